@@ -1,0 +1,64 @@
+#include "frame/OsSwMI.h"
+
+#include "nodes/ids.h"
+
+namespace IC
+{
+
+OsSwMI::OsSwMI() = default;
+
+OsSwMI::~OsSwMI() = default;
+
+Error OsSwMI::initialize(unsigned int first, Number const& second, Number const& third)
+{
+    NQ::LOG::Scope const scope(OSSWMI::unit);
+    pOsSwMI = this;
+    nodeIds_ = new std::vector<unsigned int>;
+    OSSWMI::myerr = ManagementInterface::initialize(first, second, third);
+    currentNode_ = nullptr;
+    // Each builder takes its parent from a node that an earlier one made.
+    createOsSwNodes();
+    createRootNode();
+    createComputerNodes();
+    createOsNodes();
+    createDriverNodes();
+    createUserNodes(false);
+    createGroupNodes(false);
+    createLogNodes();
+    createLogEntryNodes(false);
+    return OSSWMI::myerr;
+}
+
+void OsSwMI::unload()
+{
+    NQ::LOG::Scope const scope(OSSWMI::unit);
+    ManagementInterface::unload();
+    delete nodeIds_;
+    nodeIds_ = nullptr;
+}
+
+void OsSwMI::publishNode(Node* node)
+{
+    NQ::LOG::Scope const scope(OSSWMI::unit);
+    Error const error = addNewNode(node);
+    if (error.getStatus() != 0)
+        NQ::LOG::write(OSSWMI::unit, NQ::LOG::error,
+                       NQ::LOG::message("addNewNode error = ", static_cast<std::string>(error)));
+}
+
+unsigned int OsSwMI::takeNodeId(bool note)
+{
+    if (note)
+        nodeIds_->push_back(nextNodeId_);
+    return nextNodeId_++;
+}
+
+void OsSwMI::adopt(MutableNode* node, char const* description)
+{
+    currentNode_ = node;
+    nodes_.push_back(node);
+    node->setStatus(NODES::statusOk);
+    node->setDescription(description);
+}
+
+} // namespace IC

@@ -1,0 +1,101 @@
+#ifndef FRAME_OSSWMI_H
+#define FRAME_OSSWMI_H
+
+#include "host/ManagementInterface.h"
+#include "host/MutableNode.h"
+#include "host/Mutex.h"
+#include "util/internal.h"
+#include "util/log.h"
+
+#include <string>
+#include <vector>
+
+namespace IC
+{
+
+/**
+ * The plug-in's interface object: builds the node tree and rebuilds parts of it.
+ *
+ * The framework owns every node built here. The pointers below are kept to find parents and to
+ * remove the nodes of one kind on a rebuild.
+ */
+class OsSwMI : public ManagementInterface
+{
+public:
+    OsSwMI();
+    ~OsSwMI() override;
+
+    /**
+     * Prepares the framework and builds the whole tree, also when the framework fails.
+     *
+     * @return the framework's outcome
+     */
+    Error initialize(unsigned int first, Number const& second, Number const& third) override;
+
+    /** Lets the framework delete the nodes, then frees the node-id list. */
+    void unload() override;
+
+    /** Makes one node known to the host; a refusal is logged and otherwise ignored. */
+    void publishNode(Node* node);
+
+    void createOsSwNodes();
+    void createRootNode();
+    void createComputerNodes();
+    void createOsNodes();
+    void createDriverNodes();
+
+    /** @param refresh  delete the present nodes of this kind first and publish each new one */
+    void createUserNodes(bool refresh);
+    void createGroupNodes(bool refresh);
+
+    void createLogNodes();
+    void createLogEntryNodes(bool refresh);
+
+protected:
+    MutableNode* currentNode_ = nullptr;           // the node being built
+    std::vector<unsigned int>* nodeIds_ = nullptr; // from initialize to unload
+    MutableNode* osSwNode_ = nullptr;
+    MutableNode* rootNode_ = nullptr;
+    MutableNode* computerNode_ = nullptr;
+    MutableNode* osNode_ = nullptr;
+    MutableNode* logNode_ = nullptr;
+    std::vector<Node*> userNodes_;
+    std::vector<Node*> groupNodes_;
+    std::vector<Node*> logEntryNodes_;
+
+private:
+    /** Takes the next node id; at start-up it is also noted in the node-id list. */
+    MI_INTERNAL unsigned int takeNodeId(bool note = true);
+
+    /** Makes a freshly made node the current one and hands it to the framework. */
+    MI_INTERNAL void adopt(MutableNode* node, char const* description);
+};
+
+/** The interface object that initialize ran on; node classes rebuild nodes through it. */
+extern OsSwMI* pOsSwMI;
+
+namespace OSSWMI
+{
+
+/** Logger category of the frame and of all nodes. */
+extern std::string loggerOsSwMI;
+extern OsSwMI myosswmi;
+extern Error myerr;
+
+/** Held for the whole of every build or rebuild of user or group nodes. */
+extern NQ::Mutex myuserlock;
+
+/** True while the user-node builder itself stores properties into user nodes. Not atomic. */
+extern bool MI_call;
+
+/** Where the frame's and the nodes' messages come from. */
+extern NQ::LOG::Unit const unit MI_INTERNAL;
+
+/** The time limit of a wait without limit. */
+constexpr unsigned long waitForever = 0xFFFFFFFFUL;
+
+} // namespace OSSWMI
+
+} // namespace IC
+
+#endif

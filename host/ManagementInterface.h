@@ -1,0 +1,96 @@
+#ifndef HOST_MANAGEMENTINTERFACE_H
+#define HOST_MANAGEMENTINTERFACE_H
+
+#include "host/Alert.h"
+#include "host/Error.h"
+#include "host/Node.h"
+#include "host/Number.h"
+
+#include <string>
+#include <vector>
+
+namespace IC
+{
+
+/**
+ * The object that a plug-in hands to its host.
+ *
+ * Life: the host takes it from OpenMI, may call setLoadCallBack, calls initialize once, uses the
+ * tree, calls unload and then closes the library. The order of the virtual operations and of the
+ * protected members is part of the contract: none must be moved, added between or taken away.
+ */
+class ManagementInterface
+{
+public:
+    using AlertCallBack = Error (*)(std::vector<Alert> const& alerts, void const* context);
+    using LoadCallBack = Error (*)(Node* const& node, void const* context);
+    using LookupCallBack = Error (*)(std::string const& path, Node** node);
+
+    ManagementInterface();
+
+    /** Copies the list of the nodes. The nodes stay the framework's. */
+    virtual Error getMap(std::vector<Node*>& nodes);
+
+    /**
+     * Prepares the interface.
+     *
+     * @param first   the interface's own id; node ids are counted from first + 1
+     * @param second  for the framework; passed on unread
+     * @param third   for the framework; passed on unread
+     */
+    virtual Error initialize(unsigned int first, Number const& second, Number const& third);
+
+    virtual Error registerForAlerts(AlertCallBack callBack, void const* context);
+
+    /** Remembers who is told of new nodes and who finds nodes by path. Calls neither. */
+    virtual void setLoadCallBack(LoadCallBack callBack, void const* context, LookupCallBack lookup)
+    {
+        loadCallBack_ = callBack;
+        loadCallBackContext_ = context;
+        lookupCallBack_ = lookup;
+    }
+
+    virtual Error deRegisterForAlerts();
+
+    /** Deletes every node. */
+    virtual void unload();
+
+    virtual ~ManagementInterface();
+
+    /** A short form for log messages. */
+    virtual operator std::string() const;
+
+    /**
+     * Makes a node known to the host and lists it unless it stands in the list already.
+     *
+     * @return the host's answer; on a non-zero status the node stays where it is
+     */
+    virtual Error addNewNode(Node*& node);
+
+    /** Unlists the node, tells the host and deletes it. Status 1 for a node that is not listed. */
+    virtual Error deleteNode(Node* node);
+
+    /** Finds a node by the text of its id. Status 1 where there is none. */
+    virtual Error getNode(std::string const& id, Node*& node);
+
+protected:
+    unsigned int nextNodeId_;
+    unsigned int miId_;
+    std::vector<Node*> nodes_; // owned; a management interface appends here directly
+    std::vector<unsigned int> miIds_;
+    LoadCallBack loadCallBack_;
+    void const* loadCallBackContext_;
+    LookupCallBack lookupCallBack_;
+
+private:
+    ManagementInterface(ManagementInterface const&) = delete;
+    ManagementInterface& operator=(ManagementInterface const&) = delete;
+
+    AlertCallBack alertCallBack_;
+    void const* alertContext_;
+    std::size_t deleteHint_; // where the last deleted node stood; the next one follows it
+};
+
+} // namespace IC
+
+#endif

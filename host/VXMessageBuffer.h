@@ -1,0 +1,46 @@
+#ifndef HOST_VXMESSAGEBUFFER_H
+#define HOST_VXMESSAGEBUFFER_H
+
+#include <iosfwd>
+#include <memory>
+#include <string>
+
+namespace VXLog
+{
+
+/**
+ * Assembles one log message. Not reused: each message takes a new buffer.
+ *
+ * Text leaves the buffer as the result, so that more of its own operators can follow; a number
+ * leaves a stream on the same buffer, so that anything a stream takes can follow.
+ */
+class VXMessageBuffer
+{
+public:
+    VXMessageBuffer();
+    ~VXMessageBuffer();
+
+    VXMessageBuffer& operator<<(char const* text);
+    VXMessageBuffer& operator<<(char* text);
+    VXMessageBuffer& operator<<(std::string const& text);
+    std::ostream& operator<<(int number);
+    std::ostream& operator<<(unsigned int number);
+
+    /** The finished message; the argument is what the chain of operators returned. */
+    std::string str(VXMessageBuffer& end);
+    std::string str(std::ostream& end);
+
+private:
+    VXMessageBuffer(VXMessageBuffer const&) = delete;
+    VXMessageBuffer& operator=(VXMessageBuffer const&) = delete;
+
+    std::ostream& stream();
+
+    std::string text_;
+    struct Stream;
+    std::unique_ptr<Stream> stream_; // made by the first number
+};
+
+} // namespace VXLog
+
+#endif

@@ -1,0 +1,60 @@
+#ifndef MIHOST_RUNTIME_RUNTIME_H
+#define MIHOST_RUNTIME_RUNTIME_H
+
+#include <string>
+
+namespace IC
+{
+class Node;
+}
+
+namespace mihost
+{
+
+/** One message as a plug-in handed it to the logger. Valid only during LogSink::write. */
+struct LogMessage {
+    enum class Operation { Log, Trace };
+
+    Operation operation;
+    char const* function;
+    char const* file;
+    int line;
+    std::string const& category;
+    int level;
+    char const* extra;
+    int first;
+    int second;
+    std::string const& text;
+};
+
+/** Receives every logger call. write() may be called from several threads at once. */
+class LogSink
+{
+public:
+    virtual ~LogSink() = default;
+    virtual void write(LogMessage const& message) = 0;
+};
+
+/** Told of nodes that come and go after the start; the node is alive during the call. */
+class NodeObserver
+{
+public:
+    virtual ~NodeObserver() = default;
+    virtual void nodeAdded(IC::Node const& node) = 0;
+    virtual void nodeDeleted(IC::Node const& node) = 0;
+};
+
+/**
+ * Sets where log messages go, null for nowhere. The sink stays the caller's and must outlive its
+ * use. Set it while no plug-in code runs.
+ */
+void setLogSink(LogSink* sink);
+
+/** Sets who is told of nodes, null for nobody. Ownership and timing as for the sink. */
+void setNodeObserver(NodeObserver* observer);
+
+NodeObserver* nodeObserver();
+
+} // namespace mihost
+
+#endif

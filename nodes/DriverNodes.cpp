@@ -1,0 +1,11 @@
+#include "frame/OsSwMI.h"
+
+namespace IC
+{
+
+void OsSwMI::createDriverNodes()
+{
+    NQ::LOG::Scope const scope(OSSWMI::unit);
+}
+
+} // namespace IC

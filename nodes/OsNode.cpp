@@ -1,0 +1,163 @@
+#include "nodes/OsNode.h"
+
+#include "frame/OsSwMI.h"
+#include "nodes/ids.h"
+#include "nodes/values.h"
+#include "sysdata/osInfo_linux.h"
+
+#include <ctime>
+
+namespace IC
+{
+
+namespace
+{
+
+using NQ::OsInfo;
+
+struct TextFact {
+    unsigned int id;
+    bool (OsInfo::*get)(std::string&);
+};
+
+struct NumberFact {
+    unsigned int id;
+    bool (OsInfo::*get)(unsigned int&);
+};
+
+constexpr TextFact namingFacts[] = {
+    {NODES::name, &OsInfo::getOSName},
+    {NODES::version, &OsInfo::getOSVersion},
+};
+
+constexpr NumberFact storedFigures[] = {
+    {NODES::processMaxNumber, &OsInfo::getProcessMaxNumber},
+    {NODES::processMaxMemory, &OsInfo::getProcessMaxMemory},
+    {NODES::userCount, &OsInfo::getUserCount},
+    {NODES::licensedUserCount, &OsInfo::getLicensedUserCount},
+    {NODES::virtualMemorySize, &OsInfo::getVirtualMemorySize},
+    {NODES::virtualMemoryFree, &OsInfo::getVirtualMemoryFree},
+};
+
+constexpr TextFact localeFacts[] = {
+    {NODES::languageEdition, &OsInfo::getLanguageEdition},
+    {NODES::codeSet, &OsInfo::getCodeSet},
+};
+
+// In the order in which they are seeded.
+constexpr NumberFact liveFigures[] = {
+    {NODES::processCount, &OsInfo::getProcessCount},
+    {NODES::physicalMemoryFree, &OsInfo::getPhysicalMemoryFree},
+    {NODES::physicalMemorySize, &OsInfo::getPhysicalMemorySize},
+    {NODES::swapFileSize, &OsInfo::getSwapFileSize},
+    {NODES::swapFileFree, &OsInfo::getSwapFileFree},
+    {NODES::swapFileSizeStored, &OsInfo::getSwapFileSizeStored},
+};
+
+template <std::size_t count>
+void store(OsInfo& info, TextFact const (&facts)[count], MutableNode& node)
+{
+    for (TextFact const& fact : facts) {
+        std::string text;
+        if ((info.*fact.get)(text))
+            node.setProperty(fact.id, NODES::text(text));
+    }
+}
+
+template <std::size_t count>
+void store(OsInfo& info, NumberFact const (&facts)[count], MutableNode& node)
+{
+    for (NumberFact const& fact : facts) {
+        unsigned int number = 0;
+        if ((info.*fact.get)(number))
+            node.setProperty(fact.id, NODES::number(number));
+    }
+}
+
+void logTime(char const* what, long seconds, char const* function)
+{
+    time_t const time = seconds;
+    char text[32] = "";
+    ctime_r(&time, text);
+    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message(what, text), function);
+}
+
+} // namespace
+
+OsNode::OsNode(unsigned int nodeId, unsigned int parentId, std::vector<unsigned int> miIds,
+               unsigned int nodeType, unsigned int index)
+    : MutableNode(nodeId, parentId, miIds, nodeType, index)
+{
+    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "OsNode::OsNode: entry");
+}
+
+OsNode::~OsNode()
+{
+    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "OsNode::~OsNode: entry");
+}
+
+Error OsNode::getProperty(unsigned int id, PropertyValue& value) const
+{
+    NQ::LOG::Scope const scope(OSSWMI::unit, {"OsNode::getProperty"});
+    OsInfo info;
+    for (NumberFact const& figure : liveFigures) {
+        if (figure.id != id)
+            continue;
+        unsigned int number = 0;
+        if ((info.*figure.get)(number))
+            value = NODES::number(number);
+        return NODES::success();
+    }
+    if (id == NODES::clearLog) {
+        value = NODES::number(0);
+        return NODES::success();
+    }
+    return MutableNode::getProperty(id, value);
+}
+
+Error OsNode::setProperty(unsigned int const& id, PropertyValue const& value)
+{
+    NQ::LOG::Scope const scope(OSSWMI::unit, {"OsNode::setProperty"});
+    return MutableNode::setProperty(id, value);
+}
+
+void OsSwMI::createOsNodes()
+{
+    NQ::LOG::Scope const scope(OSSWMI::unit);
+    unsigned int const nodeId = takeNodeId();
+    osNode_ = new OsNode(nodeId, computerNode_->getNodeId(), miIds_, NODES::operatingSystemType, 0);
+    adopt(osNode_, "Operating System");
+    NODES::setProperties(
+        *osNode_, {{NODES::fixedEnumeration, {EnumValue(static_cast<unsigned short>(35)), true}},
+                   {NODES::requestedState, {EnumValue(1U), false}}, // the only false flag
+                   {NODES::fixedNumbers, NODES::fixedNumberList()}});
+
+    OsInfo info;
+    store(info, namingFacts, *osNode_);
+    NODES::setProperties(
+        *osNode_, {{NODES::createUser, NODES::text("dummy")}, {NODES::refresh, NODES::number(1)}});
+    bool distributed = false;
+    if (info.getDistributed(distributed))
+        osNode_->setProperty(NODES::distributed, NODES::truth(distributed));
+    store(info, storedFigures, *osNode_);
+    store(info, localeFacts, *osNode_);
+
+    // Kept: one value serves all, so a figure that cannot be had stores the one before it.
+    PropertyValue value = NODES::emptyValue();
+    for (NumberFact const& figure : liveFigures) {
+        osNode_->getProperty(figure.id, value);
+        osNode_->setProperty(figure.id, value);
+    }
+
+    long time = 0;
+    if (info.getLastBootTime(time)) {
+        osNode_->setProperty(NODES::lastBootTime, NODES::date(time));
+        logTime("LastBootTime = ", time, __func__);
+    }
+    if (info.getInstallDate(time)) {
+        osNode_->setProperty(NODES::installDate, NODES::date(time));
+        logTime("InstallDate = ", time, __func__);
+    }
+}
+
+} // namespace IC

@@ -1,0 +1,25 @@
+#ifndef NODES_OSNODE_H
+#define NODES_OSNODE_H
+
+#include "host/MutableNode.h"
+
+namespace IC
+{
+
+/** The operating system: memory, swap and process figures are live, all else is stored. */
+class OsNode : public MutableNode
+{
+public:
+    OsNode(unsigned int nodeId, unsigned int parentId, std::vector<unsigned int> miIds,
+           unsigned int nodeType, unsigned int index);
+    ~OsNode() override;
+
+    /** A live figure that cannot be had leaves value as it was and still succeeds. */
+    Error getProperty(unsigned int id, PropertyValue& value) const override;
+
+    Error setProperty(unsigned int const& id, PropertyValue const& value) override;
+};
+
+} // namespace IC
+
+#endif

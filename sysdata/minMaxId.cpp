@@ -1,0 +1,119 @@
+#include "sysdata/minMaxId.h"
+
+#include <climits>
+#include <cstdio>
+#include <cstring>
+#include <vector>
+
+namespace NQ
+{
+
+namespace
+{
+
+constexpr char endMark = '\xFF';
+constexpr std::size_t keyLength = 7;
+
+struct File {
+    explicit File(char const* path) : stream(std::fopen(path, "r")) {}
+    ~File()
+    {
+        if (stream)
+            std::fclose(stream);
+    }
+    File(File const&) = delete;
+    File& operator=(File const&) = delete;
+
+    FILE* stream;
+};
+
+/** The whole file, followed by the end mark and a NUL; empty where it cannot be read. */
+std::vector<char> readAll(char const* path)
+{
+    File const file(path);
+    if (!file.stream || std::fseek(file.stream, 0, SEEK_END) != 0)
+        return {};
+    long const length = std::ftell(file.stream);
+    // A directory can be opened, too, and claims the largest length there is.
+    if (length < 0 || length == LONG_MAX || std::fseek(file.stream, 0, SEEK_SET) != 0)
+        return {};
+    std::vector<char> text(static_cast<std::size_t>(length) + 2);
+    std::size_t const read =
+        std::fread(text.data(), 1, static_cast<std::size_t>(length), file.stream);
+    text[read] = endMark;
+    text[read + 1] = '\0';
+    return text;
+}
+
+} // namespace
+
+minMaxId* minMaxId::pinstance = nullptr;
+
+minMaxId* minMaxId::Instance()
+{
+    if (!pinstance)
+        pinstance = new minMaxId;
+    return pinstance;
+}
+
+minMaxId::minMaxId()
+{
+    std::vector<char> const text = readAll("/etc/login.defs");
+    if (!text.empty())
+        parse(text.data());
+}
+
+void minMaxId::parse(char const* text)
+{
+    struct Key {
+        char const* name;
+        unsigned int& value;
+        bool found;
+    };
+    Key keys[] = {{"UID_MIN", minUserId_, false},
+                  {"UID_MAX", maxUserId_, false},
+                  {"GID_MAX", maxGroupId_, false},
+                  {"GID_MIN", minGroupId_, false}};
+    constexpr std::size_t keyCount = sizeof keys / sizeof keys[0];
+
+    std::size_t found = 0;
+    for (char const* line = text; *line != endMark;) {
+        for (Key& key : keys) {
+            if (std::strncmp(line, key.name, keyLength) != 0)
+                continue;
+            // One separating byte is passed over unseen. A value that is none leaves the old one.
+            std::sscanf(line + keyLength + 1, "%u", &key.value);
+            found += key.found ? 0 : 1;
+            key.found = true;
+            break;
+        }
+        if (found == keyCount)
+            return;
+        while (*line != '\n' && *line != endMark)
+            ++line;
+        if (*line == '\n')
+            ++line;
+    }
+}
+
+unsigned int minMaxId::getMinUserId()
+{
+    return minUserId_;
+}
+
+unsigned int minMaxId::getMinGroupId()
+{
+    return minGroupId_;
+}
+
+unsigned int minMaxId::getMaxUserId()
+{
+    return maxUserId_;
+}
+
+unsigned int minMaxId::getMaxGroupId()
+{
+    return maxGroupId_;
+}
+
+} // namespace NQ

@@ -1,0 +1,284 @@
+#include "sysdata/osInfo_linux.h"
+
+#include "host/make_string.h"
+#include "sysdata/minMaxId.h"
+#include "sysdata/osInfo_log.h"
+#include "util/MyProcess.h"
+#include "util/text.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <ctime>
+#include <langinfo.h>
+#include <pwd.h>
+#include <shadow.h>
+#include <sys/sysinfo.h>
+
+namespace NQ
+{
+
+std::string loggerOsInfo = "Veltrix.IC.MI.OsSwMI.OsInfo";
+
+namespace OSINFO
+{
+
+LOG::Unit const facts{loggerOsInfo, "OsSwMI"};
+
+} // namespace OSINFO
+
+namespace
+{
+
+using OSINFO::facts;
+using Figures = struct sysinfo;
+
+void setRam(unsigned long amount, unsigned int memoryUnit, unsigned int& out)
+{
+    if (memoryUnit == 1)
+        out = static_cast<unsigned int>(amount >> 10);
+    else if (memoryUnit >= 1024)
+        out = (memoryUnit >> 10) * static_cast<unsigned int>(amount);
+}
+
+void getRam(unsigned long Figures::*amount, char const* failure, unsigned int& out,
+            char const* function)
+{
+    Figures figures{};
+    if (sysinfo(&figures) == 0) {
+        setRam(figures.*amount, figures.mem_unit, out);
+    } else {
+        LOG::write(facts, LOG::progress, failure, function);
+        out = 0;
+    }
+}
+
+/** Zeros where the call fails. */
+Figures figuresOrZero()
+{
+    Figures figures{};
+    if (sysinfo(&figures) != 0)
+        figures = {};
+    return figures;
+}
+
+std::string environment(char const* name)
+{
+    return make_string(std::getenv(name));
+}
+
+std::string withoutBlanks(std::string text)
+{
+    std::string::size_type const first = text.find_first_not_of(' ');
+    if (first != std::string::npos)
+        text.erase(0, first);
+    text.erase(text.find_last_not_of(' ') + 1);
+    return text;
+}
+
+bool isReported(uid_t uid)
+{
+    return uid == 0 || (uid >= minMaxId::Instance()->getMinUserId() &&
+                        uid <= minMaxId::Instance()->getMaxUserId());
+}
+
+void powerDown(char const* announcement, char const* command, char const* function)
+{
+    LOG::write(facts, LOG::power, announcement, function);
+    MyProcess process;
+    process.mypopen(command, "r");
+}
+
+} // namespace
+
+OsInfo::OsInfo() = default;
+
+OsInfo::~OsInfo() = default;
+
+bool OsInfo::getDistributed(bool& out)
+{
+    LOG::Scope const scope(facts);
+    out = false;
+    return true;
+}
+
+bool OsInfo::getProcessMaxNumber(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    out = 32000;
+    return true;
+}
+
+bool OsInfo::getProcessMaxMemory(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    out = 0;
+    return true;
+}
+
+bool OsInfo::getLicensedUserCount(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    out = 0;
+    return true;
+}
+
+bool OsInfo::getVirtualMemorySize(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    out = 0;
+    return true;
+}
+
+bool OsInfo::getVirtualMemoryFree(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    out = 0;
+    return true;
+}
+
+bool OsInfo::getOSCreateUser(std::string& out)
+{
+    LOG::Scope const scope(facts);
+    out.clear();
+    return true;
+}
+
+bool OsInfo::getPhysicalMemorySize(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    getRam(&Figures::totalram, "physicalMemorySize failed", out, __func__);
+    return true;
+}
+
+bool OsInfo::getPhysicalMemoryFree(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    getRam(&Figures::freeram, "physicalMemoryFree failed", out, __func__);
+    return true;
+}
+
+bool OsInfo::getSwapFileSize(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    out = static_cast<unsigned int>(figuresOrZero().totalswap);
+    return true;
+}
+
+bool OsInfo::getSwapFileFree(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    out = static_cast<unsigned int>(figuresOrZero().freeswap);
+    return true;
+}
+
+bool OsInfo::getSwapFileSizeStored(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    Figures const figures = figuresOrZero();
+    out = static_cast<unsigned int>(figures.totalswap - figures.freeswap);
+    return true;
+}
+
+bool OsInfo::getProcessCount(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    out = figuresOrZero().procs;
+    return true;
+}
+
+bool OsInfo::getLastBootTime(long& out)
+{
+    LOG::Scope const scope(facts);
+    Figures figures{};
+    if (sysinfo(&figures) != 0)
+        return false;
+    out = static_cast<long>(std::time(nullptr)) - figures.uptime;
+    return true;
+}
+
+bool OsInfo::getUserCount(unsigned int& out)
+{
+    LOG::Scope const scope(facts);
+    lckpwdf();
+    setpwent();
+    unsigned int count = 0;
+    if (FILE* file = std::fopen("/etc/passwd", "ro")) {
+        passwd entry{};
+        passwd* found = nullptr;
+        char line[4096];
+        while (fgetpwent_r(file, &entry, line, sizeof line, &found) == 0)
+            if (isReported(entry.pw_uid))
+                ++count;
+        std::fclose(file);
+    }
+    ulckpwdf();
+    out = count;
+    return true;
+}
+
+bool OsInfo::getLanguageEdition(std::string& out)
+{
+    LOG::Scope const scope(facts);
+    std::string language = environment("LANG");
+    if (language.empty())
+        language = environment("LC_CTYPE");
+    language = withoutBlanks(language);
+    if (language == "POSIX") {
+        out = "en-US";
+        return true;
+    }
+    language.erase(std::min(language.rfind('.'), language.size()));
+    std::replace(language.begin(), language.end(), '_', '-');
+    out = language;
+    return true;
+}
+
+bool OsInfo::getCodeSet(std::string& out)
+{
+    LOG::Scope const scope(facts);
+    std::string codeSet = withoutBlanks(environment("LANG"));
+    if (codeSet == "POSIX") {
+        out = "UTF-8";
+        return true;
+    }
+    std::string::size_type const dot = codeSet.find('.');
+    if (dot != std::string::npos)
+        codeSet.erase(0, dot + 1);
+    out = codeSet.empty() ? make_string(nl_langinfo(CODESET)) : codeSet;
+    return true;
+}
+
+void OsInfo::trimString(std::string& text)
+{
+    LOG::Scope const scope(facts);
+    std::string::size_type const first = text.find_first_not_of(' ');
+    if (first == std::string::npos) {
+        if (!text.empty())
+            text.pop_back();
+        return;
+    }
+    text = text.substr(first, text.find_last_not_of(' ') - first + 1);
+}
+
+void OsInfo::strreplace(char* s, char from, char to)
+{
+    LOG::Scope const scope(facts);
+    TEXT::replaceAfterFirst(s, from, to);
+}
+
+bool OsInfo::statusOffline()
+{
+    LOG::Scope const scope(facts);
+    powerDown("Halt after shutdown.", "/sbin/shutdown -h now", __func__);
+    return true;
+}
+
+bool OsInfo::statusReset()
+{
+    LOG::Scope const scope(facts);
+    powerDown("Reboot after shutdown.", "/sbin/shutdown -r now", __func__);
+    return true;
+}
+
+} // namespace NQ

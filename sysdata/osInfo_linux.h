@@ -1,0 +1,101 @@
+#ifndef SYSDATA_OSINFO_LINUX_H
+#define SYSDATA_OSINFO_LINUX_H
+
+#include <string>
+
+namespace NQ
+{
+
+/** Logger category of this source unit. */
+extern std::string loggerOsInfo;
+
+/**
+ * The facts about the running operating system, and its administration.
+ *
+ * Holds nothing and caches nothing: each call reads the system afresh. A fact getter writes its
+ * result into its argument and returns true for success.
+ */
+class OsInfo
+{
+public:
+    OsInfo();
+    ~OsInfo();
+
+    // Fixed values; always true.
+    bool getDistributed(bool& out);
+    bool getProcessMaxNumber(unsigned int& out);
+    bool getProcessMaxMemory(unsigned int& out);
+    bool getLicensedUserCount(unsigned int& out);
+    bool getVirtualMemorySize(unsigned int& out);
+    bool getVirtualMemoryFree(unsigned int& out);
+    bool getOSCreateUser(std::string& out);
+
+    /**
+     * Memory in KiB, from sysinfo; 0 where sysinfo fails. Always true.
+     *
+     * Kept: with a memory unit of 0 or of 2 to 1023 bytes nothing is written, so initialise out.
+     */
+    bool getPhysicalMemorySize(unsigned int& out);
+    bool getPhysicalMemoryFree(unsigned int& out);
+
+    /** Swap in the kernel's memory units, not scaled; 0 where sysinfo fails. Always true. */
+    bool getSwapFileSize(unsigned int& out);
+    bool getSwapFileFree(unsigned int& out);
+
+    /** Swap in use, in the kernel's memory units; 0 where sysinfo fails. Always true. */
+    bool getSwapFileSizeStored(unsigned int& out);
+
+    /** Number of current processes, from sysinfo; 0 where it fails. Always true. */
+    bool getProcessCount(unsigned int& out);
+
+    /** Seconds since 1970, from the clock and sysinfo's uptime. */
+    bool getLastBootTime(long& out);
+
+    /** Number of ordinary accounts and of those with UID 0 in /etc/passwd. Always true. */
+    bool getUserCount(unsigned int& out);
+
+    /** Last status change of the distribution's release file, seconds since 1970. Always true. */
+    bool getInstallDate(long& out);
+
+    /** First line of the first release file there is, else "Linux". Always true. */
+    bool getOSName(std::string& out);
+
+    /** First line of the file, as it is. */
+    bool getOSReleaseName(std::string path, std::string& out);
+
+    /** The distribution's version; at most 9 characters where a command yields it. */
+    bool getOSVersion(std::string& out);
+
+    /** Major and minor number of a release file of key = value lines, joined by a point. */
+    bool getKestoVersion(std::string path, std::string& out);
+
+    /** The language of LANG, else of LC_CTYPE, such as "en-US". Always true. */
+    bool getLanguageEdition(std::string& out);
+
+    /** The code set of LANG, else that of the process's locale, such as "UTF-8". Always true. */
+    bool getCodeSet(std::string& out);
+
+    /**
+     * Strips blanks from both ends, in place.
+     *
+     * Kept: a text of n blanks becomes one of n - 1 blanks.
+     */
+    void trimString(std::string& text);
+
+    /**
+     * Replaces characters in place, from the second one on; a NUL ends the text and the scan.
+     *
+     * @param s  NUL-terminated
+     */
+    void strreplace(char* s, char from, char to);
+
+    /** Halts the machine. Always true. */
+    bool statusOffline();
+
+    /** Restarts the machine. Always true. */
+    bool statusReset();
+};
+
+} // namespace NQ
+
+#endif

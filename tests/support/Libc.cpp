@@ -1,0 +1,151 @@
+#include "tests/support/Libc.h"
+
+#include <dlfcn.h>
+#include <shadow.h>
+#include <sys/sysinfo.h>
+#include <sys/utsname.h>
+
+namespace libc
+{
+
+namespace
+{
+
+template <class Function> Function* next(char const* name)
+{
+    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
+}
+
+/** Fake output as a stream; unlike an in-memory stream it holds NUL bytes and emptiness well. */
+FILE* streamOf(std::string const& text)
+{
+    FILE* stream = std::tmpfile();
+    std::fwrite(text.data(), 1, text.size(), stream);
+    std::rewind(stream);
+    return stream;
+}
+
+} // namespace
+
+Hooks& hooks()
+{
+    static Hooks inUse;
+    return inUse;
+}
+
+FILE* realPopen(char const* command, char const* mode)
+{
+    static auto* const real = next<FILE*(char const*, char const*)>("popen");
+    return real(command, mode);
+}
+
+int realPclose(FILE* stream)
+{
+    static auto* const real = next<int(FILE*)>("pclose");
+    return real(stream);
+}
+
+FILE* realFopen(char const* path, char const* mode)
+{
+    static auto* const real = next<FILE*(char const*, char const*)>("fopen");
+    return real(path, mode);
+}
+
+int realSysinfo(struct sysinfo* figures)
+{
+    static auto* const real = next<int(struct sysinfo*)>("sysinfo");
+    return real(figures);
+}
+
+HookGuard::~HookGuard()
+{
+    hooks() = {};
+}
+
+FileRoot::FileRoot(std::string root)
+{
+    hooks().fopen = [root = std::move(root)](char const* path, char const* mode) {
+        std::string const asked = path;
+        bool const below = asked.rfind("/etc/", 0) == 0 || asked.rfind("/var/log/", 0) == 0;
+        return realFopen(below ? (root + asked).c_str() : path, mode);
+    };
+}
+
+FileRoot::~FileRoot()
+{
+    hooks().fopen = nullptr;
+}
+
+FakeCommands::FakeCommands()
+{
+    hooks().popen = [this](char const* command, char const*) -> FILE* {
+        ran.emplace_back(command);
+        auto const answer = answers.find(command);
+        if (answer == answers.end())
+            return nullptr;
+        ++open;
+        return streamOf(answer->second);
+    };
+    hooks().pclose = [this](FILE* stream) {
+        --open;
+        return std::fclose(stream);
+    };
+}
+
+FakeCommands::~FakeCommands()
+{
+    hooks().popen = nullptr;
+    hooks().pclose = nullptr;
+}
+
+} // namespace libc
+
+using libc::hooks;
+
+extern "C" {
+
+FILE* popen(char const* command, char const* mode)
+{
+    return hooks().popen ? hooks().popen(command, mode) : libc::realPopen(command, mode);
+}
+
+int pclose(FILE* stream)
+{
+    return hooks().pclose ? hooks().pclose(stream) : libc::realPclose(stream);
+}
+
+FILE* fopen(char const* path, char const* mode)
+{
+    return hooks().fopen ? hooks().fopen(path, mode) : libc::realFopen(path, mode);
+}
+
+// File streams open through this name.
+FILE* fopen64(char const* path, char const* mode)
+{
+    return fopen(path, mode);
+}
+
+int sysinfo(struct sysinfo* figures) noexcept
+{
+    return hooks().sysinfo ? hooks().sysinfo(figures) : libc::realSysinfo(figures);
+}
+
+int uname(struct utsname* system) noexcept
+{
+    static auto* const real = libc::next<int(struct utsname*)>("uname");
+    return hooks().uname ? hooks().uname(system) : real(system);
+}
+
+int lckpwdf() noexcept
+{
+    static auto* const real = libc::next<int()>("lckpwdf");
+    return hooks().lckpwdf ? hooks().lckpwdf() : real();
+}
+
+int ulckpwdf() noexcept
+{
+    static auto* const real = libc::next<int()>("ulckpwdf");
+    return hooks().ulckpwdf ? hooks().ulckpwdf() : real();
+}
+
+} // extern "C"

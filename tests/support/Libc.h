@@ -1,0 +1,84 @@
+#ifndef TESTS_SUPPORT_LIBC_H
+#define TESTS_SUPPORT_LIBC_H
+
+#include <cstdio>
+#include <functional>
+#include <map>
+#include <string>
+#include <vector>
+
+struct sysinfo;
+struct utsname;
+
+/**
+ * The libc calls that the plug-in makes, replaced in the test program.
+ *
+ * Each hook that is set is asked in place of the real call; those not set fall through to it.
+ */
+namespace libc
+{
+
+struct Hooks {
+    std::function<FILE*(char const* command, char const* mode)> popen;
+    std::function<int(FILE* stream)> pclose;
+    std::function<FILE*(char const* path, char const* mode)> fopen;
+    std::function<int(struct sysinfo* figures)> sysinfo;
+    std::function<int(struct utsname* system)> uname;
+    std::function<int()> lckpwdf;
+    std::function<int()> ulckpwdf;
+};
+
+Hooks& hooks();
+
+/** The real calls, past the hooks. */
+FILE* realPopen(char const* command, char const* mode);
+int realPclose(FILE* stream);
+FILE* realFopen(char const* path, char const* mode);
+int realSysinfo(struct sysinfo* figures);
+
+/** Takes all hooks away when it goes. */
+class HookGuard
+{
+public:
+    HookGuard() = default;
+    ~HookGuard();
+    HookGuard(HookGuard const&) = delete;
+    HookGuard& operator=(HookGuard const&) = delete;
+};
+
+/**
+ * Lays files over the machine's own for as long as it lives: opening one of the given paths, or
+ * any path below /etc or /var/log, opens it below the root folder instead.
+ */
+class FileRoot
+{
+public:
+    explicit FileRoot(std::string root);
+    ~FileRoot();
+    FileRoot(FileRoot const&) = delete;
+    FileRoot& operator=(FileRoot const&) = delete;
+};
+
+/**
+ * Answers commands with recorded output for as long as it lives, and notes every command asked for.
+ *
+ * A command without an answer cannot be started: popen yields null.
+ */
+class FakeCommands
+{
+public:
+    FakeCommands();
+    ~FakeCommands();
+    FakeCommands(FakeCommands const&) = delete;
+    FakeCommands& operator=(FakeCommands const&) = delete;
+
+    std::map<std::string, std::string> answers;
+    std::vector<std::string> ran;
+
+    /** Streams handed out and not closed yet. */
+    int open = 0;
+};
+
+} // namespace libc
+
+#endif

@@ -1,0 +1,49 @@
+#ifndef TESTS_SUPPORT_RECORDING_H
+#define TESTS_SUPPORT_RECORDING_H
+
+#include "mihost/runtime/Runtime.h"
+
+#include <mutex>
+#include <string>
+#include <vector>
+
+/** One logger call, kept. */
+struct LogRecord {
+    bool trace; // false for the level log, true for the trace log
+    std::string function;
+    std::string file;
+    int line;
+    std::string category;
+    int level;
+    bool extraIsNull;
+    int first;
+    int second;
+    std::string text;
+};
+
+/** Keeps every logger call of the process for as long as it lives. */
+class Recording : public mihost::LogSink
+{
+public:
+    Recording();
+    ~Recording() override;
+
+    void write(mihost::LogMessage const& message) override;
+
+    std::vector<LogRecord> records() const;
+
+    /** The texts of the level log, in order; with a level given, only those of that level. */
+    std::vector<std::string> texts(int level = 0) const;
+
+    /** Texts other than entry and exit lines. */
+    std::vector<std::string> remarks() const;
+
+    bool has(std::string const& text, int level) const;
+    void clear();
+
+private:
+    mutable std::mutex lock_;
+    std::vector<LogRecord> records_;
+};
+
+#endif

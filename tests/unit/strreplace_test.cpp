@@ -1,0 +1,32 @@
+#include "sysdata/osInfo_linux.h"
+
+#include <gtest/gtest.h>
+
+namespace
+{
+
+std::string replaced(std::string text, char from, char to)
+{
+    text.push_back('\0');
+    NQ::OsInfo().strreplace(text.data(), from, to);
+    return text.c_str();
+}
+
+TEST(Strreplace, LeavesTheFirstCharacterAsItIs)
+{
+    EXPECT_EQ(replaced("-a-b", '-', ' '), "-a b");
+}
+
+TEST(Strreplace, StopsAtTheFirstReplacementByNul)
+{
+    char text[] = "abcbd";
+    NQ::OsInfo().strreplace(text, 'b', '\0');
+    EXPECT_EQ(std::string(text, 5), std::string("a\0cbd", 5));
+}
+
+TEST(Strreplace, LeavesAnEmptyTextAlone)
+{
+    EXPECT_EQ(replaced("", '-', ' '), "");
+}
+
+} // namespace

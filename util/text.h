@@ -1,0 +1,25 @@
+#ifndef UTIL_TEXT_H
+#define UTIL_TEXT_H
+
+#include "util/internal.h"
+
+/** Small text work that several units share. Not part of the plug-in's interface. */
+namespace NQ
+{
+
+namespace TEXT MI_INTERNAL
+{
+
+/**
+ * Replaces characters in place, from the second one on: the first is never looked at. A
+ * replacement by NUL ends the text and the scan.
+ *
+ * @param s  NUL-terminated, may be empty
+ */
+void replaceAfterFirst(char* s, char from, char to);
+
+} // namespace MI_INTERNAL
+
+} // namespace NQ
+
+#endif

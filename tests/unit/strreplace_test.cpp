@@ -9,7 +9,8 @@ std::string replaced(std::string text, char from, char to)
 {
     text.push_back('\0');
     NQ::OsInfo().strreplace(text.data(), from, to);
-    return text.c_str();
+    text.erase(text.find('\0'));
+    return text;
 }
 
 TEST(Strreplace, LeavesTheFirstCharacterAsItIs)

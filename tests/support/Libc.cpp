@@ -1,6 +1,7 @@
 #include "tests/support/Libc.h"
 
 #include <dlfcn.h>
+#include <pwd.h>
 #include <shadow.h>
 #include <sys/sysinfo.h>
 #include <sys/utsname.h>
@@ -55,6 +56,14 @@ int realSysinfo(struct sysinfo* figures)
 {
     static auto* const real = next<int(struct sysinfo*)>("sysinfo");
     return real(figures);
+}
+
+int realFgetpwent_r(FILE* stream, struct passwd* entry, char* buffer, std::size_t size,
+                    struct passwd** found)
+{
+    static auto* const real =
+        next<int(FILE*, struct passwd*, char*, std::size_t, struct passwd**)>("fgetpwent_r");
+    return real(stream, entry, buffer, size, found);
 }
 
 HookGuard::~HookGuard()
@@ -146,6 +155,28 @@ int ulckpwdf() noexcept
 {
     static auto* const real = libc::next<int()>("ulckpwdf");
     return hooks().ulckpwdf ? hooks().ulckpwdf() : real();
+}
+
+void setpwent()
+{
+    static auto* const real = libc::next<void()>("setpwent");
+    return hooks().setpwent ? hooks().setpwent() : real();
+}
+
+int fgetpwent_r(FILE* stream, struct passwd* entry, char* buffer, std::size_t size,
+                struct passwd** found)
+{
+    return hooks().fgetpwent_r ? hooks().fgetpwent_r(stream, entry, buffer, size, found)
+                               : libc::realFgetpwent_r(stream, entry, buffer, size, found);
+}
+
+time_t time(time_t* out) noexcept
+{
+    static auto* const real = libc::next<time_t(time_t*)>("time");
+    time_t const now = hooks().time ? hooks().time() : real(nullptr);
+    if (out)
+        *out = now;
+    return now;
 }
 
 } // extern "C"

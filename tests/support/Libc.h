@@ -2,11 +2,13 @@
 #define TESTS_SUPPORT_LIBC_H
 
 #include <cstdio>
+#include <ctime>
 #include <functional>
 #include <map>
 #include <string>
 #include <vector>
 
+struct passwd;
 struct sysinfo;
 struct utsname;
 
@@ -26,6 +28,11 @@ struct Hooks {
     std::function<int(struct utsname* system)> uname;
     std::function<int()> lckpwdf;
     std::function<int()> ulckpwdf;
+    std::function<void()> setpwent;
+    std::function<int(FILE* stream, struct passwd* entry, char* buffer, std::size_t size,
+                      struct passwd** found)>
+        fgetpwent_r;
+    std::function<std::time_t()> time;
 };
 
 Hooks& hooks();
@@ -35,6 +42,8 @@ FILE* realPopen(char const* command, char const* mode);
 int realPclose(FILE* stream);
 FILE* realFopen(char const* path, char const* mode);
 int realSysinfo(struct sysinfo* figures);
+int realFgetpwent_r(FILE* stream, struct passwd* entry, char* buffer, std::size_t size,
+                    struct passwd** found);
 
 /** Takes all hooks away when it goes. */
 class HookGuard

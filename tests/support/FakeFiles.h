@@ -1,0 +1,34 @@
+#ifndef TESTS_SUPPORT_FAKEFILES_H
+#define TESTS_SUPPORT_FAKEFILES_H
+
+#include "tests/support/Libc.h"
+
+#include <string>
+
+/**
+ * For as long as it lives, /etc and /var/log hold nothing but the files written here.
+ *
+ * The files stand in a folder of their own, which goes with the object.
+ */
+class FakeFiles
+{
+public:
+    FakeFiles();
+    ~FakeFiles();
+    FakeFiles(FakeFiles const&) = delete;
+    FakeFiles& operator=(FakeFiles const&) = delete;
+
+    /** @param path  as the plug-in names it, such as "/etc/passwd" */
+    void write(std::string const& path, std::string const& text) const;
+
+    void remove(std::string const& path) const;
+
+    /** Where the file really stands. */
+    std::string realPath(std::string const& path) const;
+
+private:
+    std::string folder_;
+    libc::FileRoot root_;
+};
+
+#endif

@@ -1,0 +1,195 @@
+#include "util/MyProcess.h"
+
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <climits>
+#include <cstdlib>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+// Zones are given by their rules, so that no time zone files are needed.
+constexpr char const* utc = "UTC0";
+constexpr char const* centralEurope = "CET-1CEST,M3.5.0,M10.5.0/3";
+constexpr char const* newYork = "EST5EDT,M3.2.0,M11.1.0";
+
+void useZone(char const* zone)
+{
+    setenv("TZ", zone, 1);
+    tzset();
+}
+
+time_t named(int year, std::string month, int day, int hour, int minute, int second, int isdst = -1)
+{
+    return NQ::to_time_t(year, month.data(), day, 0, hour, minute, second, isdst);
+}
+
+constexpr time_t day = 24 * 60 * 60;
+
+TEST(ToTimeT, ConvertsTheLastSecondOfAYear)
+{
+    useZone(utc);
+    EXPECT_EQ(named(2008, "Dec", 31, 23, 59, 59), 1230767999);
+}
+
+TEST(ToTimeT, ReadsTheFieldsAsLocalTime)
+{
+    useZone(newYork);
+    EXPECT_EQ(named(2008, "Dec", 31, 23, 59, 59), 1230767999 + 5 * 3600);
+    useZone(centralEurope);
+    EXPECT_EQ(named(2008, "Dec", 31, 23, 59, 59), 1230767999 - 3600);
+}
+
+TEST(ToTimeT, KnowsTheTwelveMonthsByName)
+{
+    useZone(utc);
+    struct {
+        char const* name;
+        time_t firstOf2009;
+    } const months[] = {{"Jan", 1230768000}, {"Feb", 1233446400}, {"Mar", 1235865600},
+                        {"Apr", 1238544000}, {"May", 1241136000}, {"Jun", 1243814400},
+                        {"Jul", 1246406400}, {"Aug", 1249084800}, {"Sep", 1251763200},
+                        {"Oct", 1254355200}, {"Nov", 1257033600}, {"Dec", 1259625600}};
+    for (auto const& month : months)
+        EXPECT_EQ(named(2009, month.name, 1, 0, 0, 0), month.firstOf2009) << month.name;
+}
+
+TEST(ToTimeT, TakesAnyOtherMonthNameForJanuaryWithoutAMessage)
+{
+    useZone(utc);
+    Recording const log;
+    for (char const* name :
+         {"dec", "DEC", "Dec ", " Dec", "December", "De", "", "   ", "never", "12"})
+        EXPECT_EQ(named(2009, name, 1, 0, 0, 0), 1230768000) << '"' << name << '"';
+    EXPECT_TRUE(log.remarks().empty());
+}
+
+TEST(ToTimeT, RejectsTheYear1900WithAMessage)
+{
+    useZone(utc);
+    Recording const log;
+    EXPECT_EQ(named(1900, "Jan", 1, 0, 0, 0), 0);
+    EXPECT_EQ(log.texts(), (std::vector<std::string>{"to_time_t: entry", "Invalid YY: YY = 1900",
+                                                     "to_time_t: exit"}));
+    EXPECT_EQ(log.texts(6000), std::vector<std::string>{"Invalid YY: YY = 1900"});
+}
+
+TEST(ToTimeT, RejectsEveryEarlierYearToo)
+{
+    useZone(utc);
+    Recording const log;
+    EXPECT_EQ(named(0, "Jan", 19, 0, 0, 0), 0);
+    EXPECT_EQ(named(-5, "Jan", 19, 0, 0, 0), 0);
+    EXPECT_EQ(named(INT_MIN, "Jan", 19, 0, 0, 0), 0);
+    EXPECT_EQ(log.texts(6000),
+              (std::vector<std::string>{"Invalid YY: YY = 0", "Invalid YY: YY = -5",
+                                        "Invalid YY: YY = -2147483648"}));
+}
+
+TEST(ToTimeT, AcceptsTheYear1901AsTheFirst)
+{
+    useZone(utc);
+    Recording const log;
+    EXPECT_EQ(named(1901, "Dec", 14, 0, 0, 0), -2147472000);
+    EXPECT_TRUE(log.texts(6000).empty());
+}
+
+TEST(ToTimeT, CarriesFieldsOutOfRangeOver)
+{
+    useZone(utc);
+    time_t const february = named(2009, "Feb", 1, 0, 0, 0);
+    EXPECT_EQ(named(2009, "Jan", 32, 0, 0, 0), february);
+    EXPECT_EQ(named(2009, "Feb", 0, 0, 0, 0), february - day);
+    EXPECT_EQ(named(2009, "Jan", 31, 24, 0, 0), february);
+    EXPECT_EQ(named(2009, "Jan", 31, 23, 60, 0), february);
+    EXPECT_EQ(named(2009, "Feb", 1, 0, 0, -1), february - 1);
+}
+
+TEST(ToTimeT, TakesNoNoticeOfTheWeekday)
+{
+    useZone(utc);
+    char month[] = "May";
+    for (int const weekday : {-1, 0, 1, 6, 7, INT_MAX, INT_MIN})
+        EXPECT_EQ(NQ::to_time_t(2010, month, 12, weekday, 10, 23, 45, -1), 1273659825);
+}
+
+TEST(ToTimeT, LetsTheSystemDecideOnSummerTimeWhenTheFlagIsNegative)
+{
+    useZone(centralEurope);
+    EXPECT_EQ(named(2010, "May", 12, 10, 23, 45, -1), 1273659825 - 2 * 3600);
+    EXPECT_EQ(named(2010, "Jan", 12, 10, 23, 45, -1), 1263291825 - 3600);
+}
+
+TEST(ToTimeT, ComesOutAnHourLaterWhenASummerDateIsForcedToStandardTime)
+{
+    useZone(centralEurope);
+    EXPECT_EQ(named(2010, "May", 12, 10, 23, 45, 0), named(2010, "May", 12, 10, 23, 45, -1) + 3600);
+    EXPECT_EQ(named(2010, "Jan", 12, 10, 23, 45, 0), named(2010, "Jan", 12, 10, 23, 45, -1));
+}
+
+TEST(ToTimeT, ComesOutAnHourEarlierWhenAWinterDateIsForcedToSummerTime)
+{
+    useZone(centralEurope);
+    EXPECT_EQ(named(2010, "Jan", 12, 10, 23, 45, 1), named(2010, "Jan", 12, 10, 23, 45, -1) - 3600);
+}
+
+TEST(ToTimeT, YieldsZeroForADateThatCannotBeRepresented)
+{
+    useZone(utc);
+    Recording const log;
+    EXPECT_EQ(named(INT_MAX, "Dec", INT_MAX, INT_MAX, INT_MAX, INT_MAX), 0);
+    EXPECT_TRUE(log.texts(6000).empty());
+}
+
+TEST(ToTimeT, CannotTellTheSecondBefore1970FromAFailure)
+{
+    useZone(utc);
+    EXPECT_EQ(named(1969, "Dec", 31, 23, 59, 58), -2);
+    EXPECT_EQ(named(1969, "Dec", 31, 23, 59, 59), 0);
+    EXPECT_EQ(named(1970, "Jan", 1, 0, 0, 0), 0);
+}
+
+TEST(ItoTimeT, EqualsTheConversionByName)
+{
+    useZone(centralEurope);
+    char const* const names[] = {"Jan", "Feb", "Mar", "Apr", "May", "Jun",
+                                 "Jul", "Aug", "Sep", "Oct", "Nov", "Dec"};
+    for (int month = 1; month <= 12; ++month)
+        EXPECT_EQ(NQ::ito_time_t(2011, month, 5, 3, 6, 7, 8, -1),
+                  named(2011, names[month - 1], 5, 6, 7, 8))
+            << month;
+}
+
+TEST(ItoTimeT, PassesTheOtherArgumentsOnInTheirOrder)
+{
+    useZone(utc);
+    // 3 February 2009 05:06:07; the 4 is a Thursday that the date is not.
+    EXPECT_EQ(NQ::ito_time_t(2009, 2, 3, 4, 5, 6, 7, 0), 1233637567);
+}
+
+TEST(ItoTimeT, TakesAnyOtherMonthNumberForAnUnmatchedName)
+{
+    useZone(utc);
+    for (int const month : {0, -1, 13, INT_MAX, INT_MIN})
+        EXPECT_EQ(NQ::ito_time_t(2009, month, 1, 0, 0, 0, 0, -1), 1230768000) << month;
+}
+
+TEST(ItoTimeT, LogsAroundTheConversionByName)
+{
+    useZone(utc);
+    Recording const log;
+    NQ::ito_time_t(1900, 1, 1, 0, 0, 0, 0, -1);
+    EXPECT_EQ(log.texts(), (std::vector<std::string>{"ito_time_t: entry", "to_time_t: entry",
+                                                     "Invalid YY: YY = 1900", "to_time_t: exit",
+                                                     "ito_time_t: exit"}));
+    for (LogRecord const& record : log.records()) {
+        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.MyProcess");
+        EXPECT_EQ(record.file, "MyProcess");
+    }
+}
+
+} // namespace

@@ -39,6 +39,9 @@ public:
     /** The number, 0 or 1 for a truth value, seconds since 1970 for a point in time. */
     long long getValue() const;
 
+    /** What a point in time was given beside its seconds; 0 for other kinds. */
+    unsigned short getSubSeconds() const;
+
 private:
     KindType kind_;
     unsigned short subSeconds_;

@@ -15,43 +15,45 @@ namespace
 
 using NQ::OsInfo;
 
-struct TextFact {
+template <class Value> struct Fact {
     unsigned int id;
-    bool (OsInfo::*get)(std::string&);
+    bool (*get)(OsInfo& info, Value& out);
 };
+using TextFact = Fact<std::string>;
+using NumberFact = Fact<unsigned int>;
 
-struct NumberFact {
-    unsigned int id;
-    bool (OsInfo::*get)(unsigned int&);
-};
+template <auto getter, class Value> bool ask(OsInfo& info, Value& out)
+{
+    return (info.*getter)(out);
+}
 
 constexpr TextFact namingFacts[] = {
-    {NODES::name, &OsInfo::getOSName},
-    {NODES::version, &OsInfo::getOSVersion},
+    {NODES::name, ask<&OsInfo::getOSName>},
+    {NODES::version, ask<&OsInfo::getOSVersion>},
 };
 
 constexpr NumberFact storedFigures[] = {
-    {NODES::processMaxNumber, &OsInfo::getProcessMaxNumber},
-    {NODES::processMaxMemory, &OsInfo::getProcessMaxMemory},
-    {NODES::userCount, &OsInfo::getUserCount},
-    {NODES::licensedUserCount, &OsInfo::getLicensedUserCount},
-    {NODES::virtualMemorySize, &OsInfo::getVirtualMemorySize},
-    {NODES::virtualMemoryFree, &OsInfo::getVirtualMemoryFree},
+    {NODES::processMaxNumber, ask<&OsInfo::getProcessMaxNumber>},
+    {NODES::processMaxMemory, ask<&OsInfo::getProcessMaxMemory>},
+    {NODES::userCount, ask<&OsInfo::getUserCount>},
+    {NODES::licensedUserCount, ask<&OsInfo::getLicensedUserCount>},
+    {NODES::virtualMemorySize, ask<&OsInfo::getVirtualMemorySize>},
+    {NODES::virtualMemoryFree, ask<&OsInfo::getVirtualMemoryFree>},
 };
 
 constexpr TextFact localeFacts[] = {
-    {NODES::languageEdition, &OsInfo::getLanguageEdition},
-    {NODES::codeSet, &OsInfo::getCodeSet},
+    {NODES::languageEdition, ask<&OsInfo::getLanguageEdition>},
+    {NODES::codeSet, ask<&OsInfo::getCodeSet>},
 };
 
 // In the order in which they are seeded.
 constexpr NumberFact liveFigures[] = {
-    {NODES::processCount, &OsInfo::getProcessCount},
-    {NODES::physicalMemoryFree, &OsInfo::getPhysicalMemoryFree},
-    {NODES::physicalMemorySize, &OsInfo::getPhysicalMemorySize},
-    {NODES::swapFileSize, &OsInfo::getSwapFileSize},
-    {NODES::swapFileFree, &OsInfo::getSwapFileFree},
-    {NODES::swapFileSizeStored, &OsInfo::getSwapFileSizeStored},
+    {NODES::processCount, ask<&OsInfo::getProcessCount>},
+    {NODES::physicalMemoryFree, ask<&OsInfo::getPhysicalMemoryFree>},
+    {NODES::physicalMemorySize, ask<&OsInfo::getPhysicalMemorySize>},
+    {NODES::swapFileSize, ask<&OsInfo::getSwapFileSize>},
+    {NODES::swapFileFree, ask<&OsInfo::getSwapFileFree>},
+    {NODES::swapFileSizeStored, ask<&OsInfo::getSwapFileSizeStored>},
 };
 
 template <std::size_t count>
@@ -59,7 +61,7 @@ void store(OsInfo& info, TextFact const (&facts)[count], MutableNode& node)
 {
     for (TextFact const& fact : facts) {
         std::string text;
-        if ((info.*fact.get)(text))
+        if (fact.get(info, text))
             node.setProperty(fact.id, NODES::text(text));
     }
 }
@@ -69,7 +71,7 @@ void store(OsInfo& info, NumberFact const (&facts)[count], MutableNode& node)
 {
     for (NumberFact const& fact : facts) {
         unsigned int number = 0;
-        if ((info.*fact.get)(number))
+        if (fact.get(info, number))
             node.setProperty(fact.id, NODES::number(number));
     }
 }
@@ -104,7 +106,7 @@ Error OsNode::getProperty(unsigned int id, PropertyValue& value) const
         if (figure.id != id)
             continue;
         unsigned int number = 0;
-        if ((info.*figure.get)(number))
+        if (figure.get(info, number))
             value = NODES::number(number);
         return NODES::success();
     }

@@ -15,13 +15,8 @@ void write(Unit const& unit, Level level, std::string const& message, char const
                                 message);
 }
 
-Scope::Scope(Unit const& unit, char const* function, int line)
-    : Scope(unit, Named{function}, function, line)
-{
-}
-
 Scope::Scope(Unit const& unit, Named named, char const* function, int line)
-    : unit_(unit), name_(named.name), function_(function), line_(line)
+    : unit_(unit), name_(named.name ? named.name : function), function_(function), line_(line)
 {
     write(unit_, progress, message(name_, ": entry"), function_, line_);
 }

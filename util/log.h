@@ -40,17 +40,13 @@ template <class... Parts> std::string message(Parts const&... parts)
 class Scope
 {
 public:
-    /** Speaks under the function's own name. */
-    explicit Scope(Unit const& unit, char const* function = __builtin_FUNCTION(),
-                   int line = __builtin_LINE());
-
-    /** @param name  what the two messages begin with; must outlive the scope */
+    /** What the two messages begin with; must outlive the scope. Null: the function's own name. */
     struct Named {
         char const* name;
     };
-    Scope(Unit const& unit, Named named, char const* function = __builtin_FUNCTION(),
-          int line = __builtin_LINE());
 
+    explicit Scope(Unit const& unit, Named named = {nullptr},
+                   char const* function = __builtin_FUNCTION(), int line = __builtin_LINE());
     ~Scope();
 
     Scope(Scope const&) = delete;

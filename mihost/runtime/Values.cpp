@@ -33,6 +33,11 @@ long long Number::getValue() const
     return value_;
 }
 
+unsigned short Number::getSubSeconds() const
+{
+    return subSeconds_;
+}
+
 EnumValue::EnumValue(unsigned int const& value) : value_(value) {}
 
 EnumValue::EnumValue(unsigned short const& value) : value_(value) {}

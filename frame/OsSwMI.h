@@ -91,9 +91,6 @@ extern bool MI_call;
 /** Where the frame's and the nodes' messages come from. */
 extern NQ::LOG::Unit const unit MI_INTERNAL;
 
-/** The time limit of a wait without limit. */
-constexpr unsigned long waitForever = 0xFFFFFFFFUL;
-
 } // namespace OSSWMI
 
 } // namespace IC

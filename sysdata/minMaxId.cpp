@@ -1,5 +1,7 @@
 #include "sysdata/minMaxId.h"
 
+#include "util/file.h"
+
 #include <climits>
 #include <cstdio>
 #include <cstring>
@@ -14,32 +16,19 @@ namespace
 constexpr char endMark = '\xFF';
 constexpr std::size_t keyLength = 7;
 
-struct File {
-    explicit File(char const* path) : stream(std::fopen(path, "r")) {}
-    ~File()
-    {
-        if (stream)
-            std::fclose(stream);
-    }
-    File(File const&) = delete;
-    File& operator=(File const&) = delete;
-
-    FILE* stream;
-};
-
 /** The whole file, followed by the end mark and a NUL; empty where it cannot be read. */
 std::vector<char> readAll(char const* path)
 {
-    File const file(path);
-    if (!file.stream || std::fseek(file.stream, 0, SEEK_END) != 0)
+    FILES::File const file(path, "r");
+    if (!file.stream() || std::fseek(file.stream(), 0, SEEK_END) != 0)
         return {};
-    long const length = std::ftell(file.stream);
+    long const length = std::ftell(file.stream());
     // A directory can be opened, too, and claims the largest length there is.
-    if (length < 0 || length == LONG_MAX || std::fseek(file.stream, 0, SEEK_SET) != 0)
+    if (length < 0 || length == LONG_MAX || std::fseek(file.stream(), 0, SEEK_SET) != 0)
         return {};
     std::vector<char> text(static_cast<std::size_t>(length) + 2);
     std::size_t const read =
-        std::fread(text.data(), 1, static_cast<std::size_t>(length), file.stream);
+        std::fread(text.data(), 1, static_cast<std::size_t>(length), file.stream());
     text[read] = endMark;
     text[read + 1] = '\0';
     return text;
@@ -114,6 +103,18 @@ unsigned int minMaxId::getMaxUserId()
 unsigned int minMaxId::getMaxGroupId()
 {
     return maxGroupId_;
+}
+
+bool isReportedUser(unsigned int uid)
+{
+    return uid == 0 || (uid >= minMaxId::Instance()->getMinUserId() &&
+                        uid <= minMaxId::Instance()->getMaxUserId());
+}
+
+bool isReportedGroup(unsigned int gid)
+{
+    return gid == 0 || (gid >= minMaxId::Instance()->getMinGroupId() &&
+                        gid <= minMaxId::Instance()->getMaxGroupId());
 }
 
 } // namespace NQ

@@ -37,6 +37,12 @@ private:
     unsigned int maxGroupId_ = 0;
 };
 
+/** Whether the plug-in reports this account: an ordinary one, or one with id 0. */
+MI_INTERNAL bool isReportedUser(unsigned int uid);
+
+/** As isReportedUser, for groups. */
+MI_INTERNAL bool isReportedGroup(unsigned int gid);
+
 } // namespace NQ
 
 #endif

@@ -76,12 +76,6 @@ std::string withoutBlanks(std::string text)
     return text;
 }
 
-bool isReported(uid_t uid)
-{
-    return uid == 0 || (uid >= minMaxId::Instance()->getMinUserId() &&
-                        uid <= minMaxId::Instance()->getMaxUserId());
-}
-
 void powerDown(char const* announcement, char const* command, char const* function)
 {
     LOG::write(facts, LOG::power, announcement, function);
@@ -208,7 +202,7 @@ bool OsInfo::getUserCount(unsigned int& out)
         passwd* found = nullptr;
         char line[4096];
         while (fgetpwent_r(file, &entry, line, sizeof line, &found) == 0)
-            if (isReported(entry.pw_uid))
+            if (isReportedUser(entry.pw_uid))
                 ++count;
         std::fclose(file);
     }

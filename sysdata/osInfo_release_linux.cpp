@@ -3,6 +3,7 @@
 #include "sysdata/osInfo_linux.h"
 #include "sysdata/osInfo_log.h"
 #include "util/MyProcess.h"
+#include "util/file.h"
 
 #include <cstdio>
 #include <fstream>
@@ -14,16 +15,8 @@ namespace NQ
 namespace
 {
 
+using FILES::canOpen;
 using OSINFO::facts;
-
-bool canOpen(char const* path)
-{
-    FILE* file = std::fopen(path, "r");
-    if (!file)
-        return false;
-    std::fclose(file);
-    return true;
-}
 
 #if defined(__GNUC__) && !defined(__clang__)
 #pragma GCC diagnostic push

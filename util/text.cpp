@@ -1,5 +1,8 @@
 #include "util/text.h"
 
+#include <cstdarg>
+#include <cstdio>
+
 namespace NQ::TEXT
 {
 
@@ -14,6 +17,15 @@ void replaceAfterFirst(char* s, char from, char to)
         if (to == '\0')
             return;
     }
+}
+
+bool print(char* buffer, std::size_t size, char const* format, ...)
+{
+    std::va_list arguments;
+    va_start(arguments, format);
+    int const length = std::vsnprintf(buffer, size, format, arguments);
+    va_end(arguments);
+    return length >= 0 && static_cast<std::size_t>(length) < size;
 }
 
 } // namespace NQ::TEXT

@@ -3,6 +3,8 @@
 
 #include "util/internal.h"
 
+#include <cstddef>
+
 /** Small text work that several units share. Not part of the plug-in's interface. */
 namespace NQ
 {
@@ -17,6 +19,14 @@ namespace TEXT MI_INTERNAL
  * @param s  NUL-terminated, may be empty
  */
 void replaceAfterFirst(char* s, char from, char to);
+
+/**
+ * Prints into a buffer of the given size, as snprintf does.
+ *
+ * @return false where the text does not fit; the buffer then holds its beginning
+ */
+bool print(char* buffer, std::size_t size, char const* format, ...)
+    __attribute__((format(printf, 3, 4)));
 
 } // namespace MI_INTERNAL
 

@@ -1,6 +1,8 @@
 #include "tests/support/Libc.h"
 
 #include <dlfcn.h>
+#include <grp.h>
+#include <memory>
 #include <pwd.h>
 #include <shadow.h>
 #include <sys/sysinfo.h>
@@ -25,6 +27,43 @@ FILE* streamOf(std::string const& text)
     std::rewind(stream);
     return stream;
 }
+
+/** A group database that stands in one file; read from its start after a rewind. */
+class GroupFile
+{
+public:
+    explicit GroupFile(std::string path) : path_(std::move(path)) {}
+    ~GroupFile()
+    {
+        close();
+    }
+    GroupFile(GroupFile const&) = delete;
+    GroupFile& operator=(GroupFile const&) = delete;
+
+    void rewind()
+    {
+        close();
+        stream_ = realFopen(path_.c_str(), "r");
+    }
+
+    group* next()
+    {
+        if (!stream_)
+            rewind();
+        return stream_ ? fgetgrent(stream_) : nullptr;
+    }
+
+    void close()
+    {
+        if (stream_)
+            std::fclose(stream_);
+        stream_ = nullptr;
+    }
+
+private:
+    std::string const path_;
+    FILE* stream_ = nullptr;
+};
 
 } // namespace
 
@@ -73,6 +112,14 @@ HookGuard::~HookGuard()
 
 FileRoot::FileRoot(std::string root)
 {
+    auto const groups = std::make_shared<GroupFile>(root + "/etc/group");
+    hooks().setgrent = [groups] { groups->rewind(); };
+    hooks().getgrent = [groups] { return groups->next(); };
+    hooks().endgrent = [groups] { groups->close(); };
+    if (!hooks().lckpwdf)
+        hooks().lckpwdf = [] { return 0; };
+    if (!hooks().ulckpwdf)
+        hooks().ulckpwdf = [] { return 0; };
     hooks().fopen = [root = std::move(root)](char const* path, char const* mode) {
         std::string const asked = path;
         bool const below = asked.rfind("/etc/", 0) == 0 || asked.rfind("/var/log/", 0) == 0;
@@ -83,6 +130,11 @@ FileRoot::FileRoot(std::string root)
 FileRoot::~FileRoot()
 {
     hooks().fopen = nullptr;
+    hooks().ulckpwdf = nullptr;
+    hooks().lckpwdf = nullptr;
+    hooks().endgrent = nullptr;
+    hooks().getgrent = nullptr;
+    hooks().setgrent = nullptr;
 }
 
 FakeCommands::FakeCommands()
@@ -177,6 +229,24 @@ time_t time(time_t* out) noexcept
     if (out)
         *out = now;
     return now;
+}
+
+void setgrent()
+{
+    static auto* const real = libc::next<void()>("setgrent");
+    hooks().setgrent ? hooks().setgrent() : real();
+}
+
+struct group* getgrent()
+{
+    static auto* const real = libc::next<group*()>("getgrent");
+    return hooks().getgrent ? hooks().getgrent() : real();
+}
+
+void endgrent()
+{
+    static auto* const real = libc::next<void()>("endgrent");
+    hooks().endgrent ? hooks().endgrent() : real();
 }
 
 } // extern "C"

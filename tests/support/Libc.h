@@ -8,6 +8,7 @@
 #include <string>
 #include <vector>
 
+struct group;
 struct passwd;
 struct sysinfo;
 struct utsname;
@@ -33,6 +34,9 @@ struct Hooks {
                       struct passwd** found)>
         fgetpwent_r;
     std::function<std::time_t()> time;
+    std::function<void()> setgrent;
+    std::function<struct group*()> getgrent;
+    std::function<void()> endgrent;
 };
 
 Hooks& hooks();
@@ -56,8 +60,9 @@ public:
 };
 
 /**
- * Lays files over the machine's own for as long as it lives: opening one of the given paths, or
- * any path below /etc or /var/log, opens it below the root folder instead.
+ * Lays files over the machine's own for as long as it lives: opening any path below /etc or
+ * /var/log opens it below the root folder instead, and the group database is the root folder's
+ * /etc/group. The machine's account lock is not taken.
  */
 class FileRoot
 {

@@ -1,0 +1,23 @@
+#include "util/text.h"
+
+#include <gtest/gtest.h>
+#include <string>
+
+namespace
+{
+
+TEST(PrintIntoABuffer, FillsItToTheLastByteButOne)
+{
+    char buffer[6];
+    EXPECT_TRUE(NQ::TEXT::print(buffer, sizeof buffer, "%s-%d", "abc", 7));
+    EXPECT_EQ(std::string(buffer), "abc-7");
+}
+
+TEST(PrintIntoABuffer, RefusesATextOneByteTooLong)
+{
+    char buffer[6];
+    EXPECT_FALSE(NQ::TEXT::print(buffer, sizeof buffer, "%s-%d", "abcd", 7));
+    EXPECT_EQ(std::string(buffer), "abcd-");
+}
+
+} // namespace

@@ -1,0 +1,38 @@
+#ifndef UTIL_FILE_H
+#define UTIL_FILE_H
+
+#include "util/internal.h"
+
+#include <cstdio>
+
+/** Files as C streams. Not part of the plug-in's interface. */
+namespace NQ
+{
+
+namespace FILES MI_INTERNAL
+{
+
+/** A stream opened with fopen, closed when the object goes. */
+class File
+{
+public:
+    File(char const* path, char const* mode);
+    ~File();
+    File(File const&) = delete;
+    File& operator=(File const&) = delete;
+
+    /** Null where the file could not be opened. */
+    FILE* stream() const;
+
+private:
+    FILE* const stream_;
+};
+
+/** Whether the file can be opened for reading. */
+bool canOpen(char const* path);
+
+} // namespace MI_INTERNAL
+
+} // namespace NQ
+
+#endif

@@ -105,16 +105,19 @@ unsigned int minMaxId::getMaxGroupId()
     return maxGroupId_;
 }
 
+// Both bounds are asked for with every id, 0 too.
 bool isReportedUser(unsigned int uid)
 {
-    return uid == 0 || (uid >= minMaxId::Instance()->getMinUserId() &&
-                        uid <= minMaxId::Instance()->getMaxUserId());
+    unsigned int const lowest = minMaxId::Instance()->getMinUserId();
+    unsigned int const highest = minMaxId::Instance()->getMaxUserId();
+    return uid == 0 || (uid >= lowest && uid <= highest);
 }
 
 bool isReportedGroup(unsigned int gid)
 {
-    return gid == 0 || (gid >= minMaxId::Instance()->getMinGroupId() &&
-                        gid <= minMaxId::Instance()->getMaxGroupId());
+    unsigned int const lowest = minMaxId::Instance()->getMinGroupId();
+    unsigned int const highest = minMaxId::Instance()->getMaxGroupId();
+    return gid == 0 || (gid >= lowest && gid <= highest);
 }
 
 } // namespace NQ

@@ -196,6 +196,7 @@ bool OsInfo::getUserCount(unsigned int& out)
     LOG::Scope const scope(facts);
     lckpwdf();
     setpwent();
+    minMaxId::Instance(); // read before the accounts, and also where there are none
     unsigned int count = 0;
     if (FILE* file = std::fopen("/etc/passwd", "ro")) {
         passwd entry{};

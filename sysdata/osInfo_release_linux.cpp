@@ -129,7 +129,7 @@ bool OsInfo::getOSVersion(std::string& out)
     LOG::Scope const scope(facts);
     if (getKestoVersion("/etc/release", out))
         return true;
-    if (canOpen("/etc/UnitedLinux-release")) {
+    if (FILES::File const file("/etc/UnitedLinux-release", "r"); file.stream()) {
         utsname system{};
         if (uname(&system) != 0)
             return false;

@@ -1,0 +1,246 @@
+#include "sysdata/osInfo_linux.h"
+
+#include "tests/support/Libc.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <ostream>
+#include <string>
+#include <sys/sysinfo.h>
+#include <vector>
+
+namespace
+{
+
+using NQ::OsInfo;
+using Figures = struct sysinfo;
+using NumberGetter = bool (OsInfo::*)(unsigned int&);
+
+constexpr unsigned int untouched = 4711;
+
+/** The kernel answers every sysinfo call with these figures, or fails. */
+class Kernel
+{
+public:
+    Kernel()
+    {
+        libc::hooks().sysinfo = [this](Figures* out) {
+            ++calls;
+            // What a failed call leaves behind is anybody's guess, so it is not to be looked at.
+            *out = figures;
+            return fails ? -1 : 0;
+        };
+    }
+
+    Figures figures{};
+    bool fails = false;
+    int calls = 0;
+
+private:
+    libc::HookGuard const guard_;
+};
+
+unsigned int read(NumberGetter get)
+{
+    unsigned int out = untouched;
+    EXPECT_TRUE((OsInfo().*get)(out));
+    return out;
+}
+
+TEST(OsInfoFixedValues, AreTheSameOnEveryMachine)
+{
+    Kernel kernel;
+    kernel.fails = true;
+    EXPECT_EQ(read(&OsInfo::getProcessMaxNumber), 32000U);
+    EXPECT_EQ(read(&OsInfo::getProcessMaxMemory), 0U);
+    EXPECT_EQ(read(&OsInfo::getLicensedUserCount), 0U);
+    EXPECT_EQ(read(&OsInfo::getVirtualMemorySize), 0U);
+    EXPECT_EQ(read(&OsInfo::getVirtualMemoryFree), 0U);
+
+    bool distributed = true;
+    EXPECT_TRUE(OsInfo().getDistributed(distributed));
+    EXPECT_FALSE(distributed);
+
+    std::string createUser = "before";
+    EXPECT_TRUE(OsInfo().getOSCreateUser(createUser));
+    EXPECT_EQ(createUser, "");
+
+    EXPECT_EQ(kernel.calls, 0);
+}
+
+struct RamCase {
+    NumberGetter get;
+    unsigned long Figures::*field;
+    char const* failure;
+    char const* function;
+};
+
+[[maybe_unused]] void PrintTo(RamCase const& test, std::ostream* out)
+{
+    *out << test.function;
+}
+
+class OsInfoRam : public testing::TestWithParam<RamCase>
+{
+protected:
+    unsigned int of(unsigned long amount, unsigned int memoryUnit)
+    {
+        // Every other field holds a figure that would show.
+        kernel_.figures.totalram = kernel_.figures.freeram = 11 << 20;
+        kernel_.figures.totalhigh = kernel_.figures.bufferram = 13 << 20;
+        kernel_.figures.*GetParam().field = amount;
+        kernel_.figures.mem_unit = memoryUnit;
+        return read(GetParam().get);
+    }
+
+    Kernel kernel_;
+};
+
+INSTANTIATE_TEST_SUITE_P(
+    Of, OsInfoRam,
+    testing::Values(RamCase{&OsInfo::getPhysicalMemorySize, &Figures::totalram,
+                            "physicalMemorySize failed", "getPhysicalMemorySize"},
+                    RamCase{&OsInfo::getPhysicalMemoryFree, &Figures::freeram,
+                            "physicalMemoryFree failed", "getPhysicalMemoryFree"}),
+    [](auto const& test) { return std::string(test.param.function); });
+
+TEST_P(OsInfoRam, IsCountedInKibibytesWhenTheUnitIsOneByte)
+{
+    EXPECT_EQ(of(1024, 1), 1U);
+    EXPECT_EQ(of(8UL << 20, 1), 8192U);
+    EXPECT_EQ(of(2047, 1), 1U);
+    EXPECT_EQ(of(1023, 1), 0U);
+    EXPECT_EQ(of(0, 1), 0U);
+}
+
+TEST_P(OsInfoRam, IsTheFieldItselfWhenTheUnitIsAKibibyte)
+{
+    EXPECT_EQ(of(123456, 1024), 123456U);
+}
+
+TEST_P(OsInfoRam, IsFourTimesTheFieldWhenTheUnitIs4096)
+{
+    EXPECT_EQ(of(123456, 4096), 4U * 123456U);
+}
+
+TEST_P(OsInfoRam, DropsWhatTheUnitHasOverWholeKibibytes)
+{
+    EXPECT_EQ(of(100, 1025), 100U);
+    EXPECT_EQ(of(100, 2047), 100U);
+    EXPECT_EQ(of(100, 2048), 200U);
+}
+
+TEST_P(OsInfoRam, LeavesTheCallersValueWhenTheUnitIsZeroOrBetween2And1023)
+{
+    for (unsigned int const memoryUnit : {0U, 2U, 512U, 1023U})
+        EXPECT_EQ(of(123456, memoryUnit), untouched) << memoryUnit;
+}
+
+TEST_P(OsInfoRam, WrapsAt32Bits)
+{
+    EXPECT_EQ(of(0x40000000, 4096), 0U);
+    EXPECT_EQ(of(0x40000001, 4096), 4U);
+    EXPECT_EQ(of(0xFFFFFFFF, 2048), 0xFFFFFFFEU);
+    EXPECT_EQ(of(3, 0x80000000), 0x600000U);
+}
+
+TEST_P(OsInfoRam, IsZeroAndSaysSoWhenTheKernelDoesNotAnswer)
+{
+    kernel_.fails = true;
+    Recording const log;
+    EXPECT_EQ(of(123456, 1), 0U);
+    std::string const function = GetParam().function;
+    EXPECT_EQ(log.texts(3000), (std::vector<std::string>{function + ": entry", GetParam().failure,
+                                                         function + ": exit"}));
+    for (LogRecord const& record : log.records())
+        EXPECT_EQ(record.function, function);
+}
+
+TEST_P(OsInfoRam, SaysNothingOfItsOwnOtherwise)
+{
+    Recording const log;
+    of(123456, 1);
+    of(123456, 512);
+    EXPECT_TRUE(log.remarks().empty());
+}
+
+TEST_P(OsInfoRam, AsksTheKernelOnceForEachRead)
+{
+    of(1024, 1);
+    of(1024, 1);
+    EXPECT_EQ(kernel_.calls, 2);
+}
+
+struct FigureCase {
+    NumberGetter get;
+    char const* function;
+    unsigned int expected;
+};
+
+[[maybe_unused]] void PrintTo(FigureCase const& test, std::ostream* out)
+{
+    *out << test.function;
+}
+
+class OsInfoFigure : public testing::TestWithParam<FigureCase>
+{
+protected:
+    OsInfoFigure()
+    {
+        kernel_.figures.totalswap = 5000;
+        kernel_.figures.freeswap = 1500;
+        kernel_.figures.procs = 65535;
+        kernel_.figures.mem_unit = 4096;
+    }
+
+    Kernel kernel_;
+};
+
+INSTANTIATE_TEST_SUITE_P(
+    Of, OsInfoFigure,
+    testing::Values(FigureCase{&OsInfo::getSwapFileSize, "getSwapFileSize", 5000},
+                    FigureCase{&OsInfo::getSwapFileFree, "getSwapFileFree", 1500},
+                    FigureCase{&OsInfo::getSwapFileSizeStored, "getSwapFileSizeStored", 3500},
+                    FigureCase{&OsInfo::getProcessCount, "getProcessCount", 65535}),
+    [](auto const& test) { return std::string(test.param.function); });
+
+TEST_P(OsInfoFigure, IsWhatTheKernelReportsWhateverTheMemoryUnit)
+{
+    for (unsigned int const memoryUnit : {0U, 1U, 512U, 1024U, 4096U}) {
+        kernel_.figures.mem_unit = memoryUnit;
+        EXPECT_EQ(read(GetParam().get), GetParam().expected) << memoryUnit;
+    }
+    EXPECT_EQ(kernel_.calls, 5);
+}
+
+TEST_P(OsInfoFigure, IsZeroWithoutAMessageWhenTheKernelDoesNotAnswer)
+{
+    kernel_.fails = true;
+    Recording const log;
+    EXPECT_EQ(read(GetParam().get), 0U);
+    EXPECT_TRUE(log.remarks().empty());
+}
+
+TEST(OsInfoLastBootTime, IsTheClockLessTheUptime)
+{
+    Kernel kernel;
+    kernel.figures.uptime = 1000;
+    libc::hooks().time = [] { return time_t{1273659825}; };
+    long out = untouched;
+    EXPECT_TRUE(OsInfo().getLastBootTime(out));
+    EXPECT_EQ(out, 1273658825);
+}
+
+TEST(OsInfoLastBootTime, FailsAndLeavesTheCallersValueWhenTheKernelDoesNotAnswer)
+{
+    Kernel kernel;
+    kernel.fails = true;
+    Recording const log;
+    long out = untouched;
+    EXPECT_FALSE(OsInfo().getLastBootTime(out));
+    EXPECT_EQ(out, static_cast<long>(untouched));
+    EXPECT_TRUE(log.remarks().empty());
+}
+
+} // namespace

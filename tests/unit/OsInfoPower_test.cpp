@@ -1,0 +1,68 @@
+#include "sysdata/osInfo_linux.h"
+
+#include "tests/support/Libc.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <ostream>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using NQ::OsInfo;
+
+struct PowerCase {
+    bool (OsInfo::*act)();
+    char const* function;
+    char const* announcement;
+    char const* command;
+};
+
+[[maybe_unused]] void PrintTo(PowerCase const& test, std::ostream* out)
+{
+    *out << test.function;
+}
+
+class OsInfoPower : public testing::TestWithParam<PowerCase>
+{
+protected:
+    libc::FakeCommands commands_; // no command reaches the machine
+};
+
+INSTANTIATE_TEST_SUITE_P(Of, OsInfoPower,
+                         testing::Values(PowerCase{&OsInfo::statusOffline, "statusOffline",
+                                                   "Halt after shutdown.", "/sbin/shutdown -h now"},
+                                         PowerCase{&OsInfo::statusReset, "statusReset",
+                                                   "Reboot after shutdown.",
+                                                   "/sbin/shutdown -r now"}),
+                         [](auto const& test) { return std::string(test.param.function); });
+
+TEST_P(OsInfoPower, AnnouncesItselfAtLevel4000AndThenRunsTheCommand)
+{
+    Recording const log;
+    std::vector<std::string> saidBefore;
+    libc::hooks().popen = [&](char const* command, char const* mode) -> FILE* {
+        commands_.ran.push_back(std::string(command) + "|" + mode);
+        saidBefore = log.texts(4000);
+        return nullptr;
+    };
+    EXPECT_TRUE((OsInfo().*GetParam().act)());
+    EXPECT_EQ(commands_.ran, std::vector<std::string>{std::string(GetParam().command) + "|r"});
+    EXPECT_EQ(saidBefore, std::vector<std::string>{GetParam().announcement});
+    EXPECT_EQ(log.remarks(), std::vector<std::string>{GetParam().announcement});
+    for (LogRecord const& record : log.records())
+        EXPECT_EQ(record.function, GetParam().function);
+}
+
+TEST_P(OsInfoPower, ClosesThePipeAndReadsNeitherOutputNorStatus)
+{
+    commands_.answers[GetParam().command] = "shutdown: Permission denied\n";
+    EXPECT_TRUE((OsInfo().*GetParam().act)());
+    EXPECT_EQ(commands_.ran, std::vector<std::string>{GetParam().command});
+    EXPECT_EQ(commands_.open, 0);
+}
+
+} // namespace

@@ -4,10 +4,10 @@
 #include "sysdata/minMaxId.h"
 #include "sysdata/osInfo_log.h"
 #include "util/MyProcess.h"
+#include "util/file.h"
 #include "util/text.h"
 
 #include <algorithm>
-#include <cstdio>
 #include <cstdlib>
 #include <ctime>
 #include <langinfo.h>
@@ -198,14 +198,13 @@ bool OsInfo::getUserCount(unsigned int& out)
     setpwent();
     minMaxId::Instance(); // read before the accounts, and also where there are none
     unsigned int count = 0;
-    if (FILE* file = std::fopen("/etc/passwd", "ro")) {
+    if (FILES::File const file("/etc/passwd", "ro"); file.stream()) {
         passwd entry{};
         passwd* found = nullptr;
         char line[4096];
-        while (fgetpwent_r(file, &entry, line, sizeof line, &found) == 0)
+        while (fgetpwent_r(file.stream(), &entry, line, sizeof line, &found) == 0)
             if (isReportedUser(entry.pw_uid))
                 ++count;
-        std::fclose(file);
     }
     ulckpwdf();
     out = count;

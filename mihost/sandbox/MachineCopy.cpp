@@ -1,0 +1,199 @@
+#include "mihost/sandbox/MachineCopy.h"
+
+#include "mihost/sandbox/Content.h"
+#include "mihost/sandbox/Descriptor.h"
+#include "mihost/sandbox/Failure.h"
+#include "mihost/sandbox/MountTable.h"
+
+#include <cstdlib>
+#include <fcntl.h>
+#include <fstream>
+#include <sstream>
+#include <sys/mount.h>
+#include <sys/stat.h>
+#include <sys/syscall.h>
+#include <unistd.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+// Covered while the copy is made, and empty in the copy, so that nothing is missed below it.
+std::string const stage = "/run";
+std::string const copyRoot = stage + "/copy";
+
+void mountAt(std::string const& path, char const* source, char const* type, unsigned long flags,
+             std::string const& options)
+{
+    check(mount(source, path.c_str(), type, flags, options.c_str()),
+          std::string("cannot mount ") + type + " at " + path);
+}
+
+void makeFolder(std::string const& path, mode_t mode)
+{
+    if (mkdir(path.c_str(), mode) == 0)
+        check(chmod(path.c_str(), mode), "cannot set the mode of " + path);
+    else if (errno != EEXIST)
+        failed("cannot make " + path);
+}
+
+void bind(std::string const& from, std::string const& to, unsigned long flags = 0)
+{
+    check(mount(from.c_str(), to.c_str(), nullptr, MS_BIND | flags, nullptr),
+          "cannot bind " + from);
+}
+
+void makeReadOnly(std::string const& path)
+{
+    mount_attr attributes{};
+    attributes.attr_set = MOUNT_ATTR_RDONLY;
+    check(mount_setattr(AT_FDCWD, path.c_str(), AT_RECURSIVE, &attributes, sizeof attributes),
+          "cannot make " + path + " read-only");
+}
+
+std::string readText(std::string const& path)
+{
+    std::ifstream file(path);
+    std::ostringstream text;
+    text << file.rdbuf();
+    return text.str();
+}
+
+/** Overlays one file system of the machine each, all writes going to the stage. */
+class Overlays
+{
+public:
+    void add(std::string const& path)
+    {
+        std::string const layer = stage + "/" + std::to_string(count_++);
+        std::string const upper = layer + "/upper";
+        std::string const work = layer + "/work";
+        struct stat status {
+        };
+        check(stat(path.c_str(), &status), "cannot look at " + path);
+        makeFolder(layer, 0700);
+        makeFolder(work, 0700);
+        // The folder itself takes its owner and mode from here.
+        makeFolder(upper, status.st_mode & 07777);
+        check(chown(upper.c_str(), status.st_uid, status.st_gid), "cannot set the owner of a copy");
+        // Named by ".", the path needs no escaping. Device files are dead in the copy.
+        check(chdir(path.c_str()), "cannot enter " + path);
+        mountAt(copyRoot + path, "overlay", "overlay", MS_NODEV,
+                "lowerdir=.,upperdir=" + upper + ",workdir=" + work);
+    }
+
+private:
+    int count_ = 0;
+};
+
+void copyFile(std::string const& path, struct stat const& status)
+{
+    Descriptor const from(check(open(path.c_str(), O_RDONLY | O_CLOEXEC), "cannot read " + path));
+    Descriptor const to(check(open((copyRoot + path).c_str(), O_WRONLY | O_TRUNC | O_CLOEXEC),
+                              "cannot copy " + path));
+    copyContent(from, to, path);
+    check(fchown(to.get(), status.st_uid, status.st_gid), "cannot copy " + path);
+    check(fchmod(to.get(), status.st_mode & 07777), "cannot copy " + path);
+}
+
+/** What cannot be overlaid can be seen but not written; what cannot even be bound stays away. */
+void addMount(std::string const& path, Overlays& overlays)
+{
+    struct stat status {
+    };
+    if (stat(path.c_str(), &status) != 0)
+        return;
+    if (S_ISREG(status.st_mode)) {
+        copyFile(path, status);
+        return;
+    }
+    if (!S_ISDIR(status.st_mode))
+        return;
+    try {
+        overlays.add(path);
+    } catch (std::system_error const&) {
+        if (mount(path.c_str(), (copyRoot + path).c_str(), nullptr, MS_BIND, nullptr) == 0)
+            makeReadOnly(copyRoot + path);
+    }
+}
+
+void addDevices()
+{
+    std::string const devices = copyRoot + "/dev";
+    mountAt(devices, "tmpfs", "tmpfs", MS_NOSUID, "mode=0755");
+    for (char const* name : {"null", "zero", "full", "random", "urandom", "tty"}) {
+        std::string const place = devices + "/" + name;
+        Descriptor const file(check(open(place.c_str(), O_CREAT | O_WRONLY | O_CLOEXEC, 0600),
+                                    "cannot make " + place));
+        bind(std::string("/dev/") + name, place);
+        makeReadOnly(place); // the device still takes writes, its owner and mode do not change
+    }
+    struct Link {
+        char const* name;
+        char const* target;
+    };
+    for (Link const& link : {Link{"fd", "/proc/self/fd"}, Link{"stdin", "/proc/self/fd/0"},
+                             Link{"stdout", "/proc/self/fd/1"}, Link{"stderr", "/proc/self/fd/2"},
+                             Link{"ptmx", "pts/ptmx"}})
+        check(symlink(link.target, (devices + "/" + link.name).c_str()),
+              std::string("cannot make /dev/") + link.name);
+    makeFolder(devices + "/pts", 0755);
+    mountAt(devices + "/pts", "devpts", "devpts", MS_NOSUID | MS_NOEXEC,
+            "newinstance,ptmxmode=0666,mode=0620,gid=5");
+    makeFolder(devices + "/shm", 01777);
+    mountAt(devices + "/shm", "tmpfs", "tmpfs", MS_NOSUID | MS_NODEV, "mode=1777");
+}
+
+void addKernelFileSystems()
+{
+    std::string const processes = copyRoot + "/proc";
+    mountAt(processes, "proc", "proc", MS_NOSUID | MS_NODEV | MS_NOEXEC, "");
+    // Writing to these would reach the machine itself.
+    for (char const* name : {"acpi", "bus", "fs", "irq", "scsi", "sys", "sysrq-trigger"}) {
+        std::string const path = processes + "/" + name;
+        if (access(path.c_str(), F_OK) != 0)
+            continue;
+        bind(path, path);
+        makeReadOnly(path);
+    }
+    bind("/sys", copyRoot + "/sys", MS_REC);
+    makeReadOnly(copyRoot + "/sys");
+}
+
+void makeRoot(std::string const& root)
+{
+    check(chdir(root.c_str()), "cannot enter the copy");
+    check(syscall(SYS_pivot_root, ".", "."), "cannot make the copy the root");
+    check(umount2(".", MNT_DETACH), "cannot leave the machine's own files");
+    check(chdir("/"), "cannot enter the copy");
+}
+
+} // namespace
+
+void enterMachineCopy()
+{
+    char* const there = getcwd(nullptr, 0);
+    std::string const workingDirectory = there ? there : "/";
+    std::free(there);
+    std::vector<std::string> const mounts = mountsToCopy(readText("/proc/self/mountinfo"));
+
+    check(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr), "cannot keep mounts private");
+    mountAt(stage, "tmpfs", "tmpfs", MS_NODEV, "mode=0700");
+    makeFolder(copyRoot, 0755);
+    Overlays overlays;
+    overlays.add("/");
+    for (std::string const& path : mounts)
+        addMount(path, overlays);
+    for (char const* name : {"/proc", "/sys", "/dev", "/run"})
+        makeFolder(copyRoot + name, 0755);
+    addKernelFileSystems();
+    addDevices();
+    mountAt(copyRoot + "/run", "tmpfs", "tmpfs", MS_NOSUID | MS_NODEV, "mode=0755");
+    makeRoot(copyRoot);
+    if (chdir(workingDirectory.c_str()) != 0)
+        check(chdir("/"), "cannot enter the copy");
+}
+
+} // namespace mihost

@@ -1,0 +1,21 @@
+#ifndef MIHOST_SANDBOX_MOUNTTABLE_H
+#define MIHOST_SANDBOX_MOUNTTABLE_H
+
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/**
+ * The mount points, other than / itself, whose content belongs into a copy of the machine: each
+ * once, a parent before what is mounted below it. Those of the kernel's own file systems and those
+ * below /proc, /sys, /dev and /run are left out.
+ *
+ * @param mountInfo  the text of /proc/self/mountinfo
+ */
+std::vector<std::string> mountsToCopy(std::string const& mountInfo);
+
+} // namespace mihost
+
+#endif

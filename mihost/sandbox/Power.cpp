@@ -1,0 +1,87 @@
+#include "mihost/sandbox/Power.h"
+
+#include "mihost/sandbox/Content.h"
+#include "mihost/sandbox/Failure.h"
+#include "mihost/sandbox/Sandbox.h"
+
+#include <fcntl.h>
+#include <fstream>
+#include <linux/capability.h>
+#include <sys/prctl.h>
+#include <sys/stat.h>
+#include <sys/syscall.h>
+#include <unistd.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+constexpr unsigned int machinePrivileges[] = {
+    CAP_SYS_BOOT,   // power off, restart, load another kernel
+    CAP_SYS_MODULE, // load and unload kernel modules
+    CAP_SYS_TIME,   // set the clock
+    CAP_SYS_RAWIO,  // ports and memory of the hardware
+    CAP_MKNOD,      // a device file of one's own making
+};
+
+char const* const notes = "/run/power-commands";
+
+// Noted before it is said: nobody may be listening any more.
+char const* const standIn = "#!/bin/sh\n"
+                            "printf '%s\\n' \"$0${*:+ $*}\" >>/run/power-commands\n"
+                            "echo \"sandbox: the machine itself would run: $0${*:+ $*}\" >&2\n";
+
+void replace(std::string const& path)
+{
+    // A link would lead to something that does more than power off.
+    if (unlink(path.c_str()) != 0 && errno != ENOENT)
+        failed("cannot replace " + path);
+    Descriptor const file(check(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0700),
+                                "cannot make " + path));
+    writeAll(file, standIn, std::char_traits<char>::length(standIn), path);
+    check(fchmod(file.get(), 0755), "cannot set the mode of " + path);
+}
+
+} // namespace
+
+void dropMachinePrivileges()
+{
+    __user_cap_header_struct header{_LINUX_CAPABILITY_VERSION_3, 0};
+    __user_cap_data_struct data[_LINUX_CAPABILITY_U32S_3]{};
+    check(syscall(SYS_capget, &header, data), "cannot read the privileges");
+    for (unsigned int const privilege : machinePrivileges) {
+        check(prctl(PR_CAPBSET_DROP, privilege, 0, 0, 0), "cannot drop a privilege");
+        __user_cap_data_struct& word = data[CAP_TO_INDEX(privilege)];
+        unsigned int const kept = ~CAP_TO_MASK(privilege);
+        word.effective &= kept;
+        word.permitted &= kept;
+        word.inheritable &= kept;
+    }
+    check(syscall(SYS_capset, &header, data), "cannot drop privileges");
+}
+
+void replacePowerCommands()
+{
+    for (char const* folder : {"/sbin/", "/usr/sbin/", "/bin/", "/usr/bin/"}) {
+        for (char const* name : {"shutdown", "reboot", "halt", "poweroff"}) {
+            std::string const path = std::string(folder) + name;
+            struct stat status {
+            };
+            if (path == "/sbin/shutdown" || lstat(path.c_str(), &status) == 0)
+                replace(path);
+        }
+    }
+}
+
+std::vector<std::string> refusedPowerCommands()
+{
+    std::vector<std::string> commands;
+    std::ifstream file(notes);
+    for (std::string line; std::getline(file, line);)
+        commands.push_back(line);
+    return commands;
+}
+
+} // namespace mihost

@@ -1,0 +1,48 @@
+#include "tests/support/Sandbox.h"
+
+#include "mihost/sandbox/Sandbox.h"
+
+#include <cstdlib>
+#include <gtest/gtest.h>
+#include <iostream>
+
+namespace
+{
+
+class SkipAll : public testing::EmptyTestEventListener
+{
+public:
+    explicit SkipAll(std::string reason) : reason_(std::move(reason)) {}
+
+    void OnTestStart(testing::TestInfo const&) override
+    {
+        GTEST_SKIP() << reason_;
+    }
+
+private:
+    std::string reason_;
+};
+
+bool isRequired()
+{
+    char const* const required = std::getenv("MI_SANDBOX_REQUIRED");
+    return required && std::string(required) == "1";
+}
+
+} // namespace
+
+int runTestsInSandbox(int argc, char* argv[])
+{
+    testing::InitGoogleTest(&argc, argv);
+    if (!testing::GTEST_FLAG(list_tests)) {
+        if (auto const reason = mihost::enterSandbox({})) {
+            if (isRequired()) {
+                std::cerr << "no sandbox: " << *reason << '\n';
+                return EXIT_FAILURE;
+            }
+            testing::UnitTest::GetInstance()->listeners().Append(
+                new SkipAll("no sandbox: " + *reason));
+        }
+    }
+    return RUN_ALL_TESTS();
+}

@@ -14,7 +14,7 @@ GroupNode::GroupNode(unsigned int nodeId, unsigned int parentId, std::vector<uns
 
 GroupNode::~GroupNode()
 {
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "GroupNode::~GroupNode: entry");
+    NQ::LOG::writeLast(OSSWMI::unit, "GroupNode::~GroupNode", ": entry");
 }
 
 Error GroupNode::getProperty(unsigned int id, PropertyValue& value) const

@@ -15,7 +15,7 @@ LogEntryNode::LogEntryNode(unsigned int nodeId, unsigned int parentId,
 
 LogEntryNode::~LogEntryNode()
 {
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "LogEntryNode::~LogEntryNode: entry");
+    NQ::LOG::writeLast(OSSWMI::unit, "LogEntryNode::~LogEntryNode", ": entry");
 }
 
 Error LogEntryNode::getProperty(unsigned int id, PropertyValue& value) const

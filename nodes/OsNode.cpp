@@ -95,7 +95,7 @@ OsNode::OsNode(unsigned int nodeId, unsigned int parentId, std::vector<unsigned 
 
 OsNode::~OsNode()
 {
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "OsNode::~OsNode: entry");
+    NQ::LOG::writeLast(OSSWMI::unit, "OsNode::~OsNode", ": entry");
 }
 
 Error OsNode::getProperty(unsigned int id, PropertyValue& value) const

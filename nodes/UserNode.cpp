@@ -14,7 +14,7 @@ UserNode::UserNode(unsigned int nodeId, unsigned int parentId, std::vector<unsig
 
 UserNode::~UserNode()
 {
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "UserNode::~UserNode: entry");
+    NQ::LOG::writeLast(OSSWMI::unit, "UserNode::~UserNode", ": entry");
 }
 
 Error UserNode::getProperty(unsigned int id, PropertyValue& value) const

@@ -2,6 +2,8 @@
 
 #include "host/VXLogger.h"
 
+#include <new>
+
 namespace NQ::LOG
 {
 
@@ -15,6 +17,16 @@ void write(Unit const& unit, Level level, std::string const& message, char const
                                 message);
 }
 
+void writeLast(Unit const& unit, char const* text, char const* end, char const* function,
+               int line) noexcept
+{
+    try {
+        write(unit, progress, message(text, end), function, line);
+    } catch (std::bad_alloc const&) {
+        return;
+    }
+}
+
 Scope::Scope(Unit const& unit, Named named, char const* function, int line)
     : unit_(unit), name_(named.name ? named.name : function), function_(function), line_(line)
 {
@@ -23,7 +35,7 @@ Scope::Scope(Unit const& unit, Named named, char const* function, int line)
 
 Scope::~Scope()
 {
-    write(unit_, progress, message(name_, ": exit"), function_, line_);
+    writeLast(unit_, name_, ": exit", function_, line_);
 }
 
 } // namespace NQ::LOG

@@ -29,6 +29,15 @@ struct Unit {
 void write(Unit const& unit, Level level, std::string const& message,
            char const* function = __builtin_FUNCTION(), int line = __builtin_LINE());
 
+/**
+ * For destructors: as write, but a message for which there is no memory is lost.
+ *
+ * @param text  what the message begins with, such as "getOSName"
+ * @param end   what it ends with, such as ": exit"
+ */
+void writeLast(Unit const& unit, char const* text, char const* end,
+               char const* function = __builtin_FUNCTION(), int line = __builtin_LINE()) noexcept;
+
 /** Assembles a message from texts and numbers in a buffer of its own. */
 template <class... Parts> std::string message(Parts const&... parts)
 {

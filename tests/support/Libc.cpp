@@ -105,6 +105,26 @@ int realFgetpwent_r(FILE* stream, struct passwd* entry, char* buffer, std::size_
     return real(stream, entry, buffer, size, found);
 }
 
+int realFgetspent_r(FILE* stream, struct spwd* entry, char* buffer, std::size_t size,
+                    struct spwd** found)
+{
+    static auto* const real =
+        next<int(FILE*, struct spwd*, char*, std::size_t, struct spwd**)>("fgetspent_r");
+    return real(stream, entry, buffer, size, found);
+}
+
+char* realFgets(char* buffer, int size, FILE* stream)
+{
+    static auto* const real = next<char*(char*, int, FILE*)>("fgets");
+    return real(buffer, size, stream);
+}
+
+int realUname(struct utsname* system)
+{
+    static auto* const real = next<int(struct utsname*)>("uname");
+    return real(system);
+}
+
 HookGuard::~HookGuard()
 {
     hooks() = {};
@@ -193,8 +213,7 @@ int sysinfo(struct sysinfo* figures) noexcept
 
 int uname(struct utsname* system) noexcept
 {
-    static auto* const real = libc::next<int(struct utsname*)>("uname");
-    return hooks().uname ? hooks().uname(system) : real(system);
+    return hooks().uname ? hooks().uname(system) : libc::realUname(system);
 }
 
 int lckpwdf() noexcept
@@ -220,6 +239,19 @@ int fgetpwent_r(FILE* stream, struct passwd* entry, char* buffer, std::size_t si
 {
     return hooks().fgetpwent_r ? hooks().fgetpwent_r(stream, entry, buffer, size, found)
                                : libc::realFgetpwent_r(stream, entry, buffer, size, found);
+}
+
+int fgetspent_r(FILE* stream, struct spwd* entry, char* buffer, std::size_t size,
+                struct spwd** found)
+{
+    return hooks().fgetspent_r ? hooks().fgetspent_r(stream, entry, buffer, size, found)
+                               : libc::realFgetspent_r(stream, entry, buffer, size, found);
+}
+
+char* fgets(char* buffer, int size, FILE* stream)
+{
+    return hooks().fgets ? hooks().fgets(buffer, size, stream)
+                         : libc::realFgets(buffer, size, stream);
 }
 
 time_t time(time_t* out) noexcept

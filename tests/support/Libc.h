@@ -10,6 +10,7 @@
 
 struct group;
 struct passwd;
+struct spwd;
 struct sysinfo;
 struct utsname;
 
@@ -33,6 +34,10 @@ struct Hooks {
     std::function<int(FILE* stream, struct passwd* entry, char* buffer, std::size_t size,
                       struct passwd** found)>
         fgetpwent_r;
+    std::function<int(FILE* stream, struct spwd* entry, char* buffer, std::size_t size,
+                      struct spwd** found)>
+        fgetspent_r;
+    std::function<char*(char* buffer, int size, FILE* stream)> fgets;
     std::function<std::time_t()> time;
     std::function<void()> setgrent;
     std::function<struct group*()> getgrent;
@@ -48,6 +53,10 @@ FILE* realFopen(char const* path, char const* mode);
 int realSysinfo(struct sysinfo* figures);
 int realFgetpwent_r(FILE* stream, struct passwd* entry, char* buffer, std::size_t size,
                     struct passwd** found);
+int realFgetspent_r(FILE* stream, struct spwd* entry, char* buffer, std::size_t size,
+                    struct spwd** found);
+char* realFgets(char* buffer, int size, FILE* stream);
+int realUname(struct utsname* system);
 
 /** Takes all hooks away when it goes. */
 class HookGuard

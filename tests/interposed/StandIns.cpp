@@ -1,0 +1,185 @@
+#include "tests/interposed/StandIns.h"
+
+#include "nodes/OsNode.h"
+#include "sysdata/minMaxId.h"
+#include "sysdata/osInfo_linux.h"
+
+#include <dlfcn.h>
+
+StandIns& standIns()
+{
+    static StandIns inUse;
+    return inUse;
+}
+
+namespace
+{
+
+template <class Function> Function* next(char const* name)
+{
+    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
+}
+
+/** Answers for the getter that calls it. */
+template <class Value>
+bool answer(std::map<std::string, Value> const& values, Value& out,
+            char const* getter = __builtin_FUNCTION())
+{
+    standIns().calls.emplace_back(getter);
+    if (standIns().failing.count(getter) != 0)
+        return false;
+    auto const found = values.find(getter);
+    if (found != values.end())
+        out = found->second;
+    return true;
+}
+
+unsigned int note(unsigned int value, char const* function = __builtin_FUNCTION())
+{
+    standIns().calls.emplace_back(function);
+    return value;
+}
+
+} // namespace
+
+bool realGetUserCount(unsigned int& out)
+{
+    static auto* const real =
+        next<bool(NQ::OsInfo*, unsigned int&)>("_ZN2NQ6OsInfo12getUserCountERj");
+    NQ::OsInfo info;
+    return real(&info, out);
+}
+
+namespace NQ
+{
+
+bool OsInfo::getDistributed(bool& out)
+{
+    unsigned int number = 0;
+    bool const known = answer(standIns().numbers, number);
+    if (known)
+        out = number != 0;
+    return known;
+}
+
+bool OsInfo::getProcessMaxNumber(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getProcessMaxMemory(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getLicensedUserCount(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getVirtualMemorySize(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getVirtualMemoryFree(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getPhysicalMemorySize(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getPhysicalMemoryFree(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getSwapFileSize(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getSwapFileFree(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getSwapFileSizeStored(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getProcessCount(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getUserCount(unsigned int& out)
+{
+    return answer(standIns().numbers, out);
+}
+
+bool OsInfo::getLastBootTime(long& out)
+{
+    return answer(standIns().times, out);
+}
+
+bool OsInfo::getInstallDate(long& out)
+{
+    return answer(standIns().times, out);
+}
+
+bool OsInfo::getOSName(std::string& out)
+{
+    return answer(standIns().texts, out);
+}
+
+bool OsInfo::getOSVersion(std::string& out)
+{
+    return answer(standIns().texts, out);
+}
+
+bool OsInfo::getLanguageEdition(std::string& out)
+{
+    return answer(standIns().texts, out);
+}
+
+bool OsInfo::getCodeSet(std::string& out)
+{
+    return answer(standIns().texts, out);
+}
+
+minMaxId* minMaxId::Instance()
+{
+    static minMaxId instance;
+    standIns().calls.emplace_back("Instance");
+    return &instance;
+}
+
+unsigned int minMaxId::getMinUserId()
+{
+    return note(500);
+}
+
+unsigned int minMaxId::getMaxUserId()
+{
+    return note(60000);
+}
+
+} // namespace NQ
+
+namespace IC
+{
+
+Error OsNode::setProperty(unsigned int const& id, PropertyValue const& value)
+{
+    static auto* const real = next<Error(OsNode*, unsigned int const&, PropertyValue const&)>(
+        "_ZN2IC6OsNode11setPropertyERKjRKNS_13PropertyValueE");
+    standIns().calls.push_back("set " + std::to_string(id));
+    return real(this, id, value);
+}
+
+} // namespace IC

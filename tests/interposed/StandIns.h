@@ -1,0 +1,33 @@
+#ifndef TESTS_INTERPOSED_STANDINS_H
+#define TESTS_INTERPOSED_STANDINS_H
+
+#include <map>
+#include <set>
+#include <string>
+#include <vector>
+
+/**
+ * Stands in for the facts of the operating system, the id ranges and the store of its node, all of
+ * which this program replaces in the library.
+ *
+ * The fact getters answer with what is given here and consult nothing.
+ */
+struct StandIns {
+    std::map<std::string, unsigned int> numbers;
+    std::map<std::string, std::string> texts;
+    std::map<std::string, long> times;
+
+    /** Getters that return false and leave the caller's value alone. */
+    std::set<std::string> failing;
+
+    /** What was called, in order: getters by name, stores as "set ID". */
+    std::vector<std::string> calls;
+};
+
+/** Those in use; a test starts with none set. */
+StandIns& standIns();
+
+/** Counts the accounts with the real getter. */
+bool realGetUserCount(unsigned int& out);
+
+#endif

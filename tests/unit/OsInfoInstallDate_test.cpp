@@ -1,0 +1,182 @@
+#include "sysdata/osInfo_linux.h"
+
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <fcntl.h>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using NQ::OsInfo;
+
+constexpr char const* suseCommand = "stat /etc/SuSE-release | grep Change";
+constexpr char const* unitedLinuxCommand = "stat /etc/UnitedLinux-release | grep Change";
+constexpr char const* redhatCommand = "stat /etc/redhat-release | grep Change";
+
+constexpr long may2010 = 1273659825; // 12 May 2010 10:23:45 UTC
+
+class InstallDate : public testing::Test
+{
+protected:
+    InstallDate()
+    {
+        setenv("TZ", "UTC0", 1);
+    }
+
+    long date()
+    {
+        long out = 4711;
+        EXPECT_TRUE(OsInfo().getInstallDate(out));
+        return out;
+    }
+
+    /** The date that one line of output yields. */
+    long dateOf(std::string const& output)
+    {
+        files_.write("/etc/redhat-release", "a line\n");
+        commands_.answers[redhatCommand] = output;
+        return date();
+    }
+
+    libc::HookGuard const guard_;
+    FakeFiles const files_;
+    libc::FakeCommands commands_;
+};
+
+TEST_F(InstallDate, IsZeroWithoutAReleaseFile)
+{
+    EXPECT_EQ(date(), 0);
+    EXPECT_TRUE(commands_.ran.empty());
+}
+
+TEST_F(InstallDate, IsTheReleaseFilesLastStatusChange)
+{
+    EXPECT_EQ(dateOf("Change: 2010-05-12 10:23:45.000000000 +0200\n"), may2010);
+}
+
+TEST_F(InstallDate, IsReadAsLocalTimeWhateverTheZoneOffsetSays)
+{
+    setenv("TZ", "CET-1CEST,M3.5.0,M10.5.0/3", 1);
+    EXPECT_EQ(dateOf("Change: 2010-05-12 10:23:45.999999999 +0900\n"), may2010 - 2 * 3600);
+    EXPECT_EQ(dateOf("Change: 2010-01-12 10:23:45.000000000 -0500\n"), 1263291825 - 3600);
+}
+
+TEST_F(InstallDate, ComesFromTheCommandOfTheFirstFileThereIs)
+{
+    struct {
+        char const* path;
+        char const* command;
+    } const files[] = {{"/etc/SuSE-release", suseCommand},
+                       {"/etc/UnitedLinux-release", unitedLinuxCommand},
+                       {"/etc/redhat-release", redhatCommand}};
+    for (auto const& file : files)
+        files_.write(file.path, "a line\n");
+    for (auto const& file : files) {
+        commands_.answers = {{file.command, "Change: 2010-05-12 10:23:45\n"}};
+        commands_.ran.clear();
+        EXPECT_EQ(date(), may2010) << file.path;
+        EXPECT_EQ(commands_.ran, std::vector<std::string>{file.command});
+        files_.remove(file.path);
+    }
+    EXPECT_EQ(date(), 0);
+}
+
+TEST_F(InstallDate, TakesNoNoticeOfOtherReleaseFiles)
+{
+    files_.write("/etc/release", "a line\n");
+    files_.write("/etc/vmware-release", "a line\n");
+    EXPECT_EQ(date(), 0);
+    EXPECT_TRUE(commands_.ran.empty());
+}
+
+TEST_F(InstallDate, IsZeroWhenTheCommandCannotBeStarted)
+{
+    Recording const log;
+    files_.write("/etc/SuSE-release", "a line\n");
+    files_.write("/etc/redhat-release", "a line\n");
+    commands_.answers[redhatCommand] = "Change: 2010-05-12 10:23:45\n";
+    EXPECT_EQ(date(), 0);
+    EXPECT_EQ(commands_.ran, std::vector<std::string>{suseCommand});
+    EXPECT_TRUE(log.remarks().empty());
+}
+
+TEST_F(InstallDate, IsZeroWhenTheCommandWritesNothing)
+{
+    Recording const log;
+    EXPECT_EQ(dateOf(""), 0);
+    EXPECT_TRUE(log.remarks().empty());
+}
+
+TEST_F(InstallDate, IsZeroWhenTheLineHoldsNoDate)
+{
+    Recording const log;
+    EXPECT_EQ(dateOf("stat: cannot stat\n"), 0);
+    EXPECT_EQ(log.remarks(), std::vector<std::string>{"Invalid YY: YY = 0"});
+}
+
+TEST_F(InstallDate, NeedsTheLineToBeginWithChange)
+{
+    EXPECT_EQ(dateOf(" Change: 2010-05-12 10:23:45\n"), 0);
+    EXPECT_EQ(dateOf("Changed: 2010-05-12 10:23:45\n"), 0);
+}
+
+TEST_F(InstallDate, LeavesTheLinesFirstCharacterAsItIs)
+{
+    // A hyphen in front stays one, so the line does not begin with the word.
+    EXPECT_EQ(dateOf("-Change: 2010-05-12 10:23:45\n"), 0);
+    Recording const log;
+    dateOf("Change: 2010-05-12 10:23:45\n");
+    EXPECT_TRUE(log.has("strreplace: entry", 3000));
+}
+
+TEST_F(InstallDate, ComesFromTheFirstLine)
+{
+    EXPECT_EQ(dateOf("Change: 2010-05-12 10:23:45\nChange: 2011-05-12 10:23:45\n"), may2010);
+    EXPECT_EQ(dateOf("Other\nChange: 2010-05-12 10:23:45\n"), 0);
+}
+
+TEST_F(InstallDate, ComesFromTheFirst1023CharactersOfTheLine)
+{
+    std::string const date = "2010-05-12 10:23:45";
+    std::string const start = "Change:";
+    std::string const blanks(1023 - start.size() - date.size(), ' ');
+    EXPECT_EQ(dateOf(start + blanks + date + "\n"), may2010);
+    EXPECT_EQ(dateOf(start + blanks + " " + date + "\n"), may2010 - 41); // the last 5 is cut off
+}
+
+TEST_F(InstallDate, ClosesTheCommandsStream)
+{
+    dateOf("Change: 2010-05-12 10:23:45\n");
+    EXPECT_EQ(commands_.open, 0);
+    dateOf("");
+    EXPECT_EQ(commands_.open, 0);
+}
+
+TEST_F(InstallDate, HoldsTheReleaseFileOpenUntilTheCommandRuns)
+{
+    files_.write("/etc/redhat-release", "a line\n");
+    int probe = -1;
+    libc::hooks().fopen = [&probe, below = libc::hooks().fopen](char const* path,
+                                                                char const* mode) {
+        FILE* const stream = below(path, mode);
+        if (stream)
+            probe = fileno(stream);
+        return stream;
+    };
+    bool wasOpen = false;
+    libc::hooks().popen = [&](char const*, char const*) -> FILE* {
+        wasOpen = fcntl(probe, F_GETFD) != -1;
+        return nullptr;
+    };
+    date();
+    EXPECT_TRUE(wasOpen);
+    EXPECT_EQ(fcntl(probe, F_GETFD), -1);
+}
+
+} // namespace

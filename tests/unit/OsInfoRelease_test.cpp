@@ -1,0 +1,400 @@
+// The distribution's name and version, from its release files.
+
+#include "sysdata/osInfo_linux.h"
+
+#include "tests/support/FakeFiles.h"
+
+#include <gtest/gtest.h>
+
+#include <cstring>
+#include <fcntl.h>
+#include <string>
+#include <sys/utsname.h>
+#include <unistd.h>
+#include <vector>
+
+namespace
+{
+
+using NQ::OsInfo;
+
+constexpr char const* vmwareCommand = " cat /etc/vmware-release  | tr -d '[:alpha:][:space:][()]'";
+constexpr char const* redhatCommand = "cat /etc/redhat-release  | tr -d '[:alpha:][:space:][()]'";
+constexpr char const* suseCommand =
+    "echo $(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 9)."
+    "$(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 12) | tr -d [:space:]";
+
+bool isOpen(int descriptor)
+{
+    return fcntl(descriptor, F_GETFD) != -1;
+}
+
+/** A machine with release files of its own, and commands that answer as they are told. */
+class ReleaseFiles : public testing::Test
+{
+protected:
+    std::string name()
+    {
+        std::string out = "before";
+        EXPECT_TRUE(OsInfo().getOSName(out));
+        return out;
+    }
+
+    /** The version, or "none" where there is none and the caller's text stayed. */
+    std::string version()
+    {
+        std::string out = "before";
+        if (OsInfo().getOSVersion(out))
+            return out;
+        EXPECT_EQ(out, "before");
+        return "none";
+    }
+
+    libc::HookGuard const guard_;
+    FakeFiles const files_;
+    libc::FakeCommands commands_;
+};
+
+class OSReleaseName : public ReleaseFiles
+{
+protected:
+    std::string of(std::string const& text)
+    {
+        files_.write("/etc/release", text);
+        std::string out = "before";
+        EXPECT_TRUE(OsInfo().getOSReleaseName("/etc/release", out));
+        return out;
+    }
+};
+
+TEST_F(OSReleaseName, IsTheFirstLineAsItIs)
+{
+    EXPECT_EQ(of("  Kesto Linux 10.2 \t\r\nsecond\n"), "  Kesto Linux 10.2 \t\r");
+    EXPECT_EQ(of("Kesto Linux"), "Kesto Linux");
+    EXPECT_EQ(of(std::string(5000, 'x') + "\n"), std::string(5000, 'x'));
+}
+
+TEST_F(OSReleaseName, IsEmptyForAnEmptyFirstLine)
+{
+    EXPECT_EQ(of("\nsecond\n"), "");
+}
+
+TEST_F(OSReleaseName, FailsAndLeavesTheCallersTextWithoutALine)
+{
+    std::string out = "before";
+    EXPECT_FALSE(OsInfo().getOSReleaseName("/etc/release", out));
+    files_.write("/etc/release", "");
+    EXPECT_FALSE(OsInfo().getOSReleaseName("/etc/release", out));
+    EXPECT_EQ(out, "before");
+}
+
+class OSName : public ReleaseFiles
+{
+};
+
+TEST_F(OSName, IsLinuxWithoutAReleaseFile)
+{
+    EXPECT_EQ(name(), "Linux");
+}
+
+TEST_F(OSName, ComesFromTheFirstReleaseFileThereIs)
+{
+    std::vector<std::string> const paths{"/etc/release", "/etc/vmware-release",
+                                         "/etc/redhat-release", "/etc/SuSE-release",
+                                         "/etc/UnitedLinux-release"};
+    for (std::string const& path : paths)
+        files_.write(path, "from " + path + "\n");
+    for (std::string const& path : paths) {
+        EXPECT_EQ(name(), "from " + path);
+        files_.remove(path);
+    }
+    EXPECT_EQ(name(), "Linux");
+}
+
+TEST_F(OSName, PassesOverAReleaseFileWithoutALine)
+{
+    files_.write("/etc/release", "");
+    files_.write("/etc/SuSE-release", "SUSE Linux\n");
+    EXPECT_EQ(name(), "SUSE Linux");
+}
+
+TEST_F(OSName, IsEmptyWhenTheFirstLineIs)
+{
+    files_.write("/etc/release", "\n");
+    EXPECT_EQ(name(), "");
+}
+
+class KestoVersion : public ReleaseFiles
+{
+protected:
+    /** The version, or "none" where there is none and the caller's text stayed. */
+    std::string of(std::string const& text)
+    {
+        files_.write("/etc/release", text);
+        std::string out = "before";
+        if (OsInfo().getKestoVersion("/etc/release", out))
+            return out;
+        EXPECT_EQ(out, "before");
+        return "none";
+    }
+};
+
+TEST_F(KestoVersion, JoinsTheSecondLinesAndTheThirdLinesNumber)
+{
+    EXPECT_EQ(of("Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2\n"), "10.2");
+    EXPECT_EQ(of("Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2"), "10.2");
+}
+
+TEST_F(KestoVersion, TakesNoNoticeOfTheFirstLine)
+{
+    EXPECT_EQ(of("\nVERSION = 10\nPATCHLEVEL = 2\n"), "10.2");
+    EXPECT_EQ(of("VERSION = 9\nVERSION = 10\nPATCHLEVEL = 2\nVERSION = 11\n"), "10.2");
+}
+
+TEST_F(KestoVersion, NeedsASecondLineOfMoreThan9Characters)
+{
+    EXPECT_EQ(of("Kesto\nVERSIO=10\nPATCHLEVEL = 2\n"), "none");
+    EXPECT_EQ(of("Kesto\nVERSION=10\nPATCHLEVEL = 2\n"), "10.2");
+}
+
+TEST_F(KestoVersion, NeedsAThirdLineOfAtLeast13Characters)
+{
+    EXPECT_EQ(of("Kesto\nVERSION = 10\nPATCHLEVEL=2\n"), "none");
+    EXPECT_EQ(of("Kesto\nVERSION = 10\nPATCHLEVEL= 2\n"), "10.2");
+}
+
+TEST_F(KestoVersion, CutsAtTheLastEqualsSign)
+{
+    EXPECT_EQ(of("Kesto\nVERSION = 9 = 10\nPATCHLEVEL = 1 = 2\n"), "10.2");
+}
+
+TEST_F(KestoVersion, TakesAWholeLineWithoutAnEqualsSign)
+{
+    EXPECT_EQ(of("Kesto\n VERSION: 10 \n PATCHLEVEL: 2 \n"), "VERSION: 10.PATCHLEVEL: 2");
+}
+
+TEST_F(KestoVersion, KeepsAllButOneOfTheBlanksOfABlankValue)
+{
+    EXPECT_EQ(of("Kesto\nVERSION  =   \nPATCHLEVEL   =\n"), "  .");
+}
+
+TEST_F(KestoVersion, FailsWithoutTheFileOrWithoutThreeLines)
+{
+    std::string out = "before";
+    EXPECT_FALSE(OsInfo().getKestoVersion("/etc/release", out));
+    EXPECT_EQ(out, "before");
+    EXPECT_EQ(of(""), "none");
+    EXPECT_EQ(of("Kesto Linux\n"), "none");
+    EXPECT_EQ(of("Kesto Linux\nVERSION = 10\n"), "none");
+}
+
+class OSVersion : public ReleaseFiles
+{
+protected:
+    OSVersion()
+    {
+        libc::hooks().uname = [this](utsname* system) {
+            ++unameCalls_;
+            std::strcpy(system->release, "6.1.0-37-amd64");
+            return unameFails_ ? -1 : 0;
+        };
+    }
+
+    void writeCommandFiles() const
+    {
+        for (char const* path : {"/etc/vmware-release", "/etc/redhat-release", "/etc/SuSE-release"})
+            files_.write(path, "a line\n");
+    }
+
+    bool unameFails_ = false;
+    int unameCalls_ = 0;
+};
+
+TEST_F(OSVersion, FailsWithoutAReleaseFile)
+{
+    EXPECT_EQ(version(), "none");
+    EXPECT_TRUE(commands_.ran.empty());
+    EXPECT_EQ(unameCalls_, 0);
+}
+
+TEST_F(OSVersion, IsThatOfTheKeyValueFileFirstOfAll)
+{
+    files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
+    writeCommandFiles();
+    files_.write("/etc/release", "Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2\n");
+    EXPECT_EQ(version(), "10.2");
+    EXPECT_EQ(unameCalls_, 0);
+    EXPECT_TRUE(commands_.ran.empty());
+}
+
+TEST_F(OSVersion, IsTheKernelsReleaseOnUnitedLinux)
+{
+    files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
+    writeCommandFiles();
+    EXPECT_EQ(version(), "6.1.0-37-amd64");
+    EXPECT_TRUE(commands_.ran.empty());
+}
+
+TEST_F(OSVersion, FailsOnUnitedLinuxWhenTheKernelDoesNotAnswer)
+{
+    files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
+    writeCommandFiles();
+    unameFails_ = true;
+    EXPECT_EQ(version(), "none");
+    EXPECT_EQ(unameCalls_, 1);
+    EXPECT_TRUE(commands_.ran.empty());
+}
+
+TEST_F(OSVersion, GoesOnToTheOtherFilesWhenAKeyValueLineIsTooShort)
+{
+    files_.write("/etc/release", "Kesto Linux\nVERSION = 10\nPATCHLEVEL=2\n");
+    files_.write("/etc/SuSE-release", "SUSE Linux Enterprise Server 11 (x86_64)\n");
+    commands_.answers[suseCommand] = "11.3";
+    EXPECT_EQ(version(), "11.3");
+}
+
+TEST_F(OSVersion, ComesFromTheCommandOfTheFirstFileThereIs)
+{
+    struct {
+        char const* path;
+        char const* command;
+    } const files[] = {{"/etc/vmware-release", vmwareCommand},
+                       {"/etc/redhat-release", redhatCommand},
+                       {"/etc/SuSE-release", suseCommand}};
+    writeCommandFiles();
+    for (auto const& file : files) {
+        commands_.answers = {{file.command, "5.4"}};
+        commands_.ran.clear();
+        EXPECT_EQ(version(), "5.4") << file.path;
+        EXPECT_EQ(commands_.ran, std::vector<std::string>{file.command});
+        files_.remove(file.path);
+    }
+    EXPECT_EQ(version(), "none");
+}
+
+TEST_F(OSVersion, IsCutAt9Characters)
+{
+    writeCommandFiles();
+    commands_.answers[vmwareCommand] = "123456789";
+    EXPECT_EQ(version(), "123456789");
+    commands_.answers[vmwareCommand] = "1234567890";
+    EXPECT_EQ(version(), "123456789");
+}
+
+TEST_F(OSVersion, IsOneLineWithItsEnd)
+{
+    writeCommandFiles();
+    commands_.answers[vmwareCommand] = "5.4\n6.0\n";
+    EXPECT_EQ(version(), "5.4\n");
+}
+
+TEST_F(OSVersion, FailsWhenTheCommandCannotBeStarted)
+{
+    writeCommandFiles();
+    EXPECT_EQ(version(), "none");
+    // The other files are not tried.
+    EXPECT_EQ(commands_.ran, std::vector<std::string>{vmwareCommand});
+}
+
+/** How the command's stream is treated; the stream is a file, so both ways of closing it work. */
+class OSVersionStream : public OSVersion
+{
+protected:
+    void answer(std::string const& text)
+    {
+        files_.write("/etc/redhat-release", "a line\n");
+        files_.write("/output", text);
+        libc::hooks().fopen = [this, below = libc::hooks().fopen](char const* path,
+                                                                  char const* mode) {
+            FILE* const stream = below(path, mode);
+            if (std::string(path) == "/etc/redhat-release")
+                probe_ = fileno(stream);
+            return stream;
+        };
+        libc::hooks().popen = [this](char const*, char const* mode) {
+            probeWasOpen_ = isOpen(probe_);
+            mode_ = mode;
+            FILE* const stream = libc::realFopen(files_.realPath("/output").c_str(), "r");
+            pipe_ = fileno(stream);
+            return stream;
+        };
+        libc::hooks().pclose = [this](FILE* stream) {
+            ++pcloseCalls_;
+            return std::fclose(stream);
+        };
+    }
+
+    int probe_ = -1;
+    bool probeWasOpen_ = true;
+    std::string mode_;
+    int pipe_ = -1;
+    int pcloseCalls_ = 0;
+};
+
+TEST_F(OSVersionStream, StartsOnceTheReleaseFileIsClosed)
+{
+    answer("5.4");
+    EXPECT_EQ(version(), "5.4");
+    EXPECT_NE(probe_, -1);
+    EXPECT_FALSE(probeWasOpen_);
+    EXPECT_EQ(mode_, "r");
+}
+
+TEST_F(OSVersionStream, IsClosedAsAFileAndNotAsACommand)
+{
+    answer("5.4");
+    EXPECT_EQ(version(), "5.4");
+    EXPECT_FALSE(isOpen(pipe_));
+    EXPECT_EQ(pcloseCalls_, 0);
+}
+
+TEST_F(OSVersionStream, IsLeftOpenWhenNothingCanBeRead)
+{
+    answer("");
+    EXPECT_EQ(version(), "none");
+    EXPECT_TRUE(isOpen(pipe_));
+    EXPECT_EQ(pcloseCalls_, 0);
+    close(pipe_);
+}
+
+/** Runs the real commands, turned to the files written here. */
+class OSVersionCommand : public ReleaseFiles
+{
+protected:
+    OSVersionCommand()
+    {
+        libc::hooks().pclose = nullptr;
+        libc::hooks().popen = [this](std::string command, char const* mode) {
+            std::string const folder = "/etc/";
+            for (auto at = command.find(folder); at != std::string::npos;
+                 at = command.find(folder, at)) {
+                command.replace(at, folder.size(), files_.realPath(folder));
+                at += files_.realPath(folder).size();
+            }
+            return libc::realPopen(command.c_str(), mode);
+        };
+    }
+};
+
+TEST_F(OSVersionCommand, LeavesTheDigitsAndPointsOfAVmwareFile)
+{
+    files_.write("/etc/vmware-release", "VMware ESX Server 3.5 (Dali)\n");
+    EXPECT_EQ(version(), "3.5");
+    files_.write("/etc/vmware-release", "VMware ESX Server 3.0.1 [Releasebuild-32039]\n");
+    EXPECT_EQ(version(), "3.0.1-320");
+}
+
+TEST_F(OSVersionCommand, LeavesTheDigitsAndPointsOfARedhatFile)
+{
+    files_.write("/etc/redhat-release", "Red Hat Enterprise Linux Server release 5.4 (Tikanga)\n");
+    EXPECT_EQ(version(), "5.4");
+}
+
+TEST_F(OSVersionCommand, JoinsTheNinthAndTheTwelfthWordOfASuseFile)
+{
+    files_.write("/etc/SuSE-release",
+                 "SUSE Linux Enterprise Server 10 (x86_64)\nVERSION = 10\nPATCHLEVEL = 2\n");
+    EXPECT_EQ(version(), "10.2");
+}
+
+} // namespace

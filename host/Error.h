@@ -36,6 +36,9 @@ public:
     /** A form for log messages: the status and, where there is one, the text. */
     operator std::string() const;
 
+    /** The reason alone, what a host reads; management interfaces do not call it. */
+    std::string getText() const;
+
 private:
     unsigned char status_;
     Number code_;

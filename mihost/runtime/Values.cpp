@@ -82,6 +82,11 @@ Error::operator std::string() const
     return form;
 }
 
+std::string Error::getText() const
+{
+    return text_;
+}
+
 Alert::Alert(unsigned int nodeId, std::string const& text) : nodeId_(nodeId), text_(text) {}
 
 Alert::Alert(Alert const& other) = default;

@@ -1,0 +1,89 @@
+#include "mihost/cli/Address.h"
+
+#include "mihost/cli/Failure.h"
+
+#include <algorithm>
+#include <charconv>
+#include <fmt/format.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+constexpr char forms[] =
+    "an id, mi, root, computer, os, log, user:NAME, group:NAME, driver:NAME or log:INDEX";
+
+bool parseId(std::string const& text, unsigned int& id)
+{
+    char const* const end = text.data() + text.size();
+    auto const [stop, problem] = std::from_chars(text.data(), end, id);
+    return problem == std::errc() && stop == end;
+}
+
+std::string nameOf(IC::MutableNode const& node, NodeKind const& kind)
+{
+    auto const properties = node.getProperties();
+    auto const found = properties.find(kind.nameProperty);
+    return found == properties.end() ? "" : static_cast<std::string>(found->second);
+}
+
+bool matches(Address const& address, IC::MutableNode const& node)
+{
+    if (!address.kind)
+        return node.getNodeId() == address.id;
+    if (node.getNodeType() != address.kind->type)
+        return false;
+    return address.kind->single || nameOf(node, *address.kind) == address.name;
+}
+
+} // namespace
+
+Address parseAddress(std::string const& text)
+{
+    unsigned int id = 0;
+    if (parseId(text, id))
+        return {nullptr, id, ""};
+    std::size_t const colon = text.find(':');
+    bool const single = colon == std::string::npos;
+    std::string const word = text.substr(0, colon);
+    for (NodeKind const& kind : nodeKinds())
+        if (kind.single == single && kind.address == word)
+            return {&kind, 0, single ? "" : text.substr(colon + 1)};
+    throw Failure(NotFound, fmt::format("no node '{}': a node is {}", text, forms));
+}
+
+std::vector<IC::MutableNode*> nodesOf(IC::ManagementInterface& interface)
+{
+    std::vector<IC::Node*> all;
+    interface.getMap(all);
+    std::vector<IC::MutableNode*> nodes;
+    nodes.reserve(all.size());
+    for (IC::Node* const node : all)
+        if (auto* const known = dynamic_cast<IC::MutableNode*>(node))
+            nodes.push_back(known);
+    return nodes;
+}
+
+IC::MutableNode& findNode(std::vector<IC::MutableNode*> const& nodes, std::string const& address)
+{
+    Address const wanted = parseAddress(address);
+    auto const found = std::find_if(nodes.begin(), nodes.end(),
+                                    [&wanted](auto const* node) { return matches(wanted, *node); });
+    if (found == nodes.end())
+        throw Failure(
+            NotFound,
+            fmt::format("no node '{}' in the tree; 'mihost tree' shows all of them", address));
+    return **found;
+}
+
+std::string addressOf(IC::MutableNode const& node)
+{
+    NodeKind const* const kind = findKind(node.getNodeType());
+    if (!kind)
+        return std::to_string(node.getNodeId());
+    return kind->single ? kind->address : fmt::format("{}:{}", kind->address, nameOf(node, *kind));
+}
+
+} // namespace mihost

@@ -1,0 +1,47 @@
+#include "mihost/cli/CommandLine.h"
+
+#include "mihost/cli/Failure.h"
+
+#include <CLI/Config.hpp>
+#include <CLI/Formatter.hpp>
+#include <fmt/format.h>
+
+namespace mihost
+{
+
+void CommandLine::parse(int argc, char** argv)
+{
+    CLI::App app("Loads the management-interface plug-in, shows its tree and drives it.", "mihost");
+    app.fallthrough();
+    app.set_help_all_flag("--help-all", "help for every command");
+    app.add_option("--plugin", options_.plugin, "load this plug-in file")->type_name("FILE");
+    app.add_option("--trace", options_.trace,
+                   "write every log message to FILE, - for standard error")
+        ->type_name("FILE");
+    app.add_flag("--json", options_.json, "print JSON");
+    app.add_flag("--show-secrets", options_.showSecrets, "show password hashes");
+    app.require_subcommand(0, 1);
+
+    for (CommandRow const& row : commands()) {
+        all_.push_back(row.make());
+        all_.back()->declare(*app.add_subcommand(row.name, row.summary));
+    }
+    try {
+        app.parse(argc, argv);
+    } catch (CLI::CallForHelp const&) {
+        app.exit(CLI::CallForHelp());
+        return;
+    } catch (CLI::CallForAllHelp const&) {
+        app.exit(CLI::CallForAllHelp());
+        return;
+    } catch (CLI::ParseError const& error) {
+        throw Failure(BadUsage, fmt::format("{} (mihost --help tells more)", error.what()));
+    }
+    auto const chosen = app.get_subcommands();
+    std::string const name = chosen.empty() ? "tree" : chosen.front()->get_name();
+    for (std::size_t at = 0; at < all_.size(); ++at)
+        if (commands()[at].name == name)
+            command_ = all_[at].get();
+}
+
+} // namespace mihost

@@ -1,0 +1,35 @@
+#ifndef MIHOST_CLI_FAILURE_H
+#define MIHOST_CLI_FAILURE_H
+
+#include <stdexcept>
+#include <string>
+
+namespace mihost
+{
+
+enum ExitCode {
+    Done = 0,
+    PluginRefused = 1, // the plug-in answered with a non-zero status
+    BadUsage = 2,      // wrong usage or refused input
+    NoPlugin = 3,      // the plug-in cannot be loaded
+    NotFound = 4       // no such node or property
+};
+
+/** Ends a command: what went wrong, on one line, and what the program then exits with. */
+class Failure : public std::runtime_error
+{
+public:
+    Failure(ExitCode code, std::string const& message) : std::runtime_error(message), code_(code) {}
+
+    ExitCode code() const
+    {
+        return code_;
+    }
+
+private:
+    ExitCode code_;
+};
+
+} // namespace mihost
+
+#endif

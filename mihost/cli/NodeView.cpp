@@ -1,0 +1,134 @@
+#include "mihost/cli/NodeView.h"
+
+#include "mihost/cli/Address.h"
+#include "mihost/cli/Failure.h"
+
+#include <charconv>
+#include <fmt/format.h>
+#include <fmt/ranges.h>
+#include <set>
+
+namespace mihost
+{
+
+namespace
+{
+
+bool isHidden(Property const* row, IC::PropertyValue const& value, Secrets secrets)
+{
+    if (!row)
+        return false;
+    if (row->has(Property::Secret))
+        return secrets == Secrets::Hide;
+    // A plain password is shown to nobody, whatever is asked for.
+    return row->has(Property::MayBeSecret) &&
+           static_cast<std::string>(value).find("Password") != std::string::npos;
+}
+
+PropertyView view(NodeKind const* kind, unsigned int id, IC::PropertyValue const& value,
+                  Secrets secrets)
+{
+    Property const* const row = kind ? findProperty(*kind, id) : nullptr;
+    return {id, row, value, isHidden(row, value, secrets)};
+}
+
+IC::PropertyValue emptyValue()
+{
+    return {IC::PropertyValue::EmptyKind, true};
+}
+
+/** The ids that a node stores or answers live, ascending. */
+std::set<unsigned int> idsOf(IC::MutableNode const& node)
+{
+    std::set<unsigned int> ids;
+    for (auto const& [id, value] : node.getProperties())
+        ids.insert(id);
+    if (NodeKind const* const kind = findKind(node.getNodeType()))
+        for (Property const& row : kind->properties)
+            if (row.has(Property::Live))
+                ids.insert(row.id);
+    return ids;
+}
+
+} // namespace
+
+NodeView storedView(IC::MutableNode const& node, Secrets secrets)
+{
+    NodeKind const* const kind = findKind(node.getNodeType());
+    auto const stored = node.getProperties();
+    NodeView result{&node, {}};
+    for (unsigned int const id : idsOf(node)) {
+        auto const found = stored.find(id);
+        if (found != stored.end()) {
+            result.properties.push_back(view(kind, id, found->second, secrets));
+            continue;
+        }
+        IC::PropertyValue value = emptyValue();
+        if (node.getProperty(id, value).getStatus() == 0)
+            result.properties.push_back(view(kind, id, value, secrets));
+    }
+    return result;
+}
+
+NodeView liveView(IC::MutableNode const& node, Secrets secrets)
+{
+    NodeKind const* const kind = findKind(node.getNodeType());
+    NodeView result{&node, {}};
+    for (unsigned int const id : idsOf(node)) {
+        IC::PropertyValue value = emptyValue();
+        if (node.getProperty(id, value).getStatus() == 0)
+            result.properties.push_back(view(kind, id, value, secrets));
+    }
+    return result;
+}
+
+NodeView liveView(IC::MutableNode const& node, std::vector<std::string> const& names,
+                  Secrets secrets)
+{
+    NodeKind const* const kind = findKind(node.getNodeType());
+    NodeView result{&node, {}};
+    for (std::string const& name : names) {
+        unsigned int const id = propertyId(node, name);
+        IC::PropertyValue value = emptyValue();
+        IC::Error const error = node.getProperty(id, value);
+        if (error.getStatus() != 0)
+            throw Failure(PluginRefused,
+                          fmt::format("property '{}' of node '{}': {}", name, addressOf(node),
+                                      static_cast<std::string>(error)));
+        result.properties.push_back(view(kind, id, value, secrets));
+    }
+    return result;
+}
+
+unsigned int propertyId(IC::MutableNode const& node, std::string const& name)
+{
+    NodeKind const* const kind = findKind(node.getNodeType());
+    if (Property const* const row = kind ? findProperty(*kind, name) : nullptr)
+        return row->id;
+    unsigned int id = 0;
+    char const* const end = name.data() + name.size();
+    auto const [stop, problem] = std::from_chars(name.data(), end, id);
+    bool const isId = problem == std::errc() && stop == end;
+    if (isId && ((kind && findProperty(*kind, id)) || node.getProperties().count(id) != 0))
+        return id;
+    std::vector<std::string> known;
+    for (unsigned int const each : idsOf(node)) {
+        Property const* const row = kind ? findProperty(*kind, each) : nullptr;
+        known.push_back(row ? row->name : std::to_string(each));
+    }
+    throw Failure(NotFound,
+                  fmt::format("node '{}' has no property '{}'; it has {}", addressOf(node), name,
+                              known.empty() ? "none" : fmt::format("{}", fmt::join(known, ", "))));
+}
+
+std::string valueText(PropertyView const& property)
+{
+    return property.hidden ? "(hidden)" : static_cast<std::string>(property.value);
+}
+
+std::string nameOf(PropertyView const& property)
+{
+    return property.row ? property.row->name : std::to_string(property.id);
+}
+
+} // namespace mihost

@@ -1,0 +1,19 @@
+#ifndef MIHOST_CLI_OPTIONS_H
+#define MIHOST_CLI_OPTIONS_H
+
+#include <string>
+
+namespace mihost
+{
+
+/** What stands before the command and holds for all of them. */
+struct Options {
+    std::string plugin; // empty for the one that was installed with this program
+    std::string trace;  // empty for none, "-" for standard error
+    bool json = false;
+    bool showSecrets = false;
+};
+
+} // namespace mihost
+
+#endif

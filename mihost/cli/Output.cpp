@@ -1,0 +1,46 @@
+#include "mihost/cli/Output.h"
+
+#include "mihost/cli/Failure.h"
+
+#include <cerrno>
+#include <cstring>
+#include <fmt/format.h>
+#include <unistd.h>
+
+namespace mihost
+{
+
+Output::Output(std::FILE* stream) : stream_(stream), terminal_(isatty(fileno(stream)) == 1) {}
+
+void Output::write(std::string_view text)
+{
+    if (std::fwrite(text.data(), 1, text.size(), stream_) != text.size())
+        fail();
+}
+
+void Output::line(std::string_view text)
+{
+    write(text);
+    write("\n");
+}
+
+void Output::json(Json const& document)
+{
+    line(document.dump());
+}
+
+void Output::flush()
+{
+    if (std::fflush(stream_) != 0)
+        fail();
+}
+
+void Output::fail()
+{
+    int const problem = errno;
+    if (problem == EPIPE)
+        throw OutputClosed();
+    throw Failure(BadUsage, fmt::format("cannot write the output: {}", std::strerror(problem)));
+}
+
+} // namespace mihost

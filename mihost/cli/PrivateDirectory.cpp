@@ -1,0 +1,45 @@
+#include "mihost/cli/PrivateDirectory.h"
+
+#include "mihost/cli/Failure.h"
+
+#include <cerrno>
+#include <cstdlib>
+#include <cstring>
+#include <fcntl.h>
+#include <filesystem>
+#include <fmt/format.h>
+#include <unistd.h>
+
+namespace mihost
+{
+
+PrivateDirectory::PrivateDirectory() : previous_(-1)
+{
+    char const* const parent = std::getenv("TMPDIR");
+    path_ = std::string(parent && *parent ? parent : "/tmp") + "/mihost-XXXXXX";
+    if (!mkdtemp(path_.data()))
+        throw Failure(NoPlugin, fmt::format("cannot make a private directory '{}': {}", path_,
+                                            std::strerror(errno)));
+    previous_ = open(".", O_PATH | O_DIRECTORY | O_CLOEXEC);
+    if (chdir(path_.c_str()) != 0) {
+        int const problem = errno;
+        rmdir(path_.c_str());
+        throw Failure(NoPlugin, fmt::format("cannot enter the private directory '{}': {}", path_,
+                                            std::strerror(problem)));
+    }
+}
+
+PrivateDirectory::~PrivateDirectory()
+{
+    // Where the way back is gone, the root serves: a directory that is stood in stays around.
+    if (previous_ < 0 || fchdir(previous_) != 0) {
+        if (chdir("/") != 0)
+            std::perror("mihost: chdir");
+    }
+    if (previous_ >= 0)
+        close(previous_);
+    std::error_code ignored;
+    std::filesystem::remove_all(path_, ignored);
+}
+
+} // namespace mihost

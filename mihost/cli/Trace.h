@@ -1,0 +1,37 @@
+#ifndef MIHOST_CLI_TRACE_H
+#define MIHOST_CLI_TRACE_H
+
+#include "mihost/runtime/Sinks.h"
+
+#include <cstdio>
+#include <string>
+
+namespace mihost
+{
+
+/** The --trace file: takes the runtime's messages for as long as it lives. */
+class Trace
+{
+public:
+    /**
+     * @param file  a path, or "-" for standard error
+     * @throws Failure where the file cannot be opened for writing
+     */
+    explicit Trace(std::string const& file);
+    ~Trace();
+    Trace(Trace const&) = delete;
+    Trace& operator=(Trace const&) = delete;
+
+    /** @throws Failure where something could not be written */
+    void finish();
+
+private:
+    std::string file_;
+    std::FILE* stream_;
+    LineWriter writer_;
+    JsonLines lines_;
+};
+
+} // namespace mihost
+
+#endif

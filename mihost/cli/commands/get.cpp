@@ -1,0 +1,43 @@
+#include "mihost/cli/PropertyText.h"
+#include "mihost/cli/Session.h"
+#include "mihost/cli/commands/makers.h"
+
+namespace mihost
+{
+
+namespace
+{
+
+class Get : public Command
+{
+public:
+    void declare(CLI::App& app) override
+    {
+        app.add_option("NODE", address_, "an id, or a name such as os or user:root")->required();
+        app.add_option("PROPERTY", names_, "ids or names; all of them where none is given");
+    }
+
+    void run(Session& session) override
+    {
+        IC::MutableNode const& node = findNode(session.nodes(), address_);
+        NodeView const view = names_.empty() ? liveView(node, session.secrets())
+                                             : liveView(node, names_, session.secrets());
+        if (session.options().json)
+            session.out().json(toJson(view));
+        else
+            writeProperties(view.properties, "", session.out());
+    }
+
+private:
+    std::string address_;
+    std::vector<std::string> names_;
+};
+
+} // namespace
+
+std::unique_ptr<Command> commandMakers::get()
+{
+    return std::make_unique<Get>();
+}
+
+} // namespace mihost

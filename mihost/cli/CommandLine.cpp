@@ -18,6 +18,10 @@ void CommandLine::parse(int argc, char** argv)
     app.add_option("--trace", options_.trace,
                    "write every log message to FILE, - for standard error")
         ->type_name("FILE");
+    app.add_flag("--sandbox", options_.sandbox,
+                 "run everything in a copy of this machine; nothing on the machine changes");
+    app.add_option("--overlay", options_.overlay, "lay the files of DIR over the sandbox first")
+        ->type_name("DIR");
     app.add_flag("--json", options_.json, "print JSON");
     app.add_flag("--show-secrets", options_.showSecrets, "show password hashes");
     app.require_subcommand(0, 1);
@@ -37,6 +41,7 @@ void CommandLine::parse(int argc, char** argv)
     } catch (CLI::ParseError const& error) {
         throw Failure(BadUsage, fmt::format("{} (mihost --help tells more)", error.what()));
     }
+    options_.sandbox = options_.sandbox || !options_.overlay.empty();
     auto const chosen = app.get_subcommands();
     std::string const name = chosen.empty() ? "tree" : chosen.front()->get_name();
     for (std::size_t at = 0; at < all_.size(); ++at)

@@ -8,8 +8,10 @@ namespace mihost
 
 /** What stands before the command and holds for all of them. */
 struct Options {
-    std::string plugin; // empty for the one that was installed with this program
-    std::string trace;  // empty for none, "-" for standard error
+    std::string plugin;  // empty for the one that was installed with this program
+    std::string trace;   // empty for none, "-" for standard error
+    std::string overlay; // a folder to lay over the sandbox; empty for none
+    bool sandbox = false;
     bool json = false;
     bool showSecrets = false;
 };

@@ -8,7 +8,6 @@
 #include <clocale>
 #include <csignal>
 #include <fmt/format.h>
-#include <sys/stat.h>
 
 namespace mihost
 {
@@ -41,7 +40,6 @@ int runProgram(int argc, char** argv)
     // A reader that goes early is an error of writing, not the end. A handler rather than SIG_IGN,
     // which the commands would inherit.
     std::signal(SIGPIPE, ignoreSignal);
-    umask(077);
 
     CommandLine line;
     if (int const code = guarded([&] { line.parse(argc, argv); }); code != Done || !line.command())

@@ -18,7 +18,11 @@ namespace mihost
 class Session
 {
 public:
-    /** @throws Failure where the trace cannot be written */
+    /**
+     * Opens the trace and, where that is asked for, goes on in a sandbox.
+     *
+     * @throws Failure where one of them cannot be had
+     */
     explicit Session(Options options);
 
     /** Takes the plug-in down. @throws Failure where the trace or the output was cut short */

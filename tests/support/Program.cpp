@@ -1,0 +1,73 @@
+#include "tests/support/Program.h"
+
+#include <array>
+#include <cstdio>
+#include <memory>
+#include <stdexcept>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace
+{
+
+struct CloseFile {
+    void operator()(std::FILE* file) const
+    {
+        std::fclose(file);
+    }
+};
+
+// Files rather than pipes: nobody waits for the other whatever is written in whatever order.
+using File = std::unique_ptr<std::FILE, CloseFile>;
+
+File fileOf(std::string const& text)
+{
+    File file(std::tmpfile());
+    if (!file || std::fwrite(text.data(), 1, text.size(), file.get()) != text.size())
+        throw std::runtime_error("cannot write a temporary file");
+    std::rewind(file.get());
+    return file;
+}
+
+std::string textOf(File const& file)
+{
+    std::rewind(file.get());
+    std::string text;
+    std::array<char, 4096> block{};
+    while (std::size_t const length = std::fread(block.data(), 1, block.size(), file.get()))
+        text.append(block.data(), length);
+    return text;
+}
+
+} // namespace
+
+Outcome runToEnd(std::vector<std::string> const& arguments, std::string const& input)
+{
+    File const in = fileOf(input);
+    File const out = fileOf("");
+    File const err = fileOf("");
+    std::vector<char*> list;
+    for (std::string const& argument : arguments)
+        list.push_back(const_cast<char*>(argument.c_str()));
+    list.push_back(nullptr);
+
+    pid_t const child = fork();
+    if (child == 0) {
+        dup2(fileno(in.get()), STDIN_FILENO);
+        dup2(fileno(out.get()), STDOUT_FILENO);
+        dup2(fileno(err.get()), STDERR_FILENO);
+        execv(list[0], list.data());
+        _exit(127);
+    }
+    int status = 0;
+    if (child < 0 || waitpid(child, &status, 0) != child)
+        throw std::runtime_error("cannot run " + arguments.at(0));
+    int const code = WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
+    return {code, textOf(out), textOf(err)};
+}
+
+Outcome mihostRun(std::vector<std::string> arguments, std::string const& input)
+{
+    arguments.insert(arguments.begin(), MIHOST_FILE);
+    return runToEnd(arguments, input);
+}

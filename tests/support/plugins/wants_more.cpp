@@ -1,0 +1,8 @@
+// A plug-in that wants something of its host which no host of this contract has.
+
+extern "C" int hostOperationFromTheFuture();
+
+extern "C" int OpenMI(void**, void**)
+{
+    return hostOperationFromTheFuture();
+}

@@ -1,0 +1,108 @@
+#include "mihost/cli/Json.h"
+
+#include <gtest/gtest.h>
+
+namespace
+{
+
+using IC::Number;
+using IC::PropertyValue;
+using mihost::Secrets;
+
+std::string dumped(IC::MutableNode const& node, Secrets secrets = Secrets::Hide)
+{
+    return toJson(mihost::storedView(node, secrets)).dump();
+}
+
+TEST(NodeAsJson, HasItsKeysInOrderAndItsPropertiesById)
+{
+    IC::MutableNode node(4, 3, {1}, 17, 0);
+    node.setStatus(1);
+    node.setDescription("Operating System");
+    node.setProperty(108, PropertyValue("Linux", true));
+    auto const json = toJson(mihost::storedView(node, Secrets::Hide));
+    std::string const start = R"({"id":4,"parent":3,"type":17,"kind":"os","index":0,"status":1,)"
+                              R"("description":"Operating System","mi_ids":[1],"properties":{)";
+    EXPECT_EQ(json.dump().substr(0, start.size()), start);
+    EXPECT_EQ(json["properties"]["108"].dump(),
+              R"({"name":"os-name","kind":"text","flag":true,"value":"Linux"})");
+}
+
+TEST(NodeAsJson, NamesEachKind)
+{
+    struct Row {
+        unsigned int type;
+        char const* kind;
+    };
+    for (Row const& row : {Row{39, "mi"}, Row{59, "root"}, Row{40, "computer"}, Row{17, "os"},
+                           Row{44, "driver"}, Row{46, "user"}, Row{51, "group"}, Row{35, "log"},
+                           Row{47, "log-entry"}, Row{99, "unknown"}}) {
+        IC::MutableNode const node(4, 3, {1}, row.type, 0);
+        EXPECT_EQ(toJson(mihost::storedView(node, Secrets::Hide))["kind"], row.kind);
+    }
+}
+
+TEST(NodeAsJson, WritesEachKindOfValueAsItsOwnJsonType)
+{
+    IC::MutableNode node(4, 3, {1}, 99, 0);
+    unsigned int id = 0;
+    for (PropertyValue const& value :
+         {PropertyValue("a", true), PropertyValue(Number(4294967295U), true),
+          PropertyValue(Number(true), true), PropertyValue(Number(-5L, 0), true),
+          PropertyValue(IC::EnumValue(7U), false),
+          PropertyValue(std::vector<Number>{Number(0U), Number(24U)}, true),
+          PropertyValue(std::vector<std::string>{"x", "y"}, true),
+          PropertyValue(PropertyValue::EmptyKind, true)})
+        node.setProperty(++id, value);
+    EXPECT_EQ(toJson(mihost::storedView(node, Secrets::Hide))["properties"].dump(),
+              R"({"1":{"name":null,"kind":"text","flag":true,"value":"a"},)"
+              R"("2":{"name":null,"kind":"number","flag":true,"value":4294967295},)"
+              R"("3":{"name":null,"kind":"boolean","flag":true,"value":true},)"
+              R"("4":{"name":null,"kind":"date","flag":true,"value":-5},)"
+              R"("5":{"name":null,"kind":"enumeration","flag":false,"value":7},)"
+              R"("6":{"name":null,"kind":"numbers","flag":true,"value":[0,24]},)"
+              R"("7":{"name":null,"kind":"texts","flag":true,"value":["x","y"]},)"
+              R"("8":{"name":null,"kind":"empty","flag":true,"value":null}})");
+}
+
+TEST(NodeAsJson, WritesBytesThatAreNoUtf8InHex)
+{
+    IC::MutableNode node(4, 3, {1}, 99, 0);
+    node.setDescription("J\xFCrgen");
+    node.setProperty(1, PropertyValue("\xFF", true));
+    auto const json = nlohmann::json::parse(dumped(node));
+    EXPECT_EQ(json["description"], "J\\xfcrgen");
+    EXPECT_EQ(json["properties"]["1"]["value"], "\\xff");
+}
+
+TEST(NodeAsJson, HidesPasswordHashesUntilTheyAreAskedFor)
+{
+    IC::MutableNode node(5, 4, {1}, 46, 1);
+    node.setProperty(117, PropertyValue("$6$hash", true));
+    auto const hidden = toJson(mihost::storedView(node, Secrets::Hide));
+    EXPECT_EQ(hidden["properties"]["117"].dump(),
+              R"({"name":"password","kind":"text","flag":true,"value":null,"hidden":true})");
+    auto const shown = toJson(mihost::storedView(node, Secrets::Show));
+    EXPECT_EQ(shown["properties"]["117"].dump(),
+              R"({"name":"password","kind":"text","flag":true,"value":"$6$hash"})");
+}
+
+TEST(NodeAsJson, NeverShowsAMethodCallThatHoldsAPassword)
+{
+    IC::MutableNode node(4, 3, {1}, 17, 0);
+    node.setProperty(74, PropertyValue("UserAdd,Password:CMPI_string:pw", true));
+    for (Secrets const secrets : {Secrets::Hide, Secrets::Show})
+        EXPECT_TRUE(toJson(mihost::storedView(node, secrets))["properties"]["74"]["hidden"]);
+    node.setProperty(74, PropertyValue("UserDel,UserName:CMPI_string:jdoe", true));
+    EXPECT_EQ(toJson(mihost::storedView(node, Secrets::Hide))["properties"]["74"]["value"],
+              "UserDel,UserName:CMPI_string:jdoe");
+}
+
+TEST(ErrorAsJson, IsStatusAndText)
+{
+    EXPECT_EQ(mihost::toJson(IC::Error(0, Number(0U), "")).dump(), R"({"status":0,"text":""})");
+    EXPECT_EQ(mihost::toJson(IC::Error(1, Number(0U), "no: \xFF")).dump(),
+              R"({"status":1,"text":"no: \\xff"})");
+}
+
+} // namespace

@@ -1,0 +1,70 @@
+#include "mihost/runtime/Text.h"
+
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+
+namespace
+{
+
+using mihost::jsonString;
+using mihost::printable;
+using mihost::validUtf8;
+
+TEST(Printable, LeavesOrdinaryTextInAnyScriptAlone)
+{
+    EXPECT_EQ(printable("Jürgen 李 ~ \\ \""), "Jürgen 李 ~ \\ \"");
+}
+
+TEST(Printable, WritesControlCharactersAsEscapes)
+{
+    EXPECT_EQ(printable("a\nb\tc\rd\x1b[31me\x7f"), "a\\nb\\tc\\rd\\x1b[31me\\x7f");
+    EXPECT_EQ(printable(std::string("\0", 1)), "\\x00");
+}
+
+TEST(Printable, WritesControlCharactersBeyondAsciiAsEscapes)
+{
+    EXPECT_EQ(printable("\xC2\x9B" // the one-character form of ESC [
+                        "31m"),
+              "\\u009b31m");
+}
+
+TEST(Printable, WritesCharactersThatTurnTheLineAroundAsEscapes)
+{
+    EXPECT_EQ(printable("a\u202Eb\u2066c\u2028d\u200Ee"), "a\\u202eb\\u2066c\\u2028d\\u200ee");
+    EXPECT_EQ(printable("\U000E0041"), "\\U000e0041");
+}
+
+TEST(Printable, WritesEachByteThatIsNoUtf8InHex)
+{
+    EXPECT_EQ(printable("J\xFCrgen\xFF"), "J\\xfcrgen\\xff");
+}
+
+TEST(ValidUtf8, LeavesControlCharactersAlone)
+{
+    EXPECT_EQ(validUtf8("a\n\x1b"), "a\n\x1b");
+}
+
+TEST(ValidUtf8, TakesNoOverlongFormsNoSurrogatesAndNothingBeyondTheLastCharacter)
+{
+    EXPECT_EQ(validUtf8("\xC0\xAF"), "\\xc0\\xaf");
+    EXPECT_EQ(validUtf8("\xE0\x80\xAF"), "\\xe0\\x80\\xaf");
+    EXPECT_EQ(validUtf8("\xED\xA0\x80"), "\\xed\\xa0\\x80");
+    EXPECT_EQ(validUtf8("\xF4\x90\x80\x80"), "\\xf4\\x90\\x80\\x80");
+    EXPECT_EQ(validUtf8("\xF4\x8F\xBF\xBF"), "\xF4\x8F\xBF\xBF");
+}
+
+TEST(ValidUtf8, TakesNoSequenceThatIsCutShort)
+{
+    EXPECT_EQ(validUtf8("\xE6\x9D"), "\\xe6\\x9d");
+    EXPECT_EQ(validUtf8("\xE6\x9Dx"), "\\xe6\\x9dx");
+}
+
+TEST(JsonString, ReadsBackAsTheTextWhateverBytesItHolds)
+{
+    std::string all;
+    for (int byte = 0; byte < 256; ++byte)
+        all += static_cast<char>(byte);
+    EXPECT_EQ(nlohmann::json::parse(jsonString(all)).get<std::string>(), validUtf8(all));
+}
+
+} // namespace

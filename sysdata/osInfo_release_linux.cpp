@@ -54,6 +54,21 @@ constexpr ReleaseFile versionFiles[] = {
 constexpr char const* nameFiles[] = {"/etc/release", "/etc/vmware-release", "/etc/redhat-release",
                                      "/etc/SuSE-release", "/etc/UnitedLinux-release"};
 
+/**
+ * The time in a line of stat, such as "Change: 2010-05-12 10:23:45.000000000 +0200". The fraction
+ * and the zone are passed over.
+ *
+ * @param line  changed in place
+ */
+long changeTime(OsInfo& info, char* line)
+{
+    info.strreplace(line, '-', ' ');
+    info.strreplace(line, ':', ' ');
+    int year = 0, month = 0, day = 0, hour = 0, minute = 0, second = 0;
+    std::sscanf(line, "Change  %d %d %d %d %d %d\n", &year, &month, &day, &hour, &minute, &second);
+    return static_cast<long>(ito_time_t(year, month, day, 0, hour, minute, second, -1));
+}
+
 } // namespace
 
 bool OsInfo::getInstallDate(long& out)
@@ -61,24 +76,18 @@ bool OsInfo::getInstallDate(long& out)
     LOG::Scope const scope(facts);
     out = 0;
     for (ReleaseFile const& candidate : installDateFiles) {
-        FILE* probe = std::fopen(candidate.path, "r");
-        if (!probe)
-            continue;
-        FILE* pipe = popen(candidate.command, "r");
-        std::fclose(probe);
-        if (!pipe)
-            return true;
-        char line[1024];
-        if (std::fgets(line, sizeof line, pipe)) {
-            strreplace(line, '-', ' ');
-            strreplace(line, ':', ' ');
-            int year = 0, month = 0, day = 0, hour = 0, minute = 0, second = 0;
-            std::sscanf(line, "Change  %d %d %d %d %d %d\n", &year, &month, &day, &hour, &minute,
-                        &second);
-            out = static_cast<long>(ito_time_t(year, month, day, 0, hour, minute, second, -1));
+        MyProcess process;
+        FILE* output = nullptr;
+        {
+            FILES::File const probe(candidate.path, "r");
+            if (!probe.stream())
+                continue;
+            output = process.mypopen(candidate.command, "r");
         }
-        pclose(pipe);
-        return true;
+        char line[1024];
+        if (output && std::fgets(line, sizeof line, output))
+            out = changeTime(*this, line);
+        break;
     }
     return true;
 }

@@ -101,7 +101,8 @@ void makeFolder(std::string const& path, mode_t mode)
 void layFolder(Descriptor const& folder, std::string const& path)
 {
     for (std::string const& name : namesIn(folder, path)) {
-        std::string const place = path + "/" + name;
+        std::string place = path;
+        place.append("/").append(name);
         struct stat status {
         };
         check(fstatat(folder.get(), name.c_str(), &status, AT_SYMLINK_NOFOLLOW),

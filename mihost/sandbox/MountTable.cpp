@@ -1,5 +1,6 @@
 #include "mihost/sandbox/MountTable.h"
 
+#include <algorithm>
 #include <set>
 #include <sstream>
 
@@ -9,14 +10,21 @@ namespace mihost
 namespace
 {
 
+bool isOctal(char character)
+{
+    return character >= '0' && character <= '7';
+}
+
 /** Blanks, tabs, newlines and backslashes stand as \ooo in the table. */
 std::string unescaped(std::string const& text)
 {
     std::string plain;
     for (std::size_t at = 0; at < text.size(); ++at) {
-        if (text[at] == '\\' && text.size() - at > 3) {
-            plain.push_back(static_cast<char>(std::stoi(text.substr(at + 1, 3), nullptr, 8)));
-            at += 3;
+        std::string const digits = text.substr(at + 1, 3);
+        if (text[at] == '\\' && digits.size() == 3 &&
+            std::all_of(digits.begin(), digits.end(), isOctal)) {
+            plain.push_back(static_cast<char>(std::stoi(digits, nullptr, 8)));
+            at += digits.size();
         } else {
             plain.push_back(text[at]);
         }

@@ -72,8 +72,7 @@ void record(std::string const& program)
 {
     expectSandbox();
     if (!fs::exists(notes)) {
-        std::ofstream{notes};
-        chmod(notes, 0666);
+        write(notes, "", 0666);
     }
     fs::rename(program, program + ".real");
     fs::copy_file(RECORDER_FILE, program);

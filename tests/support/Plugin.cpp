@@ -3,6 +3,7 @@
 #include "host/OpenMI.h"
 #include "nodes/ids.h"
 
+#include <algorithm>
 #include <dlfcn.h>
 #include <stdexcept>
 
@@ -53,9 +54,9 @@ std::vector<IC::MutableNode*> Plugin::nodes() const
 {
     std::vector<IC::Node*> all;
     interface_->getMap(all);
-    std::vector<IC::MutableNode*> found;
-    for (IC::Node* node : all)
-        found.push_back(dynamic_cast<IC::MutableNode*>(node));
+    std::vector<IC::MutableNode*> found(all.size());
+    std::transform(all.begin(), all.end(), found.begin(),
+                   [](IC::Node* node) { return dynamic_cast<IC::MutableNode*>(node); });
     return found;
 }
 

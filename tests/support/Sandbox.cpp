@@ -23,20 +23,20 @@ private:
     std::string reason_;
 };
 
-bool isRequired()
+} // namespace
+
+bool sandboxIsRequired()
 {
     char const* const required = std::getenv("MI_SANDBOX_REQUIRED");
     return required && std::string(required) == "1";
 }
-
-} // namespace
 
 int runTestsInSandbox(int argc, char* argv[])
 {
     testing::InitGoogleTest(&argc, argv);
     if (!testing::GTEST_FLAG(list_tests)) {
         if (auto const reason = mihost::enterSandbox({})) {
-            if (isRequired()) {
+            if (sandboxIsRequired()) {
                 std::cerr << "no sandbox: " << *reason << '\n';
                 return EXIT_FAILURE;
             }

@@ -9,4 +9,7 @@
  */
 int runTestsInSandbox(int argc, char* argv[]);
 
+/** Whether tests that cannot have a copy fail rather than being skipped. */
+bool sandboxIsRequired();
+
 #endif

@@ -1,0 +1,140 @@
+#include "tests/sandbox/border/Caller.h"
+
+#include "tests/support/Sandbox.h"
+
+#include <csignal>
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <sys/stat.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace
+{
+constexpr int refused = 99;
+}
+
+int Caller::speaker = -1;
+
+Caller::Caller(Inside inside, mihost::SandboxOptions const& options,
+               std::function<void()> const& before)
+    : process_(-1)
+{
+    int ends[2];
+    if (pipe(ends) != 0)
+        throw std::runtime_error("no pipe");
+    ear_ = mihost::Descriptor(ends[0]);
+    mihost::Descriptor mouth(ends[1]);
+    process_ = fork();
+    if (process_ != 0)
+        return;
+    ear_.reset();
+    speaker = mouth.get();
+    before();
+    if (auto const reason = mihost::enterSandbox(options)) {
+        say(*reason);
+        _exit(refused);
+    }
+    _exit(inside());
+}
+
+Caller::~Caller()
+{
+    if (process_ <= 0)
+        return;
+    kill(process_, SIGKILL);
+    waitpid(process_, nullptr, 0);
+}
+
+void Caller::say(std::string const& text)
+{
+    if (::write(speaker, text.data(), text.size()) < 0)
+        _exit(refused);
+}
+
+std::string Caller::hear(std::size_t length)
+{
+    std::string text(length, '\0');
+    std::size_t got = 0;
+    while (got < length) {
+        ssize_t const count = read(ear_.get(), text.data() + got, length - got);
+        if (count <= 0)
+            break;
+        got += static_cast<std::size_t>(count);
+    }
+    text.resize(got);
+    return text;
+}
+
+std::string Caller::hearAll()
+{
+    std::string text;
+    for (std::string next; !(next = hear(1)).empty();)
+        text += next;
+    return text;
+}
+
+void Caller::send(int signal) const
+{
+    kill(process_, signal);
+}
+
+int Caller::wait()
+{
+    int status = 0;
+    waitpid(std::exchange(process_, -1), &status, 0);
+    return status;
+}
+
+Folder::Folder()
+{
+    char path[] = "/tmp/oswmi-XXXXXX";
+    if (!mkdtemp(path))
+        throw std::runtime_error("no folder");
+    path_ = path;
+}
+
+Folder::~Folder()
+{
+    std::filesystem::remove_all(path_);
+}
+
+std::string Folder::path(std::string const& name) const
+{
+    return name.empty() ? path_ : path_ + "/" + name;
+}
+
+void Folder::write(std::string const& name, std::string const& text, mode_t mode) const
+{
+    std::filesystem::create_directories(std::filesystem::path(path(name)).parent_path());
+    std::ofstream(path(name)) << text;
+    chmod(path(name).c_str(), mode);
+}
+
+std::string readFile(std::string const& path)
+{
+    std::ifstream file(path);
+    std::ostringstream text;
+    text << file.rdbuf();
+    return text.str();
+}
+
+bool exists(std::string const& path)
+{
+    struct stat status {
+    };
+    return lstat(path.c_str(), &status) == 0;
+}
+
+void BorderTest::SetUp()
+{
+    Caller caller([] { return 0; });
+    std::string const reason = caller.hearAll();
+    if (caller.wait() == 0)
+        return;
+    if (sandboxIsRequired())
+        FAIL() << "no sandbox: " << reason;
+    GTEST_SKIP() << "no sandbox: " << reason;
+}

@@ -1,0 +1,81 @@
+#ifndef TESTS_SANDBOX_BORDER_CALLER_H
+#define TESTS_SANDBOX_BORDER_CALLER_H
+
+#include "mihost/sandbox/Descriptor.h"
+#include "mihost/sandbox/Sandbox.h"
+
+#include <functional>
+#include <gtest/gtest.h>
+#include <string>
+#include <sys/types.h>
+
+/**
+ * A process that calls enterSandbox, seen from the machine itself.
+ *
+ * The code given runs inside the copy, which talks to the test through a pipe. The pipe's end is
+ * seen once every process of the copy is gone.
+ */
+class Caller
+{
+public:
+    using Inside = std::function<int()>;
+
+    /**
+     * @param inside  what runs in the copy; its result is the exit code
+     * @param before  what the calling process does first
+     */
+    explicit Caller(
+        Inside inside, mihost::SandboxOptions const& options = {},
+        std::function<void()> const& before = [] {});
+    ~Caller();
+    Caller(Caller const&) = delete;
+    Caller& operator=(Caller const&) = delete;
+
+    /** Sends text to the test, from inside. */
+    static void say(std::string const& text);
+
+    /** Waits until as many bytes were said; fewer where all that could speak have gone. */
+    std::string hear(std::size_t length);
+
+    /** All that is said from now on until every process of the copy is gone. */
+    std::string hearAll();
+
+    void send(int signal) const;
+
+    /** Waits for the calling process. @return its wait status */
+    int wait();
+
+private:
+    static int speaker;
+
+    mihost::Descriptor ear_;
+    pid_t process_;
+};
+
+/** A new empty folder below /tmp, removed at the end. */
+class Folder
+{
+public:
+    Folder();
+    ~Folder();
+    Folder(Folder const&) = delete;
+    Folder& operator=(Folder const&) = delete;
+
+    std::string path(std::string const& name = "") const;
+    void write(std::string const& name, std::string const& text, mode_t mode = 0644) const;
+
+private:
+    std::string path_;
+};
+
+std::string readFile(std::string const& path);
+bool exists(std::string const& path);
+
+/** Skips its tests where no copy can be had, unless MI_SANDBOX_REQUIRED is 1. */
+class BorderTest : public testing::Test
+{
+protected:
+    void SetUp() override;
+};
+
+#endif

@@ -1,0 +1,376 @@
+// What must hold between a copy of the machine and the machine itself, seen from the machine.
+
+#include "tests/sandbox/border/Caller.h"
+
+#include <algorithm>
+#include <csignal>
+#include <cstdio>
+#include <fcntl.h>
+#include <fstream>
+#include <sched.h>
+#include <sys/mount.h>
+#include <sys/shm.h>
+#include <sys/stat.h>
+#include <sys/utsname.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace
+{
+
+std::string mountTable()
+{
+    return readFile("/proc/self/mountinfo");
+}
+
+std::string hostName()
+{
+    utsname system{};
+    uname(&system);
+    return system.nodename;
+}
+
+/** Writes and says whether the text is there then. */
+bool wrote(std::string const& path, std::string const& text)
+{
+    std::ofstream(path) << text;
+    return readFile(path) == text;
+}
+
+/** From here on the calling process's mounts are its own; nobody else sees them. */
+void ownMounts()
+{
+    if (unshare(CLONE_NEWNS) != 0 ||
+        mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0)
+        _exit(1);
+}
+
+[[noreturn]] void waitForSignals()
+{
+    for (;;)
+        pause();
+}
+
+class Border : public BorderTest
+{
+};
+
+TEST_F(Border, WritesInsideDoNotReachTheMachinesFiles)
+{
+    Folder const folder;
+    folder.write("file", "before");
+    Caller caller([&folder] { return wrote(folder.path("file"), "after") ? 0 : 1; });
+    EXPECT_EQ(caller.wait(), 0);
+    EXPECT_EQ(readFile(folder.path("file")), "before");
+}
+
+TEST_F(Border, NewFilesInsideDoNotShowOnTheMachine)
+{
+    std::string const name = "/oswmi-border-" + std::to_string(getpid());
+    Caller caller([&name] {
+        for (char const* folder : {"/etc", "/tmp", "/var/tmp", "/dev/shm", "/run", "/root"})
+            if (!wrote(folder + name, "new"))
+                return 1;
+        return 0;
+    });
+    EXPECT_EQ(caller.wait(), 0);
+    for (char const* folder : {"/etc", "/tmp", "/var/tmp", "/dev/shm", "/run", "/root"})
+        EXPECT_FALSE(exists(folder + name)) << folder;
+}
+
+TEST_F(Border, FilesRemovedInsideStayOnTheMachine)
+{
+    Folder const folder;
+    folder.write("file", "before");
+    Caller caller([&folder] {
+        return unlink(folder.path("file").c_str()) == 0 && !exists(folder.path("file")) ? 0 : 1;
+    });
+    EXPECT_EQ(caller.wait(), 0);
+    EXPECT_TRUE(exists(folder.path("file")));
+}
+
+TEST_F(Border, AccountsMadeInsideDoNotShowOnTheMachine)
+{
+    std::string const before = readFile("/etc/passwd");
+    Caller caller([] { return system("/usr/sbin/useradd -M oswmiborder") == 0 ? 0 : 1; });
+    EXPECT_EQ(caller.wait(), 0);
+    EXPECT_EQ(readFile("/etc/passwd"), before);
+}
+
+TEST_F(Border, MountsOfTheMachineStayAsTheyAreWhileACopyIsThere)
+{
+    std::string const before = mountTable();
+    Caller caller([]() -> int {
+        Caller::say(".");
+        waitForSignals();
+    });
+    ASSERT_EQ(caller.hear(1), ".");
+    EXPECT_EQ(mountTable(), before);
+    caller.send(SIGTERM);
+    caller.wait();
+    EXPECT_EQ(mountTable(), before);
+}
+
+TEST_F(Border, MountsMadeInsideDoNotShowOnTheMachine)
+{
+    std::string const before = mountTable();
+    Caller caller([]() -> int {
+        if (mount("tmpfs", "/mnt", "tmpfs", 0, "") != 0)
+            return 1;
+        Caller::say(".");
+        waitForSignals();
+    });
+    ASSERT_EQ(caller.hear(1), ".");
+    EXPECT_EQ(mountTable(), before);
+    caller.send(SIGTERM);
+    caller.wait();
+}
+
+TEST_F(Border, ACrashInsideLeavesNothingAndShowsAsACrash)
+{
+    std::string const mounts = mountTable();
+    Folder const folder;
+    folder.write("file", "before");
+    Caller caller([&folder]() -> int {
+        wrote(folder.path("file"), "after");
+        if (fork() == 0)
+            waitForSignals();
+        abort();
+    });
+    EXPECT_EQ(caller.hearAll(), ""); // ends once the forgotten process has gone, too
+    int const status = caller.wait();
+    ASSERT_TRUE(WIFSIGNALED(status));
+    EXPECT_EQ(WTERMSIG(status), SIGABRT);
+    EXPECT_EQ(mountTable(), mounts);
+    EXPECT_EQ(readFile(folder.path("file")), "before");
+}
+
+TEST_F(Border, TheExitCodeInsideIsThatOfTheCaller)
+{
+    Caller caller([] { return 42; });
+    int const status = caller.wait();
+    ASSERT_TRUE(WIFEXITED(status));
+    EXPECT_EQ(WEXITSTATUS(status), 42);
+}
+
+class ForwardedSignals : public BorderTest, public testing::WithParamInterface<int>
+{
+};
+
+TEST_P(ForwardedSignals, EndTheSandboxedProcessAndTheCallerAlike)
+{
+    Caller caller([]() -> int {
+        Caller::say(".");
+        waitForSignals();
+    });
+    ASSERT_EQ(caller.hear(1), ".");
+    caller.send(GetParam());
+    EXPECT_EQ(caller.hearAll(), "");
+    int const status = caller.wait();
+    ASSERT_TRUE(WIFSIGNALED(status));
+    EXPECT_EQ(WTERMSIG(status), GetParam());
+}
+
+TEST_P(ForwardedSignals, CanBeHandledInside)
+{
+    Caller caller([]() -> int {
+        std::signal(GetParam(), [](int) { _exit(5); });
+        Caller::say(".");
+        waitForSignals();
+    });
+    ASSERT_EQ(caller.hear(1), ".");
+    caller.send(GetParam());
+    int const status = caller.wait();
+    ASSERT_TRUE(WIFEXITED(status));
+    EXPECT_EQ(WEXITSTATUS(status), 5);
+}
+
+INSTANTIATE_TEST_SUITE_P(All, ForwardedSignals,
+                         testing::Values(SIGHUP, SIGINT, SIGQUIT, SIGTERM, SIGUSR1, SIGUSR2));
+
+TEST_F(Border, ATerminalsInterruptReachesTheSandboxedProcessOnce)
+{
+    mihost::Descriptor const terminal(posix_openpt(O_RDWR | O_NOCTTY));
+    ASSERT_EQ(grantpt(terminal.get()), 0);
+    ASSERT_EQ(unlockpt(terminal.get()), 0);
+    std::string const name = ptsname(terminal.get());
+    Caller caller(
+        []() -> int {
+            std::signal(SIGINT, [](int) { Caller::say("i"); });
+            Caller::say(".");
+            waitForSignals();
+        },
+        {},
+        [&name] {
+            setsid();
+            // The first terminal that a session's leader opens is the session's own.
+            if (open(name.c_str(), O_RDWR) < 0)
+                _exit(1);
+        });
+    ASSERT_EQ(caller.hear(1), ".");
+    char const interrupt = '\x03';
+    ASSERT_EQ(write(terminal.get(), &interrupt, 1), 1);
+    EXPECT_EQ(caller.hear(1), "i");
+    caller.send(SIGTERM); // comes after whatever the interrupt brought with it
+    EXPECT_EQ(caller.hearAll(), "");
+}
+
+TEST_F(Border, EverythingInsideDiesWithTheCaller)
+{
+    Caller caller([]() -> int {
+        for (int const signal : {SIGHUP, SIGINT, SIGQUIT, SIGTERM, SIGUSR1, SIGUSR2})
+            std::signal(signal, SIG_IGN);
+        Caller::say(".");
+        waitForSignals();
+    });
+    ASSERT_EQ(caller.hear(1), ".");
+    caller.send(SIGKILL);
+    EXPECT_EQ(caller.hearAll(), "");
+    caller.wait();
+}
+
+TEST_F(Border, WorksWhereTheCallerWasStartedWithChildrenIgnored)
+{
+    Caller caller([] { return 42; }, {}, [] { std::signal(SIGCHLD, SIG_IGN); });
+    EXPECT_EQ(WEXITSTATUS(caller.wait()), 42);
+}
+
+TEST_F(Border, TextKeptBackByTheCallerIsWrittenOnce)
+{
+    Folder const folder;
+    std::string const path = folder.path("out");
+    FILE* out = nullptr;
+    Caller caller(
+        [&out] {
+            std::fputs("inside ", out);
+            std::exit(0);
+            return 0;
+        },
+        {},
+        [&out, &path] {
+            // On the real file: a path would lead into the copy.
+            out = std::fopen(path.c_str(), "w");
+            std::fputs("before ", out);
+        });
+    caller.wait();
+    EXPECT_EQ(readFile(path), "before inside ");
+}
+
+TEST_F(Border, SharedMemoryMadeInsideDoesNotShowOnTheMachine)
+{
+    key_t const key = 0x4f530000 + getpid();
+    Caller caller([key]() -> int {
+        if (shmget(key, 4096, IPC_CREAT | IPC_EXCL | 0600) < 0)
+            return 1;
+        Caller::say(".");
+        waitForSignals();
+    });
+    ASSERT_EQ(caller.hear(1), ".");
+    EXPECT_LT(shmget(key, 4096, 0600), 0);
+}
+
+TEST_F(Border, TheHostNameInsideIsNotTheMachines)
+{
+    std::string const before = hostName();
+    Caller caller([] { return sethostname("copy", 4) == 0 && hostName() == "copy" ? 0 : 1; });
+    EXPECT_EQ(caller.wait(), 0);
+    EXPECT_EQ(hostName(), before);
+}
+
+TEST_F(Border, OtherFileSystemsAreCopiedOnWriteToo)
+{
+    Folder const folder;
+    std::string const file = folder.path("disk/sub folder,:\\/file");
+    // In a mount namespace of the caller's own, a second file system.
+    Caller caller(
+        [&file] {
+            Caller::say(readFile(file));
+            return wrote(file, "after") ? 0 : 1;
+        },
+        {},
+        [&folder, &file] {
+            folder.write("disk/none", "");
+            ownMounts();
+            std::string const disk = folder.path("disk");
+            mount("tmpfs", disk.c_str(), "tmpfs", 0, "");
+            folder.write("disk/sub folder,:\\/file", "outer");
+            mount("tmpfs", (disk + "/sub folder,:\\").c_str(), "tmpfs", 0, "");
+            folder.write("disk/sub folder,:\\/file", "before");
+            // The machine, from here on, is what this process sees; it looks once all is over.
+            if (pid_t const child = fork()) {
+                int status = 0;
+                waitpid(child, &status, 0);
+                Caller::say(" " + readFile(file));
+                _exit(WEXITSTATUS(status));
+            }
+        });
+    EXPECT_EQ(caller.hearAll(), "before before");
+    EXPECT_EQ(caller.wait(), 0);
+}
+
+TEST_F(Border, AFileMountedOverAnotherIsCopiedWithItsOwnerAndMode)
+{
+    Folder const folder;
+    folder.write("over", "over", 0640);
+    folder.write("below", "below", 0644);
+    Caller caller(
+        [&folder] {
+            struct stat status {
+            };
+            stat(folder.path("below").c_str(), &status);
+            return readFile(folder.path("below")) == "over" && (status.st_mode & 07777) == 0640 &&
+                           status.st_uid == 12 && status.st_gid == 34 &&
+                           wrote(folder.path("below"), "after")
+                       ? 0
+                       : 1;
+        },
+        {},
+        [&folder] {
+            if (chown(folder.path("over").c_str(), 12, 34) != 0)
+                _exit(1);
+            ownMounts();
+            mount(folder.path("over").c_str(), folder.path("below").c_str(), nullptr, MS_BIND,
+                  nullptr);
+        });
+    EXPECT_EQ(caller.wait(), 0);
+    EXPECT_EQ(readFile(folder.path("over")), "over");
+    EXPECT_EQ(readFile(folder.path("below")), "below");
+}
+
+TEST_F(Border, KeepsTheWorkingDirectory)
+{
+    Folder const folder;
+    Caller caller(
+        [] {
+            char path[4096] = "";
+            Caller::say(getcwd(path, sizeof path) ? path : "none");
+            return 0;
+        },
+        {},
+        [&folder] {
+            if (chdir(folder.path().c_str()) != 0)
+                _exit(1);
+        });
+    EXPECT_EQ(caller.hearAll(), folder.path());
+}
+
+TEST_F(Border, GoesToTheRootWhereTheWorkingDirectoryIsNotInTheCopy)
+{
+    Caller caller(
+        [] {
+            char path[4096] = "";
+            Caller::say(getcwd(path, sizeof path) ? path : "none");
+            return 0;
+        },
+        {},
+        [] {
+            ownMounts();
+            mount("tmpfs", "/run", "tmpfs", 0, "");
+            mkdir("/run/folder", 0700);
+            if (chdir("/run/folder") != 0)
+                _exit(1);
+        });
+    EXPECT_EQ(caller.hearAll(), "/");
+}
+
+} // namespace

@@ -1,0 +1,200 @@
+// The folder laid over a copy, and the calls for a copy that are refused.
+
+#include "tests/sandbox/border/Caller.h"
+
+#include <sys/stat.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace
+{
+
+constexpr unsigned int modeBits = 07777;
+
+struct stat statusOf(std::string const& path)
+{
+    struct stat status {
+    };
+    lstat(path.c_str(), &status);
+    return status;
+}
+
+/** What is at these places, line by line: mode, owner, and the text or the link's target. */
+std::string describe(std::initializer_list<char const*> paths)
+{
+    std::string lines;
+    for (char const* path : paths) {
+        struct stat const status = statusOf(path);
+        char head[64];
+        std::snprintf(head, sizeof head, "%o %u:%u ", status.st_mode & modeBits, status.st_uid,
+                      status.st_gid);
+        lines += head;
+        if (S_ISLNK(status.st_mode)) {
+            char target[256] = "";
+            lines += readlink(path, target, sizeof target - 1) > 0 ? target : "?";
+        } else if (S_ISREG(status.st_mode)) {
+            lines += readFile(path);
+        }
+        lines += '\n';
+    }
+    return lines;
+}
+
+class Overlay : public BorderTest
+{
+protected:
+    /** What stands in a copy with the folder laid over. */
+    std::string laid(std::initializer_list<char const*> paths) const
+    {
+        Caller caller(
+            [&paths] {
+                Caller::say(describe(paths));
+                return 0;
+            },
+            {folder.path()});
+        std::string said = caller.hearAll();
+        caller.wait();
+        return said;
+    }
+
+    /** Why no copy could be had with these options. */
+    static std::string reason(
+        mihost::SandboxOptions const& options, std::function<void()> const& before = [] {})
+    {
+        Caller caller([] { return 0; }, options, before);
+        std::string said = caller.hearAll();
+        EXPECT_NE(caller.wait(), 0);
+        return said;
+    }
+
+    Folder folder;
+};
+
+TEST_F(Overlay, FilesBelongToRootAndKeepTheirModes)
+{
+    folder.write("etc/oswmi/file", "text", 0751);
+    ASSERT_EQ(chown(folder.path("etc/oswmi/file").c_str(), 12, 34), 0);
+    EXPECT_EQ(laid({"/etc/oswmi/file"}), "751 0:0 text\n");
+}
+
+TEST_F(Overlay, ReplacesFilesAndLinksOfTheMachine)
+{
+    folder.write("etc/passwd", "root:x:0:0::/root:/bin/sh\n");
+    folder.write("etc/mtab", "none"); // a link on most machines
+    EXPECT_EQ(laid({"/etc/passwd", "/etc/mtab"}),
+              "644 0:0 root:x:0:0::/root:/bin/sh\n\n644 0:0 none\n");
+}
+
+TEST_F(Overlay, KeepsSymbolicLinksAsTheyAre)
+{
+    folder.write("etc/oswmi/file", "text");
+    ASSERT_EQ(symlink("no/such/place", folder.path("etc/oswmi/link").c_str()), 0);
+    EXPECT_EQ(laid({"/etc/oswmi/link"}), "777 0:0 no/such/place\n");
+}
+
+TEST_F(Overlay, NewFoldersKeepTheirModesAndOldOnesAreLeftAlone)
+{
+    folder.write("tmp/oswmi-new/file", "");
+    ASSERT_EQ(chmod(folder.path("tmp/oswmi-new").c_str(), 02750), 0);
+    ASSERT_EQ(chmod(folder.path("tmp").c_str(), 0700), 0);
+    EXPECT_EQ(laid({"/tmp", "/tmp/oswmi-new"}), "1777 0:0 \n2750 0:0 \n");
+}
+
+TEST_F(Overlay, FollowsTheMachinesLinksToFolders)
+{
+    ASSERT_EQ(statusOf("/bin").st_mode & S_IFMT, static_cast<unsigned int>(S_IFLNK));
+    folder.write("bin/oswmi", "text", 0755);
+    EXPECT_EQ(laid({"/usr/bin/oswmi"}), "755 0:0 text\n");
+}
+
+TEST_F(Overlay, ShadowFilesThatEverybodyCouldReadBecomeRootsAlone)
+{
+    folder.write("etc/shadow", "", 0644);
+    folder.write("etc/gshadow", "", 0604);
+    EXPECT_EQ(laid({"/etc/shadow", "/etc/gshadow"}), "600 0:0 \n600 0:0 \n");
+}
+
+TEST_F(Overlay, ShadowFilesWithAModeOfTheirOwnKeepIt)
+{
+    folder.write("etc/shadow", "", 0640);
+    EXPECT_EQ(laid({"/etc/shadow"}), "640 0:0 \n");
+}
+
+TEST_F(Overlay, LaysOverWhatAlsoLiesInTheMachinesTemporaryOrRunFolders)
+{
+    folder.write("run/oswmi", "run");
+    folder.write("dev/shm/oswmi", "shm");
+    EXPECT_EQ(laid({"/run/oswmi", "/dev/shm/oswmi"}), "644 0:0 run\n644 0:0 shm\n");
+}
+
+TEST_F(Overlay, DoesNotBringBackThePowerCommands)
+{
+    folder.write("sbin/shutdown", "the real one", 0755);
+    EXPECT_NE(laid({"/sbin/shutdown"}), "755 0:0 the real one\n");
+}
+
+TEST_F(Overlay, IsRefusedWithTheReasonWhereTheFolderIsMissing)
+{
+    EXPECT_EQ(reason({folder.path("missing")}),
+              "cannot open the folder " + folder.path("missing") + ": No such file or directory");
+}
+
+TEST_F(Overlay, IsRefusedWithTheReasonForAFile)
+{
+    folder.write("file", "");
+    EXPECT_EQ(reason({folder.path("file")}),
+              "cannot open the folder " + folder.path("file") + ": Not a directory");
+}
+
+TEST_F(Overlay, IsRefusedWithTheReasonForWhatIsNeitherFileNorLinkNorFolder)
+{
+    folder.write("etc/file", "");
+    ASSERT_EQ(mkfifo(folder.path("etc/pipe").c_str(), 0600), 0);
+    EXPECT_EQ(reason({folder.path()}), "cannot lay over /etc/pipe, neither a file nor a link nor "
+                                       "a folder: Invalid argument");
+}
+
+TEST_F(Overlay, IsRefusedWithTheReasonWhereAFileWouldReplaceAFolder)
+{
+    folder.write("etc", "");
+    EXPECT_EQ(reason({folder.path()}), "cannot replace /etc: Directory not empty");
+}
+
+TEST_F(Overlay, ARefusalLeavesTheCallerWhereItWas)
+{
+    ASSERT_EQ(mkfifo(folder.path("pipe").c_str(), 0600), 0);
+    std::string const before = readFile("/proc/self/mountinfo");
+    pid_t const child = fork();
+    if (child == 0) {
+        bool const wasRefused = mihost::enterSandbox({folder.path()}).has_value();
+        bool const here = readFile("/proc/self/mountinfo") == before && !mihost::inSandbox();
+        // Its next children are processes of the machine again.
+        pid_t const next = fork();
+        if (next == 0)
+            _exit(getpid() > 1 && getppid() != 0 ? 0 : 1);
+        int status = 1;
+        waitpid(next, &status, 0);
+        _exit(wasRefused && here && status == 0 ? 0 : 1);
+    }
+    int status = 1;
+    waitpid(child, &status, 0);
+    EXPECT_EQ(status, 0);
+}
+
+TEST_F(Overlay, WithoutPrivilegesTheReasonSaysWhatIsNeeded)
+{
+    EXPECT_EQ(reason({},
+                     [] {
+                         if (setuid(65534) != 0)
+                             _exit(1);
+                     }),
+              "cannot have a process namespace: Operation not permitted; root's privileges are "
+              "needed");
+}
+
+TEST_F(Overlay, LayingOverTheMachineItselfIsRefused)
+{
+    EXPECT_THROW(mihost::layOver(folder.path()), std::logic_error);
+}
+
+} // namespace

@@ -1,0 +1,190 @@
+// What a copy of the machine is like from inside.
+
+#include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Machine.h"
+
+#include <cctype>
+#include <cerrno>
+#include <cstdlib>
+#include <fcntl.h>
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <linux/capability.h>
+#include <sched.h>
+#include <set>
+#include <signal.h>
+#include <sys/prctl.h>
+#include <sys/stat.h>
+#include <sys/syscall.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace
+{
+
+using Lines = std::vector<std::string>;
+
+std::set<std::string> namesIn(char const* folder)
+{
+    std::set<std::string> names;
+    for (auto const& entry : std::filesystem::directory_iterator(folder))
+        names.insert(entry.path().filename());
+    return names;
+}
+
+TEST(Copy, KnowsThatItIsOne)
+{
+    EXPECT_TRUE(mihost::inSandbox());
+}
+
+TEST(Copy, ShowsItsOwnProcessesOnly)
+{
+    std::set<std::string> processes;
+    for (std::string const& name : namesIn("/proc"))
+        if (std::isdigit(static_cast<unsigned char>(name.front())) != 0)
+            processes.insert(name);
+    EXPECT_EQ(processes, (std::set<std::string>{"1", std::to_string(getpid())}));
+}
+
+TEST(Copy, HasAnEmptyRunFolder)
+{
+    EXPECT_EQ(namesIn("/run"), std::set<std::string>());
+}
+
+TEST(Copy, HasHarmlessDevicesOnly)
+{
+    EXPECT_EQ(namesIn("/dev"),
+              (std::set<std::string>{"fd", "full", "null", "ptmx", "pts", "random", "shm", "stderr",
+                                     "stdin", "stdout", "tty", "urandom", "zero"}));
+    EXPECT_EQ(std::system("echo text >/dev/null && head -c 4 /dev/zero >/dev/null"), 0);
+}
+
+TEST(Copy, DoesNotChangeTheModeOfADevice)
+{
+    EXPECT_EQ(chmod("/dev/null", 0600), -1);
+    EXPECT_EQ(errno, EROFS);
+}
+
+TEST(Copy, GivesOutTerminalsOfItsOwn)
+{
+    int const terminal = posix_openpt(O_RDWR | O_NOCTTY);
+    ASSERT_GE(terminal, 0);
+    EXPECT_STREQ(ptsname(terminal), "/dev/pts/0");
+    close(terminal);
+}
+
+class KernelFile : public testing::TestWithParam<char const*>
+{
+};
+
+TEST_P(KernelFile, CannotBeWritten)
+{
+    EXPECT_EQ(access(GetParam(), W_OK), -1);
+    EXPECT_EQ(errno, EROFS);
+}
+
+INSTANTIATE_TEST_SUITE_P(All, KernelFile,
+                         testing::Values("/proc/sys/kernel/panic", "/proc/sys/kernel/hostname",
+                                         "/proc/irq", "/sys", "/sys/kernel"));
+
+class Privilege : public testing::TestWithParam<unsigned int>
+{
+protected:
+    static bool isIn(unsigned int const* words)
+    {
+        return (words[CAP_TO_INDEX(GetParam())] & CAP_TO_MASK(GetParam())) != 0;
+    }
+};
+
+TEST_P(Privilege, IsGoneFromEverySet)
+{
+    __user_cap_header_struct header{_LINUX_CAPABILITY_VERSION_3, 0};
+    __user_cap_data_struct data[_LINUX_CAPABILITY_U32S_3]{};
+    ASSERT_EQ(syscall(SYS_capget, &header, data), 0);
+    __user_cap_data_struct const& word = data[CAP_TO_INDEX(GetParam())];
+    unsigned int const mask = CAP_TO_MASK(GetParam());
+    EXPECT_EQ(word.effective & mask, 0U);
+    EXPECT_EQ(word.permitted & mask, 0U);
+    EXPECT_EQ(word.inheritable & mask, 0U);
+    EXPECT_EQ(prctl(PR_CAPBSET_READ, GetParam(), 0, 0, 0), 0);
+    EXPECT_EQ(prctl(PR_CAP_AMBIENT, PR_CAP_AMBIENT_IS_SET, GetParam(), 0, 0), 0);
+}
+
+INSTANTIATE_TEST_SUITE_P(All, Privilege,
+                         testing::Values(CAP_SYS_BOOT, CAP_SYS_MODULE, CAP_SYS_TIME, CAP_SYS_RAWIO,
+                                         CAP_MKNOD));
+
+TEST(Copy, LetsRootAdministerItAllTheSame)
+{
+    EXPECT_EQ(std::system("useradd -m jdoe && chage -M 90 jdoe && echo jdoe:pw | chpasswd && "
+                          "groupadd staffers && usermod -G staffers jdoe && userdel -r jdoe"),
+              0);
+}
+
+TEST(Copy, ReapsProcessesWhoseParentIsGone)
+{
+    int ends[2];
+    ASSERT_EQ(pipe(ends), 0);
+    pid_t const child = fork();
+    if (child == 0) {
+        pid_t const orphan = fork();
+        if (orphan == 0) {
+            // Ends once the parent, and with it the pipe's only other user, has gone.
+            char end = 0;
+            close(ends[1]);
+            _exit(read(ends[0], &end, 1) == 0 ? 0 : 1);
+        }
+        if (write(ends[1], &orphan, sizeof orphan) != sizeof orphan)
+            _exit(1);
+        waitpid(orphan, nullptr, WNOHANG);
+        _exit(0);
+    }
+    pid_t orphan = 0;
+    ASSERT_EQ(read(ends[0], &orphan, sizeof orphan), static_cast<ssize_t>(sizeof orphan));
+    waitpid(child, nullptr, 0);
+    close(ends[1]);
+    while (kill(orphan, 0) == 0) // a process that nobody reaps keeps its number for ever
+        sched_yield();
+    EXPECT_EQ(errno, ESRCH);
+}
+
+class PowerCommand : public testing::TestWithParam<char const*>
+{
+protected:
+    static bool isOnTheMachine()
+    {
+        return std::filesystem::exists(std::filesystem::symlink_status(GetParam()));
+    }
+};
+
+TEST_P(PowerCommand, OnlySaysAndNotesWhatItWasAskedFor)
+{
+    std::string const path = GetParam();
+    if (!isOnTheMachine())
+        GTEST_SKIP() << path << " is not on this machine";
+    ASSERT_EQ(machine::read(path).rfind("#!/bin/sh\n", 0), 0U);
+    EXPECT_EQ(std::system((path + " -x 'two words' 2>/tmp/said").c_str()), 0);
+    std::system(path.c_str());
+    EXPECT_EQ(mihost::refusedPowerCommands(), (Lines{path + " -x two words", path}));
+    EXPECT_EQ(machine::read("/tmp/said"),
+              "sandbox: the machine itself would run: " + path + " -x two words\n");
+}
+
+INSTANTIATE_TEST_SUITE_P(All, PowerCommand,
+                         testing::Values("/sbin/shutdown", "/usr/sbin/shutdown", "/sbin/reboot",
+                                         "/sbin/halt", "/sbin/poweroff"));
+
+TEST(Copy, HasAShutdownCommandFoundByNameAlone)
+{
+    std::system("shutdown -h now");
+    ASSERT_EQ(mihost::refusedPowerCommands().size(), 1U);
+    EXPECT_EQ(mihost::refusedPowerCommands().front().rfind("shutdown -h now"),
+              mihost::refusedPowerCommands().front().size() - 15);
+}
+
+TEST(Copy, HasRefusedNothingAtFirst)
+{
+    EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
+}
+
+} // namespace

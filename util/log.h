@@ -4,6 +4,7 @@
 #include "host/VXMessageBuffer.h"
 #include "util/internal.h"
 
+#include <ostream>
 #include <string>
 
 /** The plug-in's log points. Not part of its interface, so nothing here is exported. */

@@ -53,7 +53,7 @@ unsigned int OsSwMI::takeNodeId(bool note)
     return nextNodeId_++;
 }
 
-void OsSwMI::adopt(MutableNode* node, char const* description)
+void OsSwMI::adopt(MutableNode* node, std::string const& description)
 {
     currentNode_ = node;
     nodes_.push_back(node);

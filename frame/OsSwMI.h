@@ -68,7 +68,7 @@ private:
     MI_INTERNAL unsigned int takeNodeId(bool note = true);
 
     /** Makes a freshly made node the current one and hands it to the framework. */
-    MI_INTERNAL void adopt(MutableNode* node, char const* description);
+    MI_INTERNAL void adopt(MutableNode* node, std::string const& description);
 };
 
 /** The interface object that initialize ran on; node classes rebuild nodes through it. */

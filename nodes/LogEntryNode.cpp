@@ -1,9 +1,22 @@
 #include "nodes/LogEntryNode.h"
 
 #include "frame/OsSwMI.h"
+#include "nodes/ids.h"
+#include "nodes/values.h"
+#include "sysdata/logInfo_linux.h"
+
+#include <algorithm>
 
 namespace IC
 {
+
+namespace
+{
+
+/** Each entry costs several commands at the start. */
+constexpr unsigned int maxEntries = 50;
+
+} // namespace
 
 LogEntryNode::LogEntryNode(unsigned int nodeId, unsigned int parentId,
                            std::vector<unsigned int> miIds, unsigned int nodeType,
@@ -21,7 +34,27 @@ LogEntryNode::~LogEntryNode()
 Error LogEntryNode::getProperty(unsigned int id, PropertyValue& value) const
 {
     NQ::LOG::Scope const scope(OSSWMI::unit, {"LogEntryNode::getProperty"});
-    return MutableNode::getProperty(id, value);
+    unsigned int const index = getIndex();
+    NQ::logInfo log;
+    std::string text;
+    long time = 0;
+    switch (id) {
+    case NODES::message:
+        if (!log.getData(text, index))
+            return NODES::failure();
+        value = NODES::text(text);
+        return NODES::success();
+    case NODES::id:
+        value = NODES::number(index);
+        return NODES::success();
+    case NODES::creationTime:
+        if (!log.getCreationTime(time, index))
+            return NODES::failure();
+        value = NODES::date(time);
+        return NODES::success();
+    default:
+        return MutableNode::getProperty(id, value);
+    }
 }
 
 Error LogEntryNode::setProperty(unsigned int const& id, PropertyValue const& value)
@@ -29,9 +62,30 @@ Error LogEntryNode::setProperty(unsigned int const& id, PropertyValue const& val
     NQ::LOG::Scope const scope(OSSWMI::unit, {"LogEntryNode::setProperty"});
     return MutableNode::setProperty(id, value);
 }
-void OsSwMI::createLogEntryNodes(bool)
+
+void OsSwMI::createLogEntryNodes(bool refresh)
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
+    if (refresh) {
+        for (Node* node : logEntryNodes_)
+            deleteNode(node);
+        logEntryNodes_.clear();
+    }
+    unsigned int const count = std::min(NQ::logInfo().getMaxLine(), maxEntries);
+    for (unsigned int index = 1; index <= count; ++index) {
+        unsigned int const nodeId = takeNodeId();
+        auto* node =
+            new LogEntryNode(nodeId, logNode_->getNodeId(), miIds_, NODES::logEntryType, index);
+        logEntryNodes_.push_back(node);
+        adopt(node, "OS LogEntry");
+        node->setProperty(NODES::id, NODES::number(index));
+        PropertyValue value = NODES::emptyValue();
+        for (unsigned int const id : {NODES::message, NODES::creationTime})
+            if (node->getProperty(id, value).getStatus() == 0)
+                node->setProperty(id, value);
+        if (refresh)
+            publishNode(node);
+    }
 }
 
 } // namespace IC

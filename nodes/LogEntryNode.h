@@ -6,7 +6,12 @@
 namespace IC
 {
 
-/** One of the newest lines of the system log. */
+/**
+ * One of the newest lines of the system log; index 1 is the last line.
+ *
+ * Message and time are read from the log on every read, so they are those of a newer line once the
+ * log has grown. The stored copies keep what stood there when the node was made.
+ */
 class LogEntryNode : public MutableNode
 {
 public:
@@ -14,7 +19,10 @@ public:
                  unsigned int nodeType, unsigned int index);
     ~LogEntryNode() override;
 
+    /** Status 1, and value as it was, for a message or time that cannot be read. */
     Error getProperty(unsigned int id, PropertyValue& value) const override;
+
+    /** Stores the value in the node alone; the log stays as it is. */
     Error setProperty(unsigned int const& id, PropertyValue const& value) override;
 };
 

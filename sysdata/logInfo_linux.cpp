@@ -1,0 +1,162 @@
+#include "sysdata/logInfo_linux.h"
+
+#include "sysdata/logInfo_parse.h"
+#include "util/MyProcess.h"
+#include "util/log.h"
+#include "util/text.h"
+
+#include <cstdio>
+#include <cstring>
+
+namespace NQ
+{
+
+std::string loggerLogInfo = "Veltrix.IC.MI.OsSwMI.LogInfo";
+
+namespace
+{
+
+using LOGINFO::lineSize;
+using LOGINFO::stampLength;
+
+LOG::Unit const unit{loggerLogInfo, "logInfo_linux"};
+
+constexpr char file[] = "/var/log/messages";
+constexpr char countCommand[] = "wc -l /var/log/messages";
+constexpr char fetchCommand[] = "sed -n '%dp' /var/log/messages";
+
+/** One line of a command's output; empty where there is none. */
+void readLine(FILE* output, char (&line)[lineSize])
+{
+    if (!std::fgets(line, sizeof line, output))
+        line[0] = '\0';
+}
+
+/** @param entry  all NUL; keeps at least one at its end */
+void readEntry(logInfo& log, unsigned int index, char (&entry)[lineSize])
+{
+    log.getLog(log.getMaxLine() - index + 1, entry, sizeof entry - 1);
+}
+
+/** Whether the index is one that can be read; if not, says so. */
+bool isReadable(logInfo& log, unsigned int index, char const* label, char const* function)
+{
+    unsigned int const count = log.getMaxLine();
+    // Kept: counted anew for the message, also when there will be none.
+    unsigned int const countForMessage = log.getMaxLine();
+    if (count + 1 >= index)
+        return true;
+    LOG::write(unit, LOG::error,
+               LOG::message("Invalid index: getMaxLine()=", countForMessage, label, index),
+               function);
+    return false;
+}
+
+void logInvalid(char const* text, char const* function)
+{
+    LOG::write(unit, LOG::error, LOG::message("Invalid format: buffer = ", text), function);
+}
+
+} // namespace
+
+logInfo::logInfo() = default;
+
+logInfo::~logInfo() = default;
+
+unsigned int logInfo::getMaxLine()
+{
+    LOG::Scope const scope(unit);
+    MyProcess process;
+    FILE* const output = process.mypopen(countCommand, "r");
+    if (!output) {
+        LOG::write(unit, LOG::error, LOG::message("Cannot open process: ", countCommand));
+        return 0;
+    }
+    char line[lineSize] = "";
+    readLine(output, line);
+    LOG::write(unit, LOG::progress, LOG::message("buffer = ", line));
+    unsigned int count = 0;
+    if (!LOGINFO::findCount(line, count))
+        logInvalid(line, __func__);
+    return count;
+}
+
+void logInfo::getLog(unsigned int line, char* buffer, int length)
+{
+    LOG::Scope const scope(unit);
+    char command[lineSize];
+    std::snprintf(command, sizeof command, fetchCommand, static_cast<int>(line));
+    MyProcess process;
+    FILE* const output = process.mypopen(command, "r");
+    if (!output) {
+        LOG::write(unit, LOG::error, fetchCommand); // kept: without the number
+        buffer[0] = '\0';
+        return;
+    }
+    char text[lineSize] = "";
+    readLine(output, text);
+    LOG::write(unit, LOG::progress, LOG::message("buffer = ", text));
+    std::strncpy(buffer, strget(text, ' '), static_cast<std::size_t>(length));
+}
+
+bool logInfo::getData(std::string& text, unsigned int index)
+{
+    LOG::Scope const scope(unit);
+    if (!isReadable(*this, index, ", Index=", __func__))
+        return false;
+    char entry[lineSize] = "";
+    readEntry(*this, index, entry);
+    char const* const message = entry + stampLength + 1;
+    text = std::string("*") + message + "*";
+    return true;
+}
+
+bool logInfo::getCreationTime(long& time, unsigned int index)
+{
+    LOG::Scope const scope(unit);
+    if (!isReadable(*this, index, ", logIndex=", __func__))
+        return false;
+    char entry[lineSize] = "";
+    readEntry(*this, index, entry);
+    char stampText[stampLength + 1] = "";
+    std::memcpy(stampText, entry, stampLength);
+    LOGINFO::Stamp stamp;
+    if (!LOGINFO::findStamp(stampText, stamp)) {
+        logInvalid(stampText, __func__);
+        return false;
+    }
+
+    LOGINFO::Today today;
+    MyProcess process;
+    if (FILE* const output = process.mypopen("date", "r")) {
+        char line[lineSize] = "";
+        readLine(output, line);
+        if (!LOGINFO::findToday(line, today)) {
+            logInvalid(line, __func__);
+            return false;
+        }
+    } else {
+        LOG::write(unit, LOG::error, "Cannot opne process: date"); // kept: spelled so
+    }
+    time = to_time_t(LOGINFO::yearOf(stamp, today), stamp.month, stamp.day, 0, stamp.hour,
+                     stamp.minute, stamp.second, -1);
+    return true;
+}
+
+bool logInfo::clearLog()
+{
+    LOG::Scope const scope(unit);
+    FILE* const log = std::fopen(file, "w");
+    if (!log)
+        return false;
+    std::fclose(log);
+    return true;
+}
+
+void logInfo::strreplace(char* str, char from, char to)
+{
+    LOG::Scope const scope(unit);
+    TEXT::replaceAfterFirst(str, from, to);
+}
+
+} // namespace NQ

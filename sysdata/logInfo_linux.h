@@ -1,0 +1,72 @@
+#ifndef SYSDATA_LOGINFO_LINUX_H
+#define SYSDATA_LOGINFO_LINUX_H
+
+#include <string>
+
+namespace NQ
+{
+
+/** Logger category of this source unit. */
+extern std::string loggerLogInfo;
+
+/**
+ * Reads the system log, /var/log/messages, a line at a time, and empties it.
+ *
+ * Entries are counted from the newest: index 1 is the last line of the file. Nothing is held in
+ * memory: each call runs its own commands, so an index means another line once the log has grown.
+ */
+class logInfo
+{
+public:
+    logInfo();
+    ~logInfo();
+
+    /** Number of lines in the log; 0 where they cannot be counted. */
+    unsigned int getMaxLine();
+
+    /**
+     * Copies one line without its leading blanks and its end; empty where there is no such line or
+     * it cannot be read.
+     *
+     * @param line    counted from 1 at the top of the file
+     * @param buffer  takes length bytes, the rest behind the text filled with NUL; kept: a text
+     *                of that length or more is cut and gets no NUL
+     * @param length  at least 1
+     */
+    void getLog(unsigned int line, char* buffer, int length);
+
+    /**
+     * The message of an entry, without its time stamp, between two asterisks.
+     *
+     * Kept: 0 and the index behind the oldest entry are accepted and read as an empty message.
+     *
+     * @param text  left as it was on failure
+     * @return whether there is such an entry
+     */
+    bool getData(std::string& text, unsigned int index);
+
+    /**
+     * The time stamp of an entry, read as local time, in the current year or the one before.
+     *
+     * @param time  seconds since 1970, 0 where the date cannot be had; left as it was on failure
+     * @return whether there is such an entry with a time stamp
+     */
+    bool getCreationTime(long& time, unsigned int index);
+
+    /** Truncates the log file to nothing. */
+    bool clearLog();
+
+    /**
+     * Replaces characters in place, from the second one on; a NUL ends the text and the scan.
+     *
+     * @param str  NUL-terminated
+     */
+    void strreplace(char* str, char from, char to);
+
+private:
+    std::string unused_; // kept: hosts know the size of the object
+};
+
+} // namespace NQ
+
+#endif

@@ -159,13 +159,19 @@ FileRoot::~FileRoot()
 
 FakeCommands::FakeCommands()
 {
-    hooks().popen = [this](char const* command, char const*) -> FILE* {
+    hooks().popen = [this](char const* command, char const* mode) -> FILE* {
         ran.emplace_back(command);
+        modes.emplace_back(mode);
+        std::deque<std::string>& turns = first[command];
         auto const answer = answers.find(command);
-        if (answer == answers.end())
+        if (turns.empty() && answer == answers.end())
             return nullptr;
         ++open;
-        return streamOf(answer->second);
+        if (turns.empty())
+            return streamOf(answer->second);
+        std::string const output = turns.front();
+        turns.pop_front();
+        return streamOf(output);
     };
     hooks().pclose = [this](FILE* stream) {
         --open;

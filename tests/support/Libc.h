@@ -3,6 +3,7 @@
 
 #include <cstdio>
 #include <ctime>
+#include <deque>
 #include <functional>
 #include <map>
 #include <string>
@@ -96,7 +97,14 @@ public:
     FakeCommands& operator=(FakeCommands const&) = delete;
 
     std::map<std::string, std::string> answers;
+
+    /** Answers for the first runs of a command, in turn; later ones get that of answers. */
+    std::map<std::string, std::deque<std::string>> first;
+
     std::vector<std::string> ran;
+
+    /** The modes asked for, one for each command. */
+    std::vector<std::string> modes;
 
     /** Streams handed out and not closed yet. */
     int open = 0;

@@ -1,0 +1,83 @@
+#ifndef TESTS_SUPPORT_FRAME_H
+#define TESTS_SUPPORT_FRAME_H
+
+#include "frame/OsSwMI.h"
+#include "nodes/ids.h"
+#include "tests/support/NodeCalls.h"
+
+#include <string>
+#include <vector>
+
+/**
+ * The interface object with its insides open, for tests that are linked to the plug-in's objects.
+ *
+ * The framework is initialised with the id 7 and the builders have not run; an operating-system
+ * node, with the id 8, stands for what they would find.
+ */
+class Frame : public IC::OsSwMI
+{
+public:
+    Frame()
+    {
+        ManagementInterface::initialize(7, IC::Number(0U), IC::Number(0U));
+        nodeIds_ = new std::vector<unsigned int>;
+        osNode_ = new IC::MutableNode(nextNodeId_++, miId_, miIds_, NODES::operatingSystemType, 0);
+        nodes_.push_back(osNode_);
+        IC::pOsSwMI = this;
+    }
+
+    ~Frame() override
+    {
+        IC::pOsSwMI = nullptr;
+        OsSwMI::unload();
+    }
+
+    IC::Error addNewNode(IC::Node*& node) override
+    {
+        published.push_back(node);
+        return OsSwMI::addNewNode(node);
+    }
+
+    IC::Error deleteNode(IC::Node* node) override
+    {
+        deleted.push_back(node);
+        return OsSwMI::deleteNode(node);
+    }
+
+    using OsSwMI::currentNode_;
+    using OsSwMI::groupNodes_;
+    using OsSwMI::logEntryNodes_;
+    using OsSwMI::logNode_;
+    using OsSwMI::miIds_;
+    using OsSwMI::nextNodeId_;
+    using OsSwMI::nodeIds_;
+    using OsSwMI::nodes_;
+    using OsSwMI::osNode_;
+    using OsSwMI::userNodes_;
+
+    /** The nodes of one kind, in the order of the framework's list. */
+    std::vector<IC::MutableNode*> ofType(unsigned int type) const
+    {
+        std::vector<IC::MutableNode*> found;
+        for (IC::Node* node : nodes_) {
+            auto* const candidate = dynamic_cast<IC::MutableNode*>(node);
+            if (candidate && candidate->getNodeType() == type)
+                found.push_back(candidate);
+        }
+        return found;
+    }
+
+    /** The nodes that went through publication, and those whose deletion was asked for. */
+    std::vector<IC::Node*> published;
+    std::vector<IC::Node*> deleted;
+};
+
+/** A stored property as shown() writes it; "unset" where there is none. */
+inline std::string stored(IC::Node const& node, unsigned int id)
+{
+    auto const properties = node.getProperties();
+    auto const found = properties.find(id);
+    return found == properties.end() ? "unset" : shown(found->second);
+}
+
+#endif

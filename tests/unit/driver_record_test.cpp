@@ -1,0 +1,78 @@
+#include "sysdata/driverInfo_linux.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using NQ::driverInfo;
+
+struct Field {
+    char const* getter;
+    std::string (driverInfo::*get)() const;
+    char const* setter;
+    int (driverInfo::*set)(std::string);
+};
+
+constexpr Field fields[] = {
+    {"getName", &driverInfo::getName, "setName", &driverInfo::setName},
+    {"getVersion", &driverInfo::getVersion, "setVersion", &driverInfo::setVersion},
+    {"getDescription", &driverInfo::getDescription, "setDescription", &driverInfo::setDescription},
+    {"getBuildNumber", &driverInfo::getBuildNumber, "setBuildNumber", &driverInfo::setBuildNumber},
+    {"getManufacturer", &driverInfo::getManufacturer, "setManufacturer",
+     &driverInfo::setManufacturer},
+};
+
+TEST(DriverRecord, StartsWithAllFieldsEmpty)
+{
+    driverInfo const driver;
+    for (Field const& field : fields)
+        EXPECT_EQ((driver.*field.get)(), "") << field.getter;
+}
+
+TEST(DriverRecord, ReturnsOneFromEverySetterAndKeepsTheFieldsApart)
+{
+    driverInfo driver;
+    for (Field const& field : fields)
+        EXPECT_EQ((driver.*field.set)(field.setter), 1);
+    for (Field const& field : fields)
+        EXPECT_EQ((driver.*field.get)(), field.setter);
+}
+
+TEST(DriverRecord, IsCopiedByValue)
+{
+    driverInfo first;
+    first.setName("ext4");
+    driverInfo second = first;
+    second.setName("xfs");
+    EXPECT_EQ(first.getName(), "ext4");
+    EXPECT_EQ(second.getName(), "xfs");
+}
+
+TEST(DriverRecord, LogsEntryAndExitOfGettersAndSettersAlone)
+{
+    Recording recording;
+    driverInfo driver;
+    driverInfo const copy = driver;
+    EXPECT_TRUE(recording.texts().empty());
+    for (Field const& field : fields) {
+        recording.clear();
+        (driver.*field.set)("x");
+        (copy.*field.get)();
+        EXPECT_EQ(recording.texts(3000),
+                  (std::vector<std::string>{std::string(field.setter) + ": entry",
+                                            std::string(field.setter) + ": exit",
+                                            std::string(field.getter) + ": entry",
+                                            std::string(field.getter) + ": exit"}));
+        for (LogRecord const& record : recording.records()) {
+            EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.DriverInfo");
+            EXPECT_EQ(record.file, "driverInfo_linux");
+        }
+    }
+}
+
+} // namespace

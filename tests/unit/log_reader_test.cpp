@@ -1,0 +1,589 @@
+#include "sysdata/logInfo_linux.h"
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Libc.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <ctime>
+#include <fstream>
+#include <iterator>
+#include <set>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using NQ::logInfo;
+using Texts = std::vector<std::string>;
+
+constexpr char wc[] = "wc -l /var/log/messages";
+
+std::string sed(int line)
+{
+    return "sed -n '" + std::to_string(line) + "p' /var/log/messages";
+}
+
+/** Seconds since 1970 of a day in UTC. */
+long at(int year, int month, int day, int hour, int minute, int second)
+{
+    std::tm fields{};
+    fields.tm_year = year - 1900;
+    fields.tm_mon = month - 1;
+    fields.tm_mday = day;
+    fields.tm_hour = hour;
+    fields.tm_min = minute;
+    fields.tm_sec = second;
+    return static_cast<long>(timegm(&fields));
+}
+
+/** A log with one line, number 10, out of 10. */
+class LogReader : public ::testing::Test
+{
+protected:
+    LogReader()
+    {
+        setTimeZone("UTC0");
+        commands.answers = {{wc, "10 /var/log/messages\n"},
+                            {sed(10), "Nov 20 10:11:12 host sshd[1]: session opened\n"},
+                            {"date", "Sat Nov 21 03:15:30 UTC 2026\n"}};
+    }
+
+    static void setTimeZone(char const* zone)
+    {
+        setenv("TZ", zone, 1);
+        tzset();
+    }
+
+    /** A buffer of the length filled by getLog, all of it. */
+    std::string fetched(unsigned int line, std::size_t length)
+    {
+        std::string buffer(length, '#');
+        log.getLog(line, buffer.data(), static_cast<int>(length));
+        return buffer;
+    }
+
+    std::string data(unsigned int index)
+    {
+        std::string text = "unset";
+        EXPECT_TRUE(log.getData(text, index));
+        return text;
+    }
+
+    long timeOf(unsigned int index)
+    {
+        long time = -1;
+        EXPECT_TRUE(log.getCreationTime(time, index));
+        return time;
+    }
+
+    libc::FakeCommands commands;
+    logInfo log;
+};
+
+TEST_F(LogReader, IsOneString)
+{
+    EXPECT_EQ(sizeof(logInfo), sizeof(std::string));
+}
+
+TEST_F(LogReader, IsMadeAndGoneInSilence)
+{
+    Recording const recording;
+    {
+        logInfo const another;
+    }
+    EXPECT_TRUE(recording.records().empty());
+    EXPECT_TRUE(commands.ran.empty());
+}
+
+TEST_F(LogReader, CountsTheLines)
+{
+    Recording const recording;
+    EXPECT_EQ(log.getMaxLine(), 10U);
+    EXPECT_EQ(commands.ran, Texts{wc});
+    EXPECT_EQ(commands.modes, Texts{"r"});
+    EXPECT_EQ(commands.open, 0);
+    EXPECT_EQ(recording.texts(),
+              (Texts{"getMaxLine: entry", "buffer = 10 /var/log/messages\n", "getMaxLine: exit"}));
+    EXPECT_EQ(recording.texts(3000).size(), 3U);
+}
+
+TEST_F(LogReader, CountsNothingWhenWcCannotBeStarted)
+{
+    commands.answers.clear();
+    Recording const recording;
+    EXPECT_EQ(log.getMaxLine(), 0U);
+    EXPECT_EQ(recording.texts(6000), Texts{"Cannot open process: wc -l /var/log/messages"});
+    EXPECT_EQ(recording.texts(3000), (Texts{"getMaxLine: entry", "getMaxLine: exit"}));
+}
+
+TEST_F(LogReader, CountsNothingInOutputThatIsNoNumber)
+{
+    commands.answers[wc] = "what is this 10\n";
+    Recording const recording;
+    EXPECT_EQ(log.getMaxLine(), 0U);
+    EXPECT_EQ(recording.texts(6000), Texts{"Invalid format: buffer = what is this 10\n"});
+    EXPECT_TRUE(recording.has("buffer = what is this 10\n", 3000));
+}
+
+TEST_F(LogReader, CountsNothingWhenWcPrintsNothing)
+{
+    commands.answers[wc] = "";
+    Recording const recording;
+    EXPECT_EQ(log.getMaxLine(), 0U);
+    EXPECT_EQ(recording.remarks(), (Texts{"buffer = ", "Invalid format: buffer = "}));
+}
+
+TEST_F(LogReader, ReadsOnlyTheFirstLineOfWc)
+{
+    commands.answers[wc] = "3 a\n10 b\n";
+    EXPECT_EQ(log.getMaxLine(), 3U);
+}
+
+TEST_F(LogReader, SpeaksUnderItsUnitAndCategory)
+{
+    commands.answers.erase("date");
+    Recording const recording;
+    std::string text;
+    long time = 0;
+    log.getMaxLine();
+    log.getData(text, 12);
+    log.getCreationTime(time, 12);
+    log.getCreationTime(time, 1);
+    char letters[] = "a";
+    log.strreplace(letters, 'x', 'y');
+    std::set<std::string> functions;
+    for (LogRecord const& record : recording.records()) {
+        if (record.function == "strget" || record.function == "to_time_t")
+            continue;
+        functions.insert(record.function);
+        EXPECT_EQ(record.file, "logInfo_linux");
+        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.LogInfo");
+    }
+    EXPECT_EQ(functions, (std::set<std::string>{"getMaxLine", "getData", "getLog",
+                                                "getCreationTime", "strreplace"}));
+}
+
+TEST_F(LogReader, FetchesOneLineByItsNumber)
+{
+    commands.answers[sed(3)] = "third line\n";
+    Recording const recording;
+    EXPECT_STREQ(fetched(3, 100).c_str(), "third line");
+    EXPECT_EQ(commands.ran, Texts{"sed -n '3p' /var/log/messages"});
+    EXPECT_EQ(commands.modes, Texts{"r"});
+    EXPECT_EQ(commands.open, 0);
+    EXPECT_EQ(recording.texts(3000), (Texts{"getLog: entry", "buffer = third line\n",
+                                            "strget: entry", "strget: exit", "getLog: exit"}));
+    EXPECT_EQ(recording.texts(6000), Texts{});
+}
+
+TEST_F(LogReader, StripsLeadingSpacesOfALineAndNothingElse)
+{
+    commands.answers[sed(3)] = "   \t third line \r\n";
+    EXPECT_STREQ(fetched(3, 100).c_str(), "\t third line \r");
+}
+
+TEST_F(LogReader, FillsTheRestOfTheBufferWithNul)
+{
+    commands.answers[sed(3)] = "abc\n";
+    EXPECT_EQ(fetched(3, 600), "abc" + std::string(597, '\0'));
+}
+
+TEST_F(LogReader, AddsNoTerminatorWhenTheTextFillsTheLength)
+{
+    commands.answers[sed(3)] = "abcdef\n";
+    EXPECT_EQ(fetched(3, 6), "abcdef");
+    EXPECT_EQ(fetched(3, 4), "abcd");
+    EXPECT_EQ(fetched(3, 1), "a");
+}
+
+TEST_F(LogReader, ReadsAMissingLineAsEmpty)
+{
+    commands.answers[sed(11)] = "";
+    Recording const recording;
+    EXPECT_EQ(fetched(11, 8), std::string(8, '\0'));
+    EXPECT_EQ(recording.remarks(), Texts{"buffer = "});
+}
+
+TEST_F(LogReader, CutsALineAt511Characters)
+{
+    commands.answers[sed(3)] = std::string(700, 'x') + "\n";
+    EXPECT_EQ(fetched(3, 600), std::string(511, 'x') + std::string(89, '\0'));
+}
+
+TEST_F(LogReader, EmptiesTheBufferWhenSedCannotBeStarted)
+{
+    Recording const recording;
+    EXPECT_EQ(fetched(4, 3), std::string("\0##", 3));
+    EXPECT_EQ(recording.texts(6000), Texts{"sed -n '%dp' /var/log/messages"});
+    EXPECT_EQ(recording.texts(3000), (Texts{"getLog: entry", "getLog: exit"}));
+    EXPECT_EQ(commands.ran, Texts{"sed -n '4p' /var/log/messages"});
+}
+
+TEST_F(LogReader, YieldsTheNewestMessageBetweenAsterisks)
+{
+    EXPECT_EQ(data(1), "*host sshd[1]: session opened*");
+}
+
+TEST_F(LogReader, CountsIndexesFromTheEndOfTheFile)
+{
+    commands.answers[sed(8)] = "Nov 20 10:11:12 third from the end\n";
+    EXPECT_EQ(data(3), "*third from the end*");
+    commands.answers[sed(1)] = "Nov 20 10:11:12 the oldest\n";
+    EXPECT_EQ(data(10), "*the oldest*");
+}
+
+TEST_F(LogReader, RunsThreeCountsAndOneFetchForAMessage)
+{
+    data(1);
+    EXPECT_EQ(commands.ran, (Texts{wc, wc, wc, sed(10)}));
+    EXPECT_EQ(commands.modes, Texts(4, "r"));
+    EXPECT_EQ(commands.open, 0);
+}
+
+TEST_F(LogReader, RunsTwoCountsForAMessageThatIsRefused)
+{
+    std::string text;
+    EXPECT_FALSE(log.getData(text, 12));
+    EXPECT_EQ(commands.ran, (Texts{wc, wc}));
+}
+
+TEST_F(LogReader, FetchesTheLineThatTheLastCountNames)
+{
+    commands.first[wc] = {"10 f\n", "11 f\n", "12 f\n"};
+    commands.answers[sed(12)] = "Nov 20 10:11:12 newest of all\n";
+    EXPECT_EQ(data(1), "*newest of all*");
+}
+
+TEST_F(LogReader, RefusesByTheFirstCountAndNamesTheSecond)
+{
+    commands.first[wc] = {"10 f\n", "12 f\n"};
+    Recording const recording;
+    std::string text;
+    EXPECT_FALSE(log.getData(text, 12));
+    EXPECT_EQ(recording.texts(6000), Texts{"Invalid index: getMaxLine()=12, Index=12"});
+}
+
+TEST_F(LogReader, AcceptsTheIndexBehindTheOldestLineAsEmpty)
+{
+    commands.answers[sed(0)] = "";
+    EXPECT_EQ(data(11), "**");
+    EXPECT_EQ(commands.ran, (Texts{wc, wc, wc, "sed -n '0p' /var/log/messages"}));
+}
+
+TEST_F(LogReader, AcceptsTheIndexZeroAsEmpty)
+{
+    commands.answers[sed(11)] = "";
+    EXPECT_EQ(data(0), "**");
+    EXPECT_EQ(commands.ran.back(), "sed -n '11p' /var/log/messages");
+}
+
+TEST_F(LogReader, RefusesTheNextIndexAndLeavesTheTextAlone)
+{
+    Recording const recording;
+    std::string text = "before";
+    EXPECT_FALSE(log.getData(text, 12));
+    EXPECT_EQ(text, "before");
+    EXPECT_EQ(recording.texts(6000), Texts{"Invalid index: getMaxLine()=10, Index=12"});
+    EXPECT_EQ(recording.texts().back(), "getData: exit");
+    EXPECT_EQ(recording.records()[recording.records().size() - 3].function, "getData");
+}
+
+TEST_F(LogReader, RefusesEveryIndexAboveOneOfALogThatCannotBeCounted)
+{
+    commands.answers[wc] = "";
+    commands.answers[sed(0)] = "";
+    std::string text;
+    EXPECT_TRUE(log.getData(text, 1));
+    EXPECT_EQ(text, "**");
+    EXPECT_FALSE(log.getData(text, 2));
+    EXPECT_FALSE(log.getData(text, 4294967295U));
+}
+
+TEST_F(LogReader, YieldsAnEmptyMessageForALineWithoutOne)
+{
+    for (char const* line :
+         {"\n", "short\n", "Nov 20 10:11:12\n", "Nov 20 10:11:12 \n", "123456789012345\n"}) {
+        commands.answers[sed(10)] = line;
+        EXPECT_EQ(data(1), "**") << line;
+    }
+}
+
+TEST_F(LogReader, DropsSixteenCharactersWhateverTheyAre)
+{
+    commands.answers[sed(10)] = "2026-11-20T10:11:12.000000+00:00 host sshd\n";
+    EXPECT_EQ(data(1), "*:12.000000+00:00 host sshd*");
+    commands.answers[sed(10)] = "1234567890123456x\n";
+    EXPECT_EQ(data(1), "*x*");
+}
+
+TEST_F(LogReader, CutsAMessageAt495Characters)
+{
+    commands.answers[sed(10)] = "Nov 20 10:11:12 " + std::string(700, 'm') + "\n";
+    EXPECT_EQ(data(1), "*" + std::string(495, 'm') + "*");
+}
+
+TEST_F(LogReader, YieldsAnEmptyMessageWhenSedCannotBeStarted)
+{
+    commands.answers.erase(sed(10));
+    Recording const recording;
+    EXPECT_EQ(data(1), "**");
+    EXPECT_EQ(recording.texts(6000), Texts{"sed -n '%dp' /var/log/messages"});
+}
+
+TEST_F(LogReader, EndsAMessageAtANulByte)
+{
+    commands.answers[sed(10)] = std::string("Nov 20 10:11:12 ab\0cd\n", 22);
+    EXPECT_EQ(data(1), "*ab*");
+}
+
+TEST_F(LogReader, PassesOnBytesOfAnyKind)
+{
+    std::string bytes;
+    for (int byte = 1; byte < 256; ++byte)
+        if (byte != '\n')
+            bytes.push_back(static_cast<char>(byte));
+    commands.answers[sed(10)] = "Nov 20 10:11:12 " + bytes;
+    EXPECT_EQ(data(1), "*" + bytes + "*");
+}
+
+TEST_F(LogReader, LogsEveryStepOfAMessageInOrder)
+{
+    Recording const recording;
+    data(1);
+    Texts expected{"getData: entry"};
+    for (int i = 0; i < 3; ++i)
+        for (char const* text :
+             {"getMaxLine: entry", "buffer = 10 /var/log/messages\n", "getMaxLine: exit"})
+            expected.emplace_back(text);
+    for (char const* text :
+         {"getLog: entry", "buffer = Nov 20 10:11:12 host sshd[1]: session opened\n",
+          "strget: entry", "strget: exit", "getLog: exit", "getData: exit"})
+        expected.emplace_back(text);
+    EXPECT_EQ(recording.texts(3000), expected);
+    EXPECT_EQ(recording.texts(6000), Texts{});
+}
+
+TEST_F(LogReader, ReadsATimeStampInTheCurrentYear)
+{
+    EXPECT_EQ(timeOf(1), at(2026, 11, 20, 10, 11, 12));
+}
+
+TEST_F(LogReader, RunsThreeCountsOneFetchAndOneDateForATime)
+{
+    timeOf(1);
+    EXPECT_EQ(commands.ran, (Texts{wc, wc, wc, sed(10), "date"}));
+    EXPECT_EQ(commands.modes, Texts(5, "r"));
+    EXPECT_EQ(commands.open, 0);
+}
+
+TEST_F(LogReader, ReadsATimeStampAsLocalTime)
+{
+    setTimeZone("CET-1CEST,M3.5.0,M10.5.0/3");
+    EXPECT_EQ(timeOf(1), at(2026, 11, 20, 9, 11, 12));
+    commands.answers[sed(10)] = "Jul  2 10:11:12 host\n";
+    EXPECT_EQ(timeOf(1), at(2026, 7, 2, 8, 11, 12));
+}
+
+TEST_F(LogReader, DatesDecemberReadInJanuaryBack)
+{
+    commands.answers[sed(10)] = "Dec 31 23:59:59 host\n";
+    commands.answers["date"] = "Fri Jan  2 03:15:30 UTC 2026\n";
+    EXPECT_EQ(timeOf(1), at(2025, 12, 31, 23, 59, 59));
+}
+
+TEST_F(LogReader, LeavesJanuaryReadInDecemberInTheCurrentYear)
+{
+    commands.answers[sed(10)] = "Jan  1 00:00:01 host\n";
+    commands.answers["date"] = "Thu Dec 31 03:15:30 UTC 2026\n";
+    EXPECT_EQ(timeOf(1), at(2026, 1, 1, 0, 0, 1));
+}
+
+TEST_F(LogReader, CountsTheIndexOfATimeAsThatOfAMessage)
+{
+    commands.answers[sed(8)] = "Nov  3 01:02:03 third from the end\n";
+    EXPECT_EQ(timeOf(3), at(2026, 11, 3, 1, 2, 3));
+    commands.first[wc] = {"10 f\n", "11 f\n", "8 f\n"};
+    EXPECT_EQ(timeOf(1), at(2026, 11, 3, 1, 2, 3));
+}
+
+TEST_F(LogReader, RefusesATimeByAnIndexOutOfRange)
+{
+    Recording const recording;
+    long time = 5;
+    EXPECT_FALSE(log.getCreationTime(time, 12));
+    EXPECT_EQ(time, 5);
+    EXPECT_EQ(recording.texts(6000), Texts{"Invalid index: getMaxLine()=10, logIndex=12"});
+    EXPECT_EQ(commands.ran, (Texts{wc, wc}));
+}
+
+TEST_F(LogReader, FindsNoTimeInTheLinesThatItAcceptsBeyondTheLog)
+{
+    commands.answers[sed(0)] = "";
+    commands.answers[sed(11)] = "";
+    long time = 5;
+    EXPECT_FALSE(log.getCreationTime(time, 11));
+    EXPECT_FALSE(log.getCreationTime(time, 0));
+    EXPECT_EQ(time, 5);
+}
+
+TEST_F(LogReader, FindsNoTimeInAnotherStampAndAsksForNoDate)
+{
+    commands.answers[sed(10)] = "2026-11-20T10:11:12.000000+00:00 host sshd\n";
+    Recording const recording;
+    long time = 5;
+    EXPECT_FALSE(log.getCreationTime(time, 1));
+    EXPECT_EQ(time, 5);
+    EXPECT_EQ(recording.texts(6000), Texts{"Invalid format: buffer = 2026-11-20T10:1"});
+    EXPECT_EQ(commands.ran, (Texts{wc, wc, wc, sed(10)}));
+}
+
+TEST_F(LogReader, LooksForATimeInFifteenCharactersAlone)
+{
+    commands.answers[sed(10)] = "Nov  20 10:11:12 host\n"; // the last digit is the sixteenth
+    EXPECT_EQ(timeOf(1), at(2026, 11, 20, 10, 11, 1));
+    commands.answers[sed(10)] = "November 20 10:11:12 host\n";
+    long time = 5;
+    EXPECT_FALSE(log.getCreationTime(time, 1));
+}
+
+TEST_F(LogReader, DatesAnEntryToZeroWhenDateCannotBeStarted)
+{
+    commands.answers.erase("date");
+    Recording const recording;
+    EXPECT_EQ(timeOf(1), 0);
+    EXPECT_EQ(recording.texts(6000), (Texts{"Cannot opne process: date", "Invalid YY: YY = 0"}));
+}
+
+TEST_F(LogReader, FindsNoTimeWhenDatePrintsAnotherForm)
+{
+    for (char const* line : {"", "\n", "2026\n", "Sat Nov 21 03:15:30 UTC\n", " \n"}) {
+        commands.answers["date"] = line;
+        Recording const recording;
+        long time = 5;
+        EXPECT_FALSE(log.getCreationTime(time, 1)) << line;
+        EXPECT_EQ(time, 5) << line;
+        EXPECT_EQ(recording.texts(6000), Texts{std::string("Invalid format: buffer = ") + line});
+        EXPECT_EQ(commands.open, 0);
+    }
+}
+
+TEST_F(LogReader, DatesAnEntryToZeroWhereTheYearCannotBeConverted)
+{
+    commands.answers["date"] = "Sat Nov 21 03:15:30 UTC 1900\n";
+    Recording const recording;
+    EXPECT_EQ(timeOf(1), 0);
+    EXPECT_EQ(recording.texts(6000), Texts{"Invalid YY: YY = 1900"});
+}
+
+TEST_F(LogReader, SurvivesBinaryGarbageFromEveryCommand)
+{
+    std::string garbage;
+    for (unsigned int i = 0; i < 5000; ++i)
+        garbage.push_back(static_cast<char>((i * 7919U) >> 3));
+    commands.answers[sed(10)] = garbage;
+    data(1);
+    long time = 0;
+    log.getCreationTime(time, 1);
+    commands.answers[sed(10)] = "Nov 20 10:11:12 host\n";
+    for (std::string const& date :
+         {garbage, std::string("Sat Jan 1 0 -2147483648\n"), std::string("a b 99999999999999\n"),
+          std::string("\0 \0", 3), std::string(" "), std::string(2000, ' ')}) {
+        commands.answers["date"] = date;
+        log.getCreationTime(time, 1);
+    }
+    commands.answers[sed(10)] = "Dec 20 10:11:12 host\n";
+    commands.answers["date"] = "Sat Jan 1 0 -2147483648\n";
+    EXPECT_EQ(timeOf(1), 0);
+    commands.answers[wc] = garbage;
+    log.getMaxLine();
+    EXPECT_EQ(commands.open, 0);
+}
+
+class LogClearing : public ::testing::Test
+{
+protected:
+    std::string contents() const
+    {
+        std::ifstream file(files.realPath("/var/log/messages"));
+        return {std::istreambuf_iterator<char>(file), {}};
+    }
+
+    FakeFiles files;
+    libc::FakeCommands commands;
+};
+
+TEST_F(LogClearing, TruncatesTheFileWithoutAnyCommand)
+{
+    files.write("/var/log/messages", "one\ntwo\n");
+    Recording const recording;
+    EXPECT_TRUE(logInfo().clearLog());
+    EXPECT_EQ(contents(), "");
+    EXPECT_TRUE(commands.ran.empty());
+    EXPECT_EQ(recording.texts(), (Texts{"clearLog: entry", "clearLog: exit"}));
+}
+
+TEST_F(LogClearing, OpensTheLogForWriting)
+{
+    Texts opened;
+    libc::hooks().fopen = [&opened](char const* path, char const* mode) {
+        opened.push_back(std::string(path) + "|" + mode);
+        return std::tmpfile();
+    };
+    EXPECT_TRUE(logInfo().clearLog());
+    EXPECT_EQ(opened, Texts{"/var/log/messages|w"});
+}
+
+TEST_F(LogClearing, FailsInSilenceAndLeavesAFileThatCannotBeOpened)
+{
+    files.write("/var/log/messages", "one\n");
+    libc::hooks().fopen = [](char const*, char const*) -> FILE* { return nullptr; };
+    Recording const recording;
+    EXPECT_FALSE(logInfo().clearLog());
+    libc::hooks().fopen = nullptr;
+    EXPECT_EQ(contents(), "one\n");
+    EXPECT_EQ(recording.texts(), (Texts{"clearLog: entry", "clearLog: exit"}));
+}
+
+TEST_F(LogClearing, FailsWhereThereIsNoPlaceForTheFile)
+{
+    EXPECT_FALSE(logInfo().clearLog());
+}
+
+std::string replaced(std::string text, char from, char to)
+{
+    text.push_back('\0');
+    logInfo().strreplace(text.data(), from, to);
+    return text.c_str();
+}
+
+TEST(LogStrreplace, LeavesTheFirstCharacterAsItIs)
+{
+    EXPECT_EQ(replaced("-a-b-", '-', ' '), "-a b ");
+    EXPECT_EQ(replaced("-", '-', ' '), "-");
+}
+
+TEST(LogStrreplace, StopsAtTheFirstReplacementByNul)
+{
+    char text[] = "abcbd";
+    logInfo().strreplace(text, 'b', '\0');
+    EXPECT_EQ(std::string(text, 5), std::string("a\0cbd", 5));
+}
+
+TEST(LogStrreplace, LeavesAnEmptyTextAlone)
+{
+    char text[] = {'\0', '-', '\0'};
+    logInfo().strreplace(text, '-', ' ');
+    EXPECT_EQ(std::string(text, 2), std::string("\0-", 2));
+}
+
+TEST(LogStrreplace, LogsEntryAndExit)
+{
+    Recording const recording;
+    replaced("a-b", '-', ' ');
+    EXPECT_EQ(recording.texts(3000), (Texts{"strreplace: entry", "strreplace: exit"}));
+}
+
+} // namespace

@@ -11,15 +11,17 @@
 /**
  * The interface object with its insides open, for tests that are linked to the plug-in's objects.
  *
- * The framework is initialised with the id 7 and the builders have not run; an operating-system
- * node, with the id 8, stands for what they would find.
+ * Its own id is 7 and the builders have not run; an operating-system node, with the id 8, stands
+ * for what they would find.
  */
 class Frame : public IC::OsSwMI
 {
 public:
     Frame()
     {
-        ManagementInterface::initialize(7, IC::Number(0U), IC::Number(0U));
+        miId_ = 7;
+        miIds_ = {7};
+        nextNodeId_ = 8;
         nodeIds_ = new std::vector<unsigned int>;
         osNode_ = new IC::MutableNode(nextNodeId_++, miId_, miIds_, NODES::operatingSystemType, 0);
         nodes_.push_back(osNode_);

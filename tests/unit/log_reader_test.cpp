@@ -554,9 +554,8 @@ TEST_F(LogClearing, FailsWhereThereIsNoPlaceForTheFile)
 
 std::string replaced(std::string text, char from, char to)
 {
-    text.push_back('\0');
     logInfo().strreplace(text.data(), from, to);
-    return text.c_str();
+    return text;
 }
 
 TEST(LogStrreplace, LeavesTheFirstCharacterAsItIs)

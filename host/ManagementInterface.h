@@ -6,6 +6,7 @@
 #include "host/Node.h"
 #include "host/Number.h"
 
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -86,9 +87,8 @@ private:
     ManagementInterface(ManagementInterface const&) = delete;
     ManagementInterface& operator=(ManagementInterface const&) = delete;
 
-    AlertCallBack alertCallBack_;
-    void const* alertContext_;
-    std::size_t deleteHint_; // where the last deleted node stood; the next one follows it
+    struct Own;
+    std::unique_ptr<Own> own_; // the host's own; its layout is no part of the contract
 };
 
 } // namespace IC

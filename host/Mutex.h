@@ -14,7 +14,7 @@ public:
     ~Mutex();
 
     /**
-     * @param timeout  milliseconds to wait; 0xFFFFFFFF waits without limit
+     * @param timeout  milliseconds to wait; 0xFFFFFFFF and more wait without limit
      * @return 0 once the lock is held, non-zero where the time ran out
      */
     int lock(unsigned long timeout);

@@ -58,8 +58,8 @@ public:
     operator std::string() const;
 
     /**
-     * The value as an unsigned number: the number itself, or a text that is wholly decimal and
-     * fits; 0 for everything else.
+     * The value as an unsigned number: the number itself, or that of a text that is wholly decimal;
+     * 0 for everything else and for what does not fit.
      */
     operator unsigned int() const;
 

@@ -4,6 +4,7 @@
 #include "mihost/runtime/Runtime.h"
 
 #include <algorithm>
+#include <mutex>
 
 namespace IC
 {
@@ -21,11 +22,35 @@ Error failure(std::string const& reason)
     return {1, Number(Number::EmptyKind), reason};
 }
 
+/** Takes the node off the list, wherever it stands; the hint says where to look first. */
+bool unlist(std::vector<Node*>& nodes, std::size_t& hint, Node* node)
+{
+    // Nodes of one kind are deleted in the order in which they stand, so the next one is mostly
+    // where the last one was.
+    if (hint >= nodes.size() || nodes[hint] != node) {
+        auto const found = std::find(nodes.begin(), nodes.end(), node);
+        if (found == nodes.end())
+            return false;
+        hint = static_cast<std::size_t>(found - nodes.begin());
+    }
+    nodes.erase(nodes.begin() + static_cast<std::ptrdiff_t>(hint));
+    return true;
+}
+
 } // namespace
+
+struct ManagementInterface::Own {
+    // Guards the node list, for one look or one change at a time, since different threads may
+    // rebuild nodes of different kinds at once. Nobody outside is called while it is held.
+    std::mutex listLock;
+    std::size_t deleteHint = 0; // where the last deleted node stood; the next one follows it
+    AlertCallBack alertCallBack = nullptr;
+    void const* alertContext = nullptr;
+};
 
 ManagementInterface::ManagementInterface()
     : nextNodeId_(0), miId_(0), loadCallBack_(nullptr), loadCallBackContext_(nullptr),
-      lookupCallBack_(nullptr), alertCallBack_(nullptr), alertContext_(nullptr), deleteHint_(0)
+      lookupCallBack_(nullptr), own_(std::make_unique<Own>())
 {
 }
 
@@ -33,6 +58,7 @@ ManagementInterface::~ManagementInterface() = default;
 
 Error ManagementInterface::getMap(std::vector<Node*>& nodes)
 {
+    std::lock_guard const held(own_->listLock);
     nodes = nodes_;
     return success();
 }
@@ -47,8 +73,8 @@ Error ManagementInterface::initialize(unsigned int first, Number const&, Number 
 
 Error ManagementInterface::registerForAlerts(AlertCallBack callBack, void const* context)
 {
-    alertCallBack_ = callBack;
-    alertContext_ = context;
+    own_->alertCallBack = callBack;
+    own_->alertContext = context;
     return success();
 }
 
@@ -60,8 +86,11 @@ Error ManagementInterface::deRegisterForAlerts()
 void ManagementInterface::unload()
 {
     std::vector<Node*> nodes;
-    nodes.swap(nodes_);
-    deleteHint_ = 0;
+    {
+        std::lock_guard const held(own_->listLock);
+        nodes.swap(nodes_);
+        own_->deleteHint = 0;
+    }
     for (Node* node : nodes)
         delete node;
 }
@@ -75,9 +104,12 @@ Error ManagementInterface::addNewNode(Node*& node)
 {
     if (!node)
         return failure("no node given");
-    // A node just built stands at the end of the list, so the search starts there.
-    if (std::find(nodes_.rbegin(), nodes_.rend(), node) == nodes_.rend())
-        nodes_.push_back(node);
+    {
+        std::lock_guard const held(own_->listLock);
+        // A node just built stands at the end of the list, so the search starts there.
+        if (std::find(nodes_.rbegin(), nodes_.rend(), node) == nodes_.rend())
+            nodes_.push_back(node);
+    }
     if (mihost::NodeObserver* observer = mihost::nodeObserver())
         observer->nodeAdded(*node);
     return loadCallBack_ ? loadCallBack_(node, loadCallBackContext_) : success();
@@ -85,15 +117,11 @@ Error ManagementInterface::addNewNode(Node*& node)
 
 Error ManagementInterface::deleteNode(Node* node)
 {
-    // Nodes of one kind are deleted in the order in which they stand, so the next one is mostly
-    // where the last one was.
-    if (deleteHint_ >= nodes_.size() || nodes_[deleteHint_] != node) {
-        auto const found = std::find(nodes_.begin(), nodes_.end(), node);
-        if (found == nodes_.end())
+    {
+        std::lock_guard const held(own_->listLock);
+        if (!unlist(nodes_, own_->deleteHint, node))
             return failure("no such node");
-        deleteHint_ = static_cast<std::size_t>(found - nodes_.begin());
     }
-    nodes_.erase(nodes_.begin() + static_cast<std::ptrdiff_t>(deleteHint_));
     if (mihost::NodeObserver* observer = mihost::nodeObserver())
         observer->nodeDeleted(*node);
     delete node;
@@ -102,6 +130,7 @@ Error ManagementInterface::deleteNode(Node* node)
 
 Error ManagementInterface::getNode(std::string const& id, Node*& node)
 {
+    std::lock_guard const held(own_->listLock);
     auto const found = std::find_if(nodes_.begin(), nodes_.end(), [&id](Node* candidate) {
         auto const* mutableNode = dynamic_cast<MutableNode const*>(candidate);
         return mutableNode && std::to_string(mutableNode->getNodeId()) == id;

@@ -21,7 +21,7 @@ Mutex::~Mutex() = default;
 
 int Mutex::lock(unsigned long timeout)
 {
-    if (timeout == withoutLimit) {
+    if (timeout >= withoutLimit) {
         handle_->mutex.lock();
         return 0;
     }

@@ -1,6 +1,7 @@
 #include "host/PropertyValue.h"
 
 #include <charconv>
+#include <climits>
 #include <ctime>
 #include <ostream>
 
@@ -134,7 +135,8 @@ PropertyValue::operator unsigned int() const
 {
     if (auto const* text = std::get_if<std::string>(&content_))
         return decimal(*text);
-    return static_cast<unsigned int>(getNumber());
+    long long const number = getNumber();
+    return number >= 0 && number <= UINT_MAX ? static_cast<unsigned int>(number) : 0;
 }
 
 PropertyValue::KindType PropertyValue::getKind() const

@@ -1,5 +1,6 @@
 #include "host/VXMessageBuffer.h"
 
+#include <locale>
 #include <ostream>
 #include <streambuf>
 
@@ -35,7 +36,10 @@ private:
 } // namespace
 
 struct VXMessageBuffer::Stream {
-    explicit Stream(std::string& text) : buffer(text), out(&buffer) {}
+    explicit Stream(std::string& text) : buffer(text), out(&buffer)
+    {
+        out.imbue(std::locale::classic()); // plain digits, whatever the host's own locale groups
+    }
 
     AppendToString buffer;
     std::ostream out;

@@ -1,0 +1,357 @@
+// The reference runtime's management interface.
+
+#include "host/ManagementInterface.h"
+#include "host/MutableNode.h"
+
+#include "mihost/runtime/Runtime.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <random>
+#include <string>
+#include <thread>
+#include <vector>
+
+namespace
+{
+
+using IC::Error;
+using IC::ManagementInterface;
+using IC::MutableNode;
+using IC::Node;
+using IC::Number;
+
+using Events = std::vector<std::string>;
+using Nodes = std::vector<Node*>;
+
+class Interface : public ManagementInterface
+{
+public:
+    using ManagementInterface::loadCallBack_;
+    using ManagementInterface::loadCallBackContext_;
+    using ManagementInterface::lookupCallBack_;
+    using ManagementInterface::miId_;
+    using ManagementInterface::miIds_;
+    using ManagementInterface::nextNodeId_;
+    using ManagementInterface::nodes_;
+};
+
+/** A node that says when it goes. */
+class Mortal : public MutableNode
+{
+public:
+    Mortal(unsigned int id, Events& events) : MutableNode(id, 0, {1}, 46, 0), events_(events) {}
+
+    ~Mortal() override
+    {
+        events_.push_back("gone " + std::to_string(getNodeId()));
+    }
+
+private:
+    Events& events_;
+};
+
+/** Notes what the host is told, and whether the node is listed at that moment. */
+class Host : public mihost::NodeObserver
+{
+public:
+    Host(ManagementInterface& managementInterface, Events& events)
+        : interface_(managementInterface), events_(events)
+    {
+        mihost::setNodeObserver(this);
+    }
+
+    ~Host() override
+    {
+        mihost::setNodeObserver(nullptr);
+    }
+
+    void nodeAdded(Node const& node) override
+    {
+        note("added", node);
+    }
+
+    void nodeDeleted(Node const& node) override
+    {
+        note("deleted", node);
+    }
+
+private:
+    void note(char const* what, Node const& node)
+    {
+        Nodes nodes;
+        interface_.getMap(nodes);
+        bool const listed = std::find(nodes.begin(), nodes.end(), &node) != nodes.end();
+        events_.push_back(std::string(what) + (listed ? " listed " : " unlisted ") +
+                          std::to_string(dynamic_cast<MutableNode const&>(node).getNodeId()));
+    }
+
+    ManagementInterface& interface_;
+    Events& events_;
+};
+
+class RuntimeInterface : public testing::Test
+{
+protected:
+    ~RuntimeInterface() override
+    {
+        interface_.unload();
+    }
+
+    Node* add(unsigned int id)
+    {
+        Node* node = new Mortal(id, events_);
+        EXPECT_EQ(interface_.addNewNode(node).getStatus(), 0U);
+        return node;
+    }
+
+    std::vector<unsigned int> listed()
+    {
+        Nodes nodes;
+        EXPECT_EQ(interface_.getMap(nodes).getStatus(), 0U);
+        std::vector<unsigned int> ids;
+        for (Node* node : nodes)
+            ids.push_back(dynamic_cast<MutableNode&>(*node).getNodeId());
+        return ids;
+    }
+
+    Events events_;
+    Interface interface_;
+};
+
+using Ids = std::vector<unsigned int>;
+
+TEST_F(RuntimeInterface, CountsNodeIdsFromItsOwnIdOn)
+{
+    EXPECT_EQ(interface_.initialize(7, Number(1U), Number(true)).getStatus(), 0U);
+    EXPECT_EQ(interface_.miId_, 7U);
+    EXPECT_EQ(interface_.miIds_, Ids{7});
+    EXPECT_EQ(interface_.nextNodeId_, 8U);
+    EXPECT_TRUE(interface_.nodes_.empty());
+    EXPECT_EQ(static_cast<std::string>(interface_), "management interface 7");
+}
+
+TEST_F(RuntimeInterface, StartsItsIdListAfresh)
+{
+    interface_.miIds_ = {3, 4};
+    interface_.initialize(7, Number(0U), Number(0U));
+    EXPECT_EQ(interface_.miIds_, Ids{7});
+}
+
+TEST_F(RuntimeInterface, CopiesTheNodeListInPlaceOfWhatTheCallerHad)
+{
+    Node* const node = add(2);
+    Nodes nodes(3, nullptr);
+    EXPECT_EQ(interface_.getMap(nodes).getStatus(), 0U);
+    EXPECT_EQ(nodes, Nodes{node});
+    nodes.clear();
+    EXPECT_EQ(listed(), Ids{2});
+}
+
+TEST_F(RuntimeInterface, ListsNodesThatTheInterfaceAppendedItself)
+{
+    interface_.nodes_.push_back(new Mortal(2, events_));
+    EXPECT_EQ(listed(), Ids{2});
+}
+
+TEST_F(RuntimeInterface, ListsANewNodeAndTellsTheHost)
+{
+    Host const host(interface_, events_);
+    add(2);
+    EXPECT_EQ(listed(), Ids{2});
+    EXPECT_EQ(events_, Events{"added listed 2"});
+}
+
+TEST_F(RuntimeInterface, NeverListsANodeTwice)
+{
+    Node* node = add(2);
+    add(3);
+    Host const host(interface_, events_);
+    EXPECT_EQ(interface_.addNewNode(node).getStatus(), 0U);
+    EXPECT_EQ(listed(), (Ids{2, 3}));
+    EXPECT_EQ(events_, Events{"added listed 2"});
+}
+
+TEST_F(RuntimeInterface, RefusesNoNodeAtAll)
+{
+    Host const host(interface_, events_);
+    Node* none = nullptr;
+    EXPECT_EQ(interface_.addNewNode(none).getStatus(), 1U);
+    EXPECT_TRUE(listed().empty());
+    EXPECT_TRUE(events_.empty());
+}
+
+struct Load {
+    std::vector<Node*> nodes;
+    unsigned char answer = 0;
+};
+
+Error load(Node* const& node, void const* context)
+{
+    auto& seen = *static_cast<Load*>(const_cast<void*>(context));
+    seen.nodes.push_back(node);
+    return {seen.answer, Number(0U), "from the host"};
+}
+
+Error lookUp(std::string const&, Node**)
+{
+    return {0, Number(0U), ""};
+}
+
+TEST_F(RuntimeInterface, RemembersTheCallBacksAndCallsNeither)
+{
+    Load seen;
+    interface_.setLoadCallBack(load, &seen, lookUp);
+    EXPECT_EQ(interface_.loadCallBack_, &load);
+    EXPECT_EQ(interface_.loadCallBackContext_, &seen);
+    EXPECT_EQ(interface_.lookupCallBack_, &lookUp);
+    EXPECT_TRUE(seen.nodes.empty());
+}
+
+TEST_F(RuntimeInterface, HandsANewNodeToTheLoadCallBack)
+{
+    Load seen;
+    interface_.setLoadCallBack(load, &seen, nullptr);
+    Node* const node = add(2);
+    EXPECT_EQ(seen.nodes, Nodes{node});
+    Node* again = node;
+    interface_.addNewNode(again);
+    EXPECT_EQ(seen.nodes, (Nodes{node, node}));
+}
+
+TEST_F(RuntimeInterface, ReturnsTheHostsAnswerAndKeepsARefusedNode)
+{
+    Load seen;
+    seen.answer = 5;
+    interface_.setLoadCallBack(load, &seen, nullptr);
+    Node* node = new Mortal(2, events_);
+    Error const error = interface_.addNewNode(node);
+    EXPECT_EQ(error.getStatus(), 5U);
+    EXPECT_EQ(static_cast<std::string>(error), "status 5: from the host");
+    EXPECT_EQ(listed(), Ids{2});
+    EXPECT_TRUE(events_.empty());
+}
+
+TEST_F(RuntimeInterface, UnlistsANodeTellsTheHostAndDeletesIt)
+{
+    Node* const node = add(2);
+    add(3);
+    Host const host(interface_, events_);
+    EXPECT_EQ(interface_.deleteNode(node).getStatus(), 0U);
+    EXPECT_EQ(events_, (Events{"deleted unlisted 2", "gone 2"}));
+    EXPECT_EQ(listed(), Ids{3});
+}
+
+TEST_F(RuntimeInterface, AnswersStatus1ForANodeThatItDoesNotList)
+{
+    add(2);
+    Mortal stranger(9, events_);
+    Host const host(interface_, events_);
+    EXPECT_EQ(interface_.deleteNode(&stranger).getStatus(), 1U);
+    EXPECT_EQ(interface_.deleteNode(nullptr).getStatus(), 1U);
+    EXPECT_TRUE(events_.empty());
+    EXPECT_EQ(listed(), Ids{2});
+}
+
+TEST_F(RuntimeInterface, AnswersStatus1WhenItListsNothing)
+{
+    Mortal stranger(9, events_);
+    EXPECT_EQ(interface_.deleteNode(&stranger).getStatus(), 1U);
+}
+
+TEST_F(RuntimeInterface, DeletesNodesInAnyOrder)
+{
+    std::mt19937 random(17);
+    for (int round = 0; round < 50; ++round) {
+        Nodes nodes;
+        for (unsigned int id = 0; id < 20; ++id)
+            nodes.push_back(add(id));
+        Ids order(20);
+        for (unsigned int id = 0; id < 20; ++id)
+            order[id] = id;
+        if (round > 1)
+            std::shuffle(order.begin(), order.end(), random);
+        else if (round == 1)
+            std::reverse(order.begin(), order.end());
+
+        Ids left = listed();
+        for (unsigned int const id : order) {
+            events_.clear();
+            EXPECT_EQ(interface_.deleteNode(nodes[id]).getStatus(), 0U);
+            EXPECT_EQ(events_, Events{"gone " + std::to_string(id)});
+            left.erase(std::find(left.begin(), left.end(), id));
+            ASSERT_EQ(listed(), left);
+        }
+    }
+}
+
+TEST_F(RuntimeInterface, DeletesEveryNodeWhenItIsUnloaded)
+{
+    add(2);
+    interface_.nodes_.push_back(new Mortal(3, events_));
+    interface_.unload();
+    EXPECT_EQ(events_, (Events{"gone 2", "gone 3"}));
+    EXPECT_TRUE(listed().empty());
+    interface_.unload();
+    EXPECT_EQ(events_.size(), 2U);
+}
+
+TEST_F(RuntimeInterface, FindsANodeByTheTextOfItsId)
+{
+    add(12);
+    Node* const wanted = add(1);
+    Node* found = nullptr;
+    EXPECT_EQ(interface_.getNode("1", found).getStatus(), 0U);
+    EXPECT_EQ(found, wanted);
+}
+
+TEST_F(RuntimeInterface, AnswersStatus1ForAnIdThatNoNodeHas)
+{
+    Node* const node = add(1);
+    for (char const* id : {"2", "", "01", "1 ", "one"}) {
+        Node* found = node;
+        Error const error = interface_.getNode(id, found);
+        EXPECT_EQ(error.getStatus(), 1U) << id;
+        EXPECT_EQ(static_cast<std::string>(error),
+                  std::string("status 1: no node has the id ") + id);
+        EXPECT_EQ(found, node);
+    }
+}
+
+TEST_F(RuntimeInterface, TakesAndDropsAListenerForAlerts)
+{
+    auto const listener = [](std::vector<IC::Alert> const&, void const*) -> Error {
+        return {0, Number(0U), ""};
+    };
+    EXPECT_EQ(interface_.registerForAlerts(listener, nullptr).getStatus(), 0U);
+    EXPECT_EQ(interface_.deRegisterForAlerts().getStatus(), 0U);
+}
+
+TEST_F(RuntimeInterface, LetsThreadsRebuildNodesOfDifferentKindsAtOnce)
+{
+    auto const rebuild = [this](unsigned int first) {
+        Events own;
+        for (int round = 0; round < 20; ++round) {
+            Nodes nodes;
+            for (unsigned int id = first; id < first + 50; ++id) {
+                nodes.push_back(new Mortal(id, own));
+                interface_.addNewNode(nodes.back());
+            }
+            Nodes seen;
+            interface_.getMap(seen);
+            Node* found = nullptr;
+            EXPECT_EQ(interface_.getNode(std::to_string(first), found).getStatus(), 0U);
+            EXPECT_EQ(found, nodes.front());
+            for (Node* node : nodes)
+                EXPECT_EQ(interface_.deleteNode(node).getStatus(), 0U);
+        }
+        EXPECT_EQ(own.size(), 20U * 50U);
+    };
+    std::thread other(rebuild, 1000);
+    rebuild(2000);
+    other.join();
+    EXPECT_TRUE(listed().empty());
+}
+
+} // namespace

@@ -1,0 +1,324 @@
+// The reference runtime's value types.
+
+#include "host/Alert.h"
+#include "host/Error.h"
+#include "host/PropertyValue.h"
+#include "util/MyProcess.h"
+
+#include <gtest/gtest.h>
+
+#include <climits>
+#include <cstdlib>
+#include <sstream>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using IC::EnumValue;
+using IC::Error;
+using IC::Number;
+using IC::PropertyValue;
+
+std::string asText(PropertyValue const& value)
+{
+    return value;
+}
+
+unsigned int asUnsigned(PropertyValue const& value)
+{
+    return value;
+}
+
+void useZone(char const* zone)
+{
+    setenv("TZ", zone, 1);
+    tzset();
+}
+
+PropertyValue date(long seconds)
+{
+    return {Number(seconds, 0), true};
+}
+
+TEST(Number, KnowsItsKindAndItsValue)
+{
+    Number const number(4294967295U);
+    EXPECT_EQ(number.getKind(), Number::UnsignedKind);
+    EXPECT_EQ(number.getValue(), 4294967295);
+
+    Number const truth(true);
+    EXPECT_EQ(truth.getKind(), Number::BooleanKind);
+    EXPECT_EQ(truth.getValue(), 1);
+    EXPECT_EQ(Number(false).getValue(), 0);
+
+    Number const time(-86400L, 250);
+    EXPECT_EQ(time.getKind(), Number::DateKind);
+    EXPECT_EQ(time.getValue(), -86400);
+    EXPECT_EQ(time.getSubSeconds(), 250);
+
+    Number const empty(Number::EmptyKind);
+    EXPECT_EQ(empty.getKind(), Number::EmptyKind);
+    EXPECT_EQ(empty.getValue(), 0);
+    EXPECT_EQ(empty.getSubSeconds(), 0);
+}
+
+TEST(Number, ReadsAsZeroWhenItHasAKindButNoValue)
+{
+    Number const number(Number::DateKind);
+    EXPECT_EQ(number.getKind(), Number::DateKind);
+    EXPECT_EQ(number.getValue(), 0);
+}
+
+TEST(Number, IsCopiedWhole)
+{
+    Number copy(Number::EmptyKind);
+    copy = Number(77L, 5);
+    Number const again(copy);
+    EXPECT_EQ(again.getKind(), Number::DateKind);
+    EXPECT_EQ(again.getValue(), 77);
+    EXPECT_EQ(again.getSubSeconds(), 5);
+}
+
+TEST(EnumValue, TakesWideAndShortNumbers)
+{
+    EXPECT_EQ(EnumValue(4294967295U).getValue(), 4294967295U);
+    EXPECT_EQ(EnumValue(static_cast<unsigned short>(65535)).getValue(), 65535U);
+    EnumValue copy(1U);
+    copy = EnumValue(35U);
+    EXPECT_EQ(copy.getValue(), 35U);
+}
+
+TEST(Error, GivesItsStatusAsANumberAndAsAnEnumeration)
+{
+    Error const success(0, Number(0U), "");
+    EXPECT_EQ(success.getStatus(), 0U);
+    EXPECT_EQ(static_cast<Error::StatusType>(success), Error::Success);
+
+    Error const failure(1, Number(Number::EmptyKind), "");
+    EXPECT_EQ(failure.getStatus(), 1U);
+    EXPECT_EQ(static_cast<Error::StatusType>(failure), Error::Failure);
+
+    EXPECT_EQ(static_cast<unsigned int>(static_cast<Error::StatusType>(Error(255, Number(0U), ""))),
+              255U);
+}
+
+TEST(Error, PrintsItsStatusAndItsTextIfAny)
+{
+    EXPECT_EQ(static_cast<std::string>(Error(0, Number(0U), "")), "status 0");
+    EXPECT_EQ(static_cast<std::string>(Error(200, Number(0U), "no room")), "status 200: no room");
+}
+
+TEST(Error, IsCopiedWhole)
+{
+    Error copy(0, Number(0U), "");
+    copy = Error(3, Number(1U), "reason");
+    EXPECT_EQ(static_cast<std::string>(Error(copy)), "status 3: reason");
+}
+
+TEST(Alert, CarriesANodeAndAText)
+{
+    IC::Alert copy(1, "");
+    copy = IC::Alert(17, "full");
+    EXPECT_EQ(copy.getNodeId(), 17U);
+    EXPECT_EQ(IC::Alert(copy).getText(), "full");
+}
+
+struct ValueCase {
+    char const* name;
+    PropertyValue value;
+    PropertyValue::KindType kind;
+    std::string text;
+    unsigned int asUnsigned;
+    long long number;
+};
+
+void PrintTo(ValueCase const& test, std::ostream* out)
+{
+    *out << test.name;
+}
+
+class ValueConversion : public testing::TestWithParam<ValueCase>
+{
+};
+
+PropertyValue numbers(std::vector<Number> const& list)
+{
+    return {list, true};
+}
+
+PropertyValue texts(std::vector<std::string> const& list)
+{
+    return {list, true};
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Of, ValueConversion,
+    testing::Values(
+        ValueCase{"text", {"jdoe", true}, PropertyValue::TextKind, "jdoe", 0, 0},
+        ValueCase{"stringText",
+                  {std::string("a\0b", 3), true},
+                  PropertyValue::TextKind,
+                  std::string("a\0b", 3),
+                  0,
+                  0},
+        ValueCase{"emptyText", {"", true}, PropertyValue::TextKind, "", 0, 0},
+        ValueCase{"decimalText", {"9", true}, PropertyValue::TextKind, "9", 9, 0},
+        ValueCase{"paddedText", {"0009", true}, PropertyValue::TextKind, "0009", 9, 0},
+        ValueCase{"largestText",
+                  {"4294967295", true},
+                  PropertyValue::TextKind,
+                  "4294967295",
+                  4294967295U,
+                  0},
+        ValueCase{
+            "tooLargeText", {"4294967296", true}, PropertyValue::TextKind, "4294967296", 0, 0},
+        ValueCase{
+            "wrappingText", {"4294967305", true}, PropertyValue::TextKind, "4294967305", 0, 0},
+        ValueCase{"blankBefore", {" 9", true}, PropertyValue::TextKind, " 9", 0, 0},
+        ValueCase{"blankBehind", {"9 ", true}, PropertyValue::TextKind, "9 ", 0, 0},
+        ValueCase{"plusSign", {"+9", true}, PropertyValue::TextKind, "+9", 0, 0},
+        ValueCase{"minusSign", {"-9", true}, PropertyValue::TextKind, "-9", 0, 0},
+        ValueCase{"hexadecimal", {"0x9", true}, PropertyValue::TextKind, "0x9", 0, 0},
+        ValueCase{"fraction", {"9.0", true}, PropertyValue::TextKind, "9.0", 0, 0},
+        ValueCase{"number", {Number(42U), true}, PropertyValue::NumberKind, "42", 42, 42},
+        ValueCase{"largestNumber",
+                  {Number(4294967295U), true},
+                  PropertyValue::NumberKind,
+                  "4294967295",
+                  4294967295U,
+                  4294967295},
+        ValueCase{"true_", {Number(true), true}, PropertyValue::BooleanKind, "true", 1, 1},
+        ValueCase{"false_", {Number(false), true}, PropertyValue::BooleanKind, "false", 0, 0},
+        ValueCase{
+            "enumeration", {EnumValue(35U), true}, PropertyValue::EnumerationKind, "35", 35, 35},
+        ValueCase{
+            "emptyNumber", {Number(Number::EmptyKind), true}, PropertyValue::EmptyKind, "", 0, 0},
+        ValueCase{"empty", {PropertyValue::EmptyKind, true}, PropertyValue::EmptyKind, "", 0, 0},
+        ValueCase{"emptyOfAKind",
+                  {PropertyValue::NumbersKind, true},
+                  PropertyValue::NumbersKind,
+                  "",
+                  0,
+                  0},
+        ValueCase{"numbers", numbers({Number(0U), Number(1U), Number(24U)}),
+                  PropertyValue::NumbersKind, "0,1,24", 0, 0},
+        ValueCase{"oneNumber", numbers({Number(9U)}), PropertyValue::NumbersKind, "9", 0, 0},
+        ValueCase{"mixedNumbers", numbers({Number(true), Number(Number::EmptyKind), Number(2U)}),
+                  PropertyValue::NumbersKind, "true,,2", 0, 0},
+        ValueCase{"noNumbers", numbers({}), PropertyValue::NumbersKind, "", 0, 0},
+        ValueCase{"texts", texts({"jdoe", "", "a,b"}), PropertyValue::TextsKind, "jdoe,,a,b", 0, 0},
+        ValueCase{"noTexts", texts({}), PropertyValue::TextsKind, "", 0, 0}),
+    [](auto const& test) { return std::string(test.param.name); });
+
+TEST_P(ValueConversion, KnowsItsKindItsTextAndItsNumber)
+{
+    EXPECT_EQ(GetParam().value.getKind(), GetParam().kind);
+    EXPECT_EQ(asText(GetParam().value), GetParam().text);
+    EXPECT_EQ(asUnsigned(GetParam().value), GetParam().asUnsigned);
+    EXPECT_EQ(GetParam().value.getNumber(), GetParam().number);
+}
+
+TEST_P(ValueConversion, WritesItsTextToAStream)
+{
+    std::ostringstream out;
+    out << "[" << GetParam().value << "]";
+    EXPECT_EQ(out.str(), "[" + GetParam().text + "]");
+}
+
+TEST_P(ValueConversion, SurvivesCopyAndAssignment)
+{
+    PropertyValue copy("before", !GetParam().value.getFlag());
+    copy = GetParam().value;
+    PropertyValue const again(copy);
+    copy = PropertyValue("after", false);
+    EXPECT_EQ(again.getKind(), GetParam().kind);
+    EXPECT_EQ(again.getFlag(), GetParam().value.getFlag());
+    EXPECT_EQ(asText(again), GetParam().text);
+}
+
+TEST(PropertyValue, KeepsItsFlag)
+{
+    for (bool const flag : {true, false}) {
+        EXPECT_EQ(PropertyValue("", flag).getFlag(), flag);
+        EXPECT_EQ(PropertyValue(std::string(), flag).getFlag(), flag);
+        EXPECT_EQ(PropertyValue(Number(1U), flag).getFlag(), flag);
+        EXPECT_EQ(PropertyValue(EnumValue(1U), flag).getFlag(), flag);
+        EXPECT_EQ(PropertyValue(std::vector<Number>(), flag).getFlag(), flag);
+        EXPECT_EQ(PropertyValue(std::vector<std::string>(), flag).getFlag(), flag);
+        EXPECT_EQ(PropertyValue(PropertyValue::EmptyKind, flag).getFlag(), flag);
+    }
+}
+
+TEST(PropertyValue, TakesTheSecondsOfADateForANumberWhereTheyFit)
+{
+    EXPECT_EQ(asUnsigned(date(86400)), 86400U);
+    EXPECT_EQ(date(86400).getKind(), PropertyValue::DateKind);
+    EXPECT_EQ(date(-86400).getNumber(), -86400);
+    EXPECT_EQ(asUnsigned(date(-86400)), 0U);
+    // One that does not fit must not turn into a command, such as 9, by wrapping.
+    if constexpr (sizeof(long) > 4) {
+        EXPECT_EQ(asUnsigned(date(0xFFFFFFFF)), 0xFFFFFFFFU);
+        EXPECT_EQ(asUnsigned(date(0x100000009)), 0U);
+    }
+}
+
+TEST(PropertyValue, YieldsTheListsItHolds)
+{
+    std::vector<Number> const list = numbers({Number(0U), Number(24U)}).getNumbers();
+    ASSERT_EQ(list.size(), 2U);
+    EXPECT_EQ(list[1].getValue(), 24);
+    EXPECT_EQ(texts({"a", "b"}).getTexts(), (std::vector<std::string>{"a", "b"}));
+}
+
+TEST(PropertyValue, YieldsAnEmptyListOfAKindItDoesNotHold)
+{
+    EXPECT_TRUE(texts({"a"}).getNumbers().empty());
+    EXPECT_TRUE(numbers({Number(1U)}).getTexts().empty());
+    EXPECT_TRUE(PropertyValue("a", true).getTexts().empty());
+}
+
+TEST(PropertyValue, GivesADateInLocalTime)
+{
+    useZone("UTC0");
+    EXPECT_EQ(asText(date(1273659825)), "2010-05-12 10:23:45");
+    EXPECT_EQ(asText(date(0)), "1970-01-01 00:00:00");
+    EXPECT_EQ(asText(date(-1)), "1969-12-31 23:59:59");
+    useZone("CET-1CEST,M3.5.0,M10.5.0/3");
+    EXPECT_EQ(asText(date(1273659825)), "2010-05-12 12:23:45");
+    EXPECT_EQ(asText(date(1263291825)), "2010-01-12 11:23:45");
+}
+
+TEST(PropertyValue, GivesADateBackInTheFormThatIsScannedForADay)
+{
+    useZone("CET-1CEST,M3.5.0,M10.5.0/3");
+    for (int month = 1; month <= 12; ++month) {
+        time_t const midnight = NQ::ito_time_t(2026, month, 28, 0, 0, 0, 0, -1);
+        int year = 0, readMonth = 0, day = 0;
+        std::string const text = asText(date(midnight));
+        EXPECT_EQ(std::sscanf(text.c_str(), "%4d-%2d-%2d 00:00:00", &year, &readMonth, &day), 3);
+        EXPECT_EQ(text.substr(10), " 00:00:00");
+        EXPECT_EQ(year, 2026);
+        EXPECT_EQ(readMonth, month);
+        EXPECT_EQ(day, 28);
+    }
+}
+
+TEST(PropertyValue, GivesADateBeyondTheCalendarAsItsSeconds)
+{
+    useZone("UTC0");
+    if (sizeof(long) == 4) {
+        EXPECT_EQ(asText(date(LONG_MAX)), "2038-01-19 03:14:07");
+    } else {
+        EXPECT_EQ(asText(date(LONG_MAX)), std::to_string(LONG_MAX));
+    }
+}
+
+TEST(PropertyValue, JoinsDatesLikeOtherNumbers)
+{
+    useZone("UTC0");
+    EXPECT_EQ(asText(numbers({Number(0L, 0), Number(7U)})), "1970-01-01 00:00:00,7");
+}
+
+} // namespace

@@ -41,9 +41,9 @@ void readEntry(logInfo& log, unsigned int index, char (&entry)[lineSize])
 /** Whether the index is one that can be read; if not, says so. */
 bool isReadable(logInfo& log, unsigned int index, char const* label, char const* function)
 {
-    unsigned int const count = log.getMaxLine();
-    // Kept: counted anew for the message, also when there will be none.
+    // Kept: counted once for the message, also when there will be none, and anew to compare.
     unsigned int const countForMessage = log.getMaxLine();
+    unsigned int const count = log.getMaxLine();
     if (count + 1 >= index)
         return true;
     LOG::write(unit, LOG::error,

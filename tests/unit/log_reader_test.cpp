@@ -257,9 +257,9 @@ TEST_F(LogReader, FetchesTheLineThatTheLastCountNames)
     EXPECT_EQ(data(1), "*newest of all*");
 }
 
-TEST_F(LogReader, RefusesByTheFirstCountAndNamesTheSecond)
+TEST_F(LogReader, NamesTheFirstCountAndRefusesByTheSecond)
 {
-    commands.first[wc] = {"10 f\n", "12 f\n"};
+    commands.first[wc] = {"12 f\n", "10 f\n"};
     Recording const recording;
     std::string text;
     EXPECT_FALSE(log.getData(text, 12));

@@ -60,6 +60,10 @@ std::vector<Call> recorded(std::string const& program)
 
 void lay(std::string const& name)
 {
+    // What tells one distribution from another is the file that is there and those that are not.
+    for (char const* release : {"/etc/release", "/etc/vmware-release", "/etc/redhat-release",
+                                "/etc/SuSE-release", "/etc/UnitedLinux-release"})
+        remove(release);
     mihost::layOver(MACHINES_DIR "/" + name);
 }
 

@@ -13,7 +13,10 @@
 namespace machine
 {
 
-/** Lays the files of tests/machines/NAME over the copy, all owned by root. */
+/**
+ * Lays the files of tests/machines/NAME over the copy, all owned by root. Release files that are
+ * not among them are removed; everything else of this machine stays.
+ */
 void lay(std::string const& name);
 
 /** Notes every command line given to /bin/sh from now on; each is then run by the real shell. */

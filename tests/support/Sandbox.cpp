@@ -33,6 +33,9 @@ bool sandboxIsRequired()
 
 int runTestsInSandbox(int argc, char* argv[])
 {
+    // What commands are found and how they speak is no matter of who runs the tests.
+    setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
+    setenv("LC_ALL", "C", 1);
     testing::InitGoogleTest(&argc, argv);
     if (!testing::GTEST_FLAG(list_tests)) {
         if (auto const reason = mihost::enterSandbox({})) {

@@ -123,26 +123,25 @@ TEST(Copy, LetsRootAdministerItAllTheSame)
 
 TEST(Copy, ReapsProcessesWhoseParentIsGone)
 {
-    int ends[2];
-    ASSERT_EQ(pipe(ends), 0);
+    int number[2];
+    int life[2];
+    ASSERT_EQ(pipe(number), 0);
+    ASSERT_EQ(pipe(life), 0);
     pid_t const child = fork();
     if (child == 0) {
         pid_t const orphan = fork();
         if (orphan == 0) {
-            // Ends once the parent, and with it the pipe's only other user, has gone.
+            // Ends once nobody else can write: when its parent has gone and the test lets it.
             char end = 0;
-            close(ends[1]);
-            _exit(read(ends[0], &end, 1) == 0 ? 0 : 1);
+            close(life[1]);
+            _exit(read(life[0], &end, 1) == 0 ? 0 : 1);
         }
-        if (write(ends[1], &orphan, sizeof orphan) != sizeof orphan)
-            _exit(1);
-        waitpid(orphan, nullptr, WNOHANG);
-        _exit(0);
+        _exit(write(number[1], &orphan, sizeof orphan) == sizeof orphan ? 0 : 1);
     }
     pid_t orphan = 0;
-    ASSERT_EQ(read(ends[0], &orphan, sizeof orphan), static_cast<ssize_t>(sizeof orphan));
+    ASSERT_EQ(read(number[0], &orphan, sizeof orphan), static_cast<ssize_t>(sizeof orphan));
     waitpid(child, nullptr, 0);
-    close(ends[1]);
+    close(life[1]);
     while (kill(orphan, 0) == 0) // a process that nobody reaps keeps its number for ever
         sched_yield();
     EXPECT_EQ(errno, ESRCH);

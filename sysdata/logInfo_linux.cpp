@@ -2,6 +2,7 @@
 
 #include "sysdata/logInfo_parse.h"
 #include "util/MyProcess.h"
+#include "util/file.h"
 #include "util/log.h"
 #include "util/text.h"
 
@@ -21,7 +22,6 @@ using LOGINFO::stampLength;
 
 LOG::Unit const unit{loggerLogInfo, "logInfo_linux"};
 
-constexpr char file[] = "/var/log/messages";
 constexpr char countCommand[] = "wc -l /var/log/messages";
 constexpr char fetchCommand[] = "sed -n '%dp' /var/log/messages";
 
@@ -146,11 +146,8 @@ bool logInfo::getCreationTime(long& time, unsigned int index)
 bool logInfo::clearLog()
 {
     LOG::Scope const scope(unit);
-    FILE* const log = std::fopen(file, "w");
-    if (!log)
-        return false;
-    std::fclose(log);
-    return true;
+    FILES::File const log("/var/log/messages", "w");
+    return log.stream() != nullptr;
 }
 
 void logInfo::strreplace(char* str, char from, char to)

@@ -75,7 +75,7 @@ public:
 };
 
 /** A stored property as shown() writes it; "unset" where there is none. */
-inline std::string stored(IC::Node const& node, unsigned int id)
+inline std::string storedValue(IC::Node const& node, unsigned int id)
 {
     auto const properties = node.getProperties();
     auto const found = properties.find(id);

@@ -125,6 +125,13 @@ int realUname(struct utsname* system)
     return real(system);
 }
 
+void refuse(std::string const& command)
+{
+    hooks().popen = [command](char const* asked, char const* mode) -> FILE* {
+        return asked == command ? nullptr : realPopen(asked, mode);
+    };
+}
+
 HookGuard::~HookGuard()
 {
     hooks() = {};

@@ -59,6 +59,9 @@ int realFgetspent_r(FILE* stream, struct spwd* entry, char* buffer, std::size_t 
 char* realFgets(char* buffer, int size, FILE* stream);
 int realUname(struct utsname* system);
 
+/** From now on this command, and it alone, cannot be started: popen yields null. */
+void refuse(std::string const& command);
+
 /** Takes all hooks away when it goes. */
 class HookGuard
 {

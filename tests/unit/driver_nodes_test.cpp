@@ -71,11 +71,11 @@ TEST_F(DriverNodes, HoldFourTexts)
     ASSERT_EQ(drivers().size(), 3U);
     IC::MutableNode const& xfs = *drivers()[0];
     EXPECT_EQ(xfs.getProperties().size(), 4U);
-    EXPECT_EQ(stored(xfs, 134), "text 1.2 true");
-    EXPECT_EQ(stored(xfs, 108), "text xfs true");
-    EXPECT_EQ(stored(xfs, 70), "text  true");
-    EXPECT_EQ(stored(xfs, 36), "text  true");
-    EXPECT_EQ(stored(*drivers()[1], 134), "text  true");
+    EXPECT_EQ(storedValue(xfs, 134), "text 1.2 true");
+    EXPECT_EQ(storedValue(xfs, 108), "text xfs true");
+    EXPECT_EQ(storedValue(xfs, 70), "text  true");
+    EXPECT_EQ(storedValue(xfs, 36), "text  true");
+    EXPECT_EQ(storedValue(*drivers()[1], 134), "text  true");
 }
 
 TEST_F(DriverNodes, AreSetUpInTheOrderThatHostsSee)

@@ -96,12 +96,12 @@ TEST_F(LogNodes, HaveSixPropertiesOnTheLog)
 {
     frame.createLogNodes();
     EXPECT_EQ(frame.logNode_->getProperties().size(), 6U);
-    EXPECT_EQ(stored(*frame.logNode_, 123), "enumeration 1 true");
-    EXPECT_EQ(stored(*frame.logNode_, 125), "numbers 0,1,24 true");
-    EXPECT_EQ(stored(*frame.logNode_, 37), "number 0 true");
-    EXPECT_EQ(stored(*frame.logNode_, 108), "text OS Log true");
-    EXPECT_EQ(stored(*frame.logNode_, 114), "enumeration 2 true");
-    EXPECT_EQ(stored(*frame.logNode_, 84), "text *string LogData* true");
+    EXPECT_EQ(storedValue(*frame.logNode_, 123), "enumeration 1 true");
+    EXPECT_EQ(storedValue(*frame.logNode_, 125), "numbers 0,1,24 true");
+    EXPECT_EQ(storedValue(*frame.logNode_, 37), "number 0 true");
+    EXPECT_EQ(storedValue(*frame.logNode_, 108), "text OS Log true");
+    EXPECT_EQ(storedValue(*frame.logNode_, 114), "enumeration 2 true");
+    EXPECT_EQ(storedValue(*frame.logNode_, 84), "text *string LogData* true");
 }
 
 TEST_F(LogNodes, SetTheLogUpInTheOrderThatHostsSee)
@@ -154,12 +154,12 @@ TEST_F(LogNodes, StoreIndexMessageAndTimeOnAnEntry)
     build();
     ASSERT_EQ(entries().size(), 3U);
     EXPECT_EQ(entries()[0]->getProperties().size(), 3U);
-    EXPECT_EQ(stored(*entries()[0], 89), "number 1 true");
-    EXPECT_EQ(stored(*entries()[0], 81), "text *message 3* true");
-    EXPECT_EQ(stored(*entries()[0], 79), "date " + std::to_string(firstStamp + 3) + " true");
-    EXPECT_EQ(stored(*entries()[2], 89), "number 3 true");
-    EXPECT_EQ(stored(*entries()[2], 81), "text *message 1* true");
-    EXPECT_EQ(stored(*entries()[2], 79), "date " + std::to_string(firstStamp + 1) + " true");
+    EXPECT_EQ(storedValue(*entries()[0], 89), "number 1 true");
+    EXPECT_EQ(storedValue(*entries()[0], 81), "text *message 3* true");
+    EXPECT_EQ(storedValue(*entries()[0], 79), "date " + std::to_string(firstStamp + 3) + " true");
+    EXPECT_EQ(storedValue(*entries()[2], 89), "number 3 true");
+    EXPECT_EQ(storedValue(*entries()[2], 81), "text *message 1* true");
+    EXPECT_EQ(storedValue(*entries()[2], 79), "date " + std::to_string(firstStamp + 1) + " true");
 }
 
 TEST_F(LogNodes, SetAnEntryUpInTheOrderThatHostsSee)
@@ -226,7 +226,8 @@ TEST_F(LogNodes, ShowTheLastFiftyOfALongLog)
     ASSERT_EQ(entries().size(), 50U);
     for (unsigned int i = 0; i < 50; ++i) {
         EXPECT_EQ(entries()[i]->getIndex(), i + 1);
-        EXPECT_EQ(stored(*entries()[i], 81), "text *message " + std::to_string(120 - i) + "* true");
+        EXPECT_EQ(storedValue(*entries()[i], 81),
+                  "text *message " + std::to_string(120 - i) + "* true");
     }
 }
 
@@ -246,10 +247,10 @@ TEST_F(LogNodes, LeaveTheTimeUnsetWhereALineHasNone)
     haveLine(2, "kernel: no stamp at all here\n");
     build();
     ASSERT_EQ(entries().size(), 2U);
-    EXPECT_EQ(stored(*entries()[0], 81), "text * at all here* true");
-    EXPECT_EQ(stored(*entries()[0], 79), "unset");
+    EXPECT_EQ(storedValue(*entries()[0], 81), "text * at all here* true");
+    EXPECT_EQ(storedValue(*entries()[0], 79), "unset");
     EXPECT_EQ(read(*entries()[0], 79), "1 text before true");
-    EXPECT_NE(stored(*entries()[1], 79), "unset");
+    EXPECT_NE(storedValue(*entries()[1], 79), "unset");
 }
 
 TEST_F(LogNodes, LeaveMessageAndTimeUnsetWhereTheLogHasShrunkMeanwhile)
@@ -259,10 +260,10 @@ TEST_F(LogNodes, LeaveMessageAndTimeUnsetWhereTheLogHasShrunkMeanwhile)
     haveLine(0, "");
     build();
     ASSERT_EQ(entries().size(), 2U);
-    EXPECT_EQ(stored(*entries()[0], 81), "text ** true"); // one past the oldest is accepted
-    EXPECT_EQ(stored(*entries()[1], 81), "unset");
-    EXPECT_EQ(stored(*entries()[1], 79), "unset");
-    EXPECT_EQ(stored(*entries()[1], 89), "number 2 true");
+    EXPECT_EQ(storedValue(*entries()[0], 81), "text ** true"); // one past the oldest is accepted
+    EXPECT_EQ(storedValue(*entries()[1], 81), "unset");
+    EXPECT_EQ(storedValue(*entries()[1], 79), "unset");
+    EXPECT_EQ(storedValue(*entries()[1], 89), "number 2 true");
 }
 
 TEST_F(LogNodes, ReadTheCurrentLineWhileTheStoredCopiesStay)
@@ -275,8 +276,8 @@ TEST_F(LogNodes, ReadTheCurrentLineWhileTheStoredCopiesStay)
     EXPECT_EQ(read(newest, 81), "0 text *message 5* true");
     EXPECT_EQ(read(newest, 79), "0 date " + std::to_string(firstStamp + 5) + " true");
     EXPECT_EQ(read(newest, 89), "0 number 1 true");
-    EXPECT_EQ(stored(newest, 81), "text *message 3* true");
-    EXPECT_EQ(stored(newest, 79), "date " + std::to_string(firstStamp + 3) + " true");
+    EXPECT_EQ(storedValue(newest, 81), "text *message 3* true");
+    EXPECT_EQ(storedValue(newest, 79), "date " + std::to_string(firstStamp + 3) + " true");
 }
 
 TEST_F(LogNodes, RunNoCommandForTheIndexAndForStoredProperties)
@@ -333,7 +334,7 @@ TEST_F(LogNodes, StoreWhatIsWrittenAndLeaveTheLogAlone)
     commands.ran.clear();
     EXPECT_EQ(entries()[0]->setProperty(81, IC::PropertyValue("mine", true)).getStatus(), 0);
     EXPECT_TRUE(commands.ran.empty());
-    EXPECT_EQ(stored(*entries()[0], 81), "text mine true");
+    EXPECT_EQ(storedValue(*entries()[0], 81), "text mine true");
     EXPECT_EQ(read(*entries()[0], 81), "0 text *message 1* true");
 }
 
@@ -363,7 +364,8 @@ TEST_F(LogNodes, GiveWayToNewOnesOnARefresh)
         EXPECT_EQ(entries()[i], frame.logEntryNodes_[i]);
         EXPECT_EQ(entries()[i]->getNodeId(), next + i);
         EXPECT_EQ(entries()[i]->getIndex(), i + 1);
-        EXPECT_EQ(stored(*entries()[i], 81), "text *message " + std::to_string(3 - i) + "* true");
+        EXPECT_EQ(storedValue(*entries()[i], 81),
+                  "text *message " + std::to_string(3 - i) + "* true");
     }
     EXPECT_EQ(frame.logNode_, log);
 }
@@ -404,7 +406,23 @@ TEST_F(LogNodes, ArePublishedEachAsSoonAsItIsComplete)
     EXPECT_EQ(order, (Texts{"LogEntryNode::LogEntryNode: entry", "publishNode: entry",
                             "LogEntryNode::LogEntryNode: entry", "publishNode: entry"}));
     ASSERT_EQ(frame.published.size(), 2U);
-    EXPECT_NE(stored(*frame.published[0], 79), "unset");
+    EXPECT_NE(storedValue(*frame.published[0], 79), "unset");
+}
+
+TEST_F(LogNodes, AreAllMadeThoughTheHostRefusesThem)
+{
+    haveLines(2);
+    frame.createLogNodes();
+    frame.setLoadCallBack(
+        [](IC::Node* const&, void const*) {
+            return IC::Error(1, IC::Number(IC::Number::EmptyKind), "no room");
+        },
+        nullptr, nullptr);
+    Recording const recording;
+    frame.createLogEntryNodes(true);
+    EXPECT_EQ(entries().size(), 2U);
+    EXPECT_EQ(frame.logEntryNodes_.size(), 2U);
+    EXPECT_EQ(recording.texts(6000), Texts(2, "addNewNode error = status 1: no room"));
 }
 
 TEST_F(LogNodes, AreNotDeletedWithoutARefresh)

@@ -11,6 +11,7 @@
 #include <iterator>
 #include <set>
 #include <string>
+#include <sys/stat.h>
 #include <vector>
 
 namespace
@@ -523,6 +524,23 @@ TEST_F(LogClearing, TruncatesTheFileWithoutAnyCommand)
     EXPECT_EQ(contents(), "");
     EXPECT_TRUE(commands.ran.empty());
     EXPECT_EQ(recording.texts(), (Texts{"clearLog: entry", "clearLog: exit"}));
+}
+
+TEST_F(LogClearing, KeepsTheFileAndItsPermissions)
+{
+    files.write("/var/log/messages", "one\n");
+    std::string const path = files.realPath("/var/log/messages");
+    ASSERT_EQ(chmod(path.c_str(), 0640), 0);
+    struct stat before {
+    };
+    struct stat after {
+    };
+    ASSERT_EQ(stat(path.c_str(), &before), 0);
+    EXPECT_TRUE(logInfo().clearLog());
+    ASSERT_EQ(stat(path.c_str(), &after), 0);
+    EXPECT_EQ(after.st_size, 0);
+    EXPECT_EQ(after.st_ino, before.st_ino);
+    EXPECT_EQ(after.st_mode, before.st_mode);
 }
 
 TEST_F(LogClearing, OpensTheLogForWriting)

@@ -1,0 +1,192 @@
+// Kernel modules as lsmod and modinfo really tell of them.
+
+#include "nodes/ids.h"
+#include "tests/support/Libc.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Plugin.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <ostream>
+#include <string>
+#include <sys/mount.h>
+#include <sys/utsname.h>
+#include <vector>
+
+namespace
+{
+
+using Texts = std::vector<std::string>;
+
+/** What a driver node shows. */
+struct Driver {
+    std::string name;
+    std::string version;
+    std::string description;
+};
+
+bool operator==(Driver const& one, Driver const& other)
+{
+    return one.name == other.name && one.version == other.version &&
+           one.description == other.description;
+}
+
+std::ostream& operator<<(std::ostream& out, Driver const& driver)
+{
+    return out << '{' << driver.name << ", " << driver.version << ", " << driver.description << '}';
+}
+
+class Drivers : public ::testing::Test
+{
+protected:
+    Drivers()
+    {
+        setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
+        setenv("LC_ALL", "C", 1);
+    }
+
+    std::vector<Driver> shown()
+    {
+        plugin.initialize();
+        std::vector<Driver> drivers;
+        for (IC::MutableNode const* node : plugin.nodes(NODES::driverType))
+            drivers.push_back(
+                {text(*node, NODES::name), text(*node, NODES::version), node->getDescription()});
+        return drivers;
+    }
+
+    Texts names()
+    {
+        Texts found;
+        for (Driver const& driver : shown())
+            found.push_back(driver.name);
+        return found;
+    }
+
+    /** The command lines that have to do with modules. */
+    static Texts ran()
+    {
+        Texts found;
+        for (std::string const& line : machine::ran())
+            if (line.rfind("lsmod", 0) == 0 || line.rfind("modinfo", 0) == 0)
+                found.push_back(line);
+        return found;
+    }
+
+    Plugin plugin;
+};
+
+TEST_F(Drivers, AreShownAsOddAsTheyMayBe)
+{
+    machine::lay("odd-modules");
+    EXPECT_EQ(shown(),
+              (std::vector<Driver>{{"e1000", "7.3.21-k8-NAPI", "Intel(R) PRO/1000 Network Driver"},
+                                   {"ext4", "", "Fourth Extended Filesystem"},
+                                   {"nodesc", "0.1", "Driver"},
+                                   {"twice", "2.0", "second description"},
+                                   {"blank", "", ""},
+                                   {"tight", "", "Driver"},
+                                   {"ghost", "", "Driver"},
+                                   {"wide", "3", std::string(495, 'd')}}));
+}
+
+TEST_F(Drivers, TakeOneLsmodAndOneModinfoForEachModule)
+{
+    machine::lay("odd-modules");
+    machine::recordShell();
+    shown();
+    EXPECT_EQ(ran(),
+              (Texts{"lsmod", "modinfo e1000", "modinfo ext4", "modinfo nodesc", "modinfo twice",
+                     "modinfo blank", "modinfo tight", "modinfo ghost", "modinfo wide"}));
+}
+
+TEST_F(Drivers, AreFourHundredWhereTheKernelHasThatMany)
+{
+    machine::fake("/usr/sbin/lsmod", "echo Module Size Used by\nseq -f 'module%g 4096 0' 400\n");
+    machine::fake("/usr/sbin/modinfo", "echo \"version: of $1\"\n");
+    std::vector<Driver> const drivers = shown();
+    ASSERT_EQ(drivers.size(), 400U);
+    EXPECT_EQ(drivers.front(), (Driver{"module1", "of module1", "Driver"}));
+    EXPECT_EQ(drivers.back(), (Driver{"module400", "of module400", "Driver"}));
+    EXPECT_EQ(plugin.nodes(NODES::driverType).back()->getIndex(), 400U);
+}
+
+TEST_F(Drivers, AreThoseOfTheKernel)
+{
+    Texts expected;
+    std::ifstream modules("/proc/modules");
+    for (std::string line; std::getline(modules, line);)
+        expected.push_back(line.substr(0, line.find(' ')));
+    EXPECT_EQ(names(), expected);
+}
+
+TEST_F(Drivers, AreDescribedByTheModulesThemselves)
+{
+    utsname system{};
+    ASSERT_EQ(uname(&system), 0);
+    std::string const folder = std::string("/lib/modules/") + system.release + "/extra";
+    std::filesystem::create_directories(folder);
+    std::filesystem::copy_file(MODULE_FILE, folder + "/mi_disk.ko");
+    ASSERT_EQ(std::system("depmod -a 2>/dev/null"), 0);
+    // A kernel of our making, as far as lsmod looks.
+    ASSERT_EQ(mount("none", "/proc", "tmpfs", 0, nullptr), 0);
+    machine::write("/proc/modules", "mi_disk 16384 1 - Live 0x0000000000000000\n"
+                                    "mi_ghost 4096 0 - Live 0x0000000000000000\n");
+    EXPECT_EQ(shown(), (std::vector<Driver>{{"mi_disk", "1.4.2", "A disk of memory"},
+                                            {"mi_ghost", "", "Driver"}}));
+}
+
+TEST_F(Drivers, AreNoneOnAMachineWithoutLsmod)
+{
+    machine::remove("/usr/sbin/lsmod");
+    Recording const recording;
+    EXPECT_TRUE(shown().empty());
+    // The shell starts and finds nothing, which is not told from no modules.
+    EXPECT_FALSE(recording.has("Cannot open process: lsmod", 3000));
+}
+
+TEST_F(Drivers, AreBareOnAMachineWithoutModinfo)
+{
+    machine::lay("odd-modules");
+    machine::remove("/usr/sbin/modinfo");
+    std::vector<Driver> const drivers = shown();
+    ASSERT_EQ(drivers.size(), 8U);
+    for (Driver const& driver : drivers)
+        EXPECT_EQ(driver, (Driver{driver.name, "", "Driver"}));
+}
+
+TEST_F(Drivers, AreNoneWhereLsmodCannotBeStarted)
+{
+    machine::lay("odd-modules");
+    libc::refuse("lsmod");
+    Recording const recording;
+    EXPECT_TRUE(shown().empty());
+    EXPECT_TRUE(recording.has("Cannot open process: lsmod", 3000));
+}
+
+TEST_F(Drivers, LackTheOneThatModinfoCannotBeStartedFor)
+{
+    machine::lay("odd-modules");
+    libc::refuse("modinfo ext4");
+    Recording const recording;
+    EXPECT_EQ(names(), (Texts{"e1000", "nodesc", "twice", "blank", "tight", "ghost", "wide"}));
+    EXPECT_TRUE(recording.has("Cannot open process: modinfo", 3000));
+}
+
+TEST_F(Drivers, SurviveGarbageInPlaceOfEveryOutput)
+{
+    machine::fake("/usr/sbin/lsmod", "head -c 3000 /dev/zero; echo; echo loop 1\n"
+                                     "printf '\\377\\001\\n   \\n'; head -c 2000 /dev/zero\n");
+    machine::fake("/usr/sbin/modinfo", "printf 'version: 1\\000\\n'; head -c 4000 /dev/zero\n"
+                                       "printf 'description:'\n");
+    std::vector<Driver> const drivers = shown();
+    ASSERT_EQ(drivers.size(), 2U);
+    EXPECT_EQ(drivers[0], (Driver{"loop", "1", "Driver"}));
+    EXPECT_EQ(drivers[1].name, "\377\001");
+}
+
+} // namespace

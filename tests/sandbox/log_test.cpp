@@ -1,0 +1,334 @@
+// The system log as the real wc, sed and date tell of it.
+
+#include "nodes/ids.h"
+#include "tests/support/Libc.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Plugin.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <ctime>
+#include <filesystem>
+#include <fstream>
+#include <grp.h>
+#include <string>
+#include <unistd.h>
+#include <vector>
+
+namespace
+{
+
+using Texts = std::vector<std::string>;
+
+constexpr char path[] = "/var/log/messages";
+constexpr char wc[] = "wc -l /var/log/messages";
+
+class Log : public ::testing::Test
+{
+protected:
+    Log()
+    {
+        setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
+        setenv("LC_ALL", "C", 1);
+        setenv("TZ", "UTC0", 1);
+        tzset();
+        std::filesystem::copy_file("/usr/bin/date", "/usr/bin/date.real");
+        say("Sat Nov 21 03:15:30 UTC 2026");
+    }
+
+    /** Lets date say this; wc and sed are the real ones in every test. */
+    static void say(std::string const& date)
+    {
+        machine::fake("/usr/bin/date", "echo '" + date + "'\n");
+    }
+
+    /** "Nov 20 10:11:SS message N" for each line N from 1. */
+    static std::string lines(int count)
+    {
+        std::string text;
+        for (int line = 1; line <= count; ++line) {
+            char stamp[32];
+            std::snprintf(stamp, sizeof stamp, "Nov 20 10:11:%02d ", line % 60);
+            text += std::string(stamp) + "message " + std::to_string(line) + "\n";
+        }
+        return text;
+    }
+
+    static std::string sed(int line)
+    {
+        return "sed -n '" + std::to_string(line) + "p' /var/log/messages";
+    }
+
+    static void append(std::string const& text)
+    {
+        std::ofstream(path, std::ios::app) << text;
+    }
+
+    std::vector<IC::MutableNode*> entries() const
+    {
+        return plugin.nodes(NODES::logEntryType);
+    }
+
+    /** The messages stored in the entry nodes, in their order. */
+    Texts messages() const
+    {
+        Texts found;
+        for (IC::MutableNode const* entry : entries())
+            found.push_back(stored(*entry, NODES::message));
+        return found;
+    }
+
+    /** Starts the plug-in on a log with this text. */
+    void startOn(std::string const& log)
+    {
+        machine::write(path, log);
+        plugin.initialize();
+    }
+
+    Plugin plugin;
+};
+
+/** "*message NEWEST*" down to the number of entries given. */
+Texts newest(int line, int entries)
+{
+    Texts found;
+    for (int i = 0; i < entries; ++i)
+        found.push_back("*message " + std::to_string(line - i) + "*");
+    return found;
+}
+
+TEST_F(Log, OfNoLinesHasNoEntries)
+{
+    startOn("");
+    EXPECT_TRUE(entries().empty());
+    EXPECT_EQ(plugin.nodes(NODES::logType).size(), 1U);
+}
+
+class LogOfLines : public Log, public ::testing::WithParamInterface<int>
+{
+};
+
+TEST_P(LogOfLines, ShowsTheNewestFiftyAtMost)
+{
+    startOn(lines(GetParam()));
+    EXPECT_EQ(messages(), newest(GetParam(), std::min(GetParam(), 50)));
+    for (std::size_t i = 0; i < entries().size(); ++i) {
+        EXPECT_EQ(entries()[i]->getIndex(), i + 1);
+        EXPECT_EQ(text(*entries()[i], NODES::message), messages()[i]);
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(All, LogOfLines, ::testing::Values(1, 3, 50, 51, 120));
+
+TEST_F(Log, IsReadByTheCommandsOfEachReadInOrder)
+{
+    startOn(lines(3));
+    machine::recordShell();
+    text(*entries()[1], NODES::message);
+    EXPECT_EQ(machine::ran(), (Texts{wc, wc, wc, sed(2)}));
+    machine::forget();
+    text(*entries()[1], NODES::creationTime);
+    EXPECT_EQ(machine::ran(), (Texts{wc, wc, wc, sed(2), "date"}));
+    machine::forget();
+    text(*entries()[1], NODES::id);
+    EXPECT_EQ(machine::ran(), Texts{});
+}
+
+TEST_F(Log, TakesNineCommandsForEachEntryAtTheStart)
+{
+    machine::write(path, lines(2));
+    machine::recordShell();
+    plugin.initialize();
+    Texts expected{wc};
+    for (int const line : {2, 1})
+        for (std::string const& command :
+             Texts{wc, wc, wc, sed(line), wc, wc, wc, sed(line), "date"})
+            expected.push_back(command);
+    Texts const all = machine::ran();
+    ASSERT_GE(all.size(), expected.size());
+    EXPECT_EQ(Texts(all.end() - static_cast<std::ptrdiff_t>(expected.size()), all.end()), expected);
+}
+
+TEST_F(Log, ShowsTheTimeOfEachEntry)
+{
+    startOn("Nov  2 01:02:03 host one\nJan 31 23:59:59 host two\nFeb 29 12:00:00 host three\n");
+    ASSERT_EQ(entries().size(), 3U);
+    // February has 28 days in 2026; the day after is meant.
+    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "2026-03-01 12:00:00");
+    EXPECT_EQ(text(*entries()[1], NODES::creationTime), "2026-01-31 23:59:59");
+    EXPECT_EQ(text(*entries()[2], NODES::creationTime), "2026-11-02 01:02:03");
+}
+
+TEST_F(Log, DatesDecemberReadInJanuaryBackAndNothingElse)
+{
+    say("Fri Jan  2 03:15:30 UTC 2026");
+    startOn("Nov 30 10:11:12 a\nDec 31 23:59:59 b\nJan  1 00:00:01 c\n");
+    ASSERT_EQ(entries().size(), 3U);
+    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "2026-01-01 00:00:01");
+    EXPECT_EQ(text(*entries()[1], NODES::creationTime), "2025-12-31 23:59:59");
+    EXPECT_EQ(text(*entries()[2], NODES::creationTime), "2026-11-30 10:11:12");
+    say("Thu Dec 31 03:15:30 UTC 2026");
+    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "2026-01-01 00:00:01");
+    EXPECT_EQ(text(*entries()[1], NODES::creationTime), "2026-12-31 23:59:59");
+}
+
+TEST_F(Log, UnderstandsTheRealDate)
+{
+    std::filesystem::rename("/usr/bin/date.real", "/usr/bin/date");
+    startOn(lines(1));
+    EXPECT_EQ(stored(*entries().at(0), NODES::creationTime).substr(4), "-11-20 10:11:01");
+}
+
+TEST_F(Log, ShowsShortLinesAsEmptyMessages)
+{
+    startOn("\nshort\nNov 20 10:11:12\nNov 20 10:11:13 \nNov 20 10:11:14 x\n");
+    EXPECT_EQ(messages(), (Texts{"*x*", "**", "**", "**", "**"}));
+    ASSERT_EQ(entries().size(), 5U);
+    EXPECT_EQ(stored(*entries()[1], NODES::creationTime), "2026-11-20 10:11:13");
+    EXPECT_EQ(stored(*entries()[2], NODES::creationTime), "2026-11-20 10:11:12");
+    EXPECT_EQ(stored(*entries()[3], NODES::creationTime), "(unset)");
+    EXPECT_EQ(stored(*entries()[4], NODES::creationTime), "(unset)");
+    EXPECT_EQ(text(*entries()[4], NODES::creationTime), "(status 1)");
+}
+
+TEST_F(Log, ShowsLinesWithAnotherStampWithoutATime)
+{
+    startOn("2026-11-20T10:11:12.123456+00:00 host sshd[1]: session opened\n");
+    ASSERT_EQ(entries().size(), 1U);
+    EXPECT_EQ(messages(), Texts{"*:12.123456+00:00 host sshd[1]: session opened*"});
+    EXPECT_EQ(stored(*entries()[0], NODES::creationTime), "(unset)");
+    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "(status 1)");
+}
+
+TEST_F(Log, LeavesOutALastLineThatHasNoEndYet)
+{
+    startOn(lines(2) + "Nov 20 10:11:59 half a line");
+    EXPECT_EQ(messages(), newest(2, 2));
+}
+
+TEST_F(Log, ShowsTheFirst495CharactersOfALongMessage)
+{
+    startOn("Nov 20 10:11:12 " + std::string(3000, 'm') + "\nNov 20 10:11:13 next\n");
+    EXPECT_EQ(messages(), (Texts{"*next*", "*" + std::string(495, 'm') + "*"}));
+}
+
+TEST_F(Log, SurvivesBinaryGarbage)
+{
+    std::string garbage;
+    for (unsigned int i = 0; i < 20000; ++i)
+        garbage.push_back(static_cast<char>((i * 7919U) >> 3));
+    startOn(garbage + "\n" + std::string(2000, '\0') + "\nNov 20 10:11:12 a" +
+            std::string("\0b\n", 3));
+    ASSERT_GE(entries().size(), 2U);
+    EXPECT_EQ(messages()[0], "*a*");
+    EXPECT_EQ(messages()[1], "**");
+}
+
+TEST_F(Log, MovesUnderItsEntriesAsItGrows)
+{
+    startOn(lines(3));
+    append("Nov 20 10:11:30 news\n");
+    ASSERT_EQ(entries().size(), 3U);
+    EXPECT_EQ(text(*entries()[0], NODES::message), "*news*");
+    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "2026-11-20 10:11:30");
+    EXPECT_EQ(text(*entries()[2], NODES::message), "*message 2*");
+    EXPECT_EQ(messages(), newest(3, 3));
+}
+
+TEST_F(Log, FailsTheReadsOfEntriesThatItHasLost)
+{
+    startOn(lines(3));
+    machine::write(path, lines(1));
+    ASSERT_EQ(entries().size(), 3U);
+    Recording const recording;
+    EXPECT_EQ(text(*entries()[0], NODES::message), "*message 1*");
+    EXPECT_EQ(text(*entries()[1], NODES::message), "**");
+    EXPECT_EQ(text(*entries()[2], NODES::message), "(status 1)");
+    EXPECT_EQ(text(*entries()[2], NODES::creationTime), "(status 1)");
+    EXPECT_EQ(recording.texts(6000), (Texts{"Invalid index: getMaxLine()=1, Index=3",
+                                            "Invalid index: getMaxLine()=1, logIndex=3"}));
+}
+
+TEST_F(Log, HasNoEntriesWhereItIsMissing)
+{
+    machine::remove(path);
+    Recording const recording;
+    plugin.initialize();
+    EXPECT_TRUE(entries().empty());
+    EXPECT_TRUE(recording.has("Invalid format: buffer = ", 6000));
+}
+
+TEST_F(Log, FailsTheReadsOfEntriesOnceItIsMissing)
+{
+    startOn(lines(2));
+    machine::remove(path);
+    ASSERT_EQ(entries().size(), 2U);
+    EXPECT_EQ(text(*entries()[0], NODES::message), "**");
+    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "(status 1)");
+    EXPECT_EQ(text(*entries()[1], NODES::message), "(status 1)");
+}
+
+TEST_F(Log, HasNoEntriesForWhoMayNotReadIt)
+{
+    machine::write(path, lines(3), 0600);
+    ASSERT_EQ(setgroups(0, nullptr), 0);
+    ASSERT_EQ(setresgid(65534, 65534, 65534), 0);
+    ASSERT_EQ(setresuid(65534, 65534, 65534), 0);
+    Recording const recording;
+    plugin.initialize();
+    EXPECT_TRUE(entries().empty());
+    EXPECT_TRUE(recording.has("Invalid format: buffer = ", 6000));
+}
+
+TEST_F(Log, HasNoEntriesWhereWcCannotBeStarted)
+{
+    libc::refuse(wc);
+    Recording const recording;
+    startOn(lines(3));
+    EXPECT_TRUE(entries().empty());
+    EXPECT_TRUE(recording.has("Cannot open process: wc -l /var/log/messages", 6000));
+}
+
+TEST_F(Log, HasAnEmptyEntryWhereSedCannotBeStarted)
+{
+    libc::refuse(sed(2));
+    Recording const recording;
+    startOn(lines(3));
+    EXPECT_EQ(messages(), (Texts{"*message 3*", "**", "*message 1*"}));
+    EXPECT_EQ(stored(*entries().at(1), NODES::creationTime), "(unset)");
+    EXPECT_TRUE(recording.has("sed -n '%dp' /var/log/messages", 6000));
+}
+
+TEST_F(Log, IsOfTheYear1970WhereDateCannotBeStarted)
+{
+    libc::refuse("date");
+    Recording const recording;
+    startOn(lines(1));
+    EXPECT_EQ(stored(*entries().at(0), NODES::creationTime), "1970-01-01 00:00:00");
+    EXPECT_TRUE(recording.has("Cannot opne process: date", 6000));
+}
+
+TEST_F(Log, IsWithoutTimesWhereDateSpeaksAnotherForm)
+{
+    say("2026-11-21");
+    Recording const recording;
+    startOn(lines(1));
+    EXPECT_EQ(stored(*entries().at(0), NODES::creationTime), "(unset)");
+    EXPECT_EQ(messages(), newest(1, 1));
+    EXPECT_TRUE(recording.has("Invalid format: buffer = 2026-11-21\n", 6000));
+}
+
+TEST_F(Log, StaysAsItIsWhenAnEntryIsWritten)
+{
+    startOn(lines(1));
+    entries().at(0)->setProperty(NODES::message, IC::PropertyValue("mine", true));
+    EXPECT_EQ(machine::read(path), lines(1));
+    EXPECT_EQ(stored(*entries().at(0), NODES::message), "mine");
+    EXPECT_EQ(text(*entries().at(0), NODES::message), "*message 1*");
+}
+
+} // namespace

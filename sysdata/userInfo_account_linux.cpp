@@ -1,0 +1,166 @@
+// The operations on an account: deletion, ageing, and whether it is locked.
+
+#include "sysdata/userInfo_linux.h"
+#include "sysdata/userInfo_log.h"
+#include "sysdata/userInfo_parse.h"
+#include "util/MyProcess.h"
+#include "util/file.h"
+#include "util/text.h"
+
+#include <cstdint>
+#include <cstdio>
+#include <cstring>
+
+namespace NQ
+{
+
+namespace
+{
+
+using USER_INFO::unit;
+
+constexpr long noLimit = 99999;
+constexpr long secondsPerDay = 86400;
+constexpr std::size_t commandSize = 1024;
+constexpr std::size_t lineSize = 1024;
+constexpr std::size_t runnerSize = 5000;
+
+void logTooLong(std::string const& command, char const* function)
+{
+    LOG::write(unit, LOG::error, LOG::message("Command line too long: ", command), function);
+}
+
+/** Starts a command and sees it end; a failed start is logged as the given text. */
+bool run(char const* command, std::string const& failure, char const* function)
+{
+    MyProcess process;
+    if (process.mypopen(command, "r"))
+        return true;
+    LOG::write(unit, LOG::error, failure, function);
+    return false;
+}
+
+/**
+ * The chage command that sets an age in days, so that it is reached on a date.
+ *
+ * @param label   what chage calls the day that the age is counted from
+ * @param option  chage's option for the age
+ * @return false where a command line did not fit, which has been logged
+ */
+bool makeAgeCommand(userInfo& info, std::string const& date, std::string const& user, char* label,
+                    char const* option, char (&command)[commandSize], char const* function)
+{
+    USER_INFO::CalendarDay const day = USER_INFO::scanDay(date.c_str());
+    long const requested = ito_time_t(day.year, day.month, day.day, 0, 0, 0, 0, -1);
+    if (!TEXT::print(command, sizeof command, "chage -l %s", user.c_str())) {
+        logTooLong("chage -l", function);
+        return false;
+    }
+    int const days = static_cast<int>(info.getDays(command, label, requested));
+    if (!TEXT::print(command, sizeof command, "chage %s %d %s", option, days, user.c_str())) {
+        logTooLong(LOG::message("chage ", option), function);
+        return false;
+    }
+    return true;
+}
+
+} // namespace
+
+int userInfo::setDelete(std::string user)
+{
+    LOG::Scope const scope(unit);
+    char command[commandSize];
+    if (TEXT::print(command, sizeof command, "userdel -r %s", user.c_str()))
+        run(command, LOG::message("Cannot open process: command = ", command), __func__);
+    else
+        logTooLong("userdel -r", __func__);
+    return 1;
+}
+
+bool userInfo::setInactivityTimeout(std::string date, std::string user)
+{
+    LOG::Scope const scope(unit);
+    char label[] = "Password expires";
+    char command[commandSize];
+    return makeAgeCommand(*this, date, user, label, "-I", command, __func__) &&
+           run(command, LOG::message("Cannot open process: command = ", command), __func__);
+}
+
+bool userInfo::setPasswordExpiration(std::string date, std::string user)
+{
+    LOG::Scope const scope(unit);
+    char label[] = "Last password change";
+    char command[commandSize];
+    return makeAgeCommand(*this, date, user, label, "-M", command, __func__) &&
+           run(command, "Cannot open process: chage -M", __func__);
+}
+
+long userInfo::getDays(char* command, char* label, long reference)
+{
+    LOG::Scope const scope(unit);
+    MyProcess process;
+    FILE* const output = process.mypopen(command, "r");
+    if (!output) {
+        LOG::write(unit, LOG::error, LOG::message("Cannot open process: command = ", command));
+        return noLimit;
+    }
+    USER_INFO::LabelledDate date;
+    char line[lineSize];
+    while (std::fgets(line, sizeof line, output))
+        if (USER_INFO::scanLabelledDate(line, label, date) == USER_INFO::Scan::invalid)
+            LOG::write(unit, LOG::error, LOG::message("Invalid format: buffer = ", line));
+
+    long const found = to_time_t(date.year, date.month.data(), date.day, 0, 0, 0, 0, -1);
+    if (found <= reference)
+        return (reference - found) / secondsPerDay;
+    LOG::write(unit, LOG::error, "new_day < last_day");
+    return noLimit;
+}
+
+bool userInfo::findIsAcctDisabled(char* user)
+{
+    LOG::Scope const scope(unit);
+    bool const suseStyle =
+        FILES::canOpen("/etc/SuSE-release") || FILES::canOpen("/etc/UnitedLinux-release");
+    char const program[] = "/usr/bin/passwd";
+    char const* const args[] = {program, "-S", user, ""};
+    char output[runnerSize] = "";
+    if (!executeLinCommand(program, args, output, sizeof output))
+        return false;
+    if (!suseStyle)
+        return std::strstr(output, "Password locked") || std::strstr(output, "Locked password");
+    std::string const locked = std::string(user) + " LK";
+    return std::strncmp(output, locked.c_str(), locked.size()) == 0;
+}
+
+bool userInfo::executeLinCommand(char* command, char const* const* args, char* output)
+{
+    return executeLinCommand(command, args, output, SIZE_MAX);
+}
+
+bool userInfo::executeLinCommand(char const* command, char const* const* args, char* output,
+                                 std::size_t size)
+{
+    LOG::Scope const scope(unit);
+    output[0] = '\0';
+    std::string line = command;
+    for (char const* const* arg = args + 1; **arg != '\0'; ++arg)
+        line.append(" ").append(*arg);
+    line += " 2>&1";
+    if (line.size() >= runnerSize) {
+        logTooLong(command, __func__);
+        return false;
+    }
+    FILE* const pipe = popen(line.c_str(), "r");
+    if (!pipe)
+        return false;
+    std::size_t length = 0;
+    for (int byte = std::fgetc(pipe); byte != EOF; byte = std::fgetc(pipe))
+        if (length < size - 1)
+            output[length++] = static_cast<char>(byte);
+    output[length] = '\0';
+    pclose(pipe);
+    return length > 0;
+}
+
+} // namespace NQ

@@ -1,0 +1,148 @@
+// The listing: who is reported, and what the account files say of them.
+
+#include "host/make_string.h"
+#include "sysdata/minMaxId.h"
+#include "sysdata/userInfo_linux.h"
+#include "sysdata/userInfo_log.h"
+#include "sysdata/userInfo_parse.h"
+
+#include <cstdio>
+#include <cstring>
+#include <fstream>
+#include <locale>
+#include <pwd.h>
+#include <shadow.h>
+#include <sstream>
+#include <utility>
+
+namespace NQ
+{
+
+namespace
+{
+
+using USER_INFO::unit;
+
+constexpr std::size_t lineSize = 4096;
+
+/** The two account files, open and with the account lock held until the object goes. */
+class AccountFiles
+{
+public:
+    AccountFiles() : passwd_(std::fopen("/etc/passwd", "ro"))
+    {
+        if (!passwd_)
+            return;
+        shadow_ = std::fopen("/etc/shadow", "ro");
+        lckpwdf();
+    }
+
+    ~AccountFiles()
+    {
+        if (!passwd_)
+            return;
+        ulckpwdf();
+        std::fclose(passwd_);
+        if (shadow_)
+            std::fclose(shadow_);
+    }
+
+    AccountFiles(AccountFiles const&) = delete;
+    AccountFiles& operator=(AccountFiles const&) = delete;
+
+    /** @return null at the end, and where an entry cannot be read */
+    passwd const* nextAccount()
+    {
+        passwd* found = nullptr;
+        if (!passwd_ ||
+            fgetpwent_r(passwd_, &account_, accountLine_, sizeof accountLine_, &found) != 0)
+            return nullptr;
+        return &account_;
+    }
+
+    /**
+     * The shadow entry of an account, looked for from where the last search stopped. Kept: an
+     * account that is missing uses the file up, and no later one is found.
+     */
+    spwd const* findShadow(char const* name)
+    {
+        spwd* found = nullptr;
+        while (shadow_ &&
+               fgetspent_r(shadow_, &ageing_, ageingLine_, sizeof ageingLine_, &found) == 0)
+            if (std::strcmp(ageing_.sp_namp, name) == 0)
+                return &ageing_;
+        return nullptr;
+    }
+
+private:
+    FILE* passwd_;
+    FILE* shadow_ = nullptr;
+    passwd account_{};
+    spwd ageing_{};
+    char accountLine_[lineSize];
+    char ageingLine_[lineSize];
+};
+
+std::string decimal(unsigned int number)
+{
+    std::ostringstream text;
+    text.imbue(std::locale::classic());
+    text << number;
+    return text.str();
+}
+
+/** An empty field comes as -1, in whatever width a long has. */
+unsigned long daysOf(long field)
+{
+    return field == -1 ? USER_INFO::never : static_cast<unsigned long>(field);
+}
+
+void setAgeing(userInfo& user, spwd const& entry)
+{
+    user.setUserPassword(make_string(entry.sp_pwdp));
+    user.setLstPwdChg(daysOf(entry.sp_lstchg));
+    user.setPwdMinDays(daysOf(entry.sp_min));
+    user.setPwdMaxDays(daysOf(entry.sp_max));
+    user.setPwdWarnDays(daysOf(entry.sp_warn));
+    user.setPwdExpDays(daysOf(entry.sp_inact));
+    user.setPwdInactDays(daysOf(entry.sp_expire));
+    user.setPasswordHistoryDepth(0);
+}
+
+/** The number that the login service's rules allow; the last one in the file, 0 without one. */
+long readMaxLoginFailures(char const* function)
+{
+    long failures = 0;
+    std::ifstream rules("/etc/pam.d/login");
+    for (std::string line; std::getline(rules, line);)
+        if (USER_INFO::scanDeny(line, failures) == USER_INFO::Scan::invalid)
+            LOG::write(unit, LOG::error, LOG::message("Invalid format: line = ", line), function);
+    return failures;
+}
+
+} // namespace
+
+void getUserInfo(std::vector<userInfo>& users)
+{
+    LOG::Scope const scope(unit);
+    users.clear();
+    AccountFiles files;
+    while (passwd const* account = files.nextAccount()) {
+        if (!isReportedUser(account->pw_uid))
+            continue;
+        userInfo user(account->pw_name);
+        user.setUserId(decimal(account->pw_uid));
+        user.setGroupId(decimal(account->pw_gid));
+        // An entry that stands for a remote database has none of these texts.
+        user.setUserFullName(make_string(account->pw_gecos));
+        user.setUserHomeDir(make_string(account->pw_dir));
+        user.setUserScriptPath(make_string(account->pw_shell));
+        user.setUserAcctDisabled(false);
+        if (spwd const* ageing = files.findShadow(account->pw_name))
+            setAgeing(user, *ageing);
+        user.setMaxLoginFailures(readMaxLoginFailures(__func__));
+        users.push_back(std::move(user));
+    }
+}
+
+} // namespace NQ

@@ -1,0 +1,44 @@
+#include "sysdata/userInfo_parse.h"
+
+#include <cstdio>
+#include <cstring>
+
+namespace NQ::USER_INFO
+{
+
+Scan scanDeny(std::string const& line, long& deny)
+{
+    std::string::size_type const at = line.find("deny=");
+    if (at == std::string::npos)
+        return Scan::absent;
+    int number = 0;
+    if (std::sscanf(line.c_str() + at, "deny=%d", &number) != 1)
+        return Scan::invalid;
+    deny = number;
+    return Scan::valid;
+}
+
+Scan scanLabelledDate(char const* line, char const* label, LabelledDate& date)
+{
+    if (!std::strstr(line, label))
+        return Scan::absent;
+    std::string const format = std::string(label) + " : %s %02d, %04d";
+    std::string month(std::strlen(line) + 1, '\0'); // holds whatever %s can find
+    int const converted = std::sscanf(line, format.c_str(), month.data(), &date.day, &date.year);
+    if (converted >= 1)
+        date.month = month.c_str();
+    if (converted < 3)
+        return Scan::invalid;
+    if (date.month == "never")
+        date = {"Jan", 19, 2038};
+    return Scan::valid;
+}
+
+CalendarDay scanDay(char const* text)
+{
+    CalendarDay day;
+    std::sscanf(text, "%4d-%2d-%2d 00:00:00", &day.year, &day.month, &day.day);
+    return day;
+}
+
+} // namespace NQ::USER_INFO

@@ -1,0 +1,379 @@
+#include "sysdata/userInfo_linux.h"
+
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Libc.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <ctime>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using NQ::userInfo;
+using Lines = std::vector<std::string>;
+
+/** Account operations, with the commands that they run only noted. */
+class AccountOperation : public testing::Test
+{
+protected:
+    AccountOperation()
+    {
+        setenv("TZ", "UTC0", 1);
+        tzset();
+    }
+
+    Lines errors() const
+    {
+        return log_.texts(6000);
+    }
+
+    libc::FakeCommands commands_;
+    Recording log_;
+};
+
+using UserDeletion = AccountOperation;
+
+TEST_F(UserDeletion, RunsUserdelWithTheNameAndReturnsOne)
+{
+    commands_.answers["userdel -r jdoe"] = "";
+    EXPECT_EQ(userInfo().setDelete("jdoe"), 1);
+    EXPECT_EQ(commands_.ran, Lines{"userdel -r jdoe"});
+    EXPECT_EQ(commands_.open, 0);
+    EXPECT_EQ(log_.texts(), (Lines{"setDelete: entry", "setDelete: exit"}));
+}
+
+TEST_F(UserDeletion, ReturnsOneAndLogsTheCommandWhenItCannotBeStarted)
+{
+    EXPECT_EQ(userInfo().setDelete("jdoe"), 1);
+    EXPECT_EQ(errors(), Lines{"Cannot open process: command = userdel -r jdoe"});
+    for (LogRecord const& record : log_.records()) {
+        EXPECT_EQ(record.function, "setDelete");
+        EXPECT_EQ(record.file, "userInfo_linux");
+        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.UserInfo");
+    }
+}
+
+TEST_F(UserDeletion, RunsALineThatFillsItsBufferOf1024Bytes)
+{
+    std::string const line = "userdel -r " + std::string(1023 - 11, 'x');
+    commands_.answers[line] = "";
+    EXPECT_EQ(userInfo().setDelete(line.substr(11)), 1);
+    EXPECT_EQ(commands_.ran, Lines{line});
+}
+
+TEST_F(UserDeletion, RunsNothingWhereTheLineDoesNotFit)
+{
+    EXPECT_EQ(userInfo().setDelete(std::string(1024 - 11, 'x')), 1);
+    EXPECT_EQ(commands_.ran, Lines{});
+    EXPECT_EQ(errors(), Lines{"Command line too long: userdel -r"});
+}
+
+/** What one ageing operation runs and says; the date is 11 January 2008. */
+struct Ageing {
+    char const* function;
+    bool (userInfo::*set)(std::string date, std::string user);
+    char const* label;
+    char const* option;
+    char const* cannotStart; // as logged for jdoe, 10 days
+};
+
+class AgeingOperation : public AccountOperation, public testing::WithParamInterface<Ageing>
+{
+protected:
+    bool set(std::string const& date, std::string const& user = "jdoe")
+    {
+        return (userInfo().*GetParam().set)(date, user);
+    }
+
+    /** Lets chage report the day that the age is counted from. */
+    void answerListing(std::string const& date, std::string const& user = "jdoe")
+    {
+        commands_.answers["chage -l " + user] =
+            std::string(GetParam().label) + "\t\t\t: " + date + "\n";
+    }
+
+    std::string ageLine(std::string const& days, std::string const& user = "jdoe") const
+    {
+        return std::string("chage ") + GetParam().option + " " + days + " " + user;
+    }
+};
+
+TEST_P(AgeingOperation, SetsTheDaysFromWhatChageListsToTheDate)
+{
+    answerListing("Jan 01, 2008");
+    commands_.answers[ageLine("10")] = "";
+    EXPECT_TRUE(set("2008-01-11 00:00:00"));
+    EXPECT_EQ(commands_.ran, (Lines{"chage -l jdoe", ageLine("10")}));
+    EXPECT_EQ(commands_.open, 0);
+    EXPECT_EQ(errors(), Lines{});
+}
+
+TEST_P(AgeingOperation, ReadsOnlyItsOwnLabel)
+{
+    commands_.answers["chage -l jdoe"] = "Last password change : Jan 01, 2008\n"
+                                         "Password expires : Jan 01, 2008\n"
+                                         "Password inactive : Jan 05, 2008\n"
+                                         "Account expires : Jan 06, 2008\n";
+    commands_.answers[ageLine("10")] = "";
+    EXPECT_TRUE(set("2008-01-11 00:00:00"));
+    EXPECT_EQ(commands_.ran.back(), ageLine("10"));
+    commands_.answers["chage -l jdoe"] = "Password inactive : Jan 05, 2008\n";
+    set("2008-01-11 00:00:00");
+    EXPECT_EQ(commands_.ran.back(), ageLine("13889"));
+}
+
+TEST_P(AgeingOperation, Sets99999WhereTheDateLiesBefore)
+{
+    answerListing("Feb 01, 2008");
+    set("2008-01-11 00:00:00");
+    EXPECT_EQ(commands_.ran.back(), ageLine("99999"));
+    EXPECT_EQ(errors().front(), "new_day < last_day");
+}
+
+TEST_P(AgeingOperation, Sets99999WhereChageCannotList)
+{
+    commands_.answers[ageLine("99999")] = "";
+    EXPECT_TRUE(set("2008-01-11 00:00:00"));
+    EXPECT_EQ(commands_.ran, (Lines{"chage -l jdoe", ageLine("99999")}));
+    EXPECT_EQ(errors(), Lines{"Cannot open process: command = chage -l jdoe"});
+}
+
+TEST_P(AgeingOperation, FailsWhereChageCannotBeStartedForTheChange)
+{
+    answerListing("Jan 01, 2008");
+    EXPECT_FALSE(set("2008-01-11 00:00:00"));
+    EXPECT_EQ(errors(), Lines{GetParam().cannotStart});
+    std::string const function = GetParam().function;
+    LogRecord const last = log_.records().at(log_.records().size() - 3);
+    EXPECT_EQ(last.text, GetParam().cannotStart);
+    EXPECT_EQ(last.function, function);
+}
+
+TEST_P(AgeingOperation, SucceedsWhateverChagePrints)
+{
+    answerListing("Jan 01, 2008");
+    commands_.answers[ageLine("10")] = "chage: user 'jdoe' does not exist in /etc/passwd\n";
+    EXPECT_TRUE(set("2008-01-11 00:00:00"));
+}
+
+TEST_P(AgeingOperation, TakesTheDateForLocalTime)
+{
+    // Two days over the change to summer time are one hour short of two days.
+    setenv("TZ", "CET-1CEST,M3.5.0,M10.5.0/3", 1);
+    tzset();
+    answerListing("Mar 29, 2008");
+    set("2008-03-31 00:00:00");
+    EXPECT_EQ(commands_.ran.back(), ageLine("1"));
+}
+
+TEST_P(AgeingOperation, CountsATextThatIsNoDateAs1970)
+{
+    answerListing("Jan 01, 2008");
+    set("tomorrow");
+    EXPECT_EQ(commands_.ran.back(), ageLine("99999"));
+    EXPECT_EQ(errors().front(), "Invalid YY: YY = 0");
+}
+
+TEST_P(AgeingOperation, ReadsADateWithoutLeadingZerosOrTimeOfDay)
+{
+    answerListing("Jan 01, 2008");
+    set("2008-1-11");
+    EXPECT_EQ(commands_.ran.back(), ageLine("10"));
+}
+
+TEST_P(AgeingOperation, RunsNothingWhereTheListingDoesNotFitItsBufferOf1024Bytes)
+{
+    EXPECT_FALSE(set("2008-01-11 00:00:00", std::string(1024 - 9, 'x')));
+    EXPECT_EQ(commands_.ran, Lines{});
+    EXPECT_EQ(errors(), Lines{"Command line too long: chage -l"});
+}
+
+TEST_P(AgeingOperation, ChangesNothingWhereTheChangeDoesNotFitItsBufferOf1024Bytes)
+{
+    std::string const user(1023 - 9, 'x');
+    answerListing("Jan 01, 2008", user);
+    EXPECT_FALSE(set("2008-01-11 00:00:00", user));
+    EXPECT_EQ(commands_.ran, Lines{"chage -l " + user});
+    EXPECT_EQ(errors(), Lines{std::string("Command line too long: chage ") + GetParam().option});
+}
+
+TEST_P(AgeingOperation, RunsAChangeThatFillsItsBuffer)
+{
+    std::string const user(1023 - 12, 'x');
+    answerListing("Jan 01, 2008", user);
+    commands_.answers[ageLine("10", user)] = "";
+    EXPECT_TRUE(set("2008-01-11 00:00:00", user));
+}
+
+TEST_P(AgeingOperation, ConvertsTheDateFirstAndThenAsksForTheDays)
+{
+    answerListing("Jan 01, 2008");
+    commands_.answers[ageLine("10")] = "";
+    set("2008-01-11 00:00:00");
+    std::string const function = GetParam().function;
+    EXPECT_EQ(log_.texts(),
+              (Lines{function + ": entry", "ito_time_t: entry", "to_time_t: entry",
+                     "to_time_t: exit", "ito_time_t: exit", "getDays: entry", "to_time_t: entry",
+                     "to_time_t: exit", "getDays: exit", function + ": exit"}));
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Of, AgeingOperation,
+    testing::Values(Ageing{"setInactivityTimeout", &userInfo::setInactivityTimeout,
+                           "Password expires", "-I",
+                           "Cannot open process: command = chage -I 10 jdoe"},
+                    Ageing{"setPasswordExpiration", &userInfo::setPasswordExpiration,
+                           "Last password change", "-M", "Cannot open process: chage -M"}),
+    [](auto const& of) { return of.param.function; });
+
+/** Runs "tool" with arguments; the program slot of the list is not looked at. */
+struct Outcome {
+    bool result;
+    std::string output;
+};
+
+Outcome runTool(std::vector<char const*> args, std::string command = "/usr/bin/tool")
+{
+    std::vector<char> output(20000, '#');
+    args.push_back("");
+    bool const result = userInfo().executeLinCommand(command.data(), args.data(), output.data());
+    return {result, output.data()};
+}
+
+using CommandRunner = AccountOperation;
+
+TEST_F(CommandRunner, AppendsTheArgumentsBehindTheProgramAndMergesStandardErrorIn)
+{
+    commands_.answers["/usr/bin/tool -a b c 2>&1"] = "said\n";
+    Outcome const outcome = runTool({"ignored", "-a", "b c"});
+    EXPECT_TRUE(outcome.result);
+    EXPECT_EQ(outcome.output, "said\n");
+    EXPECT_EQ(commands_.open, 0);
+    EXPECT_EQ(log_.texts(), (Lines{"executeLinCommand: entry", "executeLinCommand: exit"}));
+}
+
+TEST_F(CommandRunner, EndsTheArgumentsAtTheFirstEmptyOne)
+{
+    runTool({"ignored", "a", "", "b"});
+    EXPECT_EQ(commands_.ran, Lines{"/usr/bin/tool a 2>&1"});
+}
+
+TEST_F(CommandRunner, TakesACommandWithoutArguments)
+{
+    runTool({"ignored"});
+    EXPECT_EQ(commands_.ran, Lines{"/usr/bin/tool 2>&1"});
+}
+
+TEST_F(CommandRunner, IsFalseForACommandThatPrintsNothing)
+{
+    commands_.answers["/usr/bin/tool 2>&1"] = "";
+    Outcome const outcome = runTool({"ignored"});
+    EXPECT_FALSE(outcome.result);
+    EXPECT_EQ(outcome.output, "");
+    EXPECT_EQ(commands_.open, 0);
+}
+
+TEST_F(CommandRunner, IsTrueForASingleByte)
+{
+    commands_.answers["/usr/bin/tool 2>&1"] = "x";
+    EXPECT_TRUE(runTool({"ignored"}).result);
+}
+
+TEST_F(CommandRunner, IsFalseForACommandThatCannotBeStarted)
+{
+    Outcome const outcome = runTool({"ignored"});
+    EXPECT_FALSE(outcome.result);
+    EXPECT_EQ(outcome.output, "");
+}
+
+TEST_F(CommandRunner, CopiesAllOfTheOutputHoweverLong)
+{
+    std::string const output(15000, 'o');
+    commands_.answers["/usr/bin/tool 2>&1"] = output;
+    EXPECT_EQ(runTool({"ignored"}).output, output);
+}
+
+TEST_F(CommandRunner, RunsALineThatFillsItsBufferOf5000Bytes)
+{
+    std::string const argument(4999 - 13 - 1 - 5, 'x');
+    runTool({"ignored", argument.c_str()});
+    EXPECT_EQ(commands_.ran, Lines{"/usr/bin/tool " + argument + " 2>&1"});
+}
+
+TEST_F(CommandRunner, RunsNothingWhereTheLineDoesNotFit)
+{
+    std::string const argument(5000 - 13 - 1 - 5, 'x');
+    EXPECT_FALSE(runTool({"ignored", argument.c_str()}).result);
+    EXPECT_EQ(commands_.ran, Lines{});
+    EXPECT_EQ(errors(), Lines{"Command line too long: /usr/bin/tool"});
+}
+
+/** Asks for the lock of jdoe, with passwd's answer given. */
+class AccountLock : public AccountOperation
+{
+protected:
+    bool locked(std::string const& output)
+    {
+        commands_.answers["/usr/bin/passwd -S jdoe 2>&1"] = output;
+        char user[] = "jdoe";
+        return userInfo().findIsAcctDisabled(user);
+    }
+
+    FakeFiles const files_;
+};
+
+TEST_F(AccountLock, IsAskedOfPasswd)
+{
+    locked("jdoe PS");
+    EXPECT_EQ(commands_.ran, Lines{"/usr/bin/passwd -S jdoe 2>&1"});
+    EXPECT_EQ(log_.texts(), (Lines{"findIsAcctDisabled: entry", "executeLinCommand: entry",
+                                   "executeLinCommand: exit", "findIsAcctDisabled: exit"}));
+}
+
+TEST_F(AccountLock, StandsInWordsAnywhereInTheOutput)
+{
+    EXPECT_TRUE(locked("jdoe LK 2008-01-01 (Password locked.)\n"));
+    EXPECT_TRUE(locked("Locked password.\n"));
+    EXPECT_FALSE(locked("jdoe LK 2008-01-01 0 99999 7 -1\n"));
+    EXPECT_FALSE(locked("jdoe PS (Password set, MD5 crypt.)\n"));
+    EXPECT_FALSE(locked("password locked"));
+}
+
+TEST_F(AccountLock, StandsBehindTheNameOnASuseSystem)
+{
+    for (char const* release : {"/etc/SuSE-release", "/etc/UnitedLinux-release"}) {
+        files_.write(release, "");
+        EXPECT_TRUE(locked("jdoe LK 01/01/2008 0 99999 7 -1\n")) << release;
+        EXPECT_TRUE(locked("jdoe LKx")) << release;
+        EXPECT_FALSE(locked("jdoe L")) << release;
+        EXPECT_FALSE(locked("jdoe PS 01/01/2008\n")) << release;
+        EXPECT_FALSE(locked(" jdoe LK")) << release;
+        EXPECT_FALSE(locked("jdoes LK")) << release;
+        EXPECT_FALSE(locked("Password locked")) << release;
+        files_.remove(release);
+    }
+}
+
+TEST_F(AccountLock, IsOffWhereThereIsNoOutput)
+{
+    EXPECT_FALSE(locked(""));
+    commands_.answers.clear();
+    char user[] = "jdoe";
+    EXPECT_FALSE(userInfo().findIsAcctDisabled(user));
+}
+
+TEST_F(AccountLock, IsFoundInTheFirst4999BytesOfAnyAmountOfOutput)
+{
+    std::string const mark = "Password locked";
+    std::string const rest(1000000, 'x');
+    EXPECT_TRUE(locked(std::string(4999 - mark.size(), '.') + mark + rest));
+    EXPECT_FALSE(locked(std::string(5000 - mark.size(), '.') + mark + rest));
+    EXPECT_EQ(commands_.open, 0);
+}
+
+} // namespace

@@ -1,0 +1,189 @@
+// What is listed on the fixture machines in tests/machines/users-*.
+
+#include "sysdata/userInfo_linux.h"
+
+#include "tests/support/Libc.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <ctime>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using NQ::userInfo;
+using Lines = std::vector<std::string>;
+
+std::vector<userInfo> usersOf(std::string const& machine)
+{
+    libc::FileRoot const root(MACHINES_DIR "/" + machine);
+    std::vector<userInfo> users;
+    NQ::getUserInfo(users);
+    return users;
+}
+
+Lines namesOn(std::string const& machine)
+{
+    Lines names;
+    for (userInfo& user : usersOf(machine))
+        names.push_back(user.getUserName());
+    return names;
+}
+
+/** Name, password, last change, minimum, maximum, warning, expiry days, inactive time. */
+std::string ageing(userInfo& user)
+{
+    std::string text = user.getUserName() + ' ' + user.getUserPassword();
+    for (unsigned long const value :
+         {user.getLstPwdChg(), user.getPwdMinDays(), user.getPwdMaxDays(), user.getPwdWarnDays(),
+          user.getPwdExpDays(), user.getPwdInactDays()})
+        text += ' ' + std::to_string(value);
+    return text;
+}
+
+Lines ageingOn(std::string const& machine, char const* zone = "UTC0")
+{
+    setenv("TZ", zone, 1);
+    tzset();
+    Lines lines;
+    for (userInfo& user : usersOf(machine))
+        lines.push_back(ageing(user));
+    return lines;
+}
+
+TEST(UserMachine, WithShadowInStepGivesEveryUserItsShadowFacts)
+{
+    EXPECT_EQ(ageingOn("users-shadow-in-step"),
+              (Lines{"root $6$root$hash 1199145600 0 99999 7 99999 2147472000",
+                     "anna $6$anna$hash 1209600000 1 90 14 30 1296000000",
+                     "ben $6$ben$hash 1209600000 1 90 14 30 1296000000",
+                     "carl $6$carl$hash 1209600000 1 90 14 30 1296000000"}));
+}
+
+TEST(UserMachine, WithShadowInStepGivesTheAccountFacts)
+{
+    std::vector<userInfo> users = usersOf("users-shadow-in-step");
+    ASSERT_EQ(users.size(), 4U);
+    userInfo& carl = users.at(3);
+    EXPECT_EQ(carl.getUserName(), "carl");
+    EXPECT_EQ(carl.getUserId(), "1002");
+    EXPECT_EQ(carl.getGroupId(), "100");
+    EXPECT_EQ(carl.getUserFullName(), "Carl Example");
+    EXPECT_EQ(carl.getUserHomeDir(), "/home/carl");
+    EXPECT_EQ(carl.getUserScriptPath(), "/bin/sh");
+    EXPECT_EQ(carl.getPasswordHistoryDepth(), 0);
+    EXPECT_EQ(carl.getMaxLoginFailures(), 0);
+    for (userInfo& user : users) {
+        EXPECT_FALSE(user.IsUserAcctDisabled());
+        EXPECT_FALSE(user.IsDelete());
+    }
+}
+
+TEST(UserMachine, EastOfGreenwichHasItsDatesAtLocalMidnight)
+{
+    EXPECT_EQ(ageingOn("users-shadow-in-step", "CET-1").at(1),
+              "anna $6$anna$hash 1209596400 1 90 14 30 1295996400");
+    EXPECT_EQ(ageingOn("users-shadow-in-step", "CET-1").at(0),
+              "root $6$root$hash 1199142000 0 99999 7 99999 2147468400");
+}
+
+TEST(UserMachine, WestOfGreenwichHasItsDatesAtLocalMidnight)
+{
+    EXPECT_EQ(ageingOn("users-shadow-in-step", "EST5").at(1),
+              "anna $6$anna$hash 1209618000 1 90 14 30 1296018000");
+    EXPECT_EQ(ageingOn("users-shadow-in-step", "EST5").at(0),
+              "root $6$root$hash 1199163600 0 99999 7 99999 2147490000");
+}
+
+TEST(UserMachine, WithShadowInAnotherOrderLosesTheFactsOfAllUsersAfterTheFirstMissingOne)
+{
+    EXPECT_EQ(ageingOn("users-shadow-order"),
+              (Lines{"root $6$root$hash 1199145600 0 99999 7 99999 2147472000",
+                     "anna $6$anna$hash 1209600000 1 90 14 30 1296000000", "ben  0 0 0 0 0 0",
+                     "carl  0 0 0 0 0 0"}));
+}
+
+TEST(UserMachine, WithoutAReadableShadowFileListsUsersWithoutShadowFacts)
+{
+    EXPECT_EQ(ageingOn("users-without-shadow"), (Lines{"root  0 0 0 0 0 0", "anna  0 0 0 0 0 0"}));
+}
+
+TEST(UserMachine, WithEmptyAgeingFieldsHasTheSystemsValues)
+{
+    std::string const lastChange = std::to_string(static_cast<unsigned long>(371085174288000ULL));
+    EXPECT_EQ(ageingOn("users-empty-ageing"),
+              (Lines{"root * " + lastChange + " 0 99999 7 99999 2147472000",
+                     "anna ! " + lastChange + " 0 99999 7 99999 2147472000"}));
+}
+
+TEST(UserMachine, ListsAUidAtEitherEndOfTheRangeAndNoneBeyond)
+{
+    EXPECT_EQ(namesOn("users-range-ends"), (Lines{"root", "first", "last"}));
+}
+
+TEST(UserMachine, ListsEveryAccountWithUidZero)
+{
+    EXPECT_EQ(ageingOn("users-two-roots"),
+              (Lines{"root $6$root$hash 1199145600 0 99999 7 99999 2147472000",
+                     "toor $6$toor$hash 1199232000 0 99999 7 99999 2147472000"}));
+}
+
+TEST(UserMachine, EndsItsListAtALineThatDoesNotFitTheBuffer)
+{
+    EXPECT_EQ(namesOn("users-long-line"), Lines{"root"});
+}
+
+TEST(UserMachine, LeavesOutTheMalformedLinesThatTheLibraryPassesOver)
+{
+    EXPECT_EQ(namesOn("users-malformed-line"), (Lines{"root", "ben"}));
+}
+
+TEST(UserMachine, WithoutAnAccountFileHasNoUsersAndSaysNothing)
+{
+    Recording const log;
+    EXPECT_EQ(namesOn("users-without-passwd"), Lines{});
+    EXPECT_EQ(log.texts(), (Lines{"getUserInfo: entry", "getUserInfo: exit"}));
+}
+
+TEST(UserMachine, WithoutLoginDefsListsRootAlone)
+{
+    EXPECT_EQ(namesOn("users-without-login-defs"), Lines{"root"});
+}
+
+std::vector<long> loginFailuresOn(std::string const& machine)
+{
+    std::vector<long> failures;
+    for (userInfo& user : usersOf(machine))
+        failures.push_back(user.getMaxLoginFailures());
+    return failures;
+}
+
+TEST(UserMachine, WithOneDenyGivesItToEveryUser)
+{
+    EXPECT_EQ(loginFailuresOn("users-deny-once"), (std::vector<long>{3, 3}));
+}
+
+TEST(UserMachine, WithSeveralDenysTakesTheLast)
+{
+    EXPECT_EQ(loginFailuresOn("users-deny-several"), (std::vector<long>{5, 5}));
+}
+
+TEST(UserMachine, WithADenyInACommentTakesThatToo)
+{
+    EXPECT_EQ(loginFailuresOn("users-deny-commented"), (std::vector<long>{8, 8}));
+}
+
+TEST(UserMachine, WithADenyThatIsNoNumberKeepsTheOneBeforeAndLogsTheLineForEveryUser)
+{
+    Recording const log;
+    EXPECT_EQ(loginFailuresOn("users-deny-unparsable"), (std::vector<long>{4, 4}));
+    std::string const complaint = "Invalid format: line = auth required pam_tally2.so onerr=fail "
+                                  "deny=many unlock_time=600";
+    EXPECT_EQ(log.texts(6000), (Lines{complaint, complaint}));
+}
+
+} // namespace

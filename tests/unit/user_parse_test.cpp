@@ -1,0 +1,179 @@
+#include "sysdata/userInfo_parse.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+
+namespace
+{
+
+using NQ::USER_INFO::LabelledDate;
+using NQ::USER_INFO::Scan;
+using NQ::USER_INFO::scanDay;
+using NQ::USER_INFO::scanDeny;
+using NQ::USER_INFO::scanLabelledDate;
+
+constexpr long untouched = 4711;
+
+struct Denied {
+    Scan scan;
+    long number;
+};
+
+Denied denied(std::string const& line)
+{
+    long number = untouched;
+    Scan const scan = scanDeny(line, number);
+    return {scan, number};
+}
+
+void expectDenied(std::string const& line, Scan scan, long number)
+{
+    Denied const found = denied(line);
+    EXPECT_EQ(found.scan, scan) << line;
+    EXPECT_EQ(found.number, number) << line;
+}
+
+TEST(LoginRule, GivesTheNumberBehindDeny)
+{
+    expectDenied("auth required pam_tally2.so deny=3 unlock_time=600", Scan::valid, 3);
+    expectDenied("deny=0", Scan::valid, 0);
+    expectDenied("deny=-1", Scan::valid, -1);
+    expectDenied("deny= 12", Scan::valid, 12);
+    expectDenied("deny=5x", Scan::valid, 5);
+}
+
+TEST(LoginRule, CountsInACommentAndInsideAnotherWord)
+{
+    expectDenied("# deny=4", Scan::valid, 4);
+    expectDenied("even_root_deny=6", Scan::valid, 6);
+}
+
+TEST(LoginRule, IsReadFromItsFirstDenyOnly)
+{
+    expectDenied("deny=1 deny=2", Scan::valid, 1);
+    expectDenied("deny=x deny=2", Scan::invalid, untouched);
+}
+
+TEST(LoginRule, IsInvalidWithoutANumber)
+{
+    expectDenied("deny=", Scan::invalid, untouched);
+    expectDenied("deny=many", Scan::invalid, untouched);
+}
+
+TEST(LoginRule, IsAbsentWithoutDeny)
+{
+    expectDenied("", Scan::absent, untouched);
+    expectDenied("auth required pam_unix.so", Scan::absent, untouched);
+    expectDenied("deny 3", Scan::absent, untouched);
+    expectDenied("DENY=3", Scan::absent, untouched);
+}
+
+constexpr char const* label = "Password expires";
+
+TEST(LabelledDate, IsReadBehindItsLabelAndAColon)
+{
+    LabelledDate date;
+    EXPECT_EQ(scanLabelledDate("Password expires\t\t\t\t\t: Feb 03, 2008\n", label, date),
+              Scan::valid);
+    EXPECT_EQ(date.month, "Feb");
+    EXPECT_EQ(date.day, 3);
+    EXPECT_EQ(date.year, 2008);
+}
+
+TEST(LabelledDate, IsReplacedByALaterOne)
+{
+    LabelledDate date{"Feb", 3, 2008};
+    EXPECT_EQ(scanLabelledDate("Password expires : Dec 31, 2010", label, date), Scan::valid);
+    EXPECT_EQ(date.month, "Dec");
+    EXPECT_EQ(date.day, 31);
+    EXPECT_EQ(date.year, 2010);
+}
+
+TEST(LabelledDate, IsLeftAloneByALineWithoutTheLabel)
+{
+    LabelledDate date{"Feb", 3, 2008};
+    EXPECT_EQ(scanLabelledDate("Account expires : Dec 31, 2010", label, date), Scan::absent);
+    EXPECT_EQ(date.month, "Feb");
+    EXPECT_EQ(date.day, 3);
+    EXPECT_EQ(date.year, 2008);
+}
+
+TEST(LabelledDate, IsInvalidWhereTheLabelIsNotTheLinesStart)
+{
+    LabelledDate date{"Feb", 3, 2008};
+    EXPECT_EQ(scanLabelledDate("x Password expires : Dec 31, 2010", label, date), Scan::invalid);
+    EXPECT_EQ(date.month, "Feb");
+    EXPECT_EQ(date.day, 3);
+    EXPECT_EQ(date.year, 2008);
+}
+
+TEST(LabelledDate, TakesNeverAsTheMonthOfAnInvalidDateAndKeepsDayAndYear)
+{
+    LabelledDate date{"Feb", 3, 2008};
+    EXPECT_EQ(scanLabelledDate("Password expires : never\n", label, date), Scan::invalid);
+    EXPECT_EQ(date.month, "never");
+    EXPECT_EQ(date.day, 3);
+    EXPECT_EQ(date.year, 2008);
+}
+
+TEST(LabelledDate, Is19January2038WhereADayAndAYearFollowNever)
+{
+    LabelledDate date;
+    EXPECT_EQ(scanLabelledDate("Password expires : never 01, 2008", label, date), Scan::valid);
+    EXPECT_EQ(date.month, "Jan");
+    EXPECT_EQ(date.day, 19);
+    EXPECT_EQ(date.year, 2038);
+}
+
+TEST(LabelledDate, KeepsWhatWasReadOfAnInvalidDate)
+{
+    LabelledDate date{"Feb", 3, 2008};
+    EXPECT_EQ(scanLabelledDate("Password expires : Dec 31 2010", label, date), Scan::invalid);
+    EXPECT_EQ(date.month, "Dec");
+    EXPECT_EQ(date.day, 31);
+    EXPECT_EQ(date.year, 2008);
+}
+
+TEST(LabelledDate, ReadsTwoDigitsOfTheDayAndFourOfTheYear)
+{
+    LabelledDate date;
+    EXPECT_EQ(scanLabelledDate("Password expires : Dec 31, 20109", label, date), Scan::valid);
+    EXPECT_EQ(date.year, 2010);
+    EXPECT_EQ(scanLabelledDate("Password expires : Dec 311, 2010", label, date), Scan::invalid);
+    EXPECT_EQ(date.day, 31);
+}
+
+TEST(LabelledDate, HoldsAMonthTextAsLongAsTheLine)
+{
+    std::string const text(100000, 'm');
+    LabelledDate date;
+    EXPECT_EQ(scanLabelledDate(("Password expires : " + text).c_str(), label, date), Scan::invalid);
+    EXPECT_EQ(date.month, text);
+}
+
+void expectDay(char const* text, int year, int month, int day)
+{
+    NQ::USER_INFO::CalendarDay const found = scanDay(text);
+    EXPECT_EQ(found.year, year) << text;
+    EXPECT_EQ(found.month, month) << text;
+    EXPECT_EQ(found.day, day) << text;
+}
+
+TEST(WrittenDate, IsReadAsYearMonthAndDay)
+{
+    expectDay("2010-12-31 00:00:00", 2010, 12, 31);
+    expectDay("2010-05-07", 2010, 5, 7);
+    expectDay("2010-5-7 12:30:00", 2010, 5, 7);
+}
+
+TEST(WrittenDate, HasZerosWhereItCannotBeRead)
+{
+    expectDay("", 0, 0, 0);
+    expectDay("tomorrow", 0, 0, 0);
+    expectDay("2010", 2010, 0, 0);
+    expectDay("2010-12", 2010, 12, 0);
+    expectDay("2010/12/31", 2010, 0, 0);
+}
+
+} // namespace

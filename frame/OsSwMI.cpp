@@ -61,4 +61,18 @@ void OsSwMI::adopt(MutableNode* node, std::string const& description)
     node->setDescription(description);
 }
 
+void OsSwMI::dropNodes(std::vector<Node*>& nodes, bool refresh, char const* announcement,
+                       char const* function)
+{
+    std::vector<Node*> dropped;
+    dropped.swap(nodes);
+    if (!refresh)
+        return;
+    for (Node* node : dropped) {
+        NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress,
+                       NQ::LOG::message(announcement, node->getDescription()), function);
+        deleteNode(node);
+    }
+}
+
 } // namespace IC

@@ -69,6 +69,13 @@ private:
 
     /** Makes a freshly made node the current one and hands it to the framework. */
     MI_INTERNAL void adopt(MutableNode* node, std::string const& description);
+
+    /**
+     * Empties a list of user or group nodes; on a refresh each node is announced in the log and
+     * deleted. At start-up they stay with the framework.
+     */
+    MI_INTERNAL void dropNodes(std::vector<Node*>& nodes, bool refresh, char const* announcement,
+                               char const* function);
 };
 
 /** The interface object that initialize ran on; node classes rebuild nodes through it. */

@@ -1,9 +1,15 @@
 #include "nodes/GroupNode.h"
 
 #include "frame/OsSwMI.h"
+#include "nodes/ids.h"
+#include "nodes/values.h"
+#include "sysdata/groupInfo_linux.h"
+#include "util/MutexLock.h"
 
 namespace IC
 {
+
+using NQ::groupInfo;
 
 GroupNode::GroupNode(unsigned int nodeId, unsigned int parentId, std::vector<unsigned int> miIds,
                      unsigned int nodeType, unsigned int index)
@@ -20,12 +26,41 @@ GroupNode::~GroupNode()
 Error GroupNode::getProperty(unsigned int id, PropertyValue& value) const
 {
     NQ::LOG::Scope const scope(OSSWMI::unit, {"GroupNode::getProperty"});
-    return MutableNode::getProperty(id, value);
+    if (id != NODES::elementCount)
+        return MutableNode::getProperty(id, value);
+    std::vector<groupInfo> groups;
+    NQ::getGroupInfo(groups);
+    value = NODES::number(static_cast<unsigned int>(groups.size()));
+    return {0, Number(0U), ""};
 }
 
-void OsSwMI::createGroupNodes(bool)
+void OsSwMI::createGroupNodes(bool refresh)
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::MutexLock const lock(OSSWMI::myuserlock);
+    dropNodes(groupNodes_, refresh, "Delete a group entry: ", __func__);
+    std::vector<groupInfo> groups;
+    NQ::getGroupInfo(groups);
+    auto const count = static_cast<unsigned int>(groups.size());
+    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("groups.size() = ", count));
+    unsigned int position = 0;
+    for (groupInfo& group : groups) {
+        unsigned int const nodeId = takeNodeId(!refresh);
+        auto* const node =
+            new GroupNode(nodeId, osNode_->getNodeId(), miIds_, NODES::groupType, ++position);
+        groupNodes_.push_back(node);
+        adopt(node, "Group");
+        std::string const name = group.getGroupName();
+        unsigned int const id = group.getGroupId();
+        NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("Name = ", name));
+        NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("Id = ", id));
+        NODES::setProperties(*node, {{NODES::name, NODES::text(name)},
+                                     {NODES::id, NODES::number(id)},
+                                     {NODES::members, NODES::texts(group.getGroupMembers())},
+                                     {NODES::elementCount, NODES::number(count)}});
+        if (refresh)
+            publishNode(node);
+    }
 }
 
 } // namespace IC

@@ -1,0 +1,51 @@
+#include "tests/support/WideTexts.h"
+
+#include "host/make_string.h"
+
+#include <dlfcn.h>
+
+namespace
+{
+
+WideTexts* inUse = nullptr;
+
+template <class Function> Function* next(char const* name)
+{
+    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
+}
+
+} // namespace
+
+WideTexts::WideTexts()
+{
+    inUse = this;
+}
+
+WideTexts::~WideTexts()
+{
+    inUse = nullptr;
+}
+
+namespace NQ
+{
+
+std::wstring make_wstring(std::string const& text)
+{
+    static auto* const real = next<std::wstring(std::string const&)>(
+        "_ZN2NQ12make_wstringERKNSt7__cxx1112basic_stringIcSt11char_traitsIcESaIcEEE");
+    if (inUse)
+        inUse->widened.push_back(text);
+    return real(text);
+}
+
+std::string make_string(std::wstring const& text)
+{
+    static auto* const real = next<std::string(std::wstring const&)>(
+        "_ZN2NQ11make_stringERKNSt7__cxx1112basic_stringIwSt11char_traitsIwESaIwEEE");
+    std::string const narrow = real(text);
+    if (inUse)
+        inUse->narrowed.push_back(narrow);
+    return narrow;
+}
+
+} // namespace NQ

@@ -1,0 +1,299 @@
+#include "nodes/GroupNode.h"
+
+#include "nodes/values.h"
+#include "sysdata/minMaxId.h"
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Frame.h"
+#include "tests/support/MutexCalls.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <grp.h>
+#include <new>
+#include <string>
+#include <typeinfo>
+#include <vector>
+
+namespace
+{
+
+using Texts = std::vector<std::string>;
+using Ids = std::vector<unsigned int>;
+
+/** A machine with two groups, one of them empty. */
+class GroupNodes : public testing::Test
+{
+protected:
+    GroupNodes()
+    {
+        files.write("/etc/login.defs", "GID_MIN 500\nGID_MAX 60000\n");
+        files.write("/etc/passwd", "anna:x:1000:500:::\nben:x:1001:500:::\n");
+        files.write("/etc/group", "root:x:0:\ntty:x:5:anna\nteam:x:500:ben,carl\n");
+    }
+
+    std::vector<IC::MutableNode*> groups() const
+    {
+        return frame.ofType(51);
+    }
+
+    std::vector<IC::Node*> inOrder() const
+    {
+        std::vector<IC::MutableNode*> const nodes = groups();
+        return {nodes.begin(), nodes.end()};
+    }
+
+    FakeFiles const files;
+    libc::HookGuard const guard;
+    Frame frame;
+};
+
+TEST_F(GroupNodes, StandUnderTheOperatingSystemInTheOrderOfTheDatabase)
+{
+    frame.nextNodeId_ = 30;
+    frame.createGroupNodes(false);
+    ASSERT_EQ(groups().size(), 2U);
+    for (unsigned int i = 0; i < 2; ++i) {
+        IC::MutableNode const& node = *groups()[i];
+        EXPECT_EQ(node.getNodeId(), 30 + i);
+        EXPECT_EQ(node.getIndex(), i + 1);
+        EXPECT_EQ(node.getLinkedId(), frame.osNode_->getNodeId());
+        EXPECT_EQ(node.getMIIds(), Ids{7});
+        EXPECT_EQ(node.getStatus(), 1U);
+        EXPECT_EQ(node.getDescription(), "Group");
+        EXPECT_TRUE(typeid(node) == typeid(IC::GroupNode));
+    }
+    EXPECT_EQ(frame.nextNodeId_, 32U);
+    EXPECT_EQ(frame.currentNode_, groups().back());
+    EXPECT_EQ(frame.groupNodes_, inOrder());
+}
+
+TEST_F(GroupNodes, CarryTheIdListOfTheMomentTheyWereMade)
+{
+    frame.miIds_ = {7, 9};
+    frame.createGroupNodes(false);
+    frame.miIds_.push_back(11);
+    for (IC::MutableNode const* node : groups())
+        EXPECT_EQ(node->getMIIds(), (Ids{7, 9}));
+}
+
+TEST_F(GroupNodes, HoldFourProperties)
+{
+    frame.createGroupNodes(false);
+    ASSERT_EQ(groups().size(), 2U);
+    IC::MutableNode const& team = *groups()[1];
+    EXPECT_EQ(team.getProperties().size(), 4U);
+    EXPECT_EQ(storedValue(team, 108), "text team true");
+    EXPECT_EQ(storedValue(team, 89), "number 500 true");
+    EXPECT_EQ(storedValue(team, 165), "texts anna,ben,carl true");
+    EXPECT_EQ(storedValue(team, 51), "number 2 true");
+}
+
+TEST_F(GroupNodes, HoldAnEmptyListWithoutMembers)
+{
+    frame.createGroupNodes(false);
+    ASSERT_EQ(groups().size(), 2U);
+    EXPECT_EQ(storedValue(*groups()[0], 165), "texts  true");
+    EXPECT_TRUE(groups()[0]->getProperties().at(165).getTexts().empty());
+}
+
+TEST_F(GroupNodes, AreSetUpInTheOrderThatHostsSee)
+{
+    files.write("/etc/group", "root:x:0:\n");
+    NodeCalls const calls;
+    frame.createGroupNodes(false);
+    EXPECT_EQ(calls.calls, (Texts{"setStatus(1)", "setDescription(Group)", "setProperty(108)",
+                                  "setProperty(89)", "setProperty(165)", "setProperty(51)"}));
+}
+
+TEST_F(GroupNodes, NoteTheirIdsAndAreNotPublishedAtTheStart)
+{
+    frame.nextNodeId_ = 30;
+    frame.createGroupNodes(false);
+    EXPECT_EQ(*frame.nodeIds_, (Ids{30, 31}));
+    EXPECT_TRUE(frame.published.empty());
+    EXPECT_TRUE(frame.deleted.empty());
+}
+
+TEST_F(GroupNodes, ArePublishedOnARefreshAndTheirIdsNotNoted)
+{
+    frame.createGroupNodes(false);
+    Ids const noted = *frame.nodeIds_;
+    unsigned int const next = frame.nextNodeId_;
+    frame.createGroupNodes(true);
+    EXPECT_EQ(*frame.nodeIds_, noted);
+    ASSERT_EQ(groups().size(), 2U);
+    EXPECT_EQ(frame.published, inOrder());
+    for (unsigned int i = 0; i < 2; ++i) {
+        EXPECT_EQ(groups()[i]->getNodeId(), next + i);
+        EXPECT_EQ(groups()[i]->getIndex(), i + 1);
+    }
+}
+
+TEST_F(GroupNodes, AreAllDeletedOnARefreshBeforeANewOneIsMade)
+{
+    frame.createGroupNodes(false);
+    std::vector<IC::Node*> const before = frame.groupNodes_;
+    Recording const log;
+    frame.createGroupNodes(true);
+    EXPECT_EQ(frame.deleted, before);
+    Texts const texts = log.texts(3000);
+    EXPECT_EQ(Texts(texts.begin(), texts.begin() + 6),
+              (Texts{"createGroupNodes: entry", "Delete a group entry: Group",
+                     "GroupNode::~GroupNode: entry", "Delete a group entry: Group",
+                     "GroupNode::~GroupNode: entry", "getGroupInfo: entry"}));
+    LogRecord const announcement = log.records().at(2);
+    EXPECT_EQ(announcement.text, "Delete a group entry: Group");
+    EXPECT_EQ(announcement.function, "createGroupNodes");
+    EXPECT_EQ(announcement.file, "OsSwMI");
+}
+
+TEST_F(GroupNodes, AreForgottenButNotDeletedWhenBuiltAgainWithoutARefresh)
+{
+    frame.createGroupNodes(false);
+    frame.createGroupNodes(false);
+    EXPECT_TRUE(frame.deleted.empty());
+    EXPECT_EQ(groups().size(), 4U);
+    EXPECT_EQ(frame.groupNodes_.size(), 2U);
+    EXPECT_EQ(groups()[2]->getIndex(), 1U);
+}
+
+TEST_F(GroupNodes, SayHowManyThereAreAndWhichEachOneIs)
+{
+    Recording const log;
+    frame.createGroupNodes(false);
+    Texts remarks;
+    for (LogRecord const& record : log.records())
+        if (!record.trace && record.file == "OsSwMI" && record.function == "createGroupNodes") {
+            EXPECT_EQ(record.level, 3000);
+            EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
+            remarks.push_back(record.text);
+        }
+    EXPECT_EQ(remarks, (Texts{"createGroupNodes: entry", "groups.size() = 2", "Name = root",
+                              "Id = 0", "Name = team", "Id = 500", "createGroupNodes: exit"}));
+}
+
+TEST_F(GroupNodes, SayTheirNameAndIdBeforeTheirPropertiesAreSet)
+{
+    files.write("/etc/group", "root:x:0:\n");
+    NodeCalls const calls;
+    struct CallsAtId : mihost::LogSink {
+        explicit CallsAtId(NodeCalls const& of) : noted(of) {}
+        void write(mihost::LogMessage const& message) override
+        {
+            if (message.text == "Id = 0")
+                count = noted.calls.size();
+        }
+        NodeCalls const& noted;
+        std::size_t count = 0;
+    } sink(calls);
+    mihost::setLogSink(&sink);
+    frame.createGroupNodes(false);
+    mihost::setLogSink(nullptr);
+    EXPECT_EQ(sink.count, 2U); // status and description
+}
+
+TEST_F(GroupNodes, AreBuiltUnderTheLockThatTheyShareWithUsers)
+{
+    Texts steps;
+    MutexCalls mutexes;
+    mutexes.onLock = [&steps](NQ::Mutex const& mutex, unsigned long timeout) {
+        steps.push_back((&mutex == &IC::OSSWMI::myuserlock ? "lock shared " : "lock own ") +
+                        std::to_string(timeout));
+    };
+    mutexes.onUnlock = [&steps](NQ::Mutex const& mutex) {
+        steps.emplace_back(&mutex == &IC::OSSWMI::myuserlock ? "unlock shared" : "unlock own");
+        return 0;
+    };
+    frame.createGroupNodes(false);
+    EXPECT_EQ(steps, (Texts{"lock shared 4294967295", "lock own 4294967295", "unlock own",
+                            "unlock shared"}));
+}
+
+TEST_F(GroupNodes, LeaveNoLockBehindWhenAnExceptionPasses)
+{
+    libc::hooks().getgrent = []() -> group* { throw std::bad_alloc(); };
+    int held = 0;
+    MutexCalls mutexes;
+    mutexes.onLock = [&held](NQ::Mutex const&, unsigned long) { ++held; };
+    mutexes.onUnlock = [&held](NQ::Mutex const&) {
+        --held;
+        return 0;
+    };
+    EXPECT_THROW(frame.createGroupNodes(false), std::bad_alloc);
+    EXPECT_EQ(held, 0);
+}
+
+TEST_F(GroupNodes, AreStoredWithoutTheMarkOfTheUserBuilder)
+{
+    struct FlagSeen : mihost::LogSink {
+        void write(mihost::LogMessage const&) override
+        {
+            seen = seen || IC::OSSWMI::MI_call;
+        }
+        bool seen = false;
+    } sink;
+    mihost::setLogSink(&sink);
+    frame.createGroupNodes(false);
+    mihost::setLogSink(nullptr);
+    EXPECT_FALSE(sink.seen);
+}
+
+TEST_F(GroupNodes, AreNoneOnAnEmptyDatabase)
+{
+    files.write("/etc/group", "");
+    Recording const log;
+    frame.createGroupNodes(false);
+    EXPECT_TRUE(groups().empty());
+    EXPECT_TRUE(log.has("groups.size() = 0", 3000));
+}
+
+TEST_F(GroupNodes, AnswerTheirCountLive)
+{
+    frame.createGroupNodes(false);
+    files.write("/etc/group", "root:x:0:\nteam:x:500:\nnew:x:501:\n");
+    IC::PropertyValue value = NODES::emptyValue();
+    EXPECT_EQ(static_cast<std::string>(groups()[0]->getProperty(51, value)), "status 0");
+    EXPECT_EQ(shown(value), "number 3 true");
+    EXPECT_EQ(storedValue(*groups()[0], 51), "number 2 true");
+}
+
+TEST_F(GroupNodes, AnswerAllElseFromWhatIsStored)
+{
+    frame.createGroupNodes(false);
+    files.write("/etc/group", "");
+    IC::PropertyValue value = NODES::emptyValue();
+    EXPECT_EQ(groups()[1]->getProperty(108, value).getStatus(), 0);
+    EXPECT_EQ(shown(value), "text team true");
+    IC::PropertyValue untouched = NODES::text("untouched");
+    EXPECT_EQ(groups()[1]->getProperty(4711, untouched).getStatus(), 1);
+    EXPECT_EQ(shown(untouched), "text untouched true");
+}
+
+TEST_F(GroupNodes, OnlyStoreWhatIsWrittenToThem)
+{
+    frame.createGroupNodes(false);
+    libc::FakeCommands const commands;
+    Recording const log;
+    EXPECT_EQ(groups()[1]->setProperty(138, NODES::number(1)).getStatus(), 0);
+    EXPECT_EQ(storedValue(*groups()[1], 138), "number 1 true");
+    EXPECT_TRUE(commands.ran.empty());
+    EXPECT_TRUE(log.records().empty()); // the framework's own store
+}
+
+TEST_F(GroupNodes, SpeakOfAReadOfTheirBirthAndOfTheirDeath)
+{
+    Recording log;
+    auto* const node = new IC::GroupNode(1, 2, {}, 51, 3);
+    EXPECT_EQ(log.texts(), Texts{"GroupNode::GroupNode: entry"});
+    log.clear();
+    IC::PropertyValue value = NODES::emptyValue();
+    node->getProperty(108, value);
+    EXPECT_EQ(log.texts(),
+              (Texts{"GroupNode::getProperty: entry", "GroupNode::getProperty: exit"}));
+    log.clear();
+    delete node;
+    EXPECT_EQ(log.texts(), Texts{"GroupNode::~GroupNode: entry"});
+}
+
+} // namespace

@@ -1,0 +1,394 @@
+#include "nodes/UserNode.h"
+
+#include "nodes/values.h"
+#include "sysdata/minMaxId.h"
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Frame.h"
+#include "tests/support/MutexCalls.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cstdlib>
+#include <ctime>
+#include <new>
+#include <string>
+#include <typeinfo>
+#include <vector>
+
+namespace
+{
+
+using Texts = std::vector<std::string>;
+using Ids = std::vector<unsigned int>;
+
+std::string account(std::string const& name, unsigned int uid)
+{
+    return name + ":x:" + std::to_string(uid) + ":100:" + name + " full:/home/" + name +
+           ":/bin/sh\n";
+}
+
+/** A machine with three users. */
+class UserNodes : public testing::Test
+{
+protected:
+    UserNodes()
+    {
+        setenv("TZ", "UTC0", 1);
+        tzset();
+        files.write("/etc/login.defs", "UID_MIN 500\nUID_MAX 60000\n");
+        files.write("/etc/passwd",
+                    account("root", 0) + account("anna", 1000) + account("ben", 1001));
+    }
+
+    std::vector<IC::MutableNode*> users() const
+    {
+        return frame.ofType(46);
+    }
+
+    std::vector<IC::Node*> inOrder() const
+    {
+        std::vector<IC::MutableNode*> const nodes = users();
+        return {nodes.begin(), nodes.end()};
+    }
+
+    FakeFiles const files;
+    Frame frame;
+};
+
+TEST_F(UserNodes, StandUnderTheOperatingSystemInTheOrderOfTheAccountFile)
+{
+    frame.nextNodeId_ = 30;
+    frame.createUserNodes(false);
+    ASSERT_EQ(users().size(), 3U);
+    for (unsigned int i = 0; i < 3; ++i) {
+        IC::MutableNode const& node = *users()[i];
+        EXPECT_EQ(node.getNodeId(), 30 + i);
+        EXPECT_EQ(node.getIndex(), i + 1);
+        EXPECT_EQ(node.getLinkedId(), frame.osNode_->getNodeId());
+        EXPECT_EQ(node.getMIIds(), Ids{7});
+        EXPECT_EQ(node.getStatus(), 1U);
+        EXPECT_EQ(node.getDescription(), "User Account");
+        EXPECT_TRUE(typeid(node) == typeid(IC::UserNode));
+    }
+    EXPECT_EQ(storedValue(*users()[0], 108), "text root true");
+    EXPECT_EQ(storedValue(*users()[1], 108), "text anna true");
+    EXPECT_EQ(storedValue(*users()[2], 108), "text ben true");
+    EXPECT_EQ(frame.nextNodeId_, 33U);
+    EXPECT_EQ(frame.currentNode_, users().back());
+    EXPECT_EQ(frame.userNodes_, inOrder());
+}
+
+TEST_F(UserNodes, CarryTheIdListOfTheMomentTheyWereMade)
+{
+    frame.miIds_ = {7, 9};
+    frame.createUserNodes(false);
+    frame.miIds_.push_back(11);
+    for (IC::MutableNode const* node : users())
+        EXPECT_EQ(node->getMIIds(), (Ids{7, 9}));
+}
+
+TEST_F(UserNodes, HoldTwentyFourProperties)
+{
+    files.write("/etc/passwd", account("root", 0) + "anna:x:1000:100:Anna,,,:/home/a:/bin/ksh\n");
+    files.write("/etc/shadow", "root:*:::::::\nanna:$6$salt$hash:14000:1:90:14:30:15000:\n");
+    files.write("/etc/pam.d/login", "auth required pam_tally2.so deny=3\n");
+    frame.createUserNodes(false);
+    ASSERT_EQ(users().size(), 2U);
+    IC::MutableNode const& anna = *users()[1];
+    EXPECT_EQ(anna.getProperties().size(), 24U);
+    EXPECT_EQ(storedValue(anna, 123), "enumeration 1 true");
+    EXPECT_EQ(storedValue(anna, 125), "numbers 0,1,24 true");
+    EXPECT_EQ(storedValue(anna, 108), "text anna true");
+    EXPECT_EQ(storedValue(anna, 109), "number 4 true");
+    EXPECT_EQ(storedValue(anna, 89), "text 1000 true");
+    EXPECT_EQ(storedValue(anna, 90), "number 4 true");
+    EXPECT_EQ(storedValue(anna, 311), "text 100 true");
+    EXPECT_EQ(storedValue(anna, 312), "text Anna,,, true");
+    EXPECT_EQ(storedValue(anna, 158), "text /home/a true");
+    EXPECT_EQ(storedValue(anna, 159), "text /bin/ksh true");
+    EXPECT_EQ(storedValue(anna, 117), "text $6$salt$hash true");
+    EXPECT_EQ(storedValue(anna, 120), "number 12 true");
+    EXPECT_EQ(storedValue(anna, 163), "number 90 true");
+    EXPECT_EQ(storedValue(anna, 162), "number 14 true");
+    EXPECT_EQ(storedValue(anna, 161), "number 1 true");
+    EXPECT_EQ(storedValue(anna, 44), "number 30 true");
+    EXPECT_EQ(storedValue(anna, 118), "date 1296000000 true");
+    EXPECT_EQ(storedValue(anna, 119), "number 0 true");
+    EXPECT_EQ(storedValue(anna, 113), "text  true");
+    EXPECT_EQ(storedValue(anna, 91), "date 1296000000 true");
+    EXPECT_EQ(storedValue(anna, 160), "date 1209600000 true");
+    EXPECT_EQ(storedValue(anna, 106), "number 3 true");
+    EXPECT_EQ(storedValue(anna, 138), "boolean false true");
+    EXPECT_EQ(storedValue(anna, 51), "number 2 true");
+}
+
+TEST_F(UserNodes, CountTheBytesOfTheirTexts)
+{
+    files.write("/etc/passwd", "j\xC3\xB6rg:x:1000:100::/:/bin/sh\n");
+    frame.createUserNodes(false);
+    ASSERT_EQ(users().size(), 1U);
+    EXPECT_EQ(storedValue(*users()[0], 109), "number 5 true");
+}
+
+TEST_F(UserNodes, HoldTheSystemsValuesForEmptyAgeingFields)
+{
+    files.write("/etc/passwd", account("anna", 1000));
+    files.write("/etc/shadow", "anna:!:::::::\n");
+    frame.createUserNodes(false);
+    ASSERT_EQ(users().size(), 1U);
+    IC::MutableNode const& anna = *users()[0];
+    EXPECT_EQ(storedValue(anna, 163), "number 99999 true");
+    EXPECT_EQ(storedValue(anna, 162), "number 7 true");
+    EXPECT_EQ(storedValue(anna, 161), "number 0 true");
+    EXPECT_EQ(storedValue(anna, 44), "number 99999 true");
+    EXPECT_EQ(storedValue(anna, 118), "date 2147472000 true");
+    EXPECT_EQ(storedValue(anna, 91), "date 2147472000 true");
+}
+
+Texts setUp()
+{
+    Texts calls{"setStatus(1)", "setDescription(User Account)"};
+    for (unsigned int const id : {123, 125, 108, 109, 89,  90,  311, 312, 158, 159, 117, 120,
+                                  163, 162, 161, 44,  118, 119, 113, 91,  160, 106, 138, 51})
+        calls.push_back("setProperty(" + std::to_string(id) + ")");
+    return calls;
+}
+
+TEST_F(UserNodes, AreSetUpInTheOrderThatHostsSee)
+{
+    files.write("/etc/passwd", account("root", 0));
+    NodeCalls const calls;
+    frame.createUserNodes(false);
+    EXPECT_EQ(calls.calls, setUp());
+}
+
+TEST_F(UserNodes, NoteTheirIdsAndAreNotPublishedAtTheStart)
+{
+    frame.nextNodeId_ = 30;
+    frame.createUserNodes(false);
+    EXPECT_EQ(*frame.nodeIds_, (Ids{30, 31, 32}));
+    EXPECT_TRUE(frame.published.empty());
+    EXPECT_TRUE(frame.deleted.empty());
+}
+
+TEST_F(UserNodes, ArePublishedOnARefreshAndTheirIdsNotNoted)
+{
+    frame.createUserNodes(false);
+    Ids const noted = *frame.nodeIds_;
+    unsigned int const next = frame.nextNodeId_;
+    frame.createUserNodes(true);
+    EXPECT_EQ(*frame.nodeIds_, noted);
+    ASSERT_EQ(users().size(), 3U);
+    EXPECT_EQ(frame.published, inOrder());
+    for (unsigned int i = 0; i < 3; ++i) {
+        EXPECT_EQ(users()[i]->getNodeId(), next + i);
+        EXPECT_EQ(users()[i]->getIndex(), i + 1);
+    }
+    EXPECT_EQ(frame.nextNodeId_, next + 3);
+}
+
+TEST_F(UserNodes, AreAllDeletedOnARefreshBeforeANewOneIsMade)
+{
+    frame.createUserNodes(false);
+    std::vector<IC::Node*> const before = frame.userNodes_;
+    Recording const log;
+    frame.createUserNodes(true);
+    EXPECT_EQ(frame.deleted, before);
+    Texts const texts = log.texts(3000);
+    Texts const beginning(texts.begin(), texts.begin() + 8);
+    EXPECT_EQ(beginning, (Texts{"createUserNodes: entry", "Delete a user entry: User Account",
+                                "UserNode::~UserNode: entry", "Delete a user entry: User Account",
+                                "UserNode::~UserNode: entry", "Delete a user entry: User Account",
+                                "UserNode::~UserNode: entry", "getUserInfo: entry"}));
+    LogRecord const announcement = log.records().at(2);
+    EXPECT_EQ(announcement.text, "Delete a user entry: User Account");
+    EXPECT_EQ(announcement.function, "createUserNodes");
+    EXPECT_EQ(announcement.file, "OsSwMI");
+    EXPECT_EQ(announcement.category, "Veltrix.IC.MI.OsSwMI");
+}
+
+TEST_F(UserNodes, ShowTheAccountsAsTheyAreAtTheRefresh)
+{
+    frame.createUserNodes(false);
+    files.write("/etc/passwd", account("ben", 1001) + account("new", 1002));
+    frame.createUserNodes(true);
+    ASSERT_EQ(users().size(), 2U);
+    EXPECT_EQ(storedValue(*users()[0], 108), "text ben true");
+    EXPECT_EQ(storedValue(*users()[1], 108), "text new true");
+    EXPECT_EQ(storedValue(*users()[1], 51), "number 2 true");
+}
+
+TEST_F(UserNodes, AreForgottenButNotDeletedWhenBuiltAgainWithoutARefresh)
+{
+    frame.createUserNodes(false);
+    frame.createUserNodes(false);
+    EXPECT_TRUE(frame.deleted.empty());
+    EXPECT_EQ(users().size(), 6U);
+    EXPECT_EQ(frame.userNodes_.size(), 3U);
+    EXPECT_EQ(users()[3]->getIndex(), 1U);
+}
+
+TEST_F(UserNodes, AreBuiltUnderTheSharedLockWithoutTimeLimit)
+{
+    NQ::minMaxId::Instance();
+    for (bool const refresh : {false, true}) {
+        Texts steps;
+        MutexCalls mutexes;
+        mutexes.onLock = [&steps](NQ::Mutex const& mutex, unsigned long timeout) {
+            if (&mutex == &IC::OSSWMI::myuserlock)
+                steps.push_back("lock " + std::to_string(timeout));
+        };
+        mutexes.onUnlock = [&steps](NQ::Mutex const& mutex) {
+            if (&mutex == &IC::OSSWMI::myuserlock)
+                steps.emplace_back("unlock");
+            return 0;
+        };
+        std::size_t const deletedBefore = frame.deleted.size();
+        auto const onOpen = libc::hooks().fopen;
+        libc::hooks().fopen = [&, onOpen](char const* path, char const* mode) {
+            if (std::string(path) == "/etc/passwd")
+                steps.push_back("list, deleted " +
+                                std::to_string(frame.deleted.size() - deletedBefore));
+            return onOpen(path, mode);
+        };
+        frame.createUserNodes(refresh);
+        libc::hooks().fopen = onOpen;
+        EXPECT_EQ(steps, (Texts{"lock 4294967295", refresh ? "list, deleted 3" : "list, deleted 0",
+                                "unlock"}));
+    }
+}
+
+TEST_F(UserNodes, AreNoneWithoutAnAccountFileAndTheLockIsReleased)
+{
+    files.remove("/etc/passwd");
+    int locks = 0;
+    int unlocks = 0;
+    MutexCalls mutexes;
+    mutexes.onLock = [&locks](NQ::Mutex const&, unsigned long) { ++locks; };
+    mutexes.onUnlock = [&unlocks](NQ::Mutex const&) {
+        ++unlocks;
+        return 0;
+    };
+    frame.createUserNodes(false);
+    EXPECT_TRUE(users().empty());
+    EXPECT_EQ(locks, 1);
+    EXPECT_EQ(unlocks, 1);
+}
+
+/** Notes how the flag stands at each message; throws at one of them, if told to. */
+class FlagAtMessages : public mihost::LogSink
+{
+public:
+    FlagAtMessages()
+    {
+        mihost::setLogSink(this);
+    }
+    ~FlagAtMessages() override
+    {
+        mihost::setLogSink(nullptr);
+    }
+
+    void write(mihost::LogMessage const& message) override
+    {
+        if (message.operation == mihost::LogMessage::Operation::Trace)
+            return;
+        std::string& seen = at[message.text];
+        seen += IC::OSSWMI::MI_call ? '1' : '0';
+        if (message.text == throwAt)
+            throw std::bad_alloc();
+    }
+
+    std::map<std::string, std::string> at;
+    std::string throwAt;
+};
+
+TEST_F(UserNodes, AreMarkedAsTheBuildersWhileItStoresPropertiesAndOnlyThen)
+{
+    files.write("/etc/passwd", account("root", 0));
+    FlagAtMessages flag;
+    frame.createUserNodes(false);
+    frame.createUserNodes(true);
+    EXPECT_EQ(flag.at["UserNode::UserNode: entry"], "00");
+    EXPECT_EQ(flag.at["UserNode::setProperty: entry"], std::string(48, '1'));
+    EXPECT_EQ(flag.at["UserNode::setProperty: exit"], std::string(48, '1'));
+    EXPECT_EQ(flag.at["publishNode: entry"], "0");
+    EXPECT_EQ(flag.at["createUserNodes: exit"], "00");
+    EXPECT_FALSE(IC::OSSWMI::MI_call);
+}
+
+TEST_F(UserNodes, LeaveNeitherTheFlagNorTheLockBehindWhenAnExceptionPasses)
+{
+    FlagAtMessages flag;
+    flag.throwAt = "getPwdMinDays: entry";
+    int unlocks = 0;
+    MutexCalls mutexes;
+    mutexes.onUnlock = [&unlocks](NQ::Mutex const&) {
+        ++unlocks;
+        return 0;
+    };
+    EXPECT_THROW(frame.createUserNodes(false), std::bad_alloc);
+    EXPECT_FALSE(IC::OSSWMI::MI_call);
+    EXPECT_EQ(unlocks, 1);
+}
+
+TEST_F(UserNodes, AnswerTheirCountLive)
+{
+    frame.createUserNodes(false);
+    files.write("/etc/passwd", account("root", 0) + account("anna", 1000) + account("ben", 1001) +
+                                   account("new", 1002));
+    IC::PropertyValue value = NODES::emptyValue();
+    IC::Error const error = users()[0]->getProperty(51, value);
+    EXPECT_EQ(static_cast<std::string>(error), "status 0");
+    EXPECT_EQ(shown(value), "number 4 true");
+    EXPECT_EQ(storedValue(*users()[0], 51), "number 3 true");
+}
+
+TEST_F(UserNodes, AnswerTheirCountWhateverIsStoredUnderIt)
+{
+    frame.createUserNodes(false);
+    users()[0]->setProperty(51, NODES::number(99));
+    IC::PropertyValue value = NODES::emptyValue();
+    EXPECT_EQ(users()[0]->getProperty(51, value).getStatus(), 0);
+    EXPECT_EQ(shown(value), "number 3 true");
+}
+
+TEST_F(UserNodes, AnswerAllElseFromWhatIsStored)
+{
+    frame.createUserNodes(false);
+    files.write("/etc/passwd", "");
+    IC::PropertyValue value = NODES::emptyValue();
+    EXPECT_EQ(users()[1]->getProperty(108, value).getStatus(), 0);
+    EXPECT_EQ(shown(value), "text anna true");
+    IC::PropertyValue untouched = NODES::text("untouched");
+    EXPECT_EQ(users()[1]->getProperty(4711, untouched).getStatus(), 1);
+    EXPECT_EQ(shown(untouched), "text untouched true");
+}
+
+TEST_F(UserNodes, SpeakOfAReadUnderTheNameOfTheClass)
+{
+    frame.createUserNodes(false);
+    IC::PropertyValue value = NODES::emptyValue();
+    Recording log;
+    users()[0]->getProperty(108, value);
+    EXPECT_EQ(log.texts(3000), (Texts{"UserNode::UserNode: entry", "UserNode::UserNode: exit"}));
+    log.clear();
+    users()[0]->getProperty(51, value);
+    Texts const texts = log.texts(3000);
+    EXPECT_EQ(texts.front(), "UserNode::UserNode: entry");
+    EXPECT_EQ(texts.at(1), "getUserInfo: entry");
+    EXPECT_EQ(texts.back(), "UserNode::UserNode: exit");
+}
+
+TEST_F(UserNodes, SpeakOfTheirBirthAndOfTheirDeath)
+{
+    Recording log;
+    auto* const node = new IC::UserNode(1, 2, {}, 46, 3);
+    EXPECT_EQ(log.texts(), Texts{"UserNode::UserNode: entry"});
+    log.clear();
+    delete node;
+    EXPECT_EQ(log.texts(), Texts{"UserNode::~UserNode: entry"});
+}
+
+} // namespace

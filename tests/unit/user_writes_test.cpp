@@ -1,0 +1,293 @@
+// What writing a property of a user node does to the system.
+
+#include "nodes/UserNode.h"
+
+#include "nodes/values.h"
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Frame.h"
+#include "tests/support/Recording.h"
+#include "tests/support/WideTexts.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cstdlib>
+#include <ctime>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using Texts = std::vector<std::string>;
+
+constexpr char const* setPasswords = "chpasswd -e < usrandpwd ; rm -f usrandpwd";
+
+std::string contentOf(char const* path)
+{
+    std::ifstream const file(path);
+    std::ostringstream text;
+    text << file.rdbuf();
+    return file ? text.str() : "(none)";
+}
+
+Texts sorted(Texts texts)
+{
+    std::sort(texts.begin(), texts.end());
+    return texts;
+}
+
+/** The node of anna, UID 1000, in a working directory of its own. */
+class UserWrite : public testing::Test
+{
+protected:
+    UserWrite()
+    {
+        setenv("TZ", "UTC0", 1);
+        tzset();
+        files.write("/etc/login.defs", "UID_MIN 500\nUID_MAX 60000\n");
+        files.write("/etc/passwd", "anna:x:1000:100:Anna:/home/anna:/bin/sh\n");
+        frame.createUserNodes(false);
+        std::string const folder = files.realPath("/here");
+        std::filesystem::create_directories(folder);
+        std::filesystem::current_path(folder);
+    }
+
+    ~UserWrite() override
+    {
+        std::filesystem::current_path("/");
+    }
+
+    IC::MutableNode& anna() const
+    {
+        return *frame.ofType(46).at(0);
+    }
+
+    void write(unsigned int id, IC::PropertyValue const& value)
+    {
+        EXPECT_EQ(static_cast<std::string>(anna().setProperty(id, value)), "status 0");
+    }
+
+    FakeFiles const files;
+    Frame frame;
+    libc::FakeCommands commands;
+    Recording log;
+};
+
+/** Notes what stands in the password file at the moment that chpasswd is started. */
+class PasswordWrite : public UserWrite
+{
+protected:
+    PasswordWrite()
+    {
+        auto const start = libc::hooks().popen;
+        libc::hooks().popen = [this, start](char const* command, char const* mode) {
+            handedOver.push_back(contentOf("usrandpwd"));
+            return start(command, mode);
+        };
+    }
+
+    Texts handedOver;
+};
+
+TEST_F(PasswordWrite, HandsNameAndEncryptedPasswordToChpasswdInAFile)
+{
+    commands.answers[setPasswords] = "";
+    write(117, NODES::text("$6$salt$hash"));
+    EXPECT_EQ(commands.ran, Texts{setPasswords});
+    EXPECT_EQ(handedOver, Texts{"anna:$6$salt$hash\n"});
+    EXPECT_EQ(commands.open, 0);
+    EXPECT_EQ(storedValue(anna(), 117), "text $6$salt$hash true");
+    EXPECT_TRUE(log.texts(6000).empty());
+}
+
+TEST_F(PasswordWrite, EmptiesAFileThatIsThereAlready)
+{
+    std::ofstream("usrandpwd") << "root:x\nanna:an older and much longer password\n";
+    write(117, NODES::text("new"));
+    EXPECT_EQ(handedOver, Texts{"anna:new\n"});
+}
+
+TEST_F(PasswordWrite, TakesTheNameThatTheNodeHoldsNow)
+{
+    write(108, NODES::text("renamed"));
+    write(117, NODES::text("new"));
+    EXPECT_EQ(handedOver, Texts{"renamed:new\n"});
+}
+
+TEST_F(PasswordWrite, IsStoredAlsoWhenChpasswdCannotBeStarted)
+{
+    write(117, NODES::text("new"));
+    EXPECT_EQ(log.texts(6000),
+              Texts{"Cannot open process: chpasswd -e < usrandpwd ; rm -f usrandpwd"});
+    EXPECT_EQ(storedValue(anna(), 117), "text new true");
+    for (LogRecord const& record : log.records())
+        if (record.level == 6000) {
+            EXPECT_EQ(record.function, "setProperty");
+            EXPECT_EQ(record.file, "OsSwMI");
+            EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
+        }
+}
+
+TEST_F(PasswordWrite, StartsChpasswdAlsoWhenTheFileCannotBeCreated)
+{
+    std::filesystem::create_directory("usrandpwd");
+    commands.answers[setPasswords] = "";
+    write(117, NODES::text("new"));
+    EXPECT_EQ(commands.ran, Texts{setPasswords});
+    EXPECT_TRUE(std::filesystem::is_directory("usrandpwd"));
+    EXPECT_EQ(storedValue(anna(), 117), "text new true");
+}
+
+TEST_F(PasswordWrite, OfTheBuilderWritesNoFileAndRunsNothing)
+{
+    IC::OSSWMI::MI_call = true;
+    write(117, NODES::text("new"));
+    IC::OSSWMI::MI_call = false;
+    EXPECT_EQ(commands.ran, Texts{});
+    EXPECT_FALSE(std::filesystem::exists("usrandpwd"));
+    EXPECT_EQ(storedValue(anna(), 117), "text new true");
+}
+
+TEST_F(PasswordWrite, IsNeverLogged)
+{
+    commands.answers[setPasswords] = "";
+    write(117, NODES::text("$6$salt$hash"));
+    for (std::string const& text : log.texts())
+        EXPECT_EQ(text.find("$6$salt$hash"), std::string::npos) << text;
+}
+
+TEST_F(PasswordWrite, PassesItsTextsThroughWideText)
+{
+    WideTexts const texts;
+    write(117, NODES::text("new"));
+    EXPECT_EQ(sorted(texts.widened), (Texts{"anna", "new"}));
+    EXPECT_EQ(texts.narrowed, texts.widened);
+}
+
+TEST_F(UserWrite, OfAnInactiveTimeSetsTheDaysAfterThePasswordsExpiry)
+{
+    commands.answers = {{"chage -l anna", "Password expires : Jan 01, 2008\n"},
+                        {"chage -I 10 anna", ""}};
+    write(118, NODES::text("2008-01-11 00:00:00"));
+    EXPECT_EQ(commands.ran, (Texts{"chage -l anna", "chage -I 10 anna"}));
+    EXPECT_EQ(storedValue(anna(), 118), "text 2008-01-11 00:00:00 true");
+}
+
+TEST_F(UserWrite, OfAPasswordExpirationSetsTheDaysAfterTheLastChange)
+{
+    commands.answers = {{"chage -l anna", "Last password change : Jan 01, 2008\n"},
+                        {"chage -M 10 anna", ""}};
+    write(91, NODES::text("2008-01-11 00:00:00"));
+    EXPECT_EQ(commands.ran, (Texts{"chage -l anna", "chage -M 10 anna"}));
+    EXPECT_EQ(storedValue(anna(), 91), "text 2008-01-11 00:00:00 true");
+}
+
+TEST_F(UserWrite, OfADateTakesItsText)
+{
+    commands.answers = {{"chage -l anna", "Password expires : Jan 01, 2008\n"
+                                          "Last password change : Jan 02, 2008\n"}};
+    write(118, NODES::date(1200009600));
+    write(91, NODES::date(1200009600));
+    EXPECT_EQ(commands.ran,
+              (Texts{"chage -l anna", "chage -I 10 anna", "chage -l anna", "chage -M 9 anna"}));
+    EXPECT_EQ(storedValue(anna(), 118), "date 1200009600 true");
+    EXPECT_EQ(storedValue(anna(), 91), "date 1200009600 true");
+}
+
+TEST_F(UserWrite, OfADatePassesDateAndNameThroughWideText)
+{
+    for (unsigned int const id : {118U, 91U}) {
+        WideTexts const texts;
+        write(id, NODES::text("2008-01-11 00:00:00"));
+        EXPECT_EQ(sorted(texts.widened), (Texts{"2008-01-11 00:00:00", "anna"}));
+        EXPECT_EQ(texts.narrowed, texts.widened);
+    }
+}
+
+TEST_F(UserWrite, IsStoredWhateverBecomesOfTheCommand)
+{
+    write(118, NODES::text("tomorrow"));
+    write(91, NODES::text("tomorrow"));
+    EXPECT_EQ(storedValue(anna(), 118), "text tomorrow true");
+    EXPECT_EQ(storedValue(anna(), 91), "text tomorrow true");
+    write(138, NODES::number(1));
+    EXPECT_EQ(storedValue(anna(), 138), "number 1 true");
+    EXPECT_EQ(log.texts(6000).back(), "Cannot open process: command = userdel -r 1000");
+}
+
+TEST_F(UserWrite, OfOneToDeleteRunsUserdelWithTheUidText)
+{
+    commands.answers["userdel -r 1000"] = "";
+    write(138, NODES::number(1));
+    EXPECT_EQ(commands.ran, Texts{"userdel -r 1000"});
+    EXPECT_EQ(storedValue(anna(), 138), "number 1 true");
+}
+
+TEST_F(UserWrite, OfAnythingThatReadsAsOneToDeleteRunsUserdel)
+{
+    write(138, NODES::text("1"));
+    write(138, NODES::enumeration(1));
+    write(138, NODES::truth(true));
+    EXPECT_EQ(commands.ran, Texts(3, "userdel -r 1000"));
+}
+
+TEST_F(UserWrite, OfAnyOtherValueToDeleteDoesNothing)
+{
+    for (IC::PropertyValue const& value :
+         {NODES::number(0), NODES::number(2), NODES::truth(false), NODES::text("yes")})
+        write(138, value);
+    EXPECT_EQ(commands.ran, Texts{});
+    EXPECT_EQ(storedValue(anna(), 138), "text yes true");
+}
+
+TEST_F(UserWrite, OfADeletionPassesTheUidThroughWideText)
+{
+    WideTexts const texts;
+    write(138, NODES::number(1));
+    EXPECT_EQ(texts.widened, Texts{"1000"});
+    EXPECT_EQ(texts.narrowed, Texts{"1000"});
+}
+
+TEST_F(UserWrite, OfAnyOtherPropertyIsOnlyStored)
+{
+    for (unsigned int const id : {123, 125, 108, 109, 89,  90,  311, 312, 158, 159, 120,
+                                  163, 162, 161, 44,  119, 113, 160, 106, 51,  74,  4711})
+        write(id, NODES::text("1"));
+    EXPECT_EQ(commands.ran, Texts{});
+    EXPECT_FALSE(std::filesystem::exists("usrandpwd"));
+    EXPECT_EQ(storedValue(anna(), 312), "text 1 true");
+    EXPECT_EQ(storedValue(anna(), 4711), "text 1 true");
+}
+
+TEST_F(UserWrite, OfTheBuilderIsOnlyStored)
+{
+    IC::OSSWMI::MI_call = true;
+    write(118, NODES::text("2008-01-11 00:00:00"));
+    write(91, NODES::text("2008-01-11 00:00:00"));
+    write(138, NODES::number(1));
+    IC::OSSWMI::MI_call = false;
+    EXPECT_EQ(commands.ran, Texts{});
+    EXPECT_EQ(storedValue(anna(), 138), "number 1 true");
+}
+
+TEST_F(UserWrite, SpeaksOfItself)
+{
+    log.clear();
+    write(312, NODES::text("x"));
+    EXPECT_EQ(log.texts(3000),
+              (Texts{"UserNode::setProperty: entry", "UserNode::setProperty: exit"}));
+}
+
+TEST_F(UserWrite, LeavesTheOtherNodesAsTheyAre)
+{
+    commands.answers["userdel -r 1000"] = "";
+    write(138, NODES::number(1));
+    EXPECT_TRUE(frame.deleted.empty());
+    EXPECT_TRUE(frame.published.empty());
+}
+
+} // namespace

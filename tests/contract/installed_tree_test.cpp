@@ -1,0 +1,129 @@
+// What `cmake --install` puts in place, used by the page that tells how to write a host.
+
+#include "tests/support/Program.h"
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <gtest/gtest.h>
+#include <sstream>
+
+namespace
+{
+
+namespace fs = std::filesystem;
+
+std::string contentOf(fs::path const& path)
+{
+    std::ifstream const file(path);
+    std::ostringstream text;
+    text << file.rdbuf();
+    return text.str();
+}
+
+/** The block of writing-a-host.md in this language that holds this text. */
+std::string blockOf(std::string const& language, std::string const& text)
+{
+    std::string const page = contentOf(DOCS_DIR "/writing-a-host.md");
+    std::size_t const start = page.rfind("```" + language + '\n', page.find(text));
+    std::size_t const first = page.find('\n', start) + 1;
+    return page.substr(first, page.find("```", first) - first);
+}
+
+/** An installed tree that was moved after installing, and a working directory for a host. */
+class InstalledTree : public testing::Test
+{
+public:
+    InstalledTree()
+    {
+        std::string name = fs::temp_directory_path() / "installed.XXXXXX";
+        if (!mkdtemp(name.data()))
+            throw std::runtime_error("cannot make a directory");
+        top_ = name;
+        fs::create_directory(top_ / "work");
+        shell("cmake --install '" BUILD_DIR "' --prefix '" + (top_ / "first").string() + "'");
+        fs::rename(top_ / "first", prefix());
+        fs::copy(DOCS_DIR "/examples/minimal_host.cpp", top_ / "work");
+    }
+
+    ~InstalledTree() override
+    {
+        fs::remove_all(top_);
+    }
+
+protected:
+    fs::path prefix() const
+    {
+        return top_ / "tree";
+    }
+
+    fs::path libraries() const
+    {
+        return prefix() / LIBRARY_DIR;
+    }
+
+    fs::path work() const
+    {
+        return top_ / "work";
+    }
+
+    /** Runs lines as they stand in the page; the first that fails is told. */
+    std::string shell(std::string const& lines) const
+    {
+        Outcome const outcome =
+            runToEnd({"/bin/sh", "-ec", "cd '" + work().string() + "'\n" + lines});
+        EXPECT_EQ(outcome.code, 0) << lines << outcome.out << outcome.err;
+        return outcome.out;
+    }
+
+private:
+    fs::path top_;
+};
+
+constexpr char topOfTheTree[] = "1 OsSw Management Interface\n"
+                                "  2 ROOT Node\n"
+                                "    3 Computer\n"
+                                "      4 Operating System\n";
+
+TEST_F(InstalledTree, StandsInTheUsualDirectories)
+{
+    for (char const* file :
+         {"bin/mihost", "include/mihost/host/OpenMI.h", "include/mihost/mihost/runtime/Runtime.h"})
+        EXPECT_TRUE(fs::is_regular_file(prefix() / file)) << file;
+    for (char const* file :
+         {"libzorvvxicosswmi.so.1", "libmihost.so", "libmihost.so.0", "pkgconfig/mihost.pc"})
+        EXPECT_TRUE(fs::is_regular_file(libraries() / file)) << file;
+}
+
+TEST_F(InstalledTree, RunsMihostWithThePluginBesideIt)
+{
+    Outcome const outcome = runToEnd({prefix() / "bin/mihost", "get", "os", "os-name"});
+    EXPECT_EQ(outcome.code, 0) << outcome.err;
+    EXPECT_NE(outcome.out, "");
+}
+
+TEST_F(InstalledTree, GivesAHostHeadersAndRuntimeThroughPkgConfig)
+{
+    setenv("PKG_CONFIG_PATH", (libraries() / "pkgconfig").c_str(), 1);
+    setenv("LD_LIBRARY_PATH", libraries().c_str(), 1);
+    std::ofstream(work() / "g++") << "#!/bin/sh\nexec '" HOST_COMPILER_PROGRAM
+                                     "' " HOST_COMPILER_FLAGS " \"$@\"\n";
+    fs::permissions(work() / "g++", fs::perms::owner_all);
+    std::string const tree = shell("PATH=.:$PATH\n" + blockOf("sh", "pkg-config --cflags"));
+    EXPECT_EQ(tree.find(topOfTheTree), 0U) << tree;
+}
+
+TEST_F(InstalledTree, GivesAHostHeadersAndRuntimeThroughFindPackage)
+{
+    std::ofstream(work() / "CMakeLists.txt")
+        << "cmake_minimum_required(VERSION 3.25)\nproject(host LANGUAGES CXX)\n"
+        << blockOf("cmake", "find_package(mihost");
+    std::string const tree = shell("cmake -S . -B build -DCMAKE_PREFIX_PATH='" + prefix().string() +
+                                   "' -DCMAKE_CXX_COMPILER='" HOST_COMPILER_PROGRAM
+                                   "' -DCMAKE_CXX_FLAGS='" HOST_COMPILER_FLAGS "' >&2\n"
+                                   "cmake --build build >&2\n"
+                                   "build/minimal_host");
+    EXPECT_EQ(tree.find(topOfTheTree), 0U) << tree;
+}
+
+} // namespace

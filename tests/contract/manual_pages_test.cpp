@@ -1,0 +1,84 @@
+#include "tests/support/Program.h"
+
+#include <gtest/gtest.h>
+#include <regex>
+#include <set>
+#include <sstream>
+
+namespace
+{
+
+Outcome shell(std::string const& line)
+{
+    return runToEnd({"/bin/sh", "-c", line});
+}
+
+std::string rendered(std::string const& page)
+{
+    return shell("MANWIDTH=500 man -E ascii --local-file '" + page + "' | col -bx").out;
+}
+
+std::set<std::string> matches(std::string const& text, char const* pattern)
+{
+    std::regex const expression(pattern);
+    std::set<std::string> found;
+    for (auto at = std::sregex_iterator(text.begin(), text.end(), expression);
+         at != std::sregex_iterator(); ++at)
+        found.insert((*at)[1]);
+    return found;
+}
+
+class ManualPage : public testing::TestWithParam<char const*>
+{
+};
+
+TEST_P(ManualPage, IsRenderedWithoutWarnings)
+{
+    std::string const page = GetParam();
+    Outcome const man =
+        shell("man --warnings -E UTF-8 -Tutf8 -Z --local-file '" + page + "' >/dev/null");
+    EXPECT_EQ(man.code, 0);
+    EXPECT_EQ(man.err, "");
+}
+
+TEST_P(ManualPage, HoldsToTheMacros)
+{
+    std::istringstream notes(shell("mandoc -T lint '" + std::string(GetParam()) + "'").out);
+    for (std::string note; std::getline(notes, note);)
+        if (note.find("referenced manual not found") == std::string::npos)
+            ADD_FAILURE() << note;
+}
+
+INSTANTIATE_TEST_SUITE_P(Both, ManualPage, testing::Values(MIHOST_PAGE, PLUGIN_PAGE),
+                         [](auto const& which) { return which.index == 0 ? "Mihost" : "Plugin"; });
+
+TEST(ManualPageOfMihost, TellsOfEveryOption)
+{
+    char const* const option = "(--[a-z][a-z-]*)";
+    auto const told = matches(rendered(MIHOST_PAGE), option);
+    auto const options = matches(mihostRun({"--help-all"}).out, option);
+    EXPECT_FALSE(options.empty());
+    for (std::string const& name : options)
+        EXPECT_EQ(told.count(name), 1U) << name;
+}
+
+TEST(ManualPageOfMihost, TellsOfEveryCommand)
+{
+    std::string const help = mihostRun({"--help"}).out;
+    std::string const page = rendered(MIHOST_PAGE);
+    auto const commands = matches(help.substr(help.find("Subcommands:")), "\n  ([a-z-]+) ");
+    EXPECT_FALSE(commands.empty());
+    for (std::string const& command : commands)
+        EXPECT_TRUE(std::regex_search(page, std::regex("\n     " + command + "[ \n]"))) << command;
+}
+
+TEST(ManualPageOfThePlugin, HasTheListsOfTheCatalogue)
+{
+    std::string const page = rendered(PLUGIN_PAGE);
+    for (char const* line : {"   os (type 17)\n", "     149 physical-memory-free\n",
+                             "(number, in KiB, live) free RAM\n", "     LocalGroupAddUser\n",
+                             "             UserName CMPI_string\n"})
+        EXPECT_NE(page.find(line), std::string::npos) << line << page;
+}
+
+} // namespace

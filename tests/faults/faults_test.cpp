@@ -1,0 +1,306 @@
+// Every system call that can fail is made to fail once, one after the other, in each scenario. What
+// must hold each time: the plug-in lives, nothing stays open or locked, and the next start is
+// whole.
+
+#include "frame/OsSwMI.h"
+#include "host/OpenMI.h"
+#include "nodes/ids.h"
+#include "tests/faults/Faults.h"
+#include "tests/support/Libc.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <functional>
+#include <map>
+#include <new>
+#include <ostream>
+
+namespace
+{
+
+using faults::Call;
+
+/** A machine whose files and commands all answer, and whose locks are watched. */
+class FakeMachine
+{
+public:
+    FakeMachine()
+    {
+        libc::hooks().lckpwdf = [this] {
+            accountsLocked = true;
+            return 0;
+        };
+        libc::hooks().ulckpwdf = [this] {
+            accountsLocked = false;
+            return 0;
+        };
+        libc::hooks().popen = [this](char const* command, char const*) -> FILE* {
+            ++openPipes;
+            return streamOf(answer(command));
+        };
+        libc::hooks().pclose = [this](FILE* stream) {
+            --openPipes;
+            return std::fclose(stream);
+        };
+        faults::wrapHooks();
+    }
+
+    bool accountsLocked = false;
+    int openPipes = 0;
+
+private:
+    static std::string answer(std::string const& command)
+    {
+        static std::map<std::string, std::string> const answers = {
+            {"lsmod", "Module                  Size  Used by\nloop 1 0\nxfs 2 1\n"},
+            {"modinfo loop", "description:    Loopback device\nversion: 1.0\n"},
+            {"modinfo xfs", "license: GPL\n"},
+            {"wc -l /var/log/messages", "2 /var/log/messages\n"},
+            {"sed -n '1p' /var/log/messages", "Nov  1 10:00:00 host daemon: one\n"},
+            {"sed -n '2p' /var/log/messages", "Nov  1 10:00:01 host daemon: two\n"},
+            {"date", "Sat Nov 21 10:00:00 UTC 2026\n"},
+            {"stat /etc/UnitedLinux-release | grep Change",
+             "Change: 2010-05-12 10:23:45.000000000 +0200\n"},
+            {"chage -l anna", "Last password change : Jan 01, 2008\nPassword expires : never\n"},
+            {"/usr/bin/id \"anna\" 2>&1",
+             "uid=1000(anna) gid=1000(anna) groups=1000(anna),1001(ben)\n"},
+        };
+        auto const found = answers.find(command);
+        if (found != answers.end())
+            return found->second;
+        return command.find("useradd") != std::string::npos ? "rc=0\n" : "";
+    }
+
+    static FILE* streamOf(std::string const& text)
+    {
+        FILE* const stream = std::tmpfile();
+        std::fwrite(text.data(), 1, text.size(), stream);
+        std::rewind(stream);
+        return stream;
+    }
+
+    libc::HookGuard const guard_;
+    libc::FileRoot const root_{"machine"}; // in the test's own folder
+};
+
+IC::ManagementInterface& openInterface()
+{
+    IC::ManagementInterface* mi = nullptr;
+    IC::Error* error = nullptr;
+    OpenMI(&mi, &error);
+    return *mi;
+}
+
+/** The first node of a type; for users, the one called anna. */
+IC::Node* find(unsigned int type)
+{
+    std::vector<IC::Node*> nodes;
+    openInterface().getMap(nodes);
+    for (IC::Node* entry : nodes) {
+        auto const* node = dynamic_cast<IC::MutableNode*>(entry);
+        IC::PropertyValue name(IC::PropertyValue::EmptyKind, true);
+        node->IC::MutableNode::getProperty(NODES::name, name);
+        if (node->getNodeType() == type &&
+            (type != NODES::userType || static_cast<std::string>(name) == "anna"))
+            return entry;
+    }
+    return nullptr;
+}
+
+void start()
+{
+    openInterface().initialize(1, IC::Number(0U), IC::Number(0U));
+}
+
+bool variesByItself(unsigned int property)
+{
+    return property == NODES::lastBootTime ||
+           (property >= NODES::processCount && property <= NODES::swapFileFree);
+}
+
+/** What the tree says, to be compared with that of another start. */
+std::vector<std::string> treeTexts()
+{
+    std::vector<IC::Node*> nodes;
+    openInterface().getMap(nodes);
+    std::vector<std::string> texts;
+    for (IC::Node* node : nodes) {
+        std::string text = node->getDescription();
+        for (auto const& [id, value] : node->getProperties())
+            if (!variesByItself(id))
+                text += ' ' + std::to_string(id) + '=' + static_cast<std::string>(value);
+        texts.push_back(text);
+    }
+    return texts;
+}
+
+void set(unsigned int type, unsigned int id, IC::PropertyValue const& value)
+{
+    IC::Node* const node = find(type);
+    ASSERT_NE(node, nullptr) << "no node of type " << type;
+    node->setProperty(id, value);
+}
+
+void readLive(unsigned int type, std::initializer_list<unsigned int> ids)
+{
+    IC::Node* const node = find(type);
+    ASSERT_NE(node, nullptr) << "no node of type " << type;
+    for (unsigned int const id : ids) {
+        IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
+        node->getProperty(id, value);
+    }
+}
+
+IC::PropertyValue number(unsigned int value)
+{
+    return {IC::Number(value), true};
+}
+
+IC::PropertyValue text(char const* value)
+{
+    return {value, true};
+}
+
+struct Scenario {
+    char const* name;
+    bool startsByItself;
+    void (*run)();
+};
+
+void PrintTo(Scenario const& scenario, std::ostream* out)
+{
+    *out << scenario.name;
+}
+
+Scenario const scenarios[] = {
+    {"Start", true, start},
+    {"Refresh", false, [] { set(NODES::operatingSystemType, NODES::refresh, number(0)); }},
+    {"ClearLog", false, [] { set(NODES::operatingSystemType, NODES::clearLog, number(9)); }},
+    {"Restart", false, [] { set(NODES::operatingSystemType, NODES::requestedState, number(9)); }},
+    {"UserAdd", false,
+     [] {
+         set(NODES::operatingSystemType, NODES::createUser,
+             text("UserAdd,UserName:CMPI_string:carl,Comment:CMPI_string:Carl C,"
+                  "daysMustKeepPassword:CMPI_uint32:3,Password:CMPI_string:secret"));
+     }},
+    {"GroupMember", false,
+     [] {
+         set(NODES::operatingSystemType, NODES::createUser,
+             text("LocalGroupAddUser,LocalGroupName:CMPI_string:ben,"
+                  "DomainAndMember:CMPI_string:anna"));
+     }},
+    {"Password", false, [] { set(NODES::userType, NODES::password, text("$6$new$hash")); }},
+    {"Inactivity", false,
+     [] { set(NODES::userType, NODES::inactiveTime, text("2030-01-01 00:00:00")); }},
+    {"Expiration", false,
+     [] { set(NODES::userType, NODES::passwordExpiration, text("2030-01-01 00:00:00")); }},
+    {"Delete", false, [] { set(NODES::userType, NODES::deleteUser, number(1)); }},
+    {"LiveReads", false,
+     [] {
+         readLive(NODES::operatingSystemType,
+                  {NODES::processCount, NODES::physicalMemoryFree, NODES::swapFileSizeStored});
+         readLive(NODES::userType, {NODES::elementCount});
+         readLive(NODES::groupType, {NODES::elementCount});
+         readLive(NODES::logEntryType, {NODES::message, NODES::creationTime});
+     }},
+};
+
+long openDescriptors()
+{
+    auto const listing = std::filesystem::directory_iterator("/proc/self/fd");
+    return std::distance(begin(listing), end(listing));
+}
+
+class EachCallFails : public testing::TestWithParam<std::tuple<Scenario, Call>>
+{
+protected:
+    void SetUp() override
+    {
+        // "usrandpwd" is written where the process stands.
+        folder_ =
+            std::filesystem::path(testing::TempDir()) / ("faults-" + std::to_string(getpid()));
+        std::filesystem::create_directory(folder_);
+        std::filesystem::copy(MACHINES_DIR "/faults", folder_ / "machine",
+                              std::filesystem::copy_options::recursive);
+        std::filesystem::current_path(folder_);
+    }
+
+    void TearDown() override
+    {
+        std::filesystem::current_path("/");
+        std::filesystem::remove_all(folder_);
+    }
+
+    /** One run with the call numbered at failing. @return how many of the calls were made */
+    static unsigned long runWithFault(Scenario const& scenario, Call call, unsigned long at)
+    {
+        FakeMachine machine;
+        long const descriptors = openDescriptors();
+        if (!scenario.startsByItself)
+            start();
+        faults::arm(call, at);
+        try {
+            scenario.run();
+        } catch (std::bad_alloc const&) {
+            EXPECT_EQ(call, Call::Allocation);
+        }
+        unsigned long const made = faults::disarm();
+
+        EXPECT_FALSE(machine.accountsLocked);
+        EXPECT_EQ(machine.openPipes, 0);
+        EXPECT_EQ(openDescriptors(), descriptors);
+        EXPECT_EQ(IC::OSSWMI::myuserlock.lock(0), 0) << "left locked";
+        IC::OSSWMI::myuserlock.unlock();
+        EXPECT_FALSE(IC::OSSWMI::MI_call);
+        openInterface().unload();
+        return made;
+    }
+
+    static std::vector<std::string> treeOfAWholeStart()
+    {
+        FakeMachine const machine;
+        start();
+        std::vector<std::string> texts = treeTexts();
+        openInterface().unload();
+        return texts;
+    }
+
+private:
+    std::filesystem::path folder_;
+};
+
+TEST_P(EachCallFails, AndNothingIsLeftBehind)
+{
+    auto const& [scenario, call] = GetParam();
+    std::vector<std::string> const whole = treeOfAWholeStart();
+    unsigned long const calls = runWithFault(scenario, call, 0);
+    for (unsigned long at = 1; at <= calls && !HasFailure(); ++at) {
+        SCOPED_TRACE(faults::nameOf(call) + " number " + std::to_string(at) + " of " +
+                     std::to_string(calls));
+        runWithFault(scenario, call, at);
+        EXPECT_EQ(treeOfAWholeStart(), whole);
+    }
+}
+
+std::vector<Call> allCalls()
+{
+    std::vector<Call> calls;
+    for (int call = 0; call < static_cast<int>(Call::count); ++call)
+        calls.push_back(static_cast<Call>(call));
+    return calls;
+}
+
+std::string caseName(testing::TestParamInfo<std::tuple<Scenario, Call>> const& instance)
+{
+    auto const& [scenario, call] = instance.param;
+    return scenario.name + ("_" + faults::nameOf(call));
+}
+
+INSTANTIATE_TEST_SUITE_P(Faults, EachCallFails,
+                         testing::Combine(testing::ValuesIn(scenarios),
+                                          testing::ValuesIn(allCalls())),
+                         caseName);
+
+} // namespace

@@ -1,6 +1,5 @@
 #include "host/Alert.h"
 #include "host/EnumValue.h"
-#include "host/Error.h"
 #include "host/Number.h"
 
 namespace IC
@@ -51,40 +50,6 @@ EnumValue::~EnumValue() = default;
 unsigned int EnumValue::getValue() const
 {
     return value_;
-}
-
-Error::Error(unsigned char status, Number const& code, std::string const& text)
-    : status_(status), code_(code), text_(text)
-{
-}
-
-Error::Error(Error const& other) = default;
-
-Error& Error::operator=(Error const& other) = default;
-
-Error::~Error() = default;
-
-unsigned char Error::getStatus() const
-{
-    return status_;
-}
-
-Error::operator StatusType() const
-{
-    return static_cast<StatusType>(status_);
-}
-
-Error::operator std::string() const
-{
-    std::string form = "status " + std::to_string(static_cast<unsigned int>(status_));
-    if (!text_.empty())
-        form += ": " + text_;
-    return form;
-}
-
-std::string Error::getText() const
-{
-    return text_;
 }
 
 Alert::Alert(unsigned int nodeId, std::string const& text) : nodeId_(nodeId), text_(text) {}

@@ -1,7 +1,7 @@
 #ifndef TESTS_SUPPORT_NODECALLS_H
 #define TESTS_SUPPORT_NODECALLS_H
 
-#include "host/PropertyValue.h"
+#include "tests/support/Shown.h"
 
 #include <string>
 #include <vector>
@@ -21,8 +21,5 @@ public:
 
     std::vector<std::string> calls;
 };
-
-/** Kind, value and flag of a value, such as "text abc true" or "numbers 0,1,24 true". */
-std::string shown(IC::PropertyValue const& value);
 
 #endif

@@ -1,0 +1,191 @@
+// The three nodes at the top of the tree, and what is common to all nodes.
+
+#include "nodes/ids.h"
+#include "tests/contract/host/Loaded.h"
+
+#include <sys/utsname.h>
+#include <typeinfo>
+
+namespace
+{
+
+class FixedNodes : public Loaded
+{
+protected:
+    void SetUp() override
+    {
+        libc::hooks().uname = [](utsname* system) {
+            *system = {};
+            std::string("harbour").copy(system->nodename, sizeof system->nodename - 1);
+            return 0;
+        };
+    }
+
+    void TearDown() override
+    {
+        libc::hooks().uname = nullptr;
+    }
+
+    /** The events between a builder's entry and exit message. */
+    Lines eventsOf(std::string const& builder) const
+    {
+        auto const& all = host.events;
+        auto const begin = std::find(all.begin(), all.end(), "log: " + builder + ": entry");
+        auto const end = std::find(begin, all.end(), "log: " + builder + ": exit");
+        return begin == all.end() ? Lines{"not built"} : Lines(begin + 1, end);
+    }
+
+    /** The first ids in the node-id list. */
+    Ids firstIds(std::ptrdiff_t count)
+    {
+        Ids const& list = *Insides::nodeIds(mi());
+        return {list.begin(), list.begin() + count};
+    }
+};
+
+TEST_F(FixedNodes, TheInterfacesNodeIsMadeOfTheInterfacesOwnId)
+{
+    plugin.initialize(5);
+    EXPECT_EQ(eventsOf("createOsSwNodes"), (Lines{"MutableNode(5, 0, [5], 39, 0)", "setStatus(1)",
+                                                  "setDescription(OsSw Management Interface)"}));
+}
+
+TEST_F(FixedNodes, TheRootIsMadeOfTheFirstCountedId)
+{
+    plugin.initialize(5);
+    EXPECT_EQ(eventsOf("createRootNode"), (Lines{"MutableNode(6, 5, [5], 59, 0)", "setStatus(1)",
+                                                 "setDescription(ROOT Node)"}));
+}
+
+TEST_F(FixedNodes, TheComputerIsMadeBelowTheRootAndNamed)
+{
+    plugin.initialize(5);
+    EXPECT_EQ(eventsOf("createComputerNodes"),
+              (Lines{"MutableNode(7, 6, [5], 40, 0)", "setStatus(1)", "setDescription(Computer)",
+                     "log: getComputerName: entry", "log: getComputerName: exit",
+                     "setProperty(108, text harbour true)"}));
+}
+
+TEST_F(FixedNodes, TheComputerStaysWithoutANameWhereUnameFails)
+{
+    libc::hooks().uname = [](utsname*) { return -1; };
+    plugin.initialize(5);
+    EXPECT_EQ(eventsOf("createComputerNodes"),
+              (Lines{"MutableNode(7, 6, [5], 40, 0)", "setStatus(1)", "setDescription(Computer)",
+                     "log: getComputerName: entry", "log: getComputerName: exit"}));
+    IC::MutableNode const& computer = plugin.node(NODES::computerType);
+    EXPECT_EQ(computer.getStatus(), 1U);
+    EXPECT_EQ(computer.getDescription(), "Computer");
+    EXPECT_FALSE(property(computer, NODES::name));
+}
+
+TEST_F(FixedNodes, TheComputersNameIsReadOnceOnly)
+{
+    plugin.initialize();
+    libc::hooks().uname = [](utsname* system) {
+        std::string("renamed").copy(system->nodename, sizeof system->nodename - 1);
+        return 0;
+    };
+    EXPECT_EQ(text(plugin.node(NODES::computerType), NODES::name), "harbour");
+}
+
+TEST_F(FixedNodes, NeitherTheInterfacesNodeNorTheRootHasProperties)
+{
+    plugin.initialize();
+    EXPECT_TRUE(plugin.node(NODES::osSwType).getProperties().empty());
+    EXPECT_TRUE(plugin.node(NODES::rootType).getProperties().empty());
+}
+
+TEST_F(FixedNodes, ThreeArePlainNodesAndTheFourthIsOfAClassOfItsOwn)
+{
+    plugin.initialize();
+    for (unsigned int const type : {NODES::osSwType, NODES::rootType, NODES::computerType}) {
+        IC::MutableNode const& node = plugin.node(type);
+        EXPECT_EQ(typeid(node), typeid(IC::MutableNode));
+    }
+    IC::MutableNode const& os = plugin.node(NODES::operatingSystemType);
+    EXPECT_STREQ(typeid(os).name(), "N2IC6OsNodeE");
+}
+
+TEST_F(FixedNodes, TheIdListHoldsTheInterfacesOwnIdTwice)
+{
+    plugin.initialize(5);
+    EXPECT_EQ(firstIds(4), (Ids{5, 6, 5, 7}));
+}
+
+TEST_F(FixedNodes, TheIdListGoesOnWithTheOperatingSystemAndAllThatFollows)
+{
+    plugin.initialize(5);
+    Ids expected = {5, 6, 5, 7};
+    for (unsigned int id = 8; id < Insides::nextNodeId(mi()); ++id)
+        expected.push_back(id);
+    EXPECT_EQ(*Insides::nodeIds(mi()), expected);
+}
+
+TEST_F(FixedNodes, TheInterfacesNodeLeavesTheCounterAlone)
+{
+    unsigned int counter = 0;
+    host.onSetStatus = [this, &counter](IC::MutableNode& node) {
+        if (node.getNodeType() == NODES::osSwType)
+            counter = Insides::nextNodeId(mi());
+    };
+    plugin.initialize(5);
+    EXPECT_EQ(counter, 6U);
+}
+
+TEST_F(FixedNodes, StandInTheMembersOfTheirKindAndInTheListFromTheStart)
+{
+    plugin.initialize();
+    IC::OsSwMI& interface = mi();
+    auto const nodes = plugin.nodes();
+    ASSERT_GE(nodes.size(), 4U);
+    EXPECT_EQ(Insides::osSwNode(interface), nodes[0]);
+    EXPECT_EQ(Insides::rootNode(interface), nodes[1]);
+    EXPECT_EQ(Insides::computerNode(interface), nodes[2]);
+    EXPECT_EQ(Insides::osNode(interface), nodes[3]);
+}
+
+TEST_F(FixedNodes, AreCurrentAndListedBeforeTheirStatusIsSet)
+{
+    int count = 0;
+    host.onSetStatus = [this, &count](IC::MutableNode& node) {
+        if (node.getNodeType() == NODES::driverType || node.getIndex() != 0)
+            return;
+        ++count;
+        EXPECT_EQ(Insides::currentNode(mi()), &node);
+        EXPECT_EQ(Insides::nodes(mi()).back(), &node);
+    };
+    plugin.initialize();
+    EXPECT_EQ(count, 5); // the log, too
+}
+
+TEST_F(FixedNodes, AreParentsByTheIdThatTheyAnswerWith)
+{
+    plugin.initialize(5);
+    EXPECT_EQ(plugin.node(NODES::osSwType).getLinkedId(), 0U);
+    EXPECT_EQ(plugin.node(NODES::rootType).getLinkedId(), 5U);
+    EXPECT_EQ(plugin.node(NODES::computerType).getLinkedId(), 6U);
+    EXPECT_EQ(plugin.node(NODES::operatingSystemType).getLinkedId(), 7U);
+}
+
+TEST_F(FixedNodes, CarryTheInterfaceIdsOfTheMomentAtWhichTheyWereMade)
+{
+    host.miIds = {5, 9};
+    plugin.initialize(5);
+    Insides::miIds(mi()).push_back(10);
+    for (IC::MutableNode const* node : plugin.nodes())
+        EXPECT_EQ(node->getMIIds(), (Ids{5, 9})) << node->getDescription();
+}
+
+TEST_F(FixedNodes, ALaterInterfaceIdShowsInTheNodesMadeAfterIt)
+{
+    host.onSetStatus = [this](IC::MutableNode& node) {
+        if (node.getNodeType() == NODES::rootType)
+            Insides::miIds(mi()).push_back(9);
+    };
+    plugin.initialize(5);
+    EXPECT_EQ(plugin.node(NODES::rootType).getMIIds(), Ids{5});
+    EXPECT_EQ(plugin.node(NODES::computerType).getMIIds(), (Ids{5, 9}));
+}
+
+} // namespace

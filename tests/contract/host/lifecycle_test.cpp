@@ -1,0 +1,316 @@
+// From the loading of the library to its closing.
+
+#include "tests/contract/host/Loaded.h"
+
+#include "host/OpenMI.h"
+
+#include <dlfcn.h>
+#include <memory>
+
+namespace
+{
+
+Lines const builders = {"createOsSwNodes",  "createRootNode",    "createComputerNodes",
+                        "createOsNodes",    "createDriverNodes", "createUserNodes",
+                        "createGroupNodes", "createLogNodes",    "createLogEntryNodes"};
+
+/** Those of the messages that say that a builder, initialize, unload or publishNode began or ended.
+ */
+Lines frameMessages(Lines const& messages)
+{
+    Lines found;
+    for (std::string const& message : messages) {
+        std::string const name = message.substr(0, message.find(':'));
+        if (name == "initialize" || name == "unload" || name == "publishNode" ||
+            std::find(builders.begin(), builders.end(), name) != builders.end())
+            found.push_back(message);
+    }
+    return found;
+}
+
+TEST(Library, ConstructsItsObjectsInOrderAndDestroysThemInReverse)
+{
+    RecordingHost const& host = freshHost();
+    std::make_unique<Plugin>().reset();
+    EXPECT_EQ(host.events, (Lines{"ManagementInterface(), category Veltrix.IC.MI.OsSwMI",
+                                  "Error(0, unsigned 0, \"\")", "Mutex()", "~Mutex()", "~Error()",
+                                  "~ManagementInterface(), category Veltrix.IC.MI.OsSwMI"}));
+}
+
+TEST(Library, IsGoneOnceItIsClosed)
+{
+    std::make_unique<Plugin>().reset();
+    EXPECT_EQ(dlopen(PLUGIN_FILE, RTLD_NOW | RTLD_NOLOAD), nullptr);
+}
+
+class Lifecycle : public Loaded
+{
+protected:
+    IC::OsSwMI*& current() const
+    {
+        return object<IC::OsSwMI*>("_ZN2IC7pOsSwMIE");
+    }
+
+    Ids nodeTypes() const
+    {
+        Ids types;
+        for (IC::MutableNode const* node : plugin.nodes())
+            types.push_back(node->getNodeType());
+        return types;
+    }
+};
+
+TEST_F(Lifecycle, StartsWithEmptyListsNoInterfaceInUseAndTheFlagDown)
+{
+    EXPECT_TRUE(Insides::userNodes(mi()).empty());
+    EXPECT_TRUE(Insides::groupNodes(mi()).empty());
+    EXPECT_TRUE(Insides::logEntryNodes(mi()).empty());
+    EXPECT_EQ(current(), nullptr);
+    EXPECT_FALSE(object<bool>("_ZN2IC6OSSWMI7MI_callE"));
+}
+
+TEST_F(Lifecycle, OpenMIYieldsTheSameTwoAddressesEachTime)
+{
+    auto* const open = reinterpret_cast<decltype(&OpenMI)>(plugin.symbol("OpenMI"));
+    IC::ManagementInterface* interface = nullptr;
+    IC::Error* error = nullptr;
+    for (int time = 0; time < 2; ++time) {
+        EXPECT_EQ(open(&interface, &error), 0);
+        EXPECT_EQ(interface, &plugin.interface());
+        EXPECT_EQ(error, &plugin.status());
+    }
+    EXPECT_EQ(interface, plugin.symbol("_ZN2IC6OSSWMI8myosswmiE"));
+    EXPECT_EQ(error, plugin.symbol("_ZN2IC6OSSWMI5myerrE"));
+}
+
+TEST_F(Lifecycle, OpenMIAsksNothingOfTheHostAndSaysNothing)
+{
+    host.events.clear();
+    auto* const open = reinterpret_cast<decltype(&OpenMI)>(plugin.symbol("OpenMI"));
+    IC::ManagementInterface* interface = nullptr;
+    IC::Error* error = nullptr;
+    open(&interface, &error);
+    EXPECT_EQ(host.events, Lines());
+}
+
+TEST_F(Lifecycle, SetLoadCallBackStoresItsThreeArgumentsAndCallsNothing)
+{
+    IC::ManagementInterface::LoadCallBack const load = [](IC::Node* const&,
+                                                          void const*) -> IC::Error { throw 1; };
+    IC::ManagementInterface::LookupCallBack const lookUp = [](std::string const&,
+                                                              IC::Node**) -> IC::Error { throw 1; };
+    host.events.clear();
+    mi().setLoadCallBack(load, this, lookUp);
+    EXPECT_EQ(Insides::loadCallBack(mi()), load);
+    EXPECT_EQ(Insides::loadCallBackContext(mi()), this);
+    EXPECT_EQ(Insides::lookupCallBack(mi()), lookUp);
+    EXPECT_EQ(host.events, Lines());
+    plugin.initialize();
+}
+
+TEST_F(Lifecycle, InitializePassesItsThreeArgumentsOnUnchanged)
+{
+    host.events.clear();
+    mi().initialize(5, IC::Number(77U), IC::Number(true));
+    ASSERT_GE(host.events.size(), 2U);
+    EXPECT_EQ(host.events[0], "log: initialize: entry");
+    EXPECT_EQ(host.events[1], "initialize(5, unsigned 77, boolean 1)");
+    mi().unload();
+}
+
+TEST_F(Lifecycle, InitializeHasItsInterfaceAndListReadyWhenTheFrameworkInitialises)
+{
+    bool isReady = false;
+    host.onInitialize = [this, &isReady] {
+        isReady = current() == &mi() && Insides::nodeIds(mi()) && Insides::nodeIds(mi())->empty();
+    };
+    plugin.initialize();
+    EXPECT_TRUE(isReady);
+}
+
+TEST_F(Lifecycle, InitializeForgetsTheNodeBuiltLastBeforeItBuilds)
+{
+    IC::MutableNode last(1, 0, {1}, 39, 0);
+    Insides::currentNode(mi()) = &last;
+    std::vector<IC::MutableNode*> seen;
+    host.onInitialize = [this, &seen] { seen.push_back(Insides::currentNode(mi())); };
+    host.onNode = [this, &seen] { seen.push_back(Insides::currentNode(mi())); };
+    plugin.initialize();
+    ASSERT_GE(seen.size(), 2U);
+    EXPECT_EQ(seen[0], &last);
+    EXPECT_EQ(seen[1], nullptr);
+}
+
+TEST_F(Lifecycle, InitializeRunsTheNineBuildersInOrder)
+{
+    plugin.initialize();
+    Lines expected = {"initialize: entry"};
+    for (std::string const& builder : builders) {
+        expected.push_back(builder + ": entry");
+        expected.push_back(builder + ": exit");
+    }
+    expected.emplace_back("initialize: exit");
+    EXPECT_EQ(frameMessages(host.messages()), expected);
+}
+
+TEST_F(Lifecycle, InitializeAnswersWithTheFrameworksSuccess)
+{
+    IC::Error const error = plugin.initialize();
+    EXPECT_EQ(error.getStatus(), 0);
+    EXPECT_EQ(plugin.status().getStatus(), 0);
+}
+
+TEST_F(Lifecycle, AFailingFrameworkIsWhatTheHostHearsOfAndTheTreeStandsAllTheSame)
+{
+    plugin.initialize();
+    Ids const whole = nodeTypes();
+    plugin.unload();
+
+    host.initializeStatus = 3;
+    IC::Error const error = plugin.initialize();
+    EXPECT_EQ(static_cast<std::string>(error), "status 3, not ready");
+    EXPECT_EQ(static_cast<std::string>(plugin.status()), "status 3, not ready");
+    EXPECT_EQ(nodeTypes(), whole);
+    EXPECT_EQ(Ids(whole.begin(), whole.begin() + 4), (Ids{39, 59, 40, 17}));
+}
+
+TEST_F(Lifecycle, NodesOfTheStartAreNotPublishedOneByOne)
+{
+    plugin.initialize();
+    for (std::string const& event : host.events)
+        EXPECT_EQ(event.find("addNewNode"), std::string::npos) << event;
+}
+
+class Publishing : public Lifecycle
+{
+protected:
+    Publishing()
+    {
+        plugin.initialize();
+        host.events.clear();
+        host.logCalls.clear();
+    }
+
+    /** A member function of IC::OsSwMI, called as such. */
+    void publish(IC::Node* node)
+    {
+        auto* const publishNode = reinterpret_cast<void (*)(IC::OsSwMI*, IC::Node*)>(
+            plugin.symbol("_ZN2IC6OsSwMI11publishNodeEPNS_4NodeE"));
+        publishNode(&mi(), node);
+    }
+};
+
+TEST_F(Publishing, HandsTheNodeToTheFramework)
+{
+    publish(Insides::rootNode(mi()));
+    EXPECT_EQ(host.events, (Lines{"log: publishNode: entry", "addNewNode(ROOT Node)",
+                                  "log: publishNode: exit"}));
+}
+
+TEST_F(Publishing, LogsARefusalOnceAsAnErrorAndLeavesTheNodeWhereItIs)
+{
+    host.addNewNodeStatus = 1;
+    std::size_t const nodes = plugin.nodes().size();
+    publish(Insides::rootNode(mi()));
+    EXPECT_EQ(host.messages(), (Lines{"publishNode: entry", "addNewNode error = status 1, refused",
+                                      "publishNode: exit"}));
+    EXPECT_EQ(host.messages(6000), Lines{"addNewNode error = status 1, refused"});
+    EXPECT_EQ(host.calls(), Lines{"addNewNode(ROOT Node)"});
+    EXPECT_EQ(plugin.nodes().size(), nodes);
+}
+
+TEST_F(Publishing, TakesAnyStatusButZeroForARefusal)
+{
+    host.addNewNodeStatus = 255;
+    publish(Insides::rootNode(mi()));
+    EXPECT_EQ(host.messages(6000), Lines{"addNewNode error = status 255, refused"});
+}
+
+TEST_F(Lifecycle, UnloadLetsTheFrameworkGoFirstAndThenFreesTheIdList)
+{
+    plugin.initialize();
+    host.events.clear();
+    bool hadList = false;
+    host.onUnload = [this, &hadList] { hadList = Insides::nodeIds(mi()) != nullptr; };
+    plugin.unload();
+    EXPECT_EQ(host.events[0], "log: unload: entry");
+    EXPECT_EQ(host.events[1], "unload()");
+    EXPECT_EQ(host.events.back(), "log: unload: exit");
+    EXPECT_TRUE(hadList);
+    EXPECT_EQ(Insides::nodeIds(mi()), nullptr);
+}
+
+TEST_F(Lifecycle, UnloadDeletesNoNodeItself)
+{
+    plugin.initialize();
+    IC::MutableNode* const root = Insides::rootNode(mi());
+    auto kept = Insides::nodes(mi());
+    host.onUnload = [this] { Insides::nodes(mi()).clear(); }; // the framework keeps them
+    plugin.unload();
+    EXPECT_EQ(root->getDescription(), "ROOT Node");
+    for (IC::Node* node : kept)
+        delete node;
+}
+
+TEST_F(Lifecycle, UnloadWithoutInitializeOnlyCallsTheFrameworks)
+{
+    host.events.clear();
+    mi().unload();
+    EXPECT_EQ(host.events, (Lines{"log: unload: entry", "unload()", "log: unload: exit"}));
+}
+
+TEST_F(Lifecycle, CanBeginAgainAfterUnload)
+{
+    plugin.initialize(5);
+    plugin.unload();
+    plugin.initialize(5);
+    Ids const list = *Insides::nodeIds(mi());
+    EXPECT_EQ(Ids(list.begin(), list.begin() + 4), (Ids{5, 6, 5, 7}));
+}
+
+TEST_F(Lifecycle, EachMessageGoesToBothOfTheLoggersOperationsWithTheSameArguments)
+{
+    plugin.initialize();
+    plugin.unload();
+    auto const& calls = host.logCalls;
+    ASSERT_FALSE(calls.empty());
+    ASSERT_EQ(calls.size() % 2, 0U);
+    for (std::size_t at = 0; at < calls.size(); at += 2) {
+        LogCall const& log = calls[at];
+        LogCall const& trace = calls[at + 1];
+        EXPECT_EQ(log.operation, "log");
+        EXPECT_EQ(trace.operation, "trace");
+        EXPECT_EQ(log.function, trace.function);
+        EXPECT_EQ(log.file, trace.file);
+        EXPECT_EQ(log.line, trace.line);
+        EXPECT_GT(log.line, 0);
+        EXPECT_EQ(log.category, trace.category);
+        EXPECT_EQ(log.level, trace.level);
+        EXPECT_EQ(log.message, trace.message);
+        for (LogCall const& call : {log, trace}) {
+            EXPECT_TRUE(call.extraIsNull);
+            EXPECT_EQ(call.first, 0);
+            EXPECT_EQ(call.second, 0);
+        }
+    }
+}
+
+TEST_F(Lifecycle, TheFrameSpeaksUnderItsOwnCategoryAndFile)
+{
+    plugin.initialize();
+    plugin.unload();
+    std::size_t count = 0;
+    for (LogCall const& call : host.logCalls) {
+        if (frameMessages({call.message}).empty())
+            continue;
+        ++count;
+        EXPECT_EQ(call.function, call.message.substr(0, call.message.find(':')));
+        EXPECT_EQ(call.file, "OsSwMI");
+        EXPECT_EQ(call.category, "Veltrix.IC.MI.OsSwMI");
+        EXPECT_EQ(call.level, 3000);
+    }
+    // Entry and exit, each through both operations, of the builders, initialize and unload.
+    EXPECT_EQ(count, (builders.size() + 2) * 4);
+}
+
+} // namespace

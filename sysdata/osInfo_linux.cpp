@@ -24,6 +24,7 @@ namespace OSINFO
 {
 
 LOG::Unit const facts{loggerOsInfo, "OsSwMI"};
+LOG::Unit const methods{loggerOsInfo, "osInfo_linux"};
 
 } // namespace OSINFO
 

@@ -1,7 +1,10 @@
 #ifndef SYSDATA_OSINFO_LINUX_H
 #define SYSDATA_OSINFO_LINUX_H
 
+#include "sysdata/ParamInfo.h"
+
 #include <string>
+#include <vector>
 
 namespace NQ
 {
@@ -94,6 +97,64 @@ public:
 
     /** Restarts the machine. Always true. */
     bool statusReset();
+
+    /**
+     * Carries out one administration method, given as text: its name, then items of name, type and
+     * value joined by colons, all separated by commas.
+     *
+     * Values become part of shell command lines as they are, apart from escaped blanks: whoever
+     * may call this may run anything.
+     *
+     * @return true where the method succeeded
+     */
+    bool setCreateUser(std::string methodAndParams);
+
+    // From here on 0 and false are success.
+
+    /**
+     * Takes a method-call text apart.
+     *
+     * A text or number parameter without a value ends the parsing without an error, and so does an
+     * item that is no parameter at all; what stood before it counts.
+     *
+     * @param method  the first item; left as it was where there is none
+     * @param params  appended to, also when the text is rejected later on
+     * @return 1 for an unknown type or an unreadable date
+     */
+    int parseMethodAndParams(std::string methodAndParams, std::string& method,
+                             std::vector<ParamInfo>& params);
+
+    /**
+     * Maps a method to the system's account tools, runs them and judges what they print.
+     *
+     * A call that does not fit its command lines (39 arguments of 254 characters, 4999 characters
+     * in all) fails and runs nothing.
+     *
+     * @param shadowing  written by GetShadowing only: whether /etc/shadow can be read
+     */
+    int executeMethod(std::string method, std::vector<ParamInfo> params, bool& shadowing);
+
+    /**
+     * Runs one command line through the shell, standard error merged in. Silence is success.
+     *
+     * @param program    path, with fixed options where there are any
+     * @param arguments  the program's own entry, then the arguments up to the first empty one;
+     *                   they are joined by blanks and not quoted
+     * @param output     receives what was printed, NUL-terminated and cut to the 5000 bytes that it
+     *                   must have room for
+     * @return 1 where anything was printed or the command could not be run
+     */
+    int executeCommand(char* program, char** arguments, char* output);
+
+    /** Sets a password through passwd. Whether it was taken is not judged. */
+    void executePasswordEncryption(char* password, char* user);
+
+    /**
+     * Adds a member to a group ("LocalGroupAddUser") or, for any other method, removes it.
+     *
+     * @return true for failure
+     */
+    bool groupMemberChanges(std::string method, std::vector<ParamInfo> params);
 };
 
 } // namespace NQ

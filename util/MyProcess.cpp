@@ -1,6 +1,7 @@
 #include "util/MyProcess.h"
 
 #include "util/log.h"
+#include "util/text.h"
 
 #include <cstring>
 
@@ -58,17 +59,19 @@ char* strget(char* str, char c)
 void Tokenize(std::string const& text, std::vector<std::string>& tokens,
               std::string const& delimiters)
 {
-    LOG::Scope const scope(unit);
-    bool const secret = text.find("Password") != std::string::npos;
-    std::string::size_type start = text.find_first_not_of(delimiters);
-    while (start != std::string::npos) {
-        std::string::size_type const end = text.find_first_of(delimiters, start);
-        std::string const token = text.substr(start, end - start);
+    TEXT::tokenize(text, tokens, delimiters, text.find("Password") != std::string::npos);
+}
+
+void TEXT::tokenize(std::string const& text, std::vector<std::string>& tokens,
+                    std::string const& delimiters, bool secret)
+{
+    constexpr char const* function = "Tokenize";
+    LOG::Scope const scope(unit, {function}, function);
+    for (std::string const& token : split(text, delimiters)) {
         if (!secret)
             LOG::write(unit, LOG::progress,
-                       LOG::message("str.substr(lastPos, pos - lastPos) = ", token));
+                       LOG::message("str.substr(lastPos, pos - lastPos) = ", token), function);
         tokens.push_back(token);
-        start = text.find_first_not_of(delimiters, end);
     }
 }
 

@@ -1,6 +1,8 @@
 #ifndef UTIL_MYPROCESS_H
 #define UTIL_MYPROCESS_H
 
+#include "util/internal.h"
+
 #include <cstdio>
 #include <ctime>
 #include <string>
@@ -53,6 +55,15 @@ char* strget(char* str, char c);
  */
 void Tokenize(std::string const& text, std::vector<std::string>& tokens,
               std::string const& delimiters);
+
+namespace TEXT MI_INTERNAL
+{
+
+/** NQ::Tokenize for a text that the caller knows to be secret, or not: no token is looked at. */
+void tokenize(std::string const& text, std::vector<std::string>& tokens,
+              std::string const& delimiters, bool secret);
+
+} // namespace MI_INTERNAL
 
 /**
  * Calendar fields to seconds since 1970, read as local time; fields out of range are carried over.

@@ -28,4 +28,16 @@ bool print(char* buffer, std::size_t size, char const* format, ...)
     return length >= 0 && static_cast<std::size_t>(length) < size;
 }
 
+std::vector<std::string> split(std::string const& text, std::string const& delimiters)
+{
+    std::vector<std::string> tokens;
+    std::string::size_type start = text.find_first_not_of(delimiters);
+    while (start != std::string::npos) {
+        std::string::size_type const end = text.find_first_of(delimiters, start);
+        tokens.push_back(text.substr(start, end - start));
+        start = text.find_first_not_of(delimiters, end);
+    }
+    return tokens;
+}
+
 } // namespace NQ::TEXT

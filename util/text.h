@@ -4,6 +4,8 @@
 #include "util/internal.h"
 
 #include <cstddef>
+#include <string>
+#include <vector>
 
 /** Small text work that several units share. Not part of the plug-in's interface. */
 namespace NQ
@@ -27,6 +29,9 @@ void replaceAfterFirst(char* s, char from, char to);
  */
 bool print(char* buffer, std::size_t size, char const* format, ...)
     __attribute__((format(printf, 3, 4)));
+
+/** Every maximal run of characters of the text that holds no delimiter, in order. */
+std::vector<std::string> split(std::string const& text, std::string const& delimiters);
 
 } // namespace MI_INTERNAL
 

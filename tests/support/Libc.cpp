@@ -171,11 +171,11 @@ FakeCommands::FakeCommands()
         modes.emplace_back(mode);
         std::deque<std::string>& turns = first[command];
         auto const answer = answers.find(command);
-        if (turns.empty() && answer == answers.end())
+        if (turns.empty() && answer == answers.end() && !otherwise)
             return nullptr;
         ++open;
         if (turns.empty())
-            return streamOf(answer->second);
+            return streamOf(answer == answers.end() ? *otherwise : answer->second);
         std::string const output = turns.front();
         turns.pop_front();
         return streamOf(output);

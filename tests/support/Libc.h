@@ -6,6 +6,7 @@
 #include <deque>
 #include <functional>
 #include <map>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -89,7 +90,7 @@ public:
 /**
  * Answers commands with recorded output for as long as it lives, and notes every command asked for.
  *
- * A command without an answer cannot be started: popen yields null.
+ * A command that has no answer cannot be started: popen yields null.
  */
 class FakeCommands
 {
@@ -103,6 +104,9 @@ public:
 
     /** Answers for the first runs of a command, in turn; later ones get that of answers. */
     std::map<std::string, std::deque<std::string>> first;
+
+    /** What commands without an answer of their own print. */
+    std::optional<std::string> otherwise;
 
     std::vector<std::string> ran;
 

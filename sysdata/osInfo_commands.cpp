@@ -1,0 +1,235 @@
+#include "sysdata/osInfo_commands.h"
+
+#include "sysdata/osInfo_log.h"
+
+#include <algorithm>
+#include <iterator>
+
+namespace NQ::OSINFO
+{
+
+namespace
+{
+
+constexpr std::size_t argumentLimit = 39;
+constexpr std::size_t lengthLimit = 254;
+
+struct TypeName {
+    char const* name;
+    ParamType type;
+};
+
+constexpr TypeName typeNames[] = {
+    {"CMPI_string", ParamType::text},
+    {"CMPI_uint32", ParamType::number},
+    {"CMPI_dateTime", ParamType::date},
+};
+
+constexpr Method methodTable[] = {
+    {"UserAdd", MethodKind::userAdd, "/usr/sbin/useradd", true, false},
+    {"UserDel", MethodKind::userDel, "/usr/sbin/userdel", true, false},
+    {"UserSetAttrib", MethodKind::userSetAttrib, "/usr/bin/chage", true, false},
+    {"LocalGroupAdd", MethodKind::plain, "/usr/sbin/groupadd", false, false},
+    {"LocalGroupDel", MethodKind::plain, "/usr/sbin/groupdel", false, false},
+    {"GetShadowing", MethodKind::getShadowing, "", false, false},
+    {"LocalGroupAddUser", MethodKind::groupMembership, "", false, false},
+    {"LocalGroupDelUser", MethodKind::groupMembership, "", false, false},
+    {"UserSetFullName", MethodKind::userSetFullName, "/usr/sbin/usermod", true, true},
+    {"UserSetScriptPath", MethodKind::plain, "/usr/sbin/usermod", true, true},
+    {"UserSetHomeDir", MethodKind::plain, "/usr/sbin/usermod", true, true},
+    {"UserSetPassword", MethodKind::plain, "/usr/sbin/usermod", true, true},
+};
+
+enum class Item { plain, fullName, scriptPath, homeDir, password, userName, expiry };
+
+struct Option {
+    ParamType type;
+    char const* name;
+    Item item;
+    char const* flag; // null: the value stands alone
+};
+
+constexpr Option options[] = {
+    {ParamType::text, "FullName", Item::fullName, "-c"},
+    {ParamType::text, "Comment", Item::plain, "-c"},
+    {ParamType::text, "ScriptPath", Item::scriptPath, "-s"},
+    {ParamType::text, "HomeDir", Item::homeDir, "-d"},
+    {ParamType::text, "Password", Item::password, "-p"},
+    {ParamType::text, "UserName", Item::userName, nullptr},
+    {ParamType::text, "GroupName", Item::plain, nullptr},
+    {ParamType::number, "daysMustKeepPassword", Item::plain, "-m"},
+    {ParamType::number, "daysMustChangePasswordAfter", Item::plain, "-M"},
+    {ParamType::number, "daysWarnBeforePasswordExpire", Item::plain, "-W"},
+    {ParamType::number, "daysExpireAfter", Item::plain, "-I"},
+    {ParamType::date, "passwordExpirationDate", Item::expiry, "-E"},
+};
+
+Option const* findOption(ParamType type, std::string const& name)
+{
+    auto const found =
+        std::find_if(std::begin(options), std::end(options), [&](Option const& option) {
+            return option.type == type && name == option.name;
+        });
+    return found == std::end(options) ? nullptr : found;
+}
+
+std::string withEscapedBlanks(std::string const& value)
+{
+    std::string escaped;
+    for (char const c : value) {
+        if (c == ' ')
+            escaped += '\\';
+        escaped += c;
+    }
+    return escaped;
+}
+
+void addText(Method const& method, Option const& option, std::string const& value,
+             Commands& commands)
+{
+    if (option.item == Item::fullName && method.kind != MethodKind::userSetFullName)
+        return;
+    if (option.item == Item::password)
+        commands.password = value;
+    if (option.item == Item::userName) {
+        commands.user = value;
+        if (method.usermod)
+            return;
+    }
+    bool const path = option.item == Item::scriptPath || option.item == Item::homeDir;
+    if (path && value.empty())
+        return;
+    if (option.flag)
+        commands.main.emplace_back(option.flag);
+    commands.main.push_back(withEscapedBlanks(value));
+    if (option.item == Item::homeDir)
+        commands.main.emplace_back("-m");
+}
+
+/** @return false for a parameter of an unknown type, which the complaint then names */
+bool addParams(Method const& method, std::vector<ParamInfo> const& params, Commands& commands,
+               std::string& complaint)
+{
+    bool const adding = method.kind == MethodKind::userAdd;
+    Arguments& aged = adding ? commands.aging : commands.main;
+    for (ParamInfo const& param : params) {
+        ParamType const type = typeOf(param.type);
+        if (type == ParamType::unknown) {
+            complaint = unknownType(param.type);
+            return false;
+        }
+        Option const* option = findOption(type, param.name);
+        if (!option)
+            continue;
+        if (type == ParamType::text) {
+            addText(method, *option, param.value, commands);
+            continue;
+        }
+        aged.insert(aged.end(), {option->flag, param.value});
+        if (option->item == Item::expiry)
+            commands.expires = true;
+    }
+    return true;
+}
+
+void removeExpiry(Arguments& arguments)
+{
+    arguments.insert(arguments.end(), {"-E", "-1"});
+}
+
+/** @return false where the account must not be deleted */
+bool closeLists(Method const& method, Commands& commands)
+{
+    if (method.kind == MethodKind::userAdd && !commands.expires)
+        removeExpiry(commands.aging);
+    if (method.userTool) {
+        // Kept: the quotes differ, so this never holds and root can be deleted.
+        if (method.kind == MethodKind::userDel && "'" + commands.user + "'" == "\"root\"")
+            return false;
+        commands.aging.push_back(commands.user);
+        if (method.usermod)
+            commands.main.push_back(commands.user);
+    }
+    if (method.kind == MethodKind::userSetAttrib && !commands.expires)
+        removeExpiry(commands.main);
+    return true;
+}
+
+template <std::size_t count>
+bool beginsWithAny(std::string const& text, char const* const (&beginnings)[count])
+{
+    return std::any_of(std::begin(beginnings), std::end(beginnings), [&](std::string const& begin) {
+        return text.compare(0, begin.size(), begin) == 0;
+    });
+}
+
+constexpr char const* agingNotices[] = {"Aging information changed",
+                                        "Aging information not changed"};
+
+// userdel for an account without a crontab, and usermod for one that is as wanted already.
+constexpr char const* harmlessNotices[] = {"no crontab for", "usermod: no changes"};
+
+} // namespace
+
+ParamType typeOf(std::string const& name)
+{
+    for (TypeName const& known : typeNames)
+        if (name == known.name)
+            return known.type;
+    return ParamType::unknown;
+}
+
+Method const* findMethod(std::string const& name)
+{
+    for (Method const& method : methodTable)
+        if (name == method.name)
+            return &method;
+    return nullptr;
+}
+
+std::string commandLine(Arguments const& arguments)
+{
+    std::string line = arguments.front();
+    auto const end = std::find(arguments.begin() + 1, arguments.end(), "");
+    for (auto argument = arguments.begin() + 1; argument != end; ++argument)
+        line.append(" ").append(*argument);
+    if (line.find("useradd") != std::string::npos)
+        line += " 2>&1;echo rc=$?"; // kept, and so is the redirection that then follows
+    return line + " 2>&1";
+}
+
+bool fits(Arguments const& arguments)
+{
+    return arguments.size() <= argumentLimit + 1 &&
+           std::all_of(arguments.begin(), arguments.end(),
+                       [](std::string const& entry) { return entry.size() <= lengthLimit; }) &&
+           commandLine(arguments).size() < bufferSize;
+}
+
+bool makeCommands(Method const& method, std::string const& program,
+                  std::vector<ParamInfo> const& params, Commands& commands, std::string& complaint)
+{
+    commands.main = {program};
+    commands.aging = {"/usr/bin/chage"};
+    if (!addParams(method, params, commands, complaint) || !closeLists(method, commands))
+        return false;
+    for (Arguments const* list : {&commands.main, &commands.aging}) {
+        if (fits(*list))
+            continue;
+        complaint = misfit(list->front());
+        return false;
+    }
+    return true;
+}
+
+bool isAgingNotice(std::string const& output)
+{
+    return beginsWithAny(output, agingNotices);
+}
+
+bool isBenign(std::string const& output)
+{
+    return isAgingNotice(output) || beginsWithAny(output, harmlessNotices);
+}
+
+} // namespace NQ::OSINFO

@@ -1,0 +1,94 @@
+#ifndef SYSDATA_OSINFO_COMMANDS_H
+#define SYSDATA_OSINFO_COMMANDS_H
+
+#include "sysdata/ParamInfo.h"
+#include "util/internal.h"
+
+#include <cstddef>
+#include <optional>
+#include <string>
+#include <vector>
+
+/** From an administration method and its parameters to command lines. Nothing here runs any. */
+namespace NQ
+{
+
+namespace OSINFO MI_INTERNAL
+{
+
+enum class ParamType { text, number, date, unknown };
+
+ParamType typeOf(std::string const& name);
+
+/** What a method needs beyond its program. */
+enum class MethodKind {
+    userAdd,
+    userDel,
+    userSetAttrib,
+    userSetFullName,
+    getShadowing,    // runs nothing
+    groupMembership, // done by groupMemberChanges
+    plain
+};
+
+struct Method {
+    char const* name;
+    MethodKind kind;
+    char const* program;
+    bool userTool; // takes an account name
+    bool usermod;  // takes it last
+};
+
+/** Null for an unknown method. */
+Method const* findMethod(std::string const& name);
+
+/** A program and its arguments; an empty one ends the list when it is run. */
+using Arguments = std::vector<std::string>;
+
+/** Bytes in a command line or in what it prints, the terminating NUL included. */
+constexpr std::size_t bufferSize = 5000;
+
+/** The shell line of a list, standard error merged in. */
+std::string commandLine(Arguments const& arguments);
+
+/** At most 39 arguments of 254 characters, and a line within the buffer. */
+bool fits(Arguments const& arguments);
+
+/** The commands of one call. */
+struct Commands {
+    Arguments main;
+    Arguments aging; // chage's list; run for UserAdd only, whose tool takes no ageing options
+    std::optional<std::string> password;
+    std::string user;
+    bool expires = false; // an expiry date was given
+};
+
+/**
+ * Builds the commands of one call.
+ *
+ * @param program    what to run; the method's own program, possibly with options
+ * @param complaint  on failure what to log, if anything
+ */
+bool makeCommands(Method const& method, std::string const& program,
+                  std::vector<ParamInfo> const& params, Commands& commands, std::string& complaint);
+
+/** Whether the output begins with a text by which an account tool reports no error. */
+bool isBenign(std::string const& output);
+
+/** Whether the output begins with one of chage's own notices. */
+bool isAgingNotice(std::string const& output);
+
+/**
+ * The supplementary groups that a member shall have, comma-separated.
+ *
+ * @param identity     what id printed about the member
+ * @param quotedGroup  the group to add or to leave out, in double quotes
+ */
+std::string supplementaryGroups(std::string const& identity, std::string const& quotedGroup,
+                                bool adding);
+
+} // namespace MI_INTERNAL
+
+} // namespace NQ
+
+#endif

@@ -1,0 +1,114 @@
+// Group membership: usermod takes the whole list of a user's groups, so id is asked for it first.
+
+#include "sysdata/osInfo_commands.h"
+#include "sysdata/osInfo_linux.h"
+#include "sysdata/osInfo_log.h"
+#include "sysdata/osInfo_run.h"
+
+#include <optional>
+
+namespace NQ
+{
+
+namespace
+{
+
+using OSINFO::ParamType;
+using OSINFO::Ran;
+
+std::string quoted(std::string const& text)
+{
+    return '"' + text + '"';
+}
+
+std::string textOf(std::vector<ParamInfo> const& params, char const* name)
+{
+    std::string value;
+    for (ParamInfo const& param : params)
+        if (OSINFO::typeOf(param.type) == ParamType::text && param.name == name)
+            value = param.value;
+    return value;
+}
+
+bool holds(std::string const& text, char const* part)
+{
+    return text.find(part) != std::string::npos;
+}
+
+/**
+ * The difference of the first bytes that differ, which is what the system's string comparison
+ * yields; in some environments that yields no more than its sign.
+ */
+int difference(char const* left, char const* right)
+{
+    while (*left != '\0' && *left == *right) {
+        ++left;
+        ++right;
+    }
+    return static_cast<unsigned char>(*left) - static_cast<unsigned char>(*right);
+}
+
+/** The name in the next parentheses; at moves behind it. */
+std::optional<std::string> nextName(std::string const& text, std::string::size_type& at)
+{
+    std::string::size_type const open = text.find('(', at);
+    std::string::size_type const close = text.find(')', open);
+    if (close == std::string::npos)
+        return std::nullopt;
+    at = close;
+    return text.substr(open + 1, close - open - 1);
+}
+
+/** Where the list of all groups begins; id translates the word before it. */
+std::string::size_type listStart(std::string const& identity, std::string::size_type gid)
+{
+    std::string::size_type const word = identity.find("groups", gid);
+    if (word != std::string::npos)
+        return word;
+    std::string::size_type const field = identity.find("gid=");
+    return field == std::string::npos ? field : identity.find('=', field + 4);
+}
+
+} // namespace
+
+std::string OSINFO::supplementaryGroups(std::string const& identity, std::string const& quotedGroup,
+                                        bool adding)
+{
+    std::string::size_type primaryAt = identity.find("gid");
+    std::string::size_type listAt = listStart(identity, primaryAt);
+    std::string list;
+    // A primary group that has no name has no parentheses either.
+    if (identity.find('(', primaryAt) < listAt) {
+        std::string const primary = nextName(identity, primaryAt).value_or("");
+        // Kept: the names differ in their quotes already, so hardly any is ever left out.
+        if (adding || difference(primary.c_str(), quotedGroup.c_str()) != 1)
+            list = primary + ",";
+    }
+    while (std::optional<std::string> const name = nextName(identity, listAt)) {
+        std::string const entry = quoted(*name);
+        if (adding || entry != quotedGroup)
+            list += entry + ",";
+    }
+    if (adding)
+        list += quotedGroup;
+    else if (!list.empty())
+        list.pop_back();
+    return list;
+}
+
+bool OsInfo::groupMemberChanges(std::string method, std::vector<ParamInfo> params)
+{
+    LOG::Scope const scope(OSINFO::methods);
+    std::string const group = quoted(textOf(params, "LocalGroupName"));
+    std::string const member = quoted(textOf(params, "DomainAndMember"));
+    std::string const identity = OSINFO::runLogged(*this, {"/usr/bin/id", member}).output;
+    if (holds(identity, "No such user") || !holds(identity, "gid"))
+        return true;
+    bool const adding = method == "LocalGroupAddUser";
+    OSINFO::Arguments const change{"/usr/sbin/usermod", "-G",
+                                   OSINFO::supplementaryGroups(identity, group, adding), member};
+    Ran const changed = OSINFO::runLogged(*this, change);
+    return changed.status != 0 && !holds(changed.output, "is primary group name");
+}
+
+} // namespace NQ

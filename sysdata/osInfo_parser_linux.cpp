@@ -1,0 +1,123 @@
+// Method-call texts: taken apart here, carried out by the executor.
+
+#include "sysdata/osInfo_commands.h"
+#include "sysdata/osInfo_linux.h"
+#include "sysdata/osInfo_log.h"
+#include "util/MyProcess.h"
+#include "util/text.h"
+
+#include <algorithm>
+#include <cstdio>
+
+namespace NQ
+{
+
+namespace
+{
+
+using OSINFO::methods;
+using OSINFO::ParamType;
+
+enum class Outcome { next, stop, reject };
+
+/** Whether a password stands in the item: it has that name, or the separators are wrong. */
+bool carriesPassword(std::string const& item)
+{
+    std::vector<std::string> const parts = TEXT::split(item, ":");
+    return (!parts.empty() && parts.front() == "Password") ||
+           std::any_of(parts.begin(), parts.end(),
+                       [](std::string const& part) { return OSINFO::loggable(part) != part; });
+}
+
+void note(char const* what, std::string const& text, char const* function)
+{
+    LOG::write(methods, LOG::progress, LOG::message(what, OSINFO::loggable(text)), function);
+}
+
+/** Year, month and day of a date-time text; its time of day, fraction and offset are dropped. */
+bool readDate(std::string const& text, std::string& date)
+{
+    int year = 0, month = 0, day = 0, time = 0, fraction = 0, offset = 0;
+    if (std::sscanf(text.c_str(), "%4d%2d%2d%6d.%6d+%3d", &year, &month, &day, &time, &fraction,
+                    &offset) != 6 &&
+        std::sscanf(text.c_str(), "%4d%2d%2d%6d.%6d-%3d", &year, &month, &day, &time, &fraction,
+                    &offset) != 6)
+        return false;
+    char buffer[64];
+    std::snprintf(buffer, sizeof buffer, "%d-%d-%d", year, month, day);
+    date = buffer;
+    return true;
+}
+
+Outcome stopAtBlank(char const* function)
+{
+    LOG::write(methods, LOG::progress, "This parameter is blank ---exiting ", function);
+    return Outcome::stop;
+}
+
+/**
+ * Takes one item and appends the parameter that it makes.
+ *
+ * @param secret  whether the call carries a password. A comma within that makes items of its
+ *                pieces, so then only what is plainly a parameter is logged.
+ */
+Outcome parseItem(std::string const& item, bool secret, std::vector<ParamInfo>& params,
+                  char const* function)
+{
+    std::vector<std::string> parts;
+    if (secret)
+        TEXT::tokenize(item, parts, ":", secret);
+    else
+        Tokenize(item, parts, ":");
+    if (parts.size() < 2)
+        return stopAtBlank(function);
+
+    ParamInfo param{parts[0], parts[1], ""};
+    ParamType const type = OSINFO::typeOf(param.type);
+    bool const shown = !secret || type != ParamType::unknown;
+    if (shown) {
+        note("paramInfo.name=", param.name, function);
+        note("paramInfo.type=", param.type, function);
+    }
+    if (type == ParamType::unknown) {
+        LOG::write(methods, LOG::error, OSINFO::unknownType(shown ? param.type : ""), function);
+        return Outcome::reject;
+    }
+
+    bool const hasValue = parts.size() > 2;
+    if (!hasValue && type != ParamType::date)
+        return stopAtBlank(function);
+    if (hasValue) {
+        if (type != ParamType::date)
+            param.value = parts[2];
+        else if (!readDate(parts[2], param.value))
+            return Outcome::reject;
+        if (param.name != "Password")
+            note("paramInfo.value=", param.value, function);
+    }
+    params.push_back(param);
+    return Outcome::next;
+}
+
+} // namespace
+
+int OsInfo::parseMethodAndParams(std::string methodAndParams, std::string& method,
+                                 std::vector<ParamInfo>& params)
+{
+    LOG::Scope const scope(methods, {"OsNode::parseMethodAndParams"});
+    std::vector<std::string> items;
+    Tokenize(methodAndParams, items, ",");
+    if (items.empty())
+        return 0;
+    method = items.front();
+    note("method=", method, __func__);
+    bool const secret = std::any_of(items.begin(), items.end(), carriesPassword);
+    for (auto item = items.begin() + 1; item != items.end(); ++item) {
+        Outcome const outcome = parseItem(*item, secret, params, __func__);
+        if (outcome != Outcome::next)
+            return outcome == Outcome::reject ? 1 : 0;
+    }
+    return 0;
+}
+
+} // namespace NQ

@@ -1,0 +1,80 @@
+#include "sysdata/osInfo_run.h"
+
+#include "sysdata/osInfo_log.h"
+
+#include <cstdio>
+
+namespace NQ
+{
+
+namespace
+{
+
+using OSINFO::bufferSize;
+using OSINFO::methods;
+
+/** Reads to the end, keeps what the buffer holds and says whether there was anything. */
+bool readOutput(FILE* stream, char* output)
+{
+    std::size_t kept = 0;
+    bool any = false;
+    for (int c = std::getc(stream); c != EOF; c = std::getc(stream)) {
+        any = true;
+        if (kept < bufferSize - 1)
+            output[kept++] = static_cast<char>(c);
+    }
+    output[kept] = '\0';
+    return any;
+}
+
+} // namespace
+
+OSINFO::Ran OSINFO::run(OsInfo& info, Arguments arguments, char const* function)
+{
+    if (!fits(arguments)) {
+        LOG::write(methods, LOG::error, misfit(arguments.front()), function);
+        return {1, ""};
+    }
+    std::vector<char*> entries;
+    for (std::string& argument : arguments)
+        entries.push_back(argument.data());
+    char end[] = "";
+    entries.push_back(end);
+    char output[bufferSize];
+    int const status = info.executeCommand(entries.front(), entries.data(), output);
+    return {status, output};
+}
+
+OSINFO::Ran OSINFO::runLogged(OsInfo& info, Arguments const& arguments, bool secret,
+                              char const* function)
+{
+    Ran ran = run(info, arguments, function);
+    LOG::write(methods, LOG::progress,
+               LOG::message("outputBuffer: ", loggableOutput(ran.output, secret)), function);
+    return ran;
+}
+
+int OsInfo::executeCommand(char* program, char** arguments, char* output)
+{
+    LOG::Scope const scope(methods);
+    output[0] = '\0';
+    OSINFO::Arguments list{program};
+    for (char** argument = arguments + 1; **argument != '\0'; ++argument)
+        list.emplace_back(*argument);
+    std::string const line = OSINFO::commandLine(list);
+    if (line.size() >= bufferSize) {
+        LOG::write(methods, LOG::error, OSINFO::misfit(program));
+        return 1;
+    }
+    FILE* pipe = popen(line.c_str(), "r");
+    if (!pipe) {
+        // The line itself may hold a password.
+        LOG::write(methods, LOG::error, LOG::message("Cannot open process: ", program));
+        return 1;
+    }
+    bool const any = readOutput(pipe, output);
+    pclose(pipe);
+    return any ? 1 : 0;
+}
+
+} // namespace NQ

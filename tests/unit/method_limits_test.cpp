@@ -1,0 +1,181 @@
+// A call that does not fit its command lines runs nothing at all; nothing is ever cut.
+
+#include "tests/unit/Methods.h"
+
+namespace
+{
+
+using Params = std::vector<NQ::ParamInfo>;
+
+class MethodLimits : public MethodTest
+{
+protected:
+    /** That the call runs nothing and leaves one line at level 6000. */
+    void expectRefused(std::string const& method, Params const& params, std::string const& program)
+    {
+        commands_.ran.clear();
+        Recording const log;
+        EXPECT_EQ(execute(method, params), 1);
+        EXPECT_EQ(commands_.ran, Lines());
+        EXPECT_EQ(log.texts(6000), Lines{"Command does not fit: " + program});
+    }
+
+    void expectRun(std::string const& method, Params const& params, std::string const& line)
+    {
+        commands_.ran.clear();
+        Recording const log;
+        EXPECT_EQ(execute(method, params), 0);
+        ASSERT_FALSE(commands_.ran.empty());
+        EXPECT_EQ(commands_.ran.front(), line);
+        EXPECT_EQ(log.texts(6000), Lines());
+    }
+
+    static std::string repeated(std::string const& text, int count)
+    {
+        std::string all;
+        for (; count > 0; --count)
+            all += text;
+        return all;
+    }
+};
+
+TEST_F(MethodLimits, Are39Arguments)
+{
+    expectRun("LocalGroupAdd", Params(39, text("GroupName", "g")),
+              "/usr/sbin/groupadd" + repeated(" g", 39) + " 2>&1");
+    expectRefused("LocalGroupAdd", Params(40, text("GroupName", "g")), "/usr/sbin/groupadd");
+}
+
+TEST_F(MethodLimits, CountTheAccountNameThatUsermodTakesLast)
+{
+    Params params(38, text("GroupName", "g"));
+    params.push_back(text("UserName", "jdoe"));
+    expectRun("UserSetHomeDir", params, "/usr/sbin/usermod" + repeated(" g", 38) + " jdoe 2>&1");
+    params.push_back(text("GroupName", "g"));
+    expectRefused("UserSetHomeDir", params, "/usr/sbin/usermod");
+}
+
+TEST_F(MethodLimits, CountWhatClosesTheList)
+{
+    Params params(36, text("GroupName", "g"));
+    params.push_back(text("UserName", "jdoe"));
+    expectRun("UserSetAttrib", params, "/usr/bin/chage" + repeated(" g", 36) + " jdoe -E -1 2>&1");
+    params.push_back(text("GroupName", "g"));
+    expectRefused("UserSetAttrib", params, "/usr/bin/chage");
+}
+
+TEST_F(MethodLimits, HoldForTheAgingListBeforeAnythingRuns)
+{
+    Params params(18, {"daysExpireAfter", "CMPI_uint32", "1"});
+    params.push_back(text("UserName", "jdoe"));
+    expectRun("UserAdd", params, "/usr/sbin/useradd jdoe 2>&1;echo rc=$? 2>&1");
+    EXPECT_EQ(commands_.ran.at(1), "/usr/bin/chage" + repeated(" -I 1", 18) + " -E -1 jdoe 2>&1");
+    params.push_back({"daysExpireAfter", "CMPI_uint32", "1"});
+    expectRefused("UserAdd", params, "/usr/bin/chage");
+}
+
+TEST_F(MethodLimits, Are254CharactersInAnArgument)
+{
+    std::string const longest(254, 'x');
+    expectRun("UserDel", {text("UserName", longest)}, "/usr/sbin/userdel " + longest + " 2>&1");
+    expectRefused("UserDel", {text("UserName", longest + "x")}, "/usr/sbin/userdel");
+    expectRefused("UserAdd", {text("UserName", "jdoe"), text("Comment", longest + "x")},
+                  "/usr/sbin/useradd");
+    expectRefused("UserAdd",
+                  {text("UserName", "jdoe"), {"daysExpireAfter", "CMPI_uint32", longest + "1"}},
+                  "/usr/bin/chage");
+    expectRefused("UserSetPassword", {text("UserName", "jdoe"), text("Password", longest + "x")},
+                  "/usr/sbin/usermod");
+}
+
+TEST_F(MethodLimits, CountTheBackslashesOfEscapedBlanks)
+{
+    std::string const blanks(127, ' ');
+    expectRun("UserSetFullName", {text("FullName", blanks), text("UserName", "jdoe")},
+              "/usr/sbin/usermod -c " + repeated("\\ ", 127) + " jdoe 2>&1");
+    expectRefused("UserSetFullName", {text("FullName", blanks + "x"), text("UserName", "jdoe")},
+                  "/usr/sbin/usermod");
+}
+
+TEST_F(MethodLimits, DoNotCountWhatIsIgnored)
+{
+    expectRun("UserDel",
+              {text("UserName", "jdoe"), text("Colour", std::string(6000, 'x')),
+               text("FullName", std::string(6000, 'x'))},
+              "/usr/sbin/userdel jdoe 2>&1");
+}
+
+TEST_F(MethodLimits, Are4999CharactersInALine)
+{
+    // The program has 18 characters, each argument brings a blank, and " 2>&1" ends the line.
+    std::string const longest(254, 'x');
+    std::string const last(4999 - 18 - 19 * 255 - 1 - 5, 'x');
+    Params params(19, text("GroupName", longest));
+    params.push_back(text("GroupName", last));
+    std::string const line =
+        "/usr/sbin/groupadd" + repeated(" " + longest, 19) + " " + last + " 2>&1";
+    ASSERT_EQ(line.size(), 4999U);
+    expectRun("LocalGroupAdd", params, line);
+    params.back().value += "x";
+    expectRefused("LocalGroupAdd", params, "/usr/sbin/groupadd");
+}
+
+TEST_F(MethodLimits, HoldForTheAgingLineBeforeAnythingRuns)
+{
+    Params params(19, {"daysExpireAfter", "CMPI_uint32", std::string(254, '1')});
+    params.push_back(text("UserName", "jdoe"));
+    params.push_back({"passwordExpirationDate", "CMPI_dateTime", ""}); // ends the list, so it fits
+    expectRun("UserAdd", Params(params.begin(), params.begin() + 1),
+              "/usr/sbin/useradd"
+              " 2>&1;echo rc=$? 2>&1");
+    expectRefused("UserAdd", params, "/usr/bin/chage");
+}
+
+TEST_F(MethodLimits, LeaveTheHostWithAFailure)
+{
+    EXPECT_FALSE(call("UserDel,UserName:CMPI_string:" + std::string(255, 'x')));
+    EXPECT_EQ(commands_.ran, Lines());
+}
+
+class MemberLimits : public MethodLimits
+{
+protected:
+    /** The call for a member that is in the primary group and, apart from it, in this group. */
+    void prepare(std::string const& other)
+    {
+        params_ = {text("LocalGroupName", "g"), text("DomainAndMember", "jdoe")};
+        commands_.answers[idLine_] = "uid=1000(jdoe) gid=100(users) groups=27(" + other + ")\n";
+        commands_.ran.clear();
+    }
+
+    std::string const idLine_ = "/usr/bin/id \"jdoe\" 2>&1";
+    Params params_;
+};
+
+TEST_F(MemberLimits, LetTheGroupListHave254Characters)
+{
+    // users,"...","g"
+    std::string const longest(254 - 6 - 3 - 3, 'x');
+    prepare(longest);
+    EXPECT_EQ(execute("LocalGroupAddUser", params_), 0);
+    EXPECT_EQ(commands_.ran, (Lines{idLine_, "/usr/sbin/usermod -G users,\"" + longest +
+                                                 "\",\"g\" \"jdoe\" 2>&1"}));
+
+    prepare(longest + "x");
+    Recording const log;
+    EXPECT_EQ(execute("LocalGroupAddUser", params_), 1);
+    EXPECT_EQ(commands_.ran, Lines{idLine_});
+    EXPECT_EQ(log.texts(6000), Lines{"Command does not fit: /usr/sbin/usermod"});
+}
+
+TEST_F(MemberLimits, LetTheQuotedMemberHave254Characters)
+{
+    std::string const longest(252, 'x');
+    execute("LocalGroupAddUser", {text("LocalGroupName", "g"), text("DomainAndMember", longest)});
+    EXPECT_EQ(commands_.ran, Lines{"/usr/bin/id \"" + longest + "\" 2>&1"});
+    expectRefused("LocalGroupAddUser",
+                  {text("LocalGroupName", "g"), text("DomainAndMember", longest + "x")},
+                  "/usr/bin/id");
+}
+
+} // namespace

@@ -1,0 +1,295 @@
+#include "sysdata/osInfo_linux.h"
+
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <ostream>
+#include <string>
+#include <type_traits>
+#include <vector>
+
+namespace
+{
+
+using NQ::ParamInfo;
+using Texts = std::vector<std::string>;
+
+/** The outcome of one parse; method and parameters as they were before where nothing was set. */
+struct Parsed {
+    explicit Parsed(std::string const& text)
+    {
+        std::vector<ParamInfo> list;
+        status = NQ::OsInfo().parseMethodAndParams(text, method, list);
+        for (ParamInfo const& param : list)
+            params.push_back(param.name + "|" + param.type + "|" + param.value);
+    }
+
+    int status;
+    std::string method = "(as it was)";
+    Texts params;
+};
+
+/** What the parser itself says about a text, entry and exit lines included. */
+Texts said(std::string const& text)
+{
+    Recording const log;
+    Parsed const parsed(text);
+    Texts found;
+    for (LogRecord const& record : log.records())
+        if (!record.trace && record.function == "parseMethodAndParams")
+            found.push_back(record.text);
+    return found;
+}
+
+Texts inside(Texts texts)
+{
+    texts.insert(texts.begin(), "OsNode::parseMethodAndParams: entry");
+    texts.emplace_back("OsNode::parseMethodAndParams: exit");
+    return texts;
+}
+
+std::string dateOf(std::string const& value)
+{
+    Parsed const parsed("UserSetAttrib,passwordExpirationDate:CMPI_dateTime:" + value);
+    EXPECT_EQ(parsed.status, 0);
+    return parsed.params.empty() ? "(none)" : parsed.params.front();
+}
+
+TEST(ParamInfo, IsAValueOfThreeTexts)
+{
+    ParamInfo const first{"UserName", "CMPI_string", "jdoe"};
+    ParamInfo second = first;
+    second.value = "other";
+    EXPECT_EQ(first.name + first.type + first.value, "UserNameCMPI_stringjdoe");
+    EXPECT_EQ(second.value, "other");
+    EXPECT_TRUE(std::is_copy_constructible_v<ParamInfo>);
+}
+
+TEST(MethodParser, SplitsATextIntoTheMethodAndItsParameters)
+{
+    Parsed const parsed("UserAdd,UserName:CMPI_string:jdoe,Comment:CMPI_string:Test");
+    EXPECT_EQ(parsed.status, 0);
+    EXPECT_EQ(parsed.method, "UserAdd");
+    EXPECT_EQ(parsed.params, (Texts{"UserName|CMPI_string|jdoe", "Comment|CMPI_string|Test"}));
+}
+
+TEST(MethodParser, ConvertsDatesOnTheWay)
+{
+    Parsed const parsed("UserSetAttrib,UserName:CMPI_string:jdoe,passwordExpirationDate:"
+                        "CMPI_dateTime:20101231000000.000000+000");
+    EXPECT_EQ(parsed.status, 0);
+    EXPECT_EQ(parsed.method, "UserSetAttrib");
+    EXPECT_EQ(parsed.params, (Texts{"UserName|CMPI_string|jdoe",
+                                    "passwordExpirationDate|CMPI_dateTime|2010-12-31"}));
+}
+
+TEST(MethodParser, LeavesTheMethodAsItWasWhereThereAreNoItems)
+{
+    for (char const* text : {"", ",", ",,,"}) {
+        Parsed const parsed(text);
+        EXPECT_EQ(parsed.status, 0);
+        EXPECT_EQ(parsed.method, "(as it was)");
+        EXPECT_EQ(parsed.params, Texts());
+        EXPECT_EQ(said(text), inside({}));
+    }
+}
+
+TEST(MethodParser, AcceptsAMethodWithoutParameters)
+{
+    Parsed const parsed("UserDel");
+    EXPECT_EQ(parsed.status, 0);
+    EXPECT_EQ(parsed.method, "UserDel");
+    EXPECT_EQ(parsed.params, Texts());
+    EXPECT_EQ(said("UserDel"), inside({"method=UserDel"}));
+}
+
+TEST(MethodParser, DropsEmptyItemsAndEmptyParts)
+{
+    Parsed const parsed("UserAdd,,UserName:CMPI_string:jdoe,");
+    EXPECT_EQ(parsed.status, 0);
+    EXPECT_EQ(parsed.method, "UserAdd");
+    EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"});
+    EXPECT_EQ(Parsed(",UserAdd,:UserName::CMPI_string:::jdoe:").params, parsed.params);
+}
+
+TEST(MethodParser, IgnoresPartsBeyondTheThird)
+{
+    Parsed const parsed("UserAdd,Comment:CMPI_string:12:30");
+    EXPECT_EQ(parsed.status, 0);
+    EXPECT_EQ(parsed.params, Texts{"Comment|CMPI_string|12"});
+}
+
+TEST(MethodParser, AppendsToTheList)
+{
+    std::string method;
+    std::vector<ParamInfo> params{{"before", "CMPI_string", "x"}};
+    NQ::OsInfo().parseMethodAndParams("UserDel,UserName:CMPI_string:jdoe", method, params);
+    ASSERT_EQ(params.size(), 2U);
+    EXPECT_EQ(params[0].name, "before");
+    EXPECT_EQ(params[1].name, "UserName");
+}
+
+TEST(MethodParser, DoesNotCheckThatANumberIsOne)
+{
+    Parsed const parsed("UserSetAttrib,daysExpireAfter:CMPI_uint32:soon");
+    EXPECT_EQ(parsed.status, 0);
+    EXPECT_EQ(parsed.params, Texts{"daysExpireAfter|CMPI_uint32|soon"});
+}
+
+TEST(MethodParser, StopsQuietlyAtABlankText)
+{
+    std::string const text = "UserAdd,UserName:CMPI_string:jdoe,Comment:CMPI_string:,"
+                             "HomeDir:CMPI_string:/home/jdoe";
+    Parsed const parsed(text);
+    EXPECT_EQ(parsed.status, 0);
+    EXPECT_EQ(parsed.method, "UserAdd");
+    EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"});
+    EXPECT_EQ(said(text),
+              inside({"method=UserAdd", "paramInfo.name=UserName", "paramInfo.type=CMPI_string",
+                      "paramInfo.value=jdoe", "paramInfo.name=Comment",
+                      "paramInfo.type=CMPI_string", "This parameter is blank ---exiting "}));
+}
+
+TEST(MethodParser, StopsQuietlyAtABlankNumber)
+{
+    Parsed const parsed("UserSetAttrib,daysExpireAfter:CMPI_uint32,UserName:CMPI_string:jdoe");
+    EXPECT_EQ(parsed.status, 0);
+    EXPECT_EQ(parsed.params, Texts());
+}
+
+TEST(MethodParser, TakesAnItemThatIsNoParameterForABlankOne)
+{
+    for (char const* item : {"Comment", "Comment:", "::", ":"}) {
+        std::string const text =
+            std::string("UserAdd,UserName:CMPI_string:jdoe,") + item + ",HomeDir:CMPI_string:/h";
+        Parsed const parsed(text);
+        EXPECT_EQ(parsed.status, 0) << item;
+        EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"}) << item;
+        EXPECT_EQ(said(text),
+                  inside({"method=UserAdd", "paramInfo.name=UserName", "paramInfo.type=CMPI_string",
+                          "paramInfo.value=jdoe", "This parameter is blank ---exiting "}))
+            << item;
+    }
+}
+
+TEST(MethodParser, GoesOnAfterABlankDate)
+{
+    std::string const text = "UserSetAttrib,passwordExpirationDate:CMPI_dateTime:,"
+                             "UserName:CMPI_string:jdoe";
+    Parsed const parsed(text);
+    EXPECT_EQ(parsed.status, 0);
+    EXPECT_EQ(parsed.params,
+              (Texts{"passwordExpirationDate|CMPI_dateTime|", "UserName|CMPI_string|jdoe"}));
+    EXPECT_EQ(said(text), inside({"method=UserSetAttrib", "paramInfo.name=passwordExpirationDate",
+                                  "paramInfo.type=CMPI_dateTime", "paramInfo.name=UserName",
+                                  "paramInfo.type=CMPI_string", "paramInfo.value=jdoe"}));
+}
+
+TEST(MethodParser, WritesDatesWithoutZeroPadding)
+{
+    EXPECT_EQ(dateOf("20100507123456.654321+120"), "passwordExpirationDate|CMPI_dateTime|2010-5-7");
+}
+
+TEST(MethodParser, ReadsOffsetsOfEitherSign)
+{
+    EXPECT_EQ(dateOf("20101231000000.000000-060"),
+              "passwordExpirationDate|CMPI_dateTime|2010-12-31");
+    EXPECT_EQ(dateOf("20101231000000.000000+060"),
+              "passwordExpirationDate|CMPI_dateTime|2010-12-31");
+}
+
+TEST(MethodParser, LogsTheConvertedDate)
+{
+    EXPECT_EQ(said("UserSetAttrib,passwordExpirationDate:CMPI_dateTime:20100507000000.000000+000"),
+              inside({"method=UserSetAttrib", "paramInfo.name=passwordExpirationDate",
+                      "paramInfo.type=CMPI_dateTime", "paramInfo.value=2010-5-7"}));
+}
+
+class UnreadableDate : public testing::TestWithParam<char const*>
+{
+};
+
+INSTANTIATE_TEST_SUITE_P(Of, UnreadableDate,
+                         testing::Values("soon", "2010-12-31", "20101231", "20101231000000",
+                                         "20101231000000.000000", "20101231000000.000000+",
+                                         "20101231000000.000000*000", "2010123.000000+000"));
+
+TEST_P(UnreadableDate, RejectsTheTextAndKeepsWhatStoodBefore)
+{
+    std::string const text = std::string("UserAdd,UserName:CMPI_string:jdoe,"
+                                         "passwordExpirationDate:CMPI_dateTime:") +
+                             GetParam() + ",Comment:CMPI_string:Test";
+    Parsed const parsed(text);
+    EXPECT_EQ(parsed.status, 1);
+    EXPECT_EQ(parsed.method, "UserAdd");
+    EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"});
+    EXPECT_EQ(said(text),
+              inside({"method=UserAdd", "paramInfo.name=UserName", "paramInfo.type=CMPI_string",
+                      "paramInfo.value=jdoe", "paramInfo.name=passwordExpirationDate",
+                      "paramInfo.type=CMPI_dateTime"}));
+}
+
+TEST(MethodParser, RejectsAnUnknownTypeAndKeepsWhatStoodBefore)
+{
+    std::string const text = "UserAdd,UserName:CMPI_string:jdoe,Active:CMPI_boolean:true,"
+                             "Comment:CMPI_string:Test";
+    Recording const log;
+    Parsed const parsed(text);
+    EXPECT_EQ(parsed.status, 1);
+    EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"});
+    EXPECT_EQ(log.texts(6000), Texts{"Unknown parameter type: CMPI_boolean"});
+    EXPECT_EQ(log.texts().back(), "OsNode::parseMethodAndParams: exit");
+}
+
+TEST(MethodParser, SpeaksOnItsOwnLogger)
+{
+    Recording const log;
+    Parsed const parsed("UserAdd,Active:CMPI_boolean:true");
+    int seen = 0;
+    for (LogRecord const& record : log.records()) {
+        if (record.function != "parseMethodAndParams")
+            continue;
+        ++seen;
+        EXPECT_EQ(record.file, "osInfo_linux");
+        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.OsInfo");
+    }
+    EXPECT_EQ(seen, 2 * 6); // entry, method, name, type, complaint, exit
+}
+
+TEST(MethodParser, TokenizesTheTextAndThenEachItem)
+{
+    Recording const log;
+    Parsed const parsed("UserDel,UserName:CMPI_string:jdoe");
+    EXPECT_EQ(
+        log.texts(),
+        inside({"Tokenize: entry", "str.substr(lastPos, pos - lastPos) = UserDel",
+                "str.substr(lastPos, pos - lastPos) = UserName:CMPI_string:jdoe", "Tokenize: exit",
+                "method=UserDel", "Tokenize: entry",
+                "str.substr(lastPos, pos - lastPos) = UserName",
+                "str.substr(lastPos, pos - lastPos) = CMPI_string",
+                "str.substr(lastPos, pos - lastPos) = jdoe", "Tokenize: exit",
+                "paramInfo.name=UserName", "paramInfo.type=CMPI_string", "paramInfo.value=jdoe"}));
+}
+
+TEST(MethodParser, LogsNoTokenOfACallThatCarriesAPasswordAndNotItsValue)
+{
+    Recording const log;
+    Parsed const parsed("UserSetPassword,UserName:CMPI_string:jdoe,Password:CMPI_string:Zq7Wx9");
+    EXPECT_EQ(parsed.params, (Texts{"UserName|CMPI_string|jdoe", "Password|CMPI_string|Zq7Wx9"}));
+    EXPECT_EQ(log.texts(),
+              inside({"Tokenize: entry", "Tokenize: exit", "method=UserSetPassword",
+                      "Tokenize: entry", "Tokenize: exit", "paramInfo.name=UserName",
+                      "paramInfo.type=CMPI_string", "paramInfo.value=jdoe", "Tokenize: entry",
+                      "Tokenize: exit", "paramInfo.name=Password", "paramInfo.type=CMPI_string"}));
+}
+
+TEST(MethodParser, KeepsOnlyTheParameterNamedExactlyPasswordFromTheLog)
+{
+    EXPECT_EQ(said("UserSetAttrib,daysMustKeepPassword:CMPI_uint32:3"),
+              inside({"method=UserSetAttrib", "paramInfo.name=daysMustKeepPassword",
+                      "paramInfo.type=CMPI_uint32", "paramInfo.value=3"}));
+}
+
+} // namespace

@@ -1,0 +1,104 @@
+#include "util/MyProcess.h"
+
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using Texts = std::vector<std::string>;
+
+Texts tokens(std::string const& text, std::string const& delimiters)
+{
+    Texts found;
+    NQ::Tokenize(text, found, delimiters);
+    return found;
+}
+
+TEST(Tokenize, AppendsEveryRunThatHoldsNoDelimiterInOrder)
+{
+    EXPECT_EQ(tokens("one,two,three", ","), (Texts{"one", "two", "three"}));
+}
+
+TEST(Tokenize, TakesEveryCharacterOfTheSetAsDelimiter)
+{
+    EXPECT_EQ(tokens("one:two,three:,four", ",:"), (Texts{"one", "two", "three", "four"}));
+}
+
+TEST(Tokenize, MakesNoEmptyTokensOfRunsAndEnds)
+{
+    EXPECT_EQ(tokens(",,one,,,two,", ","), (Texts{"one", "two"}));
+}
+
+TEST(Tokenize, FindsNothingInAnEmptyTextOrInDelimitersAlone)
+{
+    EXPECT_EQ(tokens("", ","), Texts());
+    EXPECT_EQ(tokens(",,,", ","), Texts());
+}
+
+TEST(Tokenize, YieldsTheWholeTextWhereNoDelimiterIsInIt)
+{
+    EXPECT_EQ(tokens("one two", ","), Texts{"one two"});
+    EXPECT_EQ(tokens("one,two", ""), Texts{"one,two"});
+}
+
+TEST(Tokenize, DoesNotClearTheList)
+{
+    Texts found{"before"};
+    NQ::Tokenize("one,two", found, ",");
+    EXPECT_EQ(found, (Texts{"before", "one", "two"}));
+}
+
+TEST(Tokenize, LogsEachTokenBetweenEntryAndExit)
+{
+    Recording const log;
+    tokens("one,two", ",");
+    EXPECT_EQ(log.texts(), (Texts{"Tokenize: entry", "str.substr(lastPos, pos - lastPos) = one",
+                                  "str.substr(lastPos, pos - lastPos) = two", "Tokenize: exit"}));
+}
+
+TEST(Tokenize, LogsThroughBothOperationsAtLevel3000OnTheCommandRunnersLogger)
+{
+    Recording const log;
+    tokens("one", ",");
+    std::vector<LogRecord> const records = log.records();
+    ASSERT_EQ(records.size(), 6U);
+    for (std::size_t at = 0; at < records.size(); ++at) {
+        EXPECT_EQ(records[at].trace, at % 2 == 1);
+        EXPECT_EQ(records[at].text, records[at - at % 2].text);
+        EXPECT_EQ(records[at].function, "Tokenize");
+        EXPECT_EQ(records[at].file, "MyProcess");
+        EXPECT_EQ(records[at].category, "Veltrix.IC.MI.OsSwMI.MyProcess");
+        EXPECT_EQ(records[at].level, 3000);
+    }
+}
+
+TEST(Tokenize, LogsNoTokenOfATextThatHoldsPasswordAnywhere)
+{
+    for (char const* text : {"one,Password", "Password,one", "one,aPasswordb,two"}) {
+        Recording const log;
+        tokens(text, ",");
+        EXPECT_EQ(log.texts(), (Texts{"Tokenize: entry", "Tokenize: exit"})) << text;
+    }
+}
+
+TEST(Tokenize, LooksForPasswordInTheWholeTextAndNotInItsTokens)
+{
+    Recording const log;
+    tokens("one,Pass,word", ",");
+    EXPECT_EQ(log.remarks().size(), 3U);
+    EXPECT_EQ(tokens("one,Password", ","), (Texts{"one", "Password"}));
+}
+
+TEST(Tokenize, LogsATextThatHoldsPasswordInLowerCaseOnly)
+{
+    Recording const log;
+    tokens("password", ",");
+    EXPECT_EQ(log.remarks(), Texts{"str.substr(lastPos, pos - lastPos) = password"});
+}
+
+} // namespace

@@ -117,12 +117,6 @@ Error OsNode::getProperty(unsigned int id, PropertyValue& value) const
     return MutableNode::getProperty(id, value);
 }
 
-Error OsNode::setProperty(unsigned int const& id, PropertyValue const& value)
-{
-    NQ::LOG::Scope const scope(OSSWMI::unit, {"OsNode::setProperty"});
-    return MutableNode::setProperty(id, value);
-}
-
 void OsSwMI::createOsNodes()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);

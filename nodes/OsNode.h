@@ -17,6 +17,11 @@ public:
     /** A live figure that cannot be had leaves value as it was and still succeeds. */
     Error getProperty(unsigned int id, PropertyValue& value) const override;
 
+    /**
+     * Stores the value, and acts on the system first where the property is a command: requested
+     * state, clear log, refresh and create user. Only a create-user text that fails yields status
+     * 1 and is not stored; an empty text is then stored in its place.
+     */
     Error setProperty(unsigned int const& id, PropertyValue const& value) override;
 };
 

@@ -1,6 +1,7 @@
 #include "tests/interposed/StandIns.h"
 
 #include "nodes/OsNode.h"
+#include "sysdata/logInfo_linux.h"
 #include "sysdata/minMaxId.h"
 #include "sysdata/osInfo_linux.h"
 
@@ -52,6 +53,26 @@ bool realGetUserCount(unsigned int& out)
 
 namespace NQ
 {
+
+OsInfo::OsInfo()
+{
+    standIns().lives.emplace_back("OsInfo made");
+}
+
+OsInfo::~OsInfo()
+{
+    standIns().lives.emplace_back("OsInfo gone");
+}
+
+logInfo::logInfo()
+{
+    standIns().lives.emplace_back("logInfo made");
+}
+
+logInfo::~logInfo()
+{
+    standIns().lives.emplace_back("logInfo gone");
+}
 
 bool OsInfo::getDistributed(bool& out)
 {

@@ -22,6 +22,9 @@ struct StandIns {
 
     /** What was called, in order: getters by name, stores as "set ID". */
     std::vector<std::string> calls;
+
+    /** The fact and log readers that came and went, in order, such as "OsInfo made". */
+    std::vector<std::string> lives;
 };
 
 /** Those in use; a test starts with none set. */

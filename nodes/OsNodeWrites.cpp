@@ -1,0 +1,83 @@
+// What the operating-system node does when a host writes to it.
+
+#include "frame/OsSwMI.h"
+#include "host/make_string.h"
+#include "nodes/OsNode.h"
+#include "nodes/ids.h"
+#include "nodes/values.h"
+#include "sysdata/logInfo_linux.h"
+#include "sysdata/osInfo_linux.h"
+
+namespace IC
+{
+
+namespace
+{
+
+// What a host writes to command properties.
+constexpr unsigned int reset = 9; // the machine or, as clear log, the log
+constexpr unsigned int takeOffline = 12;
+constexpr unsigned int rebuild = 0;
+
+bool asksFor(PropertyValue const& value, unsigned int command)
+{
+    return static_cast<unsigned int>(value) == command;
+}
+
+void rebuildAccounts()
+{
+    pOsSwMI->createUserNodes(true);
+    pOsSwMI->createGroupNodes(true);
+}
+
+/** Carries out the method that the value calls for, if any. @return false where it failed */
+bool administer(NQ::OsInfo& info, PropertyValue const& value, char const* function)
+{
+    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "PropertyType::CreateUser: entry", function);
+    std::string const call = NQ::make_string(NQ::make_wstring(static_cast<std::string>(value)));
+    if (call.empty() || call == "dummy")
+        return true;
+    if (call.find("Password") == std::string::npos)
+        NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress,
+                       NQ::LOG::message("CreateUser: inMethodAndParams = ", call), function);
+    if (!info.setCreateUser(call))
+        return false;
+    rebuildAccounts();
+    return true;
+}
+
+} // namespace
+
+Error OsNode::setProperty(unsigned int const& id, PropertyValue const& value)
+{
+    NQ::LOG::Scope const scope(OSSWMI::unit, {"OsNode::setProperty"});
+    NQ::OsInfo info;
+    NQ::logInfo log;
+    switch (id) {
+    case NODES::requestedState:
+        if (asksFor(value, reset))
+            info.statusReset();
+        else if (asksFor(value, takeOffline))
+            info.statusOffline();
+        break;
+    case NODES::clearLog:
+        if (asksFor(value, reset) && log.clearLog())
+            pOsSwMI->createLogEntryNodes(true);
+        break;
+    case NODES::refresh:
+        if (asksFor(value, rebuild))
+            rebuildAccounts();
+        break;
+    case NODES::createUser:
+        if (!administer(info, value, __func__)) {
+            MutableNode::setProperty(id, PropertyValue("", true));
+            return NODES::failure();
+        }
+        break;
+    default:
+        break;
+    }
+    return MutableNode::setProperty(id, value);
+}
+
+} // namespace IC

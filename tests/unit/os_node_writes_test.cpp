@@ -1,0 +1,297 @@
+// What a write to the operating-system node does, stores and returns.
+
+#include "nodes/OsNode.h"
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Frame.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using IC::EnumValue;
+using IC::Error;
+using IC::Number;
+using IC::PropertyValue;
+using Lines = std::vector<std::string>;
+
+std::string const useraddLine = "/usr/sbin/useradd jdoe 2>&1;echo rc=$? 2>&1";
+std::string const chageLine = "/usr/bin/chage -E -1 jdoe 2>&1";
+std::string const addition = "UserAdd,UserName:CMPI_string:jdoe";
+
+class OsNodeWrites : public testing::Test
+{
+protected:
+    OsNodeWrites()
+    {
+        commands_.answers[useraddLine] = "rc=0\n";
+        commands_.answers[chageLine] = "";
+        commands_.answers["wc -l /var/log/messages"] = "0 /var/log/messages\n";
+        commands_.answers["/sbin/shutdown -r now"] = "";
+        commands_.answers["/sbin/shutdown -h now"] = "";
+        files_.write("/var/log/messages", oldLog);
+    }
+
+    Error write(unsigned int id, PropertyValue const& value)
+    {
+        return node_.setProperty(id, value);
+    }
+
+    Error write(unsigned int id, unsigned int number)
+    {
+        return write(id, PropertyValue(Number(number), true));
+    }
+
+    Error writeText(std::string const& text)
+    {
+        return write(74, PropertyValue(text, true));
+    }
+
+    std::string stored(unsigned int id) const
+    {
+        return storedValue(node_, id);
+    }
+
+    /** The builders that ran, in order. */
+    static Lines rebuilt(Recording const& log)
+    {
+        Lines found;
+        for (std::string const& text : log.texts())
+            for (char const* builder :
+                 {"createUserNodes", "createGroupNodes", "createLogEntryNodes"})
+                if (text == std::string(builder) + ": entry")
+                    found.emplace_back(builder);
+        return found;
+    }
+
+    bool logWasCleared() const
+    {
+        return std::filesystem::file_size(files_.realPath("/var/log/messages")) == 0;
+    }
+
+    static constexpr char oldLog[] = "Nov 20 10:11:01 message\n";
+
+    FakeFiles files_;
+    libc::FakeCommands commands_;
+    Frame frame_;
+    IC::OsNode node_{9, 7, {7}, 17, 0};
+};
+
+TEST_F(OsNodeWrites, OfNineToTheRequestedStateRestartTheMachine)
+{
+    EXPECT_EQ(write(123, PropertyValue(EnumValue(9U), true)).getStatus(), 0);
+    EXPECT_EQ(commands_.ran, Lines{"/sbin/shutdown -r now"});
+    EXPECT_EQ(stored(123), "enumeration 9 true");
+}
+
+TEST_F(OsNodeWrites, OfTwelveToTheRequestedStateHaltTheMachine)
+{
+    EXPECT_EQ(write(123, 12).getStatus(), 0);
+    EXPECT_EQ(commands_.ran, Lines{"/sbin/shutdown -h now"});
+    EXPECT_EQ(stored(123), "number 12 true");
+}
+
+TEST_F(OsNodeWrites, OfOtherStatesDoNothingElse)
+{
+    Recording const log;
+    for (unsigned int const state : {0U, 1U, 5U, 8U, 10U, 11U, 13U}) {
+        EXPECT_EQ(write(123, state).getStatus(), 0);
+        EXPECT_EQ(stored(123), "number " + std::to_string(state) + " true");
+    }
+    EXPECT_EQ(commands_.ran, Lines());
+    EXPECT_EQ(rebuilt(log), Lines());
+}
+
+TEST_F(OsNodeWrites, TakeTextsThatAreNumbersForNumbers)
+{
+    write(123, PropertyValue("12", true));
+    EXPECT_EQ(commands_.ran, Lines{"/sbin/shutdown -h now"});
+    EXPECT_EQ(stored(123), "text 12 true");
+}
+
+TEST_F(OsNodeWrites, OfThePowerStateAreStoredWhereTheCommandCannotBeStarted)
+{
+    commands_.answers.clear();
+    EXPECT_EQ(write(123, 9).getStatus(), 0);
+    EXPECT_EQ(stored(123), "number 9 true");
+}
+
+TEST_F(OsNodeWrites, OfNineToTheClearCommandClearTheLogAndRebuildItsEntries)
+{
+    Recording const log;
+    EXPECT_EQ(write(191, 9).getStatus(), 0);
+    EXPECT_TRUE(logWasCleared());
+    EXPECT_EQ(rebuilt(log), Lines{"createLogEntryNodes"});
+    EXPECT_EQ(stored(191), "number 9 true");
+}
+
+TEST_F(OsNodeWrites, ToTheClearCommandLeaveTheEntriesWhereTheLogCannotBeCleared)
+{
+    libc::hooks().fopen = [](char const*, char const*) -> FILE* { return nullptr; };
+    Recording const log;
+    EXPECT_EQ(write(191, 9).getStatus(), 0);
+    EXPECT_EQ(rebuilt(log), Lines());
+    EXPECT_EQ(stored(191), "number 9 true");
+    EXPECT_FALSE(logWasCleared());
+}
+
+TEST_F(OsNodeWrites, OfOtherNumbersToTheClearCommandClearNothing)
+{
+    Recording const log;
+    for (unsigned int const number : {0U, 1U, 8U, 10U, 12U}) {
+        EXPECT_EQ(write(191, number).getStatus(), 0);
+        EXPECT_EQ(stored(191), "number " + std::to_string(number) + " true");
+    }
+    EXPECT_FALSE(logWasCleared());
+    EXPECT_EQ(rebuilt(log), Lines());
+}
+
+TEST_F(OsNodeWrites, OfZeroToTheRefreshTriggerRebuildUsersAndThenGroups)
+{
+    Recording const log;
+    EXPECT_EQ(write(75, 0).getStatus(), 0);
+    EXPECT_EQ(rebuilt(log), (Lines{"createUserNodes", "createGroupNodes"}));
+    EXPECT_EQ(stored(75), "number 0 true");
+}
+
+TEST_F(OsNodeWrites, OfOtherNumbersToTheRefreshTriggerRebuildNothing)
+{
+    Recording const log;
+    for (unsigned int const number : {1U, 2U, 9U}) {
+        EXPECT_EQ(write(75, number).getStatus(), 0);
+        EXPECT_EQ(stored(75), "number " + std::to_string(number) + " true");
+    }
+    EXPECT_EQ(rebuilt(log), Lines());
+}
+
+TEST_F(OsNodeWrites, TakeATextThatIsNoNumberForZero)
+{
+    Recording const log;
+    write(75, PropertyValue("later", true));
+    EXPECT_EQ(rebuilt(log), (Lines{"createUserNodes", "createGroupNodes"}));
+}
+
+TEST_F(OsNodeWrites, OfAMethodRunItRebuildUsersAndThenGroupsAndKeepTheText)
+{
+    Recording const log;
+    EXPECT_EQ(writeText(addition).getStatus(), 0);
+    EXPECT_EQ(commands_.ran, (Lines{useraddLine, chageLine}));
+    EXPECT_EQ(rebuilt(log), (Lines{"createUserNodes", "createGroupNodes"}));
+    Lines const texts = log.texts();
+    EXPECT_LT(std::find(texts.begin(), texts.end(), "OsNode::setCreateUser: exit"),
+              std::find(texts.begin(), texts.end(), "createUserNodes: entry"));
+    EXPECT_EQ(stored(74), "text " + addition + " true");
+}
+
+TEST_F(OsNodeWrites, OfAMethodKeepTheValueAsItWasWritten)
+{
+    write(74, PropertyValue(addition, false));
+    EXPECT_EQ(stored(74), "text " + addition + " false");
+}
+
+TEST_F(OsNodeWrites, OfAMethodThatFailsStoreAnEmptyTextAndReturnStatus1)
+{
+    commands_.answers[useraddLine] = "useradd: user 'jdoe' already exists\nrc=9\n";
+    node_.IC::MutableNode::setProperty(74, PropertyValue("before", false));
+    Recording const log;
+    Error const error = writeText(addition);
+    EXPECT_EQ(error.getStatus(), 1);
+    EXPECT_EQ(static_cast<std::string>(error),
+              static_cast<std::string>(Error(1, Number(Number::EmptyKind), "")));
+    EXPECT_EQ(stored(74), "text  true");
+    EXPECT_EQ(rebuilt(log), Lines());
+}
+
+TEST_F(OsNodeWrites, OfATextThatIsNoMethodFail)
+{
+    for (char const* text : {"x", "dummy ", "Dummy", ",", "UserAdd,A:CMPI_boolean:b"}) {
+        EXPECT_EQ(writeText(text).getStatus(), 1) << text;
+        EXPECT_EQ(stored(74), "text  true") << text;
+    }
+    EXPECT_EQ(commands_.ran, Lines());
+}
+
+TEST_F(OsNodeWrites, OfDummyOrOfNothingRunNoMethod)
+{
+    for (PropertyValue const& value : {PropertyValue("dummy", true), PropertyValue("", true),
+                                       PropertyValue(PropertyValue::EmptyKind, true)}) {
+        Recording const log;
+        EXPECT_EQ(write(74, value).getStatus(), 0);
+        EXPECT_EQ(stored(74), shown(value));
+        EXPECT_EQ(log.texts(),
+                  (Lines{"OsNode::setProperty: entry", "PropertyType::CreateUser: entry",
+                         "OsNode::setProperty: exit"}));
+    }
+    EXPECT_EQ(commands_.ran, Lines());
+}
+
+TEST_F(OsNodeWrites, OfAMethodAreLoggedInFull)
+{
+    Recording const log;
+    writeText(addition);
+    Lines const texts = log.texts();
+    ASSERT_GE(texts.size(), 4U);
+    EXPECT_EQ(
+        Lines(texts.begin(), texts.begin() + 4),
+        (Lines{"OsNode::setProperty: entry", "PropertyType::CreateUser: entry",
+               "CreateUser: inMethodAndParams = " + addition, "OsNode::setCreateUser: entry"}));
+}
+
+TEST_F(OsNodeWrites, ThatHoldPasswordAnywhereAreNotLogged)
+{
+    for (char const* text : {"UserSetPassword", "x,Password:CMPI_string:s", "aPasswordb"}) {
+        Recording const log;
+        writeText(text);
+        for (LogRecord const& record : log.records())
+            EXPECT_EQ(record.text.find("inMethodAndParams"), std::string::npos) << text;
+    }
+}
+
+TEST_F(OsNodeWrites, HandTheTextOnByteForByte)
+{
+    std::string const name = "j\xC3\xB6rg\xFF\xE2\x82";
+    commands_.answers["/usr/sbin/userdel " + name + " 2>&1"] = "";
+    EXPECT_EQ(writeText("UserDel,UserName:CMPI_string:" + name).getStatus(), 0);
+}
+
+TEST_F(OsNodeWrites, OfAnyOtherPropertyAreStoredOnly)
+{
+    for (unsigned int const id : {0U, 9U, 73U, 76U, 108U, 138U, 144U, 190U, 192U, 4711U}) {
+        Recording const log;
+        EXPECT_EQ(write(id, 9).getStatus(), 0);
+        EXPECT_EQ(stored(id), "number 9 true");
+        EXPECT_EQ(log.texts(), (Lines{"OsNode::setProperty: entry", "OsNode::setProperty: exit"}));
+    }
+    EXPECT_EQ(commands_.ran, Lines());
+}
+
+TEST_F(OsNodeWrites, SpeakForTheFrame)
+{
+    Recording const log;
+    writeText("dummy");
+    for (LogRecord const& record : log.records()) {
+        EXPECT_EQ(record.function, "setProperty");
+        EXPECT_EQ(record.file, "OsSwMI");
+        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
+        EXPECT_EQ(record.level, 3000);
+    }
+}
+
+TEST_F(OsNodeWrites, SayWhenTheyEndOnEveryPath)
+{
+    commands_.answers.clear();
+    for (unsigned int const id : {123U, 191U, 75U, 74U, 108U}) {
+        Recording const log;
+        write(id, 9);
+        EXPECT_EQ(log.texts().front(), "OsNode::setProperty: entry");
+        EXPECT_EQ(log.texts().back(), "OsNode::setProperty: exit");
+    }
+}
+
+} // namespace

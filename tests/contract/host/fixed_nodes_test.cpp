@@ -115,11 +115,35 @@ TEST_F(FixedNodes, TheIdListHoldsTheInterfacesOwnIdTwice)
 
 TEST_F(FixedNodes, TheIdListGoesOnWithTheOperatingSystemAndAllThatFollows)
 {
+    commands.answers = {{"lsmod", "exnet 24576 0\nexfs 114688 2\n"},
+                        {"modinfo exnet", ""},
+                        {"modinfo exfs", ""},
+                        {"wc -l /var/log/messages", "3 /var/log/messages\n"}};
     plugin.initialize(5);
     Ids expected = {5, 6, 5, 7};
-    for (unsigned int id = 8; id < Insides::nextNodeId(mi()); ++id)
-        expected.push_back(id);
+    for (IC::MutableNode const* node : plugin.nodes())
+        if (node->getNodeId() > 7)
+            expected.push_back(node->getNodeId());
     EXPECT_EQ(*Insides::nodeIds(mi()), expected);
+}
+
+TEST_F(FixedNodes, IdsAreCountedInTheOrderInWhichTheKindsAreBuilt)
+{
+    commands.answers = {{"lsmod", "exnet 24576 0\n"},
+                        {"modinfo exnet", ""},
+                        {"wc -l /var/log/messages", "2 /var/log/messages\n"}};
+    plugin.initialize(5);
+    Ids types;
+    unsigned int next = 6;
+    for (IC::MutableNode const* node : plugin.nodes()) {
+        if (types.empty() || types.back() != node->getNodeType())
+            types.push_back(node->getNodeType());
+        if (node->getNodeType() != NODES::osSwType) {
+            EXPECT_EQ(node->getNodeId(), next++);
+        }
+    }
+    EXPECT_EQ(types, (Ids{39, 59, 40, 17, 44, 46, 51, 35, 47}));
+    EXPECT_EQ(Insides::nextNodeId(mi()), next);
 }
 
 TEST_F(FixedNodes, TheInterfacesNodeLeavesTheCounterAlone)

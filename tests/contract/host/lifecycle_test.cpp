@@ -3,7 +3,9 @@
 #include "tests/contract/host/Loaded.h"
 
 #include "host/OpenMI.h"
+#include "nodes/ids.h"
 
+#include <algorithm>
 #include <dlfcn.h>
 #include <memory>
 
@@ -225,6 +227,53 @@ TEST_F(Publishing, TakesAnyStatusButZeroForARefusal)
     publish(Insides::rootNode(mi()));
     EXPECT_EQ(host.messages(6000), Lines{"addNewNode error = status 255, refused"});
 }
+
+struct Rebuild {
+    char const* name;
+    char const* builder; // of IC::OsSwMI, taking the refresh flag
+    unsigned int type;
+};
+
+void PrintTo(Rebuild const& rebuild, std::ostream* out)
+{
+    *out << rebuild.name;
+}
+
+class Rebuilding : public Publishing, public testing::WithParamInterface<Rebuild>
+{
+protected:
+    void rebuild() const
+    {
+        auto* const builder =
+            reinterpret_cast<void (*)(IC::OsSwMI*, bool)>(plugin.symbol(GetParam().builder));
+        builder(&mi(), true);
+    }
+};
+
+TEST_P(Rebuilding, LogsEachRefusalOnceAndGoesOn)
+{
+    commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
+    host.addNewNodeStatus = 1;
+    rebuild();
+    std::size_t const nodes = plugin.nodes(GetParam().type).size();
+    ASSERT_GE(nodes, 3U);
+    Lines refusals;
+    for (std::string const& message : host.messages(6000))
+        if (message.rfind("addNewNode error = ", 0) == 0)
+            refusals.push_back(message);
+    EXPECT_EQ(refusals, Lines(nodes, "addNewNode error = status 1, refused"));
+    Lines const all = host.messages();
+    EXPECT_EQ(std::count(all.begin(), all.end(), "publishNode: exit"),
+              static_cast<std::ptrdiff_t>(nodes));
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    All, Rebuilding,
+    testing::Values(Rebuild{"Users", "_ZN2IC6OsSwMI15createUserNodesEb", NODES::userType},
+                    Rebuild{"Groups", "_ZN2IC6OsSwMI16createGroupNodesEb", NODES::groupType},
+                    Rebuild{"LogEntries", "_ZN2IC6OsSwMI19createLogEntryNodesEb",
+                            NODES::logEntryType}),
+    [](auto const& rebuild) { return std::string(rebuild.param.name); });
 
 TEST_F(Lifecycle, UnloadLetsTheFrameworkGoFirstAndThenFreesTheIdList)
 {

@@ -110,15 +110,15 @@ std::vector<Property> const logEntryProperties = {
 };
 
 std::vector<NodeKind> const kinds = {
-    {NODES::osSwType, "mi", "mi", true, "", 0, 0, "the management interface itself", {}},
-    {NODES::rootType, "root", "root", true, "", 0, 0, "root of the machine's tree", {}},
-    {NODES::computerType, "computer", "computer", true, "", 0, NODES::name, "the machine", computerProperties},
-    {NODES::operatingSystemType, "os", "os", true, "", 0, NODES::name, "the operating system: facts, commands and methods", osProperties},
-    {NODES::driverType, "driver", "driver", false, "drivers", NODES::name, NODES::version, "a loaded kernel module", driverProperties},
-    {NODES::userType, "user", "user", false, "users", NODES::name, NODES::fullName, "a local user account: ordinary ones and those with UID 0", userProperties},
-    {NODES::groupType, "group", "group", false, "groups", NODES::name, NODES::members, "a local group: ordinary ones and GID 0", groupProperties},
-    {NODES::logType, "log", "log", true, "", 0, 0, "the system log, /var/log/messages", logProperties},
-    {NODES::logEntryType, "log-entry", "log", false, "log", NODES::id, NODES::message, "one of the 50 newest lines of the system log", logEntryProperties},
+    {NODES::osSwType, "mi", "mi", true, "", 0, 0, "the management interface itself", {}, {}},
+    {NODES::rootType, "root", "root", true, "", 0, 0, "root of the machine's tree", {}, {}},
+    {NODES::computerType, "computer", "computer", true, "", 0, NODES::name, "the machine", {}, computerProperties},
+    {NODES::operatingSystemType, "os", "os", true, "", 0, NODES::name, "the operating system: facts, commands and methods", {}, osProperties},
+    {NODES::driverType, "driver", "driver", false, "drivers", NODES::name, NODES::version, "a loaded kernel module", {"driver-name", "driver-version", "description"}, driverProperties},
+    {NODES::userType, "user", "user", false, "users", NODES::name, NODES::fullName, "a local user account: ordinary ones and those with UID 0", {"user-name", "user-id", "group-id", "full-name", "home-directory", "login-shell"}, userProperties},
+    {NODES::groupType, "group", "group", false, "groups", NODES::name, NODES::members, "a local group: ordinary ones and GID 0", {"group-name", "group-id", "members"}, groupProperties},
+    {NODES::logType, "log", "log", true, "", 0, 0, "the system log, /var/log/messages", {}, logProperties},
+    {NODES::logEntryType, "log-entry", "log", false, "log", NODES::id, NODES::message, "one of the 50 newest lines of the system log", {"index", "time", "message"}, logEntryProperties},
 };
 
 constexpr char const* text = "CMPI_string";

@@ -62,6 +62,7 @@ struct NodeKind {
     unsigned int nameProperty; // what follows the colon in an address; 0 for none
     unsigned int headline;     // the property that says most, shown beside a node; 0 for none
     char const* meaning;
+    std::vector<std::string> columns; // of its table where none are chosen
     std::vector<Property> properties; // in the order in which the plug-in sets them
 };
 

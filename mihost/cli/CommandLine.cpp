@@ -14,6 +14,7 @@ void CommandLine::parse(int argc, char** argv)
     CLI::App app("Loads the management-interface plug-in, shows its tree and drives it.", "mihost");
     app.fallthrough();
     app.set_help_all_flag("--help-all", "help for every command");
+    app.set_version_flag("--version", "mihost " MIHOST_VERSION);
     app.add_option("--plugin", options_.plugin, "load this plug-in file")->type_name("FILE");
     app.add_option("--trace", options_.trace,
                    "write every log message to FILE, - for standard error")
@@ -24,6 +25,8 @@ void CommandLine::parse(int argc, char** argv)
         ->type_name("DIR");
     app.add_flag("--json", options_.json, "print JSON");
     app.add_flag("--show-secrets", options_.showSecrets, "show password hashes");
+    app.add_flag("--yes", options_.yes, "do what would be asked about without asking");
+    app.add_flag("--timing", options_.timing, "tell how long each phase of the start took");
     app.require_subcommand(0, 1);
 
     for (CommandRow const& row : commands()) {
@@ -37,6 +40,9 @@ void CommandLine::parse(int argc, char** argv)
         return;
     } catch (CLI::CallForAllHelp const&) {
         app.exit(CLI::CallForAllHelp());
+        return;
+    } catch (CLI::CallForVersion const& version) {
+        app.exit(version);
         return;
     } catch (CLI::ParseError const& error) {
         throw Failure(BadUsage, fmt::format("{} (mihost --help tells more)", error.what()));

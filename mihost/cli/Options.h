@@ -14,6 +14,8 @@ struct Options {
     bool sandbox = false;
     bool json = false;
     bool showSecrets = false;
+    bool yes = false; // do without asking
+    bool timing = false;
 };
 
 } // namespace mihost

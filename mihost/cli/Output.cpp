@@ -5,12 +5,11 @@
 #include <cerrno>
 #include <cstring>
 #include <fmt/format.h>
-#include <unistd.h>
 
 namespace mihost
 {
 
-Output::Output(std::FILE* stream) : stream_(stream), terminal_(isatty(fileno(stream)) == 1) {}
+Output::Output(std::FILE* stream) : stream_(stream) {}
 
 void Output::write(std::string_view text)
 {

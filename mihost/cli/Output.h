@@ -2,6 +2,7 @@
 #define MIHOST_CLI_OUTPUT_H
 
 #include "mihost/cli/Json.h"
+#include "mihost/cli/Terminal.h"
 
 #include <cstdio>
 #include <exception>
@@ -33,16 +34,16 @@ public:
     /** @throws as write */
     void flush();
 
-    bool isTerminal() const
+    /** Columns of the terminal it goes to, 0 where it is none. */
+    unsigned int width() const
     {
-        return terminal_;
+        return terminal::width(fileno(stream_));
     }
 
 private:
     [[noreturn]] static void fail();
 
     std::FILE* stream_;
-    bool terminal_;
 };
 
 } // namespace mihost

@@ -1,6 +1,7 @@
 #include "mihost/cli/PrivateDirectory.h"
 
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/Interrupts.h"
 
 #include <cerrno>
 #include <cstdlib>
@@ -16,7 +17,10 @@ namespace mihost
 PrivateDirectory::PrivateDirectory() : previous_(-1)
 {
     char const* const parent = std::getenv("TMPDIR");
-    path_ = std::string(parent && *parent ? parent : "/tmp") + "/mihost-XXXXXX";
+    std::error_code ignored;
+    path_ =
+        std::filesystem::absolute(parent && *parent ? parent : "/tmp", ignored) / "mihost-XXXXXX";
+    interrupts::Held const held; // no signal between making it and knowing of it
     if (!mkdtemp(path_.data()))
         throw Failure(NoPlugin, fmt::format("cannot make a private directory '{}': {}", path_,
                                             std::strerror(errno)));
@@ -27,6 +31,7 @@ PrivateDirectory::PrivateDirectory() : previous_(-1)
         throw Failure(NoPlugin, fmt::format("cannot enter the private directory '{}': {}", path_,
                                             std::strerror(problem)));
     }
+    interrupts::setFolderToRemove(path_.c_str());
 }
 
 PrivateDirectory::~PrivateDirectory()
@@ -40,6 +45,7 @@ PrivateDirectory::~PrivateDirectory()
         close(previous_);
     std::error_code ignored;
     std::filesystem::remove_all(path_, ignored);
+    interrupts::setFolderToRemove(nullptr);
 }
 
 } // namespace mihost

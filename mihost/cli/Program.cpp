@@ -2,11 +2,11 @@
 
 #include "mihost/cli/CommandLine.h"
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/Interrupts.h"
 #include "mihost/cli/Session.h"
 #include "mihost/runtime/Text.h"
 
 #include <clocale>
-#include <csignal>
 #include <fmt/format.h>
 
 namespace mihost
@@ -29,17 +29,13 @@ template <class Step> int guarded(Step step)
     }
 }
 
-void ignoreSignal(int) {}
-
 } // namespace
 
 int runProgram(int argc, char** argv)
 {
     // The code set is the user's; everything else, dates and numbers, stays as the plug-in expects.
     std::setlocale(LC_CTYPE, "");
-    // A reader that goes early is an error of writing, not the end. A handler rather than SIG_IGN,
-    // which the commands would inherit.
-    std::signal(SIGPIPE, ignoreSignal);
+    interrupts::install();
 
     CommandLine line;
     if (int const code = guarded([&] { line.parse(argc, argv); }); code != Done || !line.command())

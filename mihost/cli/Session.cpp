@@ -1,11 +1,16 @@
 #include "mihost/cli/Session.h"
 
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/Progress.h"
+#include "mihost/cli/Terminal.h"
+#include "mihost/runtime/Text.h"
 #include "mihost/sandbox/Sandbox.h"
 
 #include <cstdlib>
 #include <fmt/format.h>
+#include <optional>
 #include <sys/stat.h>
+#include <unistd.h>
 #include <utility>
 
 namespace mihost
@@ -25,11 +30,18 @@ void goIntoSandbox(std::string const& overlay)
 Session::Session(Options options)
     : options_(std::move(options)), out_(stdout), pluginFile_(pluginFile(options_.plugin))
 {
-    if (!options_.trace.empty())
+    if (!options_.trace.empty()) {
         trace_ = std::make_unique<Trace>(options_.trace);
+        sinks_.add(trace_->sink());
+    }
     // The trace stays the machine's own: it is open by now. The plug-in's file has its full path.
     if (options_.sandbox)
         goIntoSandbox(options_.overlay);
+}
+
+Session::~Session()
+{
+    setLogSink(nullptr);
 }
 
 void Session::finish()
@@ -37,6 +49,10 @@ void Session::finish()
     plugin_.reset();
     directory_.reset();
     out_.flush();
+    if (options_.timing && !timing_.rows().empty())
+        fmt::print(stderr, "{}",
+                   options_.json ? toJson(timing_.rows()).dump() + "\n"
+                                 : timingText(timing_.rows()));
     if (trace_)
         trace_->finish();
 }
@@ -48,16 +64,54 @@ Plugin& Session::library()
         directory_ = std::make_unique<PrivateDirectory>();
         // The plug-in scans what commands print in English. It reads LANG itself, which stays.
         setenv("LC_ALL", "C", 1);
+        timing_.begin("load");
         plugin_ = std::make_unique<Plugin>(pluginFile_);
+        timing_.end();
     }
     return *plugin_;
+}
+
+void Session::start()
+{
+    std::optional<Progress> progress;
+    std::vector<PhaseListener*> listeners;
+    if (options_.timing)
+        listeners.push_back(&timing_);
+    if (terminal::takesControls(STDERR_FILENO)) {
+        progress.emplace();
+        listeners.push_back(&*progress);
+        sinks_.add(*progress);
+    }
+    PhaseSink phaseSink(listeners);
+    if (!listeners.empty())
+        sinks_.add(phaseSink);
+    plugin_->start();
+    sinks_.remove(phaseSink);
+    if (progress)
+        sinks_.remove(*progress);
 }
 
 std::vector<IC::MutableNode*> Session::nodes()
 {
     if (!library().started())
-        plugin_->start();
+        start();
     return nodesOf(plugin_->interface());
+}
+
+IC::MutableNode& Session::node(std::string const& address)
+{
+    return findNode(nodes(), address);
+}
+
+void Session::confirm(std::string const& what) const
+{
+    if (options_.yes)
+        return;
+    if (!terminal::canAsk())
+        throw Failure(BadUsage,
+                      fmt::format("to {} needs --yes, since there is no terminal to ask", what));
+    if (!terminal::confirm(printable(fmt::format("Really {}?", what))))
+        throw Failure(BadUsage, fmt::format("not confirmed: did not {}", what));
 }
 
 } // namespace mihost

@@ -5,8 +5,10 @@
 #include "mihost/cli/NodeView.h"
 #include "mihost/cli/Options.h"
 #include "mihost/cli/Output.h"
+#include "mihost/cli/Phases.h"
 #include "mihost/cli/Plugin.h"
 #include "mihost/cli/PrivateDirectory.h"
+#include "mihost/cli/Timing.h"
 #include "mihost/cli/Trace.h"
 
 #include <memory>
@@ -24,6 +26,9 @@ public:
      * @throws Failure where one of them cannot be had
      */
     explicit Session(Options options);
+    ~Session();
+    Session(Session const&) = delete;
+    Session& operator=(Session const&) = delete;
 
     /** Takes the plug-in down. @throws Failure where the trace or the output was cut short */
     void finish();
@@ -41,16 +46,31 @@ public:
         return options_.showSecrets ? Secrets::Show : Secrets::Hide;
     }
 
-    /** The plug-in, loaded but perhaps not started. */
+    /** The plug-in, loaded but perhaps not started. @throws Failure */
     Plugin& library();
 
-    /** The nodes of the started plug-in, in the order of the host's list. */
+    /** The nodes of the started plug-in, in the order of the host's list. @throws Failure */
     std::vector<IC::MutableNode*> nodes();
 
+    /** The one node of this address. @throws Failure */
+    IC::MutableNode& node(std::string const& address);
+
+    /**
+     * Returns where that is to be done.
+     *
+     * @param what  such as "delete the account jdoe"
+     * @throws Failure (BadUsage) where it is not, or where nobody can be asked
+     */
+    void confirm(std::string const& what) const;
+
 private:
+    void start();
+
     Options options_;
     Output out_;
     std::string pluginFile_;
+    SinkGroup sinks_;
+    Timing timing_;
     std::unique_ptr<Trace> trace_;
     std::unique_ptr<PrivateDirectory> directory_;
     std::unique_ptr<Plugin> plugin_;

@@ -35,13 +35,11 @@ std::FILE* openTrace(std::string const& file)
 Trace::Trace(std::string const& file)
     : file_(file), stream_(openTrace(file)), writer_(stream_), lines_(writer_, kindName)
 {
-    setLogSink(&lines_);
     setNodeObserver(&lines_);
 }
 
 Trace::~Trace()
 {
-    setLogSink(nullptr);
     setNodeObserver(nullptr);
     if (stream_ != stderr)
         std::fclose(stream_);

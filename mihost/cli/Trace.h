@@ -9,7 +9,7 @@
 namespace mihost
 {
 
-/** The --trace file: takes the runtime's messages for as long as it lives. */
+/** The --trace file. Notes nodes that come and go for as long as it lives. */
 class Trace
 {
 public:
@@ -21,6 +21,12 @@ public:
     ~Trace();
     Trace(Trace const&) = delete;
     Trace& operator=(Trace const&) = delete;
+
+    /** Takes the log messages. */
+    LogSink& sink()
+    {
+        return lines_;
+    }
 
     /** @throws Failure where something could not be written */
     void finish();

@@ -19,7 +19,7 @@ public:
 
     void run(Session& session) override
     {
-        IC::MutableNode const& node = findNode(session.nodes(), address_);
+        IC::MutableNode const& node = session.node(address_);
         NodeView const view = names_.empty() ? liveView(node, session.secrets())
                                              : liveView(node, names_, session.secrets());
         if (session.options().json)

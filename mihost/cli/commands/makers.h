@@ -8,7 +8,17 @@ namespace mihost::commandMakers
 {
 
 std::unique_ptr<Command> tree();
+std::unique_ptr<Command> list();
 std::unique_ptr<Command> get();
+std::unique_ptr<Command> set();
+std::unique_ptr<Command> call();
+std::unique_ptr<Command> refresh();
+std::unique_ptr<Command> clearLog();
+std::unique_ptr<Command> power();
+std::unique_ptr<Command> watch();
+std::unique_ptr<Command> version();
+std::unique_ptr<Command> properties();
+std::unique_ptr<Command> methods();
 
 } // namespace mihost::commandMakers
 

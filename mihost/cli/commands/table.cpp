@@ -8,7 +8,17 @@ std::vector<CommandRow> const& commands()
 {
     static std::vector<CommandRow> const rows = {
         {"tree", "show the tree, one line a node", commandMakers::tree},
+        {"list", "show one kind of node as a table", commandMakers::list},
         {"get", "read properties of a node, live", commandMakers::get},
+        {"set", "write one property of a node", commandMakers::set},
+        {"call", "carry out an administration method", commandMakers::call},
+        {"refresh", "build the user and group nodes anew", commandMakers::refresh},
+        {"clear-log", "empty the system log", commandMakers::clearLog},
+        {"power", "restart or halt the machine", commandMakers::power},
+        {"watch", "print properties whenever they change", commandMakers::watch},
+        {"version", "show the versions of program, contract and plug-in", commandMakers::version},
+        {"properties", "describe the properties of each kind of node", commandMakers::properties},
+        {"methods", "describe the administration methods", commandMakers::methods},
     };
     return rows;
 }

@@ -1,0 +1,34 @@
+#ifndef MIHOST_CLI_CATALOGUETEXT_H
+#define MIHOST_CLI_CATALOGUETEXT_H
+
+#include "mihost/cli/Catalogue.h"
+#include "mihost/cli/Json.h"
+
+#include <string>
+#include <vector>
+
+/** The catalogue as text for people, as JSON, and as the reference documents. */
+namespace mihost
+{
+
+/** @param columns  of the terminal, 0 for no limit */
+std::vector<std::string> kindLines(NodeKind const& kind, std::size_t columns);
+std::vector<std::string> methodLines(Method const& method, std::size_t columns);
+std::vector<std::string> methodListLines(std::size_t columns);
+
+Json toJson(NodeKind const& kind);
+Json toJson(Method const& method);
+
+/** docs/properties.md and docs/methods.md, word for word. */
+std::string propertiesDocument();
+std::string methodsDocument();
+
+/** What is known of a property beyond its kind: "live", "write acts", "secret". */
+std::string traitsText(Property const& property);
+
+/** How a value of this form is written. */
+char const* formName(Form form);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,63 @@
+#ifndef MIHOST_CLI_COMMANDTAP_H
+#define MIHOST_CLI_COMMANDTAP_H
+
+#include <cstdio>
+#include <string>
+#include <vector>
+
+/**
+ * The program's own popen and pclose stand in front of libc's (see popen.cpp). Commands that the
+ * plug-in starts therefore pass through here. They run just as they are given, but with no standard
+ * input, so that none can eat what is meant for this program, and with their standard error kept
+ * apart from it.
+ *
+ * All state is the process's, as popen itself is. One thread at a time.
+ */
+namespace mihost::commandTap
+{
+
+/** A command line that was run, and what it wrote to its standard output. */
+struct RunCommand {
+    std::string line;
+    std::string output;
+};
+
+/** Told of each command line before it starts. */
+class Listener
+{
+public:
+    virtual ~Listener() = default;
+    virtual void commandStarts(char const* line) = 0;
+};
+
+/** @param listener  stays the caller's; null for nobody */
+void setListener(Listener* listener);
+
+/** How many commands were started so far. */
+unsigned int count();
+
+/**
+ * Notes every command and its output for as long as it lives. Each then runs to its end before the
+ * plug-in reads the first byte of it.
+ */
+class Recording
+{
+public:
+    Recording();
+    ~Recording();
+    Recording(Recording const&) = delete;
+    Recording& operator=(Recording const&) = delete;
+
+    std::vector<RunCommand> const& commands() const;
+};
+
+/** What commands have written to their standard error since this was last asked. */
+std::string takeStandardError();
+
+/** Where popen and pclose come in. */
+std::FILE* open(char const* line, char const* mode);
+int close(std::FILE* stream);
+
+} // namespace mihost::commandTap
+
+#endif

@@ -1,0 +1,78 @@
+#include "mihost/cli/Day.h"
+
+#include <charconv>
+#include <ctime>
+
+namespace mihost
+{
+
+namespace
+{
+
+constexpr int firstYear = 1901; // years before it the plug-in takes for none
+constexpr int lastYear = 9999;
+constexpr std::size_t dayLength = 10;
+
+/** Whether the text looks like the pattern, where 0 stands for any digit. */
+bool looksLike(std::string_view text, std::string_view pattern)
+{
+    if (text.size() != pattern.size())
+        return false;
+    for (std::size_t at = 0; at < text.size(); ++at) {
+        bool const digit = text[at] >= '0' && text[at] <= '9';
+        if (pattern[at] == '0' ? !digit : text[at] != pattern[at])
+            return false;
+    }
+    return true;
+}
+
+/** The digits from here on; the caller has looked at them. */
+int number(std::string_view text, std::size_t at, std::size_t length)
+{
+    int value = 0;
+    std::from_chars(text.data() + at, text.data() + at + length, value);
+    return value;
+}
+
+int daysIn(int month, int year)
+{
+    static constexpr int days[] = {31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
+    bool const leap = year % 4 == 0 && (year % 100 != 0 || year % 400 == 0);
+    return month == 2 && leap ? 29 : days[month - 1];
+}
+
+} // namespace
+
+std::optional<Day> parseDay(std::string_view text)
+{
+    if (!looksLike(text, "0000-00-00"))
+        return std::nullopt;
+    Day const day{number(text, 0, 4), number(text, 5, 2), number(text, 8, 2)};
+    if (day.year < firstYear || day.year > lastYear || day.month < 1 || day.month > 12 ||
+        day.day < 1 || day.day > daysIn(day.month, day.year))
+        return std::nullopt;
+    return day;
+}
+
+std::optional<long> parseTime(std::string_view text)
+{
+    auto const day = parseDay(text.substr(0, dayLength));
+    std::string_view const time = text.substr(std::min(text.size(), dayLength));
+    if (!day || (!time.empty() && !looksLike(time, " 00:00:00")))
+        return std::nullopt;
+    std::tm fields{};
+    fields.tm_year = day->year - 1900;
+    fields.tm_mon = day->month - 1;
+    fields.tm_mday = day->day;
+    fields.tm_isdst = -1;
+    if (!time.empty()) {
+        fields.tm_hour = number(time, 1, 2);
+        fields.tm_min = number(time, 4, 2);
+        fields.tm_sec = number(time, 7, 2);
+    }
+    if (fields.tm_hour > 23 || fields.tm_min > 59 || fields.tm_sec > 59)
+        return std::nullopt;
+    return std::mktime(&fields);
+}
+
+} // namespace mihost

@@ -1,0 +1,28 @@
+#ifndef MIHOST_CLI_DAY_H
+#define MIHOST_CLI_DAY_H
+
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace mihost
+{
+
+struct Day {
+    int year;
+    int month;
+    int day;
+};
+
+constexpr char dayForm[] = "YYYY-MM-DD, such as 2030-12-31";
+constexpr char timeForm[] = "YYYY-MM-DD or \"YYYY-MM-DD HH:MM:SS\", in local time";
+
+/** A day of the calendar as YYYY-MM-DD, of a year that the plug-in can convert. */
+std::optional<Day> parseDay(std::string_view text);
+
+/** Seconds since 1970 of a point in local time, written as timeForm says. */
+std::optional<long> parseTime(std::string_view text);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,59 @@
+#ifndef MIHOST_CLI_INTERRUPTS_H
+#define MIHOST_CLI_INTERRUPTS_H
+
+#include <csignal>
+#include <termios.h>
+
+/**
+ * What happens on Ctrl-C and its kin. By default the program tidies up and ends as the signal would
+ * have ended it.
+ */
+namespace mihost::interrupts
+{
+
+/** Takes over SIGINT, SIGTERM, SIGHUP and SIGQUIT, and keeps SIGPIPE from ending the program. */
+void install();
+
+/** @param path  a folder to remove when a signal ends the program; null for none */
+void setFolderToRemove(char const* path);
+
+/** @param settings  what the terminal goes back to when a signal ends the program; null for none */
+void setTerminalToRestore(termios const* settings);
+
+/** @param text  written to standard error when a signal ends the program; null for none */
+void setLastWords(char const* text);
+
+/**
+ * Holds signals back for as long as it lives: a change to the system that has begun is finished.
+ * Commands started meanwhile hold them back, too.
+ */
+class Held
+{
+public:
+    Held();
+    ~Held();
+    Held(Held const&) = delete;
+    Held& operator=(Held const&) = delete;
+
+private:
+    sigset_t before_;
+};
+
+/** For as long as it lives, SIGINT ends no more than what asks whether it came. */
+class Noted
+{
+public:
+    Noted();
+    ~Noted();
+    Noted(Noted const&) = delete;
+    Noted& operator=(Noted const&) = delete;
+
+    static bool came();
+
+    /** Forgets that it came. */
+    static void forget();
+};
+
+} // namespace mihost::interrupts
+
+#endif

@@ -1,0 +1,182 @@
+#include "mihost/cli/MethodCall.h"
+
+#include "mihost/cli/Day.h"
+#include "mihost/cli/Failure.h"
+#include "mihost/cli/Safety.h"
+
+#include <algorithm>
+#include <fmt/format.h>
+#include <fmt/ranges.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+/** What follows a day in the text form. Nothing but the day is used. */
+constexpr std::string_view midnight = "000000.000000+000";
+constexpr std::size_t longestDateTime = 25;
+
+template <class Rows> std::string namesOf(Rows const& rows)
+{
+    std::vector<std::string> names;
+    for (auto const& row : rows)
+        names.emplace_back(row.name);
+    return names.empty() ? "none" : fmt::format("{}", fmt::join(names, ", "));
+}
+
+Method const& method(std::string const& name)
+{
+    Method const* const found = findMethod(name);
+    if (!found)
+        throw Failure(BadUsage,
+                      fmt::format("no method '{}'; there are {}", name, namesOf(methods())));
+    return *found;
+}
+
+Parameter const& parameter(Method const& method, std::string const& name)
+{
+    Parameter const* const found = findParameter(method, name);
+    if (!found)
+        throw Failure(BadUsage, fmt::format("{} has no parameter '{}'; it has {}", method.name,
+                                            name, namesOf(method.parameters)));
+    return *found;
+}
+
+/** @param value  as a person writes it */
+void checkValue(Parameter const& parameter, std::string_view value)
+{
+    if (auto const reason = objection(parameter.form, value))
+        throw Failure(BadUsage, fmt::format("{} {}", parameter.name, *reason));
+}
+
+void checkWhole(MethodCall const& call)
+{
+    for (Parameter const& parameter : call.method->parameters) {
+        auto const given = std::count_if(
+            call.arguments.begin(), call.arguments.end(),
+            [&parameter](auto const& argument) { return argument.parameter == &parameter; });
+        if (given > 1)
+            throw Failure(BadUsage, fmt::format("{} is given twice", parameter.name));
+        if (given == 0 && parameter.required)
+            throw Failure(BadUsage, fmt::format("{} needs {}: {}", call.method->name,
+                                                parameter.name, parameter.meaning));
+    }
+}
+
+std::string toTextForm(Parameter const& parameter, std::string const& value)
+{
+    if (parameter.form != Form::Day)
+        return value;
+    Day const day = *parseDay(value);
+    return fmt::format("{:04}{:02}{:02}{}", day.year, day.month, day.day, midnight);
+}
+
+/** The pieces between separators, empty ones left out, as the plug-in splits. */
+std::vector<std::string> split(std::string const& text, char separator)
+{
+    std::vector<std::string> pieces;
+    std::size_t start = 0;
+    while ((start = text.find_first_not_of(separator, start)) != std::string::npos) {
+        std::size_t const end = std::min(text.find(separator, start), text.size());
+        pieces.push_back(text.substr(start, end - start));
+        start = end;
+    }
+    return pieces;
+}
+
+/** A date-time's day as a person writes it; the text as it is where it is none. */
+std::string dayOf(std::string const& dateTime)
+{
+    bool const whole = dateTime.size() == longestDateTime && dateTime[14] == '.' &&
+                       (dateTime[21] == '+' || dateTime[21] == '-') &&
+                       std::count_if(dateTime.begin(), dateTime.end(), [](char character) {
+                           return character >= '0' && character <= '9';
+                       }) == longestDateTime - 2;
+    if (!whole)
+        return dateTime;
+    return dateTime.substr(0, 4) + "-" + dateTime.substr(4, 2) + "-" + dateTime.substr(6, 2);
+}
+
+MethodCall::Argument argumentOf(Method const& method, std::string const& item)
+{
+    std::vector<std::string> const parts = split(item, ':');
+    Parameter const& known = parameter(method, parts.empty() ? "" : parts[0]);
+    if (parts.size() != 3)
+        throw Failure(BadUsage, fmt::format("{} must be written {}:{}:VALUE, without ':' in VALUE",
+                                            known.name, known.name, known.type));
+    if (parts[1] != known.type)
+        throw Failure(BadUsage,
+                      fmt::format("{} is of type {}, not '{}'", known.name, known.type, parts[1]));
+    checkValue(known, known.form == Form::Day ? dayOf(parts[2]) : parts[2]);
+    return {&known, parts[2]};
+}
+
+} // namespace
+
+MethodCall parseCall(std::string const& name, std::vector<std::string> const& assignments,
+                     AskSecret const& ask)
+{
+    MethodCall call{&method(name), {}};
+    for (std::string const& assignment : assignments) {
+        std::size_t const equals = assignment.find('=');
+        Parameter const& known = parameter(*call.method, assignment.substr(0, equals));
+        std::string value;
+        if (equals != std::string::npos)
+            value = assignment.substr(equals + 1);
+        else if (known.form == Form::Password)
+            value = ask(known.name);
+        else
+            throw Failure(BadUsage,
+                          fmt::format("{} needs a value: {}=VALUE", known.name, known.name));
+        checkValue(known, value);
+        call.arguments.push_back({&known, toTextForm(known, value)});
+    }
+    checkWhole(call);
+    return call;
+}
+
+MethodCall takeApart(std::string const& text)
+{
+    std::vector<std::string> const items = split(text, ',');
+    MethodCall call{&method(items.empty() ? "" : items[0]), {}};
+    for (std::size_t at = 1; at < items.size(); ++at)
+        call.arguments.push_back(argumentOf(*call.method, items[at]));
+    checkWhole(call);
+    return call;
+}
+
+std::string textOf(MethodCall const& call)
+{
+    std::string text = call.method->name;
+    for (MethodCall::Argument const& argument : call.arguments)
+        text += fmt::format(",{}:{}:{}", argument.parameter->name, argument.parameter->type,
+                            argument.value);
+    return text;
+}
+
+std::string valueOf(MethodCall const& call, std::string_view name)
+{
+    auto const found =
+        std::find_if(call.arguments.begin(), call.arguments.end(),
+                     [name](auto const& argument) { return argument.parameter->name == name; });
+    return found == call.arguments.end() ? "" : found->value;
+}
+
+std::string secretOf(MethodCall const& call)
+{
+    auto const found =
+        std::find_if(call.arguments.begin(), call.arguments.end(), [](auto const& argument) {
+            return argument.parameter->form == Form::Password;
+        });
+    return found == call.arguments.end() ? "" : found->value;
+}
+
+std::string dangerOf(MethodCall const& call)
+{
+    bool const deletes = std::string_view(call.method->name) == "UserDel";
+    return deletes && valueOf(call, "UserName") == "root" ? "delete the account root" : "";
+}
+
+} // namespace mihost

@@ -1,0 +1,52 @@
+#ifndef MIHOST_CLI_METHODCALL_H
+#define MIHOST_CLI_METHODCALL_H
+
+#include "mihost/cli/Catalogue.h"
+
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/** A call that was checked value by value. */
+struct MethodCall {
+    struct Argument {
+        Parameter const* parameter;
+        std::string value; // as in the text form
+    };
+
+    Method const* method;
+    std::vector<Argument> arguments; // in the order given; commands are built in it
+};
+
+/** Asks for a value that is not to stand on the command line; gets the parameter's name. */
+using AskSecret = std::function<std::string(std::string const& name)>;
+
+/**
+ * A call from "NAME=VALUE" words. A secret parameter may stand alone; it is then asked for.
+ *
+ * @throws Failure (BadUsage) naming what is wrong and what would be right
+ */
+MethodCall parseCall(std::string const& method, std::vector<std::string> const& assignments,
+                     AskSecret const& ask);
+
+/** A call from its text form. @throws Failure (BadUsage) as above */
+MethodCall takeApart(std::string const& text);
+
+/** The text form, as property 74 takes it. */
+std::string textOf(MethodCall const& call);
+
+/** The value of a parameter, empty where it is not given. */
+std::string valueOf(MethodCall const& call, std::string_view name);
+
+/** The plain password in it, empty for none. */
+std::string secretOf(MethodCall const& call);
+
+/** What must be confirmed before it is carried out; empty for nothing. */
+std::string dangerOf(MethodCall const& call);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,108 @@
+#include "mihost/cli/Progress.h"
+
+#include "mihost/cli/Interrupts.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <cstring>
+#include <fmt/format.h>
+#include <fstream>
+#include <limits>
+
+namespace mihost
+{
+
+namespace
+{
+
+constexpr char clearLine[] = "\r\x1b[K";
+constexpr unsigned int mostLogEntries = 50;
+constexpr unsigned int closely = 200; // beyond that many steps only every so many are shown
+constexpr unsigned int noLimit = std::numeric_limits<unsigned int>::max();
+
+unsigned int linesOf(char const* path, unsigned int most)
+{
+    std::ifstream file(path);
+    unsigned int count = 0;
+    while (count < most && file.ignore(std::numeric_limits<std::streamsize>::max(), '\n') &&
+           !file.eof())
+        ++count;
+    return count;
+}
+
+/** How many steps a phase has, where that can be told beforehand. */
+unsigned int stepsOf(Phase const& phase)
+{
+    if (std::strcmp(phase.function, "createDriverNodes") == 0)
+        return linesOf("/proc/modules", noLimit);
+    if (std::strcmp(phase.function, "createLogEntryNodes") == 0)
+        return linesOf("/var/log/messages", mostLogEntries);
+    return 0;
+}
+
+} // namespace
+
+Progress::Progress()
+{
+    commandTap::setListener(this);
+    interrupts::setLastWords(clearLine);
+}
+
+Progress::~Progress()
+{
+    interrupts::setLastWords(nullptr);
+    commandTap::setListener(nullptr);
+    fmt::print(stderr, clearLine);
+}
+
+void Progress::phaseBegins(Phase const& phase)
+{
+    phase_ = phase.name;
+    done_ = 0;
+    total_ = stepsOf(phase);
+    show();
+}
+
+void Progress::phaseEnds(Phase const&)
+{
+    phase_.clear();
+}
+
+void Progress::write(LogMessage const& message)
+{
+    // The node classes announce their constructors.
+    static constexpr char const* announcements[] = {"UserNode", "GroupNode", "LogEntryNode"};
+    if (message.operation == LogMessage::Operation::Log &&
+        std::any_of(
+            std::begin(announcements), std::end(announcements),
+            [&message](char const* name) { return std::strcmp(message.function, name) == 0; }))
+        step();
+}
+
+void Progress::commandStarts(char const* line)
+{
+    if (std::strncmp(line, "modinfo ", 8) == 0)
+        step();
+}
+
+void Progress::step()
+{
+    if (phase_.empty())
+        return;
+    ++done_;
+    if (done_ < closely || done_ % closely == 0)
+        show();
+}
+
+void Progress::show() const
+{
+    std::string count;
+    if (total_ != 0)
+        count = fmt::format(" {}/{}", std::min(done_, total_), total_);
+    else if (done_ != 0)
+        count = fmt::format(" {}", done_);
+    fmt::print(stderr, "{}starting: {}{}", clearLine, phase_, count);
+    std::fflush(stderr);
+}
+
+} // namespace mihost

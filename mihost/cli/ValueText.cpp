@@ -1,0 +1,116 @@
+#include "mihost/cli/ValueText.h"
+
+#include "mihost/cli/Day.h"
+#include "mihost/cli/Failure.h"
+#include "mihost/cli/MethodCall.h"
+#include "mihost/cli/Safety.h"
+
+#include <charconv>
+#include <fmt/format.h>
+#include <optional>
+#include <vector>
+
+namespace mihost
+{
+
+namespace
+{
+
+using IC::Number;
+using IC::PropertyValue;
+
+constexpr bool flag = true;
+
+Failure wrongForm(Property const& property, std::string const& right)
+{
+    return {BadUsage, fmt::format("{} is a {}: write {}", property.name,
+                                  valueKindName(property.kind), right)};
+}
+
+std::optional<unsigned int> parseNumber(std::string_view text)
+{
+    unsigned int number = 0;
+    char const* const end = text.data() + text.size();
+    auto const [stop, problem] = std::from_chars(text.data(), end, number);
+    return problem == std::errc() && stop == end ? std::optional(number) : std::nullopt;
+}
+
+unsigned int numberFrom(Property const& property, std::string_view text)
+{
+    auto const number = parseNumber(text);
+    if (!number)
+        throw wrongForm(property, "decimal digits, at most 4294967295");
+    return *number;
+}
+
+std::vector<std::string> listFrom(std::string const& text)
+{
+    std::vector<std::string> items;
+    std::size_t start = 0;
+    while (!text.empty()) {
+        std::size_t const comma = text.find(',', start);
+        items.push_back(text.substr(start, comma - start));
+        if (comma == std::string::npos)
+            break;
+        start = comma + 1;
+    }
+    return items;
+}
+
+void checkText(Property const& property, std::string const& text)
+{
+    std::optional<std::string> reason;
+    if (property.form == Form::MethodCall) {
+        if (!text.empty() && text != "dummy") // neither does anything
+            takeApart(text);
+    } else if (property.form == Form::Hash) {
+        reason = objectionToHash(text);
+    } else if (property.form != Form::Free) {
+        reason = objection(property.form, text);
+    }
+    if (reason)
+        throw Failure(BadUsage, fmt::format("{}: {}", property.name, *reason));
+}
+
+bool truthFrom(Property const& property, std::string const& text)
+{
+    for (char const* yes : {"true", "yes", "1"})
+        if (text == yes)
+            return true;
+    for (char const* no : {"false", "no", "0"})
+        if (text == no)
+            return false;
+    throw wrongForm(property, "true or false");
+}
+
+} // namespace
+
+PropertyValue parseValue(Property const& property, std::string const& text)
+{
+    switch (property.kind) {
+    case ValueKind::Text:
+        checkText(property, text);
+        break;
+    case ValueKind::Number:
+        return {Number(numberFrom(property, text)), flag};
+    case ValueKind::Boolean:
+        return {Number(truthFrom(property, text)), flag};
+    case ValueKind::Date:
+        if (auto const time = parseTime(text))
+            return {Number(*time, 0), flag};
+        throw wrongForm(property, timeForm);
+    case ValueKind::Enumeration:
+        return {IC::EnumValue(numberFrom(property, text)), flag};
+    case ValueKind::Numbers: {
+        std::vector<Number> numbers;
+        for (std::string const& item : listFrom(text))
+            numbers.emplace_back(numberFrom(property, item));
+        return {numbers, flag};
+    }
+    case ValueKind::Texts:
+        return {listFrom(text), flag};
+    }
+    return {text, flag};
+}
+
+} // namespace mihost

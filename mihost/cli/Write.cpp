@@ -1,0 +1,150 @@
+#include "mihost/cli/Write.h"
+
+#include "mihost/cli/AccountFiles.h"
+#include "mihost/cli/CommandTap.h"
+#include "mihost/cli/Failure.h"
+#include "mihost/cli/Interrupts.h"
+#include "mihost/runtime/Text.h"
+#include "mihost/sandbox/Sandbox.h"
+
+#include <fmt/format.h>
+#include <sstream>
+
+namespace mihost
+{
+
+namespace
+{
+
+using commandTap::RunCommand;
+
+struct Result {
+    IC::Error error;
+    std::vector<RunCommand> commands;
+    std::vector<FileChange> changes;
+    std::string complaints; // what the commands wrote to their standard error
+};
+
+Result perform(Write const& write, Secrets secrets)
+{
+    interrupts::Held const held;
+    commandTap::Recording const recording;
+    commandTap::takeStandardError();
+    AccountFiles const before = readAccountFiles();
+    Result result{write.node.setProperty(write.property, write.value), {}, {}, {}};
+    for (RunCommand const& command : recording.commands())
+        result.commands.push_back({withoutSecret(command.line, write.secret),
+                                   withoutSecret(command.output, write.secret)});
+    result.changes = changesBetween(before, readAccountFiles(), secrets);
+    result.complaints = withoutSecret(commandTap::takeStandardError(), write.secret);
+    return result;
+}
+
+std::vector<std::string> linesOf(std::string const& text)
+{
+    std::istringstream stream(text);
+    std::vector<std::string> lines;
+    for (std::string line; std::getline(stream, line);)
+        lines.push_back(line);
+    return lines;
+}
+
+Json listOf(std::vector<std::string> const& lines)
+{
+    Json list = Json::array();
+    for (std::string const& line : lines)
+        list.push_back(toJson(line));
+    return list;
+}
+
+Json documentOf(Result const& result)
+{
+    Json document = toJson(result.error);
+    if (!inSandbox())
+        return document;
+    Json commands = Json::array();
+    for (RunCommand const& command : result.commands)
+        commands.push_back({{"command", toJson(command.line)}, {"output", toJson(command.output)}});
+    Json changes = Json::array();
+    for (FileChange const& change : result.changes)
+        changes.push_back({{"file", change.file},
+                           {"removed", listOf(change.removed)},
+                           {"added", listOf(change.added)}});
+    document["commands"] = commands;
+    document["changes"] = changes;
+    return document;
+}
+
+void writeText(Result const& result, Output& out)
+{
+    for (RunCommand const& command : result.commands) {
+        out.line("ran  " + printable(command.line));
+        for (std::string const& line : linesOf(command.output))
+            out.line("     " + printable(line));
+    }
+    for (FileChange const& change : result.changes) {
+        out.line(change.file);
+        for (std::string const& line : change.removed)
+            out.line("  - " + printable(line));
+        for (std::string const& line : change.added)
+            out.line("  + " + printable(line));
+    }
+}
+
+/** The last thing that a command printed: mostly why it failed. Empty where nothing was. */
+std::string lastWords(std::vector<RunCommand> const& commands)
+{
+    for (auto command = commands.rbegin(); command != commands.rend(); ++command) {
+        auto const lines = linesOf(command->output);
+        for (std::string const& line : lines)
+            if (!line.empty() && line.rfind("rc=", 0) != 0)
+                return line;
+    }
+    return "";
+}
+
+bool endsWord(char character)
+{
+    return std::string_view(" \t\n'\"`:").find(character) != std::string_view::npos;
+}
+
+} // namespace
+
+std::string withoutSecret(std::string const& text, std::string const& secret)
+{
+    if (secret.empty())
+        return text;
+    std::string result;
+    std::size_t start = 0;
+    while (start <= text.size()) {
+        std::size_t end = start;
+        while (end < text.size() && !endsWord(text[end]))
+            ++end;
+        std::string const word = text.substr(start, end - start);
+        result += word == secret ? "(hidden)" : word;
+        if (end < text.size())
+            result += text[end];
+        start = end + 1;
+    }
+    return result;
+}
+
+void carryOut(Session& session, Write const& write)
+{
+    Result const result = perform(write, session.secrets());
+    if (session.options().json)
+        session.out().json(documentOf(result));
+    else if (inSandbox())
+        writeText(result, session.out());
+    session.out().flush();
+    for (std::string const& line : linesOf(result.complaints))
+        fmt::print(stderr, "mihost: a command said: {}\n", printable(line));
+    if (result.error.getStatus() == 0)
+        return;
+    std::string const reason = lastWords(result.commands);
+    throw Failure(PluginRefused,
+                  fmt::format("the plug-in answered {}{}{}", static_cast<std::string>(result.error),
+                              reason.empty() ? "" : "; a command said: ", reason));
+}
+
+} // namespace mihost

@@ -1,0 +1,57 @@
+#include "mihost/cli/CatalogueText.h"
+#include "mihost/cli/MethodCall.h"
+#include "mihost/cli/Session.h"
+#include "mihost/cli/Terminal.h"
+#include "mihost/cli/Write.h"
+#include "mihost/cli/commands/makers.h"
+#include "nodes/ids.h"
+
+#include <fmt/ranges.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+class Call : public Command
+{
+public:
+    void declare(CLI::App& app) override
+    {
+        method_ = app.add_option("METHOD", name_, "such as UserAdd")->required();
+        app.add_option("NAME=VALUE", assignments_,
+                       "parameters; days as YYYY-MM-DD; a Password without =VALUE is asked for, or "
+                       "read from standard input");
+        // Asked for help, the words given so far are known but not handed out yet.
+        app.footer([this] {
+            Method const* const known =
+                method_->empty() ? nullptr : findMethod(method_->results().front());
+            return fmt::format(
+                "{}", fmt::join(known ? methodLines(*known, 0) : methodListLines(0), "\n"));
+        });
+    }
+
+    void run(Session& session) override
+    {
+        MethodCall const call = parseCall(name_, assignments_, terminal::readSecret);
+        if (std::string const danger = dangerOf(call); !danger.empty())
+            session.confirm(danger);
+        carryOut(session, {session.node("os"), NODES::createUser,
+                           IC::PropertyValue(textOf(call), true), secretOf(call)});
+    }
+
+private:
+    CLI::Option* method_ = nullptr;
+    std::string name_;
+    std::vector<std::string> assignments_;
+};
+
+} // namespace
+
+std::unique_ptr<Command> commandMakers::call()
+{
+    return std::make_unique<Call>();
+}
+
+} // namespace mihost

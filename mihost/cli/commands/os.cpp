@@ -1,0 +1,103 @@
+// The operating-system node's command properties, under names of their own.
+
+#include "mihost/cli/Failure.h"
+#include "mihost/cli/Session.h"
+#include "mihost/cli/Write.h"
+#include "mihost/cli/commands/makers.h"
+#include "nodes/ids.h"
+
+#include <fmt/format.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+IC::PropertyValue number(unsigned int value)
+{
+    return {IC::Number(value), true};
+}
+
+std::size_t countOf(std::vector<IC::MutableNode*> const& nodes, unsigned int type)
+{
+    std::size_t count = 0;
+    for (IC::MutableNode const* node : nodes)
+        if (node->getNodeType() == type)
+            ++count;
+    return count;
+}
+
+class Refresh : public Command
+{
+public:
+    void declare(CLI::App&) override {}
+
+    void run(Session& session) override
+    {
+        carryOut(session, {session.node("os"), NODES::refresh, number(0), ""});
+        if (session.options().json)
+            return;
+        auto const nodes = session.nodes();
+        session.out().line(fmt::format("{} users, {} groups", countOf(nodes, NODES::userType),
+                                       countOf(nodes, NODES::groupType)));
+    }
+};
+
+class ClearLog : public Command
+{
+public:
+    void declare(CLI::App&) override {}
+
+    void run(Session& session) override
+    {
+        session.confirm("empty the system log");
+        carryOut(session, {session.node("os"), NODES::clearLog, number(9), ""});
+        if (session.options().json)
+            return;
+        // Whether it worked is not told; the entries that are left tell.
+        session.out().line(
+            fmt::format("{} log entries", countOf(session.nodes(), NODES::logEntryType)));
+    }
+};
+
+class Power : public Command
+{
+public:
+    void declare(CLI::App& app) override
+    {
+        app.add_option("ACTION", action_, "restart or halt")
+            ->required()
+            ->check(CLI::IsMember({"restart", "halt"}));
+    }
+
+    void run(Session& session) override
+    {
+        unsigned int const state = action_ == "restart" ? 9 : 12;
+        session.confirm(action_ + " the machine");
+        carryOut(session, {session.node("os"), NODES::requestedState,
+                           IC::PropertyValue(IC::EnumValue(state), true), ""});
+    }
+
+private:
+    std::string action_;
+};
+
+} // namespace
+
+std::unique_ptr<Command> commandMakers::refresh()
+{
+    return std::make_unique<Refresh>();
+}
+
+std::unique_ptr<Command> commandMakers::clearLog()
+{
+    return std::make_unique<ClearLog>();
+}
+
+std::unique_ptr<Command> commandMakers::power()
+{
+    return std::make_unique<Power>();
+}
+
+} // namespace mihost

@@ -1,0 +1,91 @@
+#include "mihost/cli/Failure.h"
+#include "mihost/cli/Interrupts.h"
+#include "mihost/cli/PropertyText.h"
+#include "mihost/cli/Session.h"
+#include "mihost/cli/commands/makers.h"
+
+#include <cmath>
+#include <ctime>
+#include <map>
+
+namespace mihost
+{
+
+namespace
+{
+
+/** Waits, or less where SIGINT comes. */
+void waitFor(double seconds)
+{
+    double whole = 0;
+    double const rest = std::modf(seconds, &whole);
+    timespec const time{static_cast<time_t>(whole), static_cast<long>(rest * 1e9)};
+    if (!interrupts::Noted::came())
+        nanosleep(&time, nullptr);
+}
+
+class Watch : public Command
+{
+public:
+    void declare(CLI::App& app) override
+    {
+        app.add_option("NODE", address_, "an id, or a name such as os or log:1")->required();
+        app.add_option("PROPERTY", names_, "ids or names")->required();
+        app.add_option("--interval", interval_, "seconds between two readings")
+            ->check(CLI::Range(0.0, 86400.0))
+            ->type_name("S")
+            ->capture_default_str();
+        app.add_option("--count", count_, "stop after so many readings; 0 for never")
+            ->type_name("N")
+            ->capture_default_str();
+    }
+
+    void run(Session& session) override
+    {
+        IC::MutableNode const& node = session.node(address_);
+        interrupts::Noted const noted;
+        std::map<unsigned int, std::string> last;
+        for (unsigned int reading = 1; !interrupts::Noted::came(); ++reading) {
+            NodeView view = liveView(node, names_, session.secrets());
+            std::vector<PropertyView> changed;
+            for (PropertyView const& property : view.properties) {
+                std::string const text = static_cast<std::string>(property.value);
+                auto const [entry, isNew] = last.try_emplace(property.id, text);
+                if (isNew || entry->second != text)
+                    changed.push_back(property);
+                entry->second = text;
+            }
+            view.properties = changed;
+            show(session, view);
+            if (reading == count_)
+                return;
+            waitFor(interval_);
+        }
+    }
+
+private:
+    static void show(Session& session, NodeView const& view)
+    {
+        if (view.properties.empty())
+            return;
+        if (session.options().json)
+            session.out().json(toJson(view));
+        else
+            writeProperties(view.properties, "", session.out());
+        session.out().flush();
+    }
+
+    std::string address_;
+    std::vector<std::string> names_;
+    double interval_ = 1;
+    unsigned int count_ = 0;
+};
+
+} // namespace
+
+std::unique_ptr<Command> commandMakers::watch()
+{
+    return std::make_unique<Watch>();
+}
+
+} // namespace mihost

@@ -1,0 +1,14 @@
+// The plug-in calls popen and pclose by their ordinary names. The loader binds them to the
+// program's own, which stand before libc's.
+
+#include "mihost/cli/CommandTap.h"
+
+extern "C" FILE* popen(char const* line, char const* mode)
+{
+    return mihost::commandTap::open(line, mode);
+}
+
+extern "C" int pclose(FILE* stream)
+{
+    return mihost::commandTap::close(stream);
+}

@@ -2,6 +2,7 @@
 
 #include <charconv>
 #include <ctime>
+#include <fmt/format.h>
 
 namespace mihost
 {
@@ -41,17 +42,34 @@ int daysIn(int month, int year)
     return month == 2 && leap ? 29 : days[month - 1];
 }
 
+std::optional<Day> dayOfCalendar(Day const& day)
+{
+    if (day.year < firstYear || day.year > lastYear || day.month < 1 || day.month > 12 ||
+        day.day < 1 || day.day > daysIn(day.month, day.year))
+        return std::nullopt;
+    return day;
+}
+
 } // namespace
 
 std::optional<Day> parseDay(std::string_view text)
 {
     if (!looksLike(text, "0000-00-00"))
         return std::nullopt;
-    Day const day{number(text, 0, 4), number(text, 5, 2), number(text, 8, 2)};
-    if (day.year < firstYear || day.year > lastYear || day.month < 1 || day.month > 12 ||
-        day.day < 1 || day.day > daysIn(day.month, day.year))
+    return dayOfCalendar({number(text, 0, 4), number(text, 5, 2), number(text, 8, 2)});
+}
+
+std::optional<Day> parseDateTime(std::string_view text)
+{
+    if (!looksLike(text, "00000000000000.000000+000") &&
+        !looksLike(text, "00000000000000.000000-000"))
         return std::nullopt;
-    return day;
+    return dayOfCalendar({number(text, 0, 4), number(text, 4, 2), number(text, 6, 2)});
+}
+
+std::string dateTimeText(Day const& day)
+{
+    return fmt::format("{:04}{:02}{:02}000000.000000+000", day.year, day.month, day.day);
 }
 
 std::optional<long> parseTime(std::string_view text)

@@ -15,10 +15,17 @@ struct Day {
 };
 
 constexpr char dayForm[] = "YYYY-MM-DD, such as 2030-12-31";
+constexpr char dateTimeForm[] = "YYYYMMDDhhmmss.ffffff+OOO or -OOO, digits throughout";
 constexpr char timeForm[] = "YYYY-MM-DD or \"YYYY-MM-DD HH:MM:SS\", in local time";
 
 /** A day of the calendar as YYYY-MM-DD, of a year that the plug-in can convert. */
 std::optional<Day> parseDay(std::string_view text);
+
+/** The day of a date-time as method-call texts hold it. The plug-in uses nothing else of it. */
+std::optional<Day> parseDateTime(std::string_view text);
+
+/** The day as such a date-time. */
+std::string dateTimeText(Day const& day);
 
 /** Seconds since 1970 of a point in local time, written as timeForm says. */
 std::optional<long> parseTime(std::string_view text);

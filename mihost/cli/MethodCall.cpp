@@ -14,10 +14,6 @@ namespace mihost
 namespace
 {
 
-/** What follows a day in the text form. Nothing but the day is used. */
-constexpr std::string_view midnight = "000000.000000+000";
-constexpr std::size_t longestDateTime = 25;
-
 template <class Rows> std::string namesOf(Rows const& rows)
 {
     std::vector<std::string> names;
@@ -69,8 +65,7 @@ std::string toTextForm(Parameter const& parameter, std::string const& value)
 {
     if (parameter.form != Form::Day)
         return value;
-    Day const day = *parseDay(value);
-    return fmt::format("{:04}{:02}{:02}{}", day.year, day.month, day.day, midnight);
+    return dateTimeText(*parseDay(value));
 }
 
 /** The pieces between separators, empty ones left out, as the plug-in splits. */
@@ -86,17 +81,14 @@ std::vector<std::string> split(std::string const& text, char separator)
     return pieces;
 }
 
-/** A date-time's day as a person writes it; the text as it is where it is none. */
-std::string dayOf(std::string const& dateTime)
+/** @param value  as it stands in the text form */
+void checkTextForm(Parameter const& parameter, std::string const& value)
 {
-    bool const whole = dateTime.size() == longestDateTime && dateTime[14] == '.' &&
-                       (dateTime[21] == '+' || dateTime[21] == '-') &&
-                       std::count_if(dateTime.begin(), dateTime.end(), [](char character) {
-                           return character >= '0' && character <= '9';
-                       }) == longestDateTime - 2;
-    if (!whole)
-        return dateTime;
-    return dateTime.substr(0, 4) + "-" + dateTime.substr(4, 2) + "-" + dateTime.substr(6, 2);
+    if (parameter.form != Form::Day)
+        checkValue(parameter, value);
+    else if (!parseDateTime(value))
+        throw Failure(BadUsage, fmt::format("{} is no date-time: it must be {}", parameter.name,
+                                            dateTimeForm));
 }
 
 MethodCall::Argument argumentOf(Method const& method, std::string const& item)
@@ -109,7 +101,7 @@ MethodCall::Argument argumentOf(Method const& method, std::string const& item)
     if (parts[1] != known.type)
         throw Failure(BadUsage,
                       fmt::format("{} is of type {}, not '{}'", known.name, known.type, parts[1]));
-    checkValue(known, known.form == Form::Day ? dayOf(parts[2]) : parts[2]);
+    checkTextForm(known, parts[2]);
     return {&known, parts[2]};
 }
 

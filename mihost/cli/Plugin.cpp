@@ -75,7 +75,8 @@ Plugin::Plugin(std::string const& file) : library_(dlopen(file.c_str(), RTLD_NOW
 
 Plugin::~Plugin()
 {
-    interface_->unload();
+    if (started_)
+        interface_->unload();
     dlclose(library_);
 }
 

@@ -11,7 +11,7 @@ namespace mihost
 /** The plug-in's file as named, or where it stands beside this program, or its plain name. */
 std::string pluginFile(std::string const& named);
 
-/** A loaded plug-in; going away, it unloads the interface and then the library. */
+/** A loaded plug-in; going away, it unloads what it started and then the library. */
 class Plugin
 {
 public:

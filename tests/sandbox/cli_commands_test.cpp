@@ -1,0 +1,371 @@
+// The program itself, run on fixture machines as a person or a script runs it.
+
+#include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+#include <sstream>
+
+namespace
+{
+
+using Json = nlohmann::ordered_json;
+using Lines = std::vector<std::string>;
+
+Lines linesOf(std::string const& text)
+{
+    std::istringstream stream(text);
+    Lines lines;
+    for (std::string line; std::getline(stream, line);)
+        lines.push_back(line);
+    return lines;
+}
+
+Json jsonOf(Outcome const& outcome)
+{
+    return Json::parse(outcome.out);
+}
+
+Json mihostJson(Lines arguments)
+{
+    arguments.insert(arguments.begin(), "--json");
+    return jsonOf(mihostRun(arguments));
+}
+
+/** Modules and a log, as lsmod and modinfo print them and syslog writes it. */
+void makeMachine()
+{
+    machine::lay("plain");
+    machine::fake("/usr/sbin/lsmod", "echo 'Module Size Used'\necho 'ext4 1 0'\necho 'xfs 1 0'\n");
+    machine::fake("/usr/sbin/modinfo",
+                  "echo \"description:    Driver of $1\"\necho 'version:        1.0'\n");
+    machine::write("/var/log/messages", "Jan  2 03:04:05 first line\nJan  2 03:04:06 second\n");
+}
+
+TEST(MihostTree, IsWhatItShowsWithoutACommand)
+{
+    makeMachine();
+    EXPECT_EQ(mihostRun({}).out, mihostRun({"tree"}).out);
+}
+
+TEST(MihostTree, HasALineForEachNodeBelowItsParent)
+{
+    makeMachine();
+    Lines const lines = linesOf(mihostRun({"tree"}).out);
+    ASSERT_GE(lines.size(), 6U);
+    EXPECT_EQ(lines[0], "mi #1  OsSw Management Interface");
+    EXPECT_EQ(lines[1], "└─ root #2  ROOT Node");
+    EXPECT_EQ(lines[2].rfind("   └─ computer #3  Computer: ", 0), 0U) << lines[2];
+    EXPECT_EQ(lines[3], "      └─ os #4  Operating System: Linux");
+    EXPECT_EQ(lines[4], "         ├─ driver:ext4 #5  Driver of ext4: 1.0");
+    EXPECT_EQ(lines.back(), "            └─ log:2 #" + std::to_string(lines.size()) +
+                                "  OS LogEntry: *first line*");
+}
+
+TEST(MihostTree, CanBeginAtAnyNodeAndShowProperties)
+{
+    makeMachine();
+    EXPECT_EQ(mihostRun({"tree", "--all", "driver:xfs"}).out, "driver:xfs #6  Driver of xfs: 1.0\n"
+                                                              "       36 manufacturer    \n"
+                                                              "       70 build-number    \n"
+                                                              "      108 driver-name     xfs\n"
+                                                              "      134 driver-version  1.0\n");
+}
+
+TEST(MihostTree, AsJsonIsAnArrayInTheOrderOfTheNodeList)
+{
+    makeMachine();
+    Json const tree = mihostJson({"tree"});
+    std::vector<std::string> kinds;
+    for (Json const& node : tree) {
+        EXPECT_EQ(node["id"], kinds.size() + 1);
+        kinds.push_back(node["kind"]);
+    }
+    kinds.erase(std::remove_if(kinds.begin(), kinds.end(),
+                               [](auto const& kind) { return kind == "user" || kind == "group"; }),
+                kinds.end());
+    EXPECT_EQ(kinds, (Lines{"mi", "root", "computer", "os", "driver", "driver", "log", "log-entry",
+                            "log-entry"}));
+}
+
+TEST(MihostTree, AsJsonHoldsWhatAnswersOnlyLive)
+{
+    makeMachine();
+    Json const os = mihostJson({"tree"})[3];
+    EXPECT_EQ(os["properties"]["191"].dump(),
+              R"({"name":"clear-log","kind":"number","flag":true,"value":0})");
+    EXPECT_EQ(os["properties"]["123"]["flag"], false);
+}
+
+TEST(MihostTree, NamesEveryPropertyThatThePluginHas)
+{
+    makeMachine();
+    for (Json const& node : mihostJson({"tree"}))
+        for (auto const& [id, property] : node["properties"].items())
+            EXPECT_TRUE(property["name"].is_string()) << node["kind"] << " " << id;
+}
+
+TEST(MihostTree, HasValuesOfTheKindsThatTheCatalogueNames)
+{
+    makeMachine();
+    Json const catalogue = mihostJson({"properties"});
+    for (Json const& node : mihostJson({"tree"}))
+        for (auto const& [id, property] : node["properties"].items()) {
+            std::string expected;
+            for (Json const& kind : catalogue)
+                for (Json const& row : kind["properties"])
+                    if (kind["kind"] == node["kind"] && std::to_string(row["id"].get<int>()) == id)
+                        expected = row["kind"];
+            EXPECT_EQ(property["kind"], expected) << node["kind"] << " " << id;
+        }
+}
+
+TEST(MihostGet, ReadsLiveWhatTheNodeAnswersLive)
+{
+    makeMachine();
+    EXPECT_EQ(mihostRun({"get", "log:1", "message"}).out, " 81 message  *second*\n");
+    EXPECT_EQ(mihostRun({"get", "os", "191"}).out, "191 clear-log  0\n");
+}
+
+TEST(MihostGet, PrintsOneObjectAsJson)
+{
+    makeMachine();
+    Json const entry = mihostJson({"get", "log:2", "index", "81"});
+    EXPECT_EQ(entry["kind"], "log-entry");
+    EXPECT_EQ(entry["index"], 2);
+    EXPECT_EQ(entry["properties"].dump(),
+              R"({"89":{"name":"index","kind":"number","flag":true,"value":2},)"
+              R"("81":{"name":"message","kind":"text","flag":true,"value":"*first line*"}})");
+}
+
+TEST(MihostGet, ExitsWith4ForAnUnknownNodeOrProperty)
+{
+    makeMachine();
+    for (Lines const& arguments :
+         {Lines{"get", "driver:none"}, Lines{"get", "999"}, Lines{"get", "os", "none"},
+          Lines{"get", "os", "999"}, Lines{"get", "os", "message"}, Lines{"tree", "user:none"},
+          Lines{"set", "os", "none", "1"}, Lines{"list", "log", "--columns", "none"}}) {
+        Outcome const outcome = mihostRun(arguments);
+        EXPECT_EQ(outcome.code, 4) << arguments[1];
+        EXPECT_EQ(outcome.out, "");
+        EXPECT_EQ(linesOf(outcome.err).size(), 1U) << outcome.err;
+    }
+}
+
+TEST(MihostGet, ExitsWith1WhereThePluginAnswersWithANonZeroStatus)
+{
+    machine::lay("plain"); // no release file there, so no version is stored
+    Outcome const outcome = mihostRun({"get", "os", "os-version"});
+    EXPECT_EQ(outcome.code, 1);
+    EXPECT_EQ(outcome.err, "mihost: property 'os-version' of node 'os': status 1: property 134 is "
+                           "not set\n");
+}
+
+TEST(MihostList, IsATableOfOneKind)
+{
+    makeMachine();
+    EXPECT_EQ(mihostRun({"list", "drivers"}).out, "driver-name  driver-version  description\n"
+                                                  "ext4         1.0             Driver of ext4\n"
+                                                  "xfs          1.0             Driver of xfs\n");
+}
+
+TEST(MihostList, ShowsTheColumnsAskedFor)
+{
+    makeMachine();
+    EXPECT_EQ(mihostRun({"list", "log", "--columns", "index,81"}).out, "index  message\n"
+                                                                       "1      *second*\n"
+                                                                       "2      *first line*\n");
+    Json const list = mihostJson({"list", "log", "--columns", "message"});
+    ASSERT_EQ(list.size(), 2U);
+    EXPECT_EQ(list[0]["properties"].size(), 1U);
+    EXPECT_EQ(list[0]["properties"]["81"]["value"], "*second*");
+}
+
+TEST(MihostList, RefusesAKindThatIsNone)
+{
+    EXPECT_EQ(mihostRun({"list", "things"}).code, 2);
+}
+
+TEST(MihostOutput, NeverHandsControlCharactersOfTheSystemToTheTerminal)
+{
+    makeMachine();
+    machine::write("/var/log/messages", "Jan  2 03:04:05 a\x1b[31mb\xFF\n");
+    EXPECT_EQ(mihostRun({"get", "log:1", "81"}).out, " 81 message  *a\\x1b[31mb\\xff*\n");
+    for (Lines const& arguments : {Lines{"tree"}, Lines{"tree", "--all"}, Lines{"list", "log"}})
+        EXPECT_EQ(mihostRun(arguments).out.find_first_of("\x1b\xFF"), std::string::npos);
+    EXPECT_EQ(mihostJson({"get", "log:1", "81"})["properties"]["81"]["value"], "*a\x1b[31mb\\xff*");
+}
+
+TEST(MihostTrace, IsJsonLinesInCallOrderWithBothLoggerOperations)
+{
+    makeMachine();
+    Outcome const outcome = mihostRun({"--trace", "/tmp/trace", "version"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(machine::read("/tmp/trace"), ""); // nothing was started
+
+    EXPECT_EQ(mihostRun({"--trace", "/tmp/trace", "tree"}).code, 0);
+    Lines const lines = linesOf(machine::read("/tmp/trace"));
+    ASSERT_GT(lines.size(), 2U);
+    std::vector<Json> records;
+    for (std::string const& line : lines)
+        records.push_back(Json::parse(line));
+    EXPECT_EQ(records[0]["op"], "log");
+    EXPECT_EQ(records[1]["op"], "trace");
+    for (auto const& record : {records[0], records[1]}) {
+        EXPECT_EQ(record["function"], "initialize");
+        EXPECT_EQ(record["file"], "OsSwMI");
+        EXPECT_TRUE(record["line"].is_number());
+        EXPECT_EQ(record["category"], "Veltrix.IC.MI.OsSwMI");
+        EXPECT_EQ(record["level"], 3000);
+        EXPECT_EQ(record["message"], "initialize: entry");
+    }
+    EXPECT_EQ(lines[0].substr(0, 26), R"({"op":"log","function":"in)");
+}
+
+TEST(MihostTrace, GoesToStandardErrorWhenItIsADash)
+{
+    makeMachine();
+    Outcome const outcome = mihostRun({"--trace", "-", "get", "os", "108"});
+    EXPECT_EQ(outcome.out, "108 os-name  Linux\n");
+    EXPECT_EQ(Json::parse(linesOf(outcome.err).at(0))["message"], "initialize: entry");
+}
+
+TEST(MihostTrace, ThatCannotBeWrittenIsToldAndExitsWith2)
+{
+    makeMachine();
+    Outcome const full = mihostRun({"--trace", "/dev/full", "get", "os", "108"});
+    EXPECT_EQ(full.code, 2);
+    EXPECT_EQ(full.out, "108 os-name  Linux\n");
+    EXPECT_EQ(full.err, "mihost: cannot write the trace '/dev/full': No space left on device\n");
+    Outcome const missing = mihostRun({"--trace", "/nonexistent/file", "get", "os", "108"});
+    EXPECT_EQ(missing.code, 2);
+    EXPECT_EQ(missing.out, "");
+}
+
+TEST(MihostTiming, TellsEachPhaseOfTheStartAndHowManyCommandsItRan)
+{
+    makeMachine();
+    Outcome const outcome = mihostRun({"--timing", "--json", "get", "os", "108"});
+    Json const timing = Json::parse(outcome.err)["timing"];
+    std::map<std::string, int> commands;
+    for (Json const& row : timing) {
+        commands[row["phase"]] = row["commands"];
+        EXPECT_GE(row["seconds"], 0);
+    }
+    EXPECT_EQ(commands["load"], 0);
+    EXPECT_EQ(commands["drivers"], 3); // lsmod, and modinfo for each of two modules
+    EXPECT_EQ(timing.size(), 10U);
+    Outcome const text = mihostRun({"--timing", "get", "os", "108"});
+    EXPECT_EQ(linesOf(text.err).size(), 11U) << text.err; // and the total
+}
+
+TEST(MihostWatch, PrintsTheFirstReadingAndThenOnlyWhatChanged)
+{
+    makeMachine();
+    EXPECT_EQ(mihostRun({"watch", "os", "os-name", "--interval", "0", "--count", "3"}).out,
+              "108 os-name  Linux\n");
+    // The log grows whenever it is counted.
+    machine::fake("/usr/bin/wc", "n=$(sed -n '$=' /var/log/messages)\n"
+                                 "echo \"Jan  2 03:04:05 line $((n + 1))\" >>/var/log/messages\n"
+                                 "echo \"$((n + 1)) /var/log/messages\"\n");
+    Lines const lines = linesOf(mihostRun({"--json", "watch", "log:1", "message", "index",
+                                           "--interval", "0", "--count", "2"})
+                                    .out);
+    ASSERT_EQ(lines.size(), 2U);
+    Json const first = Json::parse(lines[0])["properties"];
+    Json const second = Json::parse(lines[1])["properties"];
+    EXPECT_EQ(first.size(), 2U);
+    EXPECT_EQ(second.size(), 1U);
+    EXPECT_NE(first["81"]["value"], second["81"]["value"]);
+}
+
+TEST(MihostVersion, NamesProgramContractAndPluginFile)
+{
+    Json const version = mihostJson({"version"});
+    EXPECT_EQ(version["contract"], "1");
+    EXPECT_EQ(version["soname"], "libzorvvxicosswmi.so.1");
+    EXPECT_TRUE(std::filesystem::equivalent(version["plugin"].get<std::string>(), PLUGIN_FILE));
+    EXPECT_EQ(mihostRun({"--version"}).out,
+              "mihost " + version["mihost"].get<std::string>() + "\n");
+}
+
+TEST(MihostUsage, ExitsWith2AndOneLineForWrongArguments)
+{
+    for (Lines const& arguments :
+         {Lines{"nonsense"}, Lines{"get"}, Lines{"--nonsense"}, Lines{"power", "sleep"},
+          Lines{"set", "os"}, Lines{"watch", "os", "108", "--interval", "-1"},
+          Lines{"tree", "os", "extra"}}) {
+        Outcome const outcome = mihostRun(arguments);
+        EXPECT_EQ(outcome.code, 2) << arguments[0];
+        EXPECT_EQ(outcome.out, "");
+        EXPECT_EQ(linesOf(outcome.err).size(), 1U) << outcome.err;
+    }
+}
+
+TEST(MihostUsage, TakesOptionsBeforeAndBehindTheCommand)
+{
+    makeMachine();
+    EXPECT_EQ(mihostRun({"get", "--json", "os", "108"}).out,
+              mihostRun({"--json", "get", "os", "108"}).out);
+}
+
+TEST(MihostDangers, NeedYesWhereThereIsNoTerminalToAsk)
+{
+    makeMachine();
+    for (Lines const& arguments :
+         {Lines{"power", "halt"}, Lines{"power", "restart"}, Lines{"clear-log"},
+          Lines{"set", "os", "requested-state", "9"}, Lines{"set", "os", "123", "12"},
+          Lines{"set", "os", "clear-log", "9"}, Lines{"call", "UserDel", "UserName=root"},
+          Lines{"set", "os", "74", "UserDel,UserName:CMPI_string:root"}}) {
+        Outcome const outcome = mihostRun(arguments, "y\n");
+        EXPECT_EQ(outcome.code, 2) << arguments[0];
+        EXPECT_NE(outcome.err.find("needs --yes"), std::string::npos) << outcome.err;
+    }
+    EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
+    EXPECT_FALSE(machine::read("/var/log/messages").empty());
+}
+
+TEST(MihostPluginRun, LeavesNothingBehind)
+{
+    makeMachine();
+    std::filesystem::create_directory("/tmp/private");
+    ASSERT_EQ(setenv("TMPDIR", "/tmp/private", 1), 0);
+    EXPECT_EQ(mihostRun({"tree"}).code, 0);
+    EXPECT_TRUE(std::filesystem::is_empty("/tmp/private"));
+}
+
+TEST(MihostPluginRun, GivesCommandsAPrivateFolderNoInputAndTheirOwnLanguage)
+{
+    makeMachine();
+    machine::fake("/usr/sbin/lsmod",
+                  "{ pwd; umask; echo \"$LC_ALL $LANG\"; stat -c %a .; cat; } >/tmp/said\n"
+                  "echo complaint >&2\n");
+    ASSERT_EQ(setenv("TMPDIR", "/tmp", 1), 0);
+    ASSERT_EQ(setenv("LANG", "de_DE.ISO-8859-1", 1), 0);
+    Outcome const outcome = mihostRun({"get", "os", "155", "154"}, "input for mihost alone\n");
+    EXPECT_EQ(outcome.out, "155 language-edition  de-DE\n154 code-set          ISO-8859-1\n");
+    EXPECT_EQ(outcome.err, "");
+    Lines const said = linesOf(machine::read("/tmp/said"));
+    ASSERT_EQ(said.size(), 4U);
+    EXPECT_EQ(said[0].rfind("/tmp/mihost-", 0), 0U) << said[0];
+    EXPECT_EQ(said[1], "0077");
+    EXPECT_EQ(said[2], "C de_DE.ISO-8859-1");
+    EXPECT_EQ(said[3], "700");
+}
+
+TEST(MihostPluginRun, TakesTheCodeSetOfTheUsersLocaleWhereLangIsUnset)
+{
+    makeMachine();
+    unsetenv("LANG");
+    unsetenv("LC_CTYPE");
+    ASSERT_EQ(setenv("LC_ALL", "C.UTF-8", 1), 0);
+    EXPECT_EQ(mihostRun({"get", "os", "code-set"}).out, "154 code-set  UTF-8\n");
+    ASSERT_EQ(setenv("LC_ALL", "C", 1), 0);
+    EXPECT_EQ(mihostRun({"get", "os", "code-set"}).out, "154 code-set  ANSI_X3.4-1968\n");
+}
+
+} // namespace

@@ -1,0 +1,61 @@
+#include "mihost/cli/AccountFiles.h"
+#include "mihost/cli/Write.h"
+
+#include <gtest/gtest.h>
+
+namespace
+{
+
+using mihost::AccountFiles;
+using mihost::changesBetween;
+using mihost::Secrets;
+using Lines = std::vector<std::string>;
+
+TEST(AccountFileChanges, AreTheLinesThatWentAndCame)
+{
+    AccountFiles const before = {{"/etc/passwd", {"root:x:0:0::/root:/bin/sh", "a:x:1:1::/:/x"}},
+                                 {"/etc/group", {"root:x:0:"}}};
+    AccountFiles const after = {{"/etc/passwd", {"root:x:0:0::/root:/bin/sh", "b:x:2:2::/:/x"}},
+                                {"/etc/group", {"root:x:0:"}}};
+    auto const changes = changesBetween(before, after, Secrets::Hide);
+    ASSERT_EQ(changes.size(), 1U);
+    EXPECT_EQ(changes[0].file, "/etc/passwd");
+    EXPECT_EQ(changes[0].removed, Lines{"a:x:1:1::/:/x"});
+    EXPECT_EQ(changes[0].added, Lines{"b:x:2:2::/:/x"});
+}
+
+TEST(AccountFileChanges, HideHashesUntilTheyAreAskedFor)
+{
+    AccountFiles const before = {{"/etc/shadow", {"jdoe:!:19000::::::"}}};
+    AccountFiles const after = {{"/etc/shadow", {"jdoe:$6$salt$hash:19000::::::"}}};
+    auto const hidden = changesBetween(before, after, Secrets::Hide);
+    EXPECT_EQ(hidden.at(0).removed, Lines{"jdoe:!:19000::::::"});
+    EXPECT_EQ(hidden.at(0).added, Lines{"jdoe:(hidden):19000::::::"});
+    EXPECT_EQ(changesBetween(before, after, Secrets::Show).at(0).added,
+              Lines{"jdoe:$6$salt$hash:19000::::::"});
+}
+
+TEST(AccountFileChanges, HideHashesOfBrokenLines)
+{
+    AccountFiles const after = {{"/etc/shadow", {"jdoe:secret", "noColonAtAll"}}};
+    EXPECT_EQ(changesBetween({}, after, Secrets::Hide).at(0).added,
+              (Lines{"jdoe:(hidden)", "noColonAtAll"}));
+}
+
+TEST(WithoutSecret, ReplacesTheSecretWhereItStandsAsAWord)
+{
+    EXPECT_EQ(mihost::withoutSecret("/usr/sbin/usermod -p geheim jdoe 2>&1", "geheim"),
+              "/usr/sbin/usermod -p (hidden) jdoe 2>&1");
+    EXPECT_EQ(mihost::withoutSecret("invalid 'geheim'\ngeheim\n", "geheim"),
+              "invalid '(hidden)'\n(hidden)\n");
+    EXPECT_EQ(mihost::withoutSecret("/usr/sbin/usermod -p u u", "u"),
+              "/usr/sbin/usermod -p (hidden) (hidden)");
+}
+
+TEST(WithoutSecret, LeavesTextAloneWhereThereIsNone)
+{
+    EXPECT_EQ(mihost::withoutSecret("a  b\n\nc ", ""), "a  b\n\nc ");
+    EXPECT_EQ(mihost::withoutSecret("a  b\n\nc ", "x"), "a  b\n\nc ");
+}
+
+} // namespace

@@ -114,14 +114,12 @@ MethodCall parseCall(std::string const& name, std::vector<std::string> const& as
     for (std::string const& assignment : assignments) {
         std::size_t const equals = assignment.find('=');
         Parameter const& known = parameter(*call.method, assignment.substr(0, equals));
-        std::string value;
-        if (equals != std::string::npos)
-            value = assignment.substr(equals + 1);
-        else if (known.form == Form::Password)
-            value = ask(known.name);
-        else
+        if (equals == std::string::npos)
             throw Failure(BadUsage,
                           fmt::format("{} needs a value: {}=VALUE", known.name, known.name));
+        std::string value = assignment.substr(equals + 1);
+        if (known.form == Form::Password && value == toBeAsked)
+            value = ask(known.name);
         checkValue(known, value);
         call.arguments.push_back({&known, toTextForm(known, value)});
     }

@@ -21,11 +21,14 @@ struct MethodCall {
     std::vector<Argument> arguments; // in the order given; commands are built in it
 };
 
+/** What stands in a secret's place where it is to be asked for. */
+constexpr char toBeAsked[] = "-";
+
 /** Asks for a value that is not to stand on the command line; gets the parameter's name. */
 using AskSecret = std::function<std::string(std::string const& name)>;
 
 /**
- * A call from "NAME=VALUE" words. A secret parameter may stand alone; it is then asked for.
+ * A call from "NAME=VALUE" words. A password given as "-" is asked for.
  *
  * @throws Failure (BadUsage) naming what is wrong and what would be right
  */

@@ -57,7 +57,7 @@ void Session::finish()
         trace_->finish();
 }
 
-Plugin& Session::library()
+Plugin& Session::plugin()
 {
     if (!plugin_) {
         umask(077); // for what the plug-in and its commands write
@@ -93,7 +93,7 @@ void Session::start()
 
 std::vector<IC::MutableNode*> Session::nodes()
 {
-    if (!library().started())
+    if (!plugin().started())
         start();
     return nodesOf(plugin_->interface());
 }

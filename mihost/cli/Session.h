@@ -47,7 +47,7 @@ public:
     }
 
     /** The plug-in, loaded but perhaps not started. @throws Failure */
-    Plugin& library();
+    Plugin& plugin();
 
     /** The nodes of the started plug-in, in the order of the host's list. @throws Failure */
     std::vector<IC::MutableNode*> nodes();

@@ -49,11 +49,11 @@ TEST(MethodCall, WritesDaysAsDateTimes)
               "passwordExpirationDate:CMPI_dateTime:20101231000000.000000+000");
 }
 
-TEST(MethodCall, AsksForASecretThatStandsWithoutValue)
+TEST(MethodCall, AsksForAPasswordThatIsADash)
 {
     std::string asked;
     auto const call =
-        parseCall("UserSetPassword", {"UserName=jdoe", "Password"}, [&](std::string const& name) {
+        parseCall("UserSetPassword", {"UserName=jdoe", "Password=-"}, [&](std::string const& name) {
             asked = name;
             return std::string("geheim");
         });
@@ -77,6 +77,10 @@ TEST(MethodCall, IsRefusedWhereAParameterIsMissingDoubleOrWithoutValue)
                   textFor("UserDel", {"UserName=a", "UserName=b"});
               }),
               "UserName is given twice");
+    EXPECT_EQ(refusal([] {
+                  textFor("UserSetPassword", {"UserName=a", "Password"});
+              }),
+              "Password needs a value: Password=VALUE");
     EXPECT_EQ(refusal([] { textFor("UserDel", {"UserName"}); }),
               "UserName needs a value: UserName=VALUE");
     EXPECT_EQ(refusal([] { textFor("UserDel", {"UserName="}); }), "UserName is empty");

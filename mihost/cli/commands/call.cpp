@@ -21,8 +21,8 @@ public:
     {
         method_ = app.add_option("METHOD", name_, "such as UserAdd")->required();
         app.add_option("NAME=VALUE", assignments_,
-                       "parameters; days as YYYY-MM-DD; a Password without =VALUE is asked for, or "
-                       "read from standard input");
+                       "parameters; days as YYYY-MM-DD; Password=- is asked for, or read from "
+                       "standard input");
         // Asked for help, the words given so far are known but not handed out yet.
         app.footer([this] {
             Method const* const known =

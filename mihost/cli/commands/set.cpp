@@ -78,9 +78,10 @@ public:
     {
         app.add_option("NODE", address_, "an id, or a name such as os or user:root")->required();
         app.add_option("PROPERTY", name_, "an id or a name")->required();
-        value_ = app.add_option("VALUE", text_,
-                                "a date as YYYY-MM-DD, true or false, lists with commas; a secret "
-                                "may be left out and is asked for, or read from standard input");
+        app.add_option("VALUE", text_,
+                       "a date as YYYY-MM-DD, true or false, lists with commas; - for a password "
+                       "is asked for, or read from standard input")
+            ->required();
     }
 
     void run(Session& session) override
@@ -94,10 +95,7 @@ public:
                           fmt::format("nothing is known of property '{}' of node '{}', so "
                                       "it is not written",
                                       name_, address_));
-        bool const isSecret = property->has(Property::Secret);
-        if (value_->count() == 0 && !isSecret)
-            throw Failure(BadUsage, fmt::format("{} needs a value", property->name));
-        if (value_->count() == 0)
+        if (property->has(Property::Secret) && text_ == toBeAsked)
             text_ = terminal::readSecret(property->name);
 
         IC::PropertyValue const value = parseValue(*property, text_);
@@ -112,7 +110,6 @@ private:
     std::string address_;
     std::string name_;
     std::string text_;
-    CLI::Option* value_ = nullptr;
 };
 
 } // namespace

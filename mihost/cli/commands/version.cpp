@@ -16,7 +16,7 @@ public:
 
     void run(Session& session) override
     {
-        Plugin const& plugin = session.library();
+        Plugin const& plugin = session.plugin();
         if (session.options().json) {
             session.out().json({{"mihost", MIHOST_VERSION},
                                 {"contract", MIHOST_CONTRACT},

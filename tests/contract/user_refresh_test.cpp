@@ -1,0 +1,123 @@
+// Users and groups refreshed from several threads while others read. Says most when it is built
+// with the thread sanitizer.
+
+#include "nodes/ids.h"
+#include "tests/support/Libc.h"
+#include "tests/support/LiveNodes.h"
+#include "tests/support/Plugin.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <atomic>
+#include <cstdlib>
+#include <ctime>
+#include <set>
+#include <string>
+#include <thread>
+#include <vector>
+
+namespace
+{
+
+constexpr unsigned int userCount = 4; // on the fixture machine
+constexpr unsigned int groupCount = 4;
+constexpr unsigned int refreshesEach = 25;
+
+/** Counts the errors that are logged; all else costs as little as it can. */
+class ErrorCount : public mihost::LogSink
+{
+public:
+    ErrorCount()
+    {
+        mihost::setLogSink(this);
+    }
+    ~ErrorCount() override
+    {
+        mihost::setLogSink(nullptr);
+    }
+
+    void write(mihost::LogMessage const& message) override
+    {
+        if (message.level >= 6000)
+            ++errors;
+    }
+
+    std::atomic<unsigned int> errors{0};
+};
+
+/** A plug-in on a machine with users and groups; its commands cannot be started. */
+class ConcurrentRefresh : public testing::Test
+{
+protected:
+    ConcurrentRefresh()
+    {
+        // Without it libc looks its zone up again and again, under a lock that the sanitizer
+        // cannot see.
+        setenv("TZ", "UTC0", 1);
+        tzset();
+        plugin.initialize();
+    }
+
+    libc::FileRoot const root{MACHINES_DIR "/users-and-groups"};
+    libc::FakeCommands const commands;
+    Plugin plugin;
+};
+
+TEST_F(ConcurrentRefresh, LeavesOneWholeSetOfNodesAndEveryCountRight)
+{
+    IC::MutableNode& os = plugin.node(NODES::operatingSystemType);
+    unsigned int const lastId = plugin.nodes().back()->getNodeId();
+    ErrorCount const log;
+    LiveNodes live(plugin.nodes());
+    std::atomic<unsigned int> refreshing{2};
+    std::atomic<unsigned int> wrong{0};
+    std::atomic<unsigned int> reads{0};
+
+    auto const refresh = [&] {
+        IC::PropertyValue const now(IC::Number(0U), true);
+        for (unsigned int i = 0; i < refreshesEach; ++i)
+            wrong += os.setProperty(NODES::refresh, now).getStatus();
+        --refreshing;
+    };
+    auto const readCount = [&](unsigned int type, char const* expected) {
+        live.use(type, [&](IC::MutableNode const& node) {
+            wrong += text(node, NODES::elementCount) == expected ? 0 : 1;
+            wrong += text(node, NODES::name).empty() ? 1 : 0;
+            ++reads;
+        });
+    };
+    auto const read = [&] {
+        while (refreshing > 0 || reads < 100) {
+            readCount(NODES::userType, "4");
+            readCount(NODES::groupType, "4");
+        }
+    };
+    std::vector<std::thread> threads;
+    for (int i = 0; i < 2; ++i) {
+        threads.emplace_back(refresh);
+        threads.emplace_back(read);
+    }
+    for (std::thread& thread : threads)
+        thread.join();
+
+    EXPECT_EQ(wrong, 0U);
+    EXPECT_EQ(log.errors, 0U);
+    EXPECT_GE(reads, 100U);
+    std::set<unsigned int> ids;
+    for (unsigned int const type : {NODES::userType, NODES::groupType}) {
+        std::vector<IC::MutableNode*> const nodes = plugin.nodes(type);
+        EXPECT_EQ(nodes.size(), type == NODES::userType ? userCount : groupCount);
+        std::vector<IC::MutableNode const*> alive = live.ofType(type);
+        EXPECT_TRUE(std::is_permutation(nodes.begin(), nodes.end(), alive.begin(), alive.end()));
+        unsigned int index = 0;
+        for (IC::MutableNode const* node : nodes) {
+            EXPECT_EQ(node->getIndex(), ++index);
+            EXPECT_TRUE(ids.insert(node->getNodeId()).second);
+        }
+    }
+    // Every refresh took an id for each node, and the last set of each kind has the last ones.
+    EXPECT_EQ(*ids.rbegin(), lastId + 2 * refreshesEach * (userCount + groupCount));
+}
+
+} // namespace

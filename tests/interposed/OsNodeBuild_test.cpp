@@ -1,12 +1,12 @@
-#include "frame/OsSwMI.h"
-
 #include "tests/interposed/StandIns.h"
+#include "tests/support/Frame.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
 #include <cstdlib>
+#include <map>
 #include <string>
 #include <vector>
 
@@ -17,31 +17,18 @@ using IC::Error;
 using IC::Node;
 using IC::PropertyValue;
 
-/** An interface that builds the fixed nodes and, when asked to, the operating system's. */
-class Interface : public IC::OsSwMI
+/** An interface that has built the fixed nodes. */
+class Interface : public Frame
 {
 public:
     Interface()
     {
-        nodeIds_ = new std::vector<unsigned int>;
-        ManagementInterface::initialize(7, IC::Number(0U), IC::Number(0U));
         createOsSwNodes();
         createRootNode();
         createComputerNodes();
     }
 
-    ~Interface() override
-    {
-        unload();
-    }
-
     using OsSwMI::computerNode_;
-    using OsSwMI::currentNode_;
-    using OsSwMI::miIds_;
-    using OsSwMI::nextNodeId_;
-    using OsSwMI::nodeIds_;
-    using OsSwMI::nodes_;
-    using OsSwMI::osNode_;
 };
 
 class OsNodeBuild : public testing::Test
@@ -71,16 +58,9 @@ protected:
     }
 
     /** What is stored, whatever a live read would answer. */
-    PropertyValue stored(unsigned int id)
+    std::string stored(unsigned int id)
     {
-        auto const properties = interface_.osNode_->getProperties();
-        auto const found = properties.find(id);
-        return found == properties.end() ? PropertyValue("not set", false) : found->second;
-    }
-
-    bool isSet(unsigned int id)
-    {
-        return interface_.osNode_->getProperties().count(id) != 0;
+        return storedValue(*interface_.osNode_, id);
     }
 
     Interface interface_;
@@ -89,76 +69,56 @@ protected:
 TEST_F(OsNodeBuild, TakesTheNextNodeIdBelowTheComputer)
 {
     unsigned int const id = interface_.nextNodeId_;
+    std::size_t const noted = interface_.nodeIds_->size();
     build();
     EXPECT_EQ(interface_.osNode_->getNodeId(), id);
     EXPECT_EQ(interface_.nextNodeId_, id + 1);
     EXPECT_EQ(interface_.nodeIds_->back(), id);
-    EXPECT_EQ(interface_.nodeIds_->size(), 5U);
+    EXPECT_EQ(interface_.nodeIds_->size(), noted + 1);
     EXPECT_EQ(interface_.osNode_->getLinkedId(), interface_.computerNode_->getNodeId());
     EXPECT_EQ(interface_.osNode_->getMIIds(), interface_.miIds_);
     EXPECT_EQ(interface_.osNode_->getNodeType(), 17U);
     EXPECT_EQ(interface_.osNode_->getIndex(), 0U);
 }
 
-TEST_F(OsNodeBuild, MakesTheNodeTheCurrentOneAndListsIt)
+TEST_F(OsNodeBuild, MakesTheNodeTheCurrentOneAndListsItOnce)
 {
+    std::size_t const listed = interface_.nodes_.size();
     build();
     EXPECT_EQ(interface_.currentNode_, interface_.osNode_);
     EXPECT_EQ(interface_.nodes_.back(), interface_.osNode_);
-    EXPECT_EQ(interface_.nodes_.size(), 4U);
+    EXPECT_EQ(interface_.nodes_.size(), listed + 1);
+    EXPECT_TRUE(interface_.published.empty());
     EXPECT_EQ(interface_.osNode_->getStatus(), 1U);
     EXPECT_EQ(interface_.osNode_->getDescription(), "Operating System");
 }
 
-struct Row {
-    unsigned int id;
-    PropertyValue::KindType kind;
-    char const* text;
-    bool flag;
-};
-
 TEST_F(OsNodeBuild, StoresEveryProperty)
 {
-    using Value = PropertyValue;
-    Row const rows[] = {{74, Value::TextKind, "dummy", true},
-                        {75, Value::NumberKind, "1", true},
-                        {108, Value::TextKind, "Kesto Linux", true},
-                        {123, Value::EnumerationKind, "1", false},
-                        {125, Value::NumbersKind, "0,1,24", true},
-                        {128, Value::EnumerationKind, "35", true},
-                        {134, Value::TextKind, "10.2", true},
-                        {139, Value::DateKind, "2008-12-31 23:59:59", true},
-                        {140, Value::BooleanKind, "false", true},
-                        {141, Value::DateKind, "2010-05-12 10:23:45", true},
-                        {142, Value::NumberKind, "142", true},
-                        {143, Value::NumberKind, "143", true},
-                        {144, Value::NumberKind, "1440", true},
-                        {145, Value::NumberKind, "145", true},
-                        {146, Value::NumberKind, "146", true},
-                        {147, Value::NumberKind, "147", true},
-                        {148, Value::NumberKind, "148", true},
-                        {149, Value::NumberKind, "1490", true},
-                        {150, Value::NumberKind, "1500", true},
-                        {151, Value::NumberKind, "1510", true},
-                        {152, Value::NumberKind, "1520", true},
-                        {153, Value::NumberKind, "1530", true},
-                        {154, Value::TextKind, "UTF-8", true},
-                        {155, Value::TextKind, "en-US", true}};
-    build();
-    for (Row const& row : rows) {
-        PropertyValue const value = stored(row.id);
-        EXPECT_EQ(value.getKind(), row.kind) << row.id;
-        EXPECT_EQ(static_cast<std::string>(value), row.text) << row.id;
-        EXPECT_EQ(value.getFlag(), row.flag) << row.id;
-    }
-    EXPECT_EQ(interface_.osNode_->getProperties().size(), std::size(rows));
+    std::map<unsigned int, std::string> const expected{
+        {74, "text dummy true"},        {75, "number 1 true"},
+        {108, "text Kesto Linux true"}, {123, "enumeration 1 false"},
+        {125, "numbers 0,1,24 true"},   {128, "enumeration 35 true"},
+        {134, "text 10.2 true"},        {139, "date 1230767999 true"},
+        {140, "boolean false true"},    {141, "date 1273659825 true"},
+        {142, "number 142 true"},       {143, "number 143 true"},
+        {144, "number 1440 true"},      {145, "number 145 true"},
+        {146, "number 146 true"},       {147, "number 147 true"},
+        {148, "number 148 true"},       {149, "number 1490 true"},
+        {150, "number 1500 true"},      {151, "number 1510 true"},
+        {152, "number 1520 true"},      {153, "number 1530 true"},
+        {154, "text UTF-8 true"},       {155, "text en-US true"}};
+    std::map<unsigned int, std::string> properties;
+    for (auto const& [id, value] : build().getProperties())
+        properties[id] = shown(value);
+    EXPECT_EQ(properties, expected);
 }
 
 TEST_F(OsNodeBuild, StoresTheDistributedFlagAsATruthValue)
 {
     standIns().numbers["getDistributed"] = 1;
     build();
-    EXPECT_EQ(static_cast<std::string>(stored(140)), "true");
+    EXPECT_EQ(stored(140), "boolean true true");
 }
 
 TEST_F(OsNodeBuild, AsksAndStoresInAFixedOrder)
@@ -211,7 +171,7 @@ TEST_F(OsNodeBuild, LeavesAPropertyUnsetWithoutAMessageWhenItsFactCannotBeHad)
         standIns().failing = {fact.getter, "getLastBootTime", "getInstallDate"};
         Recording const log;
         build();
-        EXPECT_FALSE(isSet(fact.id)) << fact.getter;
+        EXPECT_EQ(stored(fact.id), "unset") << fact.getter;
         EXPECT_EQ(interface_.osNode_->getProperties().size(), 24U - standIns().failing.size())
             << fact.getter;
         EXPECT_TRUE(log.remarks().empty());
@@ -222,27 +182,25 @@ TEST_F(OsNodeBuild, StoresTheProcessCountAsFreeMemoryWhenFreeMemoryCannotBeHad)
 {
     standIns().failing = {"getPhysicalMemoryFree"};
     build();
-    EXPECT_EQ(stored(149).getKind(), PropertyValue::NumberKind);
-    EXPECT_EQ(stored(149).getNumber(), 1440);
-    EXPECT_EQ(stored(150).getNumber(), 1500);
+    EXPECT_EQ(stored(149), "number 1440 true");
+    EXPECT_EQ(stored(150), "number 1500 true");
 }
 
 TEST_F(OsNodeBuild, CarriesAFigureOverEveryOneThatCannotBeHad)
 {
     standIns().failing = {"getSwapFileSize", "getSwapFileFree", "getSwapFileSizeStored"};
     build();
-    EXPECT_EQ(stored(151).getNumber(), 1500);
-    EXPECT_EQ(stored(153).getNumber(), 1500);
-    EXPECT_EQ(stored(152).getNumber(), 1500);
+    EXPECT_EQ(stored(151), "number 1500 true");
+    EXPECT_EQ(stored(153), "number 1500 true");
+    EXPECT_EQ(stored(152), "number 1500 true");
 }
 
 TEST_F(OsNodeBuild, StoresAnEmptyValueWhenTheFirstFigureCannotBeHad)
 {
     standIns().failing = {"getProcessCount"};
     build();
-    EXPECT_EQ(stored(144).getKind(), PropertyValue::EmptyKind);
-    EXPECT_TRUE(stored(144).getFlag());
-    EXPECT_EQ(stored(149).getNumber(), 1490);
+    EXPECT_EQ(stored(144), "empty  true");
+    EXPECT_EQ(stored(149), "number 1490 true");
 }
 
 TEST_F(OsNodeBuild, SeedsWithTheNodesOwnReads)
@@ -293,7 +251,7 @@ TEST_F(OsNodeBuild, WritesTheTimesInLocalTime)
     Recording const log;
     build();
     EXPECT_TRUE(log.has("LastBootTime = Wed May 12 12:23:45 2010\n", 3000));
-    EXPECT_EQ(stored(141).getNumber(), 1273659825);
+    EXPECT_EQ(stored(141), "date 1273659825 true");
 }
 
 class OsNodeRead : public OsNodeBuild
@@ -304,15 +262,12 @@ protected:
         standIns().calls.clear();
     }
 
-    /** The value that a read leaves behind, by a caller whose value said "before". */
-    PropertyValue read(unsigned int id)
+    /** What a read leaves behind, by a caller whose value said "before". */
+    std::string read(unsigned int id)
     {
         PropertyValue value("before", false);
-        Error const error = node_.getProperty(id, value);
-        EXPECT_EQ(error.getStatus(), 0U);
-        EXPECT_EQ(static_cast<std::string>(error),
-                  static_cast<std::string>(Error(0, IC::Number(IC::Number::EmptyKind), "")));
-        return value;
+        EXPECT_EQ(static_cast<std::string>(node_.getProperty(id, value)), "status 0");
+        return shown(value);
     }
 
     Node& node_;
@@ -333,10 +288,7 @@ TEST_F(OsNodeRead, AsksAfreshForEveryLiveFigure)
         standIns().calls.clear();
         for (unsigned int const figure : {0U, 17U, 0xFFFFFFFFU}) {
             standIns().numbers[live.getter] = figure;
-            PropertyValue const value = read(live.id);
-            EXPECT_EQ(value.getKind(), PropertyValue::NumberKind) << live.getter;
-            EXPECT_EQ(value.getNumber(), figure) << live.getter;
-            EXPECT_TRUE(value.getFlag()) << live.getter;
+            EXPECT_EQ(read(live.id), "number " + std::to_string(figure) + " true") << live.getter;
         }
         EXPECT_EQ(standIns().calls, std::vector<std::string>(3, live.getter));
     }
@@ -346,35 +298,30 @@ TEST_F(OsNodeRead, DoesNotStoreALiveFigure)
 {
     standIns().numbers["getProcessCount"] = 17;
     read(144);
-    EXPECT_EQ(stored(144).getNumber(), 1440);
+    EXPECT_EQ(stored(144), "number 1440 true");
 }
 
 TEST_F(OsNodeRead, AnswersALiveFigureWhateverWasStoredInItsPlace)
 {
     EXPECT_EQ(node_.setProperty(144, PropertyValue("stored", true)).getStatus(), 0U);
-    EXPECT_EQ(read(144).getNumber(), 1440);
-    EXPECT_EQ(static_cast<std::string>(stored(144)), "stored");
+    EXPECT_EQ(read(144), "number 1440 true");
+    EXPECT_EQ(stored(144), "text stored true");
 }
 
 TEST_F(OsNodeRead, SucceedsAndLeavesTheCallersValueWhenALiveFigureCannotBeHad)
 {
     for (Live const& live : liveProperties) {
         standIns().failing = {live.getter};
-        PropertyValue const value = read(live.id);
-        EXPECT_EQ(static_cast<std::string>(value), "before") << live.getter;
-        EXPECT_FALSE(value.getFlag()) << live.getter;
+        EXPECT_EQ(read(live.id), "text before false") << live.getter;
     }
 }
 
 TEST_F(OsNodeRead, AnswersZeroForTheClearCommandWhateverWasStored)
 {
-    EXPECT_FALSE(isSet(191));
+    EXPECT_EQ(stored(191), "unset");
     for (unsigned int const written : {9U, 1U}) {
         interface_.osNode_->IC::MutableNode::setProperty(191, {IC::Number(written), true});
-        PropertyValue const value = read(191);
-        EXPECT_EQ(value.getKind(), PropertyValue::NumberKind);
-        EXPECT_EQ(value.getNumber(), 0);
-        EXPECT_TRUE(value.getFlag());
+        EXPECT_EQ(read(191), "number 0 true");
     }
 }
 
@@ -387,20 +334,16 @@ TEST_F(OsNodeRead, AnswersEveryOtherPropertyFromTheStore)
         if (live)
             continue;
         standIns().calls.clear();
-        PropertyValue const answer = read(id);
-        EXPECT_EQ(answer.getKind(), value.getKind()) << id;
-        EXPECT_EQ(answer.getFlag(), value.getFlag()) << id;
-        EXPECT_EQ(static_cast<std::string>(answer), static_cast<std::string>(value)) << id;
+        EXPECT_EQ(read(id), shown(value)) << id;
         EXPECT_TRUE(standIns().calls.empty()) << id;
     }
 }
 
 TEST_F(OsNodeRead, AnswersTheRequestedStateAsWritten)
 {
-    EXPECT_EQ(static_cast<unsigned int>(read(123)), 1U);
+    EXPECT_EQ(read(123), "enumeration 1 false");
     node_.setProperty(123, PropertyValue(IC::EnumValue(5U), true));
-    EXPECT_EQ(static_cast<unsigned int>(read(123)), 5U);
-    EXPECT_TRUE(read(123).getFlag());
+    EXPECT_EQ(read(123), "enumeration 5 true");
 }
 
 TEST_F(OsNodeRead, HandsBackTheFrameworksErrorForAnUnknownProperty)

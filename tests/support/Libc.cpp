@@ -132,6 +132,8 @@ void refuse(std::string const& command)
     };
 }
 
+HookGuard::HookGuard() = default;
+
 HookGuard::~HookGuard()
 {
     hooks() = {};

@@ -67,7 +67,7 @@ void refuse(std::string const& command);
 class HookGuard
 {
 public:
-    HookGuard() = default;
+    HookGuard();
     ~HookGuard();
     HookGuard(HookGuard const&) = delete;
     HookGuard& operator=(HookGuard const&) = delete;

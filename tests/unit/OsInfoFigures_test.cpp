@@ -69,9 +69,19 @@ TEST(OsInfoFixedValues, AreTheSameOnEveryMachine)
     EXPECT_EQ(kernel.calls, 0);
 }
 
+unsigned long& totalRam(Figures& figures)
+{
+    return figures.totalram;
+}
+
+unsigned long& freeRam(Figures& figures)
+{
+    return figures.freeram;
+}
+
 struct RamCase {
     NumberGetter get;
-    unsigned long Figures::*field;
+    unsigned long& (*field)(Figures& figures);
     char const* failure;
     char const* function;
 };
@@ -89,7 +99,7 @@ protected:
         // Every other field holds a figure that would show.
         kernel_.figures.totalram = kernel_.figures.freeram = 11 << 20;
         kernel_.figures.totalhigh = kernel_.figures.bufferram = 13 << 20;
-        kernel_.figures.*GetParam().field = amount;
+        GetParam().field(kernel_.figures) = amount;
         kernel_.figures.mem_unit = memoryUnit;
         return read(GetParam().get);
     }
@@ -99,10 +109,10 @@ protected:
 
 INSTANTIATE_TEST_SUITE_P(
     Of, OsInfoRam,
-    testing::Values(RamCase{&OsInfo::getPhysicalMemorySize, &Figures::totalram,
-                            "physicalMemorySize failed", "getPhysicalMemorySize"},
-                    RamCase{&OsInfo::getPhysicalMemoryFree, &Figures::freeram,
-                            "physicalMemoryFree failed", "getPhysicalMemoryFree"}),
+    testing::Values(RamCase{&OsInfo::getPhysicalMemorySize, totalRam, "physicalMemorySize failed",
+                            "getPhysicalMemorySize"},
+                    RamCase{&OsInfo::getPhysicalMemoryFree, freeRam, "physicalMemoryFree failed",
+                            "getPhysicalMemoryFree"}),
     [](auto const& test) { return std::string(test.param.function); });
 
 TEST_P(OsInfoRam, IsCountedInKibibytesWhenTheUnitIsOneByte)

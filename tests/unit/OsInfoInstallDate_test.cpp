@@ -19,6 +19,7 @@ constexpr char const* suseCommand = "stat /etc/SuSE-release | grep Change";
 constexpr char const* unitedLinuxCommand = "stat /etc/UnitedLinux-release | grep Change";
 constexpr char const* redhatCommand = "stat /etc/redhat-release | grep Change";
 
+constexpr long hour = 3600;
 constexpr long may2010 = 1273659825; // 12 May 2010 10:23:45 UTC
 
 class InstallDate : public testing::Test
@@ -63,7 +64,7 @@ TEST_F(InstallDate, IsTheReleaseFilesLastStatusChange)
 TEST_F(InstallDate, IsReadAsLocalTimeWhateverTheZoneOffsetSays)
 {
     setenv("TZ", "CET-1CEST,M3.5.0,M10.5.0/3", 1);
-    EXPECT_EQ(dateOf("Change: 2010-05-12 10:23:45.999999999 +0900\n"), may2010 - 2 * 3600);
+    EXPECT_EQ(dateOf("Change: 2010-05-12 10:23:45.999999999 +0900\n"), may2010 - 2 * hour);
     EXPECT_EQ(dateOf("Change: 2010-01-12 10:23:45.000000000 -0500\n"), 1263291825 - 3600);
 }
 

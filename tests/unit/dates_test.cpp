@@ -28,7 +28,8 @@ time_t named(int year, std::string month, int day, int hour, int minute, int sec
     return NQ::to_time_t(year, month.data(), day, 0, hour, minute, second, isdst);
 }
 
-constexpr time_t day = 24 * 60 * 60;
+constexpr time_t hour = 3600;
+constexpr time_t day = 24 * hour;
 
 TEST(ToTimeT, ConvertsTheLastSecondOfAYear)
 {
@@ -39,7 +40,7 @@ TEST(ToTimeT, ConvertsTheLastSecondOfAYear)
 TEST(ToTimeT, ReadsTheFieldsAsLocalTime)
 {
     useZone(newYork);
-    EXPECT_EQ(named(2008, "Dec", 31, 23, 59, 59), 1230767999 + 5 * 3600);
+    EXPECT_EQ(named(2008, "Dec", 31, 23, 59, 59), 1230767999 + 5 * hour);
     useZone(centralEurope);
     EXPECT_EQ(named(2008, "Dec", 31, 23, 59, 59), 1230767999 - 3600);
 }
@@ -120,7 +121,7 @@ TEST(ToTimeT, TakesNoNoticeOfTheWeekday)
 TEST(ToTimeT, LetsTheSystemDecideOnSummerTimeWhenTheFlagIsNegative)
 {
     useZone(centralEurope);
-    EXPECT_EQ(named(2010, "May", 12, 10, 23, 45, -1), 1273659825 - 2 * 3600);
+    EXPECT_EQ(named(2010, "May", 12, 10, 23, 45, -1), 1273659825 - 2 * hour);
     EXPECT_EQ(named(2010, "Jan", 12, 10, 23, 45, -1), 1263291825 - 3600);
 }
 

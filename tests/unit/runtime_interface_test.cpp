@@ -94,7 +94,7 @@ private:
 class RuntimeInterface : public testing::Test
 {
 protected:
-    ~RuntimeInterface() override
+    void TearDown() override
     {
         interface_.unload();
     }

@@ -150,8 +150,8 @@ TEST_F(UserNodes, HoldTheSystemsValuesForEmptyAgeingFields)
 Texts setUp()
 {
     Texts calls{"setStatus(1)", "setDescription(User Account)"};
-    for (unsigned int const id : {123, 125, 108, 109, 89,  90,  311, 312, 158, 159, 117, 120,
-                                  163, 162, 161, 44,  118, 119, 113, 91,  160, 106, 138, 51})
+    for (int const id : {123, 125, 108, 109, 89,  90,  311, 312, 158, 159, 117, 120,
+                         163, 162, 161, 44,  118, 119, 113, 91,  160, 106, 138, 51})
         calls.push_back("setProperty(" + std::to_string(id) + ")");
     return calls;
 }

@@ -254,8 +254,9 @@ TEST_F(UserWrite, OfADeletionPassesTheUidThroughWideText)
 
 TEST_F(UserWrite, OfAnyOtherPropertyIsOnlyStored)
 {
-    for (unsigned int const id : {123, 125, 108, 109, 89,  90,  311, 312, 158, 159, 120,
-                                  163, 162, 161, 44,  119, 113, 160, 106, 51,  74,  4711})
+    for (unsigned int const id :
+         {123U, 125U, 108U, 109U, 89U,  90U,  311U, 312U, 158U, 159U, 120U,
+          163U, 162U, 161U, 44U,  119U, 113U, 160U, 106U, 51U,  74U,  4711U})
         write(id, NODES::text("1"));
     EXPECT_EQ(commands.ran, Texts{});
     EXPECT_FALSE(std::filesystem::exists("usrandpwd"));

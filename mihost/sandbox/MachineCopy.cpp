@@ -24,10 +24,10 @@ namespace
 std::string const stage = "/run";
 std::string const copyRoot = stage + "/copy";
 
-void mountAt(std::string const& path, char const* source, char const* type, unsigned long flags,
+void mountAt(std::string const& path, char const* type, unsigned long flags,
              std::string const& options)
 {
-    check(mount(source, path.c_str(), type, flags, options.c_str()),
+    check(mount(type, path.c_str(), type, flags, options.c_str()),
           std::string("cannot mount ") + type + " at " + path);
 }
 
@@ -80,8 +80,9 @@ public:
         check(chown(upper.c_str(), status.st_uid, status.st_gid), "cannot set the owner of a copy");
         // Named by ".", the path needs no escaping. Device files are dead in the copy.
         check(chdir(path.c_str()), "cannot enter " + path);
-        mountAt(copyRoot + path, "overlay", "overlay", MS_NODEV,
-                "lowerdir=.,upperdir=" + upper + ",workdir=" + work);
+        std::string const options = "lowerdir=.,upperdir=" + upper + ",workdir=" + work;
+        check(mount("overlay", (copyRoot + path).c_str(), "overlay", MS_NODEV, options.c_str()),
+              "cannot overlay " + path);
     }
 
 private:
@@ -122,7 +123,7 @@ void addMount(std::string const& path, Overlays& overlays)
 void addDevices()
 {
     std::string const devices = copyRoot + "/dev";
-    mountAt(devices, "tmpfs", "tmpfs", MS_NOSUID, "mode=0755");
+    mountAt(devices, "tmpfs", MS_NOSUID, "mode=0755");
     for (char const* name : {"null", "zero", "full", "random", "urandom", "tty"}) {
         std::string const place = devices + "/" + name;
         Descriptor const file(check(open(place.c_str(), O_CREAT | O_WRONLY | O_CLOEXEC, 0600),
@@ -140,16 +141,16 @@ void addDevices()
         check(symlink(link.target, (devices + "/" + link.name).c_str()),
               std::string("cannot make /dev/") + link.name);
     makeFolder(devices + "/pts", 0755);
-    mountAt(devices + "/pts", "devpts", "devpts", MS_NOSUID | MS_NOEXEC,
+    mountAt(devices + "/pts", "devpts", MS_NOSUID | MS_NOEXEC,
             "newinstance,ptmxmode=0666,mode=0620,gid=5");
     makeFolder(devices + "/shm", 01777);
-    mountAt(devices + "/shm", "tmpfs", "tmpfs", MS_NOSUID | MS_NODEV, "mode=1777");
+    mountAt(devices + "/shm", "tmpfs", MS_NOSUID | MS_NODEV, "mode=1777");
 }
 
 void addKernelFileSystems()
 {
     std::string const processes = copyRoot + "/proc";
-    mountAt(processes, "proc", "proc", MS_NOSUID | MS_NODEV | MS_NOEXEC, "");
+    mountAt(processes, "proc", MS_NOSUID | MS_NODEV | MS_NOEXEC, "");
     // Writing to these would reach the machine itself.
     for (char const* name : {"acpi", "bus", "fs", "irq", "scsi", "sys", "sysrq-trigger"}) {
         std::string const path = processes + "/" + name;
@@ -180,7 +181,7 @@ void enterMachineCopy()
     std::vector<std::string> const mounts = mountsToCopy(readText("/proc/self/mountinfo"));
 
     check(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr), "cannot keep mounts private");
-    mountAt(stage, "tmpfs", "tmpfs", MS_NODEV, "mode=0700");
+    mountAt(stage, "tmpfs", MS_NODEV, "mode=0700");
     makeFolder(copyRoot, 0755);
     Overlays overlays;
     overlays.add("/");
@@ -190,7 +191,7 @@ void enterMachineCopy()
         makeFolder(copyRoot + name, 0755);
     addKernelFileSystems();
     addDevices();
-    mountAt(copyRoot + "/run", "tmpfs", "tmpfs", MS_NOSUID | MS_NODEV, "mode=0755");
+    mountAt(copyRoot + "/run", "tmpfs", MS_NOSUID | MS_NODEV, "mode=0755");
     makeRoot(copyRoot);
     if (chdir(workingDirectory.c_str()) != 0)
         check(chdir("/"), "cannot enter the copy");

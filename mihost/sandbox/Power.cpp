@@ -24,6 +24,7 @@ constexpr unsigned int machinePrivileges[] = {
     CAP_SYS_TIME,   // set the clock
     CAP_SYS_RAWIO,  // ports and memory of the hardware
     CAP_MKNOD,      // a device file of one's own making
+    CAP_NET_ADMIN,  // interfaces, routes, packet filters: the network is the machine's
 };
 
 char const* const notes = "/run/power-commands";

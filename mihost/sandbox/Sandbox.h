@@ -24,7 +24,7 @@ struct SandboxOptions {
  *
  * The copy has its own mounts, processes, IPC objects and host name; a fresh /proc, an empty /run,
  * a /dev with the harmless devices only and a read-only /sys. Powering off, loading modules,
- * setting the clock and reaching hardware are not permitted there, and the power commands are
+ * setting the clock, changing the network and reaching hardware are not permitted there, and the power commands are
  * replaced by one that only says what it would do. This guards against what commands do by their
  * nature; it is no prison for hostile ones.
  *

@@ -112,7 +112,7 @@ TEST_P(Privilege, IsGoneFromEverySet)
 
 INSTANTIATE_TEST_SUITE_P(All, Privilege,
                          testing::Values(CAP_SYS_BOOT, CAP_SYS_MODULE, CAP_SYS_TIME, CAP_SYS_RAWIO,
-                                         CAP_MKNOD));
+                                         CAP_MKNOD, CAP_NET_ADMIN));
 
 TEST(Copy, LetsRootAdministerItAllTheSame)
 {

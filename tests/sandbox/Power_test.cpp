@@ -1,6 +1,7 @@
 // Halting and restarting, against a command that only notes it.
 
 #include "mihost/sandbox/Sandbox.h"
+#include "nodes/ids.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -50,6 +51,71 @@ TEST_F(Power, StatusResetRestartsTheMachine)
     EXPECT_TRUE(call("_ZN2NQ6OsInfo11statusResetEv"));
     expectRan("/sbin/shutdown -r now");
     EXPECT_EQ(recording.texts(4000), Lines{"Reboot after shutdown."});
+}
+
+/** The operating-system node of a plain machine, nothing recorded yet. */
+class PowerRequest : public Power
+{
+protected:
+    PowerRequest()
+    {
+        machine::lay("plain");
+        plugin.initialize();
+        machine::forget();
+        recording.clear();
+    }
+
+    IC::MutableNode& os()
+    {
+        return plugin.node(NODES::operatingSystemType);
+    }
+
+    unsigned char request(IC::PropertyValue const& value)
+    {
+        return os().setProperty(NODES::requestedState, value).getStatus();
+    }
+};
+
+TEST_F(PowerRequest, OfTwelveHaltsTheMachineAndIsStored)
+{
+    EXPECT_EQ(request({IC::EnumValue(12U), true}), 0);
+    expectRan("/sbin/shutdown -h now");
+    EXPECT_EQ(text(os(), NODES::requestedState), "12");
+    EXPECT_EQ(recording.texts(4000), Lines{"Halt after shutdown."});
+}
+
+TEST_F(PowerRequest, OfNineRestartsTheMachineAndIsStored)
+{
+    EXPECT_EQ(request({IC::EnumValue(9U), true}), 0);
+    expectRan("/sbin/shutdown -r now");
+    EXPECT_EQ(text(os(), NODES::requestedState), "9");
+    EXPECT_EQ(recording.texts(4000), Lines{"Reboot after shutdown."});
+}
+
+TEST_F(PowerRequest, MayBeANumberOrAText)
+{
+    EXPECT_EQ(request({IC::Number(12U), true}), 0);
+    EXPECT_EQ(request({"9", true}), 0);
+    EXPECT_EQ(machine::ran(), (Lines{"/sbin/shutdown -h now", "/sbin/shutdown -r now"}));
+}
+
+TEST_F(PowerRequest, OfAnyOtherNumberIsStoredOnly)
+{
+    for (unsigned int const number : {0U, 1U, 5U, 8U, 10U, 11U, 13U, 4294967295U}) {
+        EXPECT_EQ(request({IC::EnumValue(number), true}), 0);
+        EXPECT_EQ(text(os(), NODES::requestedState), std::to_string(number));
+    }
+    EXPECT_EQ(machine::ran(), Lines());
+    EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
+    EXPECT_EQ(recording.texts(4000), Lines());
+}
+
+TEST_F(PowerRequest, IsStoredAlsoWhereThereIsNoShutdownCommand)
+{
+    machine::remove("/sbin/shutdown");
+    EXPECT_EQ(request({IC::EnumValue(12U), true}), 0);
+    EXPECT_EQ(machine::ran(), Lines{"/sbin/shutdown -h now"});
+    EXPECT_EQ(text(os(), NODES::requestedState), "12");
 }
 
 } // namespace

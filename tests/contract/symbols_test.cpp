@@ -1,0 +1,66 @@
+// What the library wants of its host and what it gives, against the lists beside this file.
+//
+// To write the lists anew, on purpose only: script/symbols --update
+
+#include "tests/support/Program.h"
+
+#include <algorithm>
+#include <fstream>
+#include <gtest/gtest.h>
+#include <iterator>
+#include <sstream>
+
+namespace
+{
+
+using Names = std::vector<std::string>;
+
+Names linesOf(std::istream&& in)
+{
+    Names lines;
+    for (std::string line; std::getline(in, line);)
+        lines.push_back(line);
+    return lines;
+}
+
+class Symbols : public testing::TestWithParam<char const*>
+{
+protected:
+    static Names inTheLibrary()
+    {
+        Outcome const outcome = runToEnd({TESTS_DIR "/../script/symbols", GetParam(), PLUGIN_FILE});
+        EXPECT_EQ(outcome.code, 0) << outcome.err;
+        return linesOf(std::istringstream(outcome.out));
+    }
+
+    static Names listed()
+    {
+        std::string const file = std::string(TESTS_DIR "/contract/") + GetParam() + "_symbols.txt";
+        return linesOf(std::ifstream(file));
+    }
+
+    /** Those of the one list that the other lacks; both are sorted. */
+    static Names missing(Names const& from, Names const& in)
+    {
+        Names found;
+        std::set_difference(from.begin(), from.end(), in.begin(), in.end(),
+                            std::back_inserter(found));
+        return found;
+    }
+};
+
+TEST_P(Symbols, OfTheLibraryAreAllListed)
+{
+    EXPECT_EQ(missing(inTheLibrary(), listed()), Names());
+}
+
+TEST_P(Symbols, ThatAreListedAreAllInTheLibrary)
+{
+    ASSERT_FALSE(listed().empty());
+    EXPECT_EQ(missing(listed(), inTheLibrary()), Names());
+}
+
+INSTANTIATE_TEST_SUITE_P(Lists, Symbols, testing::Values("undefined", "exported"),
+                         [](auto const& list) { return std::string(list.param); });
+
+} // namespace

@@ -1,0 +1,111 @@
+// Every logger call from the opening of the library to its unload, on one machine.
+//
+// To write the expected file anew, on purpose only: script/expected-log
+
+#include "tests/support/Machine.h"
+#include "tests/support/Plugin.h"
+#include "tests/support/Recording.h"
+
+#include <cstdlib>
+#include <gtest/gtest.h>
+#include <regex>
+#include <unistd.h>
+
+namespace
+{
+
+char const* const expectedFile = TESTS_DIR "/sandbox/expected/suse.log";
+
+/** Level, category, file, function and text, one call a line. */
+std::string line(LogRecord const& record)
+{
+    std::string text = std::to_string(record.level) + ' ' + record.category + ' ' + record.file +
+                       ' ' + record.function + " | ";
+    for (char const character : record.text) {
+        if (character == '\n')
+            text += "\\n";
+        else if (character == '\t')
+            text += "\\t";
+        else
+            text += character;
+    }
+    return text;
+}
+
+/** The two times that a run tells give way to a word, so long as they look like times. */
+std::string withoutTimes(std::string const& text)
+{
+    static std::regex const time(
+        "((LastBootTime|InstallDate) = )"
+        "[A-Z][a-z]{2} [A-Z][a-z]{2} [ 0-9][0-9] [0-9]{2}:[0-9]{2}:[0-9]{2} [0-9]{4}");
+    return std::regex_replace(text, time, "$1<time>");
+}
+
+bool areTheSame(LogRecord const& one, LogRecord const& other)
+{
+    return one.function == other.function && one.file == other.file && one.line == other.line &&
+           one.category == other.category && one.level == other.level && one.text == other.text;
+}
+
+/** What a whole run said, each call once, its two operations having agreed. */
+std::vector<std::string> saidByAWholeRun()
+{
+    Recording recording;
+    {
+        Plugin plugin;
+        plugin.initialize();
+        plugin.unload();
+    }
+    std::vector<LogRecord> const records = recording.records();
+    std::vector<std::string> lines;
+    for (std::size_t at = 0; at + 1 < records.size(); at += 2) {
+        LogRecord const& log = records[at];
+        LogRecord const& trace = records[at + 1];
+        EXPECT_FALSE(log.trace);
+        EXPECT_TRUE(trace.trace);
+        EXPECT_TRUE(areTheSame(log, trace)) << line(log) << '\n' << line(trace);
+        for (LogRecord const& record : {log, trace}) {
+            EXPECT_TRUE(record.extraIsNull);
+            EXPECT_EQ(record.first, 0);
+            EXPECT_EQ(record.second, 0);
+            EXPECT_GT(record.line, 0);
+        }
+        lines.push_back(withoutTimes(line(log)));
+    }
+    EXPECT_EQ(records.size() % 2, 0U);
+    return lines;
+}
+
+std::vector<std::string> linesOf(std::string const& text)
+{
+    std::vector<std::string> lines;
+    std::istringstream in(text);
+    for (std::string next; std::getline(in, next);)
+        lines.push_back(next);
+    return lines;
+}
+
+/** The copy's files are gone after the test; a descriptor handed to it leads out of the copy. */
+bool wroteToTheDescriptorAskedFor(std::vector<std::string> const& lines)
+{
+    char const* const descriptor = std::getenv("MI_EXPECTED_LOG_TO");
+    if (!descriptor)
+        return false;
+    std::string text;
+    for (std::string const& next : lines)
+        text += next + '\n';
+    EXPECT_EQ(write(std::atoi(descriptor), text.data(), text.size()),
+              static_cast<ssize_t>(text.size()));
+    return true;
+}
+
+TEST(LogSequence, OfAWholeRunIsExactlyTheExpectedOne)
+{
+    machine::lay("suse");
+    std::vector<std::string> const said = saidByAWholeRun();
+    if (wroteToTheDescriptorAskedFor(said))
+        return;
+    EXPECT_EQ(said, linesOf(machine::read(expectedFile)));
+}
+
+} // namespace

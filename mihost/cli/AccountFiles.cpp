@@ -16,7 +16,7 @@ struct File {
 
 constexpr File files[] = {
     {"/etc/passwd", false},
-    {"/etc/shadow", true},
+    {shadowFile, true},
     {"/etc/group", false},
     {"/etc/gshadow", true},
 };

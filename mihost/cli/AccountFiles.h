@@ -10,6 +10,8 @@
 namespace mihost
 {
 
+constexpr char shadowFile[] = "/etc/shadow";
+
 /** The lines of the files that hold the accounts, by path. Files that cannot be read are empty. */
 using AccountFiles = std::map<std::string, std::vector<std::string>>;
 

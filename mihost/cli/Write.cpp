@@ -6,6 +6,7 @@
 #include "mihost/cli/Interrupts.h"
 #include "mihost/runtime/Text.h"
 #include "mihost/sandbox/Sandbox.h"
+#include "nodes/ids.h"
 
 #include <fmt/format.h>
 #include <sstream>
@@ -21,6 +22,7 @@ using commandTap::RunCommand;
 struct Result {
     IC::Error error;
     std::vector<RunCommand> commands;
+    AccountFiles accounts; // as they are afterwards
     std::vector<FileChange> changes;
     std::string complaints; // what the commands wrote to their standard error
 };
@@ -31,11 +33,12 @@ Result perform(Write const& write, Secrets secrets)
     commandTap::Recording const recording;
     commandTap::takeStandardError();
     AccountFiles const before = readAccountFiles();
-    Result result{write.node.setProperty(write.property, write.value), {}, {}, {}};
+    Result result{write.node.setProperty(write.property, write.value), {}, {}, {}, {}};
     for (RunCommand const& command : recording.commands())
         result.commands.push_back({withoutSecret(command.line, write.secret),
                                    withoutSecret(command.output, write.secret)});
-    result.changes = changesBetween(before, readAccountFiles(), secrets);
+    result.accounts = readAccountFiles();
+    result.changes = changesBetween(before, result.accounts, secrets);
     result.complaints = withoutSecret(commandTap::takeStandardError(), write.secret);
     return result;
 }
@@ -75,12 +78,22 @@ Json documentOf(Result const& result)
     return document;
 }
 
+/** One line of a command's output; tabs stay, since they lay it out. */
+std::string shown(std::string const& line)
+{
+    std::string text;
+    std::size_t start = 0;
+    for (std::size_t tab = 0; (tab = line.find('\t', start)) != std::string::npos; start = tab + 1)
+        text += printable(line.substr(start, tab - start)) + '\t';
+    return text + printable(line.substr(start));
+}
+
 void writeText(Result const& result, Output& out)
 {
     for (RunCommand const& command : result.commands) {
         out.line("ran  " + printable(command.line));
         for (std::string const& line : linesOf(command.output))
-            out.line("     " + printable(line));
+            out.line("     " + shown(line));
     }
     for (FileChange const& change : result.changes) {
         out.line(change.file);
@@ -101,6 +114,23 @@ std::string lastWords(std::vector<RunCommand> const& commands)
                 return line;
     }
     return "";
+}
+
+void warnOfPlainPassword(AccountFiles const& accounts, std::string const& password)
+{
+    auto const shadow = accounts.find(shadowFile);
+    if (password.empty() || shadow == accounts.end())
+        return;
+    for (std::string const& line : shadow->second) {
+        std::size_t const first = line.find(':');
+        std::size_t const second = line.find(':', first + 1);
+        if (first != std::string::npos && line.substr(first + 1, second - first - 1) == password)
+            fmt::print(stderr,
+                       "mihost: the password of '{}' now stands in {} as it is and opens nothing: "
+                       "/usr/bin/passwd here does not take passwords from a pipe; set it with "
+                       "passwd\n",
+                       printable(line.substr(0, first)), shadowFile);
+    }
 }
 
 bool endsWord(char character)
@@ -139,6 +169,8 @@ void carryOut(Session& session, Write const& write)
     session.out().flush();
     for (std::string const& line : linesOf(result.complaints))
         fmt::print(stderr, "mihost: a command said: {}\n", printable(line));
+    if (write.property == NODES::createUser)
+        warnOfPlainPassword(result.accounts, write.secret);
     if (result.error.getStatus() == 0)
         return;
     std::string const reason = lastWords(result.commands);

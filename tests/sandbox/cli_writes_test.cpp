@@ -1,0 +1,255 @@
+// What the program writes really happens, and nothing that it refuses does.
+
+#include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+#include <sstream>
+
+namespace
+{
+
+using Json = nlohmann::ordered_json;
+using Lines = std::vector<std::string>;
+
+constexpr char hash[] = "$6$saltsalt$hashhashhash";
+
+/** A machine with the account jdoe. */
+void makeMachine()
+{
+    machine::lay("plain");
+    ASSERT_EQ(std::system("/usr/sbin/useradd -M -s /bin/sh -c 'J. Doe' jdoe"), 0);
+}
+
+bool stands(std::string const& text, std::string const& part)
+{
+    return text.find(part) != std::string::npos;
+}
+
+TEST(MihostCall, RunsTheMethodAndAnswersAsJson)
+{
+    machine::lay("plain");
+    machine::recordShell();
+    Outcome const outcome =
+        mihostRun({"--json", "call", "UserAdd", "UserName=jdoe", "Comment=John Smith"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.err, "");
+    EXPECT_EQ(Json::parse(outcome.out).dump(), R"({"status":0,"text":""})");
+    EXPECT_EQ(machine::entry("/etc/passwd", "jdoe").at(4), "John Smith");
+    Lines const ran = machine::ran();
+    EXPECT_NE(std::find(ran.begin(), ran.end(),
+                        "/usr/sbin/useradd jdoe -c John\\ Smith 2>&1;echo rc=$? 2>&1"),
+              ran.end());
+}
+
+TEST(MihostCall, ExitsWith1AndTellsWhatTheCommandSaidWhereItFails)
+{
+    machine::lay("plain");
+    Outcome const outcome = mihostRun({"--json", "call", "UserDel", "UserName=nobody-here"});
+    EXPECT_EQ(outcome.code, 1);
+    EXPECT_EQ(outcome.out, "{\"status\":1,\"text\":\"\"}\n");
+    EXPECT_EQ(outcome.err, "mihost: the plug-in answered status 1; a command said: userdel: user "
+                           "'nobody-here' does not exist\n");
+}
+
+TEST(MihostCall, RefusesWhatAShellWouldActOnBeforeThePluginSeesIt)
+{
+    machine::lay("plain");
+    machine::recordShell();
+    for (char const* word : {"UserName=a;reboot", "UserName=$(reboot)", "UserName=`reboot`",
+                             "UserName=a\nreboot", "UserName=a,b", "UserName=a:b"}) {
+        Outcome const outcome = mihostRun({"call", "UserDel", word});
+        EXPECT_EQ(outcome.code, 2) << word;
+        EXPECT_TRUE(stands(outcome.err, "UserName holds ")) << outcome.err;
+    }
+    EXPECT_EQ(machine::ran(), Lines());
+}
+
+TEST(MihostCall, DeletesRootOnlyWhenTold)
+{
+    machine::lay("plain");
+    machine::fake("/usr/sbin/userdel", "echo \"$@\" >/tmp/deleted\n");
+    EXPECT_EQ(mihostRun({"call", "UserDel", "UserName=root"}).code, 2);
+    EXPECT_FALSE(std::filesystem::exists("/tmp/deleted"));
+    EXPECT_EQ(mihostRun({"--yes", "call", "UserDel", "UserName=root"}).code, 0);
+    EXPECT_EQ(machine::read("/tmp/deleted"), "root\n");
+}
+
+TEST(MihostPasswords, ComeFromStandardInputAndShowNowhere)
+{
+    makeMachine();
+    Outcome const outcome = mihostRun(
+        {"--trace", "/tmp/trace", "call", "UserSetPassword", "UserName=jdoe", "Password=-"},
+        "geheim42\nnext line\n");
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_FALSE(stands(outcome.out + outcome.err, "geheim42"));
+    EXPECT_FALSE(stands(machine::read("/tmp/trace"), "geheim42"));
+    EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), "geheim42"); // no crypt without passwd
+}
+
+TEST(MihostPasswords, ThatStandInTheShadowFileAsTheyAreAreWarnedOf)
+{
+    makeMachine();
+    machine::fake("/usr/bin/passwd", "exit 1\n");
+    Outcome const plain =
+        mihostRun({"call", "UserSetPassword", "UserName=jdoe", "Password=-"}, "geheim42\n");
+    EXPECT_EQ(plain.err, "mihost: the password of 'jdoe' now stands in /etc/shadow as it is and "
+                         "opens nothing: /usr/bin/passwd here does not take passwords from a pipe; "
+                         "set it with passwd\n");
+    // As it is where passwd takes one.
+    machine::fake("/usr/bin/passwd", "read password\n"
+                                     "echo \"$1:$password\" | /usr/sbin/chpasswd -c SHA512\n");
+    Outcome const good =
+        mihostRun({"call", "UserSetPassword", "UserName=jdoe", "Password=-"}, "geheim42\n");
+    EXPECT_EQ(good.err, "");
+    EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1).substr(0, 3), "$6$");
+}
+
+TEST(MihostPasswords, AreRefusedWhereStandardInputHoldsNone)
+{
+    makeMachine();
+    Outcome const outcome =
+        mihostRun({"call", "UserSetPassword", "UserName=jdoe", "Password=-"}, "");
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_EQ(outcome.err, "mihost: Password: standard input holds no line\n");
+}
+
+TEST(MihostSet, SetsAPasswordHashFromStandardInput)
+{
+    makeMachine();
+    Outcome const outcome =
+        mihostRun({"set", "user:jdoe", "password", "-"}, std::string(hash) + "\n");
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.out + outcome.err, "");
+    EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), hash);
+}
+
+TEST(MihostSet, TakesNoPlainPasswordForAHash)
+{
+    makeMachine();
+    Outcome const outcome = mihostRun({"set", "user:jdoe", "password", "-"}, "geheim42\n");
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_FALSE(stands(outcome.err, "geheim42"));
+    EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), "!");
+}
+
+TEST(MihostSet, WritesADayThatThePasswordExpiresOn)
+{
+    makeMachine();
+    ASSERT_EQ(std::system("chage -d 2020-01-01 -M 99999 jdoe"), 0);
+    EXPECT_EQ(mihostRun({"set", "user:jdoe", "password-expiration", "2020-01-31"}).code, 0);
+    EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(4), "30");
+}
+
+TEST(MihostSet, RefusesADateThatIsNoneWithTheFormThatIsRight)
+{
+    makeMachine();
+    Outcome const outcome = mihostRun({"set", "user:jdoe", "password-expiration", "31.01.2020"});
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_TRUE(stands(outcome.err, "YYYY-MM-DD")) << outcome.err;
+}
+
+TEST(MihostSet, DeletesAnAccountOnlyWhenTold)
+{
+    makeMachine();
+    machine::fake("/usr/sbin/userdel", "echo \"$@\" >/tmp/deleted\n");
+    Outcome const outcome = mihostRun({"set", "user:jdoe", "delete", "true"});
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_EQ(outcome.err, "mihost: to delete the account jdoe and its home directory needs --yes, "
+                           "since there is no terminal to ask\n");
+    EXPECT_FALSE(std::filesystem::exists("/tmp/deleted"));
+    EXPECT_EQ(mihostRun({"set", "user:jdoe", "delete", "false"}).code, 0);
+    EXPECT_FALSE(std::filesystem::exists("/tmp/deleted"));
+    EXPECT_EQ(mihostRun({"--yes", "set", "user:jdoe", "delete", "true"}).code, 0);
+    EXPECT_EQ(machine::read("/tmp/deleted"),
+              "-r " + machine::entry("/etc/passwd", "jdoe").at(2) + "\n");
+}
+
+TEST(MihostSet, RunsNothingForAnAccountWhoseNameAShellWouldActOn)
+{
+    makeMachine();
+    machine::write("/etc/passwd",
+                   machine::read("/etc/passwd") + "a$(touch /tmp/ran):x:1500:1500::/:/bin/sh\n");
+    for (Lines const& write : {Lines{"password-expiration", "2030-01-01"},
+                               Lines{"inactive-time", "2030-01-01"}, Lines{"password", hash}}) {
+        Outcome const outcome = mihostRun({"set", "user:a$(touch /tmp/ran)", write[0], write[1]});
+        EXPECT_EQ(outcome.code, 2) << write[0];
+        EXPECT_TRUE(stands(outcome.err, "nothing is run for this account")) << outcome.err;
+    }
+    EXPECT_FALSE(std::filesystem::exists("/tmp/ran"));
+}
+
+TEST(MihostSet, RefusesANameForANodeThatAShellWouldActOn)
+{
+    makeMachine();
+    EXPECT_EQ(mihostRun({"set", "user:jdoe", "user-name", "a;reboot"}).code, 2);
+    EXPECT_EQ(mihostRun({"set", "user:jdoe", "108", "other"}).code, 0);
+}
+
+TEST(MihostSet, TakesAMethodCallApart)
+{
+    makeMachine();
+    Outcome const bad =
+        mihostRun({"set", "os", "create-user", "UserAdd,UserName:CMPI_string:$(reboot)"});
+    EXPECT_EQ(bad.code, 2);
+    Outcome const good =
+        mihostRun({"--json", "set", "os", "74", "LocalGroupAdd,GroupName:CMPI_string:crew"});
+    EXPECT_EQ(good.out, "{\"status\":0,\"text\":\"\"}\n");
+    EXPECT_EQ(machine::entry("/etc/group", "crew").at(0), "crew");
+}
+
+TEST(MihostSet, TellsWhatACommandComplainedAbout)
+{
+    makeMachine();
+    machine::fake("/usr/bin/chage", "echo 'chage: cannot open file' >&2\n");
+    Outcome const outcome = mihostRun({"set", "user:jdoe", "inactive-time", "2030-01-01"});
+    EXPECT_EQ(outcome.code, 0); // the plug-in does not look
+    EXPECT_EQ(outcome.err, "mihost: a command said: chage: cannot open file\n"
+                           "mihost: a command said: chage: cannot open file\n");
+}
+
+TEST(MihostRefresh, BuildsUserAndGroupNodesAnew)
+{
+    machine::lay("plain");
+    machine::write("/etc/login.defs",
+                   "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+    machine::write("/etc/passwd", "root:x:0:0::/root:/bin/sh\njdoe:x:1000:1000::/:/bin/sh\n");
+    machine::write("/etc/group", "root:x:0:\ncrew:x:1000:\n");
+    Outcome const outcome = mihostRun({"--trace", "/tmp/trace", "refresh"});
+    EXPECT_EQ(outcome.out, "2 users, 2 groups\n");
+    std::istringstream trace(machine::read("/tmp/trace"));
+    std::vector<std::string> seen;
+    for (std::string line; std::getline(trace, line);) {
+        Json const record = Json::parse(line);
+        if (record["op"] == "node-added" || record["op"] == "node-deleted")
+            seen.push_back(record["op"].get<std::string>() + " " +
+                           record["kind"].get<std::string>());
+    }
+    EXPECT_EQ(seen, (Lines{"node-deleted user", "node-deleted user", "node-added user",
+                           "node-added user", "node-deleted group", "node-deleted group",
+                           "node-added group", "node-added group"}));
+}
+
+TEST(MihostClearLog, EmptiesTheLogWhenTold)
+{
+    makeMachine();
+    machine::write("/var/log/messages", "Jan  2 03:04:05 line\n");
+    EXPECT_EQ(mihostRun({"--yes", "clear-log"}).out, "0 log entries\n");
+    EXPECT_EQ(machine::read("/var/log/messages"), "");
+}
+
+TEST(MihostPower, AsksTheMachineToRestartOrHaltWhenTold)
+{
+    makeMachine();
+    EXPECT_EQ(mihostRun({"--json", "--yes", "power", "restart"}).out,
+              "{\"status\":0,\"text\":\"\"}\n");
+    EXPECT_EQ(mihostRun({"--yes", "power", "halt"}).code, 0);
+    EXPECT_EQ(mihost::refusedPowerCommands(),
+              (Lines{"/sbin/shutdown -r now", "/sbin/shutdown -h now"}));
+}
+
+} // namespace

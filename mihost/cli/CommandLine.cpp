@@ -9,9 +9,8 @@
 namespace mihost
 {
 
-void CommandLine::parse(int argc, char** argv)
+void CommandLine::declare(CLI::App& app)
 {
-    CLI::App app("Loads the management-interface plug-in, shows its tree and drives it.", "mihost");
     app.fallthrough();
     app.set_help_all_flag("--help-all", "help for every command");
     app.set_version_flag("--version", "mihost " MIHOST_VERSION);
@@ -33,6 +32,12 @@ void CommandLine::parse(int argc, char** argv)
         all_.push_back(row.make());
         all_.back()->declare(*app.add_subcommand(row.name, row.summary));
     }
+}
+
+void CommandLine::parse(int argc, char** argv)
+{
+    CLI::App app("Loads the management-interface plug-in, shows its tree and drives it.", "mihost");
+    declare(app);
     try {
         app.parse(argc, argv);
     } catch (CLI::CallForHelp const&) {

@@ -11,6 +11,9 @@ namespace mihost
 class CommandLine
 {
 public:
+    /** Adds all options and commands. What the application is given then ends up here. */
+    void declare(CLI::App& app);
+
     /**
      * Prints help or the version where they are asked for; there is no command then.
      *

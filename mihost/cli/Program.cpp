@@ -1,8 +1,10 @@
 #include "mihost/cli/Program.h"
 
 #include "mihost/cli/CommandLine.h"
+#include "mihost/cli/Completion.h"
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/Interrupts.h"
+#include "mihost/cli/LocalNames.h"
 #include "mihost/cli/Session.h"
 #include "mihost/runtime/Text.h"
 
@@ -29,10 +31,22 @@ template <class Step> int guarded(Step step)
     }
 }
 
+/** What the completion scripts of shells run. Their words are no command line yet. */
+int answerShell(std::vector<std::string> const& words)
+{
+    return guarded([&words] {
+        Output out(stdout);
+        out.write(completionText(complete(words, localNames)));
+        out.flush();
+    });
+}
+
 } // namespace
 
 int runProgram(int argc, char** argv)
 {
+    if (argc > 1 && std::string_view(argv[1]) == "__complete")
+        return answerShell({argv + 2, argv + argc});
     // The code set is the user's; everything else, dates and numbers, stays as the plug-in expects.
     std::setlocale(LC_CTYPE, "");
     interrupts::install();

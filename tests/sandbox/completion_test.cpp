@@ -1,0 +1,65 @@
+#include "nodes/ids.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Plugin.h"
+#include "tests/support/Program.h"
+
+#include <algorithm>
+#include <gtest/gtest.h>
+#include <sstream>
+
+namespace
+{
+
+using Words = std::vector<std::string>;
+
+Words offered(std::string const& word)
+{
+    std::istringstream lines(mihostRun({"__complete", "get", word}).out);
+    std::string line;
+    std::getline(lines, line);
+    EXPECT_EQ(line, "words");
+    Words words;
+    while (std::getline(lines, line))
+        words.push_back(line);
+    return words;
+}
+
+Words shown(Plugin& plugin, unsigned int type, std::string const& before)
+{
+    Words words;
+    for (IC::MutableNode* const node : plugin.nodes(type))
+        words.push_back(before + text(*node, NODES::name));
+    return words;
+}
+
+class CompletionOn : public testing::TestWithParam<char const*>
+{
+};
+
+TEST_P(CompletionOn, OffersTheUsersAndGroupsOfTheTree)
+{
+    machine::lay(GetParam());
+    Plugin plugin;
+    plugin.initialize();
+    EXPECT_EQ(offered("user:"), shown(plugin, NODES::userType, "user:"));
+    EXPECT_EQ(offered("group:"), shown(plugin, NODES::groupType, "group:"));
+}
+
+INSTANTIATE_TEST_SUITE_P(Machines, CompletionOn,
+                         testing::Values("redhat", "suse", "users-range-ends", "users-two-roots",
+                                         "users-without-login-defs", "users-without-passwd",
+                                         "groups-without-login-defs"),
+                         [](auto const& which) {
+                             std::string name = which.param;
+                             std::replace(name.begin(), name.end(), '-', '_');
+                             return name;
+                         });
+
+TEST(Completion, OffersTheModulesOfTheTree)
+{
+    Plugin plugin;
+    plugin.initialize();
+    EXPECT_EQ(offered("driver:"), shown(plugin, NODES::driverType, "driver:"));
+}
+
+} // namespace

@@ -1,0 +1,176 @@
+#include "mihost/cli/Completion.h"
+
+#include "nodes/ids.h"
+
+#include <gtest/gtest.h>
+
+namespace
+{
+
+using namespace mihost;
+using Words = std::vector<std::string>;
+
+Words namesOf(NodeKind const& kind)
+{
+    switch (kind.type) {
+    case NODES::userType:
+        return {"root", "jdoe"};
+    case NODES::groupType:
+        return {"staff"};
+    default:
+        return {};
+    }
+}
+
+Words wordsOf(Completion const& completion)
+{
+    Words words;
+    for (Candidate const& candidate : completion.candidates)
+        words.push_back(candidate.word);
+    return words;
+}
+
+Words after(Words const& words)
+{
+    return wordsOf(complete(words, namesOf));
+}
+
+TEST(Completion, BeginsWithTheCommands)
+{
+    Words const commands = after({""});
+    ASSERT_GE(commands.size(), 2U);
+    EXPECT_EQ(commands[0], "tree");
+    EXPECT_EQ(after({"ge"}), Words{"get"});
+    EXPECT_EQ(after({"--json", "ge"}), Words{"get"});
+    EXPECT_EQ(after({}), commands);
+}
+
+TEST(Completion, KnowsNothingAfterAnUnknownCommandOrOption)
+{
+    EXPECT_EQ(after({"nonsense", ""}), Words());
+    EXPECT_EQ(after({"--nonsense", ""}), Words());
+}
+
+TEST(Completion, OffersTheOptionsOfTheCommandAndThoseOfAll)
+{
+    EXPECT_EQ(after({"list", "--c"}), Words{"--columns"});
+    EXPECT_EQ(after({"list", "--js"}), Words{"--json"});
+    EXPECT_EQ(after({"--js"}), Words{"--json"});
+    EXPECT_EQ(after({"--col"}), Words());
+}
+
+TEST(Completion, OffersEachOptionOnce)
+{
+    EXPECT_EQ(after({"list", "--help"}), (Words{"--help", "--help-all"}));
+}
+
+TEST(Completion, LeavesFilesAndFoldersToTheShell)
+{
+    EXPECT_EQ(complete({"--plugin", ""}, namesOf).what, Completion::What::Files);
+    EXPECT_EQ(complete({"get", "--trace", "x"}, namesOf).what, Completion::What::Files);
+    EXPECT_EQ(complete({"--overlay", ""}, namesOf).what, Completion::What::Folders);
+    EXPECT_EQ(complete({"--plugin=", ""}, namesOf).what, Completion::What::Words);
+}
+
+TEST(Completion, GoesOnBehindAnOptionWithItsValue)
+{
+    EXPECT_EQ(after({"--plugin", "file", "ge"}), Words{"get"});
+    EXPECT_EQ(after({"--plugin=file", "ge"}), Words{"get"});
+}
+
+TEST(Completion, OffersNodesAsTheyAreAddressed)
+{
+    EXPECT_EQ(after({"get", ""}),
+              (Words{"mi", "root", "computer", "os", "driver:", "user:", "group:", "log", "log:"}));
+    EXPECT_EQ(after({"get", "lo"}), (Words{"log", "log:"}));
+}
+
+TEST(Completion, OffersTheNodesOfAKindByName)
+{
+    EXPECT_EQ(after({"get", "user:"}), (Words{"user:root", "user:jdoe"}));
+    EXPECT_EQ(after({"get", "user:j"}), Words{"user:jdoe"});
+    EXPECT_EQ(after({"tree", "group:"}), Words{"group:staff"});
+}
+
+TEST(Completion, OffersThePropertiesOfTheNodesKind)
+{
+    EXPECT_EQ(after({"get", "user:root", "password-m"}),
+              (Words{"password-max-days", "password-min-days"}));
+    EXPECT_EQ(after({"get", "os", "os-name", "os-v"}), Words{"os-version"});
+    EXPECT_EQ(after({"watch", "os", "os-v"}), Words{"os-version"});
+    EXPECT_EQ(after({"get", "17", "os-v"}), Words());
+    EXPECT_EQ(after({"get", "no:such", "os-v"}), Words());
+}
+
+TEST(Completion, OffersTheValuesOfABoolean)
+{
+    EXPECT_EQ(after({"set", "user:root", "delete", ""}), (Words{"true", "false"}));
+    EXPECT_EQ(after({"set", "os", "refresh", ""}), Words());
+    EXPECT_EQ(after({"set", "os", "refresh", "0", ""}), Words());
+}
+
+TEST(Completion, OffersMethodsAndTheirParameters)
+{
+    EXPECT_EQ(after({"call", "UserD"}), Words{"UserDel"});
+    EXPECT_EQ(after({"call", "UserDel", ""}), Words{"UserName="});
+    EXPECT_EQ(after({"call", "NoMethod", ""}), Words());
+}
+
+TEST(Completion, OffersNoParameterTwice)
+{
+    EXPECT_EQ(after({"call", "LocalGroupAddUser", "LocalGroupName=staff", ""}),
+              Words{"DomainAndMember="});
+}
+
+TEST(Completion, LeavesAPasswordToBeAskedFor)
+{
+    EXPECT_EQ(after({"call", "UserSetPassword", "P"}), Words{"Password"});
+    EXPECT_EQ(after({"call", "UserSetPassword", "Password", ""}), Words{"UserName="});
+}
+
+TEST(Completion, OffersTheAccountsThatAParameterNames)
+{
+    EXPECT_EQ(after({"call", "UserDel", "UserName="}), (Words{"UserName=root", "UserName=jdoe"}));
+    EXPECT_EQ(after({"call", "LocalGroupDelUser", "DomainAndMember=j"}),
+              Words{"DomainAndMember=jdoe"});
+    EXPECT_EQ(after({"call", "LocalGroupDelUser", "LocalGroupName="}),
+              Words{"LocalGroupName=staff"});
+    EXPECT_EQ(after({"call", "LocalGroupDel", "GroupName="}), Words{"GroupName=staff"});
+}
+
+TEST(Completion, OffersNoAccountsForOneToBeMade)
+{
+    EXPECT_EQ(after({"call", "UserAdd", "UserName="}), Words());
+    EXPECT_EQ(after({"call", "LocalGroupAdd", "GroupName="}), Words());
+}
+
+TEST(Completion, OffersTheFewWordsThatAnArgumentTakes)
+{
+    EXPECT_EQ(after({"power", ""}), (Words{"restart", "halt"}));
+    EXPECT_EQ(after({"list", "u"}), Words{"users"});
+    EXPECT_EQ(after({"properties", "log"}), (Words{"log", "log-entry"}));
+}
+
+TEST(Completion, OffersColumnsOneAfterTheOther)
+{
+    EXPECT_EQ(after({"list", "users", "--columns", "user-name,full"}),
+              Words{"user-name,full-name"});
+    EXPECT_EQ(after({"list", "users", "--columns=full"}), Words{"--columns=full-name"});
+    EXPECT_EQ(after({"list", "--columns", "full"}), Words());
+}
+
+TEST(Completion, TakesWhatFollowsTwoDashesForArguments)
+{
+    EXPECT_EQ(after({"get", "--", "o"}), Words{"os"});
+    EXPECT_EQ(after({"get", "--", "--js"}), Words());
+}
+
+TEST(CompletionText, HasALineForEachCandidateWithItsNote)
+{
+    EXPECT_EQ(completionText({Completion::What::Words, {{"os", "the system"}, {"user:joe", ""}}}),
+              "words\nos\tthe system\nuser:joe\n");
+    EXPECT_EQ(completionText({Completion::What::Files, {}}), "files\n");
+    EXPECT_EQ(completionText({Completion::What::Folders, {}}), "folders\n");
+}
+
+} // namespace

@@ -188,9 +188,18 @@ TEST_F(LogNodes, LogTheStepsOfAnEntryInOrder)
     Recording const recording;
     frame.createLogEntryNodes(false);
     Texts nodesOnly;
-    for (LogRecord const& record : recording.records())
-        if (!record.trace && record.category == "Veltrix.IC.MI.OsSwMI")
-            nodesOnly.push_back(record.text);
+    Texts functions;
+    for (LogRecord const& record : recording.records()) {
+        if (record.trace || record.category != "Veltrix.IC.MI.OsSwMI")
+            continue;
+        nodesOnly.push_back(record.text);
+        functions.push_back(record.function);
+        EXPECT_EQ(record.file, "OsSwMI");
+    }
+    EXPECT_EQ(functions,
+              (Texts{"createLogEntryNodes", "LogEntryNode", "setProperty", "setProperty",
+                     "getProperty", "getProperty", "setProperty", "setProperty", "getProperty",
+                     "getProperty", "setProperty", "setProperty", "createLogEntryNodes"}));
     EXPECT_EQ(nodesOnly,
               (Texts{"createLogEntryNodes: entry", "LogEntryNode::LogEntryNode: entry",
                      "LogEntryNode::setProperty: entry", "LogEntryNode::setProperty: exit",

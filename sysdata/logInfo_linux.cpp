@@ -72,7 +72,7 @@ unsigned int logInfo::getMaxLine()
         LOG::write(unit, LOG::error, LOG::message("Cannot open process: ", countCommand));
         return 0;
     }
-    char line[lineSize] = "";
+    char line[lineSize];
     readLine(output, line);
     LOG::write(unit, LOG::progress, LOG::message("buffer = ", line));
     unsigned int count = 0;
@@ -93,7 +93,7 @@ void logInfo::getLog(unsigned int line, char* buffer, int length)
         buffer[0] = '\0';
         return;
     }
-    char text[lineSize] = "";
+    char text[lineSize];
     readLine(output, text);
     LOG::write(unit, LOG::progress, LOG::message("buffer = ", text));
     std::strncpy(buffer, strget(text, ' '), static_cast<std::size_t>(length));
@@ -129,7 +129,7 @@ bool logInfo::getCreationTime(long& time, unsigned int index)
     LOGINFO::Today today;
     MyProcess process;
     if (FILE* const output = process.mypopen("date", "r")) {
-        char line[lineSize] = "";
+        char line[lineSize];
         readLine(output, line);
         if (!LOGINFO::findToday(line, today)) {
             logInvalid(line, __func__);

@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <cstdlib>
+#include <cstring>
 #include <ctime>
 #include <fstream>
 #include <iterator>
@@ -206,6 +207,19 @@ TEST_F(LogReader, ReadsAMissingLineAsEmpty)
     Recording const recording;
     EXPECT_EQ(fetched(11, 8), std::string(8, '\0'));
     EXPECT_EQ(recording.remarks(), Texts{"buffer = "});
+}
+
+TEST_F(LogReader, ReadsALineAsEmptyWhoseReadingBreaksOff)
+{
+    libc::hooks().fgets = [](char* buffer, int, FILE*) -> char* {
+        std::strcpy(buffer, "7 left over"); // nothing is said of the buffer after a failure
+        return nullptr;
+    };
+    EXPECT_EQ(log.getMaxLine(), 0U);
+    EXPECT_EQ(fetched(10, 8), std::string(8, '\0'));
+    commands.answers[sed(0)] = "not read\n";
+    EXPECT_EQ(data(1), "**");
+    libc::hooks().fgets = nullptr;
 }
 
 TEST_F(LogReader, CutsALineAt511Characters)

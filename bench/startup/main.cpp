@@ -34,7 +34,7 @@ constexpr char const* list = "/tmp/commands";
 
 struct Size {
     int logLines;
-    int pairs;
+    std::size_t pairs;
 };
 
 constexpr Size sizes[] = {{1000, 21}, {100000, 21}, {1000000, 7}};
@@ -116,9 +116,8 @@ Pair runPair(bool pluginFirst)
 /** The median over all pairs; their number is odd. */
 template <class Value> double median(std::vector<Pair> const& pairs, Value const& valueOf)
 {
-    std::vector<double> values;
-    for (Pair const& pair : pairs)
-        values.push_back(valueOf(pair));
+    std::vector<double> values(pairs.size());
+    std::transform(pairs.begin(), pairs.end(), values.begin(), valueOf);
     auto const middle = values.begin() + static_cast<std::ptrdiff_t>(values.size() / 2);
     std::nth_element(values.begin(), middle, values.end());
     return *middle;
@@ -137,12 +136,12 @@ void measure(Size const& size)
 {
     writeLog(size.logLines);
     run({STARTUP_HOST, PLUGIN_FILE, list});
-    std::vector<Pair> pairs;
-    for (int i = 0; i < size.pairs; ++i)
-        pairs.push_back(runPair(i % 2 == 0));
+    std::vector<Pair> pairs(size.pairs);
+    for (std::size_t i = 0; i < pairs.size(); ++i)
+        pairs[i] = runPair(i % 2 == 0);
     for (Column const& column : columns) {
         auto const time = column.time;
-        std::printf("%9d %8d %5d  %-5s %10.2f %10.2f %7.3f\n", size.logLines, countCommands(),
+        std::printf("%9d %8d %5zu  %-5s %10.2f %10.2f %7.3f\n", size.logLines, countCommands(),
                     size.pairs, column.name,
                     median(pairs, [time](Pair const& pair) { return pair.plugin.*time; }),
                     median(pairs, [time](Pair const& pair) { return pair.bare.*time; }),

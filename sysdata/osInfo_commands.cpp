@@ -216,7 +216,7 @@ bool makeCommands(Method const& method, std::string const& program,
     for (Arguments const* list : {&commands.main, &commands.aging}) {
         if (fits(*list))
             continue;
-        complaint = misfit(list->front());
+        complaint = tooLong(list->front());
         return false;
     }
     return true;

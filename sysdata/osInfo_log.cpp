@@ -56,9 +56,9 @@ std::string unknownType(std::string const& type)
     return "Unknown parameter type: " + loggable(type);
 }
 
-std::string misfit(std::string const& program)
+std::string tooLong(std::string const& program)
 {
-    return "Command does not fit: " + program;
+    return "Command line too long: " + program;
 }
 
 } // namespace NQ::OSINFO

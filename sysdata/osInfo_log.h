@@ -33,7 +33,7 @@ std::string loggableOutput(std::string const& output, bool secret);
 
 // Error messages.
 std::string unknownType(std::string const& type);
-std::string misfit(std::string const& program);
+std::string tooLong(std::string const& program);
 
 } // namespace MI_INTERNAL
 

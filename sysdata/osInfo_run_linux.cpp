@@ -32,7 +32,7 @@ bool readOutput(FILE* stream, char* output)
 OSINFO::Ran OSINFO::run(OsInfo& info, Arguments arguments, char const* function)
 {
     if (!fits(arguments)) {
-        LOG::write(methods, LOG::error, misfit(arguments.front()), function);
+        LOG::write(methods, LOG::error, tooLong(arguments.front()), function);
         return {1, ""};
     }
     std::vector<char*> entries;
@@ -63,7 +63,7 @@ int OsInfo::executeCommand(char* program, char** arguments, char* output)
         list.emplace_back(*argument);
     std::string const line = OSINFO::commandLine(list);
     if (line.size() >= bufferSize) {
-        LOG::write(methods, LOG::error, OSINFO::misfit(program));
+        LOG::write(methods, LOG::error, OSINFO::tooLong(program));
         return 1;
     }
     FILE* pipe = popen(line.c_str(), "r");

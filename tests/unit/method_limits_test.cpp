@@ -17,7 +17,7 @@ protected:
         Recording const log;
         EXPECT_EQ(execute(method, params), 1);
         EXPECT_EQ(commands_.ran, Lines());
-        EXPECT_EQ(log.texts(6000), Lines{"Command does not fit: " + program});
+        EXPECT_EQ(log.texts(6000), Lines{"Command line too long: " + program});
     }
 
     void expectRun(std::string const& method, Params const& params, std::string const& line)
@@ -165,7 +165,7 @@ TEST_F(MemberLimits, LetTheGroupListHave254Characters)
     Recording const log;
     EXPECT_EQ(execute("LocalGroupAddUser", params_), 1);
     EXPECT_EQ(commands_.ran, Lines{idLine_});
-    EXPECT_EQ(log.texts(6000), Lines{"Command does not fit: /usr/sbin/usermod"});
+    EXPECT_EQ(log.texts(6000), Lines{"Command line too long: /usr/sbin/usermod"});
 }
 
 TEST_F(MemberLimits, LetTheQuotedMemberHave254Characters)

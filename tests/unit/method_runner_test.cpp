@@ -143,7 +143,7 @@ TEST_F(ExecuteCommand, RunsALineThatJustFitsAndNoLongerOne)
     EXPECT_EQ(run("/bin/one", {std::string(room + 1, 'x')}), 1);
     EXPECT_EQ(commands_.ran.size(), 1U);
     EXPECT_EQ(said(), "");
-    EXPECT_EQ(log.texts(6000), Lines{"Command does not fit: /bin/one"});
+    EXPECT_EQ(log.texts(6000), Lines{"Command line too long: /bin/one"});
 }
 
 TEST_F(ExecuteCommand, CountsTheEchoedCodeAsPartOfTheLine)
@@ -206,7 +206,7 @@ TEST_F(PasswordEncryption, TakesArgumentsOf254CharactersAndNoLongerOnes)
         Recording const log;
         set(password, user);
         EXPECT_EQ(commands_.ran.size(), 1U);
-        EXPECT_EQ(log.texts(6000), Lines{"Command does not fit: echo"});
+        EXPECT_EQ(log.texts(6000), Lines{"Command line too long: echo"});
     }
 }
 

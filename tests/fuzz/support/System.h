@@ -12,8 +12,8 @@ namespace fuzz
 {
 
 /**
- * The machine as the plug-in sees it for as long as it lives: only these files and only these
- * commands exist. Streams that the plug-in leaves open are closed at the end.
+ * The machine as the plug-in sees it for as long as it lives: below /etc and /var/log only these
+ * files exist, and only these commands. Streams that the plug-in leaves open are closed at the end.
  */
 class System
 {
@@ -23,7 +23,7 @@ public:
     System(System const&) = delete;
     System& operator=(System const&) = delete;
 
-    /** By path; any other cannot be opened. */
+    /** By path. */
     std::map<std::string, std::string> files;
 
     /** Output by the beginning of the command line, the first that fits; others do not start. */

@@ -99,21 +99,18 @@ void copyFile(std::string const& path, struct stat const& status)
     check(fchmod(to.get(), status.st_mode & 07777), "cannot copy " + path);
 }
 
-/** What cannot be overlaid can be seen but not written; what cannot even be bound stays away. */
+/** What cannot be copied can be seen but not written; what cannot even be bound stays away. */
 void addMount(std::string const& path, Overlays& overlays)
 {
     struct stat status {
     };
     if (stat(path.c_str(), &status) != 0)
         return;
-    if (S_ISREG(status.st_mode)) {
-        copyFile(path, status);
-        return;
-    }
-    if (!S_ISDIR(status.st_mode))
-        return;
     try {
-        overlays.add(path);
+        if (S_ISDIR(status.st_mode))
+            overlays.add(path);
+        else if (S_ISREG(status.st_mode))
+            copyFile(path, status);
     } catch (std::system_error const&) {
         if (mount(path.c_str(), (copyRoot + path).c_str(), nullptr, MS_BIND, nullptr) == 0)
             makeReadOnly(copyRoot + path);
@@ -125,10 +122,13 @@ void addDevices()
     std::string const devices = copyRoot + "/dev";
     mountAt(devices, "tmpfs", MS_NOSUID, "mode=0755");
     for (char const* name : {"null", "zero", "full", "random", "urandom", "tty"}) {
-        std::string const place = devices + "/" + name;
+        std::string const device = std::string("/dev/") + name;
+        std::string const place = copyRoot + device;
+        if (access(device.c_str(), F_OK) != 0)
+            continue;
         Descriptor const file(check(open(place.c_str(), O_CREAT | O_WRONLY | O_CLOEXEC, 0600),
                                     "cannot make " + place));
-        bind(std::string("/dev/") + name, place);
+        bind(device, place);
         makeReadOnly(place); // the device still takes writes, its owner and mode do not change
     }
     struct Link {

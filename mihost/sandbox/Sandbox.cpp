@@ -97,7 +97,7 @@ void runAsFirstProcess(Descriptor overlay, Descriptor report)
         makeSandbox(overlay);
         overlay.reset();
         child = check(fork(), "cannot start a process");
-    } catch (std::system_error const& error) {
+    } catch (std::exception const& error) {
         std::string const text = problem + std::string(error.what());
         if (write(report.get(), text.data(), text.size()) < 0)
             _exit(EXIT_FAILURE);
@@ -124,12 +124,11 @@ std::string runAsCaller(pid_t child, Descriptor report)
         count = read(report.get(), &first, 1);
     } while (count < 0 && errno == EINTR);
     if (count == 1 && first == ready) {
-        int const end = relayTo(child);
+        int end = relayTo(child); // that of the first process; it counts where it was killed
         std::string const status = readToEnd(report);
-        int sandboxed = end;
-        if (status.size() == sizeof sandboxed)
-            status.copy(reinterpret_cast<char*>(&sandboxed), sizeof sandboxed);
-        endLike(sandboxed);
+        if (status.size() == sizeof end)
+            status.copy(reinterpret_cast<char*>(&end), sizeof end);
+        endLike(end);
     }
     std::string const reason = readToEnd(report);
     waitpid(child, nullptr, 0);

@@ -62,6 +62,11 @@ IC::Error success()
     return {0, IC::Number(IC::Number::EmptyKind), ""};
 }
 
+IC::Error setterAnswer()
+{
+    return {recordingHost().setterStatus, IC::Number(IC::Number::EmptyKind), ""};
+}
+
 /** The plug-in's logger category as it stands while its library is being loaded or closed. */
 std::string category()
 {
@@ -227,7 +232,7 @@ Error Node::setProperty(unsigned int const& id, PropertyValue const& value)
 {
     note("setProperty(" + std::to_string(id) + ", " + ::shown(value) + ")");
     store_->properties.insert_or_assign(id, value);
-    return success();
+    return setterAnswer();
 }
 
 Node::operator std::string() const
@@ -313,14 +318,14 @@ Error MutableNode::setStatus(unsigned int const& status)
     if (recordingHost().onSetStatus)
         recordingHost().onSetStatus(*this);
     store_->status = status;
-    return success();
+    return setterAnswer();
 }
 
 Error MutableNode::setDescription(std::string const& description)
 {
     note("setDescription(" + description + ")");
     store_->description = description;
-    return success();
+    return setterAnswer();
 }
 
 Error MutableNode::setPath(std::string const&)

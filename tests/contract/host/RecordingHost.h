@@ -39,6 +39,7 @@ struct RecordingHost {
     // What the framework answers.
     unsigned char initializeStatus = 0;
     unsigned char addNewNodeStatus = 0;
+    unsigned char setterStatus = 0; // of a node's setStatus, setDescription and setProperty
 
     /** The interface ids that initialize sets; its own where empty. */
     std::vector<unsigned int> miIds;

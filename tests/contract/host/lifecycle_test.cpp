@@ -176,6 +176,21 @@ TEST_F(Lifecycle, AFailingFrameworkIsWhatTheHostHearsOfAndTheTreeStandsAllTheSam
     EXPECT_EQ(Ids(whole.begin(), whole.begin() + 4), (Ids{39, 59, 40, 17}));
 }
 
+TEST_F(Lifecycle, TheTreeStandsWhateverTheSettersAnswer)
+{
+    commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
+    plugin.initialize();
+    Ids const whole = nodeTypes();
+    Lines const said = host.messages();
+    plugin.unload();
+
+    host.logCalls.clear();
+    host.setterStatus = 1;
+    EXPECT_EQ(plugin.initialize().getStatus(), 0);
+    EXPECT_EQ(nodeTypes(), whole);
+    EXPECT_EQ(host.messages(), said);
+}
+
 TEST_F(Lifecycle, NodesOfTheStartAreNotPublishedOneByOne)
 {
     plugin.initialize();
@@ -266,6 +281,25 @@ TEST_P(Rebuilding, LogsEachRefusalOnceAndGoesOn)
     EXPECT_EQ(std::count(all.begin(), all.end(), "publishNode: exit"),
               static_cast<std::ptrdiff_t>(nodes));
 }
+
+class LockedBuild : public Loaded, public testing::WithParamInterface<char const*>
+{
+};
+
+TEST_P(LockedBuild, HoldsTheLockFromItsBeginningToItsEndWaitingWithoutLimit)
+{
+    plugin.initialize();
+    std::string const builder = GetParam();
+    auto const& all = host.events;
+    auto const entry = std::find(all.begin(), all.end(), "log: " + builder + ": entry");
+    auto const exit = std::find(all.begin(), all.end(), "log: " + builder + ": exit");
+    ASSERT_GT(exit - entry, 2);
+    EXPECT_EQ(entry[1], "lock(4294967295)");
+    EXPECT_EQ(exit[-1], "unlock()");
+}
+
+INSTANTIATE_TEST_SUITE_P(All, LockedBuild, testing::Values("createUserNodes", "createGroupNodes"),
+                         [](auto const& builder) { return std::string(builder.param); });
 
 INSTANTIATE_TEST_SUITE_P(
     All, Rebuilding,

@@ -308,6 +308,33 @@ TEST_F(Border, OtherFileSystemsAreCopiedOnWriteToo)
     EXPECT_EQ(caller.wait(), 0);
 }
 
+TEST_F(Border, AFileSystemThatCannotBeOverlaidCanBeReadButNotWritten)
+{
+    Folder const folder;
+    std::string const disk = folder.path("disk");
+    Caller caller(
+        [&disk] {
+            bool const canBeRead = readFile(disk + "/file") == "before";
+            return canBeRead && access(disk.c_str(), W_OK) != 0 && errno == EROFS ? 0 : 1;
+        },
+        {},
+        [&folder, &disk] {
+            folder.write("disk/none", "");
+            ownMounts();
+            // Overlays can stand on one another, but not any number of them.
+            if (mount("tmpfs", disk.c_str(), "tmpfs", 0, "") != 0 || chdir(disk.c_str()) != 0)
+                _exit(1);
+            for (char const* part : {"0", "1", "2", "u1", "u2", "w1", "w2"})
+                mkdir(part, 0755);
+            folder.write("disk/0/file", "before");
+            if (mount("overlay", "1", "overlay", 0, "lowerdir=0,upperdir=u1,workdir=w1") != 0 ||
+                mount("overlay", "2", "overlay", 0, "lowerdir=1,upperdir=u2,workdir=w2") != 0 ||
+                mount("2", disk.c_str(), nullptr, MS_BIND, nullptr) != 0 || chdir("/") != 0)
+                _exit(1);
+        });
+    EXPECT_EQ(caller.wait(), 0);
+}
+
 TEST_F(Border, AFileMountedOverAnotherIsCopiedWithItsOwnerAndMode)
 {
     Folder const folder;

@@ -1,26 +1,9 @@
 #include "tests/support/FakeFiles.h"
 
-#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 
-namespace
-{
-
-std::string newFolder()
-{
-    std::string name = std::filesystem::temp_directory_path() / "mi-files-XXXXXX";
-    return mkdtemp(name.data());
-}
-
-} // namespace
-
-FakeFiles::FakeFiles() : folder_(newFolder()), root_(folder_) {}
-
-FakeFiles::~FakeFiles()
-{
-    std::filesystem::remove_all(folder_);
-}
+FakeFiles::FakeFiles() : root_(folder_.name()) {}
 
 void FakeFiles::write(std::string const& path, std::string const& text) const
 {
@@ -36,5 +19,5 @@ void FakeFiles::remove(std::string const& path) const
 
 std::string FakeFiles::realPath(std::string const& path) const
 {
-    return folder_ + path;
+    return folder_.name() + path;
 }

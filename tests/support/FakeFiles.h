@@ -2,6 +2,7 @@
 #define TESTS_SUPPORT_FAKEFILES_H
 
 #include "tests/support/Libc.h"
+#include "tests/support/ScratchFolder.h"
 
 #include <string>
 
@@ -14,7 +15,7 @@ class FakeFiles
 {
 public:
     FakeFiles();
-    ~FakeFiles();
+    ~FakeFiles() = default;
     FakeFiles(FakeFiles const&) = delete;
     FakeFiles& operator=(FakeFiles const&) = delete;
 
@@ -27,7 +28,7 @@ public:
     std::string realPath(std::string const& path) const;
 
 private:
-    std::string folder_;
+    ScratchFolder folder_;
     libc::FileRoot root_;
 };
 

@@ -1,0 +1,43 @@
+#ifndef TESTS_SANDBOX_ACCELMODULES_H
+#define TESTS_SANDBOX_ACCELMODULES_H
+
+#include <string>
+#include <vector>
+
+/** Kernel modules of our own making, for the copy of the machine that a test runs in. */
+namespace accelModules
+{
+
+/** The folder where the running kernel's modules are looked for. */
+std::string folder();
+
+/**
+ * A module's file as compilers make it, with nothing in it but its facts.
+ *
+ * @param facts  "key=value" each
+ */
+std::string file(std::vector<std::string> const& facts);
+
+/** What is put at a module's end when it is signed; the signer may hold any bytes. */
+std::string signature(std::string const& signer);
+
+/** Puts a module into the folder. */
+void write(std::string const& fileName, std::string const& content);
+
+/** Has depmod index what is in the folder. */
+void index();
+
+/** A module that is loaded, as the kernel tells of it. */
+struct Loaded {
+    std::string name;
+    long size;
+    int uses;
+    std::vector<std::string> holders;
+};
+
+/** From now on these modules are loaded, for all that reads /proc/modules and /sys/module. */
+void load(std::vector<Loaded> const& modules);
+
+} // namespace accelModules
+
+#endif

@@ -1,0 +1,229 @@
+// lsmod and modinfo, asked in both ways and compared byte by byte.
+
+#include "tests/sandbox/AccelModules.h"
+#include "tests/support/BothWays.h"
+#include "tests/support/Machine.h"
+
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <random>
+
+namespace
+{
+
+using accelModules::Loaded;
+using bothways::answered;
+using bothways::real;
+
+using Facts = std::vector<std::string>;
+
+TEST(AccelLsmod, ListsWhatIsLoadedAsLsmodDoes)
+{
+    accelModules::load({{"ext4", 1011712, 1, {}},
+                        {"mbcache", 16384, 1, {"ext4"}},
+                        {"crc16", 16384, 3, {"ext4", "bluetooth", "l2tp_core"}},
+                        {"a_module_with_a_very_long_name_indeed", 123456789012, 70000, {}},
+                        {"going", 0, -1, {}}});
+    std::string const text = real("lsmod");
+    EXPECT_NE(text.find("mbcache                16384  1 ext4\n"), std::string::npos) << text;
+    EXPECT_EQ(answered("lsmod"), text);
+}
+
+TEST(AccelLsmod, ListsHundredsOfModulesAsLsmodDoes)
+{
+    std::mt19937 random(3);
+    std::vector<Loaded> modules;
+    for (int i = 0; i < 400; ++i) {
+        Loaded module{"m" + std::to_string(i) + std::string(random() % 30, '_'),
+                      static_cast<long>(random() % 10000000),
+                      static_cast<int>(random() % 2000),
+                      {}};
+        for (unsigned long holders = random() % 4; holders > 0 && !modules.empty(); --holders)
+            module.holders.push_back(modules[random() % modules.size()].name);
+        modules.push_back(module);
+    }
+    accelModules::load(modules);
+    EXPECT_EQ(answered("lsmod"), real("lsmod"));
+}
+
+TEST(AccelLsmod, ListsNothingButTheHeadWhenNothingIsLoaded)
+{
+    accelModules::load({});
+    EXPECT_EQ(answered("lsmod"), "Module                  Size  Used by\n");
+    EXPECT_EQ(answered("lsmod"), real("lsmod"));
+}
+
+TEST(AccelLsmod, StepsAsideWhereLsmodWouldComplain)
+{
+    accelModules::load({{"one", 1, 0, {}}});
+    std::filesystem::remove("/sys/module/one/holders");
+    EXPECT_NE(real("lsmod").find("ERROR"), std::string::npos);
+    EXPECT_FALSE(answered("lsmod"));
+    machine::remove("/proc/modules");
+    EXPECT_FALSE(answered("lsmod"));
+}
+
+TEST(AccelLsmod, IsAsNegativeAsLsmodForModulesThatJustWent)
+{
+    accelModules::load({{"one", 1, 0, {}}});
+    machine::remove("/sys/module/one/refcnt");
+    EXPECT_EQ(answered("lsmod"), real("lsmod"));
+}
+
+TEST(AccelLsmod, LetsAStandInWin)
+{
+    accelModules::load({});
+    machine::fake("/usr/local/bin/lsmod", "echo stand-in\n");
+    setenv("PATH", "/usr/local/bin:/usr/sbin:/usr/bin", 1);
+    EXPECT_EQ(real("lsmod"), "stand-in\n");
+    EXPECT_FALSE(answered("lsmod"));
+    machine::remove("/usr/local/bin/lsmod");
+    EXPECT_TRUE(answered("lsmod"));
+    machine::remove("/usr/sbin/lsmod");
+    machine::fake("/usr/sbin/lsmod", "echo stand-in\n");
+    EXPECT_FALSE(answered("lsmod"));
+}
+
+TEST(AccelModinfo, TellsWhatModinfoTells)
+{
+    accelModules::write(
+        "kernel/one.ko",
+        accelModules::file({"version=1.2.3", "description=One and only", "author=A", "author=B",
+                            "license=GPL", "alias=pci:v*d*", "depends=", "name=one"}));
+    accelModules::index();
+    std::string const text = real("modinfo one");
+    EXPECT_EQ(text, "filename:       " + accelModules::folder() +
+                        "/kernel/one.ko\n"
+                        "version:        1.2.3\n"
+                        "description:    One and only\n"
+                        "author:         A\n"
+                        "author:         B\n"
+                        "license:        GPL\n"
+                        "alias:          pci:v*d*\n"
+                        "depends:        \n"
+                        "name:           one\n");
+    EXPECT_EQ(answered("modinfo one"), text);
+}
+
+TEST(AccelModinfo, PutsParametersTogetherAsModinfoDoes)
+{
+    accelModules::write(
+        "one.ko",
+        accelModules::file({"parm=a:first", "parmtype=a:int", "parmtype=b:bool",
+                            "parm=b:second:with colon", "parm=text:only", "parmtype=type:only",
+                            "parm=a:again", "parm=:", "parmtype=empty:", "parm=ab:", "x=y"}));
+    accelModules::index();
+    EXPECT_EQ(answered("modinfo one"), real("modinfo one"));
+}
+
+std::string randomFact(std::mt19937& random)
+{
+    char const* const keys[] = {"version",
+                                "description",
+                                "parm",
+                                "parmtype",
+                                "author",
+                                "depends",
+                                "k",
+                                "fifteen_letters",
+                                "sixteen_letters_",
+                                "a_key_that_is_far_too_long",
+                                "srcversion",
+                                "vermagic"};
+    std::string fact = keys[random() % std::size(keys)];
+    if (random() % 50 == 0)
+        return fact;
+    fact += fact.rfind("parm", 0) == 0 ? "=p" + std::to_string(random() % 6) + ':' : "=";
+    for (unsigned long length = random() % 40; length > 0; --length)
+        fact += static_cast<char>(1 + random() % 255);
+    if (random() % 20 == 0)
+        fact += std::string(random() % 3000, 'x');
+    return fact;
+}
+
+std::string randomModule(std::mt19937& random)
+{
+    Facts facts;
+    for (unsigned long count = random() % 25; count > 0; --count)
+        facts.push_back(randomFact(random));
+    std::string content = accelModules::file(facts);
+    switch (random() % 10) {
+    case 0:
+        return content + accelModules::signature("somebody\xff");
+    case 1:
+        return content.substr(0, random() % content.size());
+    case 2:
+        content[random() % content.size()] ^= static_cast<char>(1U << random() % 8);
+        return content;
+    default:
+        return content;
+    }
+}
+
+/** Both ways agree, and the accelerator steps aside exactly where modinfo complains. */
+void expectAgreement(std::string const& name)
+{
+    std::string const text = real("modinfo " + name);
+    std::optional<std::string> const own = answered("modinfo " + name);
+    bool const complained = text.find("ERROR") != std::string::npos;
+    EXPECT_EQ(own.has_value(), !complained) << name << ": " << text;
+    if (own) {
+        EXPECT_EQ(*own, text) << name;
+    }
+}
+
+TEST(AccelModinfo, AgreesWithModinfoOnThousandsOfModules)
+{
+    std::mt19937 random(11);
+    constexpr int modules = 1000;
+    for (int i = 0; i < modules; ++i)
+        accelModules::write("kernel/drivers/mod-" + std::to_string(i) + ".ko",
+                            randomModule(random));
+    accelModules::index();
+    for (int i = 0; i < modules; ++i) {
+        expectAgreement("mod_" + std::to_string(i));
+        expectAgreement("mod-" + std::to_string(i));
+    }
+}
+
+TEST(AccelModinfo, AgreesWithModinfoOnNamesThatAreNotThoseOfOneModule)
+{
+    accelModules::write("a.ko",
+                        accelModules::file({"alias=net-pf-1", "alias=other_name", "name=a"}));
+    accelModules::write("b.ko", accelModules::file({"alias=net-pf-*", "alias=other_name"}));
+    accelModules::write("extra/c.ko", accelModules::file({"description=extra"}));
+    accelModules::write("kernel/c.ko", accelModules::file({"description=kernel"}));
+    accelModules::write("modules.builtin", "kernel/built_in.ko\nkernel/known.ko\n");
+    accelModules::write("modules.builtin.modinfo",
+                        std::string("known.version=7\0known.alias=net-pf-9\0"
+                                    "known.parm=x:text\0known.parmtype=x:int\0",
+                                    75));
+    accelModules::index();
+    for (char const* name : {"a", "b", "c", "net-pf-1", "net_pf_1", "net-pf-2", "net-pf-9",
+                             "other_name", "other-name", "built_in", "known", "nothing", "A", "ab"})
+        expectAgreement(name);
+}
+
+TEST(AccelModinfo, ReadsCompressedModules)
+{
+    accelModules::write("one.ko", accelModules::file({"version=1", "description=compressed"}));
+    ASSERT_EQ(std::system(("xz " + accelModules::folder() + "/one.ko").c_str()), 0);
+    accelModules::index();
+    EXPECT_NE(real("modinfo one").find("one.ko.xz"), std::string::npos);
+    expectAgreement("one");
+}
+
+TEST(AccelModinfo, SeesWhatChangedSinceTheLastTime)
+{
+    for (char const* version : {"version=1", "version=2"}) {
+        accelModules::write("one.ko", accelModules::file({version}));
+        accelModules::index();
+        expectAgreement("one");
+    }
+    machine::remove(accelModules::folder() + "/one.ko");
+    expectAgreement("one");
+    accelModules::index();
+    expectAgreement("one");
+}
+
+} // namespace

@@ -1,0 +1,138 @@
+// date, asked in both ways and compared byte by byte.
+
+#include "mihost/accel/Date.h"
+#include "tests/support/BothWays.h"
+#include "tests/support/ScratchFolder.h"
+#include "tests/unit/AccelStandIns.h"
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <gtest/gtest.h>
+#include <vector>
+
+namespace
+{
+
+using bothways::answered;
+using bothways::real;
+
+constexpr std::time_t day = 24 * 60 * 60;
+
+/** All through some years, at every hour of the day, and the ends of what fits. */
+std::vector<std::time_t> instants()
+{
+    std::vector<std::time_t> times{-3000000000, -1, 0, 1, 2147483647, 2147483648, 4102444800};
+    for (std::time_t const year : {1995, 2026, 2040})
+        for (std::time_t half = 0; half < 24; half += year == 2026 ? 1 : 4)
+            times.push_back((year - 1970) * 365 * day + (year - 1969) / 4 * day + half * 15 * day +
+                            half * 3601);
+    return times;
+}
+
+/** What the real date prints for all of the instants, in the zone and locale of the environment. */
+std::string realDates(ScratchFolder const& folder)
+{
+    std::ofstream file(folder.path("times"));
+    for (std::time_t const time : instants())
+        file << '@' << time << '\n';
+    file.close();
+    return real("date -f " + folder.path("times"));
+}
+
+std::string answeredDates()
+{
+    std::string text;
+    for (std::time_t const time : instants()) {
+        miaccel::Answer const answer = miaccel::dateAt(time);
+        text += answer.declined ? answer.declined : answer.text;
+    }
+    return text;
+}
+
+TEST(AccelDate, IsThatOfTheMoment)
+{
+    std::string before;
+    std::string between;
+    std::string after;
+    do {
+        before = real("date");
+        between = answered("date").value();
+        after = real("date");
+    } while (before != after);
+    EXPECT_EQ(between, before);
+}
+
+TEST(AccelDate, IsThatOfDateInEveryTimeZoneThereIs)
+{
+    ScratchFolder const folder;
+    setenv("LC_ALL", "C", 1);
+    std::size_t zones = 0;
+    std::filesystem::path const all = "/usr/share/zoneinfo";
+    for (auto const& entry : std::filesystem::recursive_directory_iterator(all)) {
+        std::string const name = entry.path().lexically_relative(all);
+        if (!entry.is_regular_file() || name.rfind("right/", 0) == 0 ||
+            name.rfind("posix/", 0) == 0)
+            continue;
+        setenv("TZ", name.c_str(), 1);
+        ASSERT_EQ(answeredDates(), realDates(folder)) << name;
+        ++zones;
+    }
+    EXPECT_GT(zones, 300U);
+}
+
+TEST(AccelDate, IsThatOfDateForZonesOfEveryForm)
+{
+    ScratchFolder const folder;
+    for (char const* zone :
+         {"", ":", ":Europe/Berlin", "/usr/share/zoneinfo/Asia/Tokyo", "UTC0", "XYZ-5:30",
+          "<+03>-3", "CET-1CEST,M3.5.0,M10.5.0/3", "EST5EDT", "NZST-12NZDT,M9.5.0,M4.1.0/3",
+          "EST5EDT4", "nonsense", "Europe/Nowhere", "A", "12", "../../../etc/localtime",
+          "right/UTC", " UTC"}) {
+        setenv("TZ", zone, 1);
+        EXPECT_EQ(answeredDates(), realDates(folder)) << zone;
+    }
+    unsetenv("TZ");
+    EXPECT_EQ(answeredDates(), realDates(folder));
+}
+
+TEST(AccelDate, IsThatOfDateInEveryLocaleOfTheSystemAndInNone)
+{
+    ScratchFolder const folder;
+    char const* const variables[] = {"LC_ALL", "LC_TIME", "LANG", "LC_COLLATE"};
+    for (char const* locale :
+         {"C", "POSIX", "C.UTF-8", "C.utf8", "xx_YY.UTF-8", "", "/tmp", "../x"})
+        for (char const* variable : variables) {
+            for (char const* other : variables)
+                unsetenv(other);
+            setenv("LC_TIME", "C.UTF-8", 1);
+            setenv(variable, locale, 1);
+            EXPECT_EQ(answeredDates(), realDates(folder)) << variable << '=' << locale;
+        }
+}
+
+TEST(AccelDate, ReadsTheClockThatDateReads)
+{
+    setenv("TZ", "UTC0", 1);
+    setenv("LC_ALL", "C", 1);
+    accelStandIns::Guard const guard;
+    accelStandIns::hooks().clock_gettime = [](clockid_t clock, timespec* now) {
+        int const result = accelStandIns::realClockGettime(clock, now);
+        if (clock == CLOCK_REALTIME)
+            *now = {1000000000, 999999999};
+        return result;
+    };
+    EXPECT_EQ(answered("date"), "Sun Sep  9 01:46:40 UTC 2001\n");
+}
+
+TEST(AccelDate, StepsAsideForAZoneFileThatIsNewerThanTheProcess)
+{
+    ScratchFolder const folder;
+    std::filesystem::copy_file("/usr/share/zoneinfo/UTC", folder.path("zone"));
+    setenv("TZ", folder.path("zone").c_str(), 1);
+    EXPECT_FALSE(answered("date"));
+    setenv("TZ", (":" + folder.path("zone")).c_str(), 1);
+    EXPECT_FALSE(answered("date"));
+}
+
+} // namespace

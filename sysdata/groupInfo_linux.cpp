@@ -4,6 +4,7 @@
 #include "sysdata/minMaxId.h"
 #include "util/MutexLock.h"
 #include "util/log.h"
+#include "util/text.h"
 
 #include <grp.h>
 #include <utility>
@@ -87,13 +88,10 @@ void groupInfo::Tokenize(std::string const& text, std::vector<std::string>& toke
                          std::string const& delimiters)
 {
     LOG::Scope const scope(unit);
-    std::string::size_type start = text.find_first_not_of(delimiters);
-    while (start != std::string::npos) {
-        std::string::size_type const end = text.find_first_of(delimiters, start);
-        tokens.push_back(text.substr(start, end - start));
+    for (std::string& token : TEXT::split(text, delimiters)) {
         LOG::write(unit, LOG::progress,
-                   LOG::message("str.substr(lastPos, pos - lastPos) = ", tokens.back()));
-        start = text.find_first_not_of(delimiters, end);
+                   LOG::message("str.substr(lastPos, pos - lastPos) = ", token));
+        tokens.push_back(std::move(token));
     }
 }
 

@@ -1,6 +1,7 @@
 #include "sysdata/osInfo_run.h"
 
 #include "sysdata/osInfo_log.h"
+#include "util/file.h"
 
 #include <cstdio>
 
@@ -12,20 +13,6 @@ namespace
 
 using OSINFO::bufferSize;
 using OSINFO::methods;
-
-/** Reads to the end, keeps what the buffer holds and says whether there was anything. */
-bool readOutput(FILE* stream, char* output)
-{
-    std::size_t kept = 0;
-    bool any = false;
-    for (int c = std::getc(stream); c != EOF; c = std::getc(stream)) {
-        any = true;
-        if (kept < bufferSize - 1)
-            output[kept++] = static_cast<char>(c);
-    }
-    output[kept] = '\0';
-    return any;
-}
 
 } // namespace
 
@@ -72,7 +59,7 @@ int OsInfo::executeCommand(char* program, char** arguments, char* output)
         LOG::write(methods, LOG::error, LOG::message("Cannot open process: ", program));
         return 1;
     }
-    bool const any = readOutput(pipe, output);
+    bool const any = FILES::readToEnd(pipe, output, bufferSize);
     pclose(pipe);
     return any ? 1 : 0;
 }

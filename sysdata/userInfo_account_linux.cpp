@@ -25,9 +25,9 @@ constexpr std::size_t commandSize = 1024;
 constexpr std::size_t lineSize = 1024;
 constexpr std::size_t runnerSize = 5000;
 
-void logTooLong(std::string const& command, char const* function)
+void logMisfit(std::string const& command, char const* function)
 {
-    LOG::write(unit, LOG::error, LOG::message("Command line too long: ", command), function);
+    LOG::write(unit, LOG::error, LOG::message("Command does not fit: ", command), function);
 }
 
 /** Starts a command and sees it end; a failed start is logged as the given text. */
@@ -53,12 +53,12 @@ bool makeAgeCommand(userInfo& info, std::string const& date, std::string const& 
     USER_INFO::CalendarDay const day = USER_INFO::scanDay(date.c_str());
     long const requested = ito_time_t(day.year, day.month, day.day, 0, 0, 0, 0, -1);
     if (!TEXT::print(command, sizeof command, "chage -l %s", user.c_str())) {
-        logTooLong("chage -l", function);
+        logMisfit("chage -l", function);
         return false;
     }
     int const days = static_cast<int>(info.getDays(command, label, requested));
     if (!TEXT::print(command, sizeof command, "chage %s %d %s", option, days, user.c_str())) {
-        logTooLong(LOG::message("chage ", option), function);
+        logMisfit(LOG::message("chage ", option), function);
         return false;
     }
     return true;
@@ -73,7 +73,7 @@ int userInfo::setDelete(std::string user)
     if (TEXT::print(command, sizeof command, "userdel -r %s", user.c_str()))
         run(command, LOG::message("Cannot open process: command = ", command), __func__);
     else
-        logTooLong("userdel -r", __func__);
+        logMisfit("userdel -r", __func__);
     return 1;
 }
 
@@ -148,19 +148,18 @@ bool userInfo::executeLinCommand(char const* command, char const* const* args, c
         line.append(" ").append(*arg);
     line += " 2>&1";
     if (line.size() >= runnerSize) {
-        logTooLong(command, __func__);
+        logMisfit(command, __func__);
         return false;
     }
     FILE* const pipe = popen(line.c_str(), "r");
-    if (!pipe)
+    if (!pipe) {
+        // The line itself may hold what is not for the log.
+        LOG::write(unit, LOG::error, LOG::message("Cannot open process: ", command));
         return false;
-    std::size_t length = 0;
-    for (int byte = std::fgetc(pipe); byte != EOF; byte = std::fgetc(pipe))
-        if (length < size - 1)
-            output[length++] = static_cast<char>(byte);
-    output[length] = '\0';
+    }
+    bool const any = FILES::readToEnd(pipe, output, size);
     pclose(pipe);
-    return length > 0;
+    return any;
 }
 
 } // namespace NQ

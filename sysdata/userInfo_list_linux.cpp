@@ -79,8 +79,8 @@ private:
     FILE* shadow_ = nullptr;
     passwd account_{};
     spwd ageing_{};
-    char accountLine_[lineSize];
-    char ageingLine_[lineSize];
+    char accountLine_[lineSize] = "";
+    char ageingLine_[lineSize] = "";
 };
 
 std::string decimal(unsigned int number)

@@ -2,6 +2,7 @@
 
 #include <cstdio>
 #include <cstring>
+#include <vector>
 
 namespace NQ::USER_INFO
 {
@@ -23,10 +24,10 @@ Scan scanLabelledDate(char const* line, char const* label, LabelledDate& date)
     if (!std::strstr(line, label))
         return Scan::absent;
     std::string const format = std::string(label) + " : %s %02d, %04d";
-    std::string month(std::strlen(line) + 1, '\0'); // holds whatever %s can find
+    std::vector<char> month(std::strlen(line) + 1); // holds whatever %s can find
     int const converted = std::sscanf(line, format.c_str(), month.data(), &date.day, &date.year);
     if (converted >= 1)
-        date.month = month.c_str();
+        date.month = month.data();
     if (converted < 3)
         return Scan::invalid;
     if (date.month == "never")

@@ -21,4 +21,17 @@ bool canOpen(char const* path)
     return File(path, "r").stream() != nullptr;
 }
 
+bool readToEnd(FILE* stream, char* buffer, std::size_t size)
+{
+    std::size_t kept = 0;
+    bool any = false;
+    for (int c = std::getc(stream); c != EOF; c = std::getc(stream)) {
+        any = true;
+        if (kept < size - 1)
+            buffer[kept++] = static_cast<char>(c);
+    }
+    buffer[kept] = '\0';
+    return any;
+}
+
 } // namespace NQ::FILES

@@ -3,6 +3,7 @@
 
 #include "util/internal.h"
 
+#include <cstddef>
 #include <cstdio>
 
 /** Files as C streams. Not part of the plug-in's interface. */
@@ -30,6 +31,14 @@ private:
 
 /** Whether the file can be opened for reading. */
 bool canOpen(char const* path);
+
+/**
+ * Reads a stream to its end and keeps what the buffer holds, with a NUL behind it.
+ *
+ * @param size  of the buffer, at least 1
+ * @return whether there was anything to read
+ */
+bool readToEnd(FILE* stream, char* buffer, std::size_t size);
 
 } // namespace MI_INTERNAL
 

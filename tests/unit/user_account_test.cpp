@@ -70,7 +70,7 @@ TEST_F(UserDeletion, RunsNothingWhereTheLineDoesNotFit)
 {
     EXPECT_EQ(userInfo().setDelete(std::string(1024 - 11, 'x')), 1);
     EXPECT_EQ(commands_.ran, Lines{});
-    EXPECT_EQ(errors(), Lines{"Command line too long: userdel -r"});
+    EXPECT_EQ(errors(), Lines{"Command does not fit: userdel -r"});
 }
 
 /** What one ageing operation runs and says; the date is 11 January 2008. */
@@ -190,7 +190,7 @@ TEST_P(AgeingOperation, RunsNothingWhereTheListingDoesNotFitItsBufferOf1024Bytes
 {
     EXPECT_FALSE(set("2008-01-11 00:00:00", std::string(1024 - 9, 'x')));
     EXPECT_EQ(commands_.ran, Lines{});
-    EXPECT_EQ(errors(), Lines{"Command line too long: chage -l"});
+    EXPECT_EQ(errors(), Lines{"Command does not fit: chage -l"});
 }
 
 TEST_P(AgeingOperation, ChangesNothingWhereTheChangeDoesNotFitItsBufferOf1024Bytes)
@@ -199,7 +199,7 @@ TEST_P(AgeingOperation, ChangesNothingWhereTheChangeDoesNotFitItsBufferOf1024Byt
     answerListing("Jan 01, 2008", user);
     EXPECT_FALSE(set("2008-01-11 00:00:00", user));
     EXPECT_EQ(commands_.ran, Lines{"chage -l " + user});
-    EXPECT_EQ(errors(), Lines{std::string("Command line too long: chage ") + GetParam().option});
+    EXPECT_EQ(errors(), Lines{std::string("Command does not fit: chage ") + GetParam().option});
 }
 
 TEST_P(AgeingOperation, RunsAChangeThatFillsItsBuffer)
@@ -242,7 +242,7 @@ Outcome runTool(std::vector<char const*> args, std::string command = "/usr/bin/t
     std::vector<char> output(20000, '#');
     args.push_back("");
     bool const result = userInfo().executeLinCommand(command.data(), args.data(), output.data());
-    return {result, output.data()};
+    return {result, std::string(output.data())};
 }
 
 using CommandRunner = AccountOperation;
@@ -289,6 +289,7 @@ TEST_F(CommandRunner, IsFalseForACommandThatCannotBeStarted)
     Outcome const outcome = runTool({"ignored"});
     EXPECT_FALSE(outcome.result);
     EXPECT_EQ(outcome.output, "");
+    EXPECT_EQ(errors(), Lines{"Cannot open process: /usr/bin/tool"});
 }
 
 TEST_F(CommandRunner, CopiesAllOfTheOutputHoweverLong)
@@ -310,7 +311,7 @@ TEST_F(CommandRunner, RunsNothingWhereTheLineDoesNotFit)
     std::string const argument(5000 - 13 - 1 - 5, 'x');
     EXPECT_FALSE(runTool({"ignored", argument.c_str()}).result);
     EXPECT_EQ(commands_.ran, Lines{});
-    EXPECT_EQ(errors(), Lines{"Command line too long: /usr/bin/tool"});
+    EXPECT_EQ(errors(), Lines{"Command does not fit: /usr/bin/tool"});
 }
 
 /** Asks for the lock of jdoe, with passwd's answer given. */

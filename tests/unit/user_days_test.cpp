@@ -108,8 +108,8 @@ TEST_F(LabelledDays, TakeTheDateAsLocalTime)
     EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 - 3600), 0);
     EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 - 3601), 99999);
     setZone("EST5");
-    EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 + 5 * 3600), 0);
-    EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 + 5 * 3600 - 1), 99999);
+    EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 + 5L * 3600), 0);
+    EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 + 5L * 3600 - 1), 99999);
 }
 
 TEST_F(LabelledDays, LoseTheShortDayOfTheChangeToSummerTime)

@@ -296,7 +296,7 @@ TEST(UserRecord, IsMadeCopiedAndDestroyedInSilence)
     {
         userInfo const user("jdoe");
         userInfo const empty;
-        userInfo const copy(user);
+        std::vector<userInfo> const copies(2, user);
     }
     EXPECT_TRUE(log.records().empty());
 }

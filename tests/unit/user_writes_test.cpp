@@ -56,7 +56,7 @@ protected:
         std::filesystem::current_path(folder);
     }
 
-    ~UserWrite() override
+    void TearDown() override
     {
         std::filesystem::current_path("/");
     }

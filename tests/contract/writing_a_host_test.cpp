@@ -6,7 +6,8 @@
 #include <memory>
 #include <sstream>
 
-namespace {
+namespace
+{
 
 std::string contentOf(std::string const& path)
 {

@@ -215,8 +215,7 @@ TEST(MihostSet, TellsWhatACommandComplainedAbout)
 TEST(MihostRefresh, BuildsUserAndGroupNodesAnew)
 {
     machine::lay("plain");
-    machine::write("/etc/login.defs",
-                   "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+    machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
     machine::write("/etc/passwd", "root:x:0:0::/root:/bin/sh\njdoe:x:1000:1000::/:/bin/sh\n");
     machine::write("/etc/group", "root:x:0:\ncrew:x:1000:\n");
     Outcome const outcome = mihostRun({"--trace", "/tmp/trace", "refresh"});

@@ -1,7 +1,7 @@
 // fill TEMPLATE: prints a manual page, with lists from the catalogue where the template has
 // @PROPERTIES@ and @METHODS@ on lines of their own.
 
-#include "mihost/cli/Catalogue.h"
+#include "mihost/cli/CatalogueText.h"
 
 #include <cctype>
 #include <cstdlib>
@@ -53,20 +53,11 @@ std::string sentence(std::string text)
     return lines(text + '.');
 }
 
-std::string traitsOf(Property const& property)
+/** Such as "number, KiB, live". */
+std::string natureOf(Property const& property)
 {
-    std::string text = valueKindName(property.kind);
-    if (*property.unit != '\0')
-        text += fmt::format(", in {}", property.unit);
-    if (property.has(Property::Live))
-        text += ", live";
-    if (property.has(Property::Unstored))
-        text += ", not stored";
-    if (property.has(Property::Acts))
-        text += ", a write acts";
-    if (property.has(Property::Secret))
-        text += ", secret";
-    return text;
+    std::string const traits = traitsText(property);
+    return typeText(property) + (traits.empty() ? "" : ", " + traits);
 }
 
 void writeProperties(std::ostream& out)
@@ -78,7 +69,7 @@ void writeProperties(std::ostream& out)
                    sentence(kind.meaning));
         for (Property const& property : kind.properties)
             fmt::print(out, ".It Sy {} {}\n.Pq {}\n{}\n", property.id, escaped(property.name),
-                       escaped(traitsOf(property)), lines(property.meaning));
+                       escaped(natureOf(property)), lines(property.meaning));
         fmt::print(out, ".El\n");
     }
 }

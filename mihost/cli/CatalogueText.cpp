@@ -17,12 +17,6 @@ std::string addressForm(NodeKind const& kind)
     return kind.single ? kind.address : fmt::format("{}:NAME", kind.address);
 }
 
-std::string typeText(Property const& property)
-{
-    return *property.unit ? fmt::format("{}, {}", valueKindName(property.kind), property.unit)
-                          : valueKindName(property.kind);
-}
-
 std::vector<std::string> indented(TextTable const& table, std::size_t columns)
 {
     constexpr std::size_t indent = 2;
@@ -144,6 +138,12 @@ std::string methodsDocument()
                                 parameter.meaning);
     }
     return text;
+}
+
+std::string typeText(Property const& property)
+{
+    return *property.unit ? fmt::format("{}, {}", valueKindName(property.kind), property.unit)
+                          : valueKindName(property.kind);
 }
 
 std::string traitsText(Property const& property)

@@ -23,6 +23,9 @@ Json toJson(Method const& method);
 std::string propertiesDocument();
 std::string methodsDocument();
 
+/** A property's kind with its unit, such as "number, KiB". */
+std::string typeText(Property const& property);
+
 /** What is known of a property beyond its kind: "live", "write acts", "secret". */
 std::string traitsText(Property const& property);
 

@@ -3,6 +3,7 @@
 #include "mihost/cli/Address.h"
 #include "mihost/cli/CommandLine.h"
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/MethodCall.h"
 
 #include <CLI/Config.hpp>
 #include <CLI/Formatter.hpp>
@@ -130,9 +131,11 @@ Candidates values(Typed const& typed, std::string const&, NodeNames const&)
 {
     NodeKind const* const kind = kindAt(typed.arguments.at(0));
     Property const* const property = kind ? findProperty(*kind, typed.arguments.at(1)) : nullptr;
-    if (!property || property->kind != ValueKind::Boolean)
-        return {};
-    return {{"true", ""}, {"false", ""}};
+    if (property && property->has(Property::Secret))
+        return {{toBeAsked, "asked for"}};
+    if (property && property->kind == ValueKind::Boolean)
+        return {{"true", ""}, {"false", ""}};
+    return {};
 }
 
 Candidates methodNames(Typed const&, std::string const&, NodeNames const&)
@@ -171,7 +174,7 @@ NodeKind const* namedKind(Method const& method, std::string const& parameter)
 bool isGiven(std::vector<std::string> const& arguments, std::string const& parameter)
 {
     return std::any_of(arguments.begin(), arguments.end(), [&parameter](std::string const& each) {
-        return each == parameter || beginsWith(each, parameter + '=');
+        return beginsWith(each, parameter + '=');
     });
 }
 
@@ -186,10 +189,10 @@ Candidates parameters(Typed const& typed, std::string const& word, NodeNames con
     }
     Candidates all;
     for (Parameter const& parameter : method->parameters)
-        if (!isGiven(typed.arguments, parameter.name)) // a password is better asked for
-            all.push_back(
-                {fmt::format("{}{}", parameter.name, parameter.form == Form::Password ? "" : "="),
-                 parameter.meaning});
+        if (!isGiven(typed.arguments, parameter.name))
+            all.push_back({fmt::format("{}={}", parameter.name,
+                                       parameter.form == Form::Password ? toBeAsked : ""),
+                           parameter.meaning});
     return all;
 }
 

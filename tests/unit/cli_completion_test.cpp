@@ -122,10 +122,11 @@ TEST(Completion, OffersNoParameterTwice)
               Words{"DomainAndMember="});
 }
 
-TEST(Completion, LeavesAPasswordToBeAskedFor)
+TEST(Completion, OffersToAskForAPassword)
 {
-    EXPECT_EQ(after({"call", "UserSetPassword", "P"}), Words{"Password"});
-    EXPECT_EQ(after({"call", "UserSetPassword", "Password", ""}), Words{"UserName="});
+    EXPECT_EQ(after({"call", "UserSetPassword", "P"}), Words{"Password=-"});
+    EXPECT_EQ(after({"call", "UserSetPassword", "Password=-", ""}), Words{"UserName="});
+    EXPECT_EQ(after({"set", "user:root", "password", ""}), Words{"-"});
 }
 
 TEST(Completion, OffersTheAccountsThatAParameterNames)

@@ -12,14 +12,17 @@
  * How a host brings it. The plug-in calls popen and pclose by their ordinary names, so whoever
  * defines them first in the process's scope is asked. Either
  *
- *  - link the program with -lmiaccel, which then stands before libc. A host that wants to choose at
- *    run time calls miaccel_enable before it loads the plug-in, as mihost does for --fast; a program
- *    that calls nothing of this header may need -Wl,--no-as-needed to keep the library. This is the
- *    way to prefer: nothing is left in the environment for the commands that still run; or
+ *  - link the program with -lmiaccel, which then stands before libc. A program that calls nothing of this
+ *    header may need -Wl,--no-as-needed to keep the library. miaccel_enable turns it off and on at
+ *    run time. This is the way to prefer: nothing is left in the environment for the commands that
+ *    still run; or
  *  - start the program with LD_PRELOAD naming this library and nothing else. The commands that
  *    still run inherit it, without harm.
  *
- * Loading it with dlopen changes nothing: libc comes first then.
+ * Loading it with dlopen changes nothing by itself: libc comes first then. A host with a popen and
+ * pclose of its own can call those of the library so loaded, as mihost does for --fast, and is
+ * spared what the library needs while it is not asked for. Load it early: what the process may have
+ * read before (time zones, locales) is taken to be as it was at that time.
  *
  * When it answers. Only where it is sure what the command would print: the shell and the tool that
  * the shell would find through PATH hold what their Debian package installed, in a version whose

@@ -25,6 +25,8 @@ void CommandLine::declare(CLI::App& app)
     app.add_flag("--json", options_.json, "print JSON");
     app.add_flag("--show-secrets", options_.showSecrets, "show password hashes");
     app.add_flag("--yes", options_.yes, "do what would be asked about without asking");
+    app.add_flag("--fast", options_.fast,
+                 "answer read-only commands of the plug-in inside the process");
     app.add_flag("--timing", options_.timing, "tell how long each phase of the start took");
     app.require_subcommand(0, 1);
 

@@ -14,7 +14,13 @@ namespace mihost::commandTap
 namespace
 {
 
+template <class Function> Function* next(char const* name)
+{
+    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
+}
+
 struct State {
+    Runner runner{next<Runner::Open>("popen"), next<Runner::Close>("pclose")};
     Listener* listener = nullptr;
     unsigned int count = 0;
     bool recording = false;
@@ -27,23 +33,6 @@ State& state()
 {
     static State tapped;
     return tapped;
-}
-
-template <class Function> Function* next(char const* name)
-{
-    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
-}
-
-std::FILE* realOpen(char const* line, char const* mode)
-{
-    static auto* const real = next<std::FILE*(char const*, char const*)>("popen");
-    return real(line, mode);
-}
-
-int realClose(std::FILE* stream)
-{
-    static auto* const real = next<int(std::FILE*)>("pclose");
-    return real(stream);
 }
 
 /** Puts another file in a descriptor's place for as long as it lives. */
@@ -85,7 +74,7 @@ std::FILE* start(char const* line, char const* mode)
     std::fflush(stderr);
     Redirection const input(STDIN_FILENO, nothing.get());
     Redirection const complaints(STDERR_FILENO, standardErrorFile());
-    return realOpen(line, mode);
+    return state().runner.open(line, mode);
 }
 
 std::string readToEnd(std::FILE* stream)
@@ -112,7 +101,7 @@ std::FILE* streamOf(std::string const& text)
 std::FILE* record(char const* line, std::FILE* running)
 {
     std::string const output = readToEnd(running);
-    int const status = realClose(running);
+    int const status = state().runner.close(running);
     state().recorded.push_back({line, output});
     std::FILE* const stream = streamOf(output);
     if (stream)
@@ -121,6 +110,11 @@ std::FILE* record(char const* line, std::FILE* running)
 }
 
 } // namespace
+
+void setRunner(Runner const& runner)
+{
+    state().runner = runner;
+}
 
 void setListener(Listener* listener)
 {
@@ -180,7 +174,7 @@ int close(std::FILE* stream)
 {
     auto const found = state().finished.find(stream);
     if (found == state().finished.end())
-        return realClose(stream);
+        return state().runner.close(stream);
     int const status = found->second;
     state().finished.erase(found);
     std::fclose(stream);

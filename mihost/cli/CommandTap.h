@@ -22,6 +22,17 @@ struct RunCommand {
     std::string output;
 };
 
+/** What runs the commands that pass through; libc's own two from the start. */
+struct Runner {
+    using Open = std::FILE*(char const* line, char const* mode);
+    using Close = int(std::FILE* stream);
+
+    Open* open;
+    Close* close;
+};
+
+void setRunner(Runner const& runner);
+
 /** Told of each command line before it starts. */
 class Listener
 {

@@ -16,6 +16,7 @@ struct Options {
     bool showSecrets = false;
     bool yes = false; // do without asking
     bool timing = false;
+    bool fast = false; // commands answered in the process where they can be
 };
 
 } // namespace mihost

@@ -34,6 +34,8 @@ Session::Session(Options options)
         trace_ = std::make_unique<Trace>(options_.trace);
         sinks_.add(trace_->sink());
     }
+    if (options_.fast)
+        accelerator_ = std::make_unique<Accelerator>();
     // The trace stays the machine's own: it is open by now. The plug-in's file has its full path.
     if (options_.sandbox)
         goIntoSandbox(options_.overlay);
@@ -50,11 +52,22 @@ void Session::finish()
     directory_.reset();
     out_.flush();
     if (options_.timing && !timing_.rows().empty())
-        fmt::print(stderr, "{}",
-                   options_.json ? toJson(timing_.rows()).dump() + "\n"
-                                 : timingText(timing_.rows()));
+        fmt::print(stderr, "{}", timingReport());
     if (trace_)
         trace_->finish();
+}
+
+std::string Session::timingReport() const
+{
+    std::vector<Accelerator::Row> answers;
+    if (accelerator_)
+        answers = accelerator_->rows();
+    if (!options_.json)
+        return timingText(timing_.rows()) + answersText(answers);
+    Json report = toJson(timing_.rows());
+    if (accelerator_)
+        report["answers"] = toJson(answers);
+    return report.dump() + "\n";
 }
 
 Plugin& Session::plugin()

@@ -1,6 +1,7 @@
 #ifndef MIHOST_CLI_SESSION_H
 #define MIHOST_CLI_SESSION_H
 
+#include "mihost/cli/Accelerator.h"
 #include "mihost/cli/Address.h"
 #include "mihost/cli/NodeView.h"
 #include "mihost/cli/Options.h"
@@ -21,7 +22,7 @@ class Session
 {
 public:
     /**
-     * Opens the trace and, where that is asked for, goes on in a sandbox.
+     * Opens the trace and, where that is asked for, loads the accelerator and goes on in a sandbox.
      *
      * @throws Failure where one of them cannot be had
      */
@@ -65,6 +66,7 @@ public:
 
 private:
     void start();
+    std::string timingReport() const;
 
     Options options_;
     Output out_;
@@ -72,6 +74,7 @@ private:
     SinkGroup sinks_;
     Timing timing_;
     std::unique_ptr<Trace> trace_;
+    std::unique_ptr<Accelerator> accelerator_;
     std::unique_ptr<PrivateDirectory> directory_;
     std::unique_ptr<Plugin> plugin_;
 };

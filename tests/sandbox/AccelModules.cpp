@@ -38,6 +38,13 @@ void mountEmptyFolder(char const* path)
         throw std::runtime_error(std::string("cannot mount at ") + path);
 }
 
+void bind(char const* from, char const* to)
+{
+    std::filesystem::create_directory(to);
+    if (mount(from, to, nullptr, MS_BIND | MS_REC, nullptr) != 0)
+        throw std::runtime_error(std::string("cannot mount at ") + to);
+}
+
 std::string modulesLine(Loaded const& module)
 {
     std::string const holders = std::accumulate(
@@ -128,8 +135,12 @@ void index()
 
 void load(std::vector<Loaded> const& modules)
 {
-    // Neither of the two takes new files. Nothing else of /proc is read here.
+    // Neither of the two takes new files. All else of /proc is still there, behind links.
+    bind("/proc", "/run/processes");
     mountEmptyFolder("/proc");
+    for (auto const& entry : std::filesystem::directory_iterator("/run/processes"))
+        if (entry.path().filename() != "modules")
+            std::filesystem::create_symlink(entry.path(), "/proc" / entry.path().filename());
     mountEmptyFolder("/sys/module");
     std::string list;
     for (Loaded const& module : modules) {

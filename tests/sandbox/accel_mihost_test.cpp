@@ -1,0 +1,119 @@
+// mihost --fast shows and logs what mihost does without it.
+
+#include "tests/sandbox/AccelModules.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+
+#include <cstdlib>
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+#include <regex>
+#include <sstream>
+
+namespace
+{
+
+using Json = nlohmann::ordered_json;
+using Lines = std::vector<std::string>;
+
+constexpr int logLines = 120;
+constexpr int moduleCount = 30;
+
+/** Modules that the real lsmod and modinfo know, and a log. */
+void makeMachine()
+{
+    machine::lay("plain");
+    setenv("PATH", "/usr/sbin:/usr/bin", 1);
+    std::vector<accelModules::Loaded> loaded;
+    for (int i = 0; i < moduleCount; ++i) {
+        std::string const name = "module_" + std::to_string(i);
+        Lines facts{"description=Module number " + std::to_string(i), "license=GPL",
+                    "parm=debug:How much to say", "parmtype=debug:int"};
+        if (i % 3 != 0)
+            facts.push_back("version=1." + std::to_string(i));
+        accelModules::write("kernel/" + name + ".ko", accelModules::file(facts));
+        loaded.push_back({name, 4096L * i, i % 2, i > 0 ? Lines{"module_0"} : Lines{}});
+    }
+    loaded.push_back({"without_a_file", 1, 0, {}});
+    accelModules::index();
+    accelModules::load(loaded);
+    std::string log;
+    for (int i = 0; i < logLines; ++i)
+        log += "Jan  2 03:04:05 host daemon: line " + std::to_string(i) + '\n';
+    machine::write("/var/log/messages", log + std::string(1000, 'x') + "\nshort\nno end");
+}
+
+/** Without the time of the run, and the one of the boot, which is counted back from it. */
+Lines traceLines(std::string const& file)
+{
+    static std::regex const moment(
+        "(buffer|LastBootTime) = [A-Z][a-z]{2} [A-Z][a-z]{2} [ 0-9]{2} [0-9:]{8}");
+    std::istringstream text(machine::read(file));
+    Lines lines;
+    for (std::string line; std::getline(text, line);)
+        lines.push_back(std::regex_replace(line, moment, "$1 = TIME"));
+    return lines;
+}
+
+TEST(MihostFast, ShowsAndTracesWhatMihostDoesWithoutItLineByLine)
+{
+    makeMachine();
+    Outcome const plain = mihostRun({"--trace", "/tmp/plain", "--json", "list", "drivers"});
+    Outcome const fast = mihostRun({"--trace", "/tmp/fast", "--json", "--fast", "list", "drivers"});
+    EXPECT_EQ(plain.code, 0) << plain.err;
+    EXPECT_EQ(fast.code, 0) << fast.err;
+    EXPECT_EQ(fast.out, plain.out);
+    EXPECT_EQ(Json::parse(fast.out).size(), moduleCount + 1U);
+    Lines const expected = traceLines("/tmp/plain");
+    EXPECT_GT(expected.size(), 5000U);
+    Lines const found = traceLines("/tmp/fast");
+    ASSERT_EQ(found.size(), expected.size());
+    for (std::size_t line = 0; line < found.size(); ++line)
+        ASSERT_EQ(found[line], expected[line]) << line;
+}
+
+TEST(MihostFast, TellsWithTimingHowEachCommandWasAnswered)
+{
+    makeMachine();
+    Outcome const run = mihostRun({"--json", "--timing", "--fast", "get", "os", "os-name"});
+    std::istringstream lines(run.err);
+    Json answers;
+    for (std::string line; std::getline(lines, line);)
+        if (line.rfind("{\"timing\"", 0) == 0)
+            answers = Json::parse(line).at("answers");
+    std::map<std::string, std::pair<int, int>> counts;
+    for (Json const& row : answers)
+        counts[row.at("command")] = {row.at("answered"), row.at("run")};
+    // Each of 50 entries has two properties that ask for the count three times.
+    EXPECT_EQ(counts["wc"], std::pair(1 + 50 * 2 * 3, 0));
+    EXPECT_EQ(counts["sed"], std::pair(100, 0));
+    EXPECT_EQ(counts["date"], std::pair(48, 0));
+    EXPECT_EQ(counts["lsmod"], std::pair(1, 0));
+    EXPECT_EQ(counts["modinfo"], std::pair(moduleCount, 1));
+}
+
+TEST(MihostFast, LetsAStandInOfLsmodWinAndSaysSo)
+{
+    makeMachine();
+    machine::fake("/usr/sbin/lsmod", "echo 'Module Size Used'\necho 'module_7 1 0'\n");
+    Outcome const run =
+        mihostRun({"--timing", "--fast", "list", "drivers", "--columns", "driver-name"});
+    EXPECT_NE(run.out.find("module_7"), std::string::npos) << run.out;
+    EXPECT_EQ(run.out.find("module_8"), std::string::npos) << run.out;
+    EXPECT_NE(run.err.find("lsmod                         0 answered      1 run: "
+                           "PATH does not lead to the command as its package installed it\n"),
+              std::string::npos)
+        << run.err;
+}
+
+TEST(MihostFast, RunsNothingWhereTheAcceleratorIsMissing)
+{
+    machine::remove(ACCEL_FILE);
+    Outcome const run = mihostRun({"--fast", "tree"});
+    EXPECT_EQ(run.code, 2);
+    EXPECT_EQ(run.out, "");
+    EXPECT_EQ(run.err.rfind("mihost: no accelerator, so nothing was run: libmiaccel.so.0: ", 0), 0U)
+        << run.err;
+}
+
+} // namespace

@@ -43,6 +43,7 @@ TEST_F(UserDeletion, RunsUserdelWithTheNameAndReturnsOne)
     commands_.answers["userdel -r jdoe"] = "";
     EXPECT_EQ(userInfo().setDelete("jdoe"), 1);
     EXPECT_EQ(commands_.ran, Lines{"userdel -r jdoe"});
+    EXPECT_EQ(commands_.modes, Lines{"r"});
     EXPECT_EQ(commands_.open, 0);
     EXPECT_EQ(log_.texts(), (Lines{"setDelete: entry", "setDelete: exit"}));
 }
@@ -109,6 +110,7 @@ TEST_P(AgeingOperation, SetsTheDaysFromWhatChageListsToTheDate)
     commands_.answers[ageLine("10")] = "";
     EXPECT_TRUE(set("2008-01-11 00:00:00"));
     EXPECT_EQ(commands_.ran, (Lines{"chage -l jdoe", ageLine("10")}));
+    EXPECT_EQ(commands_.modes, (Lines{"r", "r"}));
     EXPECT_EQ(commands_.open, 0);
     EXPECT_EQ(errors(), Lines{});
 }
@@ -165,6 +167,16 @@ TEST_P(AgeingOperation, TakesTheDateForLocalTime)
 {
     // Two days over the change to summer time are one hour short of two days.
     setenv("TZ", "CET-1CEST,M3.5.0,M10.5.0/3", 1);
+    tzset();
+    answerListing("Mar 29, 2008");
+    set("2008-03-31 00:00:00");
+    EXPECT_EQ(commands_.ran.back(), ageLine("1"));
+}
+
+TEST_P(AgeingOperation, TakesTheVeryBeginningOfTheDay)
+{
+    // Over the change to a summer time that is one second ahead, two days lack that second.
+    setenv("TZ", "AAA0BBB-0:00:01,M3.5.0,M10.5.0", 1);
     tzset();
     answerListing("Mar 29, 2008");
     set("2008-03-31 00:00:00");
@@ -253,6 +265,7 @@ TEST_F(CommandRunner, AppendsTheArgumentsBehindTheProgramAndMergesStandardErrorI
     Outcome const outcome = runTool({"ignored", "-a", "b c"});
     EXPECT_TRUE(outcome.result);
     EXPECT_EQ(outcome.output, "said\n");
+    EXPECT_EQ(commands_.modes, Lines{"r"});
     EXPECT_EQ(commands_.open, 0);
     EXPECT_EQ(log_.texts(), (Lines{"executeLinCommand: entry", "executeLinCommand: exit"}));
 }

@@ -11,6 +11,7 @@
 #include <cstdlib>
 #include <ctime>
 #include <fcntl.h>
+#include <locale>
 #include <new>
 #include <pwd.h>
 #include <string>
@@ -280,6 +281,24 @@ TEST_F(UserListing, HasEmptyTextsForAnEntryThatStandsForARemoteDatabase)
     EXPECT_EQ(users[1].getUserFullName(), "");
     EXPECT_EQ(users[1].getUserHomeDir(), "");
     EXPECT_EQ(users[1].getUserScriptPath(), "");
+}
+
+TEST_F(UserListing, WritesIdsInPlainDecimalWhateverTheHostsLocale)
+{
+    struct Grouped : std::numpunct<char> {
+        std::string do_grouping() const override
+        {
+            return "\3";
+        }
+    };
+    files_.write("/etc/passwd", "jdoe:x:60000:4294967294:::\n");
+    std::locale const before =
+        std::locale::global(std::locale(std::locale::classic(), new Grouped));
+    std::vector<userInfo> users = list();
+    std::locale::global(before);
+    ASSERT_EQ(users.size(), 1U);
+    EXPECT_EQ(users.front().getUserId(), "60000");
+    EXPECT_EQ(users.front().getGroupId(), "4294967294");
 }
 
 TEST_F(UserListing, SetsAllFactsOfAUserInItsOwnOrder)

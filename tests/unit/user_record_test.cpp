@@ -21,6 +21,7 @@ constexpr unsigned long allBitsSet = ~0UL;
 
 constexpr char const* east = "CET-1";
 constexpr char const* west = "EST5";
+constexpr char const* south = "AEST-10AEDT,M10.1.0,M4.1.0/3"; // has summer time in January
 
 void useZone(char const* zone)
 {
@@ -188,6 +189,19 @@ TEST(UserInactiveTime, IsCountedFromTheLocalMidnightOf1January1970)
     EXPECT_EQ(inactiveTime(14000), 1209600000U - 3600);
     useZone(west);
     EXPECT_EQ(inactiveTime(14000), 1209600000U + 5 * 3600);
+}
+
+TEST(UserInactiveTime, IsInSummerTimeWhereJanuaryIs)
+{
+    useZone(south);
+    EXPECT_EQ(inactiveTime(99999), 2147472000U - 11 * 3600);
+    EXPECT_EQ(inactiveTime(14000), 1209600000U - 11 * 3600);
+}
+
+TEST(UserLastChange, IsInSummerTimeWhereJanuaryIs)
+{
+    useZone(south);
+    EXPECT_EQ(lastChange(13879), 1199145600U - 11 * 3600);
 }
 
 TEST(UserInactiveTime, CountsTheDaysAround99999LikeAnyOther)

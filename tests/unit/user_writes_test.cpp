@@ -98,6 +98,7 @@ TEST_F(PasswordWrite, HandsNameAndEncryptedPasswordToChpasswdInAFile)
     commands.answers[setPasswords] = "";
     write(117, NODES::text("$6$salt$hash"));
     EXPECT_EQ(commands.ran, Texts{setPasswords});
+    EXPECT_EQ(commands.modes, Texts{"r"});
     EXPECT_EQ(handedOver, Texts{"anna:$6$salt$hash\n"});
     EXPECT_EQ(commands.open, 0);
     EXPECT_EQ(storedValue(anna(), 117), "text $6$salt$hash true");

@@ -27,13 +27,13 @@ int main(int argc, char** argv)
 
     std::vector<IC::Node*> nodes;
     mi->getMap(nodes);
-    std::map<unsigned int, int> depthOf; // parents come before their children
+    std::map<unsigned int, std::size_t> depthOf; // parents come before their children
     for (IC::Node* entry : nodes) {
         auto const* node = dynamic_cast<IC::MutableNode*>(entry);
-        int const depth = node->getLinkedId() == 0 ? 0 : depthOf[node->getLinkedId()] + 1;
+        std::size_t const depth = node->getLinkedId() == 0 ? 0 : depthOf[node->getLinkedId()] + 1;
         depthOf[node->getNodeId()] = depth;
-        std::cout << std::string(2U * static_cast<unsigned int>(depth), ' ') << node->getNodeId()
-                  << ' ' << node->getDescription() << '\n';
+        std::cout << std::string(2 * depth, ' ') << node->getNodeId() << ' '
+                  << node->getDescription() << '\n';
     }
 
     mi->unload(); // the nodes go before the library that holds their code

@@ -8,7 +8,7 @@ namespace miaccel
 namespace
 {
 
-constexpr std::uint64_t longestLine = 16 * 1024 * kibibyte;
+constexpr std::uint64_t longestLine = std::uint64_t{16} * 1024 * kibibyte;
 
 std::optional<Answer> lineText(TextFile const& file, LineIndex const& index, std::uint64_t line)
 {

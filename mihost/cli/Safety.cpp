@@ -93,12 +93,12 @@ std::optional<std::string> objection(Form form, std::string_view text)
 {
     if (text.empty())
         return "is empty";
-    if (auto const reason = objectionToCharacters(text))
+    if (auto reason = objectionToCharacters(text))
         return form == Form::Password
                    ? "holds a character that may not stand in it; letters, digits "
                      "and @ + - . / _ may"
                    : reason;
-    if (auto const reason = objectionToForm(form, text))
+    if (auto reason = objectionToForm(form, text))
         return reason;
     if (lengthAsArgument(text) > longestArgument)
         return fmt::format("is longer than {} bytes, each blank counting twice", longestArgument);

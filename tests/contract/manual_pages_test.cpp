@@ -75,9 +75,9 @@ TEST(ManualPageOfMihost, TellsOfEveryCommand)
 TEST(ManualPageOfThePlugin, HasTheListsOfTheCatalogue)
 {
     std::string const page = rendered(PLUGIN_PAGE);
-    for (char const* line : {"   os (type 17)\n", "     149 physical-memory-free\n",
-                             "(number, KiB, live) free RAM\n", "     LocalGroupAddUser\n",
-                             "             UserName CMPI_string\n"})
+    for (char const* line :
+         {"   os (type 17)\n", "     149 physical-memory-free\n", "(number, KiB, live) free RAM\n",
+          "     LocalGroupAddUser\n", "             UserName CMPI_string\n"})
         EXPECT_NE(page.find(line), std::string::npos) << line << page;
 }
 

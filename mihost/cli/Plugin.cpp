@@ -104,8 +104,8 @@ std::string Plugin::soname() const
     std::size_t offset = 0;
     for (ElfW(Dyn) const* entry = map->l_ld; entry->d_tag != DT_NULL; ++entry) {
         if (entry->d_tag == DT_STRTAB)
-            strings = reinterpret_cast<char const*>(
-                entry->d_un.d_ptr); // NOLINT(performance-no-int-to-ptr)
+            // NOLINTNEXTLINE(performance-no-int-to-ptr): the loader keeps addresses as numbers
+            strings = reinterpret_cast<char const*>(entry->d_un.d_ptr);
         else if (entry->d_tag == DT_SONAME)
             offset = entry->d_un.d_val;
     }

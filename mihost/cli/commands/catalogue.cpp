@@ -14,6 +14,7 @@ namespace
 template <class Rows> std::vector<std::string> namesOf(Rows const& rows)
 {
     std::vector<std::string> names;
+    names.reserve(std::size(rows));
     for (auto const& row : rows)
         names.emplace_back(row.name);
     return names;

@@ -23,9 +23,12 @@ std::int64_t fileClock()
 
 std::int64_t fileClockTick()
 {
-    timespec tick{};
-    clock_getres(CLOCK_REALTIME_COARSE, &tick);
-    return nanoseconds(tick);
+    static std::int64_t const length = [] {
+        timespec tick{};
+        clock_getres(CLOCK_REALTIME_COARSE, &tick);
+        return nanoseconds(tick);
+    }();
+    return length;
 }
 
 /** Taken when the library is loaded, so with the program's own start. */

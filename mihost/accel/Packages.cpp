@@ -1,10 +1,9 @@
 #include "mihost/accel/Packages.h"
 
+#include <algorithm>
 #include <array>
 #include <fstream>
-#include <glob.h>
 #include <md5.h>
-#include <sstream>
 
 namespace miaccel
 {
@@ -17,23 +16,19 @@ constexpr char const* database = "/var/lib/dpkg/";
 /** Empty where the file cannot be read. */
 std::string contents(std::string const& path)
 {
-    std::ifstream file(path, std::ios::binary);
-    std::ostringstream text;
-    text << file.rdbuf();
-    return text.str();
+    std::ifstream file(path, std::ios::binary | std::ios::ate);
+    std::streamoff const size = file ? std::streamoff(file.tellg()) : 0;
+    std::string text(static_cast<std::size_t>(std::max(size, std::streamoff(0))), '\0');
+    file.seekg(0);
+    return file.read(text.data(), size) ? text : std::string();
 }
 
-/** The digests of all files of a package. One that several architectures can have names its own. */
-std::string digestList(std::string const& package)
+/** The digests of a package's files. One that several architectures can have names its own. */
+std::string digestList(std::string const& package, std::string const& architecture)
 {
-    std::string const pattern = database + ("info/" + package) + "{,:*}.md5sums";
-    glob_t found{};
-    std::string list;
-    if (glob(pattern.c_str(), GLOB_BRACE, nullptr, &found) == 0)
-        for (std::size_t i = 0; i < found.gl_pathc; ++i)
-            list += contents(found.gl_pathv[i]);
-    globfree(&found);
-    return list;
+    std::string const start = database + ("info/" + package);
+    std::string const list = contents(start + ".md5sums");
+    return list.empty() ? contents(start + ':' + architecture + ".md5sums") : list;
 }
 
 std::string digestOf(std::string const& path)
@@ -60,7 +55,7 @@ bool beginsWith(std::string const& text, std::string const& start)
 
 } // namespace
 
-std::string versionIn(std::string const& status, std::string const& package)
+std::string fieldIn(std::string const& status, std::string const& package, std::string const& name)
 {
     std::string const head = "Package: " + package + '\n';
     for (auto at = status.find(head); at != std::string::npos; at = status.find(head, at + 1)) {
@@ -68,7 +63,7 @@ std::string versionIn(std::string const& status, std::string const& package)
             continue;
         std::string const stanza = status.substr(at, status.find("\n\n", at) - at);
         if (field(stanza, "Status") == "install ok installed")
-            return field(stanza, "Version");
+            return field(stanza, name);
     }
     return {};
 }
@@ -91,10 +86,12 @@ std::string digestIn(std::string const& list, std::string const& path)
 
 bool isFromPackage(std::string const& path, std::string const& package, std::string const& version)
 {
-    std::string const installed = versionIn(contents(std::string(database) + "status"), package);
+    std::string const status = contents(std::string(database) + "status");
+    std::string const installed = fieldIn(status, package, "Version");
     if (installed.empty() || !beginsWith(installed, version))
         return false;
-    std::string const listed = digestIn(digestList(package), path);
+    std::string const list = digestList(package, fieldIn(status, package, "Architecture"));
+    std::string const listed = digestIn(list, path);
     return !listed.empty() && listed == digestOf(path);
 }
 

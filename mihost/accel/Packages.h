@@ -15,8 +15,8 @@ namespace miaccel
  */
 bool isFromPackage(std::string const& path, std::string const& package, std::string const& version);
 
-/** The version of an installed package in the text of dpkg's status file; empty where none is. */
-std::string versionIn(std::string const& status, std::string const& package);
+/** What dpkg's status file says of an installed package; empty where it says nothing. */
+std::string fieldIn(std::string const& status, std::string const& package, std::string const& name);
 
 /** The digest that a package's list has for a path, on a merged /usr or not; empty for none. */
 std::string digestIn(std::string const& list, std::string const& path);

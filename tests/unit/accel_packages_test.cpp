@@ -1,3 +1,4 @@
+#include "mihost/accel/Modules.h"
 #include "mihost/accel/Packages.h"
 #include "mihost/accel/Tool.h"
 #include "tests/support/ScratchFolder.h"
@@ -9,7 +10,11 @@ namespace
 {
 
 using miaccel::digestIn;
-using miaccel::versionIn;
+
+std::string versionIn(std::string const& status, std::string const& package)
+{
+    return miaccel::fieldIn(status, package, "Version");
+}
 
 std::string const status = "Package: sed-doc\n"
                            "Status: install ok installed\n"
@@ -38,6 +43,12 @@ TEST(PackageVersion, IsThatOfTheInstalledPackage)
     EXPECT_EQ(versionIn(status, "sed"), "4.9-1");
     EXPECT_EQ(versionIn(status, "sed-doc"), "1");
     EXPECT_EQ(versionIn(status, "last"), "2:3");
+}
+
+TEST(PackageField, IsThatOfItsName)
+{
+    EXPECT_EQ(miaccel::fieldIn(status, "sed", "Section"), "utils");
+    EXPECT_EQ(miaccel::fieldIn(status, "sed", "Architecture"), "");
 }
 
 TEST(PackageVersion, IsEmptyForWhatIsNotInstalled)
@@ -88,6 +99,11 @@ TEST(PackagedFile, IsToldFromOthers)
     EXPECT_FALSE(miaccel::isFromPackage("/usr/bin/wc", "sed", ""));
     EXPECT_FALSE(miaccel::isFromPackage("/usr/bin/nonexistent", "coreutils", ""));
     EXPECT_FALSE(miaccel::isFromPackage("/usr/bin/wc", "nonexistent", ""));
+}
+
+TEST(PackagedFile, MayComeFromAPackageWhoseListNamesItsArchitecture)
+{
+    EXPECT_EQ(miaccel::strangeLibrary(), nullptr);
 }
 
 TEST(Tool, IsReachedByEveryPathToItsFile)

@@ -17,7 +17,7 @@ bool holdsPassword(std::string const& text)
 bool isPlainWord(std::string const& text)
 {
     return std::all_of(text.begin(), text.end(),
-                       [](unsigned char c) { return c < 0x80 && std::isalnum(c); });
+                       [](unsigned char c) { return std::isalnum(c) != 0; });
 }
 
 /** useradd's exit code as its command line echoes it, or a notice without any argument in it. */

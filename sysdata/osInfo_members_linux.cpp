@@ -78,12 +78,12 @@ std::string OSINFO::supplementaryGroups(std::string const& identity, std::string
     std::string::size_type listAt = listStart(identity, primaryAt);
     std::string list;
     // A primary group that has no name has no parentheses either.
-    if (identity.find('(', primaryAt) < listAt) {
-        std::string const primary = nextName(identity, primaryAt).value_or("");
-        // Kept: the names differ in their quotes already, so hardly any is ever left out.
-        if (adding || difference(primary.c_str(), quotedGroup.c_str()) != 1)
-            list = primary + ",";
-    }
+    std::optional<std::string> primary;
+    if (identity.find('(', primaryAt) < listAt)
+        primary = nextName(identity, primaryAt);
+    // Kept: the names differ in their quotes already, so hardly any is ever left out.
+    if (primary && (adding || difference(primary->c_str(), quotedGroup.c_str()) != 1))
+        list = *primary + ",";
     while (std::optional<std::string> const name = nextName(identity, listAt)) {
         std::string const entry = quoted(*name);
         if (adding || entry != quotedGroup)

@@ -140,18 +140,22 @@ INSTANTIATE_TEST_SUITE_P(
                  {"/usr/bin/chage jdoe -c Test -E -1 2>&1"}}),
     nameOf);
 
-INSTANTIATE_TEST_SUITE_P(OfLocalGroups, MethodLines,
-                         testing::Values(LineCase{"Add",
-                                                  "LocalGroupAdd,GroupName:CMPI_string:staff",
-                                                  {"/usr/sbin/groupadd staff 2>&1"}},
-                                         LineCase{"AddTakesNoAccountName",
-                                                  "LocalGroupAdd,GroupName:CMPI_string:staff,"
-                                                  "daysExpireAfter:CMPI_uint32:4",
-                                                  {"/usr/sbin/groupadd staff -I 4 2>&1"}},
-                                         LineCase{"Del",
-                                                  "LocalGroupDel,GroupName:CMPI_string:my staff",
-                                                  {"/usr/sbin/groupdel my\\ staff 2>&1"}}),
-                         nameOf);
+INSTANTIATE_TEST_SUITE_P(
+    OfLocalGroups, MethodLines,
+    testing::Values(LineCase{"Add",
+                             "LocalGroupAdd,GroupName:CMPI_string:staff",
+                             {"/usr/sbin/groupadd staff 2>&1"}},
+                    LineCase{"AddKeepsTheOrderWritten",
+                             "LocalGroupAdd,GroupName:CMPI_string:staff,"
+                             "daysExpireAfter:CMPI_uint32:4",
+                             {"/usr/sbin/groupadd staff -I 4 2>&1"}},
+                    LineCase{"DelKeepsTheOrderWritten",
+                             "LocalGroupDel,UserName:CMPI_string:jdoe,GroupName:CMPI_string:staff",
+                             {"/usr/sbin/groupdel jdoe staff 2>&1"}},
+                    LineCase{"Del",
+                             "LocalGroupDel,GroupName:CMPI_string:my staff",
+                             {"/usr/sbin/groupdel my\\ staff 2>&1"}}),
+    nameOf);
 
 INSTANTIATE_TEST_SUITE_P(
     OfUsermod, MethodLines,

@@ -122,13 +122,25 @@ TEST_F(MethodLimits, Are4999CharactersInALine)
 
 TEST_F(MethodLimits, HoldForTheAgingLineBeforeAnythingRuns)
 {
-    Params params(19, {"daysExpireAfter", "CMPI_uint32", std::string(254, '1')});
-    params.push_back(text("UserName", "jdoe"));
-    params.push_back({"passwordExpirationDate", "CMPI_dateTime", ""}); // ends the list, so it fits
-    expectRun("UserAdd", Params(params.begin(), params.begin() + 1),
-              "/usr/sbin/useradd"
-              " 2>&1;echo rc=$? 2>&1");
+    // The program has 14 characters, each option with its value 258, and " 2>&1" ends the line.
+    std::string const longest(254, '1');
+    std::string const user(4999 - 14 - 19 * 258 - 1 - 5, 'x');
+    Params params(18, {"daysExpireAfter", "CMPI_uint32", longest});
+    params.push_back({"passwordExpirationDate", "CMPI_dateTime", longest});
+    params.push_back(text("UserName", user));
+    expectRun("UserAdd", params, "/usr/sbin/useradd " + user + " 2>&1;echo rc=$? 2>&1");
+    ASSERT_EQ(commands_.ran.size(), 2U);
+    EXPECT_EQ(commands_.ran[1].size(), 4999U);
+    params.back().value += "x";
     expectRefused("UserAdd", params, "/usr/bin/chage");
+}
+
+TEST_F(MethodLimits, DoNotCountWhatTheLineEndsBefore)
+{
+    Params params(21, text("GroupName", std::string(254, 'x')));
+    params.front().value.clear();
+    expectRun("LocalGroupAdd", params, "/usr/sbin/groupadd 2>&1");
+    expectRefused("LocalGroupAdd", Params(params.begin() + 1, params.end()), "/usr/sbin/groupadd");
 }
 
 TEST_F(MethodLimits, LeaveTheHostWithAFailure)
@@ -166,6 +178,7 @@ TEST_F(MemberLimits, LetTheGroupListHave254Characters)
     EXPECT_EQ(execute("LocalGroupAddUser", params_), 1);
     EXPECT_EQ(commands_.ran, Lines{idLine_});
     EXPECT_EQ(log.texts(6000), Lines{"Command line too long: /usr/sbin/usermod"});
+    EXPECT_EQ(log.remarks().back(), "outputBuffer: ");
 }
 
 TEST_F(MemberLimits, LetTheQuotedMemberHave254Characters)

@@ -116,11 +116,38 @@ TEST_F(GroupMemberChanges, MayBeInNoGroupButThePrimaryOne)
     EXPECT_EQ(commands_.ran, linesThatSet("users,\"staff\""));
 }
 
+TEST_F(GroupMemberChanges, AreReadBehindTheWordGroupsWhereThereIsOne)
+{
+    identity("uid=1001(jdoe) gid=100(users) egid=5(tty) groups=27(sudo)\n");
+    EXPECT_EQ(add("staff"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("users,\"sudo\",\"staff\""));
+}
+
 TEST_F(GroupMemberChanges, MayHaveAPrimaryGroupWithoutAName)
 {
+    identity("uid=1001(jdoe) gid=5000\n");
+    EXPECT_EQ(add("staff"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("\"staff\""));
     identity("uid=1001(jdoe) gid=5000 groups=5000,27(sudo),100(users)\n");
     EXPECT_EQ(remove("sudo"), 0);
     EXPECT_EQ(commands_.ran, linesThatSet("\"users\""));
+}
+
+TEST_F(GroupMemberChanges, CannotBeRemovedFromTheirOnlyGroupWithAName)
+{
+    // The empty list ends the arguments before the member, and usermod complains.
+    identity("uid=1001(jdoe) gid=5000 groups=5000,27(sudo)\n");
+    std::string const line = "/usr/sbin/usermod -G 2>&1";
+    commands_.answers[line] = "usermod: option requires an argument -- 'G'\n";
+    EXPECT_EQ(remove("sudo"), 1);
+    EXPECT_EQ(commands_.ran, (Lines{idLine_, line}));
+}
+
+TEST_F(GroupMemberChanges, AreNotTakenFromACutOffName)
+{
+    identity("uid=1001(jdoe) gid=100(us");
+    EXPECT_EQ(add("staff"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("\"staff\""));
 }
 
 TEST_F(GroupMemberChanges, MayHaveNamesThatHoldTheWordsLookedFor)

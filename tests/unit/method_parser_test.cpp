@@ -121,6 +121,19 @@ TEST(MethodParser, IgnoresPartsBeyondTheThird)
     EXPECT_EQ(parsed.params, Texts{"Comment|CMPI_string|12"});
 }
 
+TEST(MethodParser, TakesEveryByteButTheSeparatorsForAPartOfAValue)
+{
+    std::string value;
+    for (int byte = 1; byte < 256; ++byte)
+        if (byte != ',' && byte != ':')
+            value += static_cast<char>(byte);
+    for (std::string const lead : {"", "Password:CMPI_string:s,"}) {
+        Parsed const parsed("UserAdd," + lead + "Comment:CMPI_string:" + value);
+        EXPECT_EQ(parsed.status, 0);
+        EXPECT_EQ(parsed.params.back(), "Comment|CMPI_string|" + value);
+    }
+}
+
 TEST(MethodParser, AppendsToTheList)
 {
     std::string method;

@@ -189,10 +189,20 @@ TEST_F(PasswordSecrecy, CoversOutputThatHoldsTheWordWhereTheCallHasNoPassword)
 {
     libc::hooks().popen = nullptr;
     libc::FakeCommands commands;
-    commands.otherwise = "userdel: Password=Zq7Wx9\nrc=12x\nrc=12\nno newline";
+    commands.otherwise = "userdel: Password=Zq7Wx9\nrc=12x\nrc=X12\nrc=X\n rc=1\nrc=12\nno newline";
     Recording const log;
     execute("UserDel", {text("UserName", "jdoe")});
-    EXPECT_EQ(log.remarks(), Lines{"outputBuffer: (not shown)\n(not shown)\nrc=12\n(not shown)\n"});
+    EXPECT_EQ(log.remarks(), Lines{"outputBuffer: (not shown)\n(not shown)\n(not shown)\n"
+                                   "(not shown)\n(not shown)\nrc=12\n(not shown)\n"});
+}
+
+TEST_F(PasswordSecrecy, LeavesTheMessagesWithoutTheText)
+{
+    Recording const log;
+    write("Password=Zq7Wx9");
+    write("UserAdd,A:Password=Zq7Wx9:b");
+    EXPECT_TRUE(log.has("method=", 3000));
+    EXPECT_EQ(log.texts(6000), (Lines{"Unknown method: ", "Unknown parameter type: "}));
 }
 
 TEST_F(PasswordSecrecy, LeavesNamesThatMerelyHoldTheWordInTheLog)

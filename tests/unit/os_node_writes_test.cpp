@@ -160,6 +160,28 @@ TEST_F(OsNodeWrites, OfZeroToTheRefreshTriggerRebuildUsersAndThenGroups)
     EXPECT_EQ(stored(75), "number 0 true");
 }
 
+TEST_F(OsNodeWrites, PublishTheNodesThatTheyRebuildAndDeleteThoseBefore)
+{
+    files_.write("/etc/passwd", "root:x:0:0:root:/root:/bin/sh\n");
+    files_.write("/etc/group", "root:x:0:\n");
+    commands_.answers["wc -l /var/log/messages"] = "1 /var/log/messages\n";
+    for (unsigned int round = 0; round < 2; ++round) {
+        frame_.published.clear();
+        frame_.deleted.clear();
+        write(75, 0);
+        EXPECT_EQ(frame_.published.size(), 2U);
+        EXPECT_EQ(frame_.deleted.size(), 2U * round);
+    }
+    frame_.createLogNodes();
+    for (unsigned int round = 0; round < 2; ++round) {
+        frame_.published.clear();
+        frame_.deleted.clear();
+        write(191, 9);
+        EXPECT_EQ(frame_.published.size(), 1U);
+        EXPECT_EQ(frame_.deleted.size(), round);
+    }
+}
+
 TEST_F(OsNodeWrites, OfOtherNumbersToTheRefreshTriggerRebuildNothing)
 {
     Recording const log;

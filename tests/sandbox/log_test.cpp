@@ -1,5 +1,6 @@
 // The system log as the real wc, sed and date tell of it.
 
+#include "mihost/runtime/Runtime.h"
 #include "nodes/ids.h"
 #include "tests/support/Libc.h"
 #include "tests/support/Machine.h"
@@ -320,6 +321,76 @@ TEST_F(Log, IsWithoutTimesWhereDateSpeaksAnotherForm)
     EXPECT_EQ(stored(*entries().at(0), NODES::creationTime), "(unset)");
     EXPECT_EQ(messages(), newest(1, 1));
     EXPECT_TRUE(recording.has("Invalid format: buffer = 2026-11-21\n", 6000));
+}
+
+/** Counts the nodes that the host is told of. */
+struct Told : mihost::NodeObserver {
+    Told()
+    {
+        mihost::setNodeObserver(this);
+    }
+
+    ~Told() override
+    {
+        mihost::setNodeObserver(nullptr);
+    }
+
+    void nodeAdded(IC::Node const&) override
+    {
+        ++added;
+    }
+
+    void nodeDeleted(IC::Node const&) override
+    {
+        ++deleted;
+    }
+
+    int added = 0;
+    int deleted = 0;
+};
+
+TEST_F(Log, LosesItsEntriesThroughTheHostWhenItIsCleared)
+{
+    machine::write(path, lines(3), 0640);
+    plugin.initialize();
+    IC::MutableNode const* const log = &plugin.node(NODES::logType);
+    Told const told;
+    plugin.node(NODES::operatingSystemType).setProperty(NODES::clearLog, {IC::Number(9U), true});
+    EXPECT_EQ(told.deleted, 3);
+    EXPECT_EQ(told.added, 0);
+    EXPECT_TRUE(entries().empty());
+    EXPECT_EQ(&plugin.node(NODES::logType), log);
+    EXPECT_EQ(machine::read(path), "");
+    EXPECT_EQ(std::filesystem::status(path).permissions(), std::filesystem::perms(0640));
+}
+
+TEST_F(Log, GetsNewEntriesForLinesThatCameDuringTheClearing)
+{
+    startOn(lines(2));
+    // A logger that writes between the clearing and the count.
+    machine::write("/usr/local/bin/wc",
+                   "#!/bin/sh\n[ -s /var/log/messages ] || "
+                   "echo 'Nov 20 10:11:40 news' >/var/log/messages\n"
+                   "exec /usr/bin/wc \"$@\"\n",
+                   0755);
+    Told const told;
+    plugin.node(NODES::operatingSystemType).setProperty(NODES::clearLog, {IC::Number(9U), true});
+    EXPECT_EQ(told.deleted, 2);
+    EXPECT_EQ(told.added, 1);
+    EXPECT_EQ(messages(), Texts{"*news*"});
+}
+
+TEST_F(Log, KeepsLinesAndEntriesWhereItMayNotBeCleared)
+{
+    startOn(lines(2));
+    ASSERT_EQ(setgroups(0, nullptr), 0);
+    ASSERT_EQ(setresgid(65534, 65534, 65534), 0);
+    ASSERT_EQ(setresuid(65534, 65534, 65534), 0);
+    Told const told;
+    plugin.node(NODES::operatingSystemType).setProperty(NODES::clearLog, {IC::Number(9U), true});
+    EXPECT_EQ(machine::read(path), lines(2));
+    EXPECT_EQ(messages(), newest(2, 2));
+    EXPECT_EQ(told.deleted + told.added, 0);
 }
 
 TEST_F(Log, StaysAsItIsWhenAnEntryIsWritten)

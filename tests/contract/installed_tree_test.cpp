@@ -102,6 +102,16 @@ TEST_F(InstalledTree, RunsMihostWithThePluginBesideIt)
     EXPECT_NE(outcome.out, "");
 }
 
+#ifdef ACCEL_FILE
+TEST_F(InstalledTree, RunsMihostWithTheAcceleratorBesideIt)
+{
+    EXPECT_TRUE(fs::is_regular_file(libraries() / "libmiaccel.so"));
+    EXPECT_TRUE(fs::is_regular_file(prefix() / "include/mihost/mihost/accel/Accel.h"));
+    Outcome const outcome = runToEnd({prefix() / "bin/mihost", "--fast", "get", "os", "os-name"});
+    EXPECT_EQ(outcome.code, 0) << outcome.err;
+}
+#endif
+
 TEST_F(InstalledTree, GivesAHostHeadersAndRuntimeThroughPkgConfig)
 {
     setenv("PKG_CONFIG_PATH", (libraries() / "pkgconfig").c_str(), 1);

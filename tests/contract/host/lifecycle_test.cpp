@@ -193,7 +193,10 @@ TEST_F(Lifecycle, TheTreeStandsWhateverTheSettersAnswer)
 
 TEST_F(Lifecycle, NodesOfTheStartAreNotPublishedOneByOne)
 {
+    commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
     plugin.initialize();
+    for (unsigned int const type : {NODES::userType, NODES::groupType, NODES::logEntryType})
+        EXPECT_FALSE(plugin.nodes(type).empty());
     for (std::string const& event : host.events)
         EXPECT_EQ(event.find("addNewNode"), std::string::npos) << event;
 }

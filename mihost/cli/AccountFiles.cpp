@@ -1,7 +1,8 @@
 #include "mihost/cli/AccountFiles.h"
 
+#include "mihost/cli/Lines.h"
+
 #include <algorithm>
-#include <fstream>
 
 namespace mihost
 {
@@ -21,16 +22,7 @@ constexpr File files[] = {
     {"/etc/gshadow", true},
 };
 
-std::vector<std::string> linesOf(char const* path)
-{
-    std::ifstream file(path);
-    std::vector<std::string> lines;
-    for (std::string line; std::getline(file, line);)
-        lines.push_back(line);
-    return lines;
-}
-
-std::vector<std::string> linesOf(AccountFiles const& all, char const* path)
+std::vector<std::string> linesIn(AccountFiles const& all, char const* path)
 {
     auto const found = all.find(path);
     return found == all.end() ? std::vector<std::string>() : found->second;
@@ -70,7 +62,7 @@ AccountFiles readAccountFiles()
 {
     AccountFiles all;
     for (File const& file : files)
-        all[file.path] = linesOf(file.path);
+        all[file.path] = linesOf(contentOf(file.path));
     return all;
 }
 
@@ -79,8 +71,8 @@ std::vector<FileChange> changesBetween(AccountFiles const& before, AccountFiles 
 {
     std::vector<FileChange> changes;
     for (File const& file : files) {
-        auto const old = linesOf(before, file.path);
-        auto const now = linesOf(after, file.path);
+        auto const old = linesIn(before, file.path);
+        auto const now = linesIn(after, file.path);
         FileChange change{file.path, missingIn(old, now), missingIn(now, old)};
         if (change.removed.empty() && change.added.empty())
             continue;

@@ -27,6 +27,7 @@ struct CommandRow {
     char const* name;
     char const* summary;
     std::unique_ptr<Command> (*make)();
+    bool notInShell = false;
 };
 
 /** Every command, in the order of the help text. */

@@ -4,15 +4,18 @@
 
 #include <CLI/Config.hpp>
 #include <CLI/Formatter.hpp>
+#include <algorithm>
 #include <fmt/format.h>
 
 namespace mihost
 {
 
-void CommandLine::declare(CLI::App& app)
+CommandLine::CommandLine(Place place, Options const& defaults) : place_(place), options_(defaults)
 {
-    app.fallthrough();
-    app.set_help_all_flag("--help-all", "help for every command");
+}
+
+void CommandLine::declareForProgram(CLI::App& app)
+{
     app.set_version_flag("--version", "mihost " MIHOST_VERSION);
     app.add_option("--plugin", options_.plugin, "load this plug-in file")->type_name("FILE");
     app.add_option("--trace", options_.trace,
@@ -22,6 +25,15 @@ void CommandLine::declare(CLI::App& app)
                  "run everything in a copy of this machine; nothing on the machine changes");
     app.add_option("--overlay", options_.overlay, "lay the files of DIR over the sandbox first")
         ->type_name("DIR");
+    app.add_flag("--timing", options_.timing, "tell how long each phase of the start took");
+}
+
+void CommandLine::declare(CLI::App& app)
+{
+    app.fallthrough();
+    app.set_help_all_flag("--help-all", "help for every command");
+    if (place_ == Place::Program)
+        declareForProgram(app);
     app.add_flag("--json", options_.json, "print JSON");
     app.add_flag("--show-secrets", options_.showSecrets, "show password hashes");
     app.add_flag("--yes", options_.yes, "do what would be asked about without asking");
@@ -31,17 +43,20 @@ void CommandLine::declare(CLI::App& app)
     app.require_subcommand(0, 1);
 
     for (CommandRow const& row : commands()) {
-        all_.push_back(row.make());
-        all_.back()->declare(*app.add_subcommand(row.name, row.summary));
+        if (place_ == Place::Shell && row.notInShell)
+            continue;
+        all_.emplace_back(row.name, row.make());
+        all_.back().second->declare(*app.add_subcommand(row.name, row.summary));
     }
 }
 
-void CommandLine::parse(int argc, char** argv)
+void CommandLine::parse(std::vector<std::string> words)
 {
     CLI::App app("Loads the management-interface plug-in, shows its tree and drives it.", "mihost");
     declare(app);
     try {
-        app.parse(argc, argv);
+        std::reverse(words.begin(), words.end()); // as it wants them
+        app.parse(words);
     } catch (CLI::CallForHelp const&) {
         app.exit(CLI::CallForHelp());
         return;
@@ -52,14 +67,15 @@ void CommandLine::parse(int argc, char** argv)
         app.exit(version);
         return;
     } catch (CLI::ParseError const& error) {
-        throw Failure(BadUsage, fmt::format("{} (mihost --help tells more)", error.what()));
+        throw Failure(BadUsage, fmt::format("{} ({} tells more)", error.what(),
+                                            place_ == Place::Shell ? "help" : "mihost --help"));
     }
     options_.sandbox = options_.sandbox || !options_.overlay.empty();
     auto const chosen = app.get_subcommands();
     std::string const name = chosen.empty() ? "tree" : chosen.front()->get_name();
-    for (std::size_t at = 0; at < all_.size(); ++at)
-        if (commands()[at].name == name)
-            command_ = all_[at].get();
+    for (auto const& [known, command] : all_)
+        if (known == name)
+            command_ = command.get();
 }
 
 } // namespace mihost

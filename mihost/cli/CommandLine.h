@@ -11,6 +11,11 @@ namespace mihost
 class CommandLine
 {
 public:
+    /** In the shell the options that settle how the plug-in is loaded are out of reach. */
+    enum class Place { Program, Shell };
+
+    explicit CommandLine(Place place = Place::Program, Options const& defaults = {});
+
     /** Adds all options and commands. What the application is given then ends up here. */
     void declare(CLI::App& app);
 
@@ -19,7 +24,7 @@ public:
      *
      * @throws Failure (BadUsage)
      */
-    void parse(int argc, char** argv);
+    void parse(std::vector<std::string> words);
 
     Options const& options() const
     {
@@ -33,8 +38,11 @@ public:
     }
 
 private:
+    void declareForProgram(CLI::App& app);
+
+    Place place_;
     Options options_;
-    std::vector<std::unique_ptr<Command>> all_;
+    std::vector<std::pair<std::string, std::unique_ptr<Command>>> all_;
     Command* command_ = nullptr;
 };
 

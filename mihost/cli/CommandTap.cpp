@@ -1,5 +1,6 @@
 #include "mihost/cli/CommandTap.h"
 
+#include "mihost/cli/Interrupts.h"
 #include "mihost/sandbox/Descriptor.h"
 
 #include <array>
@@ -74,6 +75,7 @@ std::FILE* start(char const* line, char const* mode)
     std::fflush(stderr);
     Redirection const input(STDIN_FILENO, nothing.get());
     Redirection const complaints(STDERR_FILENO, standardErrorFile());
+    interrupts::KeptFromCommands const kept;
     return state().runner.open(line, mode);
 }
 
@@ -157,6 +159,16 @@ std::string takeStandardError()
         text.clear();
     lseek(file, 0, SEEK_SET);
     return text;
+}
+
+std::string outputOf(std::string const& line)
+{
+    std::FILE* const running = start(line.c_str(), "r");
+    if (!running)
+        return "";
+    std::string output = readToEnd(running);
+    realClose(running);
+    return output;
 }
 
 std::FILE* open(char const* line, char const* mode)

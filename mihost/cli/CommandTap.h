@@ -65,6 +65,9 @@ public:
 /** What commands have written to their standard error since this was last asked. */
 std::string takeStandardError();
 
+/** Runs a command line of the program's own. @return what it prints; empty where it cannot start */
+std::string outputOf(std::string const& line);
+
 /** Where popen and pclose come in. */
 std::FILE* open(char const* line, char const* mode);
 int close(std::FILE* stream);

@@ -1,7 +1,6 @@
 #include "mihost/cli/Completion.h"
 
 #include "mihost/cli/Address.h"
-#include "mihost/cli/CommandLine.h"
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/MethodCall.h"
 
@@ -189,7 +188,7 @@ Candidates parameters(Typed const& typed, std::string const& word, NodeNames con
     }
     Candidates all;
     for (Parameter const& parameter : method->parameters)
-        if (!isGiven(typed.arguments, parameter.name))
+        if (!isGiven(typed.arguments, parameter.name)) // a password is better asked for
             all.push_back({fmt::format("{}={}", parameter.name,
                                        parameter.form == Form::Password ? toBeAsked : ""),
                            parameter.meaning});
@@ -323,9 +322,10 @@ Completion anything(Typed const& typed, std::string const& word, NodeNames const
 
 } // namespace
 
-Completion complete(std::vector<std::string> const& words, NodeNames const& names)
+Completion complete(std::vector<std::string> const& words, NodeNames const& names,
+                    CommandLine::Place place)
 {
-    CommandLine line;
+    CommandLine line(place);
     CLI::App program;
     line.declare(program);
     Typed typed(program);

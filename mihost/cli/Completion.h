@@ -2,6 +2,7 @@
 #define MIHOST_CLI_COMPLETION_H
 
 #include "mihost/cli/Catalogue.h"
+#include "mihost/cli/CommandLine.h"
 
 #include <functional>
 #include <string>
@@ -30,7 +31,8 @@ using NodeNames = std::function<std::vector<std::string>(NodeKind const& kind)>;
  * @param words  a command line without the program's name; the last word is the one being typed and
  *               may be empty
  */
-Completion complete(std::vector<std::string> const& words, NodeNames const& names);
+Completion complete(std::vector<std::string> const& words, NodeNames const& names,
+                    CommandLine::Place place = CommandLine::Place::Program);
 
 /**
  * What a shell's completion script reads: a line that says words, files or folders, then a line for

@@ -30,6 +30,9 @@ private:
     ExitCode code_;
 };
 
+/** Says on standard error, on one line, what went wrong. */
+void tell(Failure const& failure);
+
 } // namespace mihost
 
 #endif

@@ -1,9 +1,14 @@
 #include "mihost/cli/Interrupts.h"
 
+#include <algorithm>
 #include <cerrno>
+#include <cmath>
 #include <cstring>
 #include <fcntl.h>
+#include <iterator>
+#include <poll.h>
 #include <unistd.h>
+#include <utility>
 
 namespace mihost::interrupts
 {
@@ -12,13 +17,15 @@ namespace
 {
 
 constexpr int endingSignals[] = {SIGINT, SIGTERM, SIGHUP, SIGQUIT};
+constexpr int terminalSignals[] = {SIGINT, SIGQUIT, SIGHUP};
 
 // Read by the handler, so nothing but plain data; what is pointed to belongs to others.
 char const* volatile folder = nullptr;
 termios const* volatile terminal = nullptr;
 char const* volatile lastWords = nullptr;
-volatile std::sig_atomic_t noting = 0;
-volatile std::sig_atomic_t noted = 0;
+volatile std::sig_atomic_t noted = 0; // the signal
+
+bool holding = false;
 
 /** The one file that the plug-in makes where it stands. */
 void removeFolder(char const* path)
@@ -43,19 +50,20 @@ void endBy(int signal)
 void handle(int signal)
 {
     int const before = errno;
-    if (signal == SIGINT && noting != 0) {
-        noted = 1;
-    } else {
-        if (char const* const words = lastWords)
-            if (write(STDERR_FILENO, words, std::strlen(words)) < 0)
-                errno = 0; // nobody is there to be told
-        if (termios const* const settings = terminal)
-            tcsetattr(STDIN_FILENO, TCSANOW, settings);
-        if (char const* const path = folder)
-            removeFolder(path);
-        endBy(signal);
-    }
+    if (char const* const words = lastWords)
+        if (write(STDERR_FILENO, words, std::strlen(words)) < 0)
+            errno = 0; // nobody is there to be told
+    if (termios const* const settings = terminal)
+        tcsetattr(STDIN_FILENO, TCSANOW, settings);
+    if (char const* const path = folder)
+        removeFolder(path);
+    endBy(signal);
     errno = before;
+}
+
+void note(int signal)
+{
+    noted = signal;
 }
 
 void ignore(int) {}
@@ -113,36 +121,71 @@ Held::Held()
     for (int const signal : endingSignals)
         sigaddset(&set, signal);
     sigprocmask(SIG_BLOCK, &set, &before_);
+    holding = true;
 }
 
 Held::~Held()
 {
+    holding = false;
     sigprocmask(SIG_SETMASK, &before_, nullptr);
+}
+
+KeptFromCommands::KeptFromCommands() : holding_(holding)
+{
+    if (!holding_)
+        return;
+    sigpending(&pending_);
+    struct sigaction ignored {
+    };
+    ignored.sa_handler = SIG_IGN;
+    for (std::size_t at = 0; at < std::size(terminalSignals); ++at)
+        sigaction(terminalSignals[at], &ignored, &before_[at]);
+}
+
+KeptFromCommands::~KeptFromCommands()
+{
+    if (!holding_)
+        return;
+    for (std::size_t at = 0; at < std::size(terminalSignals); ++at) {
+        sigaction(terminalSignals[at], &before_[at], nullptr);
+        // To ignore a signal is to forget one that waits.
+        if (sigismember(&pending_, terminalSignals[at]) == 1)
+            raise(terminalSignals[at]);
+    }
 }
 
 Noted::Noted()
 {
+    sigset_t set;
+    sigemptyset(&set);
+    sigaddset(&set, SIGINT);
+    sigaddset(&set, SIGWINCH);
+    sigprocmask(SIG_BLOCK, &set, &before_);
     noted = 0;
-    noting = 1;
+    sigaction(SIGINT, nullptr, &interruptBefore_);
     if (!isIgnored(SIGINT))
-        setHandler(SIGINT, handle, 0); // waits and reads end early
+        setHandler(SIGINT, note, 0);
+    sigaction(SIGWINCH, nullptr, &resizeBefore_);
+    setHandler(SIGWINCH, note, 0);
 }
 
 Noted::~Noted()
 {
-    if (!isIgnored(SIGINT))
-        setHandler(SIGINT, handle, SA_RESTART);
-    noting = 0;
+    sigaction(SIGINT, &interruptBefore_, nullptr);
+    sigaction(SIGWINCH, &resizeBefore_, nullptr);
+    sigprocmask(SIG_SETMASK, &before_, nullptr);
 }
 
-bool Noted::came()
+Noted::Event Noted::wait(int descriptor, double seconds) const
 {
-    return noted != 0;
-}
-
-void Noted::forget()
-{
-    noted = 0;
+    double whole = 0;
+    double const rest = std::modf(std::max(seconds, 0.0), &whole);
+    timespec const time{static_cast<time_t>(whole), static_cast<long>(rest * 1e9)};
+    pollfd input{descriptor, POLLIN, 0};
+    int const ready = ppoll(&input, 1, seconds < 0 ? nullptr : &time, &before_);
+    if (int const signal = std::exchange(noted, 0); signal != 0)
+        return signal == SIGINT ? Event::Interrupt : Event::Resize;
+    return ready > 0 ? Event::Input : Event::Timeout;
 }
 
 } // namespace mihost::interrupts

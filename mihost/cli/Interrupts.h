@@ -25,7 +25,6 @@ void setLastWords(char const* text);
 
 /**
  * Holds signals back for as long as it lives: a change to the system that has begun is finished.
- * Commands started meanwhile hold them back, too.
  */
 class Held
 {
@@ -39,7 +38,28 @@ private:
     sigset_t before_;
 };
 
-/** For as long as it lives, SIGINT ends no more than what asks whether it came. */
+/**
+ * Where signals are held, keeps those that a terminal sends from commands started during its life.
+ * A shell undoes a mask, so the commands ignore them.
+ */
+class KeptFromCommands
+{
+public:
+    KeptFromCommands();
+    ~KeptFromCommands();
+    KeptFromCommands(KeptFromCommands const&) = delete;
+    KeptFromCommands& operator=(KeptFromCommands const&) = delete;
+
+private:
+    bool const holding_;
+    struct sigaction before_[3]{};
+    sigset_t pending_{};
+};
+
+/**
+ * For as long as it lives, SIGINT ends nothing, and neither it nor SIGWINCH comes but in wait: so
+ * none slips in between asking whether it came and waiting for it.
+ */
 class Noted
 {
 public:
@@ -48,10 +68,20 @@ public:
     Noted(Noted const&) = delete;
     Noted& operator=(Noted const&) = delete;
 
-    static bool came();
+    enum class Event { Input, Interrupt, Resize, Timeout };
 
-    /** Forgets that it came. */
-    static void forget();
+    /**
+     * @param descriptor  waited for input on; negative for none
+     * @param seconds     how long; negative for ever
+     */
+    Event wait(int descriptor, double seconds) const;
+
+private:
+    sigset_t before_;
+    struct sigaction interruptBefore_ {
+    };
+    struct sigaction resizeBefore_ {
+    };
 };
 
 } // namespace mihost::interrupts

@@ -15,6 +15,7 @@ void Output::write(std::string_view text)
 {
     if (std::fwrite(text.data(), 1, text.size(), stream_) != text.size())
         fail();
+    size_ += text.size();
 }
 
 void Output::line(std::string_view text)
@@ -32,6 +33,22 @@ void Output::flush()
 {
     if (std::fflush(stream_) != 0)
         fail();
+}
+
+std::string Output::bold(std::string const& text) const
+{
+    return styled("\x1b[1m", text);
+}
+
+std::string Output::faint(std::string const& text) const
+{
+    return styled("\x1b[2m", text);
+}
+
+std::string Output::styled(char const* start, std::string const& text) const
+{
+    constexpr char end[] = "\x1b[0m";
+    return terminal::takesColours(fileno(stream_)) ? start + text + end : text;
 }
 
 void Output::fail()

@@ -34,6 +34,16 @@ public:
     /** @throws as write */
     void flush();
 
+    /** The text in bold or faint where that can be shown. */
+    std::string bold(std::string const& text) const;
+    std::string faint(std::string const& text) const;
+
+    /** How much was written so far. */
+    std::size_t size() const
+    {
+        return size_;
+    }
+
     /** Columns of the terminal it goes to, 0 where it is none. */
     unsigned int width() const
     {
@@ -42,8 +52,10 @@ public:
 
 private:
     [[noreturn]] static void fail();
+    std::string styled(char const* start, std::string const& text) const;
 
     std::FILE* stream_;
+    std::size_t size_ = 0;
 };
 
 } // namespace mihost

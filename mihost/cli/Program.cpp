@@ -6,10 +6,8 @@
 #include "mihost/cli/Interrupts.h"
 #include "mihost/cli/LocalNames.h"
 #include "mihost/cli/Session.h"
-#include "mihost/runtime/Text.h"
 
 #include <clocale>
-#include <fmt/format.h>
 
 namespace mihost
 {
@@ -17,7 +15,7 @@ namespace mihost
 namespace
 {
 
-/** Runs the step. What goes wrong is told on one line and becomes the exit code. */
+/** Runs the step. What goes wrong becomes the exit code. */
 template <class Step> int guarded(Step step)
 {
     try {
@@ -26,7 +24,7 @@ template <class Step> int guarded(Step step)
     } catch (OutputClosed const&) {
         return Done;
     } catch (Failure const& failure) {
-        fmt::print(stderr, "mihost: {}\n", printable(failure.what()));
+        tell(failure);
         return failure.code();
     }
 }
@@ -52,7 +50,10 @@ int runProgram(int argc, char** argv)
     interrupts::install();
 
     CommandLine line;
-    if (int const code = guarded([&] { line.parse(argc, argv); }); code != Done || !line.command())
+    if (int const code = guarded([&] {
+            line.parse({argv + 1, argv + argc});
+        });
+        code != Done || !line.command())
         return code;
     std::unique_ptr<Session> session;
     int const run = guarded([&] {
@@ -62,7 +63,10 @@ int runProgram(int argc, char** argv)
     if (!session)
         return run;
     int const end = guarded([&] { session->finish(); });
-    return run != Done ? run : end;
+    for (int const code : {run, static_cast<int>(session->exitCode()), end})
+        if (code != Done)
+            return code;
+    return Done;
 }
 
 } // namespace mihost

@@ -18,25 +18,31 @@ namespace
 constexpr char clearLine[] = "\r\x1b[K";
 constexpr unsigned int mostLogEntries = 50;
 constexpr unsigned int closely = 200; // beyond that many steps only every so many are shown
-constexpr unsigned int noLimit = std::numeric_limits<unsigned int>::max();
-
-unsigned int linesOf(char const* path, unsigned int most)
+unsigned int logEntries()
 {
-    std::ifstream file(path);
+    std::ifstream file("/var/log/messages");
     unsigned int count = 0;
-    while (count < most && file.ignore(std::numeric_limits<std::streamsize>::max(), '\n') &&
-           !file.eof())
+    while (count < mostLogEntries &&
+           file.ignore(std::numeric_limits<std::streamsize>::max(), '\n') && !file.eof())
         ++count;
     return count;
+}
+
+/** The lines that lsmod prints below its heading. */
+unsigned int drivers()
+{
+    std::string const listing = commandTap::outputOf("lsmod");
+    auto const lines = std::count(listing.begin(), listing.end(), '\n');
+    return lines > 0 ? static_cast<unsigned int>(lines - 1) : 0;
 }
 
 /** How many steps a phase has, where that can be told beforehand. */
 unsigned int stepsOf(Phase const& phase)
 {
     if (std::strcmp(phase.function, "createDriverNodes") == 0)
-        return linesOf("/proc/modules", noLimit);
+        return drivers();
     if (std::strcmp(phase.function, "createLogEntryNodes") == 0)
-        return linesOf("/var/log/messages", mostLogEntries);
+        return logEntries();
     return 0;
 }
 

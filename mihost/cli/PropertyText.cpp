@@ -16,9 +16,11 @@ void writeProperties(std::vector<PropertyView> const& properties, std::string co
         width = std::max(width, nameOf(property).size());
     for (PropertyView const& property : properties) {
         bool const hasUnit = property.row && *property.row->unit;
-        out.line(fmt::format("{}{:>3} {:<{}}  {}{}{}", indent, property.id, nameOf(property), width,
-                             printable(valueText(property)), hasUnit ? " " : "",
-                             hasUnit ? property.row->unit : ""));
+        std::string line = fmt::format("{}{:>3} {:<{}}  {}{}{}", indent, property.id,
+                                       nameOf(property), width, printable(valueText(property)),
+                                       hasUnit ? " " : "", hasUnit ? property.row->unit : "");
+        line.erase(line.find_last_not_of(' ') + 1);
+        out.line(line);
     }
 }
 

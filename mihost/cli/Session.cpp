@@ -1,6 +1,5 @@
 #include "mihost/cli/Session.h"
 
-#include "mihost/cli/Failure.h"
 #include "mihost/cli/Progress.h"
 #include "mihost/cli/Terminal.h"
 #include "mihost/runtime/Text.h"
@@ -114,6 +113,22 @@ std::vector<IC::MutableNode*> Session::nodes()
 IC::MutableNode& Session::node(std::string const& address)
 {
     return findNode(nodes(), address);
+}
+
+void Session::endWith(ExitCode code)
+{
+    if (exitCode_ == Done)
+        exitCode_ = code;
+}
+
+std::string Session::askSecret(std::string const& name) const
+{
+    if (scripted_)
+        throw Failure(BadUsage,
+                      fmt::format("{} cannot be read, since standard input is the script; "
+                                  "it may stand there",
+                                  name));
+    return terminal::readSecret(name);
 }
 
 void Session::confirm(std::string const& what) const

@@ -3,6 +3,7 @@
 
 #include "mihost/cli/Accelerator.h"
 #include "mihost/cli/Address.h"
+#include "mihost/cli/Failure.h"
 #include "mihost/cli/NodeView.h"
 #include "mihost/cli/Options.h"
 #include "mihost/cli/Output.h"
@@ -38,6 +39,28 @@ public:
     {
         return options_;
     }
+
+    /** For one line of the shell. How the plug-in was loaded stays as it was. */
+    void setOptions(Options const& options)
+    {
+        options_ = options;
+    }
+
+    /** What the program exits with although nothing failed; the first one that was set. */
+    void endWith(ExitCode code);
+    ExitCode exitCode() const
+    {
+        return exitCode_;
+    }
+
+    /** Standard input is a script from now on, so no secret can be read from it. */
+    void setScripted()
+    {
+        scripted_ = true;
+    }
+
+    /** @throws Failure where there is nobody to ask and nothing to read */
+    std::string askSecret(std::string const& name) const;
     Output& out()
     {
         return out_;
@@ -69,6 +92,8 @@ private:
     std::string timingReport() const;
 
     Options options_;
+    ExitCode exitCode_ = Done;
+    bool scripted_ = false;
     Output out_;
     std::string pluginFile_;
     SinkGroup sinks_;

@@ -6,6 +6,7 @@
 #include <cerrno>
 #include <cstdlib>
 #include <fmt/format.h>
+#include <langinfo.h>
 #include <optional>
 #include <string_view>
 #include <sys/ioctl.h>
@@ -89,6 +90,11 @@ bool takesControls(int descriptor)
 bool takesColours(int descriptor)
 {
     return takesControls(descriptor) && !isSet("NO_COLOR");
+}
+
+bool hasUnicode()
+{
+    return std::string_view(nl_langinfo(CODESET)) == "UTF-8";
 }
 
 bool canAsk()

@@ -14,6 +14,9 @@ unsigned int width(int descriptor);
 bool takesControls(int descriptor);
 bool takesColours(int descriptor);
 
+/** Whether the user's code set has the signs that lines and cuts are drawn with. */
+bool hasUnicode();
+
 /** Whether somebody can be asked: standard input is a terminal. */
 bool canAsk();
 

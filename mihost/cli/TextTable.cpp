@@ -1,5 +1,6 @@
 #include "mihost/cli/TextTable.h"
 
+#include "mihost/cli/Terminal.h"
 #include "mihost/runtime/Text.h"
 
 #include <algorithm>
@@ -14,7 +15,6 @@ namespace mihost
 namespace
 {
 
-constexpr char ellipsis[] = "…";
 constexpr std::size_t gap = 2;
 constexpr std::size_t narrowest = 4;
 
@@ -71,7 +71,7 @@ std::string fitted(std::string const& text, std::size_t columns)
     if (columns == 0)
         return "";
     std::string cut;
-    std::size_t width = 1; // the ellipsis
+    std::size_t width = 1; // the sign that it was cut
     for (std::string_view rest = text; !rest.empty();) {
         Utf8Piece const piece = firstPiece(rest);
         width += widthOf(piece.character);
@@ -80,7 +80,7 @@ std::string fitted(std::string const& text, std::size_t columns)
         cut += rest.substr(0, piece.length);
         rest.remove_prefix(piece.length);
     }
-    return cut + ellipsis;
+    return cut + (terminal::hasUnicode() ? "…" : "~");
 }
 
 TextTable::TextTable(std::vector<std::string> heading) : rows_{std::move(heading)} {}

@@ -10,7 +10,7 @@ namespace mihost
 /** Columns that a text takes on a terminal. The text is printable UTF-8. */
 std::size_t displayWidth(std::string const& text);
 
-/** The text, cut to so many columns with an ellipsis where it is wider. */
+/** The text, cut to so many columns and marked as cut where it is wider. */
 std::string fitted(std::string const& text, std::size_t columns);
 
 /** Rows of cells under a heading, in columns as wide as they need to be. */

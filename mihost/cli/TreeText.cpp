@@ -2,9 +2,12 @@
 
 #include "mihost/cli/Address.h"
 #include "mihost/cli/PropertyText.h"
+#include "mihost/cli/Terminal.h"
+#include "mihost/cli/TextTable.h"
 #include "mihost/runtime/Text.h"
 
 #include <fmt/format.h>
+#include <limits>
 #include <unordered_map>
 
 namespace mihost
@@ -24,19 +27,32 @@ std::string headlineOf(IC::MutableNode const& node)
     return found == properties.end() ? "" : static_cast<std::string>(found->second);
 }
 
-std::string lineOf(IC::MutableNode const& node)
+std::string textOf(IC::MutableNode const& node)
 {
-    std::string const headline = headlineOf(node);
-    std::string const description = node.getDescription();
-    return printable(fmt::format("{} #{}  {}{}{}", addressOf(node), node.getNodeId(), description,
-                                 headline.empty() ? "" : ": ", headline));
+    std::string const description = printable(node.getDescription());
+    std::string const headline = printable(headlineOf(node));
+    if (description.empty() && headline.empty())
+        return "";
+    return "  " + description + (headline.empty() ? "" : ": " + headline);
 }
+
+/** What leads to a node's line, and what to the lines below it. */
+struct Branch {
+    char const* child;
+    char const* lastChild;
+    char const* below;
+    char const* belowLast;
+};
+
+constexpr Branch unicodeBranch = {"├─ ", "└─ ", "│  ", "   "};
+constexpr Branch plainBranch = {"|- ", "`- ", "|  ", "   "};
 
 class Drawing
 {
 public:
     Drawing(std::vector<IC::MutableNode*> const& nodes, TreeStyle const& style, Output& out)
-        : style_(style), out_(out)
+        : style_(style), out_(out), branch_(terminal::hasUnicode() ? unicodeBranch : plainBranch),
+          columns_(out.width() == 0 ? std::numeric_limits<std::size_t>::max() : out.width())
     {
         std::unordered_map<unsigned int, bool> present;
         for (IC::MutableNode const* node : nodes)
@@ -57,22 +73,40 @@ public:
 private:
     void draw(IC::MutableNode const& node, std::string const& lead, std::string const& below) const
     {
-        out_.line(lead + lineOf(node));
+        drawLine(node, lead);
         auto const found = children_.find(node.getNodeId());
         bool const leaf = found == children_.end();
         if (style_.properties)
             writeProperties(storedView(node, style_.secrets).properties,
-                            below + (leaf ? "      " : "│     "), out_);
+                            below + (leaf ? "" : branch_.below) + "      ", out_);
         if (leaf)
             return;
         for (IC::MutableNode const* child : found->second) {
             bool const last = child == found->second.back();
-            draw(*child, below + (last ? "└─ " : "├─ "), below + (last ? "   " : "│  "));
+            draw(*child, below + (last ? branch_.lastChild : branch_.child),
+                 below + (last ? branch_.belowLast : branch_.below));
         }
+    }
+
+    void drawLine(IC::MutableNode const& node, std::string const& lead) const
+    {
+        std::size_t left = columns_;
+        auto const take = [&left](std::string const& text) {
+            std::string const taken = fitted(text, left);
+            left -= displayWidth(taken);
+            return taken;
+        };
+        std::string const start = take(lead);
+        std::string const address = take(printable(addressOf(node)));
+        std::string const id = take(fmt::format(" #{}", node.getNodeId()));
+        std::string const text = take(textOf(node));
+        out_.line(start + out_.bold(address) + out_.faint(id) + text);
     }
 
     TreeStyle style_;
     Output& out_;
+    Branch branch_;
+    std::size_t columns_;
     std::vector<IC::MutableNode const*> tops_;
     std::unordered_map<unsigned int, std::vector<IC::MutableNode const*>> children_;
 };

@@ -4,12 +4,12 @@
 #include "mihost/cli/CommandTap.h"
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/Interrupts.h"
+#include "mihost/cli/Lines.h"
 #include "mihost/runtime/Text.h"
 #include "mihost/sandbox/Sandbox.h"
 #include "nodes/ids.h"
 
 #include <fmt/format.h>
-#include <sstream>
 
 namespace mihost
 {
@@ -41,15 +41,6 @@ Result perform(Write const& write, Secrets secrets)
     result.changes = changesBetween(before, result.accounts, secrets);
     result.complaints = withoutSecret(commandTap::takeStandardError(), write.secret);
     return result;
-}
-
-std::vector<std::string> linesOf(std::string const& text)
-{
-    std::istringstream stream(text);
-    std::vector<std::string> lines;
-    for (std::string line; std::getline(stream, line);)
-        lines.push_back(line);
-    return lines;
 }
 
 Json listOf(std::vector<std::string> const& lines)

@@ -39,6 +39,7 @@ Json mihostJson(Lines arguments)
 /** Modules and a log, as lsmod and modinfo print them and syslog writes it. */
 void makeMachine()
 {
+    setenv("LC_ALL", "C.UTF-8", 1);
     machine::lay("plain");
     machine::fake("/usr/sbin/lsmod", "echo 'Module Size Used'\necho 'ext4 1 0'\necho 'xfs 1 0'\n");
     machine::fake("/usr/sbin/modinfo",
@@ -70,8 +71,8 @@ TEST(MihostTree, CanBeginAtAnyNodeAndShowProperties)
 {
     makeMachine();
     EXPECT_EQ(mihostRun({"tree", "--all", "driver:xfs"}).out, "driver:xfs #6  Driver of xfs: 1.0\n"
-                                                              "       36 manufacturer    \n"
-                                                              "       70 build-number    \n"
+                                                              "       36 manufacturer\n"
+                                                              "       70 build-number\n"
                                                               "      108 driver-name     xfs\n"
                                                               "      134 driver-version  1.0\n");
 }

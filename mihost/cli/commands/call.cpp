@@ -1,7 +1,6 @@
 #include "mihost/cli/CatalogueText.h"
 #include "mihost/cli/MethodCall.h"
 #include "mihost/cli/Session.h"
-#include "mihost/cli/Terminal.h"
 #include "mihost/cli/Write.h"
 #include "mihost/cli/commands/makers.h"
 #include "nodes/ids.h"
@@ -34,7 +33,9 @@ public:
 
     void run(Session& session) override
     {
-        MethodCall const call = parseCall(name_, assignments_, terminal::readSecret);
+        MethodCall const call = parseCall(name_, assignments_, [&session](std::string const& name) {
+            return session.askSecret(name);
+        });
         if (std::string const danger = dangerOf(call); !danger.empty())
             session.confirm(danger);
         carryOut(session, {session.node("os"), NODES::createUser,

@@ -2,7 +2,6 @@
 #include "mihost/cli/MethodCall.h"
 #include "mihost/cli/Safety.h"
 #include "mihost/cli/Session.h"
-#include "mihost/cli/Terminal.h"
 #include "mihost/cli/ValueText.h"
 #include "mihost/cli/Write.h"
 #include "mihost/cli/commands/makers.h"
@@ -96,7 +95,7 @@ public:
                                       "it is not written",
                                       name_, address_));
         if (property->has(Property::Secret) && text_ == toBeAsked)
-            text_ = terminal::readSecret(property->name);
+            text_ = session.askSecret(property->name);
 
         IC::PropertyValue const value = parseValue(*property, text_);
         if (node.getNodeType() == NODES::userType && property->has(Property::Acts))

@@ -16,6 +16,8 @@ std::vector<CommandRow> const& commands()
         {"clear-log", "empty the system log", commandMakers::clearLog},
         {"power", "restart or halt the machine", commandMakers::power},
         {"watch", "print properties whenever they change", commandMakers::watch},
+        {"shell", "run many commands on one loaded plug-in", commandMakers::shell, true},
+        {"doctor", "tell what this machine lacks for a full tree", commandMakers::doctor},
         {"version", "show the versions of program, contract and plug-in", commandMakers::version},
         {"properties", "describe the properties of each kind of node", commandMakers::properties},
         {"methods", "describe the administration methods", commandMakers::methods},

@@ -4,8 +4,6 @@
 #include "mihost/cli/Session.h"
 #include "mihost/cli/commands/makers.h"
 
-#include <cmath>
-#include <ctime>
 #include <map>
 
 namespace mihost
@@ -14,15 +12,9 @@ namespace mihost
 namespace
 {
 
-/** Waits, or less where SIGINT comes. */
-void waitFor(double seconds)
-{
-    double whole = 0;
-    double const rest = std::modf(seconds, &whole);
-    timespec const time{static_cast<time_t>(whole), static_cast<long>(rest * 1e9)};
-    if (!interrupts::Noted::came())
-        nanosleep(&time, nullptr);
-}
+using interrupts::Noted;
+
+constexpr int nothing = -1; // is waited for but time
 
 class Watch : public Command
 {
@@ -43,10 +35,13 @@ public:
     void run(Session& session) override
     {
         IC::MutableNode const& node = session.node(address_);
-        interrupts::Noted const noted;
+        Noted const signals;
         std::map<unsigned int, std::string> last;
-        for (unsigned int reading = 1; !interrupts::Noted::came(); ++reading) {
+        for (unsigned int reading = 1;; ++reading) {
             NodeView view = liveView(node, names_, session.secrets());
+            // Ctrl-C reaches the commands, too: what was read then is not to be shown.
+            if (signals.wait(nothing, 0) == Noted::Event::Interrupt)
+                return;
             std::vector<PropertyView> changed;
             for (PropertyView const& property : view.properties) {
                 std::string const text = static_cast<std::string>(property.value);
@@ -59,11 +54,18 @@ public:
             show(session, view);
             if (reading == count_)
                 return;
-            waitFor(interval_);
+            if (isInterrupted(signals))
+                return;
         }
     }
 
 private:
+    /** Waits until the next reading is due; a resized terminal makes it due early. */
+    bool isInterrupted(Noted const& signals) const
+    {
+        return signals.wait(nothing, interval_) == Noted::Event::Interrupt;
+    }
+
     static void show(Session& session, NodeView const& view)
     {
         if (view.properties.empty())

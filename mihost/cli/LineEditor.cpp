@@ -1,0 +1,160 @@
+#include "mihost/cli/LineEditor.h"
+
+#include "mihost/cli/Failure.h"
+#include "mihost/cli/Words.h"
+#include "mihost/runtime/Text.h"
+
+#include <algorithm>
+#include <cwchar>
+#include <fmt/format.h>
+#include <unistd.h>
+#include <utility>
+
+namespace mihost
+{
+
+namespace
+{
+
+constexpr int historySize = 1000;
+
+bool goesOn(std::string const& word)
+{
+    return !word.empty() && (word.back() == ':' || word.back() == '=');
+}
+
+} // namespace
+
+LineEditor::LineEditor(char const* prompt, Completer completer)
+    : prompt_(prompt), completer_(std::move(completer)), history_(history_init())
+{
+    tcgetattr(STDIN_FILENO, &settings_);
+    editor_.reset(el_init("mihost", stdin, stderr, stderr)); // results alone go to standard output
+    if (!editor_ || !history_)
+        throw Failure(BadUsage, "the terminal cannot be used for editing lines");
+    HistEvent event;
+    history(history_.get(), &event, H_SETSIZE, historySize);
+    history(history_.get(), &event, H_SETUNIQUE, 1);
+    EditLine* const editor = editor_.get();
+    el_set(editor, EL_CLIENTDATA, this);
+    el_set(editor, EL_EDITOR, "emacs");
+    el_set(editor, EL_PROMPT, &LineEditor::promptOf);
+    el_set(editor, EL_HIST, history, history_.get());
+    el_set(editor, EL_GETCFN, &LineEditor::getCharacter);
+    el_set(editor, EL_ADDFN, "mihost-complete", "complete the word", &LineEditor::completeWord);
+    el_set(editor, EL_BIND, "^I", "mihost-complete", nullptr);
+    el_set(editor, EL_BIND, "^R", "em-inc-search-prev", nullptr);
+}
+
+LineEditor::~LineEditor() = default;
+
+LineEditor& LineEditor::of(EditLine* editor)
+{
+    void* self = nullptr;
+    el_get(editor, EL_CLIENTDATA, &self);
+    return *static_cast<LineEditor*>(self);
+}
+
+char* LineEditor::promptOf(EditLine* editor)
+{
+    return of(editor).prompt_.data();
+}
+
+/** Reads one character itself, so that signals end or redraw the line as they should. */
+int LineEditor::getCharacter(EditLine* editor, wchar_t* character)
+{
+    LineEditor& self = of(editor);
+    std::mbstate_t state{};
+    for (;;) {
+        auto const event = self.signals_->wait(STDIN_FILENO, -1);
+        if (event == interrupts::Noted::Event::Resize)
+            el_resize(editor);
+        self.interrupted_ = event == interrupts::Noted::Event::Interrupt;
+        if (self.interrupted_)
+            return -1;
+        if (event != interrupts::Noted::Event::Input)
+            continue;
+        char byte = 0;
+        ssize_t const count = ::read(STDIN_FILENO, &byte, 1);
+        if (count <= 0)
+            return static_cast<int>(count);
+        std::size_t const taken = std::mbrtowc(character, &byte, 1, &state);
+        if (taken == static_cast<std::size_t>(-2))
+            continue; // more bytes belong to it
+        if (taken == static_cast<std::size_t>(-1))
+            *character = static_cast<unsigned char>(byte);
+        return 1;
+    }
+}
+
+unsigned char LineEditor::completeWord(EditLine* editor, int)
+{
+    LineInfo const* const line = el_line(editor);
+    std::string const before(line->buffer, line->cursor);
+    LineEditor& self = of(editor);
+    return self.offer(self.completer_(before), wordsBeingTyped(before).back());
+}
+
+unsigned char LineEditor::offer(std::vector<std::string> const& candidates,
+                                std::string const& typed)
+{
+    if (candidates.empty())
+        return CC_REFRESH_BEEP;
+    std::string const start = commonStart(candidates);
+    std::string rest = start.substr(std::min(typed.size(), start.size()));
+    if (candidates.size() == 1 && !goesOn(start))
+        rest += ' ';
+    if (!rest.empty()) {
+        el_insertstr(editor_.get(), rest.c_str());
+        return CC_REFRESH;
+    }
+    fmt::print(stderr, "\n");
+    for (std::string const& candidate : candidates)
+        fmt::print(stderr, "{}  ", candidate);
+    fmt::print(stderr, "\n");
+    return CC_REDISPLAY;
+}
+
+LineEditor::End LineEditor::read(std::string& line)
+{
+    interrupts::Noted const signals;
+    signals_ = &signals;
+    interrupted_ = false;
+    interrupts::setTerminalToRestore(&settings_);
+    int length = 0;
+    char const* const text = el_gets(editor_.get(), &length);
+    interrupts::setTerminalToRestore(nullptr);
+    if (interrupted_) {
+        fmt::print(stderr, "\n");
+        return End::Interrupted;
+    }
+    if (!text || length <= 0) {
+        fmt::print(stderr, "\n");
+        return End::Finished;
+    }
+    line.assign(text, static_cast<std::size_t>(length));
+    if (!line.empty() && line.back() == '\n')
+        line.pop_back();
+    return End::Line;
+}
+
+void LineEditor::remember(std::string const& line)
+{
+    HistEvent event;
+    history(history_.get(), &event, H_ENTER, line.c_str());
+}
+
+std::string commonStart(std::vector<std::string> const& candidates)
+{
+    if (candidates.empty())
+        return "";
+    std::string start = candidates.front();
+    for (std::string const& candidate : candidates) {
+        auto const [end, ignored] =
+            std::mismatch(start.begin(), start.end(), candidate.begin(), candidate.end());
+        start.erase(end, start.end());
+    }
+    return start;
+}
+
+} // namespace mihost

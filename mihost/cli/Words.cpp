@@ -1,0 +1,107 @@
+#include "mihost/cli/Words.h"
+
+#include "mihost/cli/Failure.h"
+
+#include <algorithm>
+#include <fmt/format.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+/** Splits byte by byte; says in the end whether a word or a quote was still open. */
+class Splitter
+{
+public:
+    explicit Splitter(std::string const& line)
+    {
+        for (char const byte : line)
+            take(byte);
+    }
+
+    std::vector<std::string> words;
+    bool inWord = false;
+    char quote = '\0'; // ' or " within one; \ where the next byte is kept as it is
+    char outer = '\0'; // the quote that a backslash stands in
+
+private:
+    void add(char byte)
+    {
+        if (!inWord)
+            words.emplace_back();
+        inWord = true;
+        words.back() += byte;
+    }
+
+    void open(char sign)
+    {
+        if (!inWord)
+            words.emplace_back();
+        inWord = true;
+        outer = quote;
+        quote = sign;
+    }
+
+    void take(char byte)
+    {
+        if (inComment_)
+            return;
+        if (quote == '\\') {
+            quote = outer;
+            add(byte);
+        } else if (byte == '\\' && quote != '\'') {
+            open(byte);
+        } else if (quote != '\0') {
+            if (byte == quote)
+                quote = '\0';
+            else
+                add(byte);
+        } else if (byte == '\'' || byte == '"') {
+            open(byte);
+        } else if (byte == ' ' || byte == '\t') {
+            inWord = false;
+        } else if (byte == '#' && !inWord) {
+            inComment_ = true;
+        } else {
+            add(byte);
+        }
+    }
+
+    bool inComment_ = false;
+};
+
+bool isPasswordProperty(std::string const& word)
+{
+    return word == "password" || word == "117";
+}
+
+} // namespace
+
+std::vector<std::string> splitWords(std::string const& line)
+{
+    Splitter splitter(line);
+    if (splitter.quote != '\0')
+        throw Failure(BadUsage, fmt::format("nothing follows the last {}", splitter.quote));
+    return splitter.words;
+}
+
+std::vector<std::string> wordsBeingTyped(std::string const& line)
+{
+    Splitter splitter(line);
+    if (!splitter.inWord)
+        splitter.words.emplace_back();
+    return splitter.words;
+}
+
+bool holdsPassword(std::string const& line)
+{
+    if (line.find("Password") != std::string::npos) // in a method call, whatever its form
+        return true;
+    std::vector<std::string> const words = Splitter(line).words;
+    return std::find(words.begin(), words.end(), "set") != words.end() &&
+           std::any_of(words.begin(), words.end(), isPasswordProperty);
+}
+
+} // namespace mihost

@@ -1,0 +1,26 @@
+#ifndef MIHOST_CLI_WORDS_H
+#define MIHOST_CLI_WORDS_H
+
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/**
+ * The words of a line, as a shell would split it: blanks separate, quotes and backslashes keep
+ * together, # begins a comment where a word would begin. Nothing is expanded.
+ *
+ * @throws Failure (BadUsage) for a quote that does not end
+ */
+std::vector<std::string> splitWords(std::string const& line);
+
+/** The words of a line up to the cursor, the last one being typed and perhaps empty. */
+std::vector<std::string> wordsBeingTyped(std::string const& line);
+
+/** Whether a password stands in the line, so that it must not be kept. */
+bool holdsPassword(std::string const& line);
+
+} // namespace mihost
+
+#endif

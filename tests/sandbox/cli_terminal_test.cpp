@@ -1,0 +1,347 @@
+// The program at a terminal: what a person sees, types and interrupts.
+
+#include "mihost/cli/TextTable.h"
+#include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+#include "tests/support/TerminalRun.h"
+
+#include <algorithm>
+#include <clocale>
+#include <csignal>
+#include <cstdlib>
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <sstream>
+
+namespace
+{
+
+using Lines = std::vector<std::string>;
+
+constexpr char prompt[] = "mihost> ";
+constexpr char ctrlC[] = "\x03";
+constexpr char ctrlD[] = "\x04";
+constexpr char up[] = "\x1b[A";
+
+class MihostTerminal : public testing::Test
+{
+protected:
+    MihostTerminal()
+    {
+        setenv("LC_ALL", "C.UTF-8", 1);
+        std::setlocale(LC_CTYPE, "C.UTF-8");
+        setenv("TERM", "xterm", 1);
+        setenv("TMPDIR", "/tmp/private", 1);
+        unsetenv("NO_COLOR");
+        std::filesystem::create_directory("/tmp/private");
+        machine::lay("plain");
+        machine::write("/etc/login.defs",
+                       "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+        machine::write("/etc/passwd", "root:x:0:0:Super:/root:/bin/sh\n"
+                                      "jdoe:x:1000:1000:J. Doe:/home/jdoe:/bin/sh\n");
+        machine::write("/etc/shadow", "root:*:19000:0:99999:7:::\njdoe:!:19000:0:99999:7:::\n",
+                       0600);
+        machine::write("/etc/group", "root:x:0:\njdoe:x:1000:\n");
+        machine::write("/var/log/messages", "Jan  2 03:04:05 line\n");
+        machine::fake("/usr/sbin/lsmod", "echo 'Module Size'\necho 'ext4 1'\necho 'xfs 1'\n");
+        machine::fake("/usr/sbin/modinfo", "echo \"description:    Driver of $1\"\n");
+    }
+
+    static bool nothingIsLeft()
+    {
+        return std::filesystem::is_empty("/tmp/private");
+    }
+};
+
+bool stands(std::string const& text, std::string const& part)
+{
+    return text.find(part) != std::string::npos;
+}
+
+/** The lines of a terminal's stream, without what moves the cursor or sets colours. */
+Lines plainLines(std::string const& text)
+{
+    Lines lines(1);
+    for (std::size_t at = 0; at < text.size(); ++at) {
+        if (text[at] == '\x1b') {
+            at = text.find_first_of("mKJH", at);
+        } else if (text[at] == '\n') {
+            lines.emplace_back();
+        } else if (text[at] != '\r') {
+            lines.back() += text[at];
+        }
+    }
+    return lines;
+}
+
+std::size_t widest(Lines const& lines)
+{
+    std::size_t width = 0;
+    for (std::string const& line : lines)
+        width = std::max(width, mihost::displayWidth(line));
+    return width;
+}
+
+TEST_F(MihostTerminal, ShowsThePhaseOfTheStartAndHowFarItIs)
+{
+    TerminalRun run({"get", "os", "108"});
+    for (char const* step : {"starting: operating system", "starting: drivers", "drivers 1/2",
+                             "drivers 2/2", "starting: users", "users 2", "log entries 1/1"})
+        run.waitFor(step);
+    run.waitFor("\r\x1b[K"); // and takes it away
+    run.waitFor("108 os-name  Linux");
+    EXPECT_EQ(run.end(), 0);
+}
+
+TEST_F(MihostTerminal, ShowsNoProgressOnADumbOne)
+{
+    setenv("TERM", "dumb", 1);
+    TerminalRun run({"get", "os", "108"});
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_EQ(run.output(), "108 os-name  Linux\r\n");
+}
+
+TEST_F(MihostTerminal, HasColoursUnlessTheyAreUnwanted)
+{
+    TerminalRun coloured({"tree"});
+    coloured.end();
+    EXPECT_TRUE(stands(coloured.output(), "\x1b[1muser:jdoe\x1b[0m"));
+    setenv("NO_COLOR", "1", 1);
+    TerminalRun plain({"tree"});
+    plain.end();
+    EXPECT_FALSE(stands(plain.output(), "\x1b[1m"));
+    EXPECT_TRUE(stands(plain.output(), "user:jdoe #"));
+    EXPECT_FALSE(stands(mihostRun({"tree"}).out, "\x1b"));
+}
+
+TEST_F(MihostTerminal, KeepsLinesWithinItsWidthAndCutsNoWideCharacterInTwo)
+{
+    machine::write("/etc/passwd",
+                   "root:x:0:0::/:/bin/sh\njdoe:x:1000:1000:" + std::string(50, 'a') +
+                       "李明李明李明李明李明李明李明李明" + ":/home/jdoe:/bin/sh\n");
+    for (unsigned short const columns : std::initializer_list<unsigned short>{40, 80, 81, 82, 200})
+        for (Lines const& arguments :
+             {Lines{"tree"}, Lines{"list", "users"}, Lines{"list", "log"}}) {
+            TerminalRun run(arguments, columns);
+            EXPECT_EQ(run.end(), 0);
+            std::string const shown = run.output().substr(run.output().rfind("\r\x1b[K"));
+            EXPECT_LE(widest(plainLines(shown)), columns) << arguments[0];
+            EXPECT_EQ(stands(shown, "李明李明李明李明李明李明李明李明"),
+                      arguments.back() != "log" && columns == 200)
+                << columns << shown;
+        }
+    EXPECT_TRUE(stands(mihostRun({"list", "users"}).out, "李明李明李明李明李明李明李明李明"));
+}
+
+TEST_F(MihostTerminal, DrawsWithPlainSignsWhereTheCodeSetHasNoOthers)
+{
+    setenv("LC_ALL", "C", 1);
+    EXPECT_TRUE(stands(mihostRun({"tree"}).out, "\n`- root #2  ROOT Node\n"));
+    TerminalRun narrow({"list", "users"}, 30);
+    narrow.end();
+    EXPECT_TRUE(stands(narrow.output(), "~")) << narrow.output();
+}
+
+TEST_F(MihostTerminal, NeverObeysWhatTheSystemsTextsHold)
+{
+    machine::write("/etc/passwd", "root:x:0:0:\x1b]0;title\x07\x1b[2J:/:/bin/sh\n");
+    machine::write("/var/log/messages", "Jan  2 03:04:05 \x1b[31mred\x9b"
+                                        "32m\n");
+    for (Lines const& arguments : {Lines{"tree", "--all"}, Lines{"list", "users"},
+                                   Lines{"list", "log"}, Lines{"get", "log:1"}}) {
+        TerminalRun run(arguments, 200);
+        run.end();
+        EXPECT_FALSE(stands(run.output(), "\x1b]"));
+        EXPECT_FALSE(stands(run.output(), "\x1b[2J"));
+        EXPECT_FALSE(stands(run.output(), "\x1b[31m"));
+        EXPECT_FALSE(stands(run.output(), "\x9b"));
+    }
+}
+
+TEST_F(MihostTerminal, AsksBeforeWhatIsDangerousAndTakesNoForNo)
+{
+    for (char const* answer : {"\n", "n\n", "no\n", "x\n"}) {
+        TerminalRun run({"power", "halt"});
+        run.waitFor("Really halt the machine? [y/N] ");
+        run.type(answer);
+        run.waitFor("mihost: not confirmed: did not halt the machine");
+        EXPECT_EQ(run.end(), 2);
+    }
+    EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
+    TerminalRun run({"power", "halt"});
+    run.waitFor("[y/N] ");
+    run.type("y\n");
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_EQ(mihost::refusedPowerCommands(), Lines{"/sbin/shutdown -h now"});
+}
+
+TEST_F(MihostTerminal, DoesNotShowAPasswordThatIsTyped)
+{
+    TerminalRun run({"call", "UserSetPassword", "UserName=jdoe", "Password=-"});
+    run.waitFor("Password: ");
+    EXPECT_FALSE(run.showsInput());
+    run.type("geheim42\n");
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_FALSE(stands(run.output(), "geheim42"));
+    EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), "geheim42");
+}
+
+TEST_F(MihostTerminal, IsAsItWasAfterCtrlCAtAPasswordPrompt)
+{
+    TerminalRun run({"call", "UserSetPassword", "UserName=jdoe", "Password=-"});
+    run.waitFor("Password: ");
+    run.type(ctrlC);
+    EXPECT_EQ(run.end(), 128 + SIGINT);
+    EXPECT_TRUE(run.showsInput());
+    EXPECT_TRUE(nothingIsLeft());
+}
+
+TEST_F(MihostTerminal, IsLeftCleanByCtrlCDuringTheStart)
+{
+    // A module that takes for ever; the log tells that it was asked for.
+    machine::fake("/usr/sbin/modinfo", "echo asked >/tmp/asked; exec sleep 1000\n");
+    TerminalRun run({"tree"});
+    run.waitFor("drivers 1/2");
+    run.type(ctrlC);
+    EXPECT_EQ(run.end(), 128 + SIGINT);
+    EXPECT_GT(run.output().rfind("\r\x1b[K"), run.output().rfind("starting: "));
+    EXPECT_TRUE(nothingIsLeft());
+}
+
+TEST_F(MihostTerminal, FinishesAChangeThatHasBegunBeforeCtrlCEndsIt)
+{
+    machine::fake("/usr/sbin/userdel", "echo begun >/dev/tty; read go </tmp/go; "
+                                       "echo done >/tmp/done\n");
+    ASSERT_EQ(std::system("mkfifo /tmp/go"), 0);
+    TerminalRun run({"call", "UserDel", "UserName=jdoe"});
+    run.waitFor("begun");
+    run.type(ctrlC);
+    machine::write("/tmp/answer", "go\n");
+    ASSERT_EQ(std::system("cat /tmp/answer >/tmp/go"), 0);
+    EXPECT_EQ(run.end(), 128 + SIGINT);
+    EXPECT_EQ(machine::read("/tmp/done"), "done\n");
+    EXPECT_TRUE(nothingIsLeft());
+}
+
+TEST_F(MihostTerminal, StopsAWatchOnCtrlC)
+{
+    TerminalRun run({"watch", "os", "os-name", "--interval", "1000"});
+    run.waitFor("108 os-name  Linux");
+    run.type(ctrlC);
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(nothingIsLeft());
+}
+
+TEST_F(MihostTerminal, RunsAShellWithAPrompt)
+{
+    TerminalRun run({"shell"});
+    run.waitFor(prompt);
+    run.type("get os 108\n");
+    run.waitFor("108 os-name  Linux\r\n");
+    run.waitFor(prompt);
+    run.type("get nothing\n");
+    run.waitFor("mihost: no node 'nothing'");
+    run.waitFor(prompt);
+    run.type("exit\n");
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(nothingIsLeft());
+}
+
+TEST_F(MihostTerminal, EndsTheShellOnCtrlD)
+{
+    TerminalRun run({"shell"});
+    run.waitFor(prompt);
+    run.type(ctrlD);
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(run.showsInput());
+}
+
+TEST_F(MihostTerminal, DropsAShellsLineOnCtrlC)
+{
+    TerminalRun run({"shell"});
+    run.waitFor(prompt);
+    run.type("power ha");
+    run.waitFor("a"); // of "ha"
+    run.type(ctrlC);
+    run.waitFor(prompt);
+    run.type("get os 108\n");
+    run.waitFor("108 os-name  Linux");
+    run.type(ctrlD);
+    EXPECT_EQ(run.end(), 0);
+}
+
+TEST_F(MihostTerminal, ComesBackToTheShellWhenCtrlCStopsAWatch)
+{
+    TerminalRun run({"shell"});
+    run.waitFor(prompt);
+    run.type("watch os os-name --interval 1000\n");
+    run.waitFor("108 os-name  Linux");
+    run.type(ctrlC);
+    run.waitFor(prompt);
+    run.type(ctrlD);
+    EXPECT_EQ(run.end(), 0);
+}
+
+TEST_F(MihostTerminal, CompletesCommandsNodesPropertiesAndMethods)
+{
+    TerminalRun run({"shell"});
+    run.waitFor(prompt);
+    run.type("ge\tuser:j\tfull\t\n");
+    run.waitFor("312 full-name  J. Doe");
+    run.waitFor(prompt);
+    machine::fake("/usr/sbin/userdel", "echo \"$@\" >/tmp/deleted\n");
+    run.type("call UserDe\tUserN\tjd\t\n");
+    run.waitFor(prompt);
+    EXPECT_EQ(machine::read("/tmp/deleted"), "jdoe\n");
+    run.type("get user:\t"); // more than one: they are listed
+    run.waitFor("user:root  user:jdoe");
+    run.waitFor("get user:"); // and the line is shown again
+    run.type(ctrlC);
+    run.waitFor(prompt);
+    run.type(ctrlD);
+    EXPECT_EQ(run.end(), 0);
+}
+
+TEST_F(MihostTerminal, KeepsTheShellsLinesButNoPasswords)
+{
+    TerminalRun run({"shell"});
+    run.waitFor(prompt);
+    run.type("get os 108\n");
+    run.waitFor("108 os-name  Linux");
+    run.waitFor(prompt);
+    run.type("call UserSetPassword UserName=none Password=geheim42\n");
+    run.waitFor("mihost: the plug-in answered");
+    run.waitFor(prompt);
+    run.type(up);
+    EXPECT_FALSE(stands(run.waitFor("get os 108"), "geheim42"));
+    run.type("\n");
+    run.waitFor("108 os-name  Linux");
+    run.waitFor(prompt);
+    run.type(ctrlD);
+    EXPECT_EQ(run.end(), 0);
+}
+
+TEST_F(MihostTerminal, GoesBySizesThatChangeWhileTheShellRuns)
+{
+    machine::write("/var/log/messages", "Jan  2 03:04:05 " + std::string(150, 'x') + "end\n");
+    TerminalRun run({"shell"});
+    run.waitFor(prompt);
+    run.type("list log\n");
+    EXPECT_FALSE(stands(run.waitFor(prompt), "xend"));
+    run.resize(200);
+    run.type("list log\n");
+    EXPECT_TRUE(stands(run.waitFor(prompt), "xend*"));
+    run.type(ctrlD);
+    EXPECT_EQ(run.end(), 0);
+}
+
+TEST_F(MihostTerminal, SaysInTheShellsPromptThatItIsASandbox)
+{
+    TerminalRun run({"--sandbox", "shell"});
+    run.waitFor("mihost (sandbox)> ");
+    run.type(ctrlD);
+    EXPECT_EQ(run.end(), 0);
+}
+
+} // namespace

@@ -1,0 +1,88 @@
+#include "tests/support/TerminalRun.h"
+
+#include <array>
+#include <csignal>
+#include <pty.h>
+#include <stdexcept>
+#include <sys/ioctl.h>
+#include <sys/wait.h>
+#include <termios.h>
+#include <unistd.h>
+
+TerminalRun::TerminalRun(std::vector<std::string> arguments, unsigned short columns)
+{
+    arguments.insert(arguments.begin(), MIHOST_FILE);
+    std::vector<char*> list;
+    for (std::string& argument : arguments)
+        list.push_back(argument.data());
+    list.push_back(nullptr);
+    winsize size{24, columns, 0, 0};
+    child_ = forkpty(&master_, nullptr, nullptr, &size);
+    if (child_ == 0) {
+        execv(list[0], list.data());
+        _exit(127);
+    }
+    if (child_ < 0)
+        throw std::runtime_error("no terminal can be had");
+}
+
+TerminalRun::~TerminalRun()
+{
+    if (child_ > 0) {
+        kill(child_, SIGKILL);
+        waitpid(child_, nullptr, 0);
+    }
+    close(master_);
+}
+
+void TerminalRun::type(std::string const& text) const
+{
+    if (write(master_, text.data(), text.size()) != static_cast<ssize_t>(text.size()))
+        throw std::runtime_error("cannot type");
+}
+
+bool TerminalRun::readMore()
+{
+    std::array<char, 4096> block{};
+    ssize_t const count = read(master_, block.data(), block.size());
+    if (count > 0)
+        output_.append(block.data(), static_cast<std::size_t>(count));
+    return count > 0; // the terminal's other end closes with an error
+}
+
+std::string TerminalRun::waitFor(std::string const& text)
+{
+    for (;;) {
+        std::size_t const found = output_.find(text, seen_);
+        if (found != std::string::npos) {
+            std::string const read = output_.substr(seen_, found + text.size() - seen_);
+            seen_ = found + text.size();
+            return read;
+        }
+        if (!readMore())
+            throw std::runtime_error("ended without '" + text + "': " + output_.substr(seen_));
+    }
+}
+
+void TerminalRun::resize(unsigned short columns) const
+{
+    winsize const size{24, columns, 0, 0};
+    ioctl(master_, TIOCSWINSZ, &size); // the kernel sends SIGWINCH
+}
+
+bool TerminalRun::showsInput() const
+{
+    termios settings{};
+    tcgetattr(master_, &settings);
+    return (settings.c_lflag & ECHO) != 0;
+}
+
+int TerminalRun::end()
+{
+    while (readMore()) {
+    }
+    int status = 0;
+    waitpid(child_, &status, 0);
+    child_ = -1;
+    return WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
+}

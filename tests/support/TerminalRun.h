@@ -1,0 +1,57 @@
+#ifndef TESTS_SUPPORT_TERMINALRUN_H
+#define TESTS_SUPPORT_TERMINALRUN_H
+
+#include <string>
+#include <sys/types.h>
+#include <vector>
+
+/** mihost run at a terminal, as a person sees it. What it writes and shows comes as one stream. */
+class TerminalRun
+{
+public:
+    explicit TerminalRun(std::vector<std::string> arguments, unsigned short columns = 80);
+    ~TerminalRun();
+    TerminalRun(TerminalRun const&) = delete;
+    TerminalRun& operator=(TerminalRun const&) = delete;
+
+    /** Types the text; "\x03" is Ctrl-C, "\x04" Ctrl-D, "\t" asks for completion. */
+    void type(std::string const& text) const;
+
+    /**
+     * Reads until the text turns up behind what was read before.
+     *
+     * @return what was read, up to the end of the text
+     * @throw std::runtime_error where the program ends before
+     */
+    std::string waitFor(std::string const& text);
+
+    void resize(unsigned short columns) const;
+
+    /** Whether the terminal shows what is typed. */
+    bool showsInput() const;
+
+    /** Reads to the end. @return the exit code, or 128 and the number of the signal that ended it
+     */
+    int end();
+
+    /** Everything that was read so far. */
+    std::string const& output() const
+    {
+        return output_;
+    }
+
+    pid_t child() const
+    {
+        return child_;
+    }
+
+private:
+    bool readMore();
+
+    pid_t child_ = -1;
+    int master_ = -1;
+    std::string output_;
+    std::size_t seen_ = 0;
+};
+
+#endif

@@ -25,6 +25,8 @@ void CommandLine::declareForProgram(CLI::App& app)
                  "run everything in a copy of this machine; nothing on the machine changes");
     app.add_option("--overlay", options_.overlay, "lay the files of DIR over the sandbox first")
         ->type_name("DIR");
+    app.add_flag("--fast", options_.fast,
+                 "answer read-only commands of the plug-in inside the process");
     app.add_flag("--timing", options_.timing, "tell how long each phase of the start took");
 }
 
@@ -37,9 +39,6 @@ void CommandLine::declare(CLI::App& app)
     app.add_flag("--json", options_.json, "print JSON");
     app.add_flag("--show-secrets", options_.showSecrets, "show password hashes");
     app.add_flag("--yes", options_.yes, "do what would be asked about without asking");
-    app.add_flag("--fast", options_.fast,
-                 "answer read-only commands of the plug-in inside the process");
-    app.add_flag("--timing", options_.timing, "tell how long each phase of the start took");
     app.require_subcommand(0, 1);
 
     for (CommandRow const& row : commands()) {

@@ -167,7 +167,7 @@ std::string outputOf(std::string const& line)
     if (!running)
         return "";
     std::string output = readToEnd(running);
-    realClose(running);
+    state().runner.close(running);
     return output;
 }
 

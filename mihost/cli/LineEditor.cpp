@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <cwchar>
+#include <fcntl.h>
 #include <fmt/format.h>
 #include <unistd.h>
 #include <utility>
@@ -26,11 +27,13 @@ bool goesOn(std::string const& word)
 } // namespace
 
 LineEditor::LineEditor(char const* prompt, Completer completer)
-    : prompt_(prompt), completer_(std::move(completer)), history_(history_init())
+    : prompt_(prompt), completer_(std::move(completer)),
+      screen_(fdopen(fcntl(STDERR_FILENO, F_DUPFD_CLOEXEC, 3), "w")), history_(history_init())
 {
     tcgetattr(STDIN_FILENO, &settings_);
-    editor_.reset(el_init("mihost", stdin, stderr, stderr)); // results alone go to standard output
-    if (!editor_ || !history_)
+    if (screen_ && history_) // results alone go to standard output
+        editor_.reset(el_init("mihost", stdin, screen_.get(), stderr));
+    if (!editor_)
         throw Failure(BadUsage, "the terminal cannot be used for editing lines");
     HistEvent event;
     history(history_.get(), &event, H_SETSIZE, historySize);
@@ -121,6 +124,8 @@ LineEditor::End LineEditor::read(std::string& line)
     signals_ = &signals;
     interrupted_ = false;
     interrupts::setTerminalToRestore(&settings_);
+    // It would show the prompt first; what is typed between the two would be taken amiss.
+    el_set(editor_.get(), EL_PREP_TERM, 1);
     int length = 0;
     char const* const text = el_gets(editor_.get(), &length);
     interrupts::setTerminalToRestore(nullptr);

@@ -3,6 +3,7 @@
 
 #include "mihost/cli/Interrupts.h"
 
+#include <cstdio>
 #include <functional>
 #include <histedit.h>
 #include <memory>
@@ -42,6 +43,12 @@ private:
 
     unsigned char offer(std::vector<std::string> const& candidates, std::string const& typed);
 
+    struct CloseFile {
+        void operator()(std::FILE* file) const
+        {
+            std::fclose(file);
+        }
+    };
     struct EndEditor {
         void operator()(EditLine* editor) const
         {
@@ -59,7 +66,8 @@ private:
     bool interrupted_ = false;
     std::string prompt_;
     Completer completer_;
-    termios settings_{}; // the terminal's, outside of reading
+    termios settings_{};                           // the terminal's, outside of reading
+    std::unique_ptr<std::FILE, CloseFile> screen_; // standard error, written piece by piece
     std::unique_ptr<History, EndHistory> history_;
     std::unique_ptr<EditLine, EndEditor> editor_;
 };

@@ -1,7 +1,6 @@
 #include "mihost/cli/CatalogueText.h"
 
-#include "mihost/cli/TextTable.h"
-
+#include <algorithm>
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 #include <utility>
@@ -17,10 +16,12 @@ std::string addressForm(NodeKind const& kind)
     return kind.single ? kind.address : fmt::format("{}:NAME", kind.address);
 }
 
-std::vector<std::string> indented(TextTable const& table, std::size_t columns)
+std::vector<std::string> indented(TextTable const& table, Room room)
 {
     constexpr std::size_t indent = 2;
-    std::vector<std::string> lines = table.lines(columns > indent ? columns - indent : 0);
+    if (room.columns != Room::unlimited)
+        room.columns -= std::min(room.columns, indent);
+    std::vector<std::string> lines = table.lines(room);
     for (std::string& line : lines)
         line.insert(0, indent, ' ');
     return lines;
@@ -28,7 +29,7 @@ std::vector<std::string> indented(TextTable const& table, std::size_t columns)
 
 } // namespace
 
-std::vector<std::string> kindLines(NodeKind const& kind, std::size_t columns)
+std::vector<std::string> kindLines(NodeKind const& kind, Room const& room)
 {
     std::vector<std::string> lines = {
         fmt::format("{} (type {}, {}): {}", kind.name, kind.type, addressForm(kind), kind.meaning)};
@@ -38,12 +39,12 @@ std::vector<std::string> kindLines(NodeKind const& kind, std::size_t columns)
     for (Property const& property : kind.properties)
         table.add({fmt::format("{:>3}", property.id), property.name, typeText(property),
                    traitsText(property), property.meaning});
-    for (std::string const& line : indented(table, columns))
+    for (std::string const& line : indented(table, room))
         lines.push_back(line);
     return lines;
 }
 
-std::vector<std::string> methodLines(Method const& method, std::size_t columns)
+std::vector<std::string> methodLines(Method const& method, Room const& room)
 {
     std::vector<std::string> lines = {fmt::format("{}: {}", method.name, method.meaning)};
     if (method.parameters.empty())
@@ -52,17 +53,17 @@ std::vector<std::string> methodLines(Method const& method, std::size_t columns)
     for (Parameter const& parameter : method.parameters)
         table.add({parameter.name, formName(parameter.form), parameter.required ? "required" : "",
                    parameter.meaning});
-    for (std::string const& line : indented(table, columns))
+    for (std::string const& line : indented(table, room))
         lines.push_back(line);
     return lines;
 }
 
-std::vector<std::string> methodListLines(std::size_t columns)
+std::vector<std::string> methodListLines(Room const& room)
 {
     TextTable table({"method", "what it does"});
     for (Method const& method : methods())
         table.add({method.name, method.meaning});
-    return table.lines(columns);
+    return table.lines(room);
 }
 
 Json toJson(NodeKind const& kind)

@@ -3,6 +3,7 @@
 
 #include "mihost/cli/Catalogue.h"
 #include "mihost/cli/Json.h"
+#include "mihost/cli/TextTable.h"
 
 #include <string>
 #include <vector>
@@ -11,10 +12,9 @@
 namespace mihost
 {
 
-/** @param columns  of the terminal, 0 for no limit */
-std::vector<std::string> kindLines(NodeKind const& kind, std::size_t columns);
-std::vector<std::string> methodLines(Method const& method, std::size_t columns);
-std::vector<std::string> methodListLines(std::size_t columns);
+std::vector<std::string> kindLines(NodeKind const& kind, Room const& room);
+std::vector<std::string> methodLines(Method const& method, Room const& room);
+std::vector<std::string> methodListLines(Room const& room);
 
 Json toJson(NodeKind const& kind);
 Json toJson(Method const& method);

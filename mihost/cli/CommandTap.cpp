@@ -1,6 +1,5 @@
 #include "mihost/cli/CommandTap.h"
 
-#include "mihost/cli/Interrupts.h"
 #include "mihost/sandbox/Descriptor.h"
 
 #include <array>
@@ -75,7 +74,6 @@ std::FILE* start(char const* line, char const* mode)
     std::fflush(stderr);
     Redirection const input(STDIN_FILENO, nothing.get());
     Redirection const complaints(STDERR_FILENO, standardErrorFile());
-    interrupts::KeptFromCommands const kept;
     return state().runner.open(line, mode);
 }
 

@@ -24,8 +24,7 @@ char const* volatile folder = nullptr;
 termios const* volatile terminal = nullptr;
 char const* volatile lastWords = nullptr;
 volatile std::sig_atomic_t noted = 0; // the signal
-
-bool holding = false;
+int screen = STDERR_FILENO;
 
 /** The one file that the plug-in makes where it stands. */
 void removeFolder(char const* path)
@@ -51,7 +50,7 @@ void handle(int signal)
 {
     int const before = errno;
     if (char const* const words = lastWords)
-        if (write(STDERR_FILENO, words, std::strlen(words)) < 0)
+        if (write(screen, words, std::strlen(words)) < 0)
             errno = 0; // nobody is there to be told
     if (termios const* const settings = terminal)
         tcsetattr(STDIN_FILENO, TCSANOW, settings);
@@ -91,6 +90,8 @@ bool isIgnored(int signal)
 
 void install()
 {
+    // Standard error goes elsewhere for the moment in which a command is started.
+    screen = fcntl(STDERR_FILENO, F_DUPFD_CLOEXEC, 3);
     for (int const signal : endingSignals)
         if (!isIgnored(signal)) // as nohup leaves it
             setHandler(signal, handle, SA_RESTART);
@@ -121,37 +122,19 @@ Held::Held()
     for (int const signal : endingSignals)
         sigaddset(&set, signal);
     sigprocmask(SIG_BLOCK, &set, &before_);
-    holding = true;
+    struct sigaction ignored {
+    };
+    ignored.sa_handler = SIG_IGN;
+    // One that comes while it is blocked waits, ignored or not: to unblock it is to get it.
+    for (std::size_t at = 0; at < std::size(terminalSignals); ++at)
+        sigaction(terminalSignals[at], &ignored, &actionsBefore_[at]);
 }
 
 Held::~Held()
 {
-    holding = false;
-    sigprocmask(SIG_SETMASK, &before_, nullptr);
-}
-
-KeptFromCommands::KeptFromCommands() : holding_(holding)
-{
-    if (!holding_)
-        return;
-    sigpending(&pending_);
-    struct sigaction ignored {
-    };
-    ignored.sa_handler = SIG_IGN;
     for (std::size_t at = 0; at < std::size(terminalSignals); ++at)
-        sigaction(terminalSignals[at], &ignored, &before_[at]);
-}
-
-KeptFromCommands::~KeptFromCommands()
-{
-    if (!holding_)
-        return;
-    for (std::size_t at = 0; at < std::size(terminalSignals); ++at) {
-        sigaction(terminalSignals[at], &before_[at], nullptr);
-        // To ignore a signal is to forget one that waits.
-        if (sigismember(&pending_, terminalSignals[at]) == 1)
-            raise(terminalSignals[at]);
-    }
+        sigaction(terminalSignals[at], &actionsBefore_[at], nullptr);
+    sigprocmask(SIG_SETMASK, &before_, nullptr);
 }
 
 Noted::Noted()

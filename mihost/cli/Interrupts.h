@@ -24,7 +24,9 @@ void setTerminalToRestore(termios const* settings);
 void setLastWords(char const* text);
 
 /**
- * Holds signals back for as long as it lives: a change to the system that has begun is finished.
+ * Holds signals back for as long as it lives: a change to the system that has begun is finished. A
+ * terminal sends its signals to the commands as well, and a shell undoes a mask, so commands
+ * started meanwhile ignore them.
  */
 class Held
 {
@@ -36,24 +38,7 @@ public:
 
 private:
     sigset_t before_;
-};
-
-/**
- * Where signals are held, keeps those that a terminal sends from commands started during its life.
- * A shell undoes a mask, so the commands ignore them.
- */
-class KeptFromCommands
-{
-public:
-    KeptFromCommands();
-    ~KeptFromCommands();
-    KeptFromCommands(KeptFromCommands const&) = delete;
-    KeptFromCommands& operator=(KeptFromCommands const&) = delete;
-
-private:
-    bool const holding_;
-    struct sigaction before_[3]{};
-    sigset_t pending_{};
+    struct sigaction actionsBefore_[3]{};
 };
 
 /**

@@ -82,7 +82,7 @@ void NodeTable::write(std::vector<IC::MutableNode*> const& nodes, Secrets secret
             cells.push_back(printable(cell(column, view)));
         table.add(cells);
     }
-    for (std::string const& line : table.lines(out.width()))
+    for (std::string const& line : table.lines(out.room()))
         out.line(line);
 }
 

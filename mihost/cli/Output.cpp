@@ -1,6 +1,7 @@
 #include "mihost/cli/Output.h"
 
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/Terminal.h"
 
 #include <cerrno>
 #include <cstring>
@@ -33,6 +34,12 @@ void Output::flush()
 {
     if (std::fflush(stream_) != 0)
         fail();
+}
+
+Room Output::room() const
+{
+    unsigned int const width = terminal::width(fileno(stream_));
+    return {width == 0 ? Room::unlimited : width, terminal::hasUnicode() ? "…" : "~"};
 }
 
 std::string Output::bold(std::string const& text) const

@@ -2,7 +2,7 @@
 #define MIHOST_CLI_OUTPUT_H
 
 #include "mihost/cli/Json.h"
-#include "mihost/cli/Terminal.h"
+#include "mihost/cli/TextTable.h"
 
 #include <cstdio>
 #include <exception>
@@ -44,11 +44,8 @@ public:
         return size_;
     }
 
-    /** Columns of the terminal it goes to, 0 where it is none. */
-    unsigned int width() const
-    {
-        return terminal::width(fileno(stream_));
-    }
+    /** What a line may take: the terminal's columns where it goes to one. */
+    Room room() const;
 
 private:
     [[noreturn]] static void fail();

@@ -1,6 +1,5 @@
 #include "mihost/cli/TextTable.h"
 
-#include "mihost/cli/Terminal.h"
 #include "mihost/runtime/Text.h"
 
 #include <algorithm>
@@ -64,23 +63,23 @@ std::size_t displayWidth(std::string const& text)
     return width;
 }
 
-std::string fitted(std::string const& text, std::size_t columns)
+std::string fitted(std::string const& text, Room const& room)
 {
-    if (displayWidth(text) <= columns)
+    if (displayWidth(text) <= room.columns)
         return text;
-    if (columns == 0)
+    if (room.columns == 0)
         return "";
     std::string cut;
     std::size_t width = 1; // the sign that it was cut
     for (std::string_view rest = text; !rest.empty();) {
         Utf8Piece const piece = firstPiece(rest);
         width += widthOf(piece.character);
-        if (width > columns)
+        if (width > room.columns)
             break;
         cut += rest.substr(0, piece.length);
         rest.remove_prefix(piece.length);
     }
-    return cut + (terminal::hasUnicode() ? "…" : "~");
+    return cut + room.cutSign;
 }
 
 TextTable::TextTable(std::vector<std::string> heading) : rows_{std::move(heading)} {}
@@ -90,20 +89,19 @@ void TextTable::add(std::vector<std::string> cells)
     rows_.push_back(std::move(cells));
 }
 
-std::vector<std::string> TextTable::lines(std::size_t columns) const
+std::vector<std::string> TextTable::lines(Room const& room) const
 {
     std::vector<std::size_t> widths(rows_.front().size());
     for (auto const& row : rows_)
         for (std::size_t at = 0; at < widths.size(); ++at)
             widths[at] = std::max(widths[at], displayWidth(row[at]));
-    if (columns != 0)
-        shrink(widths, columns);
+    shrink(widths, room.columns);
 
     std::vector<std::string> lines;
     for (auto const& row : rows_) {
         std::string line;
         for (std::size_t at = 0; at < widths.size(); ++at) {
-            std::string const cell = fitted(row[at], widths[at]);
+            std::string const cell = fitted(row[at], {widths[at], room.cutSign});
             line += cell;
             line.append(widths[at] - displayWidth(cell) + gap, ' ');
         }

@@ -1,6 +1,7 @@
 #ifndef MIHOST_CLI_TEXTTABLE_H
 #define MIHOST_CLI_TEXTTABLE_H
 
+#include <limits>
 #include <string>
 #include <vector>
 
@@ -10,8 +11,16 @@ namespace mihost
 /** Columns that a text takes on a terminal. The text is printable UTF-8. */
 std::size_t displayWidth(std::string const& text);
 
-/** The text, cut to so many columns and marked as cut where it is wider. */
-std::string fitted(std::string const& text, std::size_t columns);
+/** What a line may take. */
+struct Room {
+    static constexpr std::size_t unlimited = std::numeric_limits<std::size_t>::max();
+
+    std::size_t columns = unlimited;
+    char const* cutSign = "…"; // stands where a text was cut; one column
+};
+
+/** The text, cut to the room's columns and marked as cut where it is wider. */
+std::string fitted(std::string const& text, Room const& room);
 
 /** Rows of cells under a heading, in columns as wide as they need to be. */
 class TextTable
@@ -22,12 +31,8 @@ public:
     /** @param cells  printable text, one for each column */
     void add(std::vector<std::string> cells);
 
-    /**
-     * The lines, without line ends.
-     *
-     * @param columns  what the widest cells are cut to fit into; 0 for no limit
-     */
-    std::vector<std::string> lines(std::size_t columns) const;
+    /** The lines, without line ends. The widest cells are cut until they fit. */
+    std::vector<std::string> lines(Room const& room) const;
 
 private:
     std::vector<std::vector<std::string>> rows_;

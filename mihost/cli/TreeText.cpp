@@ -3,11 +3,9 @@
 #include "mihost/cli/Address.h"
 #include "mihost/cli/PropertyText.h"
 #include "mihost/cli/Terminal.h"
-#include "mihost/cli/TextTable.h"
 #include "mihost/runtime/Text.h"
 
 #include <fmt/format.h>
-#include <limits>
 #include <unordered_map>
 
 namespace mihost
@@ -52,7 +50,7 @@ class Drawing
 public:
     Drawing(std::vector<IC::MutableNode*> const& nodes, TreeStyle const& style, Output& out)
         : style_(style), out_(out), branch_(terminal::hasUnicode() ? unicodeBranch : plainBranch),
-          columns_(out.width() == 0 ? std::numeric_limits<std::size_t>::max() : out.width())
+          room_(out.room())
     {
         std::unordered_map<unsigned int, bool> present;
         for (IC::MutableNode const* node : nodes)
@@ -90,10 +88,10 @@ private:
 
     void drawLine(IC::MutableNode const& node, std::string const& lead) const
     {
-        std::size_t left = columns_;
+        Room left = room_;
         auto const take = [&left](std::string const& text) {
             std::string const taken = fitted(text, left);
-            left -= displayWidth(taken);
+            left.columns -= displayWidth(taken);
             return taken;
         };
         std::string const start = take(lead);
@@ -106,7 +104,7 @@ private:
     TreeStyle style_;
     Output& out_;
     Branch branch_;
-    std::size_t columns_;
+    Room room_;
     std::vector<IC::MutableNode const*> tops_;
     std::unordered_map<unsigned int, std::vector<IC::MutableNode const*>> children_;
 };

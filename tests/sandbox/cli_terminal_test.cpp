@@ -217,6 +217,7 @@ TEST_F(MihostTerminal, FinishesAChangeThatHasBegunBeforeCtrlCEndsIt)
     TerminalRun run({"call", "UserDel", "UserName=jdoe"});
     run.waitFor("begun");
     run.type(ctrlC);
+    run.waitFor("^C"); // shown once the signal is sent
     machine::write("/tmp/answer", "go\n");
     ASSERT_EQ(std::system("cat /tmp/answer >/tmp/go"), 0);
     EXPECT_EQ(run.end(), 128 + SIGINT);

@@ -27,7 +27,8 @@ public:
             Method const* const known =
                 method_->empty() ? nullptr : findMethod(method_->results().front());
             return fmt::format(
-                "{}", fmt::join(known ? methodLines(*known, 0) : methodListLines(0), "\n"));
+                "{}",
+                fmt::join(known ? methodLines(*known, Room()) : methodListLines(Room()), "\n"));
         });
     }
 

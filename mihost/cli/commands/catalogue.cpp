@@ -57,7 +57,7 @@ public:
             if (session.options().json)
                 document.push_back(toJson(*kind));
             else
-                writeLines(kindLines(*kind, session.out().width()), session.out());
+                writeLines(kindLines(*kind, session.out().room()), session.out());
         }
         if (session.options().json)
             session.out().json(document);
@@ -89,9 +89,9 @@ public:
                 document.push_back(toJson(*method));
             out.json(document);
         } else if (method_.empty()) {
-            writeLines(methodListLines(out.width()), out);
+            writeLines(methodListLines(out.room()), out);
         } else {
-            writeLines(methodLines(*findMethod(method_), out.width()), out);
+            writeLines(methodLines(*findMethod(method_), out.room()), out);
         }
     }
 

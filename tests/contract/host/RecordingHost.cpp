@@ -348,8 +348,10 @@ unsigned int MutableNode::getNodeType() const
 Error::Error(unsigned char status, Number const& code, std::string const& text)
     : status_(status), code_(code), text_(text)
 {
-    noteStatic(this, "Error(" + std::to_string(static_cast<unsigned int>(status)) + ", " +
-                         shown(code) + ", \"" + text + "\")");
+    std::string const made = "Error(" + std::to_string(static_cast<unsigned int>(status)) + ", " +
+                             shown(code) + ", \"" + text + "\")";
+    noteStatic(this, made);
+    recordingHost().errors.push_back(made);
 }
 
 Error::Error(Error const& other) = default;
@@ -404,7 +406,7 @@ int Mutex::lock(unsigned long timeout)
 {
     note("lock(" + std::to_string(timeout) + ")");
     handle_->mutex.lock();
-    return 0;
+    return recordingHost().lockStatus;
 }
 
 int Mutex::unlock()

@@ -36,10 +36,14 @@ struct RecordingHost {
 
     std::vector<LogCall> logCalls;
 
+    /** Every status that was made, such as "Error(1, empty 0, \"\")"; copies not counted. */
+    std::vector<std::string> errors;
+
     // What the framework answers.
     unsigned char initializeStatus = 0;
     unsigned char addNewNodeStatus = 0;
     unsigned char setterStatus = 0; // of a node's setStatus, setDescription and setProperty
+    int lockStatus = 0;              // of a mutex, which is locked all the same
 
     /** The interface ids that initialize sets; its own where empty. */
     std::vector<unsigned int> miIds;

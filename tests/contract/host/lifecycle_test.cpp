@@ -8,6 +8,7 @@
 #include <algorithm>
 #include <dlfcn.h>
 #include <memory>
+#include <new>
 
 namespace
 {
@@ -39,6 +40,37 @@ TEST(Library, ConstructsItsObjectsInOrderAndDestroysThemInReverse)
                                   "~ManagementInterface(), category Veltrix.IC.MI.OsSwMI"}));
 }
 
+TEST(Library, DestroysTheMutexOfTheGroupListingFirstOfAll)
+{
+    RecordingHost& host = freshHost();
+    libc::FileRoot const files{MACHINES_DIR "/redhat"};
+    libc::FakeCommands const commands;
+    auto plugin = std::make_unique<Plugin>();
+    plugin->initialize(); // which lists the groups for the first time
+    plugin->unload();
+    host.events.clear();
+    plugin.reset();
+    EXPECT_EQ(host.events, (Lines{"~Mutex()", "~Mutex()", "~Error()",
+                                  "~ManagementInterface(), category Veltrix.IC.MI.OsSwMI"}));
+}
+
+TEST(Library, DeletesNoNodeWhenItIsClosed)
+{
+    RecordingHost& host = freshHost();
+    auto plugin = std::make_unique<Plugin>();
+    auto& mi = static_cast<IC::OsSwMI&>(plugin->interface());
+    IC::MutableNode user(1, 0, {1}, NODES::userType, 1);
+    IC::MutableNode group(2, 0, {1}, NODES::groupType, 1);
+    IC::MutableNode entry(3, 0, {1}, NODES::logEntryType, 1);
+    Insides::userNodes(mi) = {&user};
+    Insides::groupNodes(mi) = {&group};
+    Insides::logEntryNodes(mi) = {&entry};
+    host.events.clear();
+    plugin.reset();
+    EXPECT_EQ(host.events, (Lines{"~Mutex()", "~Error()",
+                                  "~ManagementInterface(), category Veltrix.IC.MI.OsSwMI"}));
+}
+
 TEST(Library, IsGoneOnceItIsClosed)
 {
     std::make_unique<Plugin>().reset();
@@ -51,6 +83,13 @@ protected:
     IC::OsSwMI*& current() const
     {
         return object<IC::OsSwMI*>("_ZN2IC7pOsSwMIE");
+    }
+
+    /** Deletes the nodes of a kind and makes them anew, as a write of a host does. */
+    void rebuild(char const* builder) const
+    {
+        auto* const rebuilds = reinterpret_cast<void (*)(IC::OsSwMI*, bool)>(plugin.symbol(builder));
+        rebuilds(&mi(), true);
     }
 
     Ids nodeTypes() const
@@ -69,6 +108,17 @@ TEST_F(Lifecycle, StartsWithEmptyListsNoInterfaceInUseAndTheFlagDown)
     EXPECT_TRUE(Insides::logEntryNodes(mi()).empty());
     EXPECT_EQ(current(), nullptr);
     EXPECT_FALSE(object<bool>("_ZN2IC6OSSWMI7MI_callE"));
+}
+
+TEST_F(Lifecycle, ReadsTheIdRangesNotBeforeTheyAreAskedFor)
+{
+    auto const& instance = object<void*>("_ZN2NQ8minMaxId9pinstanceE");
+    EXPECT_EQ(instance, nullptr);
+    plugin.initialize();
+    void const* const first = instance;
+    EXPECT_NE(first, nullptr);
+    rebuild("_ZN2IC6OsSwMI15createUserNodesEb");
+    EXPECT_EQ(instance, first);
 }
 
 TEST_F(Lifecycle, OpenMIYieldsTheSameTwoAddressesEachTime)
@@ -108,6 +158,7 @@ TEST_F(Lifecycle, SetLoadCallBackStoresItsThreeArgumentsAndCallsNothing)
     EXPECT_EQ(Insides::lookupCallBack(mi()), lookUp);
     EXPECT_EQ(host.events, Lines());
     plugin.initialize();
+    rebuild("_ZN2IC6OsSwMI15createUserNodesEb");
 }
 
 TEST_F(Lifecycle, InitializePassesItsThreeArgumentsOnUnchanged)
@@ -191,6 +242,43 @@ TEST_F(Lifecycle, TheTreeStandsWhateverTheSettersAnswer)
     EXPECT_EQ(host.messages(), said);
 }
 
+TEST_F(Lifecycle, PassesOnThatMemoryIsExhaustedWhateverNodeWasToBeBuilt)
+{
+    commands.answers = {{"lsmod", "exnet 24576 0\n"},
+                        {"modinfo exnet", ""},
+                        {"wc -l /var/log/messages", "1 /var/log/messages\n"}};
+    std::size_t built = 0;
+    host.onNode = [&built] { ++built; };
+    plugin.initialize();
+    std::size_t const whole = built;
+    ASSERT_GE(whole, 9U); // one of each kind at least
+    plugin.unload();
+    for (std::size_t last = 1; last <= whole; ++last) {
+        built = 0;
+        host.onNode = [&built, last] {
+            if (++built == last)
+                throw std::bad_alloc();
+        };
+        EXPECT_THROW(plugin.initialize(), std::bad_alloc) << last;
+        EXPECT_EQ(built, last);
+        plugin.unload();
+    }
+}
+
+TEST_F(Lifecycle, TheTreeStandsWhateverALockAnswers)
+{
+    plugin.initialize();
+    Ids const whole = nodeTypes();
+    plugin.unload();
+    host.events.clear();
+    host.lockStatus = 1;
+    plugin.initialize();
+    EXPECT_EQ(nodeTypes(), whole);
+    // Around the users, around the groups, and around the listing of the groups.
+    EXPECT_EQ(std::count(host.events.begin(), host.events.end(), "lock(4294967295)"), 3);
+    EXPECT_EQ(std::count(host.events.begin(), host.events.end(), "unlock()"), 3);
+}
+
 TEST_F(Lifecycle, NodesOfTheStartAreNotPublishedOneByOne)
 {
     commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
@@ -259,20 +347,13 @@ void PrintTo(Rebuild const& rebuild, std::ostream* out)
 
 class Rebuilding : public Publishing, public testing::WithParamInterface<Rebuild>
 {
-protected:
-    void rebuild() const
-    {
-        auto* const builder =
-            reinterpret_cast<void (*)(IC::OsSwMI*, bool)>(plugin.symbol(GetParam().builder));
-        builder(&mi(), true);
-    }
 };
 
 TEST_P(Rebuilding, LogsEachRefusalOnceAndGoesOn)
 {
     commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
     host.addNewNodeStatus = 1;
-    rebuild();
+    rebuild(GetParam().builder);
     std::size_t const nodes = plugin.nodes(GetParam().type).size();
     ASSERT_GE(nodes, 3U);
     Lines refusals;

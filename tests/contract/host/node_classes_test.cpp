@@ -71,7 +71,8 @@ TEST_P(Reads, SayTwoLinesAroundTheFrameworksOwn)
     std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
     host.events.clear();
     IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
-    EXPECT_EQ(node->getProperty(plainProperty, value).getStatus(), 1);
+    IC::Error const answer = node->getProperty(plainProperty, value);
+    EXPECT_EQ(static_cast<std::string>(answer), "status 1, not set");
     std::string const says = GetParam().says;
     EXPECT_EQ(host.events, (Lines{"log: " + says + ": entry", "log: " + says + ": exit"}));
 }
@@ -102,6 +103,14 @@ TEST_P(Writes, SayTwoLinesAroundTheFrameworksStore)
     EXPECT_EQ(text(*node, plainProperty), "x");
 }
 
+TEST_P(Writes, AnswerWhatTheFrameworksStoreAnswers)
+{
+    std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
+    host.setterStatus = 7;
+    IC::PropertyValue const value("x", true);
+    EXPECT_EQ(node->setProperty(plainProperty, value).getStatus(), 7);
+}
+
 INSTANTIATE_TEST_SUITE_P(All, Writes,
                          testing::Values(Operation{"OsNode", "OsNode::setProperty"},
                                          Operation{"UserNode", "UserNode::setProperty"},
@@ -109,6 +118,70 @@ INSTANTIATE_TEST_SUITE_P(All, Writes,
                          [](auto const& operation) {
                              return std::string(operation.param.className);
                          });
+
+/** A property that a class answers itself, and the status that it makes for that. */
+struct OwnAnswer {
+    char const* name;
+    char const* className;
+    unsigned int id;
+    char const* status;
+};
+
+void PrintTo(OwnAnswer const& answer, std::ostream* out)
+{
+    *out << answer.name;
+}
+
+class OwnReads : public Loaded, public testing::WithParamInterface<OwnAnswer>
+{
+};
+
+TEST_P(OwnReads, MakeOneStatusAndAskNothingOfTheFramework)
+{
+    std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
+    host.errors.clear();
+    IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
+    node->getProperty(GetParam().id, value);
+    EXPECT_EQ(host.errors, Lines{GetParam().status});
+}
+
+constexpr char const* success = "Error(0, empty 0, \"\")";
+constexpr char const* countSuccess = "Error(0, unsigned 0, \"\")";
+constexpr char const* failure = "Error(1, empty 0, \"\")";
+
+// The log cannot be counted here, and the index of the entry's node is 16.
+INSTANTIATE_TEST_SUITE_P(All, OwnReads,
+                         testing::Values(OwnAnswer{"ProcessCount", "OsNode", 144, success},
+                                         OwnAnswer{"ClearCommand", "OsNode", 191, success},
+                                         OwnAnswer{"UserCount", "UserNode", 51, countSuccess},
+                                         OwnAnswer{"GroupCount", "GroupNode", 51, countSuccess},
+                                         OwnAnswer{"LogIndex", "LogEntryNode", 89, success},
+                                         OwnAnswer{"LogMessage", "LogEntryNode", 81, failure},
+                                         OwnAnswer{"LogTime", "LogEntryNode", 79, failure}),
+                         [](auto const& answer) { return std::string(answer.param.name); });
+
+class CommandWrites : public Loaded
+{
+protected:
+    std::unique_ptr<IC::MutableNode> const os{construct("OsNode")};
+};
+
+TEST_F(CommandWrites, ThatFailMakeAStatusOfTheirOwnWhateverTheStoreAnswers)
+{
+    host.setterStatus = 7;
+    host.errors.clear();
+    EXPECT_EQ(os->setProperty(74, IC::PropertyValue("NoSuchMethod", true)).getStatus(), 1);
+    EXPECT_EQ(host.errors, (Lines{"Error(7, empty 0, \"\")", failure}));
+}
+
+TEST_F(CommandWrites, AnswerWhatTheStoreAnswersWhetherTheActionWorkedOrNot)
+{
+    host.setterStatus = 7;
+    for (unsigned int const id : {123U, 191U})
+        EXPECT_EQ(os->setProperty(id, IC::PropertyValue(IC::Number(12U), true)).getStatus(), 7);
+    EXPECT_EQ(os->setProperty(74, IC::PropertyValue("dummy", true)).getStatus(), 7);
+    EXPECT_EQ(commands.ran, Lines{"/sbin/shutdown -h now"}); // which could not be started
+}
 
 class GroupNodeWrites : public Loaded
 {

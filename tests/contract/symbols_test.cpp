@@ -63,4 +63,27 @@ TEST_P(Symbols, ThatAreListedAreAllInTheLibrary)
 INSTANTIATE_TEST_SUITE_P(Lists, Symbols, testing::Values("undefined", "exported"),
                          [](auto const& list) { return std::string(list.param); });
 
+/** What the library wants of anybody, the C and C++ runtimes included, in the linker's words. */
+std::string wanted()
+{
+    Outcome const outcome = runToEnd({"/usr/bin/nm", "--dynamic", "--undefined-only", PLUGIN_FILE});
+    EXPECT_EQ(outcome.code, 0) << outcome.err;
+    return outcome.out;
+}
+
+TEST(Library, StartsNoThread)
+{
+    std::string const names = wanted();
+    ASSERT_NE(names.find(" popen@"), std::string::npos);
+    for (char const* name : {"pthread_create", "thrd_create", "_M_start_thread", " clone", " fork"})
+        EXPECT_EQ(names.find(name), std::string::npos) << name;
+}
+
+TEST(Library, ThrowsNothingOfItsOwn)
+{
+    std::string const names = wanted();
+    ASSERT_NE(names.find(" popen@"), std::string::npos);
+    EXPECT_EQ(names.find("__cxa_throw"), std::string::npos);
+}
+
 } // namespace

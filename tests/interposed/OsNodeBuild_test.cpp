@@ -254,6 +254,40 @@ TEST_F(OsNodeBuild, WritesTheTimesInLocalTime)
     EXPECT_EQ(stored(141), "date 1273659825 true");
 }
 
+/** Notes messages among the fact readers that come and go. */
+class MessagesAmongLives : public mihost::LogSink
+{
+public:
+    MessagesAmongLives()
+    {
+        standIns().lives.clear();
+        mihost::setLogSink(this);
+    }
+    ~MessagesAmongLives() override
+    {
+        mihost::setLogSink(nullptr);
+    }
+
+    void write(mihost::LogMessage const& message) override
+    {
+        if (message.operation == mihost::LogMessage::Operation::Log)
+            standIns().lives.push_back(message.text);
+    }
+};
+
+TEST_F(OsNodeBuild, AsksOneFactReaderOfItsOwnAndReleasesItBeforeItSaysItsExit)
+{
+    MessagesAmongLives const noting;
+    build();
+    std::vector<std::string> const& lives = standIns().lives;
+    // One more than its 24 writes and its 6 reads make for themselves.
+    EXPECT_EQ(std::count(lives.begin(), lives.end(), "OsInfo made"), 24 + 6 + 1);
+    EXPECT_EQ(std::count(lives.begin(), lives.end(), "OsInfo gone"), 24 + 6 + 1);
+    ASSERT_GE(lives.size(), 2U);
+    EXPECT_EQ(lives[lives.size() - 2], "OsInfo gone");
+    EXPECT_EQ(lives.back(), "createOsNodes: exit");
+}
+
 class OsNodeRead : public OsNodeBuild
 {
 protected:
@@ -354,6 +388,19 @@ TEST_F(OsNodeRead, HandsBackTheFrameworksErrorForAnUnknownProperty)
     EXPECT_NE(error.getStatus(), 0U);
     EXPECT_EQ(static_cast<std::string>(error), static_cast<std::string>(framework));
     EXPECT_EQ(static_cast<std::string>(value), "before");
+}
+
+TEST_F(OsNodeRead, MakesOneFactReaderForItsOwnTimeWhateverTheProperty)
+{
+    for (unsigned int const id : {144U, 153U, 191U, 108U, 74U, 4711U}) {
+        MessagesAmongLives const noting;
+        PropertyValue value("", true);
+        node_.getProperty(id, value);
+        EXPECT_EQ(standIns().lives,
+                  (std::vector<std::string>{"OsNode::getProperty: entry", "OsInfo made",
+                                            "OsInfo gone", "OsNode::getProperty: exit"}))
+            << id;
+    }
 }
 
 TEST_F(OsNodeRead, LogsItsEntryAndExitUnderTheClassName)

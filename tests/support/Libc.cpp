@@ -249,6 +249,12 @@ void setpwent()
     return hooks().setpwent ? hooks().setpwent() : real();
 }
 
+void endpwent()
+{
+    static auto* const real = libc::next<void()>("endpwent");
+    return hooks().endpwent ? hooks().endpwent() : real();
+}
+
 int fgetpwent_r(FILE* stream, struct passwd* entry, char* buffer, std::size_t size,
                 struct passwd** found)
 {

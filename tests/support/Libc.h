@@ -33,6 +33,7 @@ struct Hooks {
     std::function<int()> lckpwdf;
     std::function<int()> ulckpwdf;
     std::function<void()> setpwent;
+    std::function<void()> endpwent;
     std::function<int(FILE* stream, struct passwd* entry, char* buffer, std::size_t size,
                       struct passwd** found)>
         fgetpwent_r;

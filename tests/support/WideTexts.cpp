@@ -48,4 +48,13 @@ std::string make_string(std::wstring const& text)
     return narrow;
 }
 
+std::string make_string(char const* text)
+{
+    static auto* const real = next<std::string(char const*)>("_ZN2NQ11make_stringB5cxx11EPKc");
+    std::string const made = real(text);
+    if (inUse)
+        inUse->made.push_back(made);
+    return made;
+}
+
 } // namespace NQ

@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-/** Notes every text that is turned into wide text, or back from it, for as long as it lives. */
+/** Notes every text that the host's conversions turn into another kind, while it lives. */
 class WideTexts
 {
 public:
@@ -15,6 +15,9 @@ public:
 
     std::vector<std::string> widened;
     std::vector<std::string> narrowed;
+
+    /** C strings that were made into texts. */
+    std::vector<std::string> made;
 };
 
 #endif

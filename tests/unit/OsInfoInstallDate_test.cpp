@@ -59,6 +59,7 @@ TEST_F(InstallDate, IsZeroWithoutAReleaseFile)
 TEST_F(InstallDate, IsTheReleaseFilesLastStatusChange)
 {
     EXPECT_EQ(dateOf("Change: 2010-05-12 10:23:45.000000000 +0200\n"), may2010);
+    EXPECT_EQ(commands_.modes, std::vector<std::string>{"r"});
 }
 
 TEST_F(InstallDate, IsReadAsLocalTimeWhateverTheZoneOffsetSays)

@@ -235,6 +235,26 @@ TEST_F(OSVersion, IsTheKernelsReleaseOnUnitedLinux)
     EXPECT_TRUE(commands_.ran.empty());
 }
 
+TEST_F(OSVersion, ClosesTheUnitedLinuxFileWhetherTheKernelAnswersOrNot)
+{
+    files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
+    int probe = -1;
+    libc::hooks().fopen = [&probe, below = libc::hooks().fopen](char const* path,
+                                                                char const* mode) {
+        FILE* const stream = below(path, mode);
+        if (stream)
+            probe = fileno(stream);
+        return stream;
+    };
+    for (bool const fails : {false, true}) {
+        unameFails_ = fails;
+        probe = -1;
+        version();
+        EXPECT_NE(probe, -1);
+        EXPECT_FALSE(isOpen(probe));
+    }
+}
+
 TEST_F(OSVersion, FailsOnUnitedLinuxWhenTheKernelDoesNotAnswer)
 {
     files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");

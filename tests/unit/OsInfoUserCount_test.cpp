@@ -40,6 +40,7 @@ protected:
             return 0;
         };
         libc::hooks().setpwent = [this] { steps_.emplace_back("setpwent"); };
+        libc::hooks().endpwent = [this] { steps_.emplace_back("endpwent"); };
         libc::hooks().fgetpwent_r = [this](FILE* stream, passwd* entry, char* buffer,
                                            std::size_t size, passwd** found) {
             steps_.emplace_back("read");
@@ -105,7 +106,7 @@ TEST_F(UserCount, OpensTheAccountFileInItsOwnMode)
     EXPECT_EQ(opened, std::vector<std::string>{"/etc/passwd|ro"});
 }
 
-TEST_F(UserCount, HoldsTheLockForTheWholeScan)
+TEST_F(UserCount, HoldsTheLockForTheWholeScanAndLeavesTheDatabaseOpen)
 {
     countOf(account("root", 0) + account("jdoe", 1000));
     EXPECT_EQ(steps_,

@@ -258,6 +258,19 @@ TEST_F(GroupNodes, AnswerTheirCountLive)
     EXPECT_EQ(storedValue(*groups()[0], 51), "number 2 true");
 }
 
+TEST_F(GroupNodes, AnswerTheirCountWithoutTheLockThatTheyShareWithUsers)
+{
+    frame.createGroupNodes(false);
+    Texts locked;
+    MutexCalls mutexes;
+    mutexes.onLock = [&locked](NQ::Mutex const& mutex, unsigned long) {
+        locked.emplace_back(&mutex == &IC::OSSWMI::myuserlock ? "shared" : "the listing's");
+    };
+    IC::PropertyValue value = NODES::emptyValue();
+    groups()[0]->getProperty(51, value);
+    EXPECT_EQ(locked, Texts{"the listing's"});
+}
+
 TEST_F(GroupNodes, AnswerAllElseFromWhatIsStored)
 {
     frame.createGroupNodes(false);

@@ -50,6 +50,16 @@ public:
     static_assert(std::is_same_v<decltype(loadCallBackContext_), void const*>);
     static_assert(
         std::is_same_v<decltype(lookupCallBack_), IC::Error (*)(std::string const&, IC::Node**)>);
+    static_assert(std::is_same_v<decltype(currentNode_), IC::MutableNode*>);
+    static_assert(std::is_same_v<decltype(nodeIds_), std::vector<unsigned int>*>);
+    static_assert(std::is_same_v<decltype(osSwNode_), IC::MutableNode*>);
+    static_assert(std::is_same_v<decltype(rootNode_), IC::MutableNode*>);
+    static_assert(std::is_same_v<decltype(computerNode_), IC::MutableNode*>);
+    static_assert(std::is_same_v<decltype(osNode_), IC::MutableNode*>);
+    static_assert(std::is_same_v<decltype(logNode_), IC::MutableNode*>);
+    static_assert(std::is_same_v<decltype(userNodes_), std::vector<IC::Node*>>);
+    static_assert(std::is_same_v<decltype(groupNodes_), std::vector<IC::Node*>>);
+    static_assert(std::is_same_v<decltype(logEntryNodes_), std::vector<IC::Node*>>);
 
 private:
     template <class Member> std::ptrdiff_t offset(Member const& member) const

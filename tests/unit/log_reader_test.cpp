@@ -8,6 +8,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <ctime>
+#include <fcntl.h>
 #include <fstream>
 #include <iterator>
 #include <set>
@@ -394,6 +395,18 @@ TEST_F(LogReader, RunsThreeCountsOneFetchAndOneDateForATime)
     EXPECT_EQ(commands.open, 0);
 }
 
+TEST_F(LogReader, ReadsEachCommandsLineIntoABufferOf512Bytes)
+{
+    std::vector<int> sizes;
+    libc::hooks().fgets = [&sizes](char* buffer, int size, FILE* stream) {
+        sizes.push_back(size);
+        return libc::realFgets(buffer, size, stream);
+    };
+    timeOf(1);
+    libc::hooks().fgets = nullptr;
+    EXPECT_EQ(sizes, std::vector<int>(5, 512)); // three counts, the line and the date
+}
+
 TEST_F(LogReader, ReadsATimeStampAsLocalTime)
 {
     setTimeZone("CET-1CEST,M3.5.0,M10.5.0/3");
@@ -557,15 +570,19 @@ TEST_F(LogClearing, KeepsTheFileAndItsPermissions)
     EXPECT_EQ(after.st_mode, before.st_mode);
 }
 
-TEST_F(LogClearing, OpensTheLogForWriting)
+TEST_F(LogClearing, OpensTheLogForWritingAndClosesIt)
 {
     Texts opened;
-    libc::hooks().fopen = [&opened](char const* path, char const* mode) {
+    int descriptor = -1;
+    libc::hooks().fopen = [&](char const* path, char const* mode) {
         opened.push_back(std::string(path) + "|" + mode);
-        return std::tmpfile();
+        FILE* const stream = std::tmpfile();
+        descriptor = fileno(stream);
+        return stream;
     };
     EXPECT_TRUE(logInfo().clearLog());
     EXPECT_EQ(opened, Texts{"/var/log/messages|w"});
+    EXPECT_EQ(fcntl(descriptor, F_GETFD), -1);
 }
 
 TEST_F(LogClearing, FailsInSilenceAndLeavesAFileThatCannotBeOpened)

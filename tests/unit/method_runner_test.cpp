@@ -96,6 +96,15 @@ TEST_F(ExecuteCommand, FailsWhereThePipeCannotBeOpened)
     EXPECT_EQ(log.texts(6000), Lines{"Cannot open process: /bin/one"});
 }
 
+TEST_F(ExecuteCommand, DoesNotLookAtHowTheCommandEnded)
+{
+    libc::hooks().pclose = [](FILE* stream) {
+        std::fclose(stream);
+        return 1 << 8;
+    };
+    EXPECT_EQ(run("/bin/one", {}), 0);
+}
+
 TEST_F(ExecuteCommand, ClosesThePipe)
 {
     commands_.otherwise = "x";

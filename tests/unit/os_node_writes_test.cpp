@@ -4,6 +4,7 @@
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
 #include "tests/support/Recording.h"
+#include "tests/support/WideTexts.h"
 
 #include <gtest/gtest.h>
 
@@ -280,6 +281,52 @@ TEST_F(OsNodeWrites, HandTheTextOnByteForByte)
     std::string const name = "j\xC3\xB6rg\xFF\xE2\x82";
     commands_.answers["/usr/sbin/userdel " + name + " 2>&1"] = "";
     EXPECT_EQ(writeText("UserDel,UserName:CMPI_string:" + name).getStatus(), 0);
+}
+
+TEST_F(OsNodeWrites, OfAMethodPassTheTextThroughWideTextAndBack)
+{
+    WideTexts const texts;
+    writeText("UserDel,UserName:CMPI_string:jdoe");
+    writeText("dummy");
+    EXPECT_EQ(texts.widened, (Lines{"UserDel,UserName:CMPI_string:jdoe", "dummy"}));
+    EXPECT_EQ(texts.narrowed, texts.widened);
+}
+
+TEST_F(OsNodeWrites, AreStoredOnceTheyHaveBeenActedOn)
+{
+    struct {
+        unsigned int id;
+        PropertyValue value;
+        char const* action; // a message that only the action logs
+    } const commands[] = {
+        {123, {Number(9U), true}, "Reboot after shutdown."},
+        {123, {Number(12U), true}, "Halt after shutdown."},
+        {191, {Number(9U), true}, "createLogEntryNodes: exit"},
+        {75, {Number(0U), true}, "createGroupNodes: exit"},
+        {74, {addition, true}, "createGroupNodes: exit"},
+    };
+    for (auto const& command : commands) {
+        node_.IC::MutableNode::setProperty(command.id, PropertyValue("before", true));
+        struct StoredAt : mihost::LogSink {
+            void write(mihost::LogMessage const& message) override
+            {
+                if (message.text == action)
+                    stored = storedValue(*node, id);
+            }
+            IC::MutableNode const* node = nullptr;
+            unsigned int id = 0;
+            std::string action;
+            std::string stored;
+        } sink;
+        sink.node = &node_;
+        sink.id = command.id;
+        sink.action = command.action;
+        mihost::setLogSink(&sink);
+        write(command.id, command.value);
+        mihost::setLogSink(nullptr);
+        EXPECT_EQ(sink.stored, "text before true") << command.action;
+        EXPECT_EQ(stored(command.id), shown(command.value)) << command.action;
+    }
 }
 
 TEST_F(OsNodeWrites, OfAnyOtherPropertyAreStoredOnly)

@@ -18,6 +18,13 @@ TEST(Strreplace, LeavesTheFirstCharacterAsItIs)
     EXPECT_EQ(replaced("-a-b", '-', ' '), "-a b");
 }
 
+TEST(Strreplace, ReplacesEveryOtherCharacterUpToTheEndOfTheText)
+{
+    char text[] = "ab-c--d-\0-";
+    NQ::OsInfo().strreplace(text, '-', ' ');
+    EXPECT_EQ(std::string(text, 10), std::string("ab c  d \0-", 10));
+}
+
 TEST(Strreplace, StopsAtTheFirstReplacementByNul)
 {
     char text[] = "abcbd";
@@ -27,7 +34,9 @@ TEST(Strreplace, StopsAtTheFirstReplacementByNul)
 
 TEST(Strreplace, LeavesAnEmptyTextAlone)
 {
-    EXPECT_EQ(replaced("", '-', ' '), "");
+    char text[] = {'\0', '-', '\0'};
+    NQ::OsInfo().strreplace(text, '-', ' ');
+    EXPECT_EQ(std::string(text, 2), std::string("\0-", 2));
 }
 
 } // namespace

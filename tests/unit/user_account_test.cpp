@@ -305,6 +305,18 @@ TEST_F(CommandRunner, IsFalseForACommandThatCannotBeStarted)
     EXPECT_EQ(errors(), Lines{"Cannot open process: /usr/bin/tool"});
 }
 
+TEST_F(CommandRunner, DoesNotLookAtHowTheCommandEnded)
+{
+    libc::hooks().pclose = [](FILE* stream) {
+        std::fclose(stream);
+        return 1 << 8;
+    };
+    commands_.answers["/usr/bin/tool 2>&1"] = "said\n";
+    EXPECT_TRUE(runTool({"ignored"}).result);
+    commands_.answers["/usr/bin/tool 2>&1"] = "";
+    EXPECT_FALSE(runTool({"ignored"}).result);
+}
+
 TEST_F(CommandRunner, CopiesAllOfTheOutputHoweverLong)
 {
     std::string const output(15000, 'o');

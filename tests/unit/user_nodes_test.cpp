@@ -345,6 +345,17 @@ TEST_F(UserNodes, AnswerTheirCountLive)
     EXPECT_EQ(storedValue(*users()[0], 51), "number 3 true");
 }
 
+TEST_F(UserNodes, AnswerTheirCountWithoutALock)
+{
+    frame.createUserNodes(false);
+    int locks = 0;
+    MutexCalls mutexes;
+    mutexes.onLock = [&locks](NQ::Mutex const&, unsigned long) { ++locks; };
+    IC::PropertyValue value = NODES::emptyValue();
+    users()[0]->getProperty(51, value);
+    EXPECT_EQ(locks, 0);
+}
+
 TEST_F(UserNodes, AnswerTheirCountWhateverIsStoredUnderIt)
 {
     frame.createUserNodes(false);

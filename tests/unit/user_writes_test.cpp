@@ -220,6 +220,22 @@ TEST_F(UserWrite, IsStoredWhateverBecomesOfTheCommand)
     EXPECT_EQ(log.texts(6000).back(), "Cannot open process: command = userdel -r 1000");
 }
 
+TEST_F(UserWrite, IsStoredOnceItHasBeenActedOn)
+{
+    for (unsigned int const id : {117U, 118U, 91U, 138U}) {
+        std::string const before = storedValue(anna(), id);
+        Texts stored;
+        libc::hooks().popen = [&](char const*, char const*) -> FILE* {
+            stored.push_back(storedValue(anna(), id));
+            return nullptr;
+        };
+        write(id, NODES::text("1"));
+        ASSERT_FALSE(stored.empty()) << id;
+        EXPECT_EQ(stored, Texts(stored.size(), before)) << id;
+        EXPECT_EQ(storedValue(anna(), id), "text 1 true");
+    }
+}
+
 TEST_F(UserWrite, OfOneToDeleteRunsUserdelWithTheUidText)
 {
     commands.answers["userdel -r 1000"] = "";

@@ -186,6 +186,17 @@ TEST(MihostList, ShowsTheColumnsAskedFor)
     EXPECT_EQ(list[0]["properties"]["81"]["value"], "*second*");
 }
 
+TEST(MihostList, PointsToTheDoctorWhereThereIsNothingOfTheKind)
+{
+    makeMachine();
+    machine::write("/var/log/messages", "");
+    auto const outcome = mihostRun({"list", "log"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.out, "index  time  message\n");
+    EXPECT_EQ(outcome.err, "mihost: nothing to list under log; see 'mihost doctor'\n");
+    EXPECT_EQ(mihostRun({"--json", "list", "log"}).err, "");
+}
+
 TEST(MihostList, RefusesAKindThatIsNone)
 {
     EXPECT_EQ(mihostRun({"list", "things"}).code, 2);

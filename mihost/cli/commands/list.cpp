@@ -52,6 +52,8 @@ public:
             session.out().json(table.json(nodes, session.secrets()));
         else
             table.write(nodes, session.secrets(), session.out());
+        if (nodes.empty() && !session.options().json)
+            fmt::print(stderr, "mihost: nothing to list under {}; see 'mihost doctor'\n", kind_);
     }
 
 private:

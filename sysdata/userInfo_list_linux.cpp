@@ -5,14 +5,13 @@
 #include "sysdata/userInfo_linux.h"
 #include "sysdata/userInfo_log.h"
 #include "sysdata/userInfo_parse.h"
+#include "util/file.h"
 
 #include <cstdio>
 #include <cstring>
-#include <fstream>
-#include <locale>
 #include <pwd.h>
 #include <shadow.h>
-#include <sstream>
+#include <string>
 #include <utility>
 
 namespace NQ
@@ -83,14 +82,6 @@ private:
     char ageingLine_[lineSize] = "";
 };
 
-std::string decimal(unsigned int number)
-{
-    std::ostringstream text;
-    text.imbue(std::locale::classic());
-    text << number;
-    return text.str();
-}
-
 /** An empty field comes as -1, in whatever width a long has. */
 unsigned long daysOf(long field)
 {
@@ -110,11 +101,15 @@ void setAgeing(userInfo& user, spwd const& entry)
 }
 
 /** The number that the login service's rules allow; the last one in the file, 0 without one. */
-long readMaxLoginFailures(char const* function)
+long readMaxLoginFailures(FILES::WholeText& text, char const* function)
 {
+    FILES::File const file("/etc/pam.d/login", "r");
+    if (!file.stream())
+        return 0;
     long failures = 0;
-    std::ifstream rules("/etc/pam.d/login");
-    for (std::string line; std::getline(rules, line);)
+    std::string_view rules = text.read(file.stream());
+    for (std::string line = USER_INFO::takeDenyLine(rules); !line.empty();
+         line = USER_INFO::takeDenyLine(rules))
         if (USER_INFO::scanDeny(line, failures) == USER_INFO::Scan::invalid)
             LOG::write(unit, LOG::error, LOG::message("Invalid format: line = ", line), function);
     return failures;
@@ -127,12 +122,13 @@ void getUserInfo(std::vector<userInfo>& users)
     LOG::Scope const scope(unit);
     users.clear();
     AccountFiles files;
+    FILES::WholeText rules;
     while (passwd const* account = files.nextAccount()) {
         if (!isReportedUser(account->pw_uid))
             continue;
         userInfo user(account->pw_name);
-        user.setUserId(decimal(account->pw_uid));
-        user.setGroupId(decimal(account->pw_gid));
+        user.setUserId(std::to_string(account->pw_uid));
+        user.setGroupId(std::to_string(account->pw_gid));
         // An entry that stands for a remote database has none of these texts.
         user.setUserFullName(make_string(account->pw_gecos));
         user.setUserHomeDir(make_string(account->pw_dir));
@@ -140,7 +136,7 @@ void getUserInfo(std::vector<userInfo>& users)
         user.setUserAcctDisabled(false);
         if (spwd const* ageing = files.findShadow(account->pw_name))
             setAgeing(user, *ageing);
-        user.setMaxLoginFailures(readMaxLoginFailures(__func__));
+        user.setMaxLoginFailures(readMaxLoginFailures(rules, __func__));
         users.push_back(std::move(user));
     }
 }

@@ -1,5 +1,6 @@
 #include "sysdata/userInfo_parse.h"
 
+#include <algorithm>
 #include <cstdio>
 #include <cstring>
 #include <vector>
@@ -7,9 +8,27 @@
 namespace NQ::USER_INFO
 {
 
+namespace
+{
+constexpr std::string_view denyKey = "deny=";
+}
+
+std::string takeDenyLine(std::string_view& rules)
+{
+    std::size_t const at = rules.find(denyKey);
+    if (at == std::string_view::npos)
+        return {};
+    std::size_t const lineEnd = std::min(rules.find('\n', at), rules.size());
+    std::size_t const before = rules.rfind('\n', at);
+    std::size_t const begin = before == std::string_view::npos ? 0 : before + 1;
+    std::string line(rules.substr(begin, lineEnd - begin));
+    rules.remove_prefix(lineEnd);
+    return line;
+}
+
 Scan scanDeny(std::string const& line, long& deny)
 {
-    std::string::size_type const at = line.find("deny=");
+    std::string::size_type const at = line.find(denyKey);
     if (at == std::string::npos)
         return Scan::absent;
     int number = 0;

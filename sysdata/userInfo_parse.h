@@ -4,6 +4,7 @@
 #include "util/internal.h"
 
 #include <string>
+#include <string_view>
 
 /** The texts that user records are read from. Nothing here does I/O or logs. */
 namespace NQ
@@ -14,6 +15,13 @@ namespace USER_INFO
 
 /** What a line has to say about what is looked for in it. */
 enum class Scan { absent, valid, invalid };
+
+/**
+ * The next line that holds "deny=", without its end; empty where there is none.
+ *
+ * @param rules  what follows that line from now on
+ */
+MI_INTERNAL std::string takeDenyLine(std::string_view& rules);
 
 /**
  * Reads the number behind the first "deny=" of a line of the login service's rules.

@@ -1,5 +1,7 @@
 #include "util/file.h"
 
+#include <algorithm>
+
 namespace NQ::FILES
 {
 
@@ -32,6 +34,20 @@ bool readToEnd(FILE* stream, char* buffer, std::size_t size)
     }
     buffer[kept] = '\0';
     return any;
+}
+
+std::string_view WholeText::read(FILE* stream)
+{
+    constexpr std::size_t firstSize = 8192;
+    buffer_.resize(std::max(buffer_.size(), firstSize));
+    std::setvbuf(stream, nullptr, _IONBF, 0); // straight into the buffer here
+    std::size_t length = 0;
+    while (true) {
+        length += std::fread(buffer_.data() + length, 1, buffer_.size() - length, stream);
+        if (length < buffer_.size())
+            return {buffer_.data(), length};
+        buffer_.resize(2 * buffer_.size());
+    }
 }
 
 } // namespace NQ::FILES

@@ -5,6 +5,8 @@
 
 #include <cstddef>
 #include <cstdio>
+#include <string_view>
+#include <vector>
 
 /** Files as C streams. Not part of the plug-in's interface. */
 namespace NQ
@@ -39,6 +41,21 @@ bool canOpen(char const* path);
  * @return whether there was anything to read
  */
 bool readToEnd(FILE* stream, char* buffer, std::size_t size);
+
+/** Reads streams as a whole; one reading uses the memory of the one before it. */
+class WholeText
+{
+public:
+    /**
+     * Reads a freshly opened stream to its end.
+     *
+     * @return what was read, good until the next reading
+     */
+    std::string_view read(FILE* stream);
+
+private:
+    std::vector<char> buffer_;
+};
 
 } // namespace MI_INTERNAL
 

@@ -348,6 +348,16 @@ TEST_F(UserListing, LogsAnUnparsableRuleUnderItsOwnNameAsAnError)
     }
 }
 
+TEST_F(UserListing, ReadsRulesOfAnyLengthToTheirEnd)
+{
+    files_.write("/etc/passwd", account("jdoe", 1000) + account("mary", 1001));
+    for (std::size_t const length : {0U, 8191U, 8192U, 100000U}) {
+        files_.write("/etc/pam.d/login", "deny=1\n" + std::string(length, '#') + "\ndeny=2");
+        for (userInfo& user : list())
+            EXPECT_EQ(user.getMaxLoginFailures(), 2) << length;
+    }
+}
+
 TEST_F(UserListing, SeesAChangeOfTheFilesTheNextTime)
 {
     files_.write("/etc/passwd", account("jdoe", 1000));

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <string>
+#include <vector>
 
 namespace
 {
@@ -67,6 +68,39 @@ TEST(LoginRule, IsAbsentWithoutDeny)
     expectDenied("auth required pam_unix.so", Scan::absent, untouched);
     expectDenied("deny 3", Scan::absent, untouched);
     expectDenied("DENY=3", Scan::absent, untouched);
+}
+
+using Lines = std::vector<std::string>;
+
+Lines denyLines(std::string_view rules)
+{
+    Lines lines;
+    for (std::string line = NQ::USER_INFO::takeDenyLine(rules); !line.empty();
+         line = NQ::USER_INFO::takeDenyLine(rules))
+        lines.push_back(line);
+    return lines;
+}
+
+TEST(LoginRules, AreTheLinesThatHoldDenyInTheirOrder)
+{
+    EXPECT_EQ(denyLines("a deny=1 b\nc\n# deny=2\n\ndeny=3 deny=4\n"),
+              (Lines{"a deny=1 b", "# deny=2", "deny=3 deny=4"}));
+}
+
+TEST(LoginRules, MayEndWithoutALineEnd)
+{
+    EXPECT_EQ(denyLines("x\ndeny=5"), (Lines{"deny=5"}));
+}
+
+TEST(LoginRules, KeepNulBytes)
+{
+    EXPECT_EQ(denyLines(std::string_view("a\0deny=1\n", 9)), (Lines{std::string("a\0deny=1", 8)}));
+}
+
+TEST(LoginRules, MayBeNone)
+{
+    EXPECT_EQ(denyLines(""), Lines());
+    EXPECT_EQ(denyLines("deny\n=3\n"), Lines());
 }
 
 constexpr char const* label = "Password expires";

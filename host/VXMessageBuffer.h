@@ -26,7 +26,10 @@ public:
     std::ostream& operator<<(int number);
     std::ostream& operator<<(unsigned int number);
 
-    /** The finished message; the argument is what the chain of operators returned. */
+    /**
+     * The finished message, taken out of the buffer; the argument is what the chain of operators
+     * returned.
+     */
     std::string str(VXMessageBuffer& end);
     std::string str(std::ostream& end);
 

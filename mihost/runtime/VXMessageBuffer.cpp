@@ -3,6 +3,7 @@
 #include <locale>
 #include <ostream>
 #include <streambuf>
+#include <utility>
 
 namespace VXLog
 {
@@ -45,7 +46,11 @@ struct VXMessageBuffer::Stream {
     std::ostream out;
 };
 
-VXMessageBuffer::VXMessageBuffer() = default;
+VXMessageBuffer::VXMessageBuffer()
+{
+    constexpr std::size_t mostMessages = 63; // fit, so that one piece of memory serves each
+    text_.reserve(mostMessages);
+}
 
 VXMessageBuffer::~VXMessageBuffer() = default;
 
@@ -79,13 +84,13 @@ std::ostream& VXMessageBuffer::operator<<(unsigned int number)
 
 std::string VXMessageBuffer::str(VXMessageBuffer& end)
 {
-    return end.text_;
+    return std::move(end.text_);
 }
 
 std::string VXMessageBuffer::str(std::ostream& end)
 {
     end.flush();
-    return text_;
+    return std::move(text_);
 }
 
 std::ostream& VXMessageBuffer::stream()

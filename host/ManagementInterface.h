@@ -77,7 +77,9 @@ public:
 protected:
     unsigned int nextNodeId_;
     unsigned int miId_;
-    std::vector<Node*> nodes_; // owned; a management interface appends here directly
+    // Owned; a management interface appends here directly. A deleted node may leave a null pointer
+    // until the next look at the list.
+    std::vector<Node*> nodes_;
     std::vector<unsigned int> miIds_;
     LoadCallBack loadCallBack_;
     void const* loadCallBackContext_;

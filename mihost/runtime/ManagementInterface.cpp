@@ -22,31 +22,47 @@ Error failure(std::string const& reason)
     return {1, Number(Number::EmptyKind), reason};
 }
 
-/** Takes the node off the list, wherever it stands; the hint says where to look first. */
-bool unlist(std::vector<Node*>& nodes, std::size_t& hint, Node* node)
-{
-    // Nodes of one kind are deleted in the order in which they stand, so the next one is mostly
-    // where the last one was.
-    if (hint >= nodes.size() || nodes[hint] != node) {
-        auto const found = std::find(nodes.begin(), nodes.end(), node);
-        if (found == nodes.end())
-            return false;
-        hint = static_cast<std::size_t>(found - nodes.begin());
-    }
-    nodes.erase(nodes.begin() + static_cast<std::ptrdiff_t>(hint));
-    return true;
-}
-
 } // namespace
 
 struct ManagementInterface::Own {
     // Guards the node list, for one look or one change at a time, since different threads may
     // rebuild nodes of different kinds at once. Nobody outside is called while it is held.
     std::mutex listLock;
-    std::size_t deleteHint = 0; // where the last deleted node stood; the next one follows it
+    std::size_t gaps = 0;    // null pointers that deleted nodes left in the list
+    std::size_t lastGap = 0; // the youngest of them
     AlertCallBack alertCallBack = nullptr;
     void const* alertContext = nullptr;
+
+    bool unlist(std::vector<Node*>& nodes, Node const* node);
+    void closeGaps(std::vector<Node*>& nodes);
 };
+
+/**
+ * Leaves a gap in the node's place: moving up all that stand behind it for each one deleted would
+ * cost a rebuild the square of the number of nodes.
+ */
+bool ManagementInterface::Own::unlist(std::vector<Node*>& nodes, Node const* node)
+{
+    // Nodes of one kind are deleted in the order in which they stand.
+    auto const next = static_cast<std::ptrdiff_t>(std::min(lastGap + 1, nodes.size()));
+    auto found = nodes.begin() + next;
+    if (found == nodes.end() || *found != node)
+        found = std::find(nodes.begin(), nodes.end(), node);
+    if (!node || found == nodes.end())
+        return false;
+    *found = nullptr;
+    lastGap = static_cast<std::size_t>(found - nodes.begin());
+    ++gaps;
+    return true;
+}
+
+void ManagementInterface::Own::closeGaps(std::vector<Node*>& nodes)
+{
+    if (gaps == 0)
+        return;
+    nodes.erase(std::remove(nodes.begin(), nodes.end(), nullptr), nodes.end());
+    gaps = 0;
+}
 
 ManagementInterface::ManagementInterface()
     : nextNodeId_(0), miId_(0), loadCallBack_(nullptr), loadCallBackContext_(nullptr),
@@ -59,6 +75,7 @@ ManagementInterface::~ManagementInterface() = default;
 Error ManagementInterface::getMap(std::vector<Node*>& nodes)
 {
     std::lock_guard const held(own_->listLock);
+    own_->closeGaps(nodes_);
     nodes = nodes_;
     return success();
 }
@@ -89,7 +106,7 @@ void ManagementInterface::unload()
     {
         std::lock_guard const held(own_->listLock);
         nodes.swap(nodes_);
-        own_->deleteHint = 0;
+        own_->gaps = 0;
     }
     for (Node* node : nodes)
         delete node;
@@ -106,6 +123,7 @@ Error ManagementInterface::addNewNode(Node*& node)
         return failure("no node given");
     {
         std::lock_guard const held(own_->listLock);
+        own_->closeGaps(nodes_);
         // A node just built stands at the end of the list, so the search starts there.
         if (std::find(nodes_.rbegin(), nodes_.rend(), node) == nodes_.rend())
             nodes_.push_back(node);
@@ -119,7 +137,7 @@ Error ManagementInterface::deleteNode(Node* node)
 {
     {
         std::lock_guard const held(own_->listLock);
-        if (!unlist(nodes_, own_->deleteHint, node))
+        if (!own_->unlist(nodes_, node))
             return failure("no such node");
     }
     if (mihost::NodeObserver* observer = mihost::nodeObserver())

@@ -130,6 +130,24 @@ TEST_F(GroupNodes, ArePublishedOnARefreshAndTheirIdsNotNoted)
     }
 }
 
+TEST_F(GroupNodes, ArePublishedEachAsSoonAsItIsComplete)
+{
+    struct Publications {
+        Frame const& frame;
+        Texts seen;
+    } publications{frame, {}};
+    frame.setLoadCallBack(
+        [](IC::Node* const& node, void const* context) {
+            auto& to = *static_cast<Publications*>(const_cast<void*>(context));
+            to.seen.push_back("node " + std::to_string(to.frame.ofType(51).size()) + " with " +
+                              std::to_string(node->getProperties().size()) + " properties");
+            return NODES::success();
+        },
+        &publications, nullptr);
+    frame.createGroupNodes(true);
+    EXPECT_EQ(publications.seen, (Texts{"node 1 with 4 properties", "node 2 with 4 properties"}));
+}
+
 TEST_F(GroupNodes, AreAllDeletedOnARefreshBeforeANewOneIsMade)
 {
     frame.createGroupNodes(false);

@@ -135,6 +135,9 @@ INSTANTIATE_TEST_SUITE_P(
                  "UserSetAttrib,UserName:CMPI_string:jdoe,passwordExpirationDate:CMPI_dateTime:,"
                  "daysExpireAfter:CMPI_uint32:4",
                  {"/usr/bin/chage jdoe -E 2>&1"}},
+        LineCase{"TakesNumbersAsTheyStand",
+                 "UserSetAttrib,UserName:CMPI_string:jdoe,daysExpireAfter:CMPI_uint32: 4 5",
+                 {"/usr/bin/chage jdoe -I  4 5 -E -1 2>&1"}},
         LineCase{"TextsGoToTheMainList",
                  "UserSetAttrib,UserName:CMPI_string:jdoe,Comment:CMPI_string:Test",
                  {"/usr/bin/chage jdoe -c Test -E -1 2>&1"}}),

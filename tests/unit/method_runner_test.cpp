@@ -68,6 +68,14 @@ TEST_F(ExecuteCommand, CopiesTheWholeOutput)
     EXPECT_EQ(said(), "one\ntwo\n\nthree");
 }
 
+TEST_F(ExecuteCommand, CopiesWhatFollowsANulByteToo)
+{
+    output_.fill('#');
+    commands_.otherwise = std::string("one\0two", 7);
+    EXPECT_EQ(run("/bin/one", {}), 1);
+    EXPECT_EQ(std::string(output_.begin(), output_.begin() + 9), std::string("one\0two\0#", 9));
+}
+
 TEST_F(ExecuteCommand, ReportsASingleByteAndSilence)
 {
     output_.fill('#');

@@ -282,6 +282,16 @@ TEST_F(CommandRunner, TakesACommandWithoutArguments)
     EXPECT_EQ(commands_.ran, Lines{"/usr/bin/tool 2>&1"});
 }
 
+TEST_F(CommandRunner, CopiesWhatFollowsANulByteToo)
+{
+    commands_.answers["/usr/bin/tool 2>&1"] = std::string("one\0two", 7);
+    char command[] = "/usr/bin/tool";
+    char const* const args[] = {command, ""};
+    char output[9] = {'#', '#', '#', '#', '#', '#', '#', '#', '#'};
+    EXPECT_TRUE(userInfo().executeLinCommand(command, args, output));
+    EXPECT_EQ(std::string(output, sizeof output), std::string("one\0two\0#", 9));
+}
+
 TEST_F(CommandRunner, IsFalseForACommandThatPrintsNothing)
 {
     commands_.answers["/usr/bin/tool 2>&1"] = "";

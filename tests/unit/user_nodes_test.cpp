@@ -189,6 +189,25 @@ TEST_F(UserNodes, ArePublishedOnARefreshAndTheirIdsNotNoted)
     EXPECT_EQ(frame.nextNodeId_, next + 3);
 }
 
+TEST_F(UserNodes, ArePublishedEachAsSoonAsItIsComplete)
+{
+    struct Publications {
+        Frame const& frame;
+        Texts seen;
+    } publications{frame, {}};
+    frame.setLoadCallBack(
+        [](IC::Node* const& node, void const* context) {
+            auto& to = *static_cast<Publications*>(const_cast<void*>(context));
+            to.seen.push_back("node " + std::to_string(to.frame.ofType(46).size()) + " with " +
+                              std::to_string(node->getProperties().size()) + " properties");
+            return NODES::success();
+        },
+        &publications, nullptr);
+    frame.createUserNodes(true);
+    EXPECT_EQ(publications.seen, (Texts{"node 1 with 24 properties", "node 2 with 24 properties",
+                                        "node 3 with 24 properties"}));
+}
+
 TEST_F(UserNodes, AreAllDeletedOnARefreshBeforeANewOneIsMade)
 {
     frame.createUserNodes(false);

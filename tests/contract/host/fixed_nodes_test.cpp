@@ -3,6 +3,7 @@
 #include "nodes/ids.h"
 #include "tests/contract/host/Loaded.h"
 
+#include <set>
 #include <sys/utsname.h>
 #include <typeinfo>
 
@@ -169,18 +170,32 @@ TEST_F(FixedNodes, StandInTheMembersOfTheirKindAndInTheListFromTheStart)
     EXPECT_EQ(Insides::osNode(interface), nodes[3]);
 }
 
-TEST_F(FixedNodes, AreCurrentAndListedBeforeTheirStatusIsSet)
+TEST_F(FixedNodes, LikeAllNodesAreCurrentAndListedBeforeTheirStatusIsSet)
 {
-    int count = 0;
-    host.onSetStatus = [this, &count](IC::MutableNode& node) {
-        if (node.getNodeType() == NODES::driverType || node.getIndex() != 0)
-            return;
-        ++count;
+    commands.answers = {{"lsmod", "exnet 24576 0\n"},
+                        {"modinfo exnet", ""},
+                        {"wc -l /var/log/messages", "2 /var/log/messages\n"}};
+    std::set<unsigned int> types;
+    host.onSetStatus = [this, &types](IC::MutableNode& node) {
+        types.insert(node.getNodeType());
         EXPECT_EQ(Insides::currentNode(mi()), &node);
         EXPECT_EQ(Insides::nodes(mi()).back(), &node);
+        switch (node.getNodeType()) {
+        case NODES::userType:
+            EXPECT_EQ(Insides::userNodes(mi()).back(), &node);
+            break;
+        case NODES::groupType:
+            EXPECT_EQ(Insides::groupNodes(mi()).back(), &node);
+            break;
+        case NODES::logEntryType:
+            EXPECT_EQ(Insides::logEntryNodes(mi()).back(), &node);
+            break;
+        default:
+            break;
+        }
     };
     plugin.initialize();
-    EXPECT_EQ(count, 5); // the log, too
+    EXPECT_EQ(types, (std::set<unsigned int>{17, 35, 39, 40, 44, 46, 47, 51, 59}));
 }
 
 TEST_F(FixedNodes, AreParentsByTheIdThatTheyAnswerWith)

@@ -51,23 +51,27 @@ void CommandLine::declare(CLI::App& app)
 
 void CommandLine::parse(std::vector<std::string> words)
 {
-    CLI::App app("Loads the management-interface plug-in, shows its tree and drives it.", "mihost");
+    bool const inShell = place_ == Place::Shell;
+    CLI::App app(inShell
+                     ? "Commands run on the loaded plug-in. help COMMAND tells more, exit leaves."
+                     : "Loads the management-interface plug-in, shows its tree and drives it.",
+                 inShell ? "" : "mihost");
     declare(app);
     try {
         std::reverse(words.begin(), words.end()); // as it wants them
         app.parse(words);
     } catch (CLI::CallForHelp const&) {
-        app.exit(CLI::CallForHelp());
+        answer_ = app.help();
         return;
     } catch (CLI::CallForAllHelp const&) {
-        app.exit(CLI::CallForAllHelp());
+        answer_ = app.help("", CLI::AppFormatMode::All);
         return;
     } catch (CLI::CallForVersion const& version) {
-        app.exit(version);
+        answer_ = fmt::format("{}\n", version.what());
         return;
     } catch (CLI::ParseError const& error) {
         throw Failure(BadUsage, fmt::format("{} ({} tells more)", error.what(),
-                                            place_ == Place::Shell ? "help" : "mihost --help"));
+                                            inShell ? "help" : "mihost --help"));
     }
     options_.sandbox = options_.sandbox || !options_.overlay.empty();
     auto const chosen = app.get_subcommands();

@@ -19,11 +19,7 @@ public:
     /** Adds all options and commands. What the application is given then ends up here. */
     void declare(CLI::App& app);
 
-    /**
-     * Prints help or the version where they are asked for; there is no command then.
-     *
-     * @throws Failure (BadUsage)
-     */
+    /** @throws Failure (BadUsage) */
     void parse(std::vector<std::string> words);
 
     Options const& options() const
@@ -31,10 +27,16 @@ public:
         return options_;
     }
 
-    /** What is to run, null where nothing is. */
+    /** What is to run; null where help or the version was asked for. */
     Command* command() const
     {
         return command_;
+    }
+
+    /** The help or the version that was asked for. */
+    std::string const& answer() const
+    {
+        return answer_;
     }
 
 private:
@@ -44,6 +46,7 @@ private:
     Options options_;
     std::vector<std::pair<std::string, std::unique_ptr<Command>>> all_;
     Command* command_ = nullptr;
+    std::string answer_;
 };
 
 } // namespace mihost

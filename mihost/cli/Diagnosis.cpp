@@ -2,18 +2,17 @@
 
 #include "mihost/cli/AccountFiles.h"
 #include "mihost/cli/CommandTap.h"
+#include "mihost/cli/FileForms.h"
 #include "mihost/cli/Lines.h"
+#include "mihost/cli/LocalNames.h"
+#include "nodes/ids.h"
 
 #include <algorithm>
-#include <cctype>
 #include <cerrno>
 #include <cstdlib>
 #include <cstring>
-#include <deque>
 #include <fmt/format.h>
-#include <fmt/ranges.h>
 #include <fstream>
-#include <set>
 #include <sstream>
 #include <sys/utsname.h>
 #include <unistd.h>
@@ -24,51 +23,25 @@ namespace mihost
 namespace
 {
 
-using Problem = std::optional<std::string>;
-
 constexpr char accountFile[] = "/etc/passwd";
+constexpr char groupFile[] = "/etc/group";
+constexpr char rangeFile[] = "/etc/login.defs";
+constexpr char releaseFile[] = "/etc/release";
 constexpr char logFile[] = "/var/log/messages";
-constexpr std::size_t longestAccountLine = 4094; // with its end and a NUL it fills the buffer
-constexpr std::size_t newestLines = 50;
 
-std::vector<std::string> namesIn(std::string const& path)
-{
-    std::vector<std::string> names;
-    for (std::string const& line : linesOf(contentOf(path)))
-        names.push_back(line.substr(0, line.find(':')));
-    return names;
-}
-
-std::vector<std::string> newestLogLines()
-{
-    std::ifstream file(logFile);
-    std::deque<std::string> newest;
-    for (std::string line; std::getline(file, line);) {
-        newest.push_back(line);
-        if (newest.size() > newestLines)
-            newest.pop_front();
-    }
-    return {newest.begin(), newest.end()};
-}
-
-Problem accessProblem(std::string const& path, int mode)
+Problem accessProblem(std::string const& path, int mode = R_OK)
 {
     if (access(path.c_str(), mode) == 0)
         return std::nullopt;
     return std::strerror(errno);
 }
 
-Problem commandProblem(std::string const& command)
+bool isThere(std::string const& path)
 {
-    if (command[0] == '/')
-        return accessProblem(command, X_OK);
-    char const* const path = std::getenv("PATH");
-    std::istringstream folders(path ? path : "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin");
-    for (std::string folder; std::getline(folders, folder, ':');)
-        if (!accessProblem(folder + "/" + command, X_OK))
-            return std::nullopt;
-    return "not found in PATH";
+    return !accessProblem(path);
 }
+
+// Commands.
 
 struct CommandNeed {
     char const* command;
@@ -106,221 +79,200 @@ constexpr CommandNeed commandNeeds[] = {
 };
 // clang-format on
 
+/** The first of the folders that the command stands in; empty for none. */
+std::string folderOf(std::string const& command, std::string const& path)
+{
+    std::istringstream folders(path);
+    for (std::string folder; std::getline(folders, folder, ':');)
+        if (!accessProblem(folder + "/" + command, X_OK))
+            return folder;
+    return "";
+}
+
+/** A command that is looked for through PATH, which for ordinary users is often too short. */
+Need needOfPath(CommandNeed const& row, Need need)
+{
+    std::string const usual = "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin";
+    char const* const path = std::getenv("PATH");
+    if (!folderOf(row.command, path ? path : usual).empty())
+        return need;
+    need.problem = "not found in PATH";
+    if (std::string const folder = folderOf(row.command, usual); !folder.empty())
+        need.debian = need.redHat = fmt::format("PATH=$PATH:{} mihost", folder);
+    return need;
+}
+
 Need needOf(CommandNeed const& row)
 {
-    return {fmt::format("command {}", row.command), commandProblem(row.command), row.cost,
-            fmt::format("apt-get install {}", row.debian),
-            fmt::format("dnf install {}", row.redHat)};
+    Need need{fmt::format("command {}", row.command), std::nullopt, row.cost,
+              fmt::format("apt-get install {}", row.debian),
+              fmt::format("dnf install {}", row.redHat)};
+    if (row.command[0] != '/')
+        return needOfPath(row, need);
+    need.problem = accessProblem(row.command, X_OK);
+    return need;
 }
 
 /** Whether passwd takes a password from a pipe; it does not on every distribution. */
-Problem passwordPipeProblem()
+Problem passwordPipeProblem(std::string const& program)
 {
-    std::string const program = "/usr/bin/passwd";
-    if (auto const problem = commandProblem(program))
-        return problem;
     if (commandTap::outputOf("LC_ALL=C " + program + " --help 2>&1").find("--stdin") !=
         std::string::npos)
         return std::nullopt;
     return "passwd does not know it";
 }
 
-Problem releaseProblem()
+// Surroundings.
+
+std::vector<Need> surroundings()
 {
-    static constexpr char const* files[] = {"/etc/release", "/etc/vmware-release",
-                                            "/etc/redhat-release", "/etc/SuSE-release",
-                                            "/etc/UnitedLinux-release"};
-    for (char const* file : files)
-        if (!accessProblem(file, R_OK))
-            return std::nullopt;
+    char const* const language = std::getenv("LANG");
+    return {
+        {"root's privileges", geteuid() == 0 ? std::nullopt : Problem("not run as root"),
+         "passwords and ageing of users, every change", "sudo mihost", "sudo mihost"},
+        {"locale in LANG", language && *language ? std::nullopt : Problem("LANG is not set"),
+         "language-edition and code-set of os", "update-locale LANG=C.UTF-8",
+         "localectl set-locale LANG=C.UTF-8"},
+    };
+}
+
+std::vector<Need> commandLines()
+{
+    std::vector<Need> needs;
+    for (CommandNeed const& row : commandNeeds)
+        needs.push_back(needOf(row));
+    if (std::string const passwd = "/usr/bin/passwd"; !accessProblem(passwd, X_OK))
+        needs.push_back({"passwd --stdin", passwordPipeProblem(passwd),
+                         "Password in methods: what is stored opens nothing",
+                         "openssl passwd -6 | mihost set user:NAME password -",
+                         "dnf install passwd"});
+    return needs;
+}
+
+// Files.
+
+constexpr char missingConfiguration[] =
+    "apt-get install --reinstall -o Dpkg::Options::=--force-confmiss login";
+
+std::vector<Need> accounts()
+{
+    std::vector<Need> needs = {
+        {"id ranges in /etc/login.defs",
+         isThere(rangeFile) ? problemOfRanges(contentOf(rangeFile)) : accessProblem(rangeFile),
+         "ordinary users, ordinary groups", missingConfiguration, "dnf reinstall shadow-utils"},
+        {"accounts in /etc/passwd", accessProblem(accountFile), "all users",
+         "cp /usr/share/base-passwd/passwd.master /etc/passwd", "dnf reinstall setup"},
+        {"groups in /etc/group", accessProblem(groupFile), "all groups",
+         "cp /usr/share/base-passwd/group.master /etc/group", "dnf reinstall setup"},
+        {"login failures in /etc/pam.d/login", accessProblem("/etc/pam.d/login"),
+         "max-login-failures of users", missingConfiguration, "dnf reinstall util-linux"},
+        {"passwords in /etc/shadow", accessProblem(shadowFile), "passwords and ageing of users",
+         "sudo mihost, or pwconv", "sudo mihost, or pwconv"},
+    };
+    if (isThere(accountFile))
+        needs.push_back({"form of /etc/passwd", problemOfAccounts(contentOf(accountFile)),
+                         "that user; behind a line that is too long, all users", "vipw", "vipw"});
+    if (isThere(groupFile))
+        needs.push_back({"form of /etc/group", problemOfGroups(contentOf(groupFile)), "that group",
+                         "vigr", "vigr"});
+    if (isThere(accountFile) && isThere(shadowFile))
+        needs.push_back(
+            {"order of /etc/shadow",
+             problemOfShadow(localNames(*findKind(NODES::userType)), contentOf(shadowFile)),
+             "passwords and ageing of that user and of all behind it", "pwconv; pwck -s",
+             "pwconv; pwck -s"});
+    return needs;
+}
+
+/** One of several files will do. */
+Problem noneOf(std::vector<std::string> const& files)
+{
+    if (std::any_of(files.begin(), files.end(), isThere))
+        return std::nullopt;
     return "none of the files that are known";
 }
 
-Problem logWriteProblem()
+std::vector<Need> release()
 {
-    if (accessProblem(logFile, F_OK))
-        return std::nullopt; // told of on its own
-    return accessProblem(logFile, W_OK);
-}
+    std::vector<std::string> const dated = {"/etc/SuSE-release", "/etc/UnitedLinux-release",
+                                            "/etc/redhat-release"};
+    std::vector<std::string> named = dated;
+    named.emplace_back("/etc/vmware-release");
+    Problem version = noneOf(named);
+    if (version && isThere(releaseFile))
+        version = problemOfRelease(contentOf(releaseFile));
+    named.emplace_back(releaseFile);
 
-Problem moduleFilesProblem()
-{
-    if (linesOf(contentOf("/proc/modules")).empty())
-        return std::nullopt; // none is loaded
-    utsname system{};
-    if (uname(&system) != 0)
-        return "the kernel does not tell its release";
-    return accessProblem(fmt::format("/lib/modules/{}", system.release), R_OK);
-}
-
-Problem localeProblem()
-{
-    char const* const language = std::getenv("LANG");
-    if (language && *language)
-        return std::nullopt;
-    return "LANG is not set";
-}
-
-Problem rootProblem()
-{
-    if (geteuid() == 0)
-        return std::nullopt;
-    return "not run as root";
-}
-
-Problem shadowOrderProblem()
-{
-    if (accessProblem(shadowFile, R_OK))
-        return std::nullopt; // told of on its own
-    return problemOfShadowOrder(namesIn(accountFile), namesIn(shadowFile));
-}
-
-Problem rangesProblem()
-{
-    auto const unreadable = accessProblem("/etc/login.defs", R_OK);
-    return unreadable ? unreadable : problemOfRanges(contentOf("/etc/login.defs"));
-}
-
-bool isStamp(std::string const& line)
-{
-    static std::set<std::string> const months = {"Jan", "Feb", "Mar", "Apr", "May", "Jun",
-                                                 "Jul", "Aug", "Sep", "Oct", "Nov", "Dec"};
-    constexpr std::string_view pattern = "... dd dd:dd:dd "; // d a digit, the day's first one may
-    if (line.size() < pattern.size())                        // be a blank
-        return false;
-    for (std::size_t at = 0; at < pattern.size(); ++at) {
-        bool const isDigit = std::isdigit(static_cast<unsigned char>(line[at])) != 0;
-        bool const fits = pattern[at] == '.' || (pattern[at] == 'd' && isDigit) ||
-                          (at == 4 && line[at] == ' ') || pattern[at] == line[at];
-        if (!fits)
-            return false;
-    }
-    return months.count(line.substr(0, 3)) != 0;
-}
-
-bool isAccount(std::string const& line)
-{
-    std::vector<std::string> fields(1);
-    for (char const character : line) {
-        if (character == ':')
-            fields.emplace_back();
-        else
-            fields.back() += character;
-    }
-    auto const isNumber = [](std::string const& field) {
-        return !field.empty() && field.find_first_not_of("0123456789") == std::string::npos;
+    std::string const write =
+        "(. /etc/os-release; printf '%s\\nVERSION = %s\\nPATCHLEVEL = 0\\n' \"$PRETTY_NAME\" "
+        "\"$VERSION_ID\") >/etc/release";
+    std::string const install = "dnf install system-release";
+    return {
+        {"name in a release file", noneOf(named), "os-name of os: it says Linux", write, install},
+        {"version in a release file", version, "os-version of os", write, install},
+        {"date of a release file", noneOf(dated), "install-date of os",
+         "none: such a file would make it another distribution", install},
     };
-    return fields.size() == 7 && !fields[0].empty() && isNumber(fields[2]) && isNumber(fields[3]);
+}
+
+std::vector<Need> modules()
+{
+    utsname system{};
+    if (linesOf(contentOf("/proc/modules")).empty() || uname(&system) != 0)
+        return {}; // none is loaded
+    return {{"module files of the kernel",
+             accessProblem(fmt::format("/lib/modules/{}", system.release)),
+             "versions and descriptions of drivers", "apt-get install linux-image-$(uname -r)",
+             "dnf install kernel-modules-$(uname -r)"}};
+}
+
+/** Lines from the end of the log; there are no fewer than the plug-in shows unless they are long.
+ */
+std::vector<std::string> newestLogLines()
+{
+    constexpr std::streamoff enough = 256 * 1024;
+    constexpr std::size_t shown = 50;
+    std::ifstream file(logFile, std::ios::ate);
+    std::streamoff const start = std::max<std::streamoff>(file.tellg() - enough, 0);
+    file.seekg(start);
+    std::vector<std::string> lines;
+    for (std::string line; std::getline(file, line);)
+        lines.push_back(line);
+    if (start > 0 && !lines.empty())
+        lines.erase(lines.begin()); // the end of one
+    if (lines.size() > shown)
+        lines.erase(lines.begin(), lines.end() - shown);
+    return lines;
+}
+
+std::vector<Need> log()
+{
+    std::string const traditional =
+        "echo '$ActionFileDefaultTemplate RSYSLOG_TraditionalFileFormat' "
+        ">/etc/rsyslog.d/00-stamp.conf; systemctl restart rsyslog";
+    std::vector<Need> needs = {
+        {"system log in /var/log/messages", accessProblem(logFile), "all log entries",
+         "apt-get install rsyslog; echo '*.info;authpriv.none -/var/log/messages;"
+         "RSYSLOG_TraditionalFileFormat' >/etc/rsyslog.d/messages.conf; systemctl restart rsyslog",
+         "dnf install rsyslog; systemctl enable --now rsyslog"}};
+    if (!isThere(logFile))
+        return needs;
+    needs.push_back({"classic stamps in the system log", problemOfStamps(newestLogLines()),
+                     "messages and times of log entries", traditional, traditional});
+    needs.push_back({"leave to empty the system log", accessProblem(logFile, W_OK), "clear-log",
+                     "sudo mihost", "sudo mihost"});
+    return needs;
 }
 
 } // namespace
 
-std::optional<std::string> problemOfRanges(std::string const& text)
-{
-    std::vector<std::string> missing;
-    for (std::string const key : {"UID_MIN", "UID_MAX", "GID_MIN", "GID_MAX"}) {
-        auto const lines = linesOf(text);
-        if (std::none_of(lines.begin(), lines.end(), [&key](std::string const& line) {
-                return line.compare(0, key.size(), key) == 0;
-            }))
-            missing.push_back(key);
-    }
-    if (missing.empty())
-        return std::nullopt;
-    return fmt::format("no line begins with {}", fmt::join(missing, ", "));
-}
-
-std::optional<std::string> problemOfAccounts(std::string const& text)
-{
-    auto const lines = linesOf(text);
-    for (std::size_t at = 0; at < lines.size(); ++at) {
-        std::string const& line = lines[at];
-        if (line.size() > longestAccountLine)
-            return fmt::format("line {} is longer than {} bytes", at + 1, longestAccountLine);
-        bool const isSkipped = line.find_first_not_of(" \t") == std::string::npos || line[0] == '#';
-        if (!isSkipped && !isAccount(line))
-            return fmt::format("line {} is malformed", at + 1);
-    }
-    return std::nullopt;
-}
-
-std::optional<std::string> problemOfShadowOrder(std::vector<std::string> const& accounts,
-                                                std::vector<std::string> const& shadow)
-{
-    auto entry = shadow.begin();
-    for (std::string const& account : accounts) {
-        auto const found = std::find(entry, shadow.end(), account);
-        if (found == shadow.end())
-            return fmt::format("'{}' does not stand there in the order of {}", account,
-                               accountFile);
-        entry = found + 1;
-    }
-    return std::nullopt;
-}
-
-std::optional<std::string> problemOfStamps(std::vector<std::string> const& lines)
-{
-    auto const other = std::find_if(lines.rbegin(), lines.rend(),
-                                    [](std::string const& line) { return !isStamp(line); });
-    if (other == lines.rend())
-        return std::nullopt;
-    return fmt::format("a line begins with '{}' rather than a stamp like 'Jan  2 03:04:05 '",
-                       other->substr(0, 16));
-}
-
 std::vector<Need> diagnose()
 {
-    std::vector<Need> needs = {
-        {"root's privileges", rootProblem(), "passwords and ageing of users, every change",
-         "sudo mihost", "sudo mihost"},
-        {"locale in LANG", localeProblem(), "language-edition and code-set of os",
-         "update-locale LANG=C.UTF-8", "localectl set-locale LANG=C.UTF-8"},
-    };
-    for (CommandNeed const& row : commandNeeds)
-        needs.push_back(needOf(row));
-    char const* const rsyslog = "apt-get install rsyslog; echo "
-                                "'*.info;authpriv.none -/var/log/messages;"
-                                "RSYSLOG_TraditionalFileFormat' >/etc/rsyslog.d/messages.conf; "
-                                "systemctl restart rsyslog";
-    char const* const traditional =
-        "echo '$ActionFileDefaultTemplate RSYSLOG_TraditionalFileFormat' "
-        ">/etc/rsyslog.d/00-stamp.conf; systemctl restart rsyslog";
-    std::vector<Need> const files = {
-        {"passwd --stdin", passwordPipeProblem(),
-         "Password in methods: it is stored as it is and opens nothing",
-         "set passwords with passwd", "dnf install passwd"},
-        {"accounts in /etc/passwd", accessProblem(accountFile, R_OK), "all users",
-         "cp /usr/share/base-passwd/passwd.master /etc/passwd", "dnf reinstall setup"},
-        {"form of /etc/passwd", problemOfAccounts(contentOf(accountFile)),
-         "the users from that line on", "vipw", "vipw"},
-        {"passwords in /etc/shadow", accessProblem(shadowFile, R_OK),
-         "passwords and ageing of users", "sudo mihost, or pwconv", "sudo mihost, or pwconv"},
-        {"order of /etc/shadow", shadowOrderProblem(),
-         "passwords and ageing of that user and all behind it", "pwck -s", "pwck -s"},
-        {"groups in /etc/group", accessProblem("/etc/group", R_OK), "all groups",
-         "cp /usr/share/base-passwd/group.master /etc/group", "dnf reinstall setup"},
-        {"id ranges in /etc/login.defs", rangesProblem(), "ordinary users, ordinary groups",
-         "apt-get install --reinstall -o Dpkg::Options::=--force-confmiss login",
-         "dnf reinstall shadow-utils"},
-        {"login failures in /etc/pam.d/login", accessProblem("/etc/pam.d/login", R_OK),
-         "max-login-failures of users",
-         "apt-get install --reinstall -o Dpkg::Options::=--force-confmiss login",
-         "dnf reinstall util-linux"},
-        {"release file", releaseProblem(), "os-name, os-version and install-date of os",
-         "(. /etc/os-release; printf '%s\\nVERSION = %s\\nPATCHLEVEL = 0\\n' \"$PRETTY_NAME\" "
-         "\"$VERSION_ID\") >/etc/release",
-         "dnf install system-release"},
-        {"module files of the kernel", moduleFilesProblem(), "versions and descriptions of drivers",
-         "apt-get install linux-image-$(uname -r)", "dnf install kernel-modules-$(uname -r)"},
-        {"system log in /var/log/messages", accessProblem(logFile, R_OK), "all log entries",
-         rsyslog, "dnf install rsyslog; systemctl enable --now rsyslog"},
-        {"classic stamps in the system log", problemOfStamps(newestLogLines()),
-         "messages and times of log entries", traditional, traditional},
-        {"leave to empty the system log", logWriteProblem(), "clear-log", "sudo mihost",
-         "sudo mihost"},
-    };
-    needs.insert(needs.end(), files.begin(), files.end());
-    return needs;
+    std::vector<Need> all;
+    for (auto const part : {surroundings, commandLines, accounts, release, modules, log})
+        for (Need const& need : part())
+            all.push_back(need);
+    return all;
 }
 
 } // namespace mihost

@@ -1,5 +1,6 @@
 #include "mihost/cli/Failure.h"
 
+#include "mihost/cli/Say.h"
 #include "mihost/runtime/Text.h"
 
 #include <fmt/format.h>
@@ -9,7 +10,7 @@ namespace mihost
 
 void tell(Failure const& failure)
 {
-    fmt::print(stderr, "mihost: {}\n", printable(failure.what()));
+    say(fmt::format("mihost: {}\n", printable(failure.what())));
 }
 
 } // namespace mihost

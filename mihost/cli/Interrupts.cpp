@@ -6,7 +6,6 @@
 #include <cstring>
 #include <fcntl.h>
 #include <iterator>
-#include <poll.h>
 #include <unistd.h>
 #include <utility>
 
@@ -159,16 +158,15 @@ Noted::~Noted()
     sigprocmask(SIG_SETMASK, &before_, nullptr);
 }
 
-Noted::Event Noted::wait(int descriptor, double seconds) const
+Noted::Event Noted::wait(pollfd file, double seconds) const
 {
     double whole = 0;
     double const rest = std::modf(std::max(seconds, 0.0), &whole);
     timespec const time{static_cast<time_t>(whole), static_cast<long>(rest * 1e9)};
-    pollfd input{descriptor, POLLIN, 0};
-    int const ready = ppoll(&input, 1, seconds < 0 ? nullptr : &time, &before_);
+    int const ready = ppoll(&file, 1, seconds < 0 ? nullptr : &time, &before_);
     if (int const signal = std::exchange(noted, 0); signal != 0)
         return signal == SIGINT ? Event::Interrupt : Event::Resize;
-    return ready > 0 ? Event::Input : Event::Timeout;
+    return ready > 0 ? Event::Ready : Event::Timeout;
 }
 
 } // namespace mihost::interrupts

@@ -2,6 +2,7 @@
 #define MIHOST_CLI_INTERRUPTS_H
 
 #include <csignal>
+#include <poll.h>
 #include <termios.h>
 
 /**
@@ -53,13 +54,13 @@ public:
     Noted(Noted const&) = delete;
     Noted& operator=(Noted const&) = delete;
 
-    enum class Event { Input, Interrupt, Resize, Timeout };
+    enum class Event { Ready, Interrupt, Resize, Timeout };
 
     /**
-     * @param descriptor  waited for input on; negative for none
-     * @param seconds     how long; negative for ever
+     * @param file     what poll is to look at; ready also where it has something unasked to tell
+     * @param seconds  how long; negative for ever
      */
-    Event wait(int descriptor, double seconds) const;
+    Event wait(pollfd file, double seconds) const;
 
 private:
     sigset_t before_;

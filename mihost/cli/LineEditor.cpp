@@ -1,13 +1,13 @@
 #include "mihost/cli/LineEditor.h"
 
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/Say.h"
 #include "mihost/cli/Words.h"
 #include "mihost/runtime/Text.h"
 
 #include <algorithm>
 #include <cwchar>
 #include <fcntl.h>
-#include <fmt/format.h>
 #include <unistd.h>
 #include <utility>
 
@@ -69,13 +69,13 @@ int LineEditor::getCharacter(EditLine* editor, wchar_t* character)
     LineEditor& self = of(editor);
     std::mbstate_t state{};
     for (;;) {
-        auto const event = self.signals_->wait(STDIN_FILENO, -1);
+        auto const event = self.signals_->wait({STDIN_FILENO, POLLIN, 0}, -1);
         if (event == interrupts::Noted::Event::Resize)
             el_resize(editor);
         self.interrupted_ = event == interrupts::Noted::Event::Interrupt;
         if (self.interrupted_)
             return -1;
-        if (event != interrupts::Noted::Event::Input)
+        if (event != interrupts::Noted::Event::Ready)
             continue;
         char byte = 0;
         ssize_t const count = ::read(STDIN_FILENO, &byte, 1);
@@ -111,10 +111,10 @@ unsigned char LineEditor::offer(std::vector<std::string> const& candidates,
         el_insertstr(editor_.get(), rest.c_str());
         return CC_REFRESH;
     }
-    fmt::print(stderr, "\n");
+    say("\n");
     for (std::string const& candidate : candidates)
-        fmt::print(stderr, "{}  ", candidate);
-    fmt::print(stderr, "\n");
+        say(candidate + "  ");
+    say("\n");
     return CC_REDISPLAY;
 }
 
@@ -130,11 +130,11 @@ LineEditor::End LineEditor::read(std::string& line)
     char const* const text = el_gets(editor_.get(), &length);
     interrupts::setTerminalToRestore(nullptr);
     if (interrupted_) {
-        fmt::print(stderr, "\n");
+        say("\n");
         return End::Interrupted;
     }
     if (!text || length <= 0) {
-        fmt::print(stderr, "\n");
+        say("\n");
         return End::Finished;
     }
     line.assign(text, static_cast<std::size_t>(length));

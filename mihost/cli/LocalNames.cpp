@@ -36,8 +36,10 @@ std::vector<std::string> accounts(char const* path, char const* minimum, char co
         std::string password;
         std::string id;
         std::getline(std::getline(std::getline(fields, name, ':'), password, ':'), id, ':');
+        bool const isNumber =
+            !id.empty() && id.find_first_not_of("0123456789") == std::string::npos;
         unsigned long const number = std::strtoul(id.c_str(), nullptr, 10);
-        if (!id.empty() && (number == 0 || (low <= number && number <= high)))
+        if (isNumber && (number == 0 || (low <= number && number <= high)))
             names.push_back(name);
     }
     return names;

@@ -38,7 +38,7 @@ void Output::flush()
 
 Room Output::room() const
 {
-    unsigned int const width = terminal::width(fileno(stream_));
+    unsigned int const width = terminal::width(descriptor());
     return {width == 0 ? Room::unlimited : width, terminal::hasUnicode() ? "…" : "~"};
 }
 
@@ -55,7 +55,7 @@ std::string Output::faint(std::string const& text) const
 std::string Output::styled(char const* start, std::string const& text) const
 {
     constexpr char end[] = "\x1b[0m";
-    return terminal::takesColours(fileno(stream_)) ? start + text + end : text;
+    return terminal::takesColours(descriptor()) ? start + text + end : text;
 }
 
 void Output::fail()

@@ -44,6 +44,11 @@ public:
         return size_;
     }
 
+    int descriptor() const
+    {
+        return fileno(stream_);
+    }
+
     /** What a line may take: the terminal's columns where it goes to one. */
     Room room() const;
 

@@ -29,12 +29,11 @@ template <class Step> int guarded(Step step)
     }
 }
 
-/** What the completion scripts of shells run. Their words are no command line yet. */
-int answerShell(std::vector<std::string> const& words)
+int answer(std::string const& text)
 {
-    return guarded([&words] {
+    return guarded([&text] {
         Output out(stdout);
-        out.write(completionText(complete(words, localNames)));
+        out.write(text);
         out.flush();
     });
 }
@@ -44,17 +43,17 @@ int answerShell(std::vector<std::string> const& words)
 int runProgram(int argc, char** argv)
 {
     if (argc > 1 && std::string_view(argv[1]) == "__complete")
-        return answerShell({argv + 2, argv + argc});
+        // What the completion scripts of shells run. Their words are no command line yet.
+        return answer(completionText(complete({argv + 2, argv + argc}, localNames)));
     // The code set is the user's; everything else, dates and numbers, stays as the plug-in expects.
     std::setlocale(LC_CTYPE, "");
     interrupts::install();
 
     CommandLine line;
-    if (int const code = guarded([&] {
-            line.parse({argv + 1, argv + argc});
-        });
-        code != Done || !line.command())
+    if (int const code = guarded([&] { line.parse({argv + 1, argv + argc}); }); code != Done)
         return code;
+    if (!line.command())
+        return answer(line.answer());
     std::unique_ptr<Session> session;
     int const run = guarded([&] {
         session = std::make_unique<Session>(line.options());
@@ -63,7 +62,7 @@ int runProgram(int argc, char** argv)
     if (!session)
         return run;
     int const end = guarded([&] { session->finish(); });
-    for (int const code : {run, static_cast<int>(session->exitCode()), end})
+    for (int const code : {run, end, static_cast<int>(session->exitCode())})
         if (code != Done)
             return code;
     return Done;

@@ -1,6 +1,7 @@
 #include "mihost/cli/Progress.h"
 
 #include "mihost/cli/Interrupts.h"
+#include "mihost/cli/Say.h"
 
 #include <algorithm>
 #include <cstdio>
@@ -18,6 +19,7 @@ namespace
 constexpr char clearLine[] = "\r\x1b[K";
 constexpr unsigned int mostLogEntries = 50;
 constexpr unsigned int closely = 200; // beyond that many steps only every so many are shown
+
 unsigned int logEntries()
 {
     std::ifstream file("/var/log/messages");
@@ -58,7 +60,7 @@ Progress::~Progress()
 {
     interrupts::setLastWords(nullptr);
     commandTap::setListener(nullptr);
-    fmt::print(stderr, clearLine);
+    say(clearLine);
 }
 
 void Progress::phaseBegins(Phase const& phase)
@@ -107,8 +109,7 @@ void Progress::show() const
         count = fmt::format(" {}/{}", std::min(done_, total_), total_);
     else if (done_ != 0)
         count = fmt::format(" {}", done_);
-    fmt::print(stderr, "{}starting: {}{}", clearLine, phase_, count);
-    std::fflush(stderr);
+    say(fmt::format("{}starting: {}{}", clearLine, phase_, count));
 }
 
 } // namespace mihost

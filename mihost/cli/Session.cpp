@@ -1,6 +1,7 @@
 #include "mihost/cli/Session.h"
 
 #include "mihost/cli/Progress.h"
+#include "mihost/cli/Say.h"
 #include "mihost/cli/Terminal.h"
 #include "mihost/runtime/Text.h"
 #include "mihost/sandbox/Sandbox.h"
@@ -51,7 +52,7 @@ void Session::finish()
     directory_.reset();
     out_.flush();
     if (options_.timing && !timing_.rows().empty())
-        fmt::print(stderr, "{}", timingReport());
+        say(timingReport());
     if (trace_)
         trace_->finish();
 }

@@ -62,6 +62,10 @@ bool Shell::runLine(std::string const& line)
     if (command.command()) {
         session_.setOptions(command.options());
         command.command()->run(session_);
+    } else if (command.options().json) {
+        session_.out().json({{"text", command.answer()}});
+    } else {
+        session_.out().write(command.answer());
     }
     session_.out().flush();
     return false;

@@ -2,6 +2,7 @@
 
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/Interrupts.h"
+#include "mihost/cli/Say.h"
 
 #include <cerrno>
 #include <cstdlib>
@@ -104,8 +105,7 @@ bool canAsk()
 
 bool confirm(std::string const& question)
 {
-    fmt::print(stderr, "{} [y/N] ", question);
-    std::fflush(stderr);
+    say(fmt::format("{} [y/N] ", question));
     auto const answer = readLine();
     return answer && (*answer == "y" || *answer == "Y" || *answer == "yes");
 }
@@ -115,8 +115,7 @@ std::string readSecret(std::string const& prompt)
     std::optional<std::string> secret;
     if (canAsk()) {
         EchoOff const silent;
-        fmt::print(stderr, "{}: ", prompt);
-        std::fflush(stderr);
+        say(fmt::format("{}: ", prompt));
         secret = readLine();
     } else {
         secret = readLine();

@@ -97,11 +97,12 @@ std::vector<std::string> wordsBeingTyped(std::string const& line)
 
 bool holdsPassword(std::string const& line)
 {
-    if (line.find("Password") != std::string::npos) // in a method call, whatever its form
-        return true;
     std::vector<std::string> const words = Splitter(line).words;
-    return std::find(words.begin(), words.end(), "set") != words.end() &&
-           std::any_of(words.begin(), words.end(), isPasswordProperty);
+    bool const inCall = std::any_of(words.begin(), words.end(), [](std::string const& word) {
+        return word.find("Password") != std::string::npos; // whatever the form of the call
+    });
+    auto const property = std::find_if(words.begin(), words.end(), isPasswordProperty);
+    return inCall || words.end() - property > 1;
 }
 
 } // namespace mihost

@@ -5,6 +5,7 @@
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/Interrupts.h"
 #include "mihost/cli/Lines.h"
+#include "mihost/cli/Say.h"
 #include "mihost/runtime/Text.h"
 #include "mihost/sandbox/Sandbox.h"
 #include "nodes/ids.h"
@@ -116,11 +117,11 @@ void warnOfPlainPassword(AccountFiles const& accounts, std::string const& passwo
         std::size_t const first = line.find(':');
         std::size_t const second = line.find(':', first + 1);
         if (first != std::string::npos && line.substr(first + 1, second - first - 1) == password)
-            fmt::print(stderr,
-                       "mihost: the password of '{}' now stands in {} as it is and opens nothing: "
-                       "/usr/bin/passwd here does not take passwords from a pipe; set it with "
-                       "passwd\n",
-                       printable(line.substr(0, first)), shadowFile);
+            say(fmt::format(
+                "mihost: the password of '{}' now stands in {} as it is and opens nothing: "
+                "/usr/bin/passwd here does not take passwords from a pipe; set it with "
+                "passwd\n",
+                printable(line.substr(0, first)), shadowFile));
     }
 }
 
@@ -159,7 +160,7 @@ void carryOut(Session& session, Write const& write)
         writeText(result, session.out());
     session.out().flush();
     for (std::string const& line : linesOf(result.complaints))
-        fmt::print(stderr, "mihost: a command said: {}\n", printable(line));
+        say(fmt::format("mihost: a command said: {}\n", printable(line)));
     if (write.property == NODES::createUser)
         warnOfPlainPassword(result.accounts, write.secret);
     if (result.error.getStatus() == 0)

@@ -199,14 +199,37 @@ TEST_F(MihostTerminal, IsAsItWasAfterCtrlCAtAPasswordPrompt)
 
 TEST_F(MihostTerminal, IsLeftCleanByCtrlCDuringTheStart)
 {
-    // A module that takes for ever; the log tells that it was asked for.
-    machine::fake("/usr/sbin/modinfo", "echo asked >/tmp/asked; exec sleep 1000\n");
-    TerminalRun run({"tree"});
-    run.waitFor("drivers 1/2");
-    run.type(ctrlC);
-    EXPECT_EQ(run.end(), 128 + SIGINT);
-    EXPECT_GT(run.output().rfind("\r\x1b[K"), run.output().rfind("starting: "));
-    EXPECT_TRUE(nothingIsLeft());
+    machine::fake("/usr/sbin/modinfo", "echo asked >/dev/tty; exec sleep 1000\n");
+    for (Lines const& arguments : {Lines{"tree"}, Lines{"--sandbox", "tree"}}) {
+        TerminalRun run(arguments);
+        run.waitFor("drivers 1/2");
+        run.waitFor("asked");
+        run.type(ctrlC);
+        EXPECT_EQ(run.end(), 128 + SIGINT);
+        EXPECT_GT(run.output().rfind("\r\x1b[K"), run.output().rfind("starting: "));
+        EXPECT_TRUE(run.showsInput());
+        EXPECT_TRUE(nothingIsLeft());
+        run.waitForDescendants();
+    }
+}
+
+TEST_F(MihostTerminal, ShowsThousandsOfNodesLineByLine)
+{
+    std::string accounts = "root:x:0:0::/:/bin/sh\n";
+    for (int id = 1000; id < 3000; ++id)
+        accounts += "u" + std::to_string(id) + ":x:" + std::to_string(id) +
+                    ":100:" + std::string(100, 'n') + "李明:/home:/bin/sh\n";
+    machine::write("/etc/passwd", accounts);
+    for (unsigned short const columns : std::initializer_list<unsigned short>{80, 200})
+        for (Lines const& arguments : {Lines{"tree"}, Lines{"list", "users"}}) {
+            TerminalRun run(arguments, columns);
+            EXPECT_EQ(run.end(), 0);
+            std::string const& all = run.output();
+            EXPECT_TRUE(stands(all, "starting: users 2000")); // the last of the steps shown
+            Lines const shown = plainLines(all.substr(all.rfind("\r\x1b[K")));
+            EXPECT_GT(shown.size(), 2001U);
+            EXPECT_LE(widest(shown), columns) << arguments[0];
+        }
 }
 
 TEST_F(MihostTerminal, FinishesAChangeThatHasBegunBeforeCtrlCEndsIt)

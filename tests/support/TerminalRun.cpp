@@ -2,6 +2,7 @@
 
 #include <array>
 #include <csignal>
+#include <fcntl.h>
 #include <pty.h>
 #include <stdexcept>
 #include <sys/ioctl.h>
@@ -16,12 +17,18 @@ TerminalRun::TerminalRun(std::vector<std::string> arguments, unsigned short colu
     for (std::string& argument : arguments)
         list.push_back(argument.data());
     list.push_back(nullptr);
+    int ends[2];
+    if (pipe2(ends, O_CLOEXEC) != 0)
+        throw std::runtime_error("no pipe can be had");
+    descendants_ = ends[0];
     winsize size{24, columns, 0, 0};
     child_ = forkpty(&master_, nullptr, nullptr, &size);
     if (child_ == 0) {
+        fcntl(ends[1], F_SETFD, 0); // it stays open and is handed on
         execv(list[0], list.data());
         _exit(127);
     }
+    close(ends[1]);
     if (child_ < 0)
         throw std::runtime_error("no terminal can be had");
 }
@@ -33,6 +40,7 @@ TerminalRun::~TerminalRun()
         waitpid(child_, nullptr, 0);
     }
     close(master_);
+    close(descendants_);
 }
 
 void TerminalRun::type(std::string const& text) const
@@ -75,6 +83,13 @@ bool TerminalRun::showsInput() const
     termios settings{};
     tcgetattr(master_, &settings);
     return (settings.c_lflag & ECHO) != 0;
+}
+
+void TerminalRun::waitForDescendants() const
+{
+    char byte = 0;
+    while (read(descendants_, &byte, 1) > 0) {
+    }
 }
 
 int TerminalRun::end()

@@ -34,6 +34,9 @@ public:
      */
     int end();
 
+    /** Waits until no process that the program started is left. */
+    void waitForDescendants() const;
+
     /** Everything that was read so far. */
     std::string const& output() const
     {
@@ -50,6 +53,7 @@ private:
 
     pid_t child_ = -1;
     int master_ = -1;
+    int descendants_ = -1; // a pipe that each of them has open
     std::string output_;
     std::size_t seen_ = 0;
 };

@@ -12,29 +12,38 @@ namespace mihost
 namespace
 {
 
+bool isMet(Need const& need)
+{
+    return !need.problem;
+}
+
 Json documentOf(std::vector<Need> const& needs)
 {
     Json list = Json::array();
     for (Need const& need : needs)
         list.push_back({{"need", need.what},
-                        {"ok", !need.problem},
-                        {"problem", need.problem ? toJson(*need.problem) : Json(nullptr)},
+                        {"ok", isMet(need)},
+                        {"problem", isMet(need) ? Json(nullptr) : toJson(*need.problem)},
                         {"cost", need.cost},
                         {"debian", need.debian},
                         {"red-hat", need.redHat}});
     return list;
 }
 
-void write(Need const& need, Output& out)
+/** What is missing comes last, where a person looks first. */
+void write(std::vector<Need> needs, Output& out)
 {
-    if (!need.problem) {
-        out.line(fmt::format("ok       {}", need.what));
-        return;
+    auto const missing = std::stable_partition(needs.begin(), needs.end(), isMet);
+    for (auto need = needs.begin(); need != missing; ++need)
+        out.line(fmt::format("ok       {}", need->what));
+    for (auto need = missing; need != needs.end(); ++need) {
+        out.line(
+            fmt::format("{}  {}: {}", out.bold("missing"), need->what, printable(*need->problem)));
+        out.line(fmt::format("           costs    {}", need->cost));
+        out.line(fmt::format("           Debian   {}", need->debian));
+        out.line(fmt::format("           Red Hat  {}", need->redHat));
     }
-    out.line(fmt::format("missing  {}: {}", need.what, printable(*need.problem)));
-    out.line(fmt::format("           costs    {}", need.cost));
-    out.line(fmt::format("           Debian   {}", need.debian));
-    out.line(fmt::format("           Red Hat  {}", need.redHat));
+    out.line(fmt::format("{} of {} missing", needs.end() - missing, needs.size()));
 }
 
 class Doctor : public Command
@@ -45,17 +54,11 @@ public:
     void run(Session& session) override
     {
         std::vector<Need> const needs = diagnose();
-        Output& out = session.out();
-        auto const missing = std::count_if(
-            needs.begin(), needs.end(), [](Need const& need) { return need.problem.has_value(); });
-        if (session.options().json) {
-            out.json(documentOf(needs));
-        } else {
-            for (Need const& need : needs)
-                write(need, out);
-            out.line(fmt::format("{} of {} missing", missing, needs.size()));
-        }
-        if (missing != 0)
+        if (session.options().json)
+            session.out().json(documentOf(needs));
+        else
+            write(needs, session.out());
+        if (!std::all_of(needs.begin(), needs.end(), isMet))
             session.endWith(PluginRefused);
     }
 };

@@ -14,8 +14,6 @@ namespace
 
 using interrupts::Noted;
 
-constexpr int nothing = -1; // is waited for but time
-
 class Watch : public Command
 {
 public:
@@ -40,7 +38,7 @@ public:
         for (unsigned int reading = 1;; ++reading) {
             NodeView view = liveView(node, names_, session.secrets());
             // Ctrl-C reaches the commands, too: what was read then is not to be shown.
-            if (signals.wait(nothing, 0) == Noted::Event::Interrupt)
+            if (!goesOn(session.out(), signals, 0))
                 return;
             std::vector<PropertyView> changed;
             for (PropertyView const& property : view.properties) {
@@ -52,18 +50,24 @@ public:
             }
             view.properties = changed;
             show(session, view);
-            if (reading == count_)
-                return;
-            if (isInterrupted(signals))
+            if (reading == count_ || !goesOn(session.out(), signals, interval_))
                 return;
         }
     }
 
 private:
-    /** Waits until the next reading is due; a resized terminal makes it due early. */
-    bool isInterrupted(Noted const& signals) const
+    /**
+     * Waits, or less where the terminal changes its size.
+     *
+     * @return whether the watch goes on
+     * @throws OutputClosed, which without a change would never be noticed
+     */
+    static bool goesOn(Output const& out, Noted const& signals, double seconds)
     {
-        return signals.wait(nothing, interval_) == Noted::Event::Interrupt;
+        auto const event = signals.wait({out.descriptor(), 0, 0}, seconds);
+        if (event == Noted::Event::Ready)
+            throw OutputClosed();
+        return event != Noted::Event::Interrupt;
     }
 
     static void show(Session& session, NodeView const& view)

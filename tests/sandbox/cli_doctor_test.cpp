@@ -1,0 +1,273 @@
+// What the doctor finds on machines that lack one thing or another, and that its advice helps.
+
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+
+#include <cstdlib>
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+
+namespace
+{
+
+using Json = nlohmann::ordered_json;
+
+/** A machine that lacks nothing. */
+class Doctor : public testing::Test
+{
+protected:
+    Doctor()
+    {
+        setenv("LANG", "C.UTF-8", 1);
+        machine::lay("redhat");
+        machine::write("/etc/passwd", "root:x:0:0:root:/root:/bin/sh\n"
+                                      "bin:x:1:1::/:/bin/false\n"
+                                      "anna:x:1000:1000::/home/anna:/bin/sh\n"
+                                      "ben:x:1001:1001::/home/ben:/bin/sh\n");
+        machine::write("/etc/shadow",
+                       "root:*:19000:0:99999:7:::\nanna:!:19000:0:99999:7:::\n"
+                       "ben:!:19000:0:99999:7:::\n",
+                       0600);
+        machine::write("/etc/group", "root:x:0:\nanna:x:1000:\nben:x:1001:\n");
+        machine::write("/etc/login.defs",
+                       "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+        machine::write("/etc/pam.d/login", "auth required pam_unix.so\n");
+        machine::write("/var/log/messages", "Jan  2 03:04:05 host x: y\n");
+        machine::fake("/usr/bin/passwd", "echo '  --stdin  read it from a pipe'\n");
+        for (char const* program : {"/usr/sbin/lsmod", "/usr/sbin/modinfo", "/sbin/shutdown"})
+            machine::fake(program, "");
+        std::filesystem::remove_all("/proc/modules");
+    }
+
+    /** The one need of this name. */
+    static Json need(std::string const& name)
+    {
+        for (Json const& each : Json::parse(mihostRun({"--json", "doctor"}).out))
+            if (each["need"] == name)
+                return each;
+        return nullptr;
+    }
+
+    static void expectMissing(std::string const& name, std::string const& problem,
+                              std::string const& cost)
+    {
+        Json const found = need(name);
+        ASSERT_FALSE(found.is_null()) << name;
+        EXPECT_EQ(found["ok"], false) << name;
+        EXPECT_EQ(found["problem"], problem) << name;
+        EXPECT_EQ(found["cost"], cost) << name;
+        EXPECT_NE(found["debian"], "") << name;
+        EXPECT_NE(found["red-hat"], "") << name;
+        EXPECT_EQ(mihostRun({"doctor"}).code, 1) << name;
+    }
+
+    /** Follows the advice for Debian. */
+    static void follow(Json const& need)
+    {
+        std::string const advice = need["debian"];
+        ASSERT_EQ(std::system(advice.c_str()), 0) << advice;
+    }
+};
+
+TEST_F(Doctor, FindsNothingMissingOnAWholeMachine)
+{
+    Outcome const outcome = mihostRun({"doctor"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.err, "");
+    EXPECT_EQ(outcome.out.find("missing "), std::string::npos) << outcome.out;
+    EXPECT_NE(outcome.out.find("\n0 of "), std::string::npos) << outcome.out;
+    Outcome const json = mihostRun({"--json", "doctor"});
+    EXPECT_EQ(json.code, 0);
+    for (Json const& need : Json::parse(json.out)) {
+        EXPECT_EQ(need["ok"], true) << need;
+        EXPECT_EQ(need["problem"], nullptr) << need;
+    }
+}
+
+TEST_F(Doctor, LoadsNoPlugin)
+{
+    EXPECT_EQ(mihostRun({"--plugin", "/none.so", "doctor"}).code, 0);
+}
+
+TEST_F(Doctor, ShowsWhatIsMissingLastWithItsCostAndWhatMendsIt)
+{
+    machine::remove("/usr/sbin/lsmod");
+    machine::remove("/usr/bin/lsmod");
+    std::string const out = mihostRun({"doctor"}).out;
+    std::string const told = "missing  command lsmod: not found in PATH\n"
+                             "           costs    all drivers\n"
+                             "           Debian   apt-get install kmod\n"
+                             "           Red Hat  dnf install kmod\n"
+                             "1 of ";
+    EXPECT_NE(out.find(told), std::string::npos) << out;
+    EXPECT_GT(out.find(told), out.rfind("\nok  "));
+}
+
+TEST_F(Doctor, MissesEachCommandThatThePluginRuns)
+{
+    for (std::string const command : {"lsmod",
+                                      "modinfo",
+                                      "wc",
+                                      "sed",
+                                      "date",
+                                      "stat",
+                                      "grep",
+                                      "cat",
+                                      "tr",
+                                      "cut",
+                                      "chage",
+                                      "chpasswd",
+                                      "rm",
+                                      "userdel",
+                                      "/usr/sbin/useradd",
+                                      "/usr/sbin/userdel",
+                                      "/usr/sbin/usermod",
+                                      "/usr/sbin/groupadd",
+                                      "/usr/sbin/groupdel",
+                                      "/usr/bin/chage",
+                                      "/usr/bin/passwd",
+                                      "/usr/bin/id",
+                                      "/sbin/shutdown",
+                                      "/bin/sh"})
+        EXPECT_EQ(need("command " + command)["ok"], true) << command;
+    machine::remove("/usr/sbin/groupdel");
+    expectMissing("command /usr/sbin/groupdel", "No such file or directory",
+                  "the method LocalGroupDel");
+}
+
+TEST_F(Doctor, TellsACommandThatIsThereFromAPathThatIsTooShort)
+{
+    setenv("PATH", "/usr/bin:/bin", 1);
+    expectMissing("command chpasswd", "not found in PATH", "writing password of users");
+    EXPECT_EQ(need("command chpasswd")["debian"], "PATH=$PATH:/usr/sbin mihost");
+    EXPECT_EQ(need("command chpasswd")["red-hat"], "PATH=$PATH:/usr/sbin mihost");
+}
+
+TEST_F(Doctor, MissesAPasswdThatTakesPasswordsFromAPipe)
+{
+    machine::fake("/usr/bin/passwd", "echo 'nothing of the kind'\n");
+    expectMissing("passwd --stdin", "passwd does not know it",
+                  "Password in methods: what is stored opens nothing");
+}
+
+TEST_F(Doctor, MissesALocale)
+{
+    unsetenv("LANG");
+    expectMissing("locale in LANG", "LANG is not set", "language-edition and code-set of os");
+}
+
+TEST_F(Doctor, MissesIdRangesAndWhatTheyName)
+{
+    machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\n");
+    expectMissing("id ranges in /etc/login.defs", "no line begins with GID_MAX and a number",
+                  "ordinary users, ordinary groups");
+    machine::remove("/etc/login.defs");
+    expectMissing("id ranges in /etc/login.defs", "No such file or directory",
+                  "ordinary users, ordinary groups");
+}
+
+TEST_F(Doctor, MissesAccountFilesAndTheirForm)
+{
+    machine::write("/etc/group", "root:x:0:\nstaff:x:fifty:\n");
+    expectMissing("form of /etc/group", "line 2 is malformed", "that group");
+    machine::remove("/etc/group");
+    expectMissing("groups in /etc/group", "No such file or directory", "all groups");
+    EXPECT_EQ(need("form of /etc/group"), nullptr);
+    machine::write("/etc/passwd", "root:x:0:0::/:/bin/sh\nnonsense\n");
+    expectMissing("form of /etc/passwd", "line 2 is malformed",
+                  "that user; behind a line that is too long, all users");
+    machine::remove("/etc/passwd");
+    expectMissing("accounts in /etc/passwd", "No such file or directory", "all users");
+    machine::remove("/etc/pam.d/login");
+    expectMissing("login failures in /etc/pam.d/login", "No such file or directory",
+                  "max-login-failures of users");
+}
+
+TEST_F(Doctor, MissesShadowEntriesInTheirOrderAndKnowsHowToSortThem)
+{
+    std::string const cost = "passwords and ageing of that user and of all behind it";
+    machine::write("/etc/shadow",
+                   "bin:*:19000:0:99999:7:::\nben:!:19000:0:99999:7:::\n"
+                   "anna:!:19000:0:99999:7:::\nroot:*:19000:0:99999:7:::\n",
+                   0600);
+    expectMissing("order of /etc/shadow",
+                  "no entry for 'anna' where the order of /etc/passwd wants it", cost);
+    follow(need("order of /etc/shadow"));
+    EXPECT_EQ(need("order of /etc/shadow")["ok"], true);
+    machine::remove("/etc/shadow");
+    expectMissing("passwords in /etc/shadow", "No such file or directory",
+                  "passwords and ageing of users");
+    EXPECT_EQ(need("order of /etc/shadow"), nullptr);
+}
+
+TEST_F(Doctor, MissesAReleaseFileAndKnowsHowToWriteOne)
+{
+    machine::remove("/etc/redhat-release");
+    machine::write("/etc/os-release", "PRETTY_NAME=\"Some System 12\"\nVERSION_ID=\"12\"\n");
+    expectMissing("date of a release file", "none of the files that are known",
+                  "install-date of os");
+    expectMissing("version in a release file", "none of the files that are known",
+                  "os-version of os");
+    expectMissing("name in a release file", "none of the files that are known",
+                  "os-name of os: it says Linux");
+    follow(need("name in a release file"));
+    EXPECT_EQ(need("name in a release file")["ok"], true);
+    EXPECT_EQ(need("version in a release file")["ok"], true);
+    EXPECT_EQ(mihostRun({"get", "os", "os-name", "os-version"}).out,
+              "108 os-name     Some System 12\n134 os-version  12.0\n");
+    machine::write("/etc/release", "Some System 12\n");
+    expectMissing("version in a release file",
+                  "no lines like 'VERSION = 1' and 'PATCHLEVEL = 0' behind the first",
+                  "os-version of os");
+}
+
+TEST_F(Doctor, MissesALogWithClassicStamps)
+{
+    machine::write("/var/log/messages", "2026-01-02T03:04:05.678901+00:00 host x: y\n");
+    expectMissing("classic stamps in the system log",
+                  "a line begins with '2026-01-02T03:04' rather than a stamp like "
+                  "'Jan  2 03:04:05 '",
+                  "messages and times of log entries");
+    machine::remove("/var/log/messages");
+    expectMissing("system log in /var/log/messages", "No such file or directory",
+                  "all log entries");
+    EXPECT_EQ(need("classic stamps in the system log"), nullptr);
+}
+
+TEST_F(Doctor, LooksAtTheNewestLinesOfALongLogOnly)
+{
+    std::string log = "2025-01-02T03:04:05 before the change\n";
+    for (int line = 0; line < 20000; ++line)
+        log += "Jan  2 03:04:05 host x: y\n";
+    machine::write("/var/log/messages", log);
+    EXPECT_EQ(need("classic stamps in the system log")["ok"], true);
+    machine::write("/var/log/messages", log + "2026-01-02T03:04:05 newest\n");
+    EXPECT_EQ(need("classic stamps in the system log")["ok"], false);
+}
+
+TEST_F(Doctor, NeverObeysWhatALogLineHolds)
+{
+    machine::write("/var/log/messages", "\x1b[2J\xff\n");
+    std::string const out = mihostRun({"doctor"}).out;
+    EXPECT_NE(out.find(R"(a line begins with '\x1b[2J\xff' rather)"), std::string::npos) << out;
+    EXPECT_FALSE(need("classic stamps in the system log").is_null());
+}
+
+TEST_F(Doctor, MissesRootsPrivilegesWhereItHasNone)
+{
+    Outcome const outcome = runToEnd(
+        {"/usr/bin/setpriv", "--reuid=65534", "--clear-groups", MIHOST_FILE, "--json", "doctor"});
+    EXPECT_EQ(outcome.code, 1);
+    int found = 0;
+    for (Json const& need : Json::parse(outcome.out))
+        for (char const* name :
+             {"root's privileges", "passwords in /etc/shadow", "leave to empty the system log"})
+            if (need["need"] == name) {
+                EXPECT_EQ(need["ok"], false) << name;
+                ++found;
+            }
+    EXPECT_EQ(found, 3);
+}
+
+} // namespace

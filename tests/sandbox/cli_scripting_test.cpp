@@ -1,0 +1,126 @@
+// mihost among other programs: what comes before and behind it in a pipe, and what JSON they read.
+
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+
+#include <gtest/gtest.h>
+
+namespace
+{
+
+/** Runs a line in bash, where $mihost is the program and a pipe fails if anything in it does. */
+Outcome bash(std::string const& line)
+{
+    return runToEnd(
+        {"/bin/bash", "-c", "mihost=$1; set -o pipefail; " + line, "bash", MIHOST_FILE});
+}
+
+/** A machine with texts of any bytes but separators. */
+void makeMachine(int users = 3)
+{
+    machine::lay("plain");
+    std::string accounts = "root:x:0:0:\x1b[31m\xff \"quoted\" \\ back\t\x01:/:/bin/sh\n";
+    for (int id = 1000; id < 1000 + users; ++id)
+        accounts += "user" + std::to_string(id) + ":x:" + std::to_string(id) + ":100:" + "李明" +
+                    std::to_string(id) + ":/:/bin/sh\n";
+    machine::write("/etc/passwd", accounts);
+    machine::write("/etc/shadow", "root:*:19000:0:99999:7:::\n", 0600);
+    machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+    machine::write("/var/log/messages", "Jan  2 03:04:05 \x80 \"\x7f\" \xc0\xaf\x1b]0;x\x07\n");
+}
+
+TEST(MihostInAPipe, EndsQuietlyWhenItsReaderGoes)
+{
+    makeMachine(1200); // more lines than fit into a pipe
+    for (char const* arguments :
+         {"tree", "--json tree", "tree --all", "list users", "--json list users", "get os",
+          "properties", "methods --markdown", "--help", "doctor || true", "shell < <(yes tree)",
+          "watch os os-name --interval 0"}) {
+        Outcome const outcome = bash("{ $mihost " + std::string(arguments) + "; } | head -c 1");
+        EXPECT_EQ(outcome.code, 0) << arguments;
+        EXPECT_EQ(outcome.err, "") << arguments;
+        EXPECT_EQ(outcome.out.size(), 1U) << arguments;
+    }
+}
+
+TEST(MihostInAPipe, EndsQuietlyWhenTheReaderOfItsMessagesGoes)
+{
+    makeMachine();
+    for (char const* arguments : {"--trace - tree", "--timing tree", "--trace - shell <<<tree"})
+        EXPECT_EQ(
+            bash("{ $mihost " + std::string(arguments) + " 2>&1 >/dev/null; } | head -c 1").code, 0)
+            << arguments;
+    // An error stays one where nobody reads of it.
+    EXPECT_EQ(bash("$mihost get nothing 2> >(true); exit $?").code, 4);
+}
+
+TEST(MihostInAPipe, TellsThatItsOutputCannotBeWritten)
+{
+    makeMachine();
+    for (char const* arguments : {"tree", "--json list users", "get os 108", "--help", "--version",
+                                  "doctor", "methods", "shell <<<'get os 108'"}) {
+        Outcome const outcome = bash("$mihost " + std::string(arguments) + " >/dev/full");
+        EXPECT_EQ(outcome.code, 2) << arguments;
+        EXPECT_NE(outcome.err.find("cannot write the output: No space left on device\n"),
+                  std::string::npos)
+            << outcome.err;
+    }
+}
+
+TEST(MihostOnAFullDisk, TellsThatTheTraceWasCutShort)
+{
+    makeMachine();
+    Outcome const outcome =
+        bash("mkdir /tmp/small && mount -t tmpfs -o size=16k none /tmp/small && "
+             "$mihost --trace /tmp/small/trace get os 108");
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_EQ(outcome.out, "108 os-name  Linux\n"); // the trace is no reason to do less
+    EXPECT_EQ(outcome.err,
+              "mihost: cannot write the trace '/tmp/small/trace': No space left on device\n");
+    EXPECT_EQ(bash("test $(stat -c %s /tmp/small/trace) -gt 8000").code, 0);
+}
+
+TEST(MihostJson, IsReadByJqWhateverTheSystemsTextsHold)
+{
+    makeMachine();
+    struct Reading {
+        char const* arguments;
+        char const* filter;
+        char const* result;
+    };
+    for (Reading const& reading : std::initializer_list<Reading>{
+             {"tree --all", "map(select(.kind == \"user\")) | length", "4"},
+             {"tree user:root", ".[0].properties.\"312\".value",
+              R"("\u001b[31m\\xff \"quoted\" \\ back\t\u0001")"},
+             {"list users", ".[3].properties.\"312\".value", R"("李明1002")"},
+             {"list groups", "map(.kind) | unique", R"(["group"])"},
+             {"list drivers", "type", R"("array")"},
+             {"list log", ".[0].kind", R"("log-entry")"},
+             {"get log:1", ".kind", R"("log-entry")"},
+             {"get user:root password", ".properties.\"117\" | [.value, .hidden]", "[null,true]"},
+             {"set user:root full-name plain", ".", R"({"status":0,"text":""})"},
+             {"call GetShadowing", ".", R"({"status":0,"text":""})"},
+             {"refresh", ".status", "0"},
+             {"--yes clear-log", ".status", "0"},
+             {"--yes power restart 2>/dev/null", ".status", "0"},
+             {"watch os os-name --count 1", ".properties.\"108\".value", R"("Linux")"},
+             {"shell <<<'get os 108'", ".properties.\"108\".kind", R"("text")"},
+             {"doctor", "map(has(\"need\")) | all", "true"},
+             {"version", "has(\"mihost\")", "true"},
+             {"properties os", ".[0].kind", R"("os")"},
+             {"properties", "length", "9"},
+             {"methods", "length", "12"},
+             {"methods UserDel", ".[0].method", R"("UserDel")"}}) {
+        Outcome const outcome = bash("{ $mihost --json " + std::string(reading.arguments) +
+                                     "; echo $? >/tmp/code; } | jq -c '" + reading.filter + "'");
+        EXPECT_EQ(outcome.out, std::string(reading.result) + "\n") << reading.arguments;
+        EXPECT_EQ(outcome.err, "") << reading.arguments;
+        EXPECT_EQ(outcome.code, 0) << reading.arguments;
+    }
+    for (char const* arguments :
+         {"tree", "list users", "--timing tree 2>&1 >/dev/null", "--trace - tree 2>&1 >/dev/null"})
+        EXPECT_EQ(bash("$mihost --json " + std::string(arguments) + " | jq empty").err, "")
+            << arguments;
+}
+
+} // namespace

@@ -1,0 +1,158 @@
+// The shell without a terminal: scripts that drive one loaded plug-in.
+
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+#include <sstream>
+
+namespace
+{
+
+using Json = nlohmann::ordered_json;
+using Lines = std::vector<std::string>;
+
+class MihostScript : public testing::Test
+{
+protected:
+    MihostScript()
+    {
+        machine::lay("plain");
+        machine::fake("/usr/sbin/lsmod", "echo asked >>/tmp/asked\necho 'Module Size'\n");
+    }
+};
+
+Lines linesOf(std::string const& text)
+{
+    std::istringstream stream(text);
+    Lines lines;
+    for (std::string line; std::getline(stream, line);)
+        lines.push_back(line);
+    return lines;
+}
+
+TEST_F(MihostScript, RunsItsLinesOnOneLoadedPlugin)
+{
+    Outcome const outcome = mihostRun({"shell"}, "get os 108\n\n"
+                                                 "# a comment, then blanks and no line end\n"
+                                                 "   get   'os'  \"os-name\"   # and another");
+    EXPECT_EQ(outcome.out, "108 os-name  Linux\n108 os-name  Linux\n");
+    EXPECT_EQ(outcome.err, "");
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(machine::read("/tmp/asked"), "asked\n");
+}
+
+TEST_F(MihostScript, ShowsInEachLineWhatTheOnesBeforeChanged)
+{
+    Outcome const outcome = mihostRun({"shell"}, "call UserAdd UserName=jdoe 'Comment=J. Doe'\n"
+                                                 "get user:jdoe full-name\n"
+                                                 "call UserSetFullName UserName=jdoe FullName=J\n"
+                                                 "get user:jdoe full-name\n");
+    EXPECT_EQ(outcome.out, "312 full-name  J. Doe\n312 full-name  J\n") << outcome.err;
+    EXPECT_EQ(outcome.code, 0);
+}
+
+TEST_F(MihostScript, EndsAtTheFirstLineThatFailsAndNamesIt)
+{
+    struct Script {
+        char const* line;
+        int code;
+        char const* message;
+    };
+    for (Script const& script : std::initializer_list<Script>{
+             {"get nothing", 4, "mihost: line 2: no node 'nothing': a node is"},
+             {"get os nothing", 4, "mihost: line 2: node 'os' has no property 'nothing'"},
+             {"nonsense", 2, "mihost: line 2: "},
+             {"get 'os", 2, "mihost: line 2: nothing follows the last '"},
+             {"--sandbox get os", 2, "mihost: line 2: "},
+             {"--plugin x.so get os", 2, "mihost: line 2: "},
+             {"shell", 2, "mihost: line 2: "},
+             {"call UserDel UserName=a;b", 2, "mihost: line 2: UserName holds ';'"},
+             {"call UserDel UserName=nobody-here", 1, "mihost: line 2: the plug-in answered"},
+             {"power halt", 2, "mihost: line 2: to halt the machine needs --yes"}}) {
+        Outcome const outcome =
+            mihostRun({"shell"}, "get os 108\n" + std::string(script.line) + "\nget os 108\n");
+        EXPECT_EQ(outcome.code, script.code) << script.line;
+        EXPECT_EQ(outcome.out, "108 os-name  Linux\n") << script.line;
+        EXPECT_EQ(outcome.err.find(script.message), 0U) << outcome.err;
+        EXPECT_EQ(linesOf(outcome.err).size(), 1U) << outcome.err;
+    }
+}
+
+TEST_F(MihostScript, GoesOnBehindFailuresWhereItIsToldTo)
+{
+    Outcome const outcome =
+        mihostRun({"shell", "--keep-going"},
+                  "get nothing\nget os 108\ncall UserDel UserName=a;b\nget os 108\n");
+    EXPECT_EQ(outcome.code, 4); // the first one's
+    EXPECT_EQ(outcome.out, "108 os-name  Linux\n108 os-name  Linux\n");
+    Lines const told = linesOf(outcome.err);
+    ASSERT_EQ(told.size(), 2U);
+    EXPECT_EQ(told[0].find("mihost: line 1: "), 0U) << told[0];
+    EXPECT_EQ(told[1].find("mihost: line 3: "), 0U) << told[1];
+}
+
+TEST_F(MihostScript, EndsOnExitAndQuit)
+{
+    for (char const* word : {"exit", "quit"}) {
+        Outcome const outcome = mihostRun({"shell"}, std::string(word) + "\nget nothing\n");
+        EXPECT_EQ(outcome.code, 0);
+        EXPECT_EQ(outcome.err, "");
+    }
+}
+
+TEST_F(MihostScript, PrintsOneJsonLineForEachCommand)
+{
+    Outcome const outcome = mihostRun({"--json", "shell", "--keep-going"},
+                                      "get os 108\nlist users\nget nothing\nnonsense\nrefresh\n"
+                                      "call UserAdd UserName=jdoe\nhelp get\nversion\ntree\n"
+                                      "call UserDel UserName=nobody-here\n");
+    Lines const lines = linesOf(outcome.out);
+    ASSERT_EQ(lines.size(), 10U) << outcome.out;
+    EXPECT_EQ(Json::parse(lines[0])["kind"], "os");
+    EXPECT_TRUE(Json::parse(lines[1]).is_array());
+    EXPECT_EQ(Json::parse(lines[2])["exit"], 4);
+    EXPECT_EQ(Json::parse(lines[2])["error"].get<std::string>().find("line 3: no node"), 0U);
+    EXPECT_EQ(Json::parse(lines[3])["exit"], 2);
+    EXPECT_EQ(lines[4], R"({"status":0,"text":""})");
+    EXPECT_EQ(lines[5], R"({"status":0,"text":""})");
+    EXPECT_EQ(Json::parse(lines[6])["text"].get<std::string>().find("read properties"), 0U);
+    EXPECT_TRUE(Json::parse(lines[7]).contains("plugin"));
+    EXPECT_TRUE(Json::parse(lines[8]).is_array());
+    EXPECT_EQ(lines[9], R"({"status":1,"text":""})");
+}
+
+TEST_F(MihostScript, TakesOptionsForOneLineOnly)
+{
+    Outcome const outcome = mihostRun({"shell"}, "--json get os 108\nget os 108\n");
+    Lines const lines = linesOf(outcome.out);
+    ASSERT_EQ(lines.size(), 2U);
+    EXPECT_EQ(Json::parse(lines[0])["kind"], "os");
+    EXPECT_EQ(lines[1], "108 os-name  Linux");
+}
+
+TEST_F(MihostScript, IsNeverReadForAPassword)
+{
+    Outcome const outcome =
+        mihostRun({"shell"}, "call UserSetPassword UserName=root Password=-\nget os 108\n");
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_EQ(outcome.err, "mihost: line 1: Password cannot be read, since standard input is the "
+                           "script; it may stand there\n");
+}
+
+TEST_F(MihostScript, MayBeEmpty)
+{
+    EXPECT_EQ(mihostRun({"shell"}, "").code, 0);
+    EXPECT_EQ(mihostRun({"shell"}, "\n\n# nothing\n").out, "");
+}
+
+TEST_F(MihostScript, DoesNotStartWhereThePluginCannotBeLoaded)
+{
+    Outcome const outcome = mihostRun({"--plugin", "/none.so", "shell"}, "get os 108\n");
+    EXPECT_EQ(outcome.code, 3);
+    EXPECT_EQ(outcome.out, "");
+}
+
+} // namespace

@@ -84,7 +84,7 @@ std::string folderOf(std::string const& command, std::string const& path)
 {
     std::istringstream folders(path);
     for (std::string folder; std::getline(folders, folder, ':');)
-        if (!accessProblem(folder + "/" + command, X_OK))
+        if (!accessProblem(fmt::format("{}/{}", folder, command), X_OK))
             return folder;
     return "";
 }
@@ -230,7 +230,7 @@ std::vector<Need> modules()
  */
 std::vector<std::string> newestLogLines()
 {
-    constexpr std::streamoff enough = 256 * 1024;
+    constexpr std::streamoff enough = 1 << 18;
     constexpr std::size_t shown = 50;
     std::ifstream file(logFile, std::ios::ate);
     std::streamoff const start = std::max<std::streamoff>(file.tellg() - enough, 0);

@@ -48,18 +48,18 @@ private:
     {
         if (inComment_)
             return;
+        bool const escapes = byte == '\\' && quote != '\'';
+        bool const quotes = quote == '\0' && (byte == '\'' || byte == '"');
         if (quote == '\\') {
             quote = outer;
             add(byte);
-        } else if (byte == '\\' && quote != '\'') {
+        } else if (escapes || quotes) {
             open(byte);
         } else if (quote != '\0') {
             if (byte == quote)
                 quote = '\0';
             else
                 add(byte);
-        } else if (byte == '\'' || byte == '"') {
-            open(byte);
         } else if (byte == ' ' || byte == '\t') {
             inWord = false;
         } else if (byte == '#' && !inWord) {

@@ -1,17 +1,49 @@
-// startup_host PLUGIN [LIST]: starts the plug-in as a host does, without a log, and prints its own
-// processor time. With a file given, notes there every command that the plug-in runs, one a line.
+// startup_host PLUGIN [READS [LIST]]: starts the plug-in as a host does, without a log, and prints
+// the processor time that it took itself, in microseconds. Then reads the newest log entry's
+// message once and READS times more, and prints the mean time of each kind of read, in
+// microseconds. With a file given, notes there every command that the start runs, one a line.
 
+#include "host/MutableNode.h"
 #include "host/OpenMI.h"
+#include "nodes/ids.h"
 
 #include "own_time.h"
 
+#include <chrono>
+#include <cstdlib>
 #include <dlfcn.h>
 #include <unistd.h>
+#include <vector>
 
 namespace
 {
+
 FILE* list = nullptr;
+
+IC::MutableNode const* newestEntry(IC::ManagementInterface& interface)
+{
+    std::vector<IC::Node*> nodes;
+    interface.getMap(nodes);
+    for (IC::Node* node : nodes)
+        if (auto const* entry = dynamic_cast<IC::MutableNode*>(node);
+            entry && entry->getNodeType() == NODES::logEntryType)
+            return entry;
+    return nullptr;
 }
+
+/** Microseconds for each of so many reads. */
+double readTime(IC::MutableNode const& entry, int reads)
+{
+    auto const before = std::chrono::steady_clock::now();
+    IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
+    for (int i = 0; i < reads; ++i)
+        entry.getProperty(NODES::message, value);
+    std::chrono::duration<double, std::micro> const time =
+        std::chrono::steady_clock::now() - before;
+    return time.count() / reads;
+}
+
+} // namespace
 
 extern "C" FILE* popen(char const* command, char const* mode)
 {
@@ -25,17 +57,23 @@ int main(int argc, char* argv[])
 {
     if (argc < 2)
         return 1;
-    if (argc > 2)
-        list = std::fopen(argv[2], "w");
+    int const reads = argc > 2 ? std::atoi(argv[2]) : 0;
+    if (argc > 3)
+        list = std::fopen(argv[3], "w");
     void* const library = dlopen(argv[1], RTLD_NOW);
-    void* const entry = library ? dlsym(library, "OpenMI") : nullptr;
-    if (!entry)
+    void* const entryPoint = library ? dlsym(library, "OpenMI") : nullptr;
+    if (!entryPoint)
         return 1;
     IC::ManagementInterface* interface = nullptr;
     IC::Error* error = nullptr;
-    reinterpret_cast<decltype(&OpenMI)>(entry)(&interface, &error);
+    reinterpret_cast<decltype(&OpenMI)>(entryPoint)(&interface, &error);
     interface->initialize(1, IC::Number(0U), IC::Number(0U));
     printOwnTime();
+    IC::MutableNode const* const entry = reads > 0 ? newestEntry(*interface) : nullptr;
+    if (entry) {
+        double const first = readTime(*entry, 1);
+        std::printf("%.1f %.1f\n", first, readTime(*entry, reads));
+    }
     std::fflush(nullptr);
     _exit(0); // what follows a start is not measured
 }

@@ -1,126 +1,83 @@
-// The plug-in's start-up against the bare cost of the commands that it runs.
+// bench_startup [--quick]: the plug-in's start-up against the bare cost of the commands that it
+// runs.
 //
-// In a copy of this machine with 120 kernel modules, whose lsmod and modinfo are scripts that print
-// recorded text, and with a log of 1,000, 100,000 and 1,000,000 lines, run by turns
+// In a copy of this machine with 120 kernel modules, 10 users and a log of 1,000, 100,000 and
+// 1,000,000 lines, run by turns
 //
-//   plug-in   startup_host: loads the plug-in and initialises it, from its start to its end
-//   bare      startup_commands: gives the very same command lines in the same order to popen and
-//             reads what they print, likewise
+//   bare         startup_commands: gives the very command lines of a start, in their order, to
+//   popen
+//                and reads what they print
+//   plug-in      startup_host: loads the plug-in and initialises it, from its start to its end
+//   accelerated  startup_host_fast: the same host, linked to the accelerator
 //
-// For each log it prints the number of commands and, for both, the median of the time taken
-// (whole), of the processor time with the commands (cpu) and of the processor time without them
-// (own: the plug-in's share of a start); the ratios are medians of those of the pairs. On a busy
-// machine that of cpu says more than that of whole.
+// Prints for each log the time of each, from its start to its end, and the processor time that
+// bare and plug-in take themselves, without that of their children; then what reading a log
+// entry takes once the plug-in has started.
 
-#include "mihost/sandbox/Sandbox.h"
-#include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "bench/support/MadeUp.h"
+#include "bench/support/Samples.h"
+#include "bench/support/Table.h"
+#include "bench/support/Timed.h"
 
-#include <algorithm>
-#include <chrono>
-#include <cstdio>
-#include <cstdlib>
 #include <fstream>
-#include <stdexcept>
-#include <string>
-#include <sys/resource.h>
-#include <vector>
+#include <sstream>
 
 namespace
 {
 
 constexpr int modules = 120;
+constexpr int users = 10;
 constexpr char const* list = "/tmp/commands";
 
 struct Size {
     int logLines;
-    std::size_t pairs;
+    std::size_t rounds;
 };
 
-constexpr Size sizes[] = {{1000, 21}, {100000, 21}, {1000000, 7}};
+constexpr Size sizes[] = {{1000, 21}, {100000, 11}, {1000000, 5}};
+constexpr std::size_t quickRounds = 3;
 
-double wholeTime()
-{
-    std::chrono::duration<double, std::milli> const time =
-        std::chrono::steady_clock::now().time_since_epoch();
-    return time.count();
-}
+/** What the runs of one program took, in milliseconds. */
+struct Runs {
+    std::vector<std::string> arguments;
+    Samples whole = {};
+    Samples cpu = {};
+    Samples own = {};
+    Samples firstRead = {};
+    Samples laterReads = {};
 
-double cpuTime()
-{
-    rusage used{};
-    getrusage(RUSAGE_CHILDREN, &used);
-    return 1e3 * static_cast<double>(used.ru_utime.tv_sec + used.ru_stime.tv_sec) +
-           1e-3 * static_cast<double>(used.ru_utime.tv_usec + used.ru_stime.tv_usec);
-}
-
-/** What one run took, in milliseconds. */
-struct Times {
-    double whole;
-    double cpu;
-    double own;
+    void once()
+    {
+        Timed const run = timed(arguments);
+        std::istringstream output(run.output);
+        double ownTime = 0;
+        double first = 0;
+        double later = 0;
+        output >> ownTime;
+        whole.push_back(run.whole);
+        cpu.push_back(run.cpu);
+        own.push_back(ownTime / 1000);
+        if (output >> first >> later) {
+            firstRead.push_back(first / 1000);
+            laterReads.push_back(later / 1000);
+        }
+    }
 };
 
-struct Column {
-    char const* name;
-    double Times::*time;
-};
-
-constexpr Column columns[] = {{"whole", &Times::whole}, {"cpu", &Times::cpu}, {"own", &Times::own}};
-
-void makeMachine()
+Samples differences(Samples const& one, Samples const& other)
 {
-    setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
-    setenv("LC_ALL", "C", 1);
-    machine::lay("odd-modules");
-    std::string lsmod = "Module                  Size  Used by\n";
-    for (int i = 0; i < modules; ++i)
-        lsmod += "module" + std::to_string(i) + " 16384 0\n";
-    machine::write("/usr/share/recorded/lsmod", lsmod);
-    std::string const modinfo = machine::read("/usr/share/recorded/modinfo/e1000");
-    for (int i = 0; i < modules; ++i)
-        machine::write("/usr/share/recorded/modinfo/module" + std::to_string(i), modinfo);
+    Samples result;
+    for (std::size_t i = 0; i < one.size(); ++i)
+        result.push_back(one[i] - other[i]);
+    return result;
 }
 
-void writeLog(int lines)
+Samples percent(Samples parts, Samples const& wholes)
 {
-    std::ofstream log("/var/log/messages");
-    for (int i = 0; i < lines; ++i)
-        log << "Nov 20 10:11:12 host systemd[1]: Started Session " << i << " of user root.\n";
-}
-
-Times run(std::vector<std::string> const& arguments)
-{
-    double const wholeBefore = wholeTime();
-    double const cpuBefore = cpuTime();
-    Outcome const outcome = runToEnd(arguments);
-    if (outcome.code != 0)
-        throw std::runtime_error(arguments.front() + " failed: " + outcome.err);
-    return {wholeTime() - wholeBefore, cpuTime() - cpuBefore, std::stod(outcome.out) / 1000};
-}
-
-struct Pair {
-    Times plugin;
-    Times bare;
-};
-
-Pair runPair(bool pluginFirst)
-{
-    std::vector<std::string> const host{STARTUP_HOST, PLUGIN_FILE};
-    std::vector<std::string> const commands{STARTUP_COMMANDS, list};
-    Times const first = run(pluginFirst ? host : commands);
-    Times const second = run(pluginFirst ? commands : host);
-    return pluginFirst ? Pair{first, second} : Pair{second, first};
-}
-
-/** The median over all pairs; their number is odd. */
-template <class Value> double median(std::vector<Pair> const& pairs, Value const& valueOf)
-{
-    std::vector<double> values(pairs.size());
-    std::transform(pairs.begin(), pairs.end(), values.begin(), valueOf);
-    auto const middle = values.begin() + static_cast<std::ptrdiff_t>(values.size() / 2);
-    std::nth_element(values.begin(), middle, values.end());
-    return *middle;
+    parts = ratios(parts, wholes);
+    for (double& part : parts)
+        part *= 100;
+    return parts;
 }
 
 int countCommands()
@@ -132,38 +89,85 @@ int countCommands()
     return count;
 }
 
-void measure(Size const& size)
+struct Result {
+    int logLines;
+    int commands;
+    Runs bare{{STARTUP_COMMANDS, list}};
+    Runs plugin{{STARTUP_HOST, PLUGIN_FILE}};
+    Runs fast{{STARTUP_HOST_FAST, PLUGIN_FILE}};
+    Runs pluginReads{{STARTUP_HOST, PLUGIN_FILE, "5"}};
+    Runs fastReads{{STARTUP_HOST_FAST, PLUGIN_FILE, "500"}};
+};
+
+Result measure(Size const& size, bool quick)
 {
-    writeLog(size.logLines);
-    run({STARTUP_HOST, PLUGIN_FILE, list});
-    std::vector<Pair> pairs(size.pairs);
-    for (std::size_t i = 0; i < pairs.size(); ++i)
-        pairs[i] = runPair(i % 2 == 0);
-    for (Column const& column : columns) {
-        auto const time = column.time;
-        std::printf("%9d %8d %5zu  %-5s %10.2f %10.2f %7.3f\n", size.logLines, countCommands(),
-                    size.pairs, column.name,
-                    median(pairs, [time](Pair const& pair) { return pair.plugin.*time; }),
-                    median(pairs, [time](Pair const& pair) { return pair.bare.*time; }),
-                    median(pairs, [time](Pair const& pair) {
-                        return pair.plugin.*time / pair.bare.*time;
-                    }));
+    madeUp::log(size.logLines);
+    timed({STARTUP_HOST, PLUGIN_FILE, "0", list});
+    Result result{size.logLines, countCommands()};
+    byTurns(
+        quick ? quickRounds : size.rounds,
+        {[&] { result.bare.once(); }, [&] { result.plugin.once(); }, [&] { result.fast.once(); }});
+    byTurns(quickRounds, {[&] { result.pluginReads.once(); }, [&] { result.fastReads.once(); }});
+    return result;
+}
+
+void printWhole(std::vector<Result> const& results)
+{
+    say("Time of a start in milliseconds, from the start of the process to its end.");
+    Table table({"Log lines", "Commands", "Bare loop", "Plug-in", "Plug-in / bare",
+                 "With accelerator", "Accelerated / bare"});
+    for (Result const& result : results)
+        table.add(
+            {number(result.logLines), number(result.commands), shown(result.bare.whole),
+             shown(result.plugin.whole), shown(ratios(result.plugin.whole, result.bare.whole), 3),
+             shown(result.fast.whole, 1), shown(ratios(result.fast.whole, result.bare.whole), 4)});
+    table.print();
+}
+
+void printOwn(std::vector<Result> const& results)
+{
+    say("Processor time of the process itself in milliseconds, user and system, without that of "
+        "the "
+        "commands. The bare loop's is what starting and reading commands costs its process.");
+    Table table({"Log lines", "Bare loop", "Plug-in", "Plug-in - bare", "Bare, % of its time",
+                 "Plug-in, % of its time", "Plug-in - bare, % of plug-in's time",
+                 "With accelerator"});
+    for (Result const& result : results) {
+        Samples const more = differences(result.plugin.own, result.bare.own);
+        table.add({number(result.logLines), shown(result.bare.own, 1), shown(result.plugin.own, 1),
+                   shown(more, 1), shown(percent(result.bare.own, result.bare.whole), 1),
+                   shown(percent(result.plugin.own, result.plugin.whole), 1),
+                   shown(percent(more, result.plugin.whole), 1), shown(result.fast.own, 1)});
     }
-    std::fflush(stdout);
+    table.print();
+}
+
+void printReads(std::vector<Result> const& results)
+{
+    say("Reading the newest log entry's message once the plug-in has started, in milliseconds.");
+    Table table({"Log lines", "Plug-in", "With accelerator, first", "With accelerator, later"});
+    for (Result const& result : results)
+        table.add({number(result.logLines), shown(result.pluginReads.laterReads, 2),
+                   shown(result.fastReads.firstRead, 3), shown(result.fastReads.laterReads, 3)});
+    table.print();
+}
+
+void measureAll(bool quick)
+{
+    enterCopy();
+    madeUp::accounts(users);
+    madeUp::modules(modules);
+    std::vector<Result> results;
+    for (Size const& size : sizes)
+        results.push_back(measure(size, quick));
+    printWhole(results);
+    printOwn(results);
+    printReads(results);
 }
 
 } // namespace
 
-int main()
+int main(int argc, char* argv[])
 {
-    if (auto const reason = mihost::enterSandbox({})) {
-        std::fprintf(stderr, "no sandbox: %s\n", reason->c_str());
-        return EXIT_FAILURE;
-    }
-    makeMachine();
-    std::printf("%9s %8s %5s  %-5s %10s %10s %7s\n", "log lines", "commands", "pairs", "time",
-                "plug-in ms", "bare ms", "ratio");
-    for (Size const& size : sizes)
-        measure(size);
-    return EXIT_SUCCESS;
+    return runBench(argc, argv, measureAll);
 }

@@ -1,0 +1,84 @@
+// bench_memory [--quick]: what nodes take, and whether refreshes leave anything behind.
+//
+// In a copy of this machine, in one process: the heap and the resident memory of a plug-in with
+// 10,000 users and as many groups for each of its nodes; then, with 1,000 of both, memory after 10
+// and after 1,000 refreshes.
+
+#include "bench/support/MadeUp.h"
+#include "bench/support/Samples.h"
+#include "bench/support/Table.h"
+#include "bench/support/Timed.h"
+#include "nodes/ids.h"
+#include "tests/support/Plugin.h"
+
+#include <fstream>
+#include <malloc.h>
+#include <unistd.h>
+
+namespace
+{
+
+/** In bytes. */
+struct Memory {
+    double heap;
+    double resident;
+};
+
+Memory memoryNow()
+{
+    malloc_trim(0); // what the allocator only keeps for later is not used
+    long pages = 0;
+    long resident = 0;
+    std::ifstream("/proc/self/statm") >> pages >> resident;
+    struct mallinfo2 const info = mallinfo2();
+    return {static_cast<double>(info.uordblks + info.hblkhd),
+            static_cast<double>(resident * sysconf(_SC_PAGESIZE))};
+}
+
+void measureNodes()
+{
+    madeUp::accounts(10000);
+    Plugin plugin;
+    Memory const before = memoryNow();
+    plugin.initialize();
+    Memory const after = memoryNow();
+    auto const nodes = static_cast<double>(plugin.nodes().size());
+    Table table({"Nodes", "Heap for each, bytes", "Resident for each, bytes"});
+    table.add({number(nodes), number((after.heap - before.heap) / nodes),
+               number((after.resident - before.resident) / nodes)});
+    table.print();
+}
+
+void measureRefreshes(int many)
+{
+    constexpr int few = 10;
+    madeUp::accounts(1000);
+    Plugin plugin;
+    plugin.initialize();
+    IC::MutableNode& os = plugin.node(NODES::operatingSystemType);
+    Table table({"Refreshes", "Heap, bytes", "Resident, bytes"});
+    for (int done = 1; done <= many; ++done) {
+        os.setProperty(NODES::refresh, IC::PropertyValue(IC::Number(0U), true));
+        if (done != few && done != many)
+            continue;
+        Memory const now = memoryNow();
+        table.add({number(done), number(now.heap), number(now.resident)});
+    }
+    table.print();
+}
+
+void measureAll(bool quick)
+{
+    enterCopy();
+    madeUp::modules(0);
+    madeUp::log(0);
+    measureNodes();
+    measureRefreshes(quick ? 100 : 1000);
+}
+
+} // namespace
+
+int main(int argc, char* argv[])
+{
+    return runBench(argc, argv, measureAll);
+}

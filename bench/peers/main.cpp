@@ -1,0 +1,180 @@
+// bench_peers [--quick]: other programs that tell facts of a machine, on the same machine.
+//
+// In a copy of this machine, into which their Debian packages are installed, so that nothing of
+// them stays. With 120 kernel modules and a log of 1,000 lines, run by turns with mihost, with and
+// without the accelerator, which always starts the plug-in as a whole:
+//
+//   with 10 users      facter, ansible's setup module, inxi, snmpwalk of the host resources (once
+//                      without and once with the start of its agent); mihost prints its whole tree
+//   with 10,000 users  userdbctl, getent; mihost lists users and groups
+//
+// snmpd runs in a network of its own, of which nothing stays either.
+
+#include "bench/peers/Loopback.h"
+#include "bench/support/MadeUp.h"
+#include "bench/support/Samples.h"
+#include "bench/support/Table.h"
+#include "bench/support/Timed.h"
+
+#include <csignal>
+#include <cstdlib>
+#include <stdexcept>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace
+{
+
+constexpr std::size_t rounds = 7;
+constexpr std::size_t quickRounds = 2;
+
+struct Peer {
+    char const* name;
+    std::string command;
+    char const* leavesOut; // of what the plug-in tells
+};
+
+/** Listens on the loopback alone, which by then is that of a network of its own. */
+std::string agent(std::string const& port)
+{
+    return "snmpd -f -LF 0 /dev/null -C -r --rocommunity=public udp:127.0.0.1:" + port;
+}
+
+/** One part of the host resources: 1 the system, 2 its storage, 4 its processes. */
+std::string walk(std::string const& port, std::string const& part)
+{
+    return "snmpwalk -v2c -c public -r 0 -Oq 127.0.0.1:" + port + " .1.3.6.1.2.1.25." + part;
+}
+
+std::string walks(std::string const& port)
+{
+    return walk(port, "1") + " && " + walk(port, "2") + " && " + walk(port, "4");
+}
+
+std::string untilItAnswers(std::string const& port)
+{
+    return "until " + walk(port, "1.1 -t 0.05") + " 2>/dev/null; do sleep 0.01; done";
+}
+
+constexpr char const* standing = "16161"; // the port of the agent that runs all the time
+constexpr char const* passing = "16162";
+
+std::vector<Peer> const factPeers = {
+    {"facter", "facter --json", "accounts, groups, kernel modules, the log, counts of processes"},
+    {"ansible's setup", "ansible localhost -m setup",
+     "accounts but its own, groups, kernel modules, the log, counts of processes"},
+    {"inxi", "inxi -F -c 0",
+     "accounts, groups, modules but those of the hardware it knows, the log"},
+    {"snmpwalk, agent running", walks(standing), "accounts, groups, kernel modules, the log"},
+    {"snmpwalk, agent started",
+     agent(passing) + " & " + untilItAnswers(passing) + "; " + walks(passing) +
+         " && kill $! && { wait; true; }",
+     "accounts, groups, kernel modules, the log"},
+};
+
+std::vector<Peer> const accountPeers = {
+    {"userdbctl", "userdbctl user --json=short && userdbctl group --json=short",
+     "all but accounts and groups; failures allowed at login"},
+    {"getent", "getent passwd && getent shadow && getent group",
+     "all but accounts and groups; failures allowed at login, members by primary group"},
+};
+
+int shell(std::string const& line)
+{
+    return std::system((line + " >/dev/null 2>&1").c_str());
+}
+
+void install()
+{
+    std::string const apt = "DEBIAN_FRONTEND=noninteractive apt-get -qq ";
+    if (shell(apt + "update") != 0 ||
+        shell(apt + "install --no-install-recommends facter ansible-core inxi snmpd snmp "
+                    "systemd-userdbd") != 0)
+        throw std::runtime_error("the peers' packages cannot be installed");
+}
+
+/** snmpd, from when it answers for as long as the object lives. */
+class Agent
+{
+public:
+    Agent() : child_(fork())
+    {
+        if (child_ == 0) {
+            execl("/bin/sh", "sh", "-c", ("exec " + agent(standing)).c_str(), nullptr);
+            _exit(127);
+        }
+        if (shell("timeout 20 sh -c '" + untilItAnswers(standing) + "'") != 0)
+            throw std::runtime_error("snmpd does not answer");
+    }
+
+    ~Agent()
+    {
+        kill(child_, SIGTERM);
+        waitpid(child_, nullptr, 0);
+    }
+
+    Agent(Agent const&) = delete;
+    Agent& operator=(Agent const&) = delete;
+
+private:
+    pid_t child_;
+};
+
+struct Compared {
+    Peer const& peer;
+    Samples its = {};
+    Samples plain = {};
+    Samples fast = {};
+};
+
+std::string mihostTelling(std::string const& options, std::string const& script)
+{
+    return "printf '" + script + "' | " MIHOST_FILE " " + options + " shell";
+}
+
+/** @param script  what mihost is asked, a command a line */
+void compare(std::vector<Peer> const& peers, int users, std::string const& script, bool quick)
+{
+    madeUp::accounts(users);
+    Table table({"With " + number(users) + " users", "Its time, ms", "mihost, ms",
+                 "mihost --fast, ms", "mihost / its", "mihost --fast / its", "It leaves out"});
+    for (Peer const& peer : peers) {
+        Compared found{peer};
+        auto const run = [](std::string const& line) {
+            return timed({"/bin/sh", "-c", "{ " + line + "; } >/dev/null"}).whole;
+        };
+        run(peer.command); // what it keeps for the next time is there from now on
+        byTurns(quick ? quickRounds : rounds,
+                {[&] { found.its.push_back(run(peer.command)); },
+                 [&] { found.plain.push_back(run(mihostTelling("", script))); },
+                 [&] { found.fast.push_back(run(mihostTelling("--fast", script))); }});
+        table.add({peer.name, shown(found.its), shown(found.plain), shown(found.fast),
+                   shown(ratios(found.plain, found.its), 2),
+                   shown(ratios(found.fast, found.its), 3), peer.leavesOut});
+    }
+    table.print();
+}
+
+void measureAll(bool quick)
+{
+    Loopback const loopback;
+    enterCopy();
+    setenv("HOME", "/root", 1);
+    setenv("LC_ALL", "C.UTF-8", 1); // without which ansible does not start
+    install();
+    madeUp::modules(120);
+    madeUp::log(1000);
+    loopback.enter();
+    {
+        Agent const agent;
+        compare(factPeers, 10, "tree --all\\n", quick);
+    }
+    compare(accountPeers, 10000, "list users\\nlist groups\\n", quick);
+}
+
+} // namespace
+
+int main(int argc, char* argv[])
+{
+    return runBench(argc, argv, measureAll);
+}

@@ -1,0 +1,24 @@
+#ifndef BENCH_SUPPORT_MADEUP_H
+#define BENCH_SUPPORT_MADEUP_H
+
+#include <string>
+
+/** What a made-up machine holds, laid over the copy that this process runs in. */
+namespace madeUp
+{
+
+/**
+ * Users from 10000 on, each with a group of its own, and one group that holds all of them; beside
+ * them only root.
+ */
+void accounts(int users);
+
+/** So many loaded kernel modules, which the real lsmod and modinfo know. To be called once. */
+void modules(int count);
+
+/** A system log of so many lines. */
+void log(int lines);
+
+} // namespace madeUp
+
+#endif

@@ -1,0 +1,26 @@
+#ifndef BENCH_SUPPORT_TIMED_H
+#define BENCH_SUPPORT_TIMED_H
+
+#include <string>
+#include <vector>
+
+/** Milliseconds on a clock that is never set. */
+double millisecondsNow();
+
+/** What a program's run took, in milliseconds, and what it printed. */
+struct Timed {
+    double whole; // from its start to its end
+    double cpu;   // user and system time, its children's included
+    std::string output;
+};
+
+/** @throw std::runtime_error where it does not end with exit code 0 */
+Timed timed(std::vector<std::string> const& arguments);
+
+/** Goes into a copy of this machine. @throw std::runtime_error where none can be had */
+void enterCopy();
+
+/** A program's main: what stops the measurement goes to standard error. Takes --quick. */
+int runBench(int argc, char* argv[], void (*measure)(bool quick));
+
+#endif

@@ -122,6 +122,18 @@ Problem passwordPipeProblem(std::string const& program)
     return "passwd does not know it";
 }
 
+/** Where there is this file, UserAdd gives useradd an option that newer ones do not have. */
+std::vector<Need> groupOption()
+{
+    if (!isThere("/etc/redhat-release"))
+        return {};
+    std::string const said = commandTap::outputOf("LC_ALL=C /usr/sbin/useradd -n 2>&1");
+    bool const isUnknown = said.find("invalid option") != std::string::npos;
+    return {{"useradd -n", isUnknown ? Problem("useradd does not know it") : std::nullopt,
+             "the method UserAdd", "none: it is not asked for there",
+             "none: add accounts with useradd itself"}};
+}
+
 // Surroundings.
 
 std::vector<Need> surroundings()
@@ -269,7 +281,8 @@ std::vector<Need> log()
 std::vector<Need> diagnose()
 {
     std::vector<Need> all;
-    for (auto const part : {surroundings, commandLines, accounts, release, modules, log})
+    for (auto const part :
+         {surroundings, commandLines, groupOption, accounts, release, modules, log})
         for (Need const& need : part())
             all.push_back(need);
     return all;

@@ -2,12 +2,15 @@
 
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/Say.h"
+#include "mihost/cli/Terminal.h"
+#include "mihost/cli/TextTable.h"
 #include "mihost/cli/Words.h"
 #include "mihost/runtime/Text.h"
 
 #include <algorithm>
 #include <cwchar>
 #include <fcntl.h>
+#include <fmt/format.h>
 #include <unistd.h>
 #include <utility>
 
@@ -111,10 +114,7 @@ unsigned char LineEditor::offer(std::vector<std::string> const& candidates,
         el_insertstr(editor_.get(), rest.c_str());
         return CC_REFRESH;
     }
-    say("\n");
-    for (std::string const& candidate : candidates)
-        say(candidate + "  ");
-    say("\n");
+    say("\n" + inColumns(candidates, terminal::width(STDERR_FILENO)));
     return CC_REDISPLAY;
 }
 
@@ -147,6 +147,26 @@ void LineEditor::remember(std::string const& line)
 {
     HistEvent event;
     history(history_.get(), &event, H_ENTER, line.c_str());
+}
+
+std::string inColumns(std::vector<std::string> const& words, std::size_t width)
+{
+    constexpr std::size_t most = 200;
+    constexpr std::size_t gap = 2;
+    std::size_t widest = 0;
+    std::size_t const count = std::min(words.size(), most);
+    for (std::size_t at = 0; at < count; ++at)
+        widest = std::max(widest, displayWidth(words[at]) + gap);
+    std::size_t const columns = std::max<std::size_t>(width / widest, 1);
+    std::string text;
+    for (std::size_t at = 0; at < count; ++at) {
+        bool const isLast = at + 1 == count || at % columns + 1 == columns;
+        text += words[at];
+        text += isLast ? "\n" : std::string(widest - displayWidth(words[at]), ' ');
+    }
+    if (words.size() > most)
+        text += fmt::format("and {} more\n", words.size() - most);
+    return text;
 }
 
 std::string commonStart(std::vector<std::string> const& candidates)

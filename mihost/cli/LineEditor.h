@@ -72,6 +72,9 @@ private:
     std::unique_ptr<EditLine, EndEditor> editor_;
 };
 
+/** Words side by side, with line ends; of very many only the first, and how many there are more. */
+std::string inColumns(std::vector<std::string> const& words, std::size_t width);
+
 /** What all candidates begin with. */
 std::string commonStart(std::vector<std::string> const& candidates);
 

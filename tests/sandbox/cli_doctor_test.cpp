@@ -35,6 +35,7 @@ protected:
         machine::write("/etc/pam.d/login", "auth required pam_unix.so\n");
         machine::write("/var/log/messages", "Jan  2 03:04:05 host x: y\n");
         machine::fake("/usr/bin/passwd", "echo '  --stdin  read it from a pipe'\n");
+        machine::fake("/usr/sbin/useradd", "echo 'Usage: useradd'\n");
         for (char const* program : {"/usr/sbin/lsmod", "/usr/sbin/modinfo", "/sbin/shutdown"})
             machine::fake(program, "");
         std::filesystem::remove_all("/proc/modules");
@@ -149,6 +150,15 @@ TEST_F(Doctor, MissesAPasswdThatTakesPasswordsFromAPipe)
     machine::fake("/usr/bin/passwd", "echo 'nothing of the kind'\n");
     expectMissing("passwd --stdin", "passwd does not know it",
                   "Password in methods: what is stored opens nothing");
+}
+
+TEST_F(Doctor, MissesAUseraddThatKnowsTheOptionOfItsFamily)
+{
+    machine::fake("/usr/sbin/useradd",
+                  "[ \"$*\" = -n ] && echo \"useradd: invalid option -- 'n'\"\n");
+    expectMissing("useradd -n", "useradd does not know it", "the method UserAdd");
+    machine::remove("/etc/redhat-release");
+    EXPECT_EQ(need("useradd -n"), nullptr);
 }
 
 TEST_F(Doctor, MissesALocale)

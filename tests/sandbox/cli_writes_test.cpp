@@ -109,6 +109,36 @@ TEST(MihostPasswords, ThatStandInTheShadowFileAsTheyAreAreWarnedOf)
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1).substr(0, 3), "$6$");
 }
 
+TEST(MihostSecrets, AreHiddenWhereverTheyCouldShowAndShownWhenTold)
+{
+    makeMachine();
+    ASSERT_EQ(std::system(("usermod -p '" + std::string(hash) + "' jdoe").c_str()), 0);
+    std::string const script = "call UserAdd UserName=new Password=geheim42\n";
+    for (Lines const& arguments :
+         {Lines{"tree", "--all"}, Lines{"--json", "tree"}, Lines{"--json", "list", "users"},
+          Lines{"get", "user:jdoe"}, Lines{"--json", "get", "user:jdoe", "117"},
+          Lines{"list", "users", "--columns", "user-name,password"}}) {
+        Outcome const hidden = mihostRun(arguments);
+        EXPECT_FALSE(stands(hidden.out, hash)) << arguments[0];
+        EXPECT_TRUE(stands(hidden.out, "hidden")) << arguments[0];
+        Lines told = arguments;
+        told.emplace_back("--show-secrets");
+        EXPECT_TRUE(stands(mihostRun(told).out, hash)) << arguments[0];
+    }
+    EXPECT_EQ(Json::parse(mihostRun({"--json", "get", "user:jdoe", "117"}).out)["properties"]["117"]
+                  .dump(),
+              R"({"name":"password","kind":"text","flag":true,"value":null,"hidden":true})");
+    // The node keeps the text of the last call.
+    Outcome const kept = mihostRun({"shell"}, script + "get os 74\n--show-secrets get os 74\n");
+    Lines lines;
+    std::istringstream stream(kept.out);
+    for (std::string line; std::getline(stream, line);)
+        lines.push_back(line);
+    ASSERT_EQ(lines.size(), 2U) << kept.out << kept.err;
+    EXPECT_EQ(lines[0], " 74 create-user  (hidden)");
+    EXPECT_EQ(lines[1], lines[0]); // a plain password never shows
+}
+
 TEST(MihostPasswords, AreRefusedWhereStandardInputHoldsNone)
 {
     makeMachine();

@@ -10,25 +10,26 @@ void OsSwMI::createOsSwNodes()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
     nodeIds_->push_back(miId_);
-    osSwNode_ = new MutableNode(miId_, 0, miIds_, NODES::osSwType, 0);
-    adopt(osSwNode_, "OsSw Management Interface");
+    osSwNode_ = adopt(std::make_unique<MutableNode>(miId_, 0, miIds_, NODES::osSwType, 0),
+                      "OsSw Management Interface");
 }
 
 void OsSwMI::createRootNode()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
-    rootNode_ = new MutableNode(nodeId, miId_, miIds_, NODES::rootType, 0);
     nodeIds_->push_back(miId_); // kept: the interface's own id stands in the list twice
-    adopt(rootNode_, "ROOT Node");
+    rootNode_ = adopt(std::make_unique<MutableNode>(nodeId, miId_, miIds_, NODES::rootType, 0),
+                      "ROOT Node");
 }
 
 void OsSwMI::createComputerNodes()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
-    computerNode_ = new MutableNode(nodeId, rootNode_->getNodeId(), miIds_, NODES::computerType, 0);
-    adopt(computerNode_, "Computer");
+    computerNode_ = adopt(std::make_unique<MutableNode>(nodeId, rootNode_->getNodeId(), miIds_,
+                                                        NODES::computerType, 0),
+                          "Computer");
     std::string name;
     if (NQ::ComputerInfo::getComputerName(name))
         computerNode_->setProperty(NODES::name, NODES::text(name));

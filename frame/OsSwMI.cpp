@@ -32,7 +32,9 @@ Error OsSwMI::initialize(unsigned int first, Number const& second, Number const&
 void OsSwMI::unload()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
-    ManagementInterface::unload();
+    ManagementInterface::unload(); // deletes the nodes: a later life must not take others for them
+    for (std::vector<Node*>* kind : {&logEntryNodes_, &groupNodes_, &userNodes_})
+        kind->clear();
     delete nodeIds_;
     nodeIds_ = nullptr;
 }
@@ -53,12 +55,16 @@ unsigned int OsSwMI::takeNodeId(bool note)
     return nextNodeId_++;
 }
 
-void OsSwMI::adopt(MutableNode* node, std::string const& description)
+MutableNode* OsSwMI::adopt(std::unique_ptr<MutableNode> node, std::string const& description,
+                           std::vector<Node*>* kin)
 {
-    currentNode_ = node;
-    nodes_.push_back(node);
-    node->setStatus(NODES::statusOk);
-    node->setDescription(description);
+    nodes_.push_back(node.get()); // may fail for want of memory
+    currentNode_ = node.release();
+    if (kin)
+        kin->push_back(currentNode_);
+    currentNode_->setStatus(NODES::statusOk);
+    currentNode_->setDescription(description);
+    return currentNode_;
 }
 
 void OsSwMI::dropNodes(std::vector<Node*>& nodes, bool refresh, char const* announcement,

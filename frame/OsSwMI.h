@@ -7,6 +7,7 @@
 #include "util/internal.h"
 #include "util/log.h"
 
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -67,8 +68,15 @@ private:
     /** Takes the next node id; at start-up it is also noted in the node-id list. */
     MI_INTERNAL unsigned int takeNodeId(bool note = true);
 
-    /** Makes a freshly made node the current one and hands it to the framework. */
-    MI_INTERNAL void adopt(MutableNode* node, std::string const& description);
+    /**
+     * Makes a freshly made node the current one and hands it to the framework.
+     *
+     * @param kin  gets it, too; has room for it
+     * @return the node, the framework's from here on
+     */
+    MI_INTERNAL MutableNode* adopt(std::unique_ptr<MutableNode> node,
+                                   std::string const& description,
+                                   std::vector<Node*>* kin = nullptr);
 
     /**
      * Empties a list of user or group nodes; on a refresh each node is announced in the log and

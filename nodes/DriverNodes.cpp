@@ -14,9 +14,10 @@ void OsSwMI::createDriverNodes()
     unsigned int index = 0;
     for (NQ::driverInfo const& driver : drivers) {
         unsigned int const nodeId = takeNodeId();
-        auto* node =
-            new MutableNode(nodeId, osNode_->getNodeId(), miIds_, NODES::driverType, ++index);
-        adopt(node, driver.getDescription());
+        MutableNode* const node =
+            adopt(std::make_unique<MutableNode>(nodeId, osNode_->getNodeId(), miIds_,
+                                                NODES::driverType, ++index),
+                  driver.getDescription());
         NODES::setProperties(*node, {{NODES::version, NODES::text(driver.getVersion())},
                                      {NODES::name, NODES::text(driver.getName())},
                                      {NODES::buildNumber, NODES::text(driver.getBuildNumber())},

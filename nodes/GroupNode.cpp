@@ -43,13 +43,14 @@ void OsSwMI::createGroupNodes(bool refresh)
     NQ::getGroupInfo(groups);
     auto const count = static_cast<unsigned int>(groups.size());
     NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("groups.size() = ", count));
+    groupNodes_.reserve(count);
     unsigned int position = 0;
     for (groupInfo& group : groups) {
         unsigned int const nodeId = takeNodeId(!refresh);
-        auto* const node =
-            new GroupNode(nodeId, osNode_->getNodeId(), miIds_, NODES::groupType, ++position);
-        groupNodes_.push_back(node);
-        adopt(node, "Group");
+        MutableNode* const node =
+            adopt(std::make_unique<GroupNode>(nodeId, osNode_->getNodeId(), miIds_,
+                                              NODES::groupType, ++position),
+                  "Group", &groupNodes_);
         std::string const name = group.getGroupName();
         unsigned int const id = group.getGroupId();
         NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("Name = ", name));

@@ -72,12 +72,13 @@ void OsSwMI::createLogEntryNodes(bool refresh)
         logEntryNodes_.clear();
     }
     unsigned int const count = std::min(NQ::logInfo().getMaxLine(), maxEntries);
+    logEntryNodes_.reserve(logEntryNodes_.size() + count);
     for (unsigned int index = 1; index <= count; ++index) {
         unsigned int const nodeId = takeNodeId();
-        auto* node =
-            new LogEntryNode(nodeId, logNode_->getNodeId(), miIds_, NODES::logEntryType, index);
-        logEntryNodes_.push_back(node);
-        adopt(node, "OS LogEntry");
+        MutableNode* const node =
+            adopt(std::make_unique<LogEntryNode>(nodeId, logNode_->getNodeId(), miIds_,
+                                                 NODES::logEntryType, index),
+                  "OS LogEntry", &logEntryNodes_);
         node->setProperty(NODES::id, NODES::number(index));
         PropertyValue value = NODES::emptyValue();
         for (unsigned int const id : {NODES::message, NODES::creationTime})

@@ -9,8 +9,9 @@ void OsSwMI::createLogNodes()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
-    logNode_ = new MutableNode(nodeId, osNode_->getNodeId(), miIds_, NODES::logType, 0);
-    adopt(logNode_, "OS Log");
+    logNode_ = adopt(
+        std::make_unique<MutableNode>(nodeId, osNode_->getNodeId(), miIds_, NODES::logType, 0),
+        "OS Log");
     NODES::setProperties(*logNode_, {{NODES::requestedState, NODES::enumeration(1)},
                                      {NODES::fixedNumbers, NODES::fixedNumberList()},
                                      {NODES::logNumber, NODES::number(0)},

@@ -121,8 +121,9 @@ void OsSwMI::createOsNodes()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
-    osNode_ = new OsNode(nodeId, computerNode_->getNodeId(), miIds_, NODES::operatingSystemType, 0);
-    adopt(osNode_, "Operating System");
+    osNode_ = adopt(std::make_unique<OsNode>(nodeId, computerNode_->getNodeId(), miIds_,
+                                             NODES::operatingSystemType, 0),
+                    "Operating System");
     NODES::setProperties(
         *osNode_, {{NODES::fixedEnumeration, {EnumValue(static_cast<unsigned short>(35)), true}},
                    {NODES::requestedState, {EnumValue(1U), false}}, // the only false flag

@@ -167,19 +167,19 @@ void OsSwMI::createUserNodes(bool refresh)
     dropNodes(userNodes_, refresh, "Delete a user entry: ", __func__);
     std::vector<userInfo> users;
     NQ::getUserInfo(users);
+    userNodes_.reserve(users.size());
     unsigned int position = 0;
     for (userInfo& user : users) {
         unsigned int const nodeId = takeNodeId(!refresh);
-        auto* const node =
-            new UserNode(nodeId, osNode_->getNodeId(), miIds_, NODES::userType, ++position);
-        userNodes_.push_back(node);
+        auto node = std::make_unique<UserNode>(nodeId, osNode_->getNodeId(), miIds_,
+                                               NODES::userType, ++position);
         {
             BuilderWrites const ours;
-            adopt(node, "User Account");
-            setUserProperties(*node, user, users.size());
+            adopt(std::move(node), "User Account", &userNodes_);
+            setUserProperties(*currentNode_, user, users.size());
         }
         if (refresh)
-            publishNode(node);
+            publishNode(currentNode_);
     }
 }
 

@@ -434,6 +434,15 @@ TEST_F(LogNodes, AreAllMadeThoughTheHostRefusesThem)
     EXPECT_EQ(recording.texts(6000), Texts(2, "addNewNode error = status 1: no room"));
 }
 
+TEST_F(LogNodes, OfAnEarlierLifeAreForgottenWithIt)
+{
+    haveLines(2);
+    build();
+    frame.unload();
+    EXPECT_TRUE(frame.logEntryNodes_.empty());
+    EXPECT_TRUE(frame.deleted.empty());
+}
+
 TEST_F(LogNodes, AreNotDeletedWithoutARefresh)
 {
     haveLines(2);

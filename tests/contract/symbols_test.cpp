@@ -74,7 +74,7 @@ std::string wanted()
 TEST(Library, StartsNoThread)
 {
     std::string const names = wanted();
-    ASSERT_NE(names.find(" popen@"), std::string::npos);
+    ASSERT_NE(names.find(" popen"), std::string::npos);
     for (char const* name : {"pthread_create", "thrd_create", "_M_start_thread", " clone", " fork"})
         EXPECT_EQ(names.find(name), std::string::npos) << name;
 }
@@ -82,7 +82,7 @@ TEST(Library, StartsNoThread)
 TEST(Library, ThrowsNothingOfItsOwn)
 {
     std::string const names = wanted();
-    ASSERT_NE(names.find(" popen@"), std::string::npos);
+    ASSERT_NE(names.find(" popen"), std::string::npos);
     EXPECT_EQ(names.find("__cxa_throw"), std::string::npos);
 }
 

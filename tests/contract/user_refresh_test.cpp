@@ -2,6 +2,7 @@
 // with the thread sanitizer.
 
 #include "nodes/ids.h"
+#include "tests/support/ErrorCount.h"
 #include "tests/support/Libc.h"
 #include "tests/support/LiveNodes.h"
 #include "tests/support/Plugin.h"
@@ -23,28 +24,6 @@ namespace
 constexpr unsigned int userCount = 4; // on the fixture machine
 constexpr unsigned int groupCount = 4;
 constexpr unsigned int refreshesEach = 25;
-
-/** Counts the errors that are logged; all else costs as little as it can. */
-class ErrorCount : public mihost::LogSink
-{
-public:
-    ErrorCount()
-    {
-        mihost::setLogSink(this);
-    }
-    ~ErrorCount() override
-    {
-        mihost::setLogSink(nullptr);
-    }
-
-    void write(mihost::LogMessage const& message) override
-    {
-        if (message.level >= 6000)
-            ++errors;
-    }
-
-    std::atomic<unsigned int> errors{0};
-};
 
 /** A plug-in on a machine with users and groups; its commands cannot be started. */
 class ConcurrentRefresh : public testing::Test

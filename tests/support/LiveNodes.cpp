@@ -46,6 +46,22 @@ bool LiveNodes::use(unsigned int type, std::function<void(IC::MutableNode const&
     return false;
 }
 
+void LiveNodes::useEach(std::function<void(IC::MutableNode const& node)> const& with)
+{
+    std::unique_lock held(lock_);
+    Nodes const known = nodes_;
+    held.unlock();
+    for (auto const& [node, inUse] : known) {
+        std::lock_guard const used(*inUse);
+        held.lock();
+        auto const found = nodes_.find(node);
+        bool const lives = found != nodes_.end() && found->second == inUse;
+        held.unlock();
+        if (lives)
+            with(*node);
+    }
+}
+
 std::vector<IC::MutableNode const*> LiveNodes::ofType(unsigned int type) const
 {
     std::lock_guard const held(lock_);

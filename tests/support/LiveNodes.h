@@ -28,10 +28,16 @@ public:
     /** Uses some node of the type that nobody else is using; false where there is none now. */
     bool use(unsigned int type, std::function<void(IC::MutableNode const& node)> const& with);
 
+    /** Uses all nodes that are alive, one after the other; waits for those that others are using.
+     */
+    void useEach(std::function<void(IC::MutableNode const& node)> const& with);
+
     std::vector<IC::MutableNode const*> ofType(unsigned int type) const;
 
 private:
-    std::map<IC::MutableNode const*, std::shared_ptr<std::mutex>> nodes_;
+    using Nodes = std::map<IC::MutableNode const*, std::shared_ptr<std::mutex>>;
+
+    Nodes nodes_;
     mutable std::mutex lock_;
 };
 

@@ -1,0 +1,140 @@
+// A busy host: threads that read whatever the tree holds while one refreshes it and another
+// administers the machine. script/concurrency lets it run for minutes; says most when it is built
+// with the thread sanitizer.
+
+#include "nodes/ids.h"
+#include "tests/support/ErrorCount.h"
+#include "tests/support/Libc.h"
+#include "tests/support/LiveNodes.h"
+#include "tests/support/Plugin.h"
+
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <chrono>
+#include <cstdlib>
+#include <cstring>
+#include <ctime>
+#include <iostream>
+#include <thread>
+#include <vector>
+
+namespace
+{
+
+constexpr unsigned int writesEach = 20;
+constexpr unsigned int readers = 3;
+
+/** What the machine's commands print; unlike FakeCommands it keeps no notes that threads share. */
+char const* outputOf(char const* command)
+{
+    struct Answer {
+        char const* beginning;
+        char const* output;
+    };
+    static constexpr Answer answers[] = {
+        {"lsmod", "Module Size Used by\nloop 1 0\n"},
+        {"modinfo ", "description: Loopback\nversion: 1.0\n"},
+        {"wc ", "2 /var/log/messages\n"},
+        {"sed ", "Nov  1 10:00:00 host daemon: a line\n"},
+        {"date", "Sat Nov 21 10:00:00 UTC 2026\n"},
+        {"stat ", "Change: 2010-05-12 10:23:45.000000000 +0200\n"},
+    };
+    for (auto const& [beginning, output] : answers)
+        if (std::strncmp(command, beginning, std::strlen(beginning)) == 0)
+            return output;
+    return ""; // what tools print that succeed
+}
+
+FILE* answer(char const* command, char const*)
+{
+    char const* const output = outputOf(command);
+    FILE* const stream = std::tmpfile();
+    std::fputs(output, stream);
+    std::rewind(stream);
+    return stream;
+}
+
+/** From which on writers stop: after so many writes or, if asked for, so many seconds. */
+class Duration
+{
+public:
+    bool goesOn(unsigned int writes) const
+    {
+        return seconds_ ? std::chrono::steady_clock::now() < end_ : writes < writesEach;
+    }
+
+private:
+    char const* const seconds_ = std::getenv("MI_CONCURRENCY_SECONDS");
+    std::chrono::steady_clock::time_point const end_ =
+        std::chrono::steady_clock::now() + std::chrono::seconds(seconds_ ? std::atoi(seconds_) : 0);
+};
+
+class ConcurrentHost : public testing::Test
+{
+protected:
+    ConcurrentHost()
+    {
+        // Without it libc looks its zone up again and again, under a lock that the sanitizer
+        // cannot see.
+        setenv("TZ", "UTC0", 1);
+        tzset();
+        libc::hooks().popen = answer;
+        libc::hooks().pclose = [](FILE* stream) { return std::fclose(stream); };
+        plugin.initialize();
+    }
+
+    libc::HookGuard const guard;
+    libc::FileRoot const root{MACHINES_DIR "/users-and-groups"};
+    Plugin plugin;
+};
+
+TEST_F(ConcurrentHost, ReadsEveryNodeWhileOneThreadRefreshesAndAnotherAddsGroups)
+{
+    IC::MutableNode& os = plugin.node(NODES::operatingSystemType);
+    std::size_t const nodeCount = plugin.nodes().size();
+    ErrorCount const log;
+    LiveNodes live(plugin.nodes());
+    Duration const duration;
+    std::atomic<unsigned int> writers{2};
+    std::atomic<unsigned int> wrong{0};
+    std::atomic<unsigned long> writes{0};
+    std::atomic<unsigned long> reads{0};
+
+    auto const write = [&](unsigned int id, IC::PropertyValue const& value) {
+        for (unsigned int done = 0; duration.goesOn(done); ++done) {
+            wrong += os.setProperty(id, value).getStatus();
+            ++writes;
+        }
+        --writers;
+    };
+    auto const readAll = [&](IC::MutableNode const& node) {
+        wrong += node.getDescription().empty() ? 1 : 0;
+        for (auto const& entry : node.getProperties()) {
+            IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
+            wrong += node.getProperty(entry.first, value).getStatus();
+            ++reads;
+        }
+    };
+    std::vector<std::thread> threads;
+    threads.emplace_back(write, NODES::refresh, IC::PropertyValue(IC::Number(0U), true));
+    threads.emplace_back(write, NODES::createUser,
+                         IC::PropertyValue("LocalGroupAdd,GroupName:CMPI_string:staff", true));
+    for (unsigned int i = 0; i < readers; ++i)
+        threads.emplace_back([&] {
+            do
+                live.useEach(readAll);
+            while (writers > 0);
+        });
+    for (std::thread& thread : threads)
+        thread.join();
+
+    EXPECT_EQ(wrong, 0U);
+    EXPECT_EQ(log.errors, 0U);
+    EXPECT_GE(writes, 2UL);
+    EXPECT_GE(reads, readers * nodeCount);
+    EXPECT_EQ(plugin.nodes().size(), nodeCount);
+    std::cout << reads << " reads, " << writes << " writes\n";
+}
+
+} // namespace

@@ -1,0 +1,30 @@
+#ifndef TESTS_SUPPORT_ERRORCOUNT_H
+#define TESTS_SUPPORT_ERRORCOUNT_H
+
+#include "mihost/runtime/Runtime.h"
+
+#include <atomic>
+
+/** Counts the errors that are logged; all else costs as little as it can. */
+class ErrorCount : public mihost::LogSink
+{
+public:
+    ErrorCount()
+    {
+        mihost::setLogSink(this);
+    }
+    ~ErrorCount() override
+    {
+        mihost::setLogSink(nullptr);
+    }
+
+    void write(mihost::LogMessage const& message) override
+    {
+        if (message.level >= 6000)
+            ++errors;
+    }
+
+    std::atomic<unsigned int> errors{0};
+};
+
+#endif

@@ -4,6 +4,7 @@
 #include "mihost/runtime/Text.h"
 
 #include <cerrno>
+#include <utility>
 
 namespace mihost
 {
@@ -45,12 +46,21 @@ JsonLines::JsonLines(LineWriter& out, KindName kindName) : out_(out), kindName_(
 
 void JsonLines::write(LogMessage const& message)
 {
-    bool const trace = message.operation == LogMessage::Operation::Trace;
-    out_.write(std::string("{\"op\":") + (trace ? "\"trace\"" : "\"log\"") + ",\"function\":" +
-               jsonString(message.function) + ",\"file\":" + jsonString(message.file) +
-               ",\"line\":" + std::to_string(message.line) + ",\"category\":" +
-               jsonString(message.category) + ",\"level\":" + std::to_string(message.level) +
-               ",\"message\":" + jsonString(message.text) + "}");
+    constexpr std::size_t mostLines = 255; // fit
+    std::string line;
+    line.reserve(mostLines);
+    line +=
+        message.operation == LogMessage::Operation::Trace ? "{\"op\":\"trace\"" : "{\"op\":\"log\"";
+    line += ",\"function\":";
+    appendJsonString(line, message.function);
+    line += ",\"file\":";
+    appendJsonString(line, message.file);
+    line += ",\"line\":" + std::to_string(message.line) + ",\"category\":";
+    appendJsonString(line, message.category);
+    line += ",\"level\":" + std::to_string(message.level) + ",\"message\":";
+    appendJsonString(line, message.text);
+    line += '}';
+    out_.write(std::move(line));
 }
 
 void JsonLines::nodeAdded(IC::Node const& node)

@@ -70,11 +70,27 @@ bool isCharacter(char32_t character, char32_t smallest)
     return character >= smallest && character <= 0x10FFFF && !surrogate;
 }
 
+/** Printable ASCII, which nobody here rewrites. */
+bool isPlain(char byte)
+{
+    return byte >= 0x20 && byte < 0x7F;
+}
+
+/** Moves the run that a text begins with to the end of another. */
+template <class Belongs>
+void moveRun(std::string_view& from, std::string& to, Belongs const& belongs)
+{
+    auto const end = std::find_if_not(from.begin(), from.end(), belongs);
+    auto const length = static_cast<std::size_t>(end - from.begin());
+    to.append(from.substr(0, length));
+    from.remove_prefix(length);
+}
+
 template <class MustEscape> std::string rewritten(std::string_view text, MustEscape mustEscape)
 {
     std::string result;
     result.reserve(text.size());
-    while (!text.empty()) {
+    for (moveRun(text, result, isPlain); !text.empty(); moveRun(text, result, isPlain)) {
         Utf8Piece const piece = firstPiece(text);
         if (!piece.valid)
             result += hexByte(static_cast<unsigned char>(text[0]));
@@ -128,22 +144,33 @@ std::string printable(std::string_view text)
 
 std::string jsonString(std::string_view text)
 {
-    std::string quoted = "\"";
-    for (char const byte : validUtf8(text)) {
-        auto const code = static_cast<unsigned char>(byte);
-        if (byte == '"' || byte == '\\') {
-            quoted += '\\';
-            quoted += byte;
-        } else if (code < 0x20) {
-            quoted += "\\u00";
-            quoted += hexDigits[code >> 4];
-            quoted += hexDigits[code & 0xF];
-        } else {
-            quoted += byte;
-        }
-    }
-    quoted += '"';
+    std::string quoted;
+    appendJsonString(quoted, text);
     return quoted;
+}
+
+void appendJsonString(std::string& to, std::string_view text)
+{
+    bool const plain = std::all_of(text.begin(), text.end(), isPlain);
+    std::string const valid = plain ? std::string() : validUtf8(text);
+    std::string_view rest = plain ? text : valid;
+    auto const standsAsItIs = [](char byte) {
+        return byte != '"' && byte != '\\' && static_cast<unsigned char>(byte) >= 0x20;
+    };
+    to += '"';
+    for (moveRun(rest, to, standsAsItIs); !rest.empty(); moveRun(rest, to, standsAsItIs)) {
+        auto const code = static_cast<unsigned char>(rest.front());
+        if (code >= 0x20) {
+            to += '\\';
+            to += rest.front();
+        } else {
+            to += "\\u00";
+            to += hexDigits[code >> 4];
+            to += hexDigits[code & 0xF];
+        }
+        rest.remove_prefix(1);
+    }
+    to += '"';
 }
 
 } // namespace mihost

@@ -33,6 +33,9 @@ std::string printable(std::string_view text);
 /** The text as a JSON string, quotes included. */
 std::string jsonString(std::string_view text);
 
+/** As jsonString, at the end of a text. */
+void appendJsonString(std::string& to, std::string_view text);
+
 } // namespace mihost
 
 #endif

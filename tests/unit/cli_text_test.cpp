@@ -67,4 +67,19 @@ TEST(JsonString, ReadsBackAsTheTextWhateverBytesItHolds)
     EXPECT_EQ(nlohmann::json::parse(jsonString(all)).get<std::string>(), validUtf8(all));
 }
 
+TEST(JsonString, EscapesWhatStandsBetweenPlainRunsAndAtTheEnds)
+{
+    EXPECT_EQ(jsonString(""), "\"\"");
+    EXPECT_EQ(jsonString("plain ~"), "\"plain ~\"");
+    EXPECT_EQ(jsonString("\"a\\b\nc\x1f"), "\"\\\"a\\\\b\\u000ac\\u001f\"");
+    EXPECT_EQ(jsonString("\x7f\xC3\xA4\xFFz"), "\"\x7f\xC3\xA4\\\\xffz\"");
+}
+
+TEST(JsonString, IsAppendedBehindWhatStandsThere)
+{
+    std::string text = "\"key\":";
+    mihost::appendJsonString(text, "a\tb");
+    EXPECT_EQ(text, "\"key\":\"a\\u0009b\"");
+}
+
 } // namespace

@@ -51,6 +51,13 @@ bool realGetUserCount(unsigned int& out)
     return real(&info, out);
 }
 
+bool realGetInstallDate(long& out)
+{
+    static auto* const real = next<bool(NQ::OsInfo*, long&)>("_ZN2NQ6OsInfo14getInstallDateERl");
+    NQ::OsInfo info;
+    return real(&info, out);
+}
+
 namespace NQ
 {
 

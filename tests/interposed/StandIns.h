@@ -33,4 +33,7 @@ StandIns& standIns();
 /** Counts the accounts with the real getter. */
 bool realGetUserCount(unsigned int& out);
 
+/** Finds the install date with the real getter. */
+bool realGetInstallDate(long& out);
+
 #endif

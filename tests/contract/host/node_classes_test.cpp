@@ -183,6 +183,16 @@ TEST_F(CommandWrites, AnswerWhatTheStoreAnswersWhetherTheActionWorkedOrNot)
     EXPECT_EQ(commands.ran, Lines{"/sbin/shutdown -h now"}); // which could not be started
 }
 
+TEST_F(CommandWrites, TakeNoLockWhereTheyRebuildNothing)
+{
+    host.events.clear();
+    for (unsigned int const id : {123U, 191U, 75U, 108U})
+        os->setProperty(id, IC::PropertyValue(IC::Number(5U), true));
+    os->setProperty(74, IC::PropertyValue("NoSuchMethod", true));
+    for (std::string const& event : host.events)
+        EXPECT_EQ(event.find("lock("), std::string::npos) << event;
+}
+
 class GroupNodeWrites : public Loaded
 {
 };

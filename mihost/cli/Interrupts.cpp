@@ -136,36 +136,42 @@ Held::~Held()
     sigprocmask(SIG_SETMASK, &before_, nullptr);
 }
 
-Noted::Noted()
+Noted::Noted(std::vector<int> const& others)
 {
+    std::vector<int> signals = others;
+    signals.push_back(SIGINT);
     sigset_t set;
     sigemptyset(&set);
-    sigaddset(&set, SIGINT);
-    sigaddset(&set, SIGWINCH);
+    for (int const signal : signals)
+        sigaddset(&set, signal);
     sigprocmask(SIG_BLOCK, &set, &before_);
     noted = 0;
-    sigaction(SIGINT, nullptr, &interruptBefore_);
-    if (!isIgnored(SIGINT))
-        setHandler(SIGINT, note, 0);
-    sigaction(SIGWINCH, nullptr, &resizeBefore_);
-    setHandler(SIGWINCH, note, 0);
+    for (int const signal : signals) {
+        struct sigaction before {
+        };
+        sigaction(signal, nullptr, &before);
+        actionsBefore_.emplace_back(signal, before);
+        if (before.sa_handler != SIG_IGN)
+            setHandler(signal, note, 0);
+    }
 }
 
 Noted::~Noted()
 {
-    sigaction(SIGINT, &interruptBefore_, nullptr);
-    sigaction(SIGWINCH, &resizeBefore_, nullptr);
+    for (auto const& [signal, before] : actionsBefore_)
+        sigaction(signal, &before, nullptr);
     sigprocmask(SIG_SETMASK, &before_, nullptr);
 }
 
-Noted::Event Noted::wait(pollfd file, double seconds) const
+Noted::Event Noted::wait(pollfd file, double seconds)
 {
     double whole = 0;
     double const rest = std::modf(std::max(seconds, 0.0), &whole);
     timespec const time{static_cast<time_t>(whole), static_cast<long>(rest * 1e9)};
     int const ready = ppoll(&file, 1, seconds < 0 ? nullptr : &time, &before_);
-    if (int const signal = std::exchange(noted, 0); signal != 0)
-        return signal == SIGINT ? Event::Interrupt : Event::Resize;
+    signal_ = std::exchange(noted, 0);
+    if (signal_ != 0)
+        return Event::Signal;
     return ready > 0 ? Event::Ready : Event::Timeout;
 }
 

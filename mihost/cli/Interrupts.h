@@ -4,6 +4,8 @@
 #include <csignal>
 #include <poll.h>
 #include <termios.h>
+#include <utility>
+#include <vector>
 
 /**
  * What happens on Ctrl-C and its kin. By default the program tidies up and ends as the signal would
@@ -43,31 +45,35 @@ private:
 };
 
 /**
- * For as long as it lives, SIGINT ends nothing, and neither it nor SIGWINCH comes but in wait: so
+ * For as long as it lives, SIGINT and the other signals named do nothing and come only in wait: so
  * none slips in between asking whether it came and waiting for it.
  */
 class Noted
 {
 public:
-    Noted();
+    explicit Noted(std::vector<int> const& others = {});
     ~Noted();
     Noted(Noted const&) = delete;
     Noted& operator=(Noted const&) = delete;
 
-    enum class Event { Ready, Interrupt, Resize, Timeout };
+    enum class Event { Ready, Timeout, Signal };
 
     /**
      * @param file     what poll is to look at; ready also where it has something unasked to tell
      * @param seconds  how long; negative for ever
      */
-    Event wait(pollfd file, double seconds) const;
+    Event wait(pollfd file, double seconds);
+
+    /** The one that the last wait ended by. */
+    int signal() const
+    {
+        return signal_;
+    }
 
 private:
     sigset_t before_;
-    struct sigaction interruptBefore_ {
-    };
-    struct sigaction resizeBefore_ {
-    };
+    std::vector<std::pair<int, struct sigaction>> actionsBefore_;
+    int signal_ = 0;
 };
 
 } // namespace mihost::interrupts

@@ -5,9 +5,10 @@
 #include "mihost/cli/Terminal.h"
 #include "mihost/cli/TextTable.h"
 #include "mihost/cli/Words.h"
-#include "mihost/runtime/Text.h"
+#include "mihost/sandbox/Sandbox.h"
 
 #include <algorithm>
+#include <csignal>
 #include <cwchar>
 #include <fcntl.h>
 #include <fmt/format.h>
@@ -73,9 +74,8 @@ int LineEditor::getCharacter(EditLine* editor, wchar_t* character)
     std::mbstate_t state{};
     for (;;) {
         auto const event = self.signals_->wait({STDIN_FILENO, POLLIN, 0}, -1);
-        if (event == interrupts::Noted::Event::Resize)
-            el_resize(editor);
-        self.interrupted_ = event == interrupts::Noted::Event::Interrupt;
+        if (event == interrupts::Noted::Event::Signal)
+            self.obey(self.signals_->signal());
         if (self.interrupted_)
             return -1;
         if (event != interrupts::Noted::Event::Ready)
@@ -91,6 +91,23 @@ int LineEditor::getCharacter(EditLine* editor, wchar_t* character)
             *character = static_cast<unsigned char>(byte);
         return 1;
     }
+}
+
+void LineEditor::obey(int signal)
+{
+    interrupted_ = signal == SIGINT;
+    if (signal == SIGWINCH)
+        el_resize(editor_.get());
+    if (signal != SIGTSTP)
+        return;
+    // Stopped, the terminal is somebody else's; afterwards the line is to be seen again. From
+    // inside the sandbox, whose outer process stops as well, it is perhaps somebody else's already.
+    if (!inSandbox())
+        el_set(editor_.get(), EL_PREP_TERM, 0);
+    raise(SIGSTOP);
+    el_set(editor_.get(), EL_PREP_TERM, 0);
+    el_set(editor_.get(), EL_PREP_TERM, 1);
+    el_set(editor_.get(), EL_REFRESH);
 }
 
 unsigned char LineEditor::completeWord(EditLine* editor, int)
@@ -120,7 +137,7 @@ unsigned char LineEditor::offer(std::vector<std::string> const& candidates,
 
 LineEditor::End LineEditor::read(std::string& line)
 {
-    interrupts::Noted const signals;
+    interrupts::Noted signals({SIGWINCH, SIGTSTP});
     signals_ = &signals;
     interrupted_ = false;
     interrupts::setTerminalToRestore(&settings_);

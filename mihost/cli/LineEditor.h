@@ -41,6 +41,7 @@ private:
     static int getCharacter(EditLine* editor, wchar_t* character);
     static unsigned char completeWord(EditLine* editor, int key);
 
+    void obey(int signal);
     unsigned char offer(std::vector<std::string> const& candidates, std::string const& typed);
 
     struct CloseFile {
@@ -62,7 +63,7 @@ private:
         }
     };
 
-    interrupts::Noted const* signals_ = nullptr; // while reading
+    interrupts::Noted* signals_ = nullptr; // while reading
     bool interrupted_ = false;
     std::string prompt_;
     Completer completer_;

@@ -22,6 +22,7 @@ using Lines = std::vector<std::string>;
 constexpr char prompt[] = "mihost> ";
 constexpr char ctrlC[] = "\x03";
 constexpr char ctrlD[] = "\x04";
+constexpr char ctrlZ[] = "\x1a";
 constexpr char up[] = "\x1b[A";
 
 class MihostTerminal : public testing::Test
@@ -302,6 +303,25 @@ TEST_F(MihostTerminal, ComesBackToTheShellWhenCtrlCStopsAWatch)
     run.type("watch os os-name --interval 1000\n");
     run.waitFor("108 os-name  Linux");
     run.type(ctrlC);
+    run.waitFor(prompt);
+    run.type(ctrlD);
+    EXPECT_EQ(run.end(), 0);
+}
+
+TEST_F(MihostTerminal, IsItsOwnersWhileTheShellIsStoppedAndShowsTheLineAfterwards)
+{
+    TerminalRun run({"shell"});
+    run.waitFor(prompt);
+    run.type("get os");
+    run.waitFor("get os");
+    run.type(ctrlZ);
+    run.waitForStop();
+    EXPECT_TRUE(run.showsInput());
+    kill(run.child(), SIGCONT);
+    run.waitFor("mihost> get os");
+    EXPECT_FALSE(run.showsInput()); // the editor shows it
+    run.type(" 108\n");
+    run.waitFor("108 os-name  Linux");
     run.waitFor(prompt);
     run.type(ctrlD);
     EXPECT_EQ(run.end(), 0);

@@ -85,6 +85,13 @@ bool TerminalRun::showsInput() const
     return (settings.c_lflag & ECHO) != 0;
 }
 
+void TerminalRun::waitForStop() const
+{
+    int status = 0;
+    if (waitpid(child_, &status, WUNTRACED) != child_ || !WIFSTOPPED(status))
+        throw std::runtime_error("ended rather than stopped");
+}
+
 void TerminalRun::waitForDescendants() const
 {
     char byte = 0;

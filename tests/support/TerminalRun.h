@@ -34,6 +34,9 @@ public:
      */
     int end();
 
+    /** Waits until the program is stopped, as Ctrl-Z does. */
+    void waitForStop() const;
+
     /** Waits until no process that the program started is left. */
     void waitForDescendants() const;
 

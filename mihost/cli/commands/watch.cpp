@@ -33,7 +33,7 @@ public:
     void run(Session& session) override
     {
         IC::MutableNode const& node = session.node(address_);
-        Noted const signals;
+        Noted signals;
         std::map<unsigned int, std::string> last;
         for (unsigned int reading = 1;; ++reading) {
             NodeView view = liveView(node, names_, session.secrets());
@@ -57,17 +57,17 @@ public:
 
 private:
     /**
-     * Waits, or less where the terminal changes its size.
+     * Waits.
      *
      * @return whether the watch goes on
      * @throws OutputClosed, which without a change would never be noticed
      */
-    static bool goesOn(Output const& out, Noted const& signals, double seconds)
+    static bool goesOn(Output const& out, Noted& signals, double seconds)
     {
         auto const event = signals.wait({out.descriptor(), 0, 0}, seconds);
         if (event == Noted::Event::Ready)
             throw OutputClosed();
-        return event != Noted::Event::Interrupt;
+        return event == Noted::Event::Timeout;
     }
 
     static void show(Session& session, NodeView const& view)

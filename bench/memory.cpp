@@ -71,7 +71,7 @@ void measureAll(bool quick)
 {
     enterCopy();
     madeUp::modules(0);
-    madeUp::log(0);
+    madeUp::systemLog(0);
     measureNodes();
     measureRefreshes(quick ? 100 : 1000);
 }

@@ -105,7 +105,7 @@ int main(int argc, char* argv[])
     if (benchmark::ReportUnrecognizedArguments(argc, argv))
         return EXIT_FAILURE;
     madeUp::modules(0);
-    madeUp::log(0);
+    madeUp::systemLog(0);
     Keeper keeper;
     for (int const users : {10, 1000, 10000}) {
         madeUp::accounts(users);

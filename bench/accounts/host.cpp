@@ -12,14 +12,19 @@
 namespace
 {
 
-Plugin const* plugin = nullptr;
+Plugin& plugin()
+{
+    static Plugin loaded;
+    return loaded;
+}
+
 double spent = 0;
 
 /** Calls the plug-in's own operation of that name and adds up how long it takes. */
 void timedCall(IC::OsSwMI* self, char const* name, bool refresh)
 {
     using Operation = void (*)(IC::OsSwMI*, bool);
-    auto const own = reinterpret_cast<Operation>(plugin->symbol(name));
+    auto const own = reinterpret_cast<Operation>(plugin().symbol(name));
     double const before = millisecondsNow();
     own(self, refresh);
     spent += millisecondsNow() - before;
@@ -42,11 +47,9 @@ int main(int argc, char* argv[])
 {
     if (argc != 2)
         return EXIT_FAILURE;
-    Plugin loaded;
-    plugin = &loaded;
-    loaded.initialize();
+    plugin().initialize();
     std::printf("%.4f\n", spent);
-    IC::MutableNode& os = loaded.node(NODES::operatingSystemType);
+    IC::MutableNode& os = plugin().node(NODES::operatingSystemType);
     for (int left = std::atoi(argv[1]); left > 0; --left) {
         double const before = millisecondsNow();
         os.setProperty(NODES::refresh, IC::PropertyValue(IC::Number(0U), true));

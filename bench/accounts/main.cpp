@@ -53,7 +53,7 @@ void measureAll(bool quick)
 {
     enterCopy();
     madeUp::modules(0);
-    madeUp::log(0);
+    madeUp::systemLog(0);
     std::map<int, Result> results;
     for (int const users : {10, small, large}) {
         madeUp::accounts(users);

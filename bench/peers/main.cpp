@@ -163,7 +163,7 @@ void measureAll(bool quick)
     setenv("LC_ALL", "C.UTF-8", 1); // without which ansible does not start
     install();
     madeUp::modules(120);
-    madeUp::log(1000);
+    madeUp::systemLog(1000);
     loopback.enter();
     {
         Agent const agent;

@@ -101,7 +101,7 @@ struct Result {
 
 Result measure(Size const& size, bool quick)
 {
-    madeUp::log(size.logLines);
+    madeUp::systemLog(size.logLines);
     timed({STARTUP_HOST, PLUGIN_FILE, "0", list});
     Result result{size.logLines, countCommands()};
     byTurns(

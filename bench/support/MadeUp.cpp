@@ -57,7 +57,7 @@ void modules(int count)
     accelModules::load(loaded);
 }
 
-void log(int lines)
+void systemLog(int lines)
 {
     machine::write("/var/log/messages", "");
     std::ofstream log("/var/log/messages");

@@ -17,7 +17,7 @@ void accounts(int users);
 void modules(int count);
 
 /** A system log of so many lines. */
-void log(int lines);
+void systemLog(int lines);
 
 } // namespace madeUp
 

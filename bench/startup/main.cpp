@@ -115,20 +115,20 @@ void printWhole(std::vector<Result> const& results)
 {
     say("Time of a start in milliseconds, from the start of the process to its end.");
     Table table({"Log lines", "Commands", "Bare loop", "Plug-in", "Plug-in / bare",
-                 "With accelerator", "Accelerated / bare"});
+                 "Likewise, processor time", "With accelerator", "Accelerated / bare"});
     for (Result const& result : results)
         table.add(
             {number(result.logLines), number(result.commands), shown(result.bare.whole),
              shown(result.plugin.whole), shown(ratios(result.plugin.whole, result.bare.whole), 3),
-             shown(result.fast.whole, 1), shown(ratios(result.fast.whole, result.bare.whole), 4)});
+             shown(ratios(result.plugin.cpu, result.bare.cpu), 3), shown(result.fast.whole, 1),
+             shown(ratios(result.fast.whole, result.bare.whole), 4)});
     table.print();
 }
 
 void printOwn(std::vector<Result> const& results)
 {
     say("Processor time of the process itself in milliseconds, user and system, without that of "
-        "the "
-        "commands. The bare loop's is what starting and reading commands costs its process.");
+        "the commands. The bare loop's is what starting and reading commands costs its process.");
     Table table({"Log lines", "Bare loop", "Plug-in", "Plug-in - bare", "Bare, % of its time",
                  "Plug-in, % of its time", "Plug-in - bare, % of plug-in's time",
                  "With accelerator"});

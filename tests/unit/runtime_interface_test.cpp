@@ -286,6 +286,49 @@ TEST_F(RuntimeInterface, DeletesNodesInAnyOrder)
     }
 }
 
+TEST_F(RuntimeInterface, KeepsTheOrderOfTheOthersWhenManyGoBeforeTheNextLook)
+{
+    std::mt19937 random(18);
+    for (int round = 0; round < 50; ++round) {
+        Nodes nodes;
+        Ids left;
+        for (unsigned int id = 0; id < 20; ++id) {
+            nodes.push_back(add(id));
+            left.push_back(id);
+        }
+        Ids order = left;
+        if (round > 0)
+            std::shuffle(order.begin(), order.end(), random);
+        order.resize(12);
+        for (unsigned int const id : order) {
+            EXPECT_EQ(interface_.deleteNode(nodes[id]).getStatus(), 0U);
+            EXPECT_EQ(interface_.deleteNode(nullptr).getStatus(), 1U);
+            left.erase(std::find(left.begin(), left.end(), id));
+        }
+        interface_.nodes_.push_back(new Mortal(20, events_));
+        left.push_back(20);
+        add(21);
+        left.push_back(21);
+        EXPECT_EQ(interface_.nodes_.size(), left.size());
+        ASSERT_EQ(listed(), left);
+        interface_.unload();
+    }
+}
+
+TEST_F(RuntimeInterface, FindsAndUnloadsWhatIsLeftBehindDeletedNodes)
+{
+    Node* const first = add(1);
+    Node* const wanted = add(2);
+    interface_.deleteNode(first);
+    events_.clear();
+    Node* found = nullptr;
+    EXPECT_EQ(interface_.getNode("2", found).getStatus(), 0U);
+    EXPECT_EQ(found, wanted);
+    EXPECT_EQ(interface_.getNode("1", found).getStatus(), 1U);
+    interface_.unload();
+    EXPECT_EQ(events_, Events{"gone 2"});
+}
+
 TEST_F(RuntimeInterface, DeletesEveryNodeWhenItIsUnloaded)
 {
     add(2);

@@ -137,8 +137,7 @@ unsigned char LineEditor::offer(std::vector<std::string> const& candidates,
 
 LineEditor::End LineEditor::read(std::string& line)
 {
-    interrupts::Noted signals({SIGWINCH, SIGTSTP});
-    signals_ = &signals;
+    signals_.emplace(std::vector<int>{SIGWINCH, SIGTSTP});
     interrupted_ = false;
     interrupts::setTerminalToRestore(&settings_);
     // It would show the prompt first; what is typed between the two would be taken amiss.
@@ -146,6 +145,7 @@ LineEditor::End LineEditor::read(std::string& line)
     int length = 0;
     char const* const text = el_gets(editor_.get(), &length);
     interrupts::setTerminalToRestore(nullptr);
+    signals_.reset();
     if (interrupted_) {
         say("\n");
         return End::Interrupted;
@@ -170,7 +170,7 @@ std::string inColumns(std::vector<std::string> const& words, std::size_t width)
 {
     constexpr std::size_t most = 200;
     constexpr std::size_t gap = 2;
-    std::size_t widest = 0;
+    std::size_t widest = gap;
     std::size_t const count = std::min(words.size(), most);
     for (std::size_t at = 0; at < count; ++at)
         widest = std::max(widest, displayWidth(words[at]) + gap);

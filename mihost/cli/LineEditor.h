@@ -7,6 +7,7 @@
 #include <functional>
 #include <histedit.h>
 #include <memory>
+#include <optional>
 #include <string>
 #include <termios.h>
 #include <vector>
@@ -63,7 +64,7 @@ private:
         }
     };
 
-    interrupts::Noted* signals_ = nullptr; // while reading
+    std::optional<interrupts::Noted> signals_; // while reading
     bool interrupted_ = false;
     std::string prompt_;
     Completer completer_;

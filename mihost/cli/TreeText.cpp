@@ -90,7 +90,7 @@ private:
     {
         Room left = room_;
         auto const take = [&left](std::string const& text) {
-            std::string const taken = fitted(text, left);
+            std::string taken = fitted(text, left);
             left.columns -= displayWidth(taken);
             return taken;
         };

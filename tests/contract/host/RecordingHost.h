@@ -43,7 +43,7 @@ struct RecordingHost {
     unsigned char initializeStatus = 0;
     unsigned char addNewNodeStatus = 0;
     unsigned char setterStatus = 0; // of a node's setStatus, setDescription and setProperty
-    int lockStatus = 0;              // of a mutex, which is locked all the same
+    int lockStatus = 0;             // of a mutex, which is locked all the same
 
     /** The interface ids that initialize sets; its own where empty. */
     std::vector<unsigned int> miIds;

@@ -130,7 +130,8 @@ TEST_F(InstalledTree, GivesAHostHeadersAndRuntimeThroughFindPackage)
         << blockOf("cmake", "find_package(mihost");
     std::string const tree = shell("cmake -S . -B build -DCMAKE_PREFIX_PATH='" + prefix().string() +
                                    "' -DCMAKE_CXX_COMPILER='" HOST_COMPILER_PROGRAM
-                                   "' -DCMAKE_CXX_FLAGS='" HOST_COMPILER_FLAGS "' >&2\n"
+                                   "' -DCMAKE_CXX_FLAGS='" HOST_COMPILER_FLAGS
+                                   "' -DCMAKE_EXE_LINKER_FLAGS='" HOST_LINKER_FLAGS "' >&2\n"
                                    "cmake --build build >&2\n"
                                    "build/minimal_host");
     EXPECT_EQ(tree.find(topOfTheTree), 0U) << tree;

@@ -36,7 +36,7 @@ TEST_P(NodeClasses, SayOneLineBeforeTheyAreDestroyed)
 TEST_P(NodeClasses, SpeakUnderTheFramesCategoryAndFile)
 {
     host.logCalls.clear();
-    construct(GetParam())->~MutableNode();
+    std::unique_ptr<IC::MutableNode>(construct(GetParam())).reset();
     ASSERT_EQ(host.logCalls.size(), 4U);
     for (LogCall const& call : host.logCalls) {
         EXPECT_EQ(call.file, "OsSwMI");

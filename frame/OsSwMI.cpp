@@ -58,8 +58,9 @@ unsigned int OsSwMI::takeNodeId(bool note)
 MutableNode* OsSwMI::adopt(std::unique_ptr<MutableNode> node, std::string const& description,
                            std::vector<Node*>* kin)
 {
-    nodes_.push_back(node.get()); // may fail for want of memory
+    nodes_.push_back(nullptr); // may fail for want of memory, while the node is still ours
     currentNode_ = node.release();
+    nodes_.back() = currentNode_;
     if (kin)
         kin->push_back(currentNode_);
     currentNode_->setStatus(NODES::statusOk);

@@ -53,12 +53,12 @@ std::string loggableOutput(std::string const& output, bool secret)
 
 std::string unknownType(std::string const& type)
 {
-    return "Unknown parameter type: " + loggable(type);
+    return LOG::message("Unknown parameter type: ", loggable(type));
 }
 
 std::string tooLong(std::string const& program)
 {
-    return "Command line too long: " + program;
+    return LOG::message("Command line too long: ", program);
 }
 
 } // namespace NQ::OSINFO

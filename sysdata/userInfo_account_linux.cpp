@@ -92,7 +92,7 @@ bool userInfo::setPasswordExpiration(std::string date, std::string user)
     char label[] = "Last password change";
     char command[commandSize];
     return makeAgeCommand(*this, date, user, label, "-M", command, __func__) &&
-           run(command, "Cannot open process: chage -M", __func__);
+           run(command, LOG::message("Cannot open process: chage -M"), __func__);
 }
 
 long userInfo::getDays(char* command, char* label, long reference)

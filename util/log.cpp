@@ -17,6 +17,11 @@ void write(Unit const& unit, Level level, std::string const& message, char const
                                 message);
 }
 
+void write(Unit const& unit, Level level, char const* text, char const* function, int line)
+{
+    write(unit, level, message(text), function, line);
+}
+
 void writeLast(Unit const& unit, char const* text, char const* end, char const* function,
                int line) noexcept
 {

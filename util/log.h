@@ -30,6 +30,10 @@ struct Unit {
 void write(Unit const& unit, Level level, std::string const& message,
            char const* function = __builtin_FUNCTION(), int line = __builtin_LINE());
 
+/** As above, for a fixed text. It takes a buffer of its own like every message. */
+void write(Unit const& unit, Level level, char const* text,
+           char const* function = __builtin_FUNCTION(), int line = __builtin_LINE());
+
 /**
  * For destructors: as write, but a message for which there is no memory is lost.
  *

@@ -45,6 +45,9 @@ LineEditor::LineEditor(char const* prompt, Completer completer)
     EditLine* const editor = editor_.get();
     el_set(editor, EL_CLIENTDATA, this);
     el_set(editor, EL_EDITOR, "emacs");
+    // With Ctrl-C the kernel would drop what is on its way to the terminal, perhaps the next
+    // prompt.
+    el_set(editor, EL_SETTY, "-d", "+noflsh", nullptr);
     el_set(editor, EL_PROMPT, &LineEditor::promptOf);
     el_set(editor, EL_HIST, history, history_.get());
     el_set(editor, EL_GETCFN, &LineEditor::getCharacter);

@@ -216,8 +216,8 @@ struct Place {
 };
 
 constexpr Place places[] = {
-    {"NODE", nodes},         {"PROPERTY", properties},   {"VALUE", values},
-    {"METHOD", methodNames}, {"NAME=VALUE", parameters}, {"--columns", columns},
+    {"NODE", nodes},         {"PROPERTY", properties},  {"VALUE", values},
+    {"METHOD", methodNames}, {"PARAMETER", parameters}, {"--columns", columns},
 };
 
 /** The words of an option that takes one of a few; its type then reads like TEXT:{restart,halt}. */

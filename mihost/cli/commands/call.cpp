@@ -19,8 +19,8 @@ public:
     void declare(CLI::App& app) override
     {
         method_ = app.add_option("METHOD", name_, "such as UserAdd")->required();
-        app.add_option("NAME=VALUE", assignments_,
-                       "parameters; days as YYYY-MM-DD; Password=- is asked for, or read from "
+        app.add_option("PARAMETER", assignments_,
+                       "NAME=VALUE; days as YYYY-MM-DD; Password=- is asked for, or read from "
                        "standard input");
         // Asked for help, the words given so far are known but not handed out yet.
         app.footer([this] {

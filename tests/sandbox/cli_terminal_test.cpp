@@ -292,6 +292,7 @@ TEST_F(MihostTerminal, DropsAShellsLineOnCtrlC)
     run.waitFor(prompt);
     run.type("get os 108\n");
     run.waitFor("108 os-name  Linux");
+    run.waitFor(prompt); // until then Ctrl-D ends a line rather than the input
     run.type(ctrlD);
     EXPECT_EQ(run.end(), 0);
 }

@@ -17,15 +17,6 @@ struct Step {
     Lines output; // a line of dots stands for any lines
 };
 
-Lines linesOf(std::string const& text)
-{
-    std::istringstream stream(text);
-    Lines lines;
-    for (std::string line; std::getline(stream, line);)
-        lines.push_back(line);
-    return lines;
-}
-
 std::vector<Step> readSession()
 {
     std::ifstream readme(DOCS_DIR "/../README.md");

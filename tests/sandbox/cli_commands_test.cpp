@@ -16,15 +16,6 @@ namespace
 using Json = nlohmann::ordered_json;
 using Lines = std::vector<std::string>;
 
-Lines linesOf(std::string const& text)
-{
-    std::istringstream stream(text);
-    Lines lines;
-    for (std::string line; std::getline(stream, line);)
-        lines.push_back(line);
-    return lines;
-}
-
 Json jsonOf(Outcome const& outcome)
 {
     return Json::parse(outcome.out);

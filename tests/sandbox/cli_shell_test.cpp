@@ -23,15 +23,6 @@ protected:
     }
 };
 
-Lines linesOf(std::string const& text)
-{
-    std::istringstream stream(text);
-    Lines lines;
-    for (std::string line; std::getline(stream, line);)
-        lines.push_back(line);
-    return lines;
-}
-
 TEST_F(MihostScript, RunsItsLinesOnOneLoadedPlugin)
 {
     Outcome const outcome = mihostRun({"shell"}, "get os 108\n\n"

@@ -11,8 +11,8 @@ namespace mihost
 /** One character of a text, or one byte that is part of none. */
 struct Utf8Piece {
     std::size_t length; // bytes taken; 0 at the end of the text
-    char32_t character; // meaningless where valid is false
-    bool valid;         // false for a byte that is no UTF-8
+    char32_t character; // or that byte
+    bool valid;         // false for a byte that is part of no character
 };
 
 /** The piece that the text begins with. Overlong forms and surrogates are no UTF-8. */

@@ -1,5 +1,7 @@
 #include "host/make_string.h"
 
+#include "mihost/runtime/Text.h"
+
 namespace NQ
 {
 
@@ -9,54 +11,6 @@ namespace
 // A byte that starts no valid sequence travels as U+DC80 to U+DCFF, which UTF-8 itself never
 // yields.
 constexpr char32_t strayBase = 0xDC00;
-
-unsigned char byteAt(std::string const& text, std::size_t at)
-{
-    return static_cast<unsigned char>(text[at]);
-}
-
-struct Sequence {
-    char32_t code;
-    std::size_t length;
-};
-
-Sequence stray(unsigned char byte)
-{
-    return {strayBase + byte, 1};
-}
-
-Sequence decode(std::string const& text, std::size_t at)
-{
-    struct Form {
-        unsigned char mask, lead;
-        std::size_t length;
-        char32_t lowest;
-    };
-    static constexpr Form forms[] = {{0x80, 0x00, 1, 0},
-                                     {0xE0, 0xC0, 2, 0x80},
-                                     {0xF0, 0xE0, 3, 0x800},
-                                     {0xF8, 0xF0, 4, 0x10000}};
-
-    unsigned char const first = byteAt(text, at);
-    for (Form const& form : forms) {
-        if ((first & form.mask) != form.lead)
-            continue;
-        if (text.size() - at < form.length)
-            return stray(first);
-        char32_t code = first & static_cast<unsigned char>(~form.mask);
-        for (std::size_t i = 1; i < form.length; ++i) {
-            unsigned char const next = byteAt(text, at + i);
-            if ((next & 0xC0) != 0x80)
-                return stray(first);
-            code = (code << 6) | (next & 0x3FU);
-        }
-        bool const surrogate = code >= 0xD800 && code <= 0xDFFF;
-        if (code < form.lowest || code > 0x10FFFF || surrogate)
-            return stray(first);
-        return {code, form.length};
-    }
-    return stray(first);
-}
 
 void encode(char32_t code, std::string& text)
 {
@@ -100,10 +54,11 @@ std::wstring make_wstring(std::string const& text)
 {
     std::wstring wide;
     wide.reserve(text.size());
-    for (std::size_t at = 0; at < text.size();) {
-        Sequence const sequence = decode(text, at);
-        wide.push_back(static_cast<wchar_t>(sequence.code));
-        at += sequence.length;
+    for (std::string_view rest = text; !rest.empty();) {
+        mihost::Utf8Piece const piece = mihost::firstPiece(rest);
+        char32_t const code = piece.valid ? piece.character : strayBase + piece.character;
+        wide.push_back(static_cast<wchar_t>(code));
+        rest.remove_prefix(piece.length);
     }
     return wide;
 }

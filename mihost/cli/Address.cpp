@@ -1,9 +1,9 @@
 #include "mihost/cli/Address.h"
 
+#include "mihost/cli/Decimal.h"
 #include "mihost/cli/Failure.h"
 
 #include <algorithm>
-#include <charconv>
 #include <fmt/format.h>
 
 namespace mihost
@@ -15,36 +15,21 @@ namespace
 constexpr char forms[] =
     "an id, mi, root, computer, os, log, user:NAME, group:NAME, driver:NAME or log:INDEX";
 
-bool parseId(std::string const& text, unsigned int& id)
-{
-    char const* const end = text.data() + text.size();
-    auto const [stop, problem] = std::from_chars(text.data(), end, id);
-    return problem == std::errc() && stop == end;
-}
-
-std::string nameOf(IC::MutableNode const& node, NodeKind const& kind)
-{
-    auto const properties = node.getProperties();
-    auto const found = properties.find(kind.nameProperty);
-    return found == properties.end() ? "" : static_cast<std::string>(found->second);
-}
-
 bool matches(Address const& address, IC::MutableNode const& node)
 {
     if (!address.kind)
         return node.getNodeId() == address.id;
     if (node.getNodeType() != address.kind->type)
         return false;
-    return address.kind->single || nameOf(node, *address.kind) == address.name;
+    return address.kind->single || storedText(node, address.kind->nameProperty) == address.name;
 }
 
 } // namespace
 
 Address parseAddress(std::string const& text)
 {
-    unsigned int id = 0;
-    if (parseId(text, id))
-        return {nullptr, id, ""};
+    if (auto const id = parseDecimal(text))
+        return {nullptr, *id, ""};
     std::size_t const colon = text.find(':');
     bool const single = colon == std::string::npos;
     std::string const word = text.substr(0, colon);
@@ -78,12 +63,19 @@ IC::MutableNode& findNode(std::vector<IC::MutableNode*> const& nodes, std::strin
     return **found;
 }
 
+std::string storedText(IC::MutableNode const& node, unsigned int property)
+{
+    auto const properties = node.getProperties();
+    auto const found = properties.find(property);
+    return found == properties.end() ? "" : static_cast<std::string>(found->second);
+}
+
 std::string addressOf(IC::MutableNode const& node)
 {
     NodeKind const* const kind = findKind(node.getNodeType());
     if (!kind)
         return std::to_string(node.getNodeId());
-    return kind->single ? kind->address : fmt::format("{}:{}", kind->address, nameOf(node, *kind));
+    return kind->single ? kind->address : fmt::format("{}:{}", kind->address, storedText(node, kind->nameProperty));
 }
 
 } // namespace mihost

@@ -27,6 +27,9 @@ std::vector<IC::MutableNode*> nodesOf(IC::ManagementInterface& interface);
 /** @throws Failure (NotFound) naming the address */
 IC::MutableNode& findNode(std::vector<IC::MutableNode*> const& nodes, std::string const& address);
 
+/** A stored property as text; empty where the node has none of this id. */
+std::string storedText(IC::MutableNode const& node, unsigned int property);
+
 /** How a node is addressed: "os", "user:jdoe", or its id where its kind has no address. */
 std::string addressOf(IC::MutableNode const& node);
 

@@ -1,9 +1,9 @@
 #include "mihost/cli/NodeView.h"
 
 #include "mihost/cli/Address.h"
+#include "mihost/cli/Decimal.h"
 #include "mihost/cli/Failure.h"
 
-#include <charconv>
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 #include <set>
@@ -105,12 +105,9 @@ unsigned int propertyId(IC::MutableNode const& node, std::string const& name)
     NodeKind const* const kind = findKind(node.getNodeType());
     if (Property const* const row = kind ? findProperty(*kind, name) : nullptr)
         return row->id;
-    unsigned int id = 0;
-    char const* const end = name.data() + name.size();
-    auto const [stop, problem] = std::from_chars(name.data(), end, id);
-    bool const isId = problem == std::errc() && stop == end;
-    if (isId && ((kind && findProperty(*kind, id)) || node.getProperties().count(id) != 0))
-        return id;
+    if (auto const id = parseDecimal(name);
+        id && ((kind && findProperty(*kind, *id)) || node.getProperties().count(*id) != 0))
+        return *id;
     std::vector<std::string> known;
     for (unsigned int const each : idsOf(node)) {
         Property const* const row = kind ? findProperty(*kind, each) : nullptr;

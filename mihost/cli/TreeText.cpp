@@ -18,11 +18,7 @@ namespace
 std::string headlineOf(IC::MutableNode const& node)
 {
     NodeKind const* const kind = findKind(node.getNodeType());
-    if (!kind || kind->headline == 0)
-        return "";
-    auto const properties = node.getProperties();
-    auto const found = properties.find(kind->headline);
-    return found == properties.end() ? "" : static_cast<std::string>(found->second);
+    return kind && kind->headline != 0 ? storedText(node, kind->headline) : "";
 }
 
 std::string textOf(IC::MutableNode const& node)

@@ -1,11 +1,11 @@
 #include "mihost/cli/ValueText.h"
 
 #include "mihost/cli/Day.h"
+#include "mihost/cli/Decimal.h"
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/MethodCall.h"
 #include "mihost/cli/Safety.h"
 
-#include <charconv>
 #include <fmt/format.h>
 #include <optional>
 #include <vector>
@@ -27,17 +27,9 @@ Failure wrongForm(Property const& property, std::string const& right)
                                   valueKindName(property.kind), right)};
 }
 
-std::optional<unsigned int> parseNumber(std::string_view text)
-{
-    unsigned int number = 0;
-    char const* const end = text.data() + text.size();
-    auto const [stop, problem] = std::from_chars(text.data(), end, number);
-    return problem == std::errc() && stop == end ? std::optional(number) : std::nullopt;
-}
-
 unsigned int numberFrom(Property const& property, std::string_view text)
 {
-    auto const number = parseNumber(text);
+    auto const number = parseDecimal(text);
     if (!number)
         throw wrongForm(property, "decimal digits, at most 4294967295");
     return *number;

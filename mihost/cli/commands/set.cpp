@@ -30,13 +30,6 @@ constexpr Danger dangers[] = {
     {NODES::userType, NODES::deleteUser, 1, "delete the account {} and its home directory"},
 };
 
-std::string storedText(IC::MutableNode const& node, unsigned int id)
-{
-    auto const properties = node.getProperties();
-    auto const found = properties.find(id);
-    return found == properties.end() ? "" : static_cast<std::string>(found->second);
-}
-
 /** A user node's writes put its stored name or id into a command line. */
 void checkAccount(IC::MutableNode const& node)
 {

@@ -185,6 +185,12 @@ NodeKind const* findKind(unsigned int nodeType)
     return find(kinds, [nodeType](NodeKind const& kind) { return kind.type == nodeType; });
 }
 
+NodeKind const* findList(std::string_view name)
+{
+    return find(kinds,
+                [name](NodeKind const& kind) { return !name.empty() && kind.listName == name; });
+}
+
 Property const* findProperty(NodeKind const& kind, unsigned int id)
 {
     return find(kind.properties, [id](Property const& property) { return property.id == id; });

@@ -1,7 +1,6 @@
 #ifndef MIHOST_CLI_CATALOGUE_H
 #define MIHOST_CLI_CATALOGUE_H
 
-#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -83,7 +82,21 @@ struct Method {
 std::vector<NodeKind> const& nodeKinds();
 std::vector<Method> const& methods();
 
+/** The names of kinds, properties, methods or parameters, in their order. */
+template <class Rows> std::vector<std::string> rowNames(Rows const& rows)
+{
+    std::vector<std::string> names;
+    names.reserve(rows.size());
+    for (auto const& row : rows)
+        names.emplace_back(row.name);
+    return names;
+}
+
 NodeKind const* findKind(unsigned int nodeType);
+
+/** The kind that the list command calls so; null where there is none. */
+NodeKind const* findList(std::string_view name);
+
 Property const* findProperty(NodeKind const& kind, unsigned int id);
 Property const* findProperty(NodeKind const& kind, std::string_view name);
 Method const* findMethod(std::string_view name);

@@ -198,12 +198,7 @@ Candidates parameters(Typed const& typed, std::string const& word, NodeNames con
 /** Properties of the kind that is listed, the last of them being typed. */
 Candidates columns(Typed const& typed, std::string const& word, NodeNames const&)
 {
-    std::string const list = typed.arguments.empty() ? "" : typed.arguments[0];
-    auto const kind = std::find_if(nodeKinds().begin(), nodeKinds().end(),
-                                   [&list](NodeKind const& each) { return each.listName == list; });
-    if (list.empty() || kind == nodeKinds().end())
-        return {};
-    Candidates all = propertiesOf(&*kind);
+    Candidates all = propertiesOf(typed.arguments.empty() ? nullptr : findList(typed.arguments[0]));
     for (Candidate& candidate : all)
         candidate.word.insert(0, word, 0, word.rfind(',') + 1);
     return all;

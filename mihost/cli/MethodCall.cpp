@@ -14,13 +14,9 @@ namespace mihost
 namespace
 {
 
-template <class Rows> std::string namesOf(Rows const& rows)
+template <class Rows> std::string listOf(Rows const& rows)
 {
-    std::vector<std::string> names;
-    names.reserve(std::size(rows));
-    for (auto const& row : rows)
-        names.emplace_back(row.name);
-    return names.empty() ? "none" : fmt::format("{}", fmt::join(names, ", "));
+    return rows.empty() ? "none" : fmt::format("{}", fmt::join(rowNames(rows), ", "));
 }
 
 Method const& method(std::string const& name)
@@ -28,7 +24,7 @@ Method const& method(std::string const& name)
     Method const* const found = findMethod(name);
     if (!found)
         throw Failure(BadUsage,
-                      fmt::format("no method '{}'; there are {}", name, namesOf(methods())));
+                      fmt::format("no method '{}'; there are {}", name, listOf(methods())));
     return *found;
 }
 
@@ -37,7 +33,7 @@ Parameter const& parameter(Method const& method, std::string const& name)
     Parameter const* const found = findParameter(method, name);
     if (!found)
         throw Failure(BadUsage, fmt::format("{} has no parameter '{}'; it has {}", method.name,
-                                            name, namesOf(method.parameters)));
+                                            name, listOf(method.parameters)));
     return *found;
 }
 
@@ -126,6 +122,11 @@ MethodCall parseCall(std::string const& name, std::vector<std::string> const& as
     }
     checkWhole(call);
     return call;
+}
+
+bool callsNothing(std::string const& text)
+{
+    return text.empty() || text == "dummy";
 }
 
 MethodCall takeApart(std::string const& text)

@@ -35,6 +35,9 @@ using AskSecret = std::function<std::string(std::string const& name)>;
 MethodCall parseCall(std::string const& method, std::vector<std::string> const& assignments,
                      AskSecret const& ask);
 
+/** Whether property 74 only stores this text, as the empty one and that of a fresh tree. */
+bool callsNothing(std::string const& text);
+
 /** A call from its text form. @throws Failure (BadUsage) as above */
 MethodCall takeApart(std::string const& text);
 

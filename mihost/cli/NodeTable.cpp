@@ -28,9 +28,7 @@ constexpr Attribute attributes[] = {
 
 std::vector<std::string> namesFor(NodeKind const& kind)
 {
-    std::vector<std::string> names;
-    for (Property const& property : kind.properties)
-        names.emplace_back(property.name);
+    std::vector<std::string> names = rowNames(kind.properties);
     for (Attribute const& attribute : attributes)
         names.emplace_back(attribute.name);
     return names;

@@ -53,7 +53,7 @@ void checkText(Property const& property, std::string const& text)
 {
     std::optional<std::string> reason;
     if (property.form == Form::MethodCall) {
-        if (!text.empty() && text != "dummy") // neither does anything
+        if (!callsNothing(text))
             takeApart(text);
     } else if (property.form == Form::Hash) {
         reason = objectionToHash(text);

@@ -1,7 +1,6 @@
 // The catalogue for reading: properties and methods.
 
 #include "mihost/cli/CatalogueText.h"
-#include "mihost/cli/Failure.h"
 #include "mihost/cli/Session.h"
 #include "mihost/cli/commands/makers.h"
 
@@ -10,15 +9,6 @@ namespace mihost
 
 namespace
 {
-
-template <class Rows> std::vector<std::string> namesOf(Rows const& rows)
-{
-    std::vector<std::string> names;
-    names.reserve(std::size(rows));
-    for (auto const& row : rows)
-        names.emplace_back(row.name);
-    return names;
-}
 
 void writeLines(std::vector<std::string> const& lines, Output& out)
 {
@@ -42,7 +32,7 @@ public:
     void declare(CLI::App& app) override
     {
         app.add_option("KIND", kind_, "such as os or user; all kinds where none is given")
-            ->check(CLI::IsMember(namesOf(nodeKinds())));
+            ->check(CLI::IsMember(rowNames(nodeKinds())));
         app.add_flag("--markdown", markdown_, "as docs/properties.md");
     }
 
@@ -74,7 +64,7 @@ public:
     void declare(CLI::App& app) override
     {
         app.add_option("METHOD", method_, "such as UserAdd; a list of all where none is given")
-            ->check(CLI::IsMember(namesOf(methods())));
+            ->check(CLI::IsMember(rowNames(methods())));
         app.add_flag("--markdown", markdown_, "as docs/methods.md");
     }
 

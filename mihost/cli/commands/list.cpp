@@ -1,5 +1,5 @@
-#include "mihost/cli/Failure.h"
 #include "mihost/cli/NodeTable.h"
+#include "mihost/cli/Say.h"
 #include "mihost/cli/Session.h"
 #include "mihost/cli/commands/makers.h"
 
@@ -38,9 +38,7 @@ public:
 
     void run(Session& session) override
     {
-        NodeKind const& kind =
-            *std::find_if(nodeKinds().begin(), nodeKinds().end(),
-                          [this](NodeKind const& each) { return each.listName == kind_; });
+        NodeKind const& kind = *findList(kind_);
         NodeTable const table(kind, columns_);
         std::vector<IC::MutableNode*> nodes = session.nodes();
         nodes.erase(std::remove_if(nodes.begin(), nodes.end(),
@@ -53,7 +51,7 @@ public:
         else
             table.write(nodes, session.secrets(), session.out());
         if (nodes.empty() && !session.options().json)
-            fmt::print(stderr, "mihost: nothing to list under {}; see 'mihost doctor'\n", kind_);
+            say(fmt::format("mihost: nothing to list under {}; see 'mihost doctor'\n", kind_));
     }
 
 private:

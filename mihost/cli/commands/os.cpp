@@ -1,6 +1,5 @@
 // The operating-system node's command properties, under names of their own.
 
-#include "mihost/cli/Failure.h"
 #include "mihost/cli/Session.h"
 #include "mihost/cli/Write.h"
 #include "mihost/cli/commands/makers.h"

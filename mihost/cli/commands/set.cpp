@@ -42,14 +42,15 @@ void checkAccount(IC::MutableNode const& node)
     }
 }
 
-std::string dangerOf(IC::MutableNode const& node, unsigned int property,
+std::string dangerOf(IC::MutableNode const& node, Property const& property,
                      IC::PropertyValue const& value)
 {
-    std::string const text = static_cast<std::string>(value);
-    if (node.getNodeType() == NODES::operatingSystemType && property == NODES::createUser)
-        return text.empty() || text == "dummy" ? "" : dangerOf(takeApart(text));
+    if (property.form == Form::MethodCall) {
+        std::string const text = static_cast<std::string>(value);
+        return callsNothing(text) ? "" : dangerOf(takeApart(text));
+    }
     for (Danger const& danger : dangers)
-        if (danger.nodeType == node.getNodeType() && danger.property == property &&
+        if (danger.nodeType == node.getNodeType() && danger.property == property.id &&
             danger.value == static_cast<unsigned int>(value))
             return fmt::format(danger.what, storedText(node, NODES::name));
     return "";
@@ -59,7 +60,7 @@ std::string secretOf(Property const& property, std::string const& text)
 {
     if (property.has(Property::Secret))
         return text;
-    bool const isCall = property.form == Form::MethodCall && !text.empty() && text != "dummy";
+    bool const isCall = property.form == Form::MethodCall && !callsNothing(text);
     return isCall ? secretOf(takeApart(text)) : "";
 }
 
@@ -93,7 +94,7 @@ public:
         IC::PropertyValue const value = parseValue(*property, text_);
         if (node.getNodeType() == NODES::userType && property->has(Property::Acts))
             checkAccount(node);
-        if (std::string const danger = dangerOf(node, id, value); !danger.empty())
+        if (std::string const danger = dangerOf(node, *property, value); !danger.empty())
             session.confirm(danger);
         carryOut(session, {node, id, value, secretOf(*property, text_)});
     }

@@ -1,4 +1,3 @@
-#include "mihost/cli/Failure.h"
 #include "mihost/cli/Session.h"
 #include "mihost/cli/TreeText.h"
 #include "mihost/cli/commands/makers.h"

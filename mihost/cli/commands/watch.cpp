@@ -1,4 +1,3 @@
-#include "mihost/cli/Failure.h"
 #include "mihost/cli/Interrupts.h"
 #include "mihost/cli/PropertyText.h"
 #include "mihost/cli/Session.h"

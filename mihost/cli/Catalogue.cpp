@@ -12,101 +12,98 @@ namespace
 {
 
 using P = Property;
-using K = ValueKind;
-
-Property const requestedState{
-    NODES::requestedState, "requested-state", K::Enumeration, "", P::Plain,
-    Form::Digits,          "fixed: 1"};
-Property const fixedNumbers{NODES::fixedNumbers, "fixed-numbers",  K::Numbers, "", P::Plain,
-                            Form::Digits,        "fixed: 0, 1, 24"};
+using V = IC::PropertyValue;
 
 // clang-format off
+Property const requestedState{NODES::requestedState, "requested-state", V::EnumerationKind, "", P::Plain, Form::Digits, "fixed: 1"};
+Property const fixedNumbers{NODES::fixedNumbers, "fixed-numbers", V::NumbersKind, "", P::Plain, Form::Digits, "fixed: 0, 1, 24"};
+
 std::vector<Property> const computerProperties = {
-    {NODES::name, "computer-name", K::Text, "", P::Plain, Form::Free, "the machine's network node name"},
+    {NODES::name, "computer-name", V::TextKind, "", P::Plain, Form::Free, "the machine's network node name"},
 };
 
 std::vector<Property> const osProperties = {
-    {NODES::fixedEnumeration, "fixed-enumeration", K::Enumeration, "", P::Plain, Form::Digits, "fixed: 35"},
-    {NODES::requestedState, "requested-state", K::Enumeration, "", P::Acts, Form::Digits, "starts as 1; writing 9 restarts the machine, 12 halts it"},
+    {NODES::fixedEnumeration, "fixed-enumeration", V::EnumerationKind, "", P::Plain, Form::Digits, "fixed: 35"},
+    {NODES::requestedState, "requested-state", V::EnumerationKind, "", P::Acts, Form::Digits, "starts as 1; writing 9 restarts the machine, 12 halts it"},
     fixedNumbers,
-    {NODES::name, "os-name", K::Text, "", P::Plain, Form::Free, "first line of the distribution's release file, else Linux"},
-    {NODES::version, "os-version", K::Text, "", P::Plain, Form::Free, "the distribution's version; unset where no release file is known"},
-    {NODES::createUser, "create-user", K::Text, "", P::Acts | P::MayBeSecret, Form::MethodCall, "writing a method-call text carries out an administration method; empty after a failure"},
-    {NODES::refresh, "refresh", K::Number, "", P::Acts, Form::Digits, "writing 0 builds the user and group nodes anew"},
-    {NODES::distributed, "distributed", K::Boolean, "", P::Plain, Form::Free, "fixed: false"},
-    {NODES::processMaxNumber, "process-max-number", K::Number, "processes", P::Plain, Form::Digits, "fixed: 32000"},
-    {NODES::processMaxMemory, "process-max-memory", K::Number, "", P::Plain, Form::Digits, "fixed: 0"},
-    {NODES::userCount, "user-count", K::Number, "accounts", P::Plain, Form::Digits, "ordinary accounts and those with UID 0, at the start"},
-    {NODES::licensedUserCount, "licensed-user-count", K::Number, "accounts", P::Plain, Form::Digits, "fixed: 0"},
-    {NODES::virtualMemorySize, "virtual-memory-size", K::Number, "", P::Plain, Form::Digits, "fixed: 0"},
-    {NODES::virtualMemoryFree, "virtual-memory-free", K::Number, "", P::Plain, Form::Digits, "fixed: 0"},
-    {NODES::languageEdition, "language-edition", K::Text, "", P::Plain, Form::Free, "language tag of the locale, such as en-US"},
-    {NODES::codeSet, "code-set", K::Text, "", P::Plain, Form::Free, "code set of the locale, such as UTF-8"},
-    {NODES::processCount, "process-count", K::Number, "processes", P::Live, Form::Digits, "processes at this moment"},
-    {NODES::physicalMemoryFree, "physical-memory-free", K::Number, "KiB", P::Live, Form::Digits, "free RAM"},
-    {NODES::physicalMemorySize, "physical-memory-size", K::Number, "KiB", P::Live, Form::Digits, "RAM"},
-    {NODES::swapFileSize, "swap-size", K::Number, "kernel memory units", P::Live, Form::Digits, "swap space, not scaled; cut to 32 bits"},
-    {NODES::swapFileFree, "swap-free", K::Number, "kernel memory units", P::Live, Form::Digits, "free swap space, not scaled; cut to 32 bits"},
-    {NODES::swapFileSizeStored, "swap-used", K::Number, "kernel memory units", P::Live, Form::Digits, "swap space in use, not scaled; cut to 32 bits"},
-    {NODES::lastBootTime, "last-boot-time", K::Date, "", P::Plain, Form::Day, "when the machine was started"},
-    {NODES::installDate, "install-date", K::Date, "", P::Plain, Form::Day, "last status change of the release file; the epoch where there is none"},
-    {NODES::clearLog, "clear-log", K::Number, "", P::Live | P::Unstored | P::Acts, Form::Digits, "always reads 0; writing 9 empties the system log"},
+    {NODES::name, "os-name", V::TextKind, "", P::Plain, Form::Free, "first line of the distribution's release file, else Linux"},
+    {NODES::version, "os-version", V::TextKind, "", P::Plain, Form::Free, "the distribution's version; unset where no release file is known"},
+    {NODES::createUser, "create-user", V::TextKind, "", P::Acts | P::MayBeSecret, Form::MethodCall, "writing a method-call text carries out an administration method; empty after a failure"},
+    {NODES::refresh, "refresh", V::NumberKind, "", P::Acts, Form::Digits, "writing 0 builds the user and group nodes anew"},
+    {NODES::distributed, "distributed", V::BooleanKind, "", P::Plain, Form::Free, "fixed: false"},
+    {NODES::processMaxNumber, "process-max-number", V::NumberKind, "processes", P::Plain, Form::Digits, "fixed: 32000"},
+    {NODES::processMaxMemory, "process-max-memory", V::NumberKind, "", P::Plain, Form::Digits, "fixed: 0"},
+    {NODES::userCount, "user-count", V::NumberKind, "accounts", P::Plain, Form::Digits, "ordinary accounts and those with UID 0, at the start"},
+    {NODES::licensedUserCount, "licensed-user-count", V::NumberKind, "accounts", P::Plain, Form::Digits, "fixed: 0"},
+    {NODES::virtualMemorySize, "virtual-memory-size", V::NumberKind, "", P::Plain, Form::Digits, "fixed: 0"},
+    {NODES::virtualMemoryFree, "virtual-memory-free", V::NumberKind, "", P::Plain, Form::Digits, "fixed: 0"},
+    {NODES::languageEdition, "language-edition", V::TextKind, "", P::Plain, Form::Free, "language tag of the locale, such as en-US"},
+    {NODES::codeSet, "code-set", V::TextKind, "", P::Plain, Form::Free, "code set of the locale, such as UTF-8"},
+    {NODES::processCount, "process-count", V::NumberKind, "processes", P::Live, Form::Digits, "processes at this moment"},
+    {NODES::physicalMemoryFree, "physical-memory-free", V::NumberKind, "KiB", P::Live, Form::Digits, "free RAM"},
+    {NODES::physicalMemorySize, "physical-memory-size", V::NumberKind, "KiB", P::Live, Form::Digits, "RAM"},
+    {NODES::swapFileSize, "swap-size", V::NumberKind, "kernel memory units", P::Live, Form::Digits, "swap space, not scaled; cut to 32 bits"},
+    {NODES::swapFileFree, "swap-free", V::NumberKind, "kernel memory units", P::Live, Form::Digits, "free swap space, not scaled; cut to 32 bits"},
+    {NODES::swapFileSizeStored, "swap-used", V::NumberKind, "kernel memory units", P::Live, Form::Digits, "swap space in use, not scaled; cut to 32 bits"},
+    {NODES::lastBootTime, "last-boot-time", V::DateKind, "", P::Plain, Form::Day, "when the machine was started"},
+    {NODES::installDate, "install-date", V::DateKind, "", P::Plain, Form::Day, "last status change of the release file; the epoch where there is none"},
+    {NODES::clearLog, "clear-log", V::NumberKind, "", P::Live | P::Unstored | P::Acts, Form::Digits, "always reads 0; writing 9 empties the system log"},
 };
 
 std::vector<Property> const driverProperties = {
-    {NODES::version, "driver-version", K::Text, "", P::Plain, Form::Free, "the module's version; empty where it states none"},
-    {NODES::name, "driver-name", K::Text, "", P::Plain, Form::Free, "the module's name"},
-    {NODES::buildNumber, "build-number", K::Text, "", P::Plain, Form::Free, "always empty"},
-    {NODES::manufacturer, "manufacturer", K::Text, "", P::Plain, Form::Free, "always empty"},
+    {NODES::version, "driver-version", V::TextKind, "", P::Plain, Form::Free, "the module's version; empty where it states none"},
+    {NODES::name, "driver-name", V::TextKind, "", P::Plain, Form::Free, "the module's name"},
+    {NODES::buildNumber, "build-number", V::TextKind, "", P::Plain, Form::Free, "always empty"},
+    {NODES::manufacturer, "manufacturer", V::TextKind, "", P::Plain, Form::Free, "always empty"},
 };
 
 std::vector<Property> const userProperties = {
     requestedState,
     fixedNumbers,
-    {NODES::name, "user-name", K::Text, "", P::Plain, Form::AccountName, "login name; account commands take it from here"},
-    {NODES::nameLength, "user-name-length", K::Number, "bytes", P::Plain, Form::Digits, "length of the login name"},
-    {NODES::id, "user-id", K::Text, "", P::Plain, Form::Digits, "UID in decimal; a delete takes it from here"},
-    {NODES::idLength, "user-id-length", K::Number, "bytes", P::Plain, Form::Digits, "length of the UID's text"},
-    {NODES::groupId, "group-id", K::Text, "", P::Plain, Form::Digits, "GID of the primary group in decimal"},
-    {NODES::fullName, "full-name", K::Text, "", P::Plain, Form::Free, "the account's comment field"},
-    {NODES::homeDir, "home-directory", K::Text, "", P::Plain, Form::Free, "home directory"},
-    {NODES::scriptPath, "login-shell", K::Text, "", P::Plain, Form::Free, "login shell"},
-    {NODES::password, "password", K::Text, "", P::Acts | P::Secret, Form::Hash, "password hash; writing a hash sets it"},
-    {NODES::passwordLength, "password-length", K::Number, "bytes", P::Plain, Form::Digits, "length of the password hash"},
-    {NODES::pwdMaxDays, "password-max-days", K::Number, "days", P::Plain, Form::Digits, "how long a password stays valid; 99999 for ever"},
-    {NODES::pwdWarnDays, "password-warn-days", K::Number, "days", P::Plain, Form::Digits, "warning before a password expires"},
-    {NODES::pwdMinDays, "password-min-days", K::Number, "days", P::Plain, Form::Digits, "wait before a password may be changed"},
-    {NODES::pwdExpDays, "password-expiry-days", K::Number, "days", P::Plain, Form::Digits, "from a password's expiry until the account goes inactive; 99999 for never"},
-    {NODES::inactiveTime, "inactive-time", K::Date, "", P::Acts, Form::Day, "account expiry, 2038-01-19 for never; writing a day makes the account inactive from then on"},
-    {NODES::passwordHistoryDepth, "password-history-depth", K::Number, "", P::Plain, Form::Digits, "fixed: 0"},
-    {NODES::reservedText, "reserved-text", K::Text, "", P::Plain, Form::Free, "fixed: empty"},
-    {NODES::passwordExpiration, "password-expiration", K::Date, "", P::Acts, Form::Day, "account expiry, as inactive-time; writing a day lets the password expire then"},
-    {NODES::lastPwdChange, "last-password-change", K::Date, "", P::Plain, Form::Day, "when the password was last changed"},
-    {NODES::maxLoginFailures, "max-login-failures", K::Number, "", P::Plain, Form::Digits, "the deny= of /etc/pam.d/login, 0 for none"},
-    {NODES::deleteUser, "delete", K::Boolean, "", P::Acts, Form::Free, "reads false; writing true deletes the account, home directory included"},
-    {NODES::elementCount, "user-count", K::Number, "accounts", P::Live, Form::Digits, "reported accounts at this moment"},
+    {NODES::name, "user-name", V::TextKind, "", P::Plain, Form::AccountName, "login name; account commands take it from here"},
+    {NODES::nameLength, "user-name-length", V::NumberKind, "bytes", P::Plain, Form::Digits, "length of the login name"},
+    {NODES::id, "user-id", V::TextKind, "", P::Plain, Form::Digits, "UID in decimal; a delete takes it from here"},
+    {NODES::idLength, "user-id-length", V::NumberKind, "bytes", P::Plain, Form::Digits, "length of the UID's text"},
+    {NODES::groupId, "group-id", V::TextKind, "", P::Plain, Form::Digits, "GID of the primary group in decimal"},
+    {NODES::fullName, "full-name", V::TextKind, "", P::Plain, Form::Free, "the account's comment field"},
+    {NODES::homeDir, "home-directory", V::TextKind, "", P::Plain, Form::Free, "home directory"},
+    {NODES::scriptPath, "login-shell", V::TextKind, "", P::Plain, Form::Free, "login shell"},
+    {NODES::password, "password", V::TextKind, "", P::Acts | P::Secret, Form::Hash, "password hash; writing a hash sets it"},
+    {NODES::passwordLength, "password-length", V::NumberKind, "bytes", P::Plain, Form::Digits, "length of the password hash"},
+    {NODES::pwdMaxDays, "password-max-days", V::NumberKind, "days", P::Plain, Form::Digits, "how long a password stays valid; 99999 for ever"},
+    {NODES::pwdWarnDays, "password-warn-days", V::NumberKind, "days", P::Plain, Form::Digits, "warning before a password expires"},
+    {NODES::pwdMinDays, "password-min-days", V::NumberKind, "days", P::Plain, Form::Digits, "wait before a password may be changed"},
+    {NODES::pwdExpDays, "password-expiry-days", V::NumberKind, "days", P::Plain, Form::Digits, "from a password's expiry until the account goes inactive; 99999 for never"},
+    {NODES::inactiveTime, "inactive-time", V::DateKind, "", P::Acts, Form::Day, "account expiry, 2038-01-19 for never; writing a day makes the account inactive from then on"},
+    {NODES::passwordHistoryDepth, "password-history-depth", V::NumberKind, "", P::Plain, Form::Digits, "fixed: 0"},
+    {NODES::reservedText, "reserved-text", V::TextKind, "", P::Plain, Form::Free, "fixed: empty"},
+    {NODES::passwordExpiration, "password-expiration", V::DateKind, "", P::Acts, Form::Day, "account expiry, as inactive-time; writing a day lets the password expire then"},
+    {NODES::lastPwdChange, "last-password-change", V::DateKind, "", P::Plain, Form::Day, "when the password was last changed"},
+    {NODES::maxLoginFailures, "max-login-failures", V::NumberKind, "", P::Plain, Form::Digits, "the deny= of /etc/pam.d/login, 0 for none"},
+    {NODES::deleteUser, "delete", V::BooleanKind, "", P::Acts, Form::Free, "reads false; writing true deletes the account, home directory included"},
+    {NODES::elementCount, "user-count", V::NumberKind, "accounts", P::Live, Form::Digits, "reported accounts at this moment"},
 };
 
 std::vector<Property> const groupProperties = {
-    {NODES::name, "group-name", K::Text, "", P::Plain, Form::Free, "the group's name"},
-    {NODES::id, "group-id", K::Number, "", P::Plain, Form::Digits, "GID"},
-    {NODES::members, "members", K::Texts, "", P::Plain, Form::Free, "login names: those whose primary group it is, then those it lists"},
-    {NODES::elementCount, "group-count", K::Number, "groups", P::Live, Form::Digits, "reported groups at this moment"},
+    {NODES::name, "group-name", V::TextKind, "", P::Plain, Form::Free, "the group's name"},
+    {NODES::id, "group-id", V::NumberKind, "", P::Plain, Form::Digits, "GID"},
+    {NODES::members, "members", V::TextsKind, "", P::Plain, Form::Free, "login names: those whose primary group it is, then those it lists"},
+    {NODES::elementCount, "group-count", V::NumberKind, "groups", P::Live, Form::Digits, "reported groups at this moment"},
 };
 
 std::vector<Property> const logProperties = {
     requestedState,
     fixedNumbers,
-    {NODES::logNumber, "log-number", K::Number, "", P::Plain, Form::Digits, "fixed: 0"},
-    {NODES::name, "log-name", K::Text, "", P::Plain, Form::Free, "fixed: OS Log"},
-    {NODES::logState, "log-state", K::Enumeration, "", P::Plain, Form::Digits, "fixed: 2"},
-    {NODES::dataType, "data-type", K::Text, "", P::Plain, Form::Free, "fixed: *string LogData*"},
+    {NODES::logNumber, "log-number", V::NumberKind, "", P::Plain, Form::Digits, "fixed: 0"},
+    {NODES::name, "log-name", V::TextKind, "", P::Plain, Form::Free, "fixed: OS Log"},
+    {NODES::logState, "log-state", V::EnumerationKind, "", P::Plain, Form::Digits, "fixed: 2"},
+    {NODES::dataType, "data-type", V::TextKind, "", P::Plain, Form::Free, "fixed: *string LogData*"},
 };
 
 std::vector<Property> const logEntryProperties = {
-    {NODES::id, "index", K::Number, "", P::Live, Form::Digits, "position counted from the newest line, which is 1"},
-    {NODES::message, "message", K::Text, "", P::Live, Form::Free, "the line without its time stamp, between asterisks"},
-    {NODES::creationTime, "time", K::Date, "", P::Live, Form::Day, "the line's time stamp, read as local time"},
+    {NODES::id, "index", V::NumberKind, "", P::Live, Form::Digits, "position counted from the newest line, which is 1"},
+    {NODES::message, "message", V::TextKind, "", P::Live, Form::Free, "the line without its time stamp, between asterisks"},
+    {NODES::creationTime, "time", V::DateKind, "", P::Live, Form::Day, "the line's time stamp, read as local time"},
 };
 
 std::vector<NodeKind> const kinds = {
@@ -221,23 +218,9 @@ char const* kindName(unsigned int nodeType)
 
 char const* valueKindName(ValueKind kind)
 {
-    switch (kind) {
-    case ValueKind::Text:
-        return "text";
-    case ValueKind::Number:
-        return "number";
-    case ValueKind::Boolean:
-        return "boolean";
-    case ValueKind::Date:
-        return "date";
-    case ValueKind::Enumeration:
-        return "enumeration";
-    case ValueKind::Numbers:
-        return "numbers";
-    case ValueKind::Texts:
-        return "texts";
-    }
-    return "";
+    static constexpr char const* names[] = {"empty", "text",        "number",  "boolean",
+                                            "date",  "enumeration", "numbers", "texts"};
+    return names[kind];
 }
 
 } // namespace mihost

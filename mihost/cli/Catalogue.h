@@ -1,6 +1,8 @@
 #ifndef MIHOST_CLI_CATALOGUE_H
 #define MIHOST_CLI_CATALOGUE_H
 
+#include "host/PropertyValue.h"
+
 #include <string>
 #include <string_view>
 #include <vector>
@@ -13,7 +15,7 @@
 namespace mihost
 {
 
-enum class ValueKind { Text, Number, Boolean, Date, Enumeration, Numbers, Texts };
+using ValueKind = IC::PropertyValue::KindType;
 
 /** What a text must look like before it is handed to the plug-in. */
 enum class Form {
@@ -105,6 +107,7 @@ Parameter const* findParameter(Method const& method, std::string_view name);
 /** The name of a node's kind as in JSON; "unknown" for a type that no kind has. */
 char const* kindName(unsigned int nodeType);
 
+/** The name of a value's kind, such as "text". */
 char const* valueKindName(ValueKind kind);
 
 } // namespace mihost

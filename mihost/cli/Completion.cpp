@@ -132,7 +132,7 @@ Candidates values(Typed const& typed, std::string const&, NodeNames const&)
     Property const* const property = kind ? findProperty(*kind, typed.arguments.at(1)) : nullptr;
     if (property && property->has(Property::Secret))
         return {{toBeAsked, "asked for"}};
-    if (property && property->kind == ValueKind::Boolean)
+    if (property && property->kind == IC::PropertyValue::BooleanKind)
         return {{"true", ""}, {"false", ""}};
     return {};
 }

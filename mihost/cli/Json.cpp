@@ -8,9 +8,6 @@ namespace mihost
 namespace
 {
 
-constexpr char const* valueKindNames[] = {"empty", "text",        "number",  "boolean",
-                                          "date",  "enumeration", "numbers", "texts"};
-
 Json valueToJson(IC::PropertyValue const& value)
 {
     switch (value.getKind()) {
@@ -51,7 +48,7 @@ Json toJson(PropertyView const& property)
 {
     Json object;
     object["name"] = property.row ? Json(property.row->name) : Json(nullptr);
-    object["kind"] = valueKindNames[property.value.getKind()];
+    object["kind"] = valueKindName(property.value.getKind());
     object["flag"] = property.value.getFlag();
     object["value"] = property.hidden ? Json(nullptr) : valueToJson(property.value);
     if (property.hidden)

@@ -80,27 +80,29 @@ bool truthFrom(Property const& property, std::string const& text)
 PropertyValue parseValue(Property const& property, std::string const& text)
 {
     switch (property.kind) {
-    case ValueKind::Text:
+    case PropertyValue::TextKind:
         checkText(property, text);
         break;
-    case ValueKind::Number:
+    case PropertyValue::NumberKind:
         return {Number(numberFrom(property, text)), flag};
-    case ValueKind::Boolean:
+    case PropertyValue::BooleanKind:
         return {Number(truthFrom(property, text)), flag};
-    case ValueKind::Date:
+    case PropertyValue::DateKind:
         if (auto const time = parseTime(text))
             return {Number(*time, 0), flag};
         throw wrongForm(property, timeForm);
-    case ValueKind::Enumeration:
+    case PropertyValue::EnumerationKind:
         return {IC::EnumValue(numberFrom(property, text)), flag};
-    case ValueKind::Numbers: {
+    case PropertyValue::NumbersKind: {
         std::vector<Number> numbers;
         for (std::string const& item : listFrom(text))
             numbers.emplace_back(numberFrom(property, item));
         return {numbers, flag};
     }
-    case ValueKind::Texts:
+    case PropertyValue::TextsKind:
         return {listFrom(text), flag};
+    case PropertyValue::EmptyKind:
+        break;
     }
     return {text, flag};
 }

@@ -1,5 +1,6 @@
 #include "mihost/cli/Day.h"
 
+#include <algorithm>
 #include <charconv>
 #include <ctime>
 #include <fmt/format.h>

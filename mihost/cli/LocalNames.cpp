@@ -1,9 +1,9 @@
 #include "mihost/cli/LocalNames.h"
 
+#include "mihost/cli/Lines.h"
 #include "nodes/ids.h"
 
 #include <cstdlib>
-#include <fstream>
 #include <sstream>
 
 namespace mihost
@@ -15,9 +15,8 @@ namespace
 /** A number of /etc/login.defs as the plug-in finds it; 0 where it has none. */
 unsigned long policy(std::string const& key)
 {
-    std::ifstream file("/etc/login.defs");
     unsigned long value = 0;
-    for (std::string line; std::getline(file, line);)
+    for (std::string const& line : linesOf(contentOf("/etc/login.defs")))
         if (line.compare(0, key.size(), key) == 0 && line.size() > key.size())
             value = std::strtoul(line.c_str() + key.size() + 1, nullptr, 10);
     return value;
@@ -28,9 +27,8 @@ std::vector<std::string> accounts(char const* path, char const* minimum, char co
 {
     unsigned long const low = policy(minimum);
     unsigned long const high = policy(maximum);
-    std::ifstream file(path);
     std::vector<std::string> names;
-    for (std::string line; std::getline(file, line);) {
+    for (std::string const& line : linesOf(contentOf(path))) {
         std::istringstream fields(line);
         std::string name;
         std::string password;
@@ -47,9 +45,8 @@ std::vector<std::string> accounts(char const* path, char const* minimum, char co
 
 std::vector<std::string> modules()
 {
-    std::ifstream file("/proc/modules");
     std::vector<std::string> names;
-    for (std::string line; std::getline(file, line);)
+    for (std::string const& line : linesOf(contentOf("/proc/modules")))
         names.push_back(line.substr(0, line.find(' ')));
     return names;
 }

@@ -50,6 +50,14 @@ std::set<unsigned int> idsOf(IC::MutableNode const& node)
     return ids;
 }
 
+/** Adds what the node answers for the property now, where it answers. */
+void addLive(NodeView& to, unsigned int id, Secrets secrets)
+{
+    IC::PropertyValue value = emptyValue();
+    if (to.node->getProperty(id, value).getStatus() == 0)
+        to.properties.push_back(view(findKind(to.node->getNodeType()), id, value, secrets));
+}
+
 } // namespace
 
 NodeView storedView(IC::MutableNode const& node, Secrets secrets)
@@ -59,26 +67,19 @@ NodeView storedView(IC::MutableNode const& node, Secrets secrets)
     NodeView result{&node, {}};
     for (unsigned int const id : idsOf(node)) {
         auto const found = stored.find(id);
-        if (found != stored.end()) {
+        if (found != stored.end())
             result.properties.push_back(view(kind, id, found->second, secrets));
-            continue;
-        }
-        IC::PropertyValue value = emptyValue();
-        if (node.getProperty(id, value).getStatus() == 0)
-            result.properties.push_back(view(kind, id, value, secrets));
+        else
+            addLive(result, id, secrets);
     }
     return result;
 }
 
 NodeView liveView(IC::MutableNode const& node, Secrets secrets)
 {
-    NodeKind const* const kind = findKind(node.getNodeType());
     NodeView result{&node, {}};
-    for (unsigned int const id : idsOf(node)) {
-        IC::PropertyValue value = emptyValue();
-        if (node.getProperty(id, value).getStatus() == 0)
-            result.properties.push_back(view(kind, id, value, secrets));
-    }
+    for (unsigned int const id : idsOf(node))
+        addLive(result, id, secrets);
     return result;
 }
 

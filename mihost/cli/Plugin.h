@@ -47,7 +47,6 @@ public:
 private:
     void* library_;
     IC::ManagementInterface* interface_ = nullptr;
-    IC::Error* error_ = nullptr;
     bool started_ = false;
 };
 

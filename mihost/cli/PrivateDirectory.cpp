@@ -14,7 +14,7 @@
 namespace mihost
 {
 
-PrivateDirectory::PrivateDirectory() : previous_(-1)
+PrivateDirectory::PrivateDirectory()
 {
     char const* const parent = std::getenv("TMPDIR");
     std::error_code ignored;
@@ -24,7 +24,7 @@ PrivateDirectory::PrivateDirectory() : previous_(-1)
     if (!mkdtemp(path_.data()))
         throw Failure(NoPlugin, fmt::format("cannot make a private directory '{}': {}", path_,
                                             std::strerror(errno)));
-    previous_ = open(".", O_PATH | O_DIRECTORY | O_CLOEXEC);
+    previous_ = Descriptor(open(".", O_PATH | O_DIRECTORY | O_CLOEXEC));
     if (chdir(path_.c_str()) != 0) {
         int const problem = errno;
         rmdir(path_.c_str());
@@ -37,12 +37,8 @@ PrivateDirectory::PrivateDirectory() : previous_(-1)
 PrivateDirectory::~PrivateDirectory()
 {
     // Where the way back is gone, the root serves: a directory that is stood in stays around.
-    if (previous_ < 0 || fchdir(previous_) != 0) {
-        if (chdir("/") != 0)
-            std::perror("mihost: chdir");
-    }
-    if (previous_ >= 0)
-        close(previous_);
+    if (fchdir(previous_.get()) != 0 && chdir("/") != 0)
+        std::perror("mihost: chdir");
     std::error_code ignored;
     std::filesystem::remove_all(path_, ignored);
     interrupts::setFolderToRemove(nullptr);

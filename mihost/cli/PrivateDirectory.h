@@ -1,6 +1,8 @@
 #ifndef MIHOST_CLI_PRIVATEDIRECTORY_H
 #define MIHOST_CLI_PRIVATEDIRECTORY_H
 
+#include "mihost/sandbox/Descriptor.h"
+
 #include <string>
 
 namespace mihost
@@ -26,7 +28,7 @@ public:
 
 private:
     std::string path_;
-    int previous_;
+    Descriptor previous_;
 };
 
 } // namespace mihost

@@ -40,11 +40,6 @@ bool isPlain(std::string const& name)
            name.find_first_of(" '\"\\#") == std::string::npos;
 }
 
-std::string replaceReason(Failure const& failure, std::size_t line)
-{
-    return fmt::format("line {}: {}", line, failure.what());
-}
-
 } // namespace
 
 Shell::Shell(Session& session) : session_(session), options_(session.options()) {}
@@ -89,7 +84,8 @@ void Shell::runScript(std::istream& script, bool keepGoing)
             if (runLine(line))
                 return;
         } catch (Failure const& failure) {
-            Failure const numbered(failure.code(), replaceReason(failure, number));
+            Failure const numbered(failure.code(),
+                                   fmt::format("line {}: {}", number, failure.what()));
             // A command has a line of its own also where it has no result.
             if (session_.options().json && session_.out().size() == before)
                 tellAsJson(numbered);

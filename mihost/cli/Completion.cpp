@@ -53,8 +53,9 @@ void takeOption(Typed& typed, std::string const& word)
 {
     std::size_t const equals = word.find('=');
     CLI::Option* const option = findOption(typed, word.substr(0, equals));
-    typed.isWrong = !option;
-    if (option && option->get_items_expected_max() > 0 && equals == std::string::npos)
+    if (!option)
+        typed.isWrong = true;
+    else if (option->get_items_expected_max() > 0 && equals == std::string::npos)
         typed.waiting = option;
 }
 
@@ -71,8 +72,9 @@ void take(Typed& typed, std::string const& word)
     } else {
         auto const chosen = typed.program->get_subcommands(
             [&word](CLI::App const* command) { return command->get_name() == word; });
-        typed.isWrong = chosen.empty();
-        if (!typed.isWrong)
+        if (chosen.empty())
+            typed.isWrong = true;
+        else
             typed.command = chosen.front();
     }
 }

@@ -49,6 +49,8 @@ TEST(Completion, KnowsNothingAfterAnUnknownCommandOrOption)
 {
     EXPECT_EQ(after({"nonsense", ""}), Words());
     EXPECT_EQ(after({"--nonsense", ""}), Words());
+    EXPECT_EQ(after({"nonsense", "get", ""}), Words());
+    EXPECT_EQ(after({"--nonsense", "--json", "get", ""}), Words());
 }
 
 TEST(Completion, OffersTheOptionsOfTheCommandAndThoseOfAll)

@@ -3,6 +3,7 @@
 #include "sysdata/driverInfo_parse.h"
 #include "util/MyProcess.h"
 #include "util/log.h"
+#include "util/text.h"
 
 #include <cstdio>
 #include <utility>
@@ -35,8 +36,7 @@ void readFacts(FILE* modinfo, char const* module, driverInfo& driver, char const
 void addDriver(char const* module, std::vector<driverInfo>& drivers, char const* function)
 {
     char command[lineSize];
-    int const length = std::snprintf(command, sizeof command, "modinfo %s", module);
-    if (length < 0 || static_cast<std::size_t>(length) >= sizeof command) {
+    if (!TEXT::print(command, sizeof command, "modinfo %s", module)) {
         LOG::write(unit, LOG::error, LOG::message("Command too long: modinfo ", module), function);
         return;
     }

@@ -8,6 +8,7 @@
 #include <cstdlib>
 #include <map>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace
@@ -212,6 +213,13 @@ TEST_F(OsNodeBuild, SeedsWithTheNodesOwnReads)
     EXPECT_EQ(std::count(texts.begin(), texts.end(), "OsNode::getProperty: exit"), 6);
     EXPECT_EQ(std::count(texts.begin(), texts.end(), "OsNode::setProperty: entry"), 24);
     EXPECT_EQ(std::count(texts.begin(), texts.end(), "OsNode::setProperty: exit"), 24);
+}
+
+TEST_F(OsNodeBuild, GivesNothingBesideTheSecondsOfItsTwoTimes)
+{
+    build();
+    std::vector<std::pair<long, unsigned short>> const expected{{1273659825, 0}, {1230767999, 0}};
+    EXPECT_EQ(standIns().dates, expected);
 }
 
 TEST_F(OsNodeBuild, LogsItsEntryItsExitAndTheTwoTimes)

@@ -1,5 +1,6 @@
 #include "tests/interposed/StandIns.h"
 
+#include "host/Number.h"
 #include "nodes/OsNode.h"
 #include "sysdata/logInfo_linux.h"
 #include "sysdata/minMaxId.h"
@@ -56,6 +57,12 @@ bool realGetInstallDate(long& out)
     static auto* const real = next<bool(NQ::OsInfo*, long&)>("_ZN2NQ6OsInfo14getInstallDateERl");
     NQ::OsInfo info;
     return real(&info, out);
+}
+
+IC::Number::Number(long seconds, unsigned short subSeconds)
+    : kind_(DateKind), subSeconds_(subSeconds), value_(seconds)
+{
+    standIns().dates.emplace_back(seconds, subSeconds);
 }
 
 namespace NQ

@@ -4,11 +4,12 @@
 #include <map>
 #include <set>
 #include <string>
+#include <utility>
 #include <vector>
 
 /**
- * Stands in for the facts of the operating system, the id ranges and the store of its node, all of
- * which this program replaces in the library.
+ * Stands in for the facts of the operating system, the id ranges, points in time and the store of
+ * its node, all of which this program replaces.
  *
  * The fact getters answer with what is given here and consult nothing.
  */
@@ -22,6 +23,9 @@ struct StandIns {
 
     /** What was called, in order: getters by name, stores as "set ID". */
     std::vector<std::string> calls;
+
+    /** The points in time that were made, in order: seconds and what was given beside them. */
+    std::vector<std::pair<long, unsigned short>> dates;
 
     /** The fact and log readers that came and went, in order, such as "OsInfo made". */
     std::vector<std::string> lives;

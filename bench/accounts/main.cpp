@@ -4,6 +4,7 @@
 // group that holds all users, run by turns
 //
 //   plug-in  accounts_host: what a start spends on users and groups, and what a refresh takes
+//   calls    accounts_calls: the C library's calls that a refresh consists of, and nothing else
 //   Python   list.py: lists the same with the modules pwd, spwd and grp, for its own time and for
 //            that of the whole program
 
@@ -26,6 +27,7 @@ constexpr std::size_t quickRounds = 3;
 struct Result {
     Samples start = {};
     Samples refresh = {};
+    Samples calls = {};
     Samples python = {};
     Samples pythonWhole = {};
 
@@ -39,6 +41,11 @@ struct Result {
         while (output >> time)
             refreshes.push_back(time);
         refresh.push_back(median(refreshes));
+    }
+
+    void callsAlone()
+    {
+        calls.push_back(std::stod(timed({ACCOUNTS_CALLS}).output));
     }
 
     void list()
@@ -58,17 +65,20 @@ void measureAll(bool quick)
     for (int const users : {10, small, large}) {
         madeUp::accounts(users);
         Result& result = results[users];
-        byTurns(quick ? quickRounds : rounds, {[&] { result.plugin(); }, [&] { result.list(); }});
+        byTurns(quick ? quickRounds : rounds,
+                {[&] { result.plugin(); }, [&] { result.callsAlone(); }, [&] { result.list(); }});
     }
     say("Milliseconds for all users and groups.");
-    Table table({"Users", "Start's share", "Refresh", "Refresh / start's share",
+    Table table({"Users", "Start's share", "Refresh", "Refresh / start's share", "Its calls alone",
                  "Python, listing alone", "Python, whole program", "Refresh / listing alone",
-                 "Refresh / whole program"});
+                 "Refresh / whole program", "Its calls / whole program"});
     for (auto const& [users, result] : results)
         table.add({number(users), shown(result.start, 2), shown(result.refresh, 2),
-                   shown(ratios(result.refresh, result.start), 2), shown(result.python, 2),
-                   shown(result.pythonWhole, 1), shown(ratios(result.refresh, result.python), 2),
-                   shown(ratios(result.refresh, result.pythonWhole), 2)});
+                   shown(ratios(result.refresh, result.start), 2), shown(result.calls, 2),
+                   shown(result.python, 2), shown(result.pythonWhole, 1),
+                   shown(ratios(result.refresh, result.python), 2),
+                   shown(ratios(result.refresh, result.pythonWhole), 2),
+                   shown(ratios(result.calls, result.pythonWhole), 2)});
     table.print();
     say("From " + number(small) + " to " + number(large) + " users a refresh grows " +
         shown(ratios(results[large].refresh, results[small].refresh), 2) +

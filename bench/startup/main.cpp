@@ -5,8 +5,7 @@
 // 1,000,000 lines, run by turns
 //
 //   bare         startup_commands: gives the very command lines of a start, in their order, to
-//   popen
-//                and reads what they print
+//                popen and reads what they print
 //   plug-in      startup_host: loads the plug-in and initialises it, from its start to its end
 //   accelerated  startup_host_fast: the same host, linked to the accelerator
 //

@@ -5,6 +5,7 @@
 #include <climits>
 #include <cstdio>
 #include <cstring>
+#include <iterator>
 #include <vector>
 
 namespace NQ
@@ -63,7 +64,6 @@ void minMaxId::parse(char const* text)
                   {"UID_MAX", maxUserId_, false},
                   {"GID_MAX", maxGroupId_, false},
                   {"GID_MIN", minGroupId_, false}};
-    constexpr std::size_t keyCount = sizeof keys / sizeof keys[0];
 
     std::size_t found = 0;
     for (char const* line = text; *line != endMark;) {
@@ -76,7 +76,7 @@ void minMaxId::parse(char const* text)
             key.found = true;
             break;
         }
-        if (found == keyCount)
+        if (found == std::size(keys))
             return;
         while (*line != '\n' && *line != endMark)
             ++line;

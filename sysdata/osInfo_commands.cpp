@@ -26,14 +26,14 @@ constexpr TypeName typeNames[] = {
 };
 
 constexpr Method methodTable[] = {
-    {"UserAdd", MethodKind::userAdd, "/usr/sbin/useradd", true, false},
-    {"UserDel", MethodKind::userDel, "/usr/sbin/userdel", true, false},
-    {"UserSetAttrib", MethodKind::userSetAttrib, "/usr/bin/chage", true, false},
-    {"LocalGroupAdd", MethodKind::plain, "/usr/sbin/groupadd", false, false},
-    {"LocalGroupDel", MethodKind::plain, "/usr/sbin/groupdel", false, false},
-    {"GetShadowing", MethodKind::getShadowing, "", false, false},
-    {"LocalGroupAddUser", MethodKind::groupMembership, "", false, false},
-    {"LocalGroupDelUser", MethodKind::groupMembership, "", false, false},
+    {"UserAdd", MethodKind::userAdd, "/usr/sbin/useradd", true},
+    {"UserDel", MethodKind::userDel, "/usr/sbin/userdel", true},
+    {"UserSetAttrib", MethodKind::userSetAttrib, "/usr/bin/chage", true},
+    {"LocalGroupAdd", MethodKind::plain, "/usr/sbin/groupadd"},
+    {"LocalGroupDel", MethodKind::plain, "/usr/sbin/groupdel"},
+    {"GetShadowing", MethodKind::getShadowing},
+    {"LocalGroupAddUser", MethodKind::groupMembership},
+    {"LocalGroupDelUser", MethodKind::groupMembership},
     {"UserSetFullName", MethodKind::userSetFullName, "/usr/sbin/usermod", true, true},
     {"UserSetScriptPath", MethodKind::plain, "/usr/sbin/usermod", true, true},
     {"UserSetHomeDir", MethodKind::plain, "/usr/sbin/usermod", true, true},

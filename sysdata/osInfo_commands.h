@@ -34,9 +34,9 @@ enum class MethodKind {
 struct Method {
     char const* name;
     MethodKind kind;
-    char const* program;
-    bool userTool; // takes an account name
-    bool usermod;  // takes it last
+    char const* program = "";
+    bool userTool = false; // takes an account name
+    bool usermod = false;  // takes it last
 };
 
 /** Null for an unknown method. */

@@ -44,6 +44,12 @@ void PhaseSink::write(LogMessage const& message)
     }
 }
 
+SinkGroup::~SinkGroup()
+{
+    if (!sinks_.empty())
+        setLogSink(nullptr);
+}
+
 void SinkGroup::add(LogSink& sink)
 {
     sinks_.push_back(&sink);

@@ -37,10 +37,15 @@ private:
     std::vector<PhaseListener*> listeners_;
 };
 
-/** Hands messages on to several sinks, which stay the caller's. */
+/** Hands messages on to several sinks, which stay the caller's; the log's sink while it has any. */
 class SinkGroup : public LogSink
 {
 public:
+    SinkGroup() = default;
+    ~SinkGroup() override;
+    SinkGroup(SinkGroup const&) = delete;
+    SinkGroup& operator=(SinkGroup const&) = delete;
+
     void add(LogSink& sink);
     void remove(LogSink const& sink);
 

@@ -41,11 +41,6 @@ Session::Session(Options options)
         goIntoSandbox(options_.overlay);
 }
 
-Session::~Session()
-{
-    setLogSink(nullptr);
-}
-
 void Session::finish()
 {
     plugin_.reset();

@@ -28,7 +28,6 @@ public:
      * @throws Failure where one of them cannot be had
      */
     explicit Session(Options options);
-    ~Session();
     Session(Session const&) = delete;
     Session& operator=(Session const&) = delete;
 
@@ -96,12 +95,12 @@ private:
     bool scripted_ = false;
     Output out_;
     std::string pluginFile_;
-    SinkGroup sinks_;
     Timing timing_;
     std::unique_ptr<Trace> trace_;
     std::unique_ptr<Accelerator> accelerator_;
     std::unique_ptr<PrivateDirectory> directory_;
     std::unique_ptr<Plugin> plugin_;
+    SinkGroup sinks_; // the last, so that no message comes in while the others go
 };
 
 } // namespace mihost

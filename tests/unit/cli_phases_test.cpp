@@ -1,4 +1,6 @@
 #include "mihost/cli/Phases.h"
+
+#include "host/VXLogger.h"
 #include "mihost/cli/Timing.h"
 
 #include <gtest/gtest.h>
@@ -95,6 +97,22 @@ TEST(SinkGroup, HandsEachMessageToAllThatAreInIt)
     say(group, "f", "f: exit");
     EXPECT_EQ(first.count, 1);
     EXPECT_EQ(second.count, 2);
+}
+
+TEST(SinkGroup, IsTheLogsSinkUntilItGoes)
+{
+    auto const log = [] {
+        VXLog::VXLogger::logLevelMessage("f", "unit", 1, "category", 3000, nullptr, 0, 0, "text");
+    };
+    Counter counter;
+    {
+        mihost::SinkGroup group;
+        log();
+        group.add(counter);
+        log();
+    }
+    log();
+    EXPECT_EQ(counter.count, 1);
 }
 
 } // namespace

@@ -7,10 +7,10 @@
 #include "sysdata/userInfo_linux.h"
 #include "tests/interposed/StandIns.h"
 #include "tests/support/FakeFiles.h"
+#include "tests/support/Next.h"
 
 #include <gtest/gtest.h>
 
-#include <dlfcn.h>
 #include <initializer_list>
 #include <string>
 #include <vector>
@@ -32,11 +32,6 @@ void note(std::string call, std::string const& month, std::initializer_list<int>
     for (int const other : others)
         call += " " + std::to_string(other);
     conversions().push_back(call);
-}
-
-template <class Function> Function* next(char const* name)
-{
-    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
 }
 
 } // namespace

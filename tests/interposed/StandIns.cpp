@@ -5,8 +5,7 @@
 #include "sysdata/logInfo_linux.h"
 #include "sysdata/minMaxId.h"
 #include "sysdata/osInfo_linux.h"
-
-#include <dlfcn.h>
+#include "tests/support/Next.h"
 
 StandIns& standIns()
 {
@@ -16,11 +15,6 @@ StandIns& standIns()
 
 namespace
 {
-
-template <class Function> Function* next(char const* name)
-{
-    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
-}
 
 /** Answers for the getter that calls it. */
 template <class Value>

@@ -1,6 +1,7 @@
 #include "tests/support/Libc.h"
 
-#include <dlfcn.h>
+#include "tests/support/Next.h"
+
 #include <grp.h>
 #include <memory>
 #include <pwd.h>
@@ -13,11 +14,6 @@ namespace libc
 
 namespace
 {
-
-template <class Function> Function* next(char const* name)
-{
-    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
-}
 
 /** Fake output as a stream; unlike an in-memory stream it holds NUL bytes and emptiness well. */
 FILE* streamOf(std::string const& text)
@@ -233,25 +229,25 @@ int uname(struct utsname* system) noexcept
 
 int lckpwdf() noexcept
 {
-    static auto* const real = libc::next<int()>("lckpwdf");
+    static auto* const real = next<int()>("lckpwdf");
     return hooks().lckpwdf ? hooks().lckpwdf() : real();
 }
 
 int ulckpwdf() noexcept
 {
-    static auto* const real = libc::next<int()>("ulckpwdf");
+    static auto* const real = next<int()>("ulckpwdf");
     return hooks().ulckpwdf ? hooks().ulckpwdf() : real();
 }
 
 void setpwent()
 {
-    static auto* const real = libc::next<void()>("setpwent");
+    static auto* const real = next<void()>("setpwent");
     return hooks().setpwent ? hooks().setpwent() : real();
 }
 
 void endpwent()
 {
-    static auto* const real = libc::next<void()>("endpwent");
+    static auto* const real = next<void()>("endpwent");
     return hooks().endpwent ? hooks().endpwent() : real();
 }
 
@@ -277,7 +273,7 @@ char* fgets(char* buffer, int size, FILE* stream)
 
 time_t time(time_t* out) noexcept
 {
-    static auto* const real = libc::next<time_t(time_t*)>("time");
+    static auto* const real = next<time_t(time_t*)>("time");
     time_t const now = hooks().time ? hooks().time() : real(nullptr);
     if (out)
         *out = now;
@@ -286,19 +282,19 @@ time_t time(time_t* out) noexcept
 
 void setgrent()
 {
-    static auto* const real = libc::next<void()>("setgrent");
+    static auto* const real = next<void()>("setgrent");
     hooks().setgrent ? hooks().setgrent() : real();
 }
 
 struct group* getgrent()
 {
-    static auto* const real = libc::next<group*()>("getgrent");
+    static auto* const real = next<group*()>("getgrent");
     return hooks().getgrent ? hooks().getgrent() : real();
 }
 
 void endgrent()
 {
-    static auto* const real = libc::next<void()>("endgrent");
+    static auto* const real = next<void()>("endgrent");
     hooks().endgrent ? hooks().endgrent() : real();
 }
 

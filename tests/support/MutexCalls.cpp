@@ -1,19 +1,11 @@
 #include "tests/support/MutexCalls.h"
 
-#include <dlfcn.h>
+#include "tests/support/Next.h"
 
 namespace
 {
-
 MutexCalls* inUse = nullptr;
-
-// The host's own, past the ones below. A member function takes its object as first argument.
-template <class Function> Function* next(char const* name)
-{
-    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
 }
-
-} // namespace
 
 MutexCalls::MutexCalls()
 {

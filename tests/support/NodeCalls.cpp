@@ -1,8 +1,7 @@
 #include "tests/support/NodeCalls.h"
 
 #include "host/MutableNode.h"
-
-#include <dlfcn.h>
+#include "tests/support/Next.h"
 
 namespace
 {
@@ -15,13 +14,8 @@ void note(std::string call)
         inUse->calls.push_back(std::move(call));
 }
 
-// The framework's own, past the ones below. A member function takes its object as first argument.
+/** The framework's own, past the ones below. */
 template <class Argument> using Setter = IC::Error(IC::MutableNode* node, Argument const& argument);
-
-template <class Function> Function* next(char const* name)
-{
-    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
-}
 
 } // namespace
 

@@ -1,20 +1,12 @@
 #include "tests/support/WideTexts.h"
 
 #include "host/make_string.h"
-
-#include <dlfcn.h>
+#include "tests/support/Next.h"
 
 namespace
 {
-
 WideTexts* inUse = nullptr;
-
-template <class Function> Function* next(char const* name)
-{
-    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
 }
-
-} // namespace
 
 WideTexts::WideTexts()
 {

@@ -1,20 +1,11 @@
 #include "tests/unit/AccelStandIns.h"
 
-#include <dlfcn.h>
+#include "tests/support/Next.h"
+
 #include <unistd.h>
 
 namespace accelStandIns
 {
-
-namespace
-{
-
-template <class Function> Function* next(char const* name)
-{
-    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
-}
-
-} // namespace
 
 Hooks& hooks()
 {
@@ -100,7 +91,7 @@ int fstatfs(int descriptor, struct statfs* system) noexcept
 
 uid_t geteuid() noexcept
 {
-    static auto* const real = accelStandIns::next<uid_t()>("geteuid");
+    static auto* const real = next<uid_t()>("geteuid");
     return hooks().geteuid ? hooks().geteuid() : real();
 }
 

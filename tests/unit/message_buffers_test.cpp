@@ -5,24 +5,17 @@
 #include "sysdata/osInfo_linux.h"
 #include "sysdata/userInfo_linux.h"
 #include "tests/support/Libc.h"
+#include "tests/support/Next.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <dlfcn.h>
 
 namespace
 {
-
 std::size_t taken = 0; // texts that were taken out of buffers
-
-template <class Function> Function* next(char const* name)
-{
-    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
 }
-
-} // namespace
 
 namespace VXLog
 {

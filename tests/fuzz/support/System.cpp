@@ -1,8 +1,9 @@
 #include "tests/fuzz/support/System.h"
 
+#include "tests/support/Next.h"
+
 #include <cstdio>
 #include <cstdlib>
-#include <dlfcn.h>
 #include <set>
 #include <sys/mman.h>
 #include <unistd.h>
@@ -42,11 +43,6 @@ FILE* start(std::string const& command)
         if (command.compare(0, beginning.size(), beginning) == 0)
             return streamOf(output);
     return nullptr;
-}
-
-template <class Function> Function* next(char const* name)
-{
-    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
 }
 
 } // namespace

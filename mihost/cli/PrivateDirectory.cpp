@@ -16,14 +16,14 @@ namespace mihost
 
 PrivateDirectory::PrivateDirectory()
 {
-    char const* const parent = std::getenv("TMPDIR");
+    char const* const wanted = std::getenv("TMPDIR");
     std::error_code ignored;
-    path_ =
-        std::filesystem::absolute(parent && *parent ? parent : "/tmp", ignored) / "mihost-XXXXXX";
+    auto const parent = std::filesystem::absolute(wanted && *wanted ? wanted : "/tmp", ignored);
+    path_ = parent / "mihost-XXXXXX";
     interrupts::Held const held; // no signal between making it and knowing of it
     if (!mkdtemp(path_.data()))
-        throw Failure(NoPlugin, fmt::format("cannot make a private directory '{}': {}", path_,
-                                            std::strerror(errno)));
+        throw Failure(NoPlugin, fmt::format("cannot make a private directory in '{}': {}",
+                                            parent.string(), std::strerror(errno)));
     previous_ = Descriptor(open(".", O_PATH | O_DIRECTORY | O_CLOEXEC));
     if (chdir(path_.c_str()) != 0) {
         int const problem = errno;

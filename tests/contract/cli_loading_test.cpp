@@ -1,7 +1,7 @@
 #include "tests/support/Program.h"
 
 #include <algorithm>
-#include <fstream>
+#include <cstdlib>
 #include <gtest/gtest.h>
 #include <unistd.h>
 
@@ -42,6 +42,47 @@ TEST(LoadingThePlugin, NamesALibraryWithoutTheEntryPoint)
 TEST(LoadingThePlugin, NamesTheSymbolThatTheHostLacks)
 {
     expectRefused(PLUGIN_THAT_WANTS_MORE, "undefined symbol: hostOperationFromTheFuture");
+}
+
+TEST(LoadingThePlugin, TellsWhatTheEntryPointAnswered)
+{
+    setenv("ODD", "answer", 1);
+    expectRefused(PLUGIN_THAT_IS_ODD, "OpenMI answered 7");
+}
+
+TEST(LoadingThePlugin, MissesTheInterface)
+{
+    setenv("ODD", "interface", 1);
+    expectRefused(PLUGIN_THAT_IS_ODD, "OpenMI handed out no interface");
+}
+
+TEST(LoadingThePlugin, TellsWhyAPluginDidNotStart)
+{
+    setenv("ODD", "start", 1);
+    Outcome const outcome = mihostRun({"--plugin", PLUGIN_THAT_IS_ODD, "tree"});
+    EXPECT_EQ(outcome.code, 1);
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_EQ(outcome.err, "mihost: the plug-in did not start: status 5: no reason\n");
+}
+
+TEST(LoadingThePlugin, ShowsANodeOfAnUnknownKindButWritesNothingToIt)
+{
+    EXPECT_EQ(mihostRun({"--plugin", PLUGIN_THAT_IS_ODD, "tree", "--all"}).out,
+              "2 #2\n        7 7  seven\n");
+    Outcome const outcome = mihostRun({"--plugin", PLUGIN_THAT_IS_ODD, "set", "2", "7", "eight"});
+    EXPECT_EQ(outcome.code, 4);
+    EXPECT_EQ(outcome.err, "mihost: nothing is known of property '7' of node '2', so it is not "
+                           "written\n");
+}
+
+TEST(LoadingThePlugin, NeedsAFolderForItsPrivateOne)
+{
+    setenv("TMPDIR", "/nonexistent", 1);
+    Outcome const outcome = mihostRun({"tree"});
+    EXPECT_EQ(outcome.code, 3);
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_EQ(outcome.err, "mihost: cannot make a private directory in '/nonexistent': "
+                           "No such file or directory\n");
 }
 
 TEST(LoadingThePlugin, FindsThePluginBesideTheProgram)

@@ -1,0 +1,42 @@
+// A plug-in with one node of an unknown kind. In what the environment variable ODD says it behaves
+// as the real one never does.
+
+#include "host/MutableNode.h"
+#include "host/OpenMI.h"
+
+#include <cstdlib>
+#include <string>
+
+namespace
+{
+
+bool isOddIn(char const* what)
+{
+    char const* const odd = std::getenv("ODD");
+    return odd && std::string(odd) == what;
+}
+
+class Odd : public IC::ManagementInterface
+{
+public:
+    IC::Error initialize(unsigned int first, IC::Number const& second,
+                         IC::Number const& third) override
+    {
+        ManagementInterface::initialize(first, second, third);
+        auto* const node = new IC::MutableNode(nextNodeId_++, 0, miIds_, 99, 0);
+        node->setProperty(7, IC::PropertyValue("seven", true));
+        nodes_.push_back(node);
+        return {static_cast<unsigned char>(isOddIn("start") ? 5 : 0), IC::Number(0U), "no reason"};
+    }
+};
+
+} // namespace
+
+extern "C" int OpenMI(IC::ManagementInterface** interface, IC::Error** error)
+{
+    static Odd odd;
+    static IC::Error status(0, IC::Number(0U), "");
+    *interface = isOddIn("interface") ? nullptr : &odd;
+    *error = &status;
+    return isOddIn("answer") ? 7 : 0;
+}

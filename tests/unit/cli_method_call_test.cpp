@@ -1,12 +1,11 @@
-#include "mihost/cli/Failure.h"
 #include "mihost/cli/MethodCall.h"
+#include "tests/unit/Refusal.h"
 
 #include <gtest/gtest.h>
 
 namespace
 {
 
-using mihost::Failure;
 using mihost::parseCall;
 using mihost::takeApart;
 
@@ -19,17 +18,6 @@ std::string noSecret(std::string const& name)
 std::string textFor(std::string const& method, std::vector<std::string> const& words)
 {
     return textOf(parseCall(method, words, noSecret));
-}
-
-template <class Step> std::string refusal(Step step)
-{
-    try {
-        step();
-    } catch (Failure const& failure) {
-        EXPECT_EQ(failure.code(), mihost::BadUsage);
-        return failure.what();
-    }
-    return "accepted";
 }
 
 TEST(MethodCall, BecomesTextWithNameTypeAndValueOfEachParameterInTheOrderGiven)

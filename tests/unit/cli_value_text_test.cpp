@@ -1,5 +1,5 @@
-#include "mihost/cli/Failure.h"
 #include "mihost/cli/ValueText.h"
+#include "tests/unit/Refusal.h"
 
 #include <cstdlib>
 #include <ctime>
@@ -9,7 +9,6 @@ namespace
 {
 
 using IC::PropertyValue;
-using mihost::Failure;
 
 mihost::Property const& property(unsigned int nodeType, unsigned int id)
 {
@@ -27,13 +26,7 @@ PropertyValue parsed(unsigned int nodeType, unsigned int id, std::string const& 
 
 std::string refusal(unsigned int nodeType, unsigned int id, std::string const& text)
 {
-    try {
-        parsed(nodeType, id, text);
-    } catch (Failure const& failure) {
-        EXPECT_EQ(failure.code(), mihost::BadUsage);
-        return failure.what();
-    }
-    return "accepted";
+    return ::refusal([&] { parsed(nodeType, id, text); });
 }
 
 TEST(ValueText, BecomesAValueOfThePropertysKind)

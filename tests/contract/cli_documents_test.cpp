@@ -1,19 +1,10 @@
+#include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 
-#include <fstream>
 #include <gtest/gtest.h>
-#include <sstream>
 
 namespace
 {
-
-std::string contentOf(std::string const& path)
-{
-    std::ifstream const file(path);
-    std::ostringstream text;
-    text << file.rdbuf();
-    return text.str();
-}
 
 TEST(ReferenceDocuments, AreWhatTheCatalogueSays)
 {

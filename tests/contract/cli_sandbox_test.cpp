@@ -1,10 +1,10 @@
 // The --sandbox option: what it shows, and that the machine stays as it is.
 
+#include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 
 #include <cstdlib>
 #include <filesystem>
-#include <fstream>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 #include <unistd.h>
@@ -13,14 +13,6 @@ namespace
 {
 
 using Json = nlohmann::ordered_json;
-
-std::string contentOf(std::string const& path)
-{
-    std::ifstream const file(path);
-    std::ostringstream text;
-    text << file.rdbuf();
-    return text.str();
-}
 
 /** Tests of the option itself need the privilege for it. */
 class MihostSandbox : public testing::Test

@@ -1,25 +1,18 @@
 // What `cmake --install` puts in place, used by the page that tells how to write a host.
 
+#include "tests/support/Lines.h"
 #include "tests/support/Program.h"
+#include "tests/support/ScratchFolder.h"
 
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <gtest/gtest.h>
-#include <sstream>
 
 namespace
 {
 
 namespace fs = std::filesystem;
-
-std::string contentOf(fs::path const& path)
-{
-    std::ifstream const file(path);
-    std::ostringstream text;
-    text << file.rdbuf();
-    return text.str();
-}
 
 /** The block of writing-a-host.md in this language that holds this text. */
 std::string blockOf(std::string const& language, std::string const& text)
@@ -36,19 +29,10 @@ class InstalledTree : public testing::Test
 public:
     InstalledTree()
     {
-        std::string name = fs::temp_directory_path() / "installed.XXXXXX";
-        if (!mkdtemp(name.data()))
-            throw std::runtime_error("cannot make a directory");
-        top_ = name;
         fs::create_directory(top_ / "work");
         shell("cmake --install '" BUILD_DIR "' --prefix '" + (top_ / "first").string() + "'");
         fs::rename(top_ / "first", prefix());
         fs::copy(DOCS_DIR "/examples/minimal_host.cpp", top_ / "work");
-    }
-
-    ~InstalledTree() override
-    {
-        fs::remove_all(top_);
     }
 
 protected:
@@ -77,7 +61,8 @@ protected:
     }
 
 private:
-    fs::path top_;
+    ScratchFolder const folder_;
+    fs::path const top_ = folder_.name();
 };
 
 constexpr char topOfTheTree[] = "1 OsSw Management Interface\n"

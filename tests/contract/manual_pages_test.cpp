@@ -1,9 +1,9 @@
+#include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 
 #include <gtest/gtest.h>
 #include <regex>
 #include <set>
-#include <sstream>
 
 namespace
 {
@@ -43,8 +43,8 @@ TEST_P(ManualPage, IsRenderedWithoutWarnings)
 
 TEST_P(ManualPage, HoldsToTheMacros)
 {
-    std::istringstream notes(shell("mandoc -T lint '" + std::string(GetParam()) + "'").out);
-    for (std::string note; std::getline(notes, note);)
+    for (std::string const& note :
+         linesOf(shell("mandoc -T lint '" + std::string(GetParam()) + "'").out))
         if (note.find("referenced manual not found") == std::string::npos)
             ADD_FAILURE() << note;
 }

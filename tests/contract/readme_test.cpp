@@ -1,11 +1,10 @@
 // The session that the README shows is one that the program holds.
 
+#include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 
 #include <cstdlib>
-#include <fstream>
 #include <gtest/gtest.h>
-#include <sstream>
 
 namespace
 {
@@ -19,10 +18,9 @@ struct Step {
 
 std::vector<Step> readSession()
 {
-    std::ifstream readme(DOCS_DIR "/../README.md");
     std::vector<Step> steps;
     bool inSession = false;
-    for (std::string line; std::getline(readme, line);)
+    for (std::string const& line : linesOf(contentOf(DOCS_DIR "/../README.md")))
         if (line.rfind("```", 0) == 0)
             inSession = line == "```console";
         else if (inSession && line.rfind("$ ", 0) == 0)

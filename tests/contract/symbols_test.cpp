@@ -2,26 +2,17 @@
 //
 // To write the lists anew, on purpose only: script/symbols --update
 
+#include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 
 #include <algorithm>
-#include <fstream>
 #include <gtest/gtest.h>
 #include <iterator>
-#include <sstream>
 
 namespace
 {
 
 using Names = std::vector<std::string>;
-
-Names linesOf(std::istream&& in)
-{
-    Names lines;
-    for (std::string line; std::getline(in, line);)
-        lines.push_back(line);
-    return lines;
-}
 
 class Symbols : public testing::TestWithParam<char const*>
 {
@@ -30,13 +21,13 @@ protected:
     {
         Outcome const outcome = runToEnd({TESTS_DIR "/../script/symbols", GetParam(), PLUGIN_FILE});
         EXPECT_EQ(outcome.code, 0) << outcome.err;
-        return linesOf(std::istringstream(outcome.out));
+        return linesOf(outcome.out);
     }
 
     static Names listed()
     {
-        std::string const file = std::string(TESTS_DIR "/contract/") + GetParam() + "_symbols.txt";
-        return linesOf(std::ifstream(file));
+        return linesOf(
+            contentOf(std::string(TESTS_DIR "/contract/") + GetParam() + "_symbols.txt"));
     }
 
     /** Those of the one list that the other lacks; both are sorted. */

@@ -1,38 +1,10 @@
-#include <gtest/gtest.h>
+#include "tests/support/Lines.h"
+#include "tests/support/Program.h"
 
-#include <array>
-#include <cstdio>
-#include <fstream>
-#include <memory>
-#include <sstream>
+#include <gtest/gtest.h>
 
 namespace
 {
-
-std::string contentOf(std::string const& path)
-{
-    std::ifstream const file(path);
-    std::ostringstream text;
-    text << file.rdbuf();
-    return text.str();
-}
-
-struct ClosePipe {
-    void operator()(FILE* pipe) const
-    {
-        pclose(pipe);
-    }
-};
-
-std::string outputOf(std::string const& command)
-{
-    std::unique_ptr<FILE, ClosePipe> const pipe(popen(command.c_str(), "r"));
-    std::array<char, 4096> piece{};
-    std::string text;
-    while (std::size_t const length = std::fread(piece.data(), 1, piece.size(), pipe.get()))
-        text.append(piece.data(), length);
-    return text;
-}
 
 TEST(MinimalHost, StandsInTheDocumentWordForWord)
 {
@@ -44,7 +16,7 @@ TEST(MinimalHost, StandsInTheDocumentWordForWord)
 
 TEST(MinimalHost, PrintsTheTreeFromTheTop)
 {
-    std::string const tree = outputOf(MINIMAL_HOST " " PLUGIN_FILE);
+    std::string const tree = runToEnd({MINIMAL_HOST, PLUGIN_FILE}).out;
     EXPECT_EQ(tree.find("1 OsSw Management Interface\n"
                         "  2 ROOT Node\n"
                         "    3 Computer\n"

@@ -2,6 +2,7 @@
 //
 // To write the expected file anew, on purpose only: script/expected-log
 
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -73,15 +74,6 @@ std::vector<std::string> saidByAWholeRun()
         lines.push_back(withoutTimes(line(log)));
     }
     EXPECT_EQ(records.size() % 2, 0U);
-    return lines;
-}
-
-std::vector<std::string> linesOf(std::string const& text)
-{
-    std::vector<std::string> lines;
-    std::istringstream in(text);
-    for (std::string next; std::getline(in, next);)
-        lines.push_back(next);
     return lines;
 }
 

@@ -1,6 +1,7 @@
 // mihost --fast shows and logs what mihost does without it.
 
 #include "tests/sandbox/AccelModules.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
@@ -8,7 +9,6 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 #include <regex>
-#include <sstream>
 
 namespace
 {
@@ -48,10 +48,9 @@ Lines traceLines(std::string const& file)
 {
     static std::regex const moment(
         "(buffer|LastBootTime) = [A-Z][a-z]{2} [A-Z][a-z]{2} [ 0-9]{2} [0-9:]{8}");
-    std::istringstream text(machine::read(file));
-    Lines lines;
-    for (std::string line; std::getline(text, line);)
-        lines.push_back(std::regex_replace(line, moment, "$1 = TIME"));
+    Lines lines = linesOf(machine::read(file));
+    for (std::string& line : lines)
+        line = std::regex_replace(line, moment, "$1 = TIME");
     return lines;
 }
 
@@ -76,9 +75,8 @@ TEST(MihostFast, TellsWithTimingHowEachCommandWasAnswered)
 {
     makeMachine();
     Outcome const run = mihostRun({"--json", "--timing", "--fast", "get", "os", "os-name"});
-    std::istringstream lines(run.err);
     Json answers;
-    for (std::string line; std::getline(lines, line);)
+    for (std::string const& line : linesOf(run.err))
         if (line.rfind("{\"timing\"", 0) == 0)
             answers = Json::parse(line).at("answers");
     std::map<std::string, std::pair<int, int>> counts;

@@ -1,6 +1,7 @@
 // The program itself, run on fixture machines as a person or a script runs it.
 
 #include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
@@ -8,7 +9,6 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
-#include <sstream>
 
 namespace
 {

@@ -1,11 +1,11 @@
 // The shell without a terminal: scripts that drive one loaded plug-in.
 
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
-#include <sstream>
 
 namespace
 {

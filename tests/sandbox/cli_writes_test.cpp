@@ -1,6 +1,7 @@
 // What the program writes really happens, and nothing that it refuses does.
 
 #include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
@@ -8,7 +9,6 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
-#include <sstream>
 
 namespace
 {
@@ -130,10 +130,7 @@ TEST(MihostSecrets, AreHiddenWhereverTheyCouldShowAndShownWhenTold)
               R"({"name":"password","kind":"text","flag":true,"value":null,"hidden":true})");
     // The node keeps the text of the last call.
     Outcome const kept = mihostRun({"shell"}, script + "get os 74\n--show-secrets get os 74\n");
-    Lines lines;
-    std::istringstream stream(kept.out);
-    for (std::string line; std::getline(stream, line);)
-        lines.push_back(line);
+    Lines const lines = linesOf(kept.out);
     ASSERT_EQ(lines.size(), 2U) << kept.out << kept.err;
     EXPECT_EQ(lines[0], " 74 create-user  (hidden)");
     EXPECT_EQ(lines[1], lines[0]); // a plain password never shows
@@ -250,9 +247,8 @@ TEST(MihostRefresh, BuildsUserAndGroupNodesAnew)
     machine::write("/etc/group", "root:x:0:\ncrew:x:1000:\n");
     Outcome const outcome = mihostRun({"--trace", "/tmp/trace", "refresh"});
     EXPECT_EQ(outcome.out, "2 users, 2 groups\n");
-    std::istringstream trace(machine::read("/tmp/trace"));
     std::vector<std::string> seen;
-    for (std::string line; std::getline(trace, line);) {
+    for (std::string const& line : linesOf(machine::read("/tmp/trace"))) {
         Json const record = Json::parse(line);
         if (record["op"] == "node-added" || record["op"] == "node-deleted")
             seen.push_back(record["op"].get<std::string>() + " " +

@@ -1,11 +1,11 @@
 #include "nodes/ids.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Program.h"
 
 #include <algorithm>
 #include <gtest/gtest.h>
-#include <sstream>
 
 namespace
 {
@@ -14,13 +14,9 @@ using Words = std::vector<std::string>;
 
 Words offered(std::string const& word)
 {
-    std::istringstream lines(mihostRun({"__complete", "get", word}).out);
-    std::string line;
-    std::getline(lines, line);
-    EXPECT_EQ(line, "words");
-    Words words;
-    while (std::getline(lines, line))
-        words.push_back(line);
+    Words words = linesOf(mihostRun({"__complete", "get", word}).out);
+    EXPECT_EQ(words.at(0), "words");
+    words.erase(words.begin());
     return words;
 }
 

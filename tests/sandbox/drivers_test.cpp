@@ -2,6 +2,7 @@
 
 #include "nodes/ids.h"
 #include "tests/support/Libc.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -10,7 +11,6 @@
 
 #include <cstdlib>
 #include <filesystem>
-#include <fstream>
 #include <ostream>
 #include <string>
 #include <sys/mount.h>
@@ -118,8 +118,7 @@ TEST_F(Drivers, AreFourHundredWhereTheKernelHasThatMany)
 TEST_F(Drivers, AreThoseOfTheKernel)
 {
     Texts expected;
-    std::ifstream modules("/proc/modules");
-    for (std::string line; std::getline(modules, line);)
+    for (std::string const& line : linesOf(contentOf("/proc/modules")))
         expected.push_back(line.substr(0, line.find(' ')));
     EXPECT_EQ(names(), expected);
 }

@@ -1,6 +1,7 @@
 // Users and groups as the real account tools make them, and what writes to user nodes really do.
 
 #include "nodes/ids.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 
@@ -10,7 +11,6 @@
 #include <cstdlib>
 #include <ctime>
 #include <filesystem>
-#include <sstream>
 #include <string>
 #include <unistd.h>
 #include <vector>
@@ -94,8 +94,7 @@ protected:
     /** One line of what chage lists for jdoe, without the blanks between label and colon. */
     static std::string listed(std::string const& label)
     {
-        std::istringstream lines(outputOf("chage -l jdoe"));
-        for (std::string line; std::getline(lines, line);)
+        for (std::string const& line : linesOf(outputOf("chage -l jdoe")))
             if (line.rfind(label, 0) == 0)
                 return line.substr(line.find(": ") + 2);
         return "(none)";

@@ -3,7 +3,6 @@
 #include <array>
 #include <cstdio>
 #include <memory>
-#include <sstream>
 #include <stdexcept>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -71,13 +70,4 @@ Outcome mihostRun(std::vector<std::string> arguments, std::string const& input)
 {
     arguments.insert(arguments.begin(), MIHOST_FILE);
     return runToEnd(arguments, input);
-}
-
-std::vector<std::string> linesOf(std::string const& text)
-{
-    std::istringstream stream(text);
-    std::vector<std::string> lines;
-    for (std::string line; std::getline(stream, line);)
-        lines.push_back(line);
-    return lines;
 }

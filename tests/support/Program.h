@@ -22,7 +22,4 @@ Outcome runToEnd(std::vector<std::string> const& arguments, std::string const& i
 /** Runs mihost with the plug-in that was built beside it. */
 Outcome mihostRun(std::vector<std::string> arguments, std::string const& input = "");
 
-/** The lines of what a program wrote, without their ends. */
-std::vector<std::string> linesOf(std::string const& text);
-
 #endif

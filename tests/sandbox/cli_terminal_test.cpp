@@ -203,6 +203,7 @@ TEST_F(MihostTerminal, IsLeftCleanByCtrlCDuringTheStart)
     machine::fake("/usr/sbin/modinfo", "echo asked >/dev/tty; exec sleep 1000\n");
     for (Lines const& arguments : {Lines{"tree"}, Lines{"--sandbox", "tree"}}) {
         TerminalRun run(arguments);
+        run.dropNothingWithCtrlC();
         run.waitFor("drivers 1/2");
         run.waitFor("asked");
         run.type(ctrlC);

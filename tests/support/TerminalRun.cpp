@@ -78,6 +78,14 @@ void TerminalRun::resize(unsigned short columns) const
     ioctl(master_, TIOCSWINSZ, &size); // the kernel sends SIGWINCH
 }
 
+void TerminalRun::dropNothingWithCtrlC() const
+{
+    termios settings{};
+    tcgetattr(master_, &settings);
+    settings.c_lflag |= NOFLSH;
+    tcsetattr(master_, TCSANOW, &settings);
+}
+
 bool TerminalRun::showsInput() const
 {
     termios settings{};

@@ -27,6 +27,9 @@ public:
 
     void resize(unsigned short columns) const;
 
+    /** Keeps the kernel from dropping what is on its way to the terminal when Ctrl-C is typed. */
+    void dropNothingWithCtrlC() const;
+
     /** Whether the terminal shows what is typed. */
     bool showsInput() const;
 

@@ -1,6 +1,6 @@
 #include "bench/support/MadeUp.h"
 
-#include "tests/sandbox/AccelModules.h"
+#include "tests/support/KernelModules.h"
 #include "tests/support/Machine.h"
 
 #include <fstream>
@@ -32,7 +32,7 @@ void accounts(int users)
 
 void modules(int count)
 {
-    std::vector<accelModules::Loaded> loaded;
+    std::vector<kernelModules::Loaded> loaded;
     for (int i = 0; i < count; ++i) {
         std::string const name = "module_" + std::to_string(i);
         std::vector<std::string> facts{"description=Driver number " + std::to_string(i),
@@ -49,12 +49,12 @@ void modules(int count)
         for (int alias = 0; alias < 8; ++alias)
             facts.push_back("alias=pci:v00008086d0000" + std::to_string(1000 + alias) +
                             "sv*sd*bc*sc*i*");
-        accelModules::write("kernel/drivers/" + name + ".ko", accelModules::file(facts));
+        kernelModules::write("kernel/drivers/" + name + ".ko", kernelModules::file(facts));
         loaded.push_back({name, 16384L + 4096L * i, i % 3, {}});
     }
     if (count > 0)
-        accelModules::index();
-    accelModules::load(loaded);
+        kernelModules::index();
+    kernelModules::load(loaded);
 }
 
 void systemLog(int lines)

@@ -1,6 +1,6 @@
 // mihost --fast shows and logs what mihost does without it.
 
-#include "tests/sandbox/AccelModules.h"
+#include "tests/support/KernelModules.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
@@ -24,19 +24,19 @@ void makeMachine()
 {
     machine::lay("plain");
     setenv("PATH", "/usr/sbin:/usr/bin", 1);
-    std::vector<accelModules::Loaded> loaded;
+    std::vector<kernelModules::Loaded> loaded;
     for (int i = 0; i < moduleCount; ++i) {
         std::string const name = "module_" + std::to_string(i);
         Lines facts{"description=Module number " + std::to_string(i), "license=GPL",
                     "parm=debug:How much to say", "parmtype=debug:int"};
         if (i % 3 != 0)
             facts.push_back("version=1." + std::to_string(i));
-        accelModules::write("kernel/" + name + ".ko", accelModules::file(facts));
+        kernelModules::write("kernel/" + name + ".ko", kernelModules::file(facts));
         loaded.push_back({name, 4096L * i, i % 2, i > 0 ? Lines{"module_0"} : Lines{}});
     }
     loaded.push_back({"without_a_file", 1, 0, {}});
-    accelModules::index();
-    accelModules::load(loaded);
+    kernelModules::index();
+    kernelModules::load(loaded);
     std::string log;
     for (int i = 0; i < logLines; ++i)
         log += "Jan  2 03:04:05 host daemon: line " + std::to_string(i) + '\n';

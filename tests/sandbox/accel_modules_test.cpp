@@ -1,7 +1,7 @@
 // lsmod and modinfo, asked in both ways and compared byte by byte.
 
-#include "tests/sandbox/AccelModules.h"
 #include "tests/support/BothWays.h"
+#include "tests/support/KernelModules.h"
 #include "tests/support/Machine.h"
 
 #include <filesystem>
@@ -11,19 +11,19 @@
 namespace
 {
 
-using accelModules::Loaded;
 using bothways::answered;
 using bothways::real;
+using kernelModules::Loaded;
 
 using Facts = std::vector<std::string>;
 
 TEST(AccelLsmod, ListsWhatIsLoadedAsLsmodDoes)
 {
-    accelModules::load({{"ext4", 1011712, 1, {}},
-                        {"mbcache", 16384, 1, {"ext4"}},
-                        {"crc16", 16384, 3, {"ext4", "bluetooth", "l2tp_core"}},
-                        {"a_module_with_a_very_long_name_indeed", 123456789012, 70000, {}},
-                        {"going", 0, -1, {}}});
+    kernelModules::load({{"ext4", 1011712, 1, {}},
+                         {"mbcache", 16384, 1, {"ext4"}},
+                         {"crc16", 16384, 3, {"ext4", "bluetooth", "l2tp_core"}},
+                         {"a_module_with_a_very_long_name_indeed", 123456789012, 70000, {}},
+                         {"going", 0, -1, {}}});
     std::string const text = real("lsmod");
     EXPECT_NE(text.find("mbcache                16384  1 ext4\n"), std::string::npos) << text;
     EXPECT_EQ(answered("lsmod"), text);
@@ -42,20 +42,20 @@ TEST(AccelLsmod, ListsHundredsOfModulesAsLsmodDoes)
             module.holders.push_back(modules[random() % modules.size()].name);
         modules.push_back(module);
     }
-    accelModules::load(modules);
+    kernelModules::load(modules);
     EXPECT_EQ(answered("lsmod"), real("lsmod"));
 }
 
 TEST(AccelLsmod, ListsNothingButTheHeadWhenNothingIsLoaded)
 {
-    accelModules::load({});
+    kernelModules::load({});
     EXPECT_EQ(answered("lsmod"), "Module                  Size  Used by\n");
     EXPECT_EQ(answered("lsmod"), real("lsmod"));
 }
 
 TEST(AccelLsmod, StepsAsideWhereLsmodWouldComplain)
 {
-    accelModules::load({{"one", 1, 0, {}}});
+    kernelModules::load({{"one", 1, 0, {}}});
     std::filesystem::remove("/sys/module/one/holders");
     EXPECT_NE(real("lsmod").find("ERROR"), std::string::npos);
     EXPECT_FALSE(answered("lsmod"));
@@ -65,14 +65,14 @@ TEST(AccelLsmod, StepsAsideWhereLsmodWouldComplain)
 
 TEST(AccelLsmod, IsAsNegativeAsLsmodForModulesThatJustWent)
 {
-    accelModules::load({{"one", 1, 0, {}}});
+    kernelModules::load({{"one", 1, 0, {}}});
     machine::remove("/sys/module/one/refcnt");
     EXPECT_EQ(answered("lsmod"), real("lsmod"));
 }
 
 TEST(AccelLsmod, LetsAStandInWin)
 {
-    accelModules::load({});
+    kernelModules::load({});
     machine::fake("/usr/local/bin/lsmod", "echo stand-in\n");
     setenv("PATH", "/usr/local/bin:/usr/sbin:/usr/bin", 1);
     EXPECT_EQ(real("lsmod"), "stand-in\n");
@@ -86,13 +86,13 @@ TEST(AccelLsmod, LetsAStandInWin)
 
 TEST(AccelModinfo, TellsWhatModinfoTells)
 {
-    accelModules::write(
+    kernelModules::write(
         "kernel/one.ko",
-        accelModules::file({"version=1.2.3", "description=One and only", "author=A", "author=B",
-                            "license=GPL", "alias=pci:v*d*", "depends=", "name=one"}));
-    accelModules::index();
+        kernelModules::file({"version=1.2.3", "description=One and only", "author=A", "author=B",
+                             "license=GPL", "alias=pci:v*d*", "depends=", "name=one"}));
+    kernelModules::index();
     std::string const text = real("modinfo one");
-    EXPECT_EQ(text, "filename:       " + accelModules::folder() +
+    EXPECT_EQ(text, "filename:       " + kernelModules::folder() +
                         "/kernel/one.ko\n"
                         "version:        1.2.3\n"
                         "description:    One and only\n"
@@ -107,12 +107,12 @@ TEST(AccelModinfo, TellsWhatModinfoTells)
 
 TEST(AccelModinfo, PutsParametersTogetherAsModinfoDoes)
 {
-    accelModules::write(
+    kernelModules::write(
         "one.ko",
-        accelModules::file({"parm=a:first", "parmtype=a:int", "parmtype=b:bool",
-                            "parm=b:second:with colon", "parm=text:only", "parmtype=type:only",
-                            "parm=a:again", "parm=:", "parmtype=empty:", "parm=ab:", "x=y"}));
-    accelModules::index();
+        kernelModules::file({"parm=a:first", "parmtype=a:int", "parmtype=b:bool",
+                             "parm=b:second:with colon", "parm=text:only", "parmtype=type:only",
+                             "parm=a:again", "parm=:", "parmtype=empty:", "parm=ab:", "x=y"}));
+    kernelModules::index();
     EXPECT_EQ(answered("modinfo one"), real("modinfo one"));
 }
 
@@ -146,10 +146,10 @@ std::string randomModule(std::mt19937& random)
     Facts facts;
     for (unsigned long count = random() % 25; count > 0; --count)
         facts.push_back(randomFact(random));
-    std::string content = accelModules::file(facts);
+    std::string content = kernelModules::file(facts);
     switch (random() % 10) {
     case 0:
-        return content + accelModules::signature("somebody\xff");
+        return content + kernelModules::signature("somebody\xff");
     case 1:
         return content.substr(0, random() % content.size());
     case 2:
@@ -177,9 +177,9 @@ TEST(AccelModinfo, AgreesWithModinfoOnThousandsOfModules)
     std::mt19937 random(11);
     constexpr int modules = 1000;
     for (int i = 0; i < modules; ++i)
-        accelModules::write("kernel/drivers/mod-" + std::to_string(i) + ".ko",
-                            randomModule(random));
-    accelModules::index();
+        kernelModules::write("kernel/drivers/mod-" + std::to_string(i) + ".ko",
+                             randomModule(random));
+    kernelModules::index();
     for (int i = 0; i < modules; ++i) {
         expectAgreement("mod_" + std::to_string(i));
         expectAgreement("mod-" + std::to_string(i));
@@ -188,17 +188,17 @@ TEST(AccelModinfo, AgreesWithModinfoOnThousandsOfModules)
 
 TEST(AccelModinfo, AgreesWithModinfoOnNamesThatAreNotThoseOfOneModule)
 {
-    accelModules::write("a.ko",
-                        accelModules::file({"alias=net-pf-1", "alias=other_name", "name=a"}));
-    accelModules::write("b.ko", accelModules::file({"alias=net-pf-*", "alias=other_name"}));
-    accelModules::write("extra/c.ko", accelModules::file({"description=extra"}));
-    accelModules::write("kernel/c.ko", accelModules::file({"description=kernel"}));
-    accelModules::write("modules.builtin", "kernel/built_in.ko\nkernel/known.ko\n");
-    accelModules::write("modules.builtin.modinfo",
-                        std::string("known.version=7\0known.alias=net-pf-9\0"
-                                    "known.parm=x:text\0known.parmtype=x:int\0",
-                                    75));
-    accelModules::index();
+    kernelModules::write("a.ko",
+                         kernelModules::file({"alias=net-pf-1", "alias=other_name", "name=a"}));
+    kernelModules::write("b.ko", kernelModules::file({"alias=net-pf-*", "alias=other_name"}));
+    kernelModules::write("extra/c.ko", kernelModules::file({"description=extra"}));
+    kernelModules::write("kernel/c.ko", kernelModules::file({"description=kernel"}));
+    kernelModules::write("modules.builtin", "kernel/built_in.ko\nkernel/known.ko\n");
+    kernelModules::write("modules.builtin.modinfo",
+                         std::string("known.version=7\0known.alias=net-pf-9\0"
+                                     "known.parm=x:text\0known.parmtype=x:int\0",
+                                     75));
+    kernelModules::index();
     for (char const* name : {"a", "b", "c", "net-pf-1", "net_pf_1", "net-pf-2", "net-pf-9",
                              "other_name", "other-name", "built_in", "known", "nothing", "A", "ab"})
         expectAgreement(name);
@@ -206,9 +206,9 @@ TEST(AccelModinfo, AgreesWithModinfoOnNamesThatAreNotThoseOfOneModule)
 
 TEST(AccelModinfo, ReadsCompressedModules)
 {
-    accelModules::write("one.ko", accelModules::file({"version=1", "description=compressed"}));
-    ASSERT_EQ(std::system(("xz " + accelModules::folder() + "/one.ko").c_str()), 0);
-    accelModules::index();
+    kernelModules::write("one.ko", kernelModules::file({"version=1", "description=compressed"}));
+    ASSERT_EQ(std::system(("xz " + kernelModules::folder() + "/one.ko").c_str()), 0);
+    kernelModules::index();
     EXPECT_NE(real("modinfo one").find("one.ko.xz"), std::string::npos);
     expectAgreement("one");
 }
@@ -216,13 +216,13 @@ TEST(AccelModinfo, ReadsCompressedModules)
 TEST(AccelModinfo, SeesWhatChangedSinceTheLastTime)
 {
     for (char const* version : {"version=1", "version=2"}) {
-        accelModules::write("one.ko", accelModules::file({version}));
-        accelModules::index();
+        kernelModules::write("one.ko", kernelModules::file({version}));
+        kernelModules::index();
         expectAgreement("one");
     }
-    machine::remove(accelModules::folder() + "/one.ko");
+    machine::remove(kernelModules::folder() + "/one.ko");
     expectAgreement("one");
-    accelModules::index();
+    kernelModules::index();
     expectAgreement("one");
 }
 

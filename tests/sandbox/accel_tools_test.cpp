@@ -1,8 +1,8 @@
 // On a machine whose shell or tools are not as their packages installed them, those that are there
 // have the word.
 
-#include "tests/sandbox/AccelModules.h"
 #include "tests/support/BothWays.h"
+#include "tests/support/KernelModules.h"
 #include "tests/support/Machine.h"
 
 #include <cstdlib>
@@ -120,7 +120,7 @@ TEST(AccelTools, StepAsideForALibraryThatIsPutIntoEveryProgram)
 
 TEST(AccelTools, StepAsideForModulesWhereLibkmodChangedSinceTheStart)
 {
-    accelModules::load({});
+    kernelModules::load({});
     ASSERT_TRUE(answered("lsmod"));
     ASSERT_EQ(std::system("library=$(readlink -f /usr/lib/*/libkmod.so.2) && "
                           "cp -a $library /tmp/library && mv /tmp/library $library"),

@@ -1,4 +1,4 @@
-#include "tests/sandbox/AccelModules.h"
+#include "tests/support/KernelModules.h"
 
 #include "tests/support/Machine.h"
 
@@ -11,7 +11,7 @@
 #include <sys/mount.h>
 #include <sys/utsname.h>
 
-namespace accelModules
+namespace kernelModules
 {
 
 namespace
@@ -157,4 +157,4 @@ void load(std::vector<Loaded> const& modules)
     machine::write("/proc/modules", list);
 }
 
-} // namespace accelModules
+} // namespace kernelModules

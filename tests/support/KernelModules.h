@@ -1,11 +1,11 @@
-#ifndef TESTS_SANDBOX_ACCELMODULES_H
-#define TESTS_SANDBOX_ACCELMODULES_H
+#ifndef TESTS_SUPPORT_KERNELMODULES_H
+#define TESTS_SUPPORT_KERNELMODULES_H
 
 #include <string>
 #include <vector>
 
 /** Kernel modules of our own making, for the copy of the machine that a test runs in. */
-namespace accelModules
+namespace kernelModules
 {
 
 /** The folder where the running kernel's modules are looked for. */
@@ -38,6 +38,6 @@ struct Loaded {
 /** From now on these modules are loaded, for all that reads /proc/modules and /sys/module. */
 void load(std::vector<Loaded> const& modules);
 
-} // namespace accelModules
+} // namespace kernelModules
 
 #endif

@@ -121,7 +121,7 @@ int main(int argc, char** argv)
         std::cerr << "soak: SHARE is a percentage from 1 to 100\n";
         return 2;
     }
-    if (auto const reason = mihost::enterSandbox({})) {
+    if (auto const reason = mihost::enterSandbox()) {
         std::cerr << "soak: no copy of this machine can be had: " << *reason << '\n';
         return 1;
     }

@@ -21,7 +21,7 @@ namespace
 
 void goIntoSandbox(std::string const& overlay)
 {
-    if (auto const reason = enterSandbox({overlay}))
+    if (auto const reason = enterSandbox(overlay))
         throw Failure(BadUsage, fmt::format("no sandbox, so nothing was run: {}", *reason));
 }
 

@@ -137,10 +137,10 @@ std::string runAsCaller(pid_t child, Descriptor report)
 
 } // namespace
 
-std::optional<std::string> enterSandbox(SandboxOptions const& options)
+std::optional<std::string> enterSandbox(std::string const& overlay)
 {
     try {
-        Descriptor overlay = options.overlay.empty() ? Descriptor() : openFolder(options.overlay);
+        Descriptor folder = overlay.empty() ? Descriptor() : openFolder(overlay);
         Pipe report;
         HeldSignals const held;
         signal(SIGCHLD, SIG_DFL); // where it is ignored, no child's end would be seen
@@ -148,7 +148,7 @@ std::optional<std::string> enterSandbox(SandboxOptions const& options)
         pid_t const child = forkFirstProcess();
         if (child == 0) {
             report.readEnd.reset();
-            runAsFirstProcess(std::move(overlay), std::move(report.writeEnd));
+            runAsFirstProcess(std::move(folder), std::move(report.writeEnd));
             inside = true;
             return std::nullopt;
         }

@@ -8,11 +8,6 @@
 namespace mihost
 {
 
-struct SandboxOptions {
-    /** A folder whose files are laid over the copy first; empty for none. */
-    std::string overlay;
-};
-
 /**
  * Goes on in a copy-on-write copy of this machine: every command really runs there, nothing on the
  * machine changes.
@@ -31,9 +26,10 @@ struct SandboxOptions {
  * Call it before any thread is started. Needs CAP_SYS_ADMIN, as root has it. An unprivileged user
  * namespace is no way round: it may not overlay / and knows no accounts to change.
  *
+ * @param overlay  a folder whose files are laid over the copy first; empty for none
  * @return nothing inside the copy; where no copy can be had, the reason, in the caller's process
  */
-std::optional<std::string> enterSandbox(SandboxOptions const& options);
+std::optional<std::string> enterSandbox(std::string const& overlay = "");
 
 /** Whether this process runs in a copy that enterSandbox made. */
 bool inSandbox();

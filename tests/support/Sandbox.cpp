@@ -38,7 +38,7 @@ int runTestsInSandbox(int argc, char* argv[])
     setenv("LC_ALL", "C", 1);
     testing::InitGoogleTest(&argc, argv);
     if (!testing::GTEST_FLAG(list_tests)) {
-        if (auto const reason = mihost::enterSandbox({})) {
+        if (auto const reason = mihost::enterSandbox()) {
             if (sandboxIsRequired()) {
                 std::cerr << "no sandbox: " << *reason << '\n';
                 return EXIT_FAILURE;

@@ -35,8 +35,10 @@ std::string ScratchFolder::path(std::string const& name) const
 
 std::string ScratchFolder::write(std::string const& name, std::string const& content) const
 {
-    std::ofstream(path(name), std::ios::binary | std::ios::trunc) << content;
-    return path(name);
+    std::string const file = path(name);
+    std::filesystem::create_directories(std::filesystem::path(file).parent_path());
+    std::ofstream(file, std::ios::binary | std::ios::trunc) << content;
+    return file;
 }
 
 void ScratchFolder::append(std::string const& name, std::string const& content) const

@@ -17,7 +17,12 @@ public:
     /** The full path of a name in it. */
     std::string path(std::string const& name) const;
 
-    /** Gives a file this content, keeping the file where there is one. */
+    /**
+     * Gives a file this content, keeping the file where there is one, and makes the folders that
+     * lead to it.
+     *
+     * @return its full path
+     */
     std::string write(std::string const& name, std::string const& content) const;
 
     void append(std::string const& name, std::string const& content) const;

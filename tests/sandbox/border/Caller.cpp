@@ -4,9 +4,6 @@
 
 #include <csignal>
 #include <cstdlib>
-#include <filesystem>
-#include <fstream>
-#include <sstream>
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -18,8 +15,7 @@ constexpr int refused = 99;
 
 int Caller::speaker = -1;
 
-Caller::Caller(Inside inside, mihost::SandboxOptions const& options,
-               std::function<void()> const& before)
+Caller::Caller(Inside inside, std::string const& overlay, std::function<void()> const& before)
     : process_(-1)
 {
     int ends[2];
@@ -33,7 +29,7 @@ Caller::Caller(Inside inside, mihost::SandboxOptions const& options,
     ear_.reset();
     speaker = mouth.get();
     before();
-    if (auto const reason = mihost::enterSandbox(options)) {
+    if (auto const reason = mihost::enterSandbox(overlay)) {
         say(*reason);
         _exit(refused);
     }
@@ -86,39 +82,6 @@ int Caller::wait()
     int status = 0;
     waitpid(std::exchange(process_, -1), &status, 0);
     return status;
-}
-
-Folder::Folder()
-{
-    char path[] = "/tmp/oswmi-XXXXXX";
-    if (!mkdtemp(path))
-        throw std::runtime_error("no folder");
-    path_ = path;
-}
-
-Folder::~Folder()
-{
-    std::filesystem::remove_all(path_);
-}
-
-std::string Folder::path(std::string const& name) const
-{
-    return name.empty() ? path_ : path_ + "/" + name;
-}
-
-void Folder::write(std::string const& name, std::string const& text, mode_t mode) const
-{
-    std::filesystem::create_directories(std::filesystem::path(path(name)).parent_path());
-    std::ofstream(path(name)) << text;
-    chmod(path(name).c_str(), mode);
-}
-
-std::string readFile(std::string const& path)
-{
-    std::ifstream file(path);
-    std::ostringstream text;
-    text << file.rdbuf();
-    return text.str();
 }
 
 bool exists(std::string const& path)

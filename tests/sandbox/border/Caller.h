@@ -21,11 +21,12 @@ public:
     using Inside = std::function<int()>;
 
     /**
-     * @param inside  what runs in the copy; its result is the exit code
-     * @param before  what the calling process does first
+     * @param inside   what runs in the copy; its result is the exit code
+     * @param overlay  a folder to lay over the copy
+     * @param before   what the calling process does first
      */
     explicit Caller(
-        Inside inside, mihost::SandboxOptions const& options = {},
+        Inside inside, std::string const& overlay = "",
         std::function<void()> const& before = [] {});
     ~Caller();
     Caller(Caller const&) = delete;
@@ -52,23 +53,7 @@ private:
     pid_t process_;
 };
 
-/** A new empty folder below /tmp, removed at the end. */
-class Folder
-{
-public:
-    Folder();
-    ~Folder();
-    Folder(Folder const&) = delete;
-    Folder& operator=(Folder const&) = delete;
-
-    std::string path(std::string const& name = "") const;
-    void write(std::string const& name, std::string const& text, mode_t mode = 0644) const;
-
-private:
-    std::string path_;
-};
-
-std::string readFile(std::string const& path);
+/** Whether anything stands there, be it a link that leads nowhere. */
 bool exists(std::string const& path);
 
 /** Skips its tests where no copy can be had, unless MI_SANDBOX_REQUIRED is 1. */

@@ -1,6 +1,8 @@
 // What must hold between a copy of the machine and the machine itself, seen from the machine.
 
 #include "tests/sandbox/border/Caller.h"
+#include "tests/support/Lines.h"
+#include "tests/support/ScratchFolder.h"
 
 #include <algorithm>
 #include <csignal>
@@ -20,7 +22,7 @@ namespace
 
 std::string mountTable()
 {
-    return readFile("/proc/self/mountinfo");
+    return contentOf("/proc/self/mountinfo");
 }
 
 std::string hostName()
@@ -34,7 +36,7 @@ std::string hostName()
 bool wrote(std::string const& path, std::string const& text)
 {
     std::ofstream(path) << text;
-    return readFile(path) == text;
+    return contentOf(path) == text;
 }
 
 /** From here on the calling process's mounts are its own; nobody else sees them. */
@@ -57,11 +59,11 @@ class Border : public BorderTest
 
 TEST_F(Border, WritesInsideDoNotReachTheMachinesFiles)
 {
-    Folder const folder;
+    ScratchFolder const folder;
     folder.write("file", "before");
     Caller caller([&folder] { return wrote(folder.path("file"), "after") ? 0 : 1; });
     EXPECT_EQ(caller.wait(), 0);
-    EXPECT_EQ(readFile(folder.path("file")), "before");
+    EXPECT_EQ(contentOf(folder.path("file")), "before");
 }
 
 TEST_F(Border, NewFilesInsideDoNotShowOnTheMachine)
@@ -80,7 +82,7 @@ TEST_F(Border, NewFilesInsideDoNotShowOnTheMachine)
 
 TEST_F(Border, FilesRemovedInsideStayOnTheMachine)
 {
-    Folder const folder;
+    ScratchFolder const folder;
     folder.write("file", "before");
     Caller caller([&folder] {
         return unlink(folder.path("file").c_str()) == 0 && !exists(folder.path("file")) ? 0 : 1;
@@ -91,10 +93,10 @@ TEST_F(Border, FilesRemovedInsideStayOnTheMachine)
 
 TEST_F(Border, AccountsMadeInsideDoNotShowOnTheMachine)
 {
-    std::string const before = readFile("/etc/passwd");
+    std::string const before = contentOf("/etc/passwd");
     Caller caller([] { return system("/usr/sbin/useradd -M oswmiborder") == 0 ? 0 : 1; });
     EXPECT_EQ(caller.wait(), 0);
-    EXPECT_EQ(readFile("/etc/passwd"), before);
+    EXPECT_EQ(contentOf("/etc/passwd"), before);
 }
 
 TEST_F(Border, MountsOfTheMachineStayAsTheyAreWhileACopyIsThere)
@@ -129,7 +131,7 @@ TEST_F(Border, MountsMadeInsideDoNotShowOnTheMachine)
 TEST_F(Border, ACrashInsideLeavesNothingAndShowsAsACrash)
 {
     std::string const mounts = mountTable();
-    Folder const folder;
+    ScratchFolder const folder;
     folder.write("file", "before");
     Caller caller([&folder]() -> int {
         wrote(folder.path("file"), "after");
@@ -142,7 +144,7 @@ TEST_F(Border, ACrashInsideLeavesNothingAndShowsAsACrash)
     ASSERT_TRUE(WIFSIGNALED(status));
     EXPECT_EQ(WTERMSIG(status), SIGABRT);
     EXPECT_EQ(mountTable(), mounts);
-    EXPECT_EQ(readFile(folder.path("file")), "before");
+    EXPECT_EQ(contentOf(folder.path("file")), "before");
 }
 
 TEST_F(Border, TheExitCodeInsideIsThatOfTheCaller)
@@ -200,7 +202,7 @@ TEST_F(Border, ATerminalsInterruptReachesTheSandboxedProcessOnce)
             Caller::say(".");
             waitForSignals();
         },
-        {},
+        "",
         [&name] {
             setsid();
             // The first terminal that a session's leader opens is the session's own.
@@ -231,13 +233,13 @@ TEST_F(Border, EverythingInsideDiesWithTheCaller)
 
 TEST_F(Border, WorksWhereTheCallerWasStartedWithChildrenIgnored)
 {
-    Caller caller([] { return 42; }, {}, [] { std::signal(SIGCHLD, SIG_IGN); });
+    Caller caller([] { return 42; }, "", [] { std::signal(SIGCHLD, SIG_IGN); });
     EXPECT_EQ(WEXITSTATUS(caller.wait()), 42);
 }
 
 TEST_F(Border, TextKeptBackByTheCallerIsWrittenOnce)
 {
-    Folder const folder;
+    ScratchFolder const folder;
     std::string const path = folder.path("out");
     FILE* out = nullptr;
     Caller caller(
@@ -246,14 +248,14 @@ TEST_F(Border, TextKeptBackByTheCallerIsWrittenOnce)
             std::exit(0);
             return 0;
         },
-        {},
+        "",
         [&out, &path] {
             // On the real file: a path would lead into the copy.
             out = std::fopen(path.c_str(), "w");
             std::fputs("before ", out);
         });
     caller.wait();
-    EXPECT_EQ(readFile(path), "before inside ");
+    EXPECT_EQ(contentOf(path), "before inside ");
 }
 
 TEST_F(Border, SharedMemoryMadeInsideDoesNotShowOnTheMachine)
@@ -279,15 +281,15 @@ TEST_F(Border, TheHostNameInsideIsNotTheMachines)
 
 TEST_F(Border, OtherFileSystemsAreCopiedOnWriteToo)
 {
-    Folder const folder;
+    ScratchFolder const folder;
     std::string const file = folder.path("disk/sub folder,:\\/file");
     // In a mount namespace of the caller's own, a second file system.
     Caller caller(
         [&file] {
-            Caller::say(readFile(file));
+            Caller::say(contentOf(file));
             return wrote(file, "after") ? 0 : 1;
         },
-        {},
+        "",
         [&folder, &file] {
             folder.write("disk/none", "");
             ownMounts();
@@ -300,7 +302,7 @@ TEST_F(Border, OtherFileSystemsAreCopiedOnWriteToo)
             if (pid_t const child = fork()) {
                 int status = 0;
                 waitpid(child, &status, 0);
-                Caller::say(" " + readFile(file));
+                Caller::say(" " + contentOf(file));
                 _exit(WEXITSTATUS(status));
             }
         });
@@ -310,14 +312,14 @@ TEST_F(Border, OtherFileSystemsAreCopiedOnWriteToo)
 
 TEST_F(Border, AFileSystemThatCannotBeOverlaidCanBeReadButNotWritten)
 {
-    Folder const folder;
+    ScratchFolder const folder;
     std::string const disk = folder.path("disk");
     Caller caller(
         [&disk] {
-            bool const canBeRead = readFile(disk + "/file") == "before";
+            bool const canBeRead = contentOf(disk + "/file") == "before";
             return canBeRead && access(disk.c_str(), W_OK) != 0 && errno == EROFS ? 0 : 1;
         },
-        {},
+        "",
         [&folder, &disk] {
             folder.write("disk/none", "");
             ownMounts();
@@ -337,21 +339,21 @@ TEST_F(Border, AFileSystemThatCannotBeOverlaidCanBeReadButNotWritten)
 
 TEST_F(Border, AFileMountedOverAnotherIsCopiedWithItsOwnerAndMode)
 {
-    Folder const folder;
-    folder.write("over", "over", 0640);
-    folder.write("below", "below", 0644);
+    ScratchFolder const folder;
+    chmod(folder.write("over", "over").c_str(), 0640);
+    chmod(folder.write("below", "below").c_str(), 0644);
     Caller caller(
         [&folder] {
             struct stat status {
             };
             stat(folder.path("below").c_str(), &status);
-            return readFile(folder.path("below")) == "over" && (status.st_mode & 07777) == 0640 &&
+            return contentOf(folder.path("below")) == "over" && (status.st_mode & 07777) == 0640 &&
                            status.st_uid == 12 && status.st_gid == 34 &&
                            wrote(folder.path("below"), "after")
                        ? 0
                        : 1;
         },
-        {},
+        "",
         [&folder] {
             if (chown(folder.path("over").c_str(), 12, 34) != 0)
                 _exit(1);
@@ -360,25 +362,25 @@ TEST_F(Border, AFileMountedOverAnotherIsCopiedWithItsOwnerAndMode)
                   nullptr);
         });
     EXPECT_EQ(caller.wait(), 0);
-    EXPECT_EQ(readFile(folder.path("over")), "over");
-    EXPECT_EQ(readFile(folder.path("below")), "below");
+    EXPECT_EQ(contentOf(folder.path("over")), "over");
+    EXPECT_EQ(contentOf(folder.path("below")), "below");
 }
 
 TEST_F(Border, KeepsTheWorkingDirectory)
 {
-    Folder const folder;
+    ScratchFolder const folder;
     Caller caller(
         [] {
             char path[4096] = "";
             Caller::say(getcwd(path, sizeof path) ? path : "none");
             return 0;
         },
-        {},
+        "",
         [&folder] {
-            if (chdir(folder.path().c_str()) != 0)
+            if (chdir(folder.name().c_str()) != 0)
                 _exit(1);
         });
-    EXPECT_EQ(caller.hearAll(), folder.path());
+    EXPECT_EQ(caller.hearAll(), folder.name());
 }
 
 TEST_F(Border, GoesToTheRootWhereTheWorkingDirectoryIsNotInTheCopy)
@@ -389,7 +391,7 @@ TEST_F(Border, GoesToTheRootWhereTheWorkingDirectoryIsNotInTheCopy)
             Caller::say(getcwd(path, sizeof path) ? path : "none");
             return 0;
         },
-        {},
+        "",
         [] {
             ownMounts();
             mount("tmpfs", "/run", "tmpfs", 0, "");

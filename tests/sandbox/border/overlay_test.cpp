@@ -1,6 +1,8 @@
 // The folder laid over a copy, and the calls for a copy that are refused.
 
 #include "tests/sandbox/border/Caller.h"
+#include "tests/support/Lines.h"
+#include "tests/support/ScratchFolder.h"
 
 #include <sys/stat.h>
 #include <sys/wait.h>
@@ -33,7 +35,7 @@ std::string describe(std::initializer_list<char const*> paths)
             char target[256] = "";
             lines += readlink(path, target, sizeof target - 1) > 0 ? target : "?";
         } else if (S_ISREG(status.st_mode)) {
-            lines += readFile(path);
+            lines += contentOf(path);
         }
         lines += '\n';
     }
@@ -51,7 +53,7 @@ protected:
                 Caller::say(describe(paths));
                 return 0;
             },
-            {folder.path()});
+            folder.name());
         std::string said = caller.hearAll();
         caller.wait();
         return said;
@@ -59,20 +61,20 @@ protected:
 
     /** Why no copy could be had with these options. */
     static std::string reason(
-        mihost::SandboxOptions const& options, std::function<void()> const& before = [] {})
+        std::string const& overlay, std::function<void()> const& before = [] {})
     {
-        Caller caller([] { return 0; }, options, before);
+        Caller caller([] { return 0; }, overlay, before);
         std::string said = caller.hearAll();
         EXPECT_NE(caller.wait(), 0);
         return said;
     }
 
-    Folder folder;
+    ScratchFolder const folder;
 };
 
 TEST_F(Overlay, FilesBelongToRootAndKeepTheirModes)
 {
-    folder.write("etc/oswmi/file", "text", 0751);
+    chmod(folder.write("etc/oswmi/file", "text").c_str(), 0751);
     ASSERT_EQ(chown(folder.path("etc/oswmi/file").c_str(), 12, 34), 0);
     EXPECT_EQ(laid({"/etc/oswmi/file"}), "751 0:0 text\n");
 }
@@ -103,20 +105,20 @@ TEST_F(Overlay, NewFoldersKeepTheirModesAndOldOnesAreLeftAlone)
 TEST_F(Overlay, FollowsTheMachinesLinksToFolders)
 {
     ASSERT_EQ(statusOf("/bin").st_mode & S_IFMT, static_cast<unsigned int>(S_IFLNK));
-    folder.write("bin/oswmi", "text", 0755);
+    chmod(folder.write("bin/oswmi", "text").c_str(), 0755);
     EXPECT_EQ(laid({"/usr/bin/oswmi"}), "755 0:0 text\n");
 }
 
 TEST_F(Overlay, ShadowFilesThatEverybodyCouldReadBecomeRootsAlone)
 {
-    folder.write("etc/shadow", "", 0644);
-    folder.write("etc/gshadow", "", 0604);
+    chmod(folder.write("etc/shadow", "").c_str(), 0644);
+    chmod(folder.write("etc/gshadow", "").c_str(), 0604);
     EXPECT_EQ(laid({"/etc/shadow", "/etc/gshadow"}), "600 0:0 \n600 0:0 \n");
 }
 
 TEST_F(Overlay, ShadowFilesWithAModeOfTheirOwnKeepIt)
 {
-    folder.write("etc/shadow", "", 0640);
+    chmod(folder.write("etc/shadow", "").c_str(), 0640);
     EXPECT_EQ(laid({"/etc/shadow"}), "640 0:0 \n");
 }
 
@@ -129,20 +131,20 @@ TEST_F(Overlay, LaysOverWhatAlsoLiesInTheMachinesTemporaryOrRunFolders)
 
 TEST_F(Overlay, DoesNotBringBackThePowerCommands)
 {
-    folder.write("sbin/shutdown", "the real one", 0755);
+    chmod(folder.write("sbin/shutdown", "the real one").c_str(), 0755);
     EXPECT_NE(laid({"/sbin/shutdown"}), "755 0:0 the real one\n");
 }
 
 TEST_F(Overlay, IsRefusedWithTheReasonWhereTheFolderIsMissing)
 {
-    EXPECT_EQ(reason({folder.path("missing")}),
+    EXPECT_EQ(reason(folder.path("missing")),
               "cannot open the folder " + folder.path("missing") + ": No such file or directory");
 }
 
 TEST_F(Overlay, IsRefusedWithTheReasonForAFile)
 {
     folder.write("file", "");
-    EXPECT_EQ(reason({folder.path("file")}),
+    EXPECT_EQ(reason(folder.path("file")),
               "cannot open the folder " + folder.path("file") + ": Not a directory");
 }
 
@@ -150,24 +152,24 @@ TEST_F(Overlay, IsRefusedWithTheReasonForWhatIsNeitherFileNorLinkNorFolder)
 {
     folder.write("etc/file", "");
     ASSERT_EQ(mkfifo(folder.path("etc/pipe").c_str(), 0600), 0);
-    EXPECT_EQ(reason({folder.path()}), "cannot lay over /etc/pipe, neither a file nor a link nor "
-                                       "a folder: Invalid argument");
+    EXPECT_EQ(reason(folder.name()), "cannot lay over /etc/pipe, neither a file nor a link nor "
+                                     "a folder: Invalid argument");
 }
 
 TEST_F(Overlay, IsRefusedWithTheReasonWhereAFileWouldReplaceAFolder)
 {
     folder.write("etc", "");
-    EXPECT_EQ(reason({folder.path()}), "cannot replace /etc: Directory not empty");
+    EXPECT_EQ(reason(folder.name()), "cannot replace /etc: Directory not empty");
 }
 
 TEST_F(Overlay, ARefusalLeavesTheCallerWhereItWas)
 {
     ASSERT_EQ(mkfifo(folder.path("pipe").c_str(), 0600), 0);
-    std::string const before = readFile("/proc/self/mountinfo");
+    std::string const before = contentOf("/proc/self/mountinfo");
     pid_t const child = fork();
     if (child == 0) {
-        bool const wasRefused = mihost::enterSandbox({folder.path()}).has_value();
-        bool const here = readFile("/proc/self/mountinfo") == before && !mihost::inSandbox();
+        bool const wasRefused = mihost::enterSandbox(folder.name()).has_value();
+        bool const here = contentOf("/proc/self/mountinfo") == before && !mihost::inSandbox();
         // Its next children are processes of the machine again.
         pid_t const next = fork();
         if (next == 0)
@@ -183,7 +185,7 @@ TEST_F(Overlay, ARefusalLeavesTheCallerWhereItWas)
 
 TEST_F(Overlay, WithoutPrivilegesTheReasonSaysWhatIsNeeded)
 {
-    EXPECT_EQ(reason({},
+    EXPECT_EQ(reason("",
                      [] {
                          if (setuid(65534) != 0)
                              _exit(1);
@@ -194,7 +196,7 @@ TEST_F(Overlay, WithoutPrivilegesTheReasonSaysWhatIsNeeded)
 
 TEST_F(Overlay, LayingOverTheMachineItselfIsRefused)
 {
-    EXPECT_THROW(mihost::layOver(folder.path()), std::logic_error);
+    EXPECT_THROW(mihost::layOver(folder.name()), std::logic_error);
 }
 
 } // namespace

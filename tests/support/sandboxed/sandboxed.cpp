@@ -12,7 +12,7 @@ int main(int argc, char* argv[])
         std::fputs("sandboxed PROGRAM [ARGUMENT...]\n", stderr);
         return EXIT_FAILURE;
     }
-    if (auto const reason = mihost::enterSandbox({})) {
+    if (auto const reason = mihost::enterSandbox()) {
         std::fprintf(stderr, "no sandbox: %s\n", reason->c_str());
         return EXIT_FAILURE;
     }

@@ -9,9 +9,9 @@ namespace mihost
 
 enum ExitCode {
     Done = 0,
-    PluginRefused = 1, // the plug-in answered with a non-zero status
-    BadUsage = 2,      // wrong usage or refused input
-    NoPlugin = 3,      // the plug-in cannot be loaded
+    PluginRefused = 1, // the plug-in answered with a non-zero status; the doctor misses something
+    BadUsage = 2,      // wrong usage, refused input, or what was asked for beside cannot be had
+    NoPlugin = 3,      // the plug-in cannot be loaded, or has no folder to run in
     NotFound = 4       // no such node or property
 };
 

@@ -96,15 +96,15 @@ void writeText(Result const& result, Output& out)
     }
 }
 
-/** The last thing that a command printed: mostly why it failed. Empty where nothing was. */
-std::string lastWords(std::vector<RunCommand> const& commands)
+/**
+ * What the last command that said anything said first: mostly why it failed. Empty where none did.
+ */
+std::string likelyReason(std::vector<RunCommand> const& commands)
 {
-    for (auto command = commands.rbegin(); command != commands.rend(); ++command) {
-        auto const lines = linesOf(command->output);
-        for (std::string const& line : lines)
+    for (auto command = commands.rbegin(); command != commands.rend(); ++command)
+        for (std::string const& line : linesOf(command->output))
             if (!line.empty() && line.rfind("rc=", 0) != 0)
                 return line;
-    }
     return "";
 }
 
@@ -165,7 +165,7 @@ void carryOut(Session& session, Write const& write)
         warnOfPlainPassword(result.accounts, write.secret);
     if (result.error.getStatus() == 0)
         return;
-    std::string const reason = lastWords(result.commands);
+    std::string const reason = likelyReason(result.commands);
     throw Failure(PluginRefused,
                   fmt::format("the plug-in answered {}{}{}", static_cast<std::string>(result.error),
                               reason.empty() ? "" : "; a command said: ", reason));

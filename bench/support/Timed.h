@@ -14,10 +14,10 @@ struct Timed {
     std::string output;
 };
 
-/** @throw std::runtime_error where it does not end with exit code 0 */
+/** @throws std::runtime_error where it does not end with exit code 0 */
 Timed timed(std::vector<std::string> const& arguments);
 
-/** Goes into a copy of this machine. @throw std::runtime_error where none can be had */
+/** Goes into a copy of this machine. @throws std::runtime_error where none can be had */
 void enterCopy();
 
 /** A program's main: what stops the measurement goes to standard error. Takes --quick. */

@@ -12,10 +12,10 @@
  * How a host brings it. The plug-in calls popen and pclose by their ordinary names, so whoever
  * defines them first in the process's scope is asked. Either
  *
- *  - link the program with -lmiaccel, which then stands before libc. A program that calls nothing
- * of this header may need -Wl,--no-as-needed to keep the library. miaccel_enable turns it off and
- * on at run time. This is the way to prefer: nothing is left in the environment for the commands
- * that still run; or
+ *  - link the program with -lmiaccel, which then stands before libc. A program that calls
+ *    nothing of this header may need -Wl,--no-as-needed to keep the library. miaccel_enable turns
+ *    it off and on at run time. This is the way to prefer: nothing is left in the environment for
+ *    the commands that still run; or
  *  - start the program with LD_PRELOAD naming this library and nothing else. The commands that
  *    still run inherit it, without harm.
  *

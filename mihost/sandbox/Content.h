@@ -8,10 +8,10 @@
 namespace mihost
 {
 
-/** @throw std::system_error that names the path */
+/** @throws std::system_error that names the path */
 void copyContent(Descriptor const& from, Descriptor const& to, std::string const& path);
 
-/** Writes all of the text. @throw std::system_error that names the path */
+/** Writes all of the text. @throws std::system_error that names the path */
 void writeAll(Descriptor const& to, char const* text, std::size_t length, std::string const& path);
 
 } // namespace mihost

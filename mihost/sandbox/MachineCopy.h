@@ -10,7 +10,7 @@ namespace mihost
  *
  * To be called by the first process of its own mount and process namespaces.
  *
- * @throw std::system_error
+ * @throws std::system_error
  */
 void enterMachineCopy();
 

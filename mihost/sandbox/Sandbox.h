@@ -45,7 +45,7 @@ std::vector<std::string> refusedPowerCommands();
  * folders. All are owned by root and keep their modes, save that /etc/shadow and /etc/gshadow are
  * root's alone where everybody could have read them. A folder that exists already stays as it is.
  *
- * @throw std::logic_error outside a copy, std::system_error for a file that cannot be read or
+ * @throws std::logic_error outside a copy, std::system_error for a file that cannot be read or
  *        written
  */
 void layOver(std::string const& folder);

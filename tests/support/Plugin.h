@@ -17,7 +17,7 @@
 class Plugin
 {
 public:
-    /** @throw std::runtime_error where the library cannot be loaded */
+    /** @throws std::runtime_error where the library cannot be loaded */
     explicit Plugin(char const* file = PLUGIN_FILE);
     ~Plugin();
     Plugin(Plugin const&) = delete;
@@ -40,13 +40,13 @@ public:
     /** Those of one node type, see nodes/ids.h. */
     std::vector<IC::MutableNode*> nodes(unsigned int type) const;
 
-    /** @throw std::runtime_error where there is not exactly one of this type */
+    /** @throws std::runtime_error where there is not exactly one of this type */
     IC::MutableNode& node(unsigned int type) const;
 
     /** The first of this type whose property 108 has this text, null where there is none. */
     IC::MutableNode* find(unsigned int type, std::string const& name) const;
 
-    /** As find. @throw std::runtime_error where there is none */
+    /** As find. @throws std::runtime_error where there is none */
     IC::MutableNode& node(unsigned int type, std::string const& name) const;
 
 private:

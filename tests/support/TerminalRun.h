@@ -21,7 +21,7 @@ public:
      * Reads until the text turns up behind what was read before.
      *
      * @return what was read, up to the end of the text
-     * @throw std::runtime_error where the program ends before
+     * @throws std::runtime_error where the program ends before
      */
     std::string waitFor(std::string const& text);
 

@@ -1,3 +1,5 @@
+// The runtime's text helpers, which mihost prints with; some are judged by mihost's JSON parser.
+
 #include "mihost/runtime/Text.h"
 
 #include <gtest/gtest.h>

@@ -1,7 +1,7 @@
-#include <algorithm>
-
 #include "sysdata/osInfo_linux.h"
 #include "tests/fuzz/support/System.h"
+
+#include <algorithm>
 
 // One text serves as every release file and as every command's output.
 extern "C" int LLVMFuzzerTestOneInput(std::uint8_t const* data, std::size_t size)

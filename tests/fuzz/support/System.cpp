@@ -87,7 +87,6 @@ void require(bool holds)
 } // namespace fuzz
 
 using fuzz::inUse;
-using fuzz::next;
 
 extern "C" {
 

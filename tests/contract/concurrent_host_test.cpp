@@ -7,6 +7,7 @@
 #include "tests/support/Libc.h"
 #include "tests/support/LiveNodes.h"
 #include "tests/support/Plugin.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
@@ -14,7 +15,6 @@
 #include <chrono>
 #include <cstdlib>
 #include <cstring>
-#include <ctime>
 #include <iostream>
 #include <thread>
 #include <vector>
@@ -77,8 +77,7 @@ protected:
     {
         // Without it libc looks its zone up again and again, under a lock that the sanitizer
         // cannot see.
-        setenv("TZ", "UTC0", 1);
-        tzset();
+        useZone("UTC0");
         libc::hooks().popen = answer;
         libc::hooks().pclose = [](FILE* stream) { return std::fclose(stream); };
         plugin.initialize();

@@ -6,13 +6,12 @@
 #include "tests/support/Libc.h"
 #include "tests/support/LiveNodes.h"
 #include "tests/support/Plugin.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
 #include <atomic>
-#include <cstdlib>
-#include <ctime>
 #include <set>
 #include <string>
 #include <thread>
@@ -33,8 +32,7 @@ protected:
     {
         // Without it libc looks its zone up again and again, under a lock that the sanitizer
         // cannot see.
-        setenv("TZ", "UTC0", 1);
-        tzset();
+        useZone("UTC0");
         plugin.initialize();
     }
 

@@ -1,6 +1,7 @@
 #include "tests/interposed/StandIns.h"
 #include "tests/support/Frame.h"
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
@@ -254,8 +255,7 @@ TEST_F(OsNodeBuild, LogsEachTimeRightAfterItIsStored)
 
 TEST_F(OsNodeBuild, WritesTheTimesInLocalTime)
 {
-    setenv("TZ", "CET-1CEST,M3.5.0,M10.5.0/3", 1);
-    tzset();
+    useZone("CET-1CEST,M3.5.0,M10.5.0/3");
     Recording const log;
     build();
     EXPECT_TRUE(log.has("LastBootTime = Wed May 12 12:23:45 2010\n", 3000));

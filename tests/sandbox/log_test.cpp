@@ -6,13 +6,13 @@
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
 #include <cstdio>
 #include <cstdlib>
-#include <ctime>
 #include <filesystem>
 #include <fstream>
 #include <grp.h>
@@ -35,8 +35,7 @@ protected:
     {
         setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
         setenv("LC_ALL", "C", 1);
-        setenv("TZ", "UTC0", 1);
-        tzset();
+        useZone("UTC0");
         std::filesystem::copy_file("/usr/bin/date", "/usr/bin/date.real");
         say("Sat Nov 21 03:15:30 UTC 2026");
     }

@@ -4,6 +4,7 @@
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
@@ -66,12 +67,6 @@ protected:
         std::filesystem::current_path("/tmp");
         run("useradd -u 4711 -U -m -c 'John Doe' -s /bin/sh -p first jdoe");
         run("chage -d 2020-01-15 -m 1 -M 90 -W 14 -I 20 -E 2030-06-01 jdoe");
-    }
-
-    static void useZone(char const* zone)
-    {
-        setenv("TZ", zone, 1);
-        tzset();
     }
 
     /** Loads the plug-in and notes every command line from then on. */

@@ -1,8 +1,7 @@
 #include "mihost/cli/ValueText.h"
+#include "tests/support/TimeZone.h"
 #include "tests/unit/Refusal.h"
 
-#include <cstdlib>
-#include <ctime>
 #include <gtest/gtest.h>
 
 namespace
@@ -51,8 +50,7 @@ TEST(ValueText, ReadsBackFromTheValue)
 
 TEST(ValueText, OfADayIsMidnightOfLocalTimeInTheFormThatThePluginScans)
 {
-    setenv("TZ", "Europe/Berlin", 1);
-    tzset();
+    useZone("Europe/Berlin");
     EXPECT_EQ(static_cast<std::string>(parsed(user, 118, "2030-07-01")), "2030-07-01 00:00:00");
     EXPECT_EQ(static_cast<std::string>(parsed(user, 91, "2030-07-01 12:30:00")),
               "2030-07-01 12:30:00");

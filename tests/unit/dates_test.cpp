@@ -1,6 +1,7 @@
 #include "util/MyProcess.h"
 
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
@@ -16,12 +17,6 @@ namespace
 constexpr char const* utc = "UTC0";
 constexpr char const* centralEurope = "CET-1CEST,M3.5.0,M10.5.0/3";
 constexpr char const* newYork = "EST5EDT,M3.2.0,M11.1.0";
-
-void useZone(char const* zone)
-{
-    setenv("TZ", zone, 1);
-    tzset();
-}
 
 time_t named(int year, std::string month, int day, int hour, int minute, int second, int isdst = -1)
 {

@@ -2,11 +2,11 @@
 #include "tests/support/Frame.h"
 #include "tests/support/Libc.h"
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
 #include <cstdlib>
-#include <ctime>
 #include <string>
 #include <typeinfo>
 #include <vector>
@@ -27,8 +27,7 @@ class LogNodes : public ::testing::Test
 protected:
     LogNodes()
     {
-        setenv("TZ", "UTC0", 1);
-        tzset();
+        useZone("UTC0");
         commands.answers["date"] = "Sat Nov 21 03:15:30 UTC 2026\n";
         haveLines(0);
     }

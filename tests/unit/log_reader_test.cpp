@@ -2,6 +2,7 @@
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Libc.h"
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
@@ -48,16 +49,10 @@ class LogReader : public ::testing::Test
 protected:
     LogReader()
     {
-        setTimeZone("UTC0");
+        useZone("UTC0");
         commands.answers = {{wc, "10 /var/log/messages\n"},
                             {sed(10), "Nov 20 10:11:12 host sshd[1]: session opened\n"},
                             {"date", "Sat Nov 21 03:15:30 UTC 2026\n"}};
-    }
-
-    static void setTimeZone(char const* zone)
-    {
-        setenv("TZ", zone, 1);
-        tzset();
     }
 
     /** A buffer of the length filled by getLog, all of it. */
@@ -409,7 +404,7 @@ TEST_F(LogReader, ReadsEachCommandsLineIntoABufferOf512Bytes)
 
 TEST_F(LogReader, ReadsATimeStampAsLocalTime)
 {
-    setTimeZone("CET-1CEST,M3.5.0,M10.5.0/3");
+    useZone("CET-1CEST,M3.5.0,M10.5.0/3");
     EXPECT_EQ(timeOf(1), at(2026, 11, 20, 9, 11, 12));
     commands.answers[sed(10)] = "Jul  2 10:11:12 host\n";
     EXPECT_EQ(timeOf(1), at(2026, 7, 2, 8, 11, 12));

@@ -3,12 +3,12 @@
 #include "host/Alert.h"
 #include "host/Error.h"
 #include "host/PropertyValue.h"
+#include "tests/support/TimeZone.h"
 #include "util/MyProcess.h"
 
 #include <gtest/gtest.h>
 
 #include <climits>
-#include <cstdlib>
 #include <sstream>
 #include <string>
 #include <vector>
@@ -29,12 +29,6 @@ std::string asText(PropertyValue const& value)
 unsigned int asUnsigned(PropertyValue const& value)
 {
     return value;
-}
-
-void useZone(char const* zone)
-{
-    setenv("TZ", zone, 1);
-    tzset();
 }
 
 PropertyValue date(long seconds)

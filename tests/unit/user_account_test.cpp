@@ -3,11 +3,11 @@
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Libc.h"
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
 #include <cstdlib>
-#include <ctime>
 #include <string>
 #include <vector>
 
@@ -23,8 +23,7 @@ class AccountOperation : public testing::Test
 protected:
     AccountOperation()
     {
-        setenv("TZ", "UTC0", 1);
-        tzset();
+        useZone("UTC0");
     }
 
     Lines errors() const
@@ -166,8 +165,7 @@ TEST_P(AgeingOperation, SucceedsWhateverChagePrints)
 TEST_P(AgeingOperation, TakesTheDateForLocalTime)
 {
     // Two days over the change to summer time are one hour short of two days.
-    setenv("TZ", "CET-1CEST,M3.5.0,M10.5.0/3", 1);
-    tzset();
+    useZone("CET-1CEST,M3.5.0,M10.5.0/3");
     answerListing("Mar 29, 2008");
     set("2008-03-31 00:00:00");
     EXPECT_EQ(commands_.ran.back(), ageLine("1"));
@@ -176,8 +174,7 @@ TEST_P(AgeingOperation, TakesTheDateForLocalTime)
 TEST_P(AgeingOperation, TakesTheVeryBeginningOfTheDay)
 {
     // Over the change to a summer time that is one second ahead, two days lack that second.
-    setenv("TZ", "AAA0BBB-0:00:01,M3.5.0,M10.5.0", 1);
-    tzset();
+    useZone("AAA0BBB-0:00:01,M3.5.0,M10.5.0");
     answerListing("Mar 29, 2008");
     set("2008-03-31 00:00:00");
     EXPECT_EQ(commands_.ran.back(), ageLine("1"));

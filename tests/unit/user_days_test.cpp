@@ -2,11 +2,11 @@
 
 #include "tests/support/Libc.h"
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
 #include <cstdlib>
-#include <ctime>
 #include <string>
 #include <vector>
 
@@ -29,8 +29,7 @@ protected:
 
     static void setZone(char const* zone)
     {
-        setenv("TZ", zone, 1);
-        tzset();
+        useZone(zone);
     }
 
     long days(std::string const& output, long reference, std::string label = "Password expires")

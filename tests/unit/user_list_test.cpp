@@ -3,13 +3,13 @@
 #include "sysdata/minMaxId.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
 #include <cerrno>
 #include <cstdlib>
-#include <ctime>
 #include <fcntl.h>
 #include <locale>
 #include <new>
@@ -35,8 +35,7 @@ class UserListing : public testing::Test
 protected:
     UserListing()
     {
-        setenv("TZ", "UTC0", 1);
-        tzset();
+        useZone("UTC0");
         files_.write("/etc/login.defs", "UID_MIN 500\nUID_MAX 60000\n");
         NQ::minMaxId::Instance();
         libc::hooks().lckpwdf = [this] {

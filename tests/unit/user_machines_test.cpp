@@ -4,6 +4,7 @@
 
 #include "tests/support/Libc.h"
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
@@ -47,8 +48,7 @@ std::string ageing(userInfo& user)
 
 Lines ageingOn(std::string const& machine, char const* zone = "UTC0")
 {
-    setenv("TZ", zone, 1);
-    tzset();
+    useZone(zone);
     Lines lines;
     for (userInfo& user : usersOf(machine))
         lines.push_back(ageing(user));

@@ -6,12 +6,12 @@
 #include "tests/support/Frame.h"
 #include "tests/support/MutexCalls.h"
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
 #include <cstdlib>
-#include <ctime>
 #include <new>
 #include <string>
 #include <typeinfo>
@@ -35,8 +35,7 @@ class UserNodes : public testing::Test
 protected:
     UserNodes()
     {
-        setenv("TZ", "UTC0", 1);
-        tzset();
+        useZone("UTC0");
         files.write("/etc/login.defs", "UID_MIN 500\nUID_MAX 60000\n");
         files.write("/etc/passwd",
                     account("root", 0) + account("anna", 1000) + account("ben", 1001));

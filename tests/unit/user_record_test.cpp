@@ -1,6 +1,7 @@
 #include "sysdata/userInfo_linux.h"
 
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
@@ -22,12 +23,6 @@ constexpr unsigned long allBitsSet = ~0UL;
 constexpr char const* east = "CET-1";
 constexpr char const* west = "EST5";
 constexpr char const* south = "AEST-10AEDT,M10.1.0,M4.1.0/3"; // has summer time in January
-
-void useZone(char const* zone)
-{
-    setenv("TZ", zone, 1);
-    tzset();
-}
 
 TEST(UserRecord, KnowsTheMarkOfAnEmptyAgeingField)
 {

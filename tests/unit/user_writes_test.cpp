@@ -6,13 +6,13 @@
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
 #include "tests/support/Recording.h"
+#include "tests/support/TimeZone.h"
 #include "tests/support/WideTexts.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
 #include <cstdlib>
-#include <ctime>
 #include <filesystem>
 #include <fstream>
 #include <sstream>
@@ -46,8 +46,7 @@ class UserWrite : public testing::Test
 protected:
     UserWrite()
     {
-        setenv("TZ", "UTC0", 1);
-        tzset();
+        useZone("UTC0");
         files.write("/etc/login.defs", "UID_MIN 500\nUID_MAX 60000\n");
         files.write("/etc/passwd", "anna:x:1000:100:Anna:/home/anna:/bin/sh\n");
         frame.createUserNodes(false);

@@ -301,7 +301,7 @@ TEST(MihostUsage, ExitsWith2AndOneLineForWrongArguments)
     for (Lines const& arguments :
          {Lines{"nonsense"}, Lines{"get"}, Lines{"--nonsense"}, Lines{"power", "sleep"},
           Lines{"set", "os"}, Lines{"watch", "os", "108", "--interval", "-1"},
-          Lines{"tree", "os", "extra"}}) {
+          Lines{"watch", "os", "108", "--interval", "nan"}, Lines{"tree", "os", "extra"}}) {
         Outcome const outcome = mihostRun(arguments);
         EXPECT_EQ(outcome.code, 2) << arguments[0];
         EXPECT_EQ(outcome.out, "");

@@ -3,6 +3,8 @@
 #include "mihost/cli/Session.h"
 #include "mihost/cli/commands/makers.h"
 
+#include <cmath>
+#include <cstdlib>
 #include <map>
 
 namespace mihost
@@ -13,6 +15,12 @@ namespace
 
 using interrupts::Noted;
 
+/** A range alone lets through what is no number at all. */
+std::string objectionToNan(std::string const& text)
+{
+    return std::isnan(std::strtod(text.c_str(), nullptr)) ? text + " is no number" : "";
+}
+
 class Watch : public Command
 {
 public:
@@ -22,6 +30,7 @@ public:
         app.add_option("PROPERTY", names_, "ids or names")->required();
         app.add_option("--interval", interval_, "seconds between two readings")
             ->check(CLI::Range(0.0, 86400.0))
+            ->check(objectionToNan)
             ->type_name("S")
             ->capture_default_str();
         app.add_option("--count", count_, "stop after so many readings; 0 for never")

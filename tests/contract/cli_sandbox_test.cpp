@@ -2,9 +2,9 @@
 
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
+#include "tests/support/ScratchFolder.h"
 
 #include <cstdlib>
-#include <filesystem>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 #include <unistd.h>
@@ -71,10 +71,10 @@ TEST_F(MihostSandbox, HidesPasswordsInCommandsAndFiles)
 
 TEST_F(MihostSandbox, WritesTheTraceOutsideOfIt)
 {
-    std::string const trace = testing::TempDir() + "sandbox.trace";
+    ScratchFolder const folder;
+    std::string const trace = folder.path("trace");
     EXPECT_EQ(mihostRun({"--sandbox", "--trace", trace, "tree"}).code, 0);
     EXPECT_NE(contentOf(trace).find("initialize: entry"), std::string::npos);
-    std::filesystem::remove(trace);
 }
 
 TEST_F(MihostSandbox, LaysTheOverlaysFilesOverTheMachine)

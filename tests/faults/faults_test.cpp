@@ -7,6 +7,7 @@
 #include "nodes/ids.h"
 #include "tests/faults/Faults.h"
 #include "tests/support/Libc.h"
+#include "tests/support/ScratchFolder.h"
 
 #include <gtest/gtest.h>
 
@@ -219,18 +220,14 @@ protected:
     void SetUp() override
     {
         // "usrandpwd" is written where the process stands.
-        folder_ =
-            std::filesystem::path(testing::TempDir()) / ("faults-" + std::to_string(getpid()));
-        std::filesystem::create_directory(folder_);
-        std::filesystem::copy(MACHINES_DIR "/faults", folder_ / "machine",
+        std::filesystem::copy(MACHINES_DIR "/faults", folder_.path("machine"),
                               std::filesystem::copy_options::recursive);
-        std::filesystem::current_path(folder_);
+        std::filesystem::current_path(folder_.name());
     }
 
     void TearDown() override
     {
         std::filesystem::current_path("/");
-        std::filesystem::remove_all(folder_);
     }
 
     /** One run with the call numbered at failing. @return how many of the calls were made */
@@ -268,7 +265,7 @@ protected:
     }
 
 private:
-    std::filesystem::path folder_;
+    ScratchFolder const folder_;
 };
 
 TEST_P(EachCallFails, AndNothingIsLeftBehind)

@@ -40,15 +40,9 @@ std::ostream& operator<<(std::ostream& out, Driver const& driver)
     return out << '{' << driver.name << ", " << driver.version << ", " << driver.description << '}';
 }
 
-class Drivers : public ::testing::Test
+class Drivers : public testing::Test
 {
 protected:
-    Drivers()
-    {
-        setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
-        setenv("LC_ALL", "C", 1);
-    }
-
     std::vector<Driver> shown()
     {
         plugin.initialize();

@@ -28,13 +28,11 @@ using Texts = std::vector<std::string>;
 constexpr char path[] = "/var/log/messages";
 constexpr char wc[] = "wc -l /var/log/messages";
 
-class Log : public ::testing::Test
+class Log : public testing::Test
 {
 protected:
     Log()
     {
-        setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
-        setenv("LC_ALL", "C", 1);
         useZone("UTC0");
         std::filesystem::copy_file("/usr/bin/date", "/usr/bin/date.real");
         say("Sat Nov 21 03:15:30 UTC 2026");
@@ -108,7 +106,7 @@ TEST_F(Log, OfNoLinesHasNoEntries)
     EXPECT_EQ(plugin.nodes(NODES::logType).size(), 1U);
 }
 
-class LogOfLines : public Log, public ::testing::WithParamInterface<int>
+class LogOfLines : public Log, public testing::WithParamInterface<int>
 {
 };
 
@@ -122,7 +120,7 @@ TEST_P(LogOfLines, ShowsTheNewestFiftyAtMost)
     }
 }
 
-INSTANTIATE_TEST_SUITE_P(All, LogOfLines, ::testing::Values(1, 3, 50, 51, 120));
+INSTANTIATE_TEST_SUITE_P(All, LogOfLines, testing::Values(1, 3, 50, 51, 120));
 
 TEST_F(Log, IsReadByTheCommandsOfEachReadInOrder)
 {

@@ -25,7 +25,6 @@ class HostedMachine
 public:
     explicit HostedMachine(std::string const& name)
     {
-        setenv("LC_ALL", "C", 1);
         machine::lay(name);
         if (name == "plain") // which reports no groups otherwise
             machine::write("/etc/login.defs", machine::read("/etc/login.defs") + "GID_MAX 60000\n");

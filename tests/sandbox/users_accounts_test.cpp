@@ -61,8 +61,6 @@ class RealAccounts : public testing::Test
 protected:
     RealAccounts()
     {
-        setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
-        setenv("LC_ALL", "C", 1);
         useZone("UTC0");
         std::filesystem::current_path("/tmp");
         run("useradd -u 4711 -U -m -c 'John Doe' -s /bin/sh -p first jdoe");

@@ -15,7 +15,7 @@ using Texts = std::vector<std::string>;
 
 constexpr char header[] = "Module                  Size  Used by\n";
 
-class DriverInventory : public ::testing::Test
+class DriverInventory : public testing::Test
 {
 protected:
     std::vector<driverInfo> list()

@@ -14,7 +14,7 @@ namespace
 using Texts = std::vector<std::string>;
 using Ids = std::vector<unsigned int>;
 
-class DriverNodes : public ::testing::Test
+class DriverNodes : public testing::Test
 {
 protected:
     void haveThreeModules()

@@ -22,7 +22,7 @@ constexpr char wc[] = "wc -l /var/log/messages";
 // 2026-11-20 10:11:00 UTC, the minute of all the log lines below.
 constexpr long firstStamp = 1795169460;
 
-class LogNodes : public ::testing::Test
+class LogNodes : public testing::Test
 {
 protected:
     LogNodes()

@@ -44,7 +44,7 @@ long at(int year, int month, int day, int hour, int minute, int second)
 }
 
 /** A log with one line, number 10, out of 10. */
-class LogReader : public ::testing::Test
+class LogReader : public testing::Test
 {
 protected:
     LogReader()
@@ -525,7 +525,7 @@ TEST_F(LogReader, SurvivesBinaryGarbageFromEveryCommand)
     EXPECT_EQ(commands.open, 0);
 }
 
-class LogClearing : public ::testing::Test
+class LogClearing : public testing::Test
 {
 protected:
     std::string contents() const

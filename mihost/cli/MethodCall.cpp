@@ -19,7 +19,7 @@ template <class Rows> std::string listOf(Rows const& rows)
     return rows.empty() ? "none" : fmt::format("{}", fmt::join(rowNames(rows), ", "));
 }
 
-Method const& method(std::string const& name)
+Method const& method(std::string_view name)
 {
     Method const* const found = findMethod(name);
     if (!found)
@@ -28,7 +28,7 @@ Method const& method(std::string const& name)
     return *found;
 }
 
-Parameter const& parameter(Method const& method, std::string const& name)
+Parameter const& parameter(Method const& method, std::string_view name)
 {
     Parameter const* const found = findParameter(method, name);
     if (!found)
@@ -91,7 +91,7 @@ void checkTextForm(Parameter const& parameter, std::string const& value)
 MethodCall::Argument argumentOf(Method const& method, std::string const& item)
 {
     std::vector<std::string> const parts = split(item, ':');
-    Parameter const& known = parameter(method, parts.empty() ? "" : parts[0]);
+    Parameter const& known = parameter(method, parts.empty() ? std::string_view() : parts[0]);
     if (parts.size() != 3)
         throw Failure(BadUsage, fmt::format("{} must be written {}:{}:VALUE, without ':' in VALUE",
                                             known.name, known.name, known.type));
@@ -110,7 +110,8 @@ MethodCall parseCall(std::string const& name, std::vector<std::string> const& as
     MethodCall call{&method(name), {}};
     for (std::string const& assignment : assignments) {
         std::size_t const equals = assignment.find('=');
-        Parameter const& known = parameter(*call.method, assignment.substr(0, equals));
+        Parameter const& known =
+            parameter(*call.method, std::string_view(assignment).substr(0, equals));
         if (equals == std::string::npos)
             throw Failure(BadUsage,
                           fmt::format("{} needs a value: {}=VALUE", known.name, known.name));
@@ -132,7 +133,7 @@ bool callsNothing(std::string const& text)
 MethodCall takeApart(std::string const& text)
 {
     std::vector<std::string> const items = split(text, ',');
-    MethodCall call{&method(items.empty() ? "" : items[0]), {}};
+    MethodCall call{&method(items.empty() ? std::string_view() : items[0]), {}};
     for (std::size_t at = 1; at < items.size(); ++at)
         call.arguments.push_back(argumentOf(*call.method, items[at]));
     checkWhole(call);

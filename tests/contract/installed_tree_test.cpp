@@ -113,12 +113,12 @@ TEST_F(InstalledTree, GivesAHostHeadersAndRuntimeThroughFindPackage)
     std::ofstream(work() / "CMakeLists.txt")
         << "cmake_minimum_required(VERSION 3.25)\nproject(host LANGUAGES CXX)\n"
         << blockOf("cmake", "find_package(mihost");
-    std::string const tree = shell("cmake -S . -B build -DCMAKE_PREFIX_PATH='" + prefix().string() +
-                                   "' -DCMAKE_CXX_COMPILER='" HOST_COMPILER_PROGRAM
-                                   "' -DCMAKE_CXX_FLAGS='" HOST_COMPILER_FLAGS
-                                   "' -DCMAKE_EXE_LINKER_FLAGS='" HOST_LINKER_FLAGS "' >&2\n"
-                                   "cmake --build build >&2\n"
-                                   "build/minimal_host");
+    std::string const tree = shell(
+        "cmake -G Ninja -S . -B build -DCMAKE_PREFIX_PATH='" + prefix().string() +
+        "' -DCMAKE_CXX_COMPILER='" HOST_COMPILER_PROGRAM "' -DCMAKE_CXX_FLAGS='" HOST_COMPILER_FLAGS
+        "' -DCMAKE_EXE_LINKER_FLAGS='" HOST_LINKER_FLAGS "' >&2\n"
+        "cmake --build build >&2\n"
+        "build/minimal_host");
     EXPECT_EQ(tree.find(topOfTheTree), 0U) << tree;
 }
 

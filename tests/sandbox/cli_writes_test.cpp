@@ -82,6 +82,7 @@ TEST(MihostCall, DeletesRootOnlyWhenTold)
 TEST(MihostPasswords, ComeFromStandardInputAndShowNowhere)
 {
     makeMachine();
+    machine::fake("/usr/bin/passwd", "exit 1\n");
     Outcome const outcome = mihostRun(
         {"--trace", "/tmp/trace", "call", "UserSetPassword", "UserName=jdoe", "Password=-"},
         "geheim42\nnext line\n");

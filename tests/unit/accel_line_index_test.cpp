@@ -2,6 +2,7 @@
 #include "tests/support/ScratchFolder.h"
 #include "tests/unit/AccelStandIns.h"
 
+#include <algorithm>
 #include <gtest/gtest.h>
 #include <random>
 

@@ -1,5 +1,6 @@
 #include "mihost/cli/LineEditor.h"
 
+#include <algorithm>
 #include <gtest/gtest.h>
 
 namespace

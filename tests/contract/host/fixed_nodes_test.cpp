@@ -3,6 +3,7 @@
 #include "nodes/ids.h"
 #include "tests/contract/host/Loaded.h"
 
+#include <algorithm>
 #include <set>
 #include <sys/utsname.h>
 #include <typeinfo>

@@ -20,6 +20,9 @@ namespace
 {
 
 constexpr Reason complaint = "the command would write to standard error";
+constexpr Reason longKey = "versions of modinfo differ in how they show a long key";
+
+constexpr std::size_t valueColumn = 16;
 
 template <class Owned, auto release> struct Release {
     void operator()(Owned* owned) const
@@ -51,27 +54,27 @@ public:
         return context_.get();
     }
 
-    void complain()
+    void stepAside(Reason reason)
     {
-        complained_ = true;
+        reason_ = reason;
     }
 
     Answer answer(std::string text) const
     {
-        return complained_ ? Answer::none(complaint) : Answer::with(std::move(text));
+        return reason_ ? Answer::none(reason_) : Answer::with(std::move(text));
     }
 
 private:
     static void note(void* self, int, char const*, int, char const*, char const*, va_list)
     {
-        static_cast<Session*>(self)->complain();
+        static_cast<Session*>(self)->stepAside(complaint);
     }
 
     static constexpr char const* runningKernel = nullptr;
     static constexpr char const* noConfiguration[] = {nullptr};
 
     Context context_;
-    bool complained_ = false;
+    Reason reason_ = nullptr;
 };
 
 template <class Do> void forEach(kmod_list const* list, Do each)
@@ -112,16 +115,9 @@ std::string loadedLine(kmod_module const* module)
 
 std::string factLine(std::string_view key, std::string_view value)
 {
-    constexpr std::size_t valueColumn = 16;
     std::string line(key);
     line += ':';
-    // The field's width turns round below 0, so a key longer than its column is kept from its
-    // value by as many blanks as it is too long.
-    std::size_t const used = line.size();
-    line.append(used > valueColumn ? used - valueColumn : valueColumn - used, ' ');
-    line += value;
-    line += '\n';
-    return line;
+    return padded(line, valueColumn).append(value) + '\n';
 }
 
 /** A module's parameters; modules give the text and the type of one apart, in any order. */
@@ -191,17 +187,19 @@ std::string factsOf(kmod_module const* module, Session& session)
     Facts const facts(list);
     // Old kernels say nothing of what they have built in, and the command takes that as it is.
     if (got < 0 && (path || got != -ENOENT))
-        session.complain();
+        session.stepAside(complaint);
     if (got < 0)
         return text;
     Parameters parameters;
     forEach(facts.get(), [&](kmod_list const* entry) {
         std::string_view const key = kmod_module_info_get_key(entry);
         char const* const value = kmod_module_info_get_value(entry);
+        if (key.size() >= valueColumn)
+            session.stepAside(longKey);
         if (key != "parm" && key != "parmtype")
             text += factLine(key, value);
         else if (!parameters.add(value, key == "parmtype"))
-            session.complain();
+            session.stepAside(complaint);
     });
     return text + parameters.lines();
 }
@@ -216,7 +214,7 @@ Reason strangeLibrary()
     std::unique_ptr<char, decltype(&std::free)> const path(realpath(own.dli_fname, nullptr),
                                                            &std::free);
     std::optional<FileStamp> const stamp = FileStamp::of(path ? path.get() : "");
-    if (!stamp || !stamp->isOlderThanProcess() || !isGenuine({path.get(), "libkmod2", "30+"}))
+    if (!stamp || !stamp->isOlderThanProcess() || !isGenuine({path.get(), "libkmod2", "30+ 34.2-"}))
         return "libkmod is not the one of the commands";
     return nullptr;
 }

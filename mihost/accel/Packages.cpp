@@ -4,6 +4,7 @@
 #include <array>
 #include <fstream>
 #include <md5.h>
+#include <sstream>
 
 namespace miaccel
 {
@@ -53,6 +54,17 @@ bool beginsWith(std::string const& text, std::string const& start)
     return text.compare(0, start.size(), start) == 0;
 }
 
+/** Whether it begins with one of the words, or there are none. */
+bool beginsWithOne(std::string const& text, std::string const& words)
+{
+    std::istringstream starts(words);
+    bool isAny = true;
+    for (std::string start; starts >> start; isAny = false)
+        if (beginsWith(text, start))
+            return true;
+    return isAny;
+}
+
 } // namespace
 
 std::string fieldIn(std::string const& status, std::string const& package, std::string const& name)
@@ -84,11 +96,11 @@ std::string digestIn(std::string const& list, std::string const& path)
     return {};
 }
 
-bool isFromPackage(std::string const& path, std::string const& package, std::string const& version)
+bool isFromPackage(std::string const& path, std::string const& package, std::string const& versions)
 {
     std::string const status = contents(std::string(database) + "status");
     std::string const installed = fieldIn(status, package, "Version");
-    if (installed.empty() || !beginsWith(installed, version))
+    if (installed.empty() || !beginsWithOne(installed, versions))
         return false;
     std::string const list = digestList(package, fieldIn(status, package, "Architecture"));
     std::string const listed = digestIn(list, path);

@@ -9,11 +9,13 @@ namespace miaccel
 /**
  * Whether a file holds what its Debian package installed.
  *
- * @param path     with no links in it
- * @param package  name of the package that the file must come from
- * @param version  what the installed version must begin with; empty for any
+ * @param path      with no links in it
+ * @param package   name of the package that the file must come from
+ * @param versions  what the installed version must begin with, blanks between several; empty for
+ * any
  */
-bool isFromPackage(std::string const& path, std::string const& package, std::string const& version);
+bool isFromPackage(std::string const& path, std::string const& package,
+                   std::string const& versions);
 
 /** What dpkg's status file says of an installed package; empty where it says nothing. */
 std::string fieldIn(std::string const& status, std::string const& package, std::string const& name);

@@ -22,14 +22,18 @@ constexpr Tool shells[] = {
     {"/usr/bin/bash", "bash", ""},
 };
 
-/** In the order of Kind. The versions are those whose output is known byte for byte. */
+// Versions whose output is known byte for byte: those of Debian 12 and 13.
+constexpr char coreutils[] = "9.1- 9.7-";
+constexpr char kmod[] = "30+ 34.2-";
+
+/** In the order of Kind. */
 constexpr struct {
     char const* name;
     Tool tool;
 } commands[] = {
-    {"wc", {"/usr/bin/wc", "coreutils", "9.1-"}},     {"sed", {"/usr/bin/sed", "sed", "4.9-"}},
-    {"date", {"/usr/bin/date", "coreutils", "9.1-"}}, {"lsmod", {"/usr/bin/kmod", "kmod", "30+"}},
-    {"modinfo", {"/usr/bin/kmod", "kmod", "30+"}},
+    {"wc", {"/usr/bin/wc", "coreutils", coreutils}},     {"sed", {"/usr/bin/sed", "sed", "4.9-"}},
+    {"date", {"/usr/bin/date", "coreutils", coreutils}}, {"lsmod", {"/usr/bin/kmod", "kmod", kmod}},
+    {"modinfo", {"/usr/bin/kmod", "kmod", kmod}},
 };
 
 /** One folder of a search path: absolute, and with nothing in it that a shell could read specially.

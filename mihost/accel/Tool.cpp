@@ -30,7 +30,7 @@ bool isGenuine(Tool const& tool, FileStamp const& now)
     auto const known = verdicts.find(tool.path);
     if (known != verdicts.end() && now.isUnchangedSince(known->second.stamp))
         return known->second.genuine;
-    bool const genuine = isFromPackage(tool.path, tool.package, tool.version);
+    bool const genuine = isFromPackage(tool.path, tool.package, tool.versions);
     verdicts.insert_or_assign(tool.path, Verdict{now, genuine});
     return genuine;
 }

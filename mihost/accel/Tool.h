@@ -6,9 +6,9 @@ namespace miaccel
 
 /** A program or library whose output is known. */
 struct Tool {
-    char const* path;    // as installed, with no links in it
-    char const* package; // whose file it is
-    char const* version; // what the package's version must begin with; empty for any
+    char const* path;     // as installed, with no links in it
+    char const* package;  // whose file it is
+    char const* versions; // what the package's version must begin with: words; empty for any
 };
 
 /**

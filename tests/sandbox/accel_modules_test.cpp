@@ -118,18 +118,9 @@ TEST(AccelModinfo, PutsParametersTogetherAsModinfoDoes)
 
 std::string randomFact(std::mt19937& random)
 {
-    char const* const keys[] = {"version",
-                                "description",
-                                "parm",
-                                "parmtype",
-                                "author",
-                                "depends",
-                                "k",
-                                "fifteen_letters",
-                                "sixteen_letters_",
-                                "a_key_that_is_far_too_long",
-                                "srcversion",
-                                "vermagic"};
+    char const* const keys[] = {"version",    "description", "parm", "parmtype",
+                                "author",     "depends",     "k",    "fifteen_letters",
+                                "srcversion", "vermagic"};
     std::string fact = keys[random() % std::size(keys)];
     if (random() % 50 == 0)
         return fact;
@@ -160,16 +151,23 @@ std::string randomModule(std::mt19937& random)
     }
 }
 
-/** Both ways agree, and the accelerator steps aside exactly where modinfo complains. */
-void expectAgreement(std::string const& name)
+/** An answer is modinfo's, and none is given where modinfo complains. @return whether one lacks */
+bool isLeftOut(std::string const& name)
 {
     std::string const text = real("modinfo " + name);
     std::optional<std::string> const own = answered("modinfo " + name);
     bool const complained = text.find("ERROR") != std::string::npos;
-    EXPECT_EQ(own.has_value(), !complained) << name << ": " << text;
+    EXPECT_FALSE(own && complained) << name << ": " << text;
     if (own) {
         EXPECT_EQ(*own, text) << name;
     }
+    return !own && !complained;
+}
+
+/** Both ways agree, and the accelerator steps aside exactly where modinfo complains. */
+void expectAgreement(std::string const& name)
+{
+    EXPECT_FALSE(isLeftOut(name)) << name;
 }
 
 TEST(AccelModinfo, AgreesWithModinfoOnThousandsOfModules)
@@ -178,12 +176,22 @@ TEST(AccelModinfo, AgreesWithModinfoOnThousandsOfModules)
     constexpr int modules = 1000;
     for (int i = 0; i < modules; ++i)
         kernelModules::write("kernel/drivers/mod-" + std::to_string(i) + ".ko",
-                             randomModule(random));
+                            randomModule(random));
     kernelModules::index();
-    for (int i = 0; i < modules; ++i) {
-        expectAgreement("mod_" + std::to_string(i));
-        expectAgreement("mod-" + std::to_string(i));
-    }
+    int leftOut = 0; // a changed byte may have made a key too long
+    for (int i = 0; i < modules; ++i)
+        for (char const* name : {"mod_", "mod-"})
+            leftOut += isLeftOut(name + std::to_string(i));
+    EXPECT_LT(leftOut, modules / 50);
+}
+
+TEST(AccelModinfo, IsLeftToModinfoForAKeyLongerThanItsColumn)
+{
+    kernelModules::write("one.ko", kernelModules::file({"version=1", "sixteen_letters_=x"}));
+    kernelModules::write("two.ko", kernelModules::file({"version=1", "fifteen_letters=x"}));
+    kernelModules::index();
+    EXPECT_FALSE(answered("modinfo one"));
+    expectAgreement("two");
 }
 
 TEST(AccelModinfo, AgreesWithModinfoOnNamesThatAreNotThoseOfOneModule)

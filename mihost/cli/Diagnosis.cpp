@@ -227,15 +227,33 @@ std::vector<Need> release()
     };
 }
 
+/** Why no module is listed. Nothing where lsmod is missing, which is told by itself. */
+Problem emptyModuleList(std::string const& file)
+{
+    bool const isListed = linesOf(commandTap::outputOf("lsmod 2>/dev/null")).size() > 1;
+    if (isListed || commandTap::outputOf("command -v lsmod").empty())
+        return std::nullopt;
+    if (!isThere(file))
+        return "this kernel has no " + file;
+    return "none is loaded";
+}
+
 std::vector<Need> modules()
 {
+    std::string const file = "/proc/modules";
+    std::string const advice =
+        isThere(file) ? "modprobe MODULE" : "none: the kernel is of one piece";
+    std::vector<Need> needs = {
+        {"loaded kernel modules", emptyModuleList(file), "all drivers", advice, advice}};
     utsname system{};
-    if (linesOf(contentOf("/proc/modules")).empty() || uname(&system) != 0)
-        return {}; // none is loaded
-    return {{"module files of the kernel",
-             accessProblem(fmt::format("/lib/modules/{}", system.release)),
-             "versions and descriptions of drivers", "apt-get install linux-image-$(uname -r)",
-             "dnf install kernel-modules-$(uname -r)"}};
+    if (linesOf(contentOf(file)).empty() || uname(&system) != 0)
+        return needs;
+    needs.push_back({"module files of the kernel",
+                     accessProblem(fmt::format("/lib/modules/{}", system.release)),
+                     "versions and descriptions of drivers",
+                     "apt-get install linux-image-$(uname -r)",
+                     "dnf install kernel-modules-$(uname -r)"});
+    return needs;
 }
 
 /** Lines from the end of the log; there are no fewer than the plug-in shows unless they are long.

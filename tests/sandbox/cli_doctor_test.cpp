@@ -1,5 +1,6 @@
 // What the doctor finds on machines that lack one thing or another, and that its advice helps.
 
+#include "tests/support/KernelModules.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
@@ -36,9 +37,11 @@ protected:
         machine::write("/var/log/messages", "Jan  2 03:04:05 host x: y\n");
         machine::fake("/usr/bin/passwd", "echo '  --stdin  read it from a pipe'\n");
         machine::fake("/usr/sbin/useradd", "echo 'Usage: useradd'\n");
-        for (char const* program : {"/usr/sbin/lsmod", "/usr/sbin/modinfo", "/sbin/shutdown"})
+        machine::fake("/usr/sbin/lsmod", "echo Module Size Used by\necho one 1 0\n");
+        for (char const* program : {"/usr/sbin/modinfo", "/sbin/shutdown"})
             machine::fake(program, "");
-        std::filesystem::remove_all("/proc/modules");
+        kernelModules::load({});
+        machine::remove("/proc/modules"); // its modules need no files
     }
 
     /** The one need of this name. */
@@ -262,6 +265,16 @@ TEST_F(Doctor, NeverObeysWhatALogLineHolds)
     std::string const out = mihostRun({"doctor"}).out;
     EXPECT_NE(out.find(R"(a line begins with '\x1b[2J\xff' rather)"), std::string::npos) << out;
     EXPECT_FALSE(need("classic stamps in the system log").is_null());
+}
+
+TEST_F(Doctor, MissesLoadedModulesAndAKernelThatHasAny)
+{
+    machine::fake("/usr/sbin/lsmod", "echo 'Error: no list' >&2\nexit 1\n");
+    expectMissing("loaded kernel modules", "this kernel has no /proc/modules", "all drivers");
+    machine::fake("/usr/sbin/lsmod", "echo Module Size Used by\n");
+    machine::write("/proc/modules", "");
+    expectMissing("loaded kernel modules", "none is loaded", "all drivers");
+    EXPECT_EQ(need("loaded kernel modules")["debian"], "modprobe MODULE");
 }
 
 TEST_F(Doctor, MissesRootsPrivilegesWhereItHasNone)

@@ -2,6 +2,7 @@
 
 #include "mihost/cli/Decimal.h"
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/Suggestion.h"
 
 #include <algorithm>
 #include <fmt/format.h>
@@ -24,6 +25,18 @@ bool matches(Address const& address, IC::MutableNode const& node)
     return address.kind->single || storedText(node, address.kind->nameProperty) == address.name;
 }
 
+/** The name of another node of that kind that is nearly the one in the address; empty for none. */
+std::string nameMeant(std::vector<IC::MutableNode*> const& nodes, Address const& address)
+{
+    if (!address.kind || address.kind->single || parseDecimal(address.name))
+        return "";
+    std::vector<std::string> names;
+    for (IC::MutableNode const* node : nodes)
+        if (node->getNodeType() == address.kind->type)
+            names.push_back(storedText(*node, address.kind->nameProperty));
+    return nearest(address.name, names);
+}
+
 } // namespace
 
 Address parseAddress(std::string const& text)
@@ -36,6 +49,11 @@ Address parseAddress(std::string const& text)
     for (NodeKind const& kind : nodeKinds())
         if (kind.single == single && kind.address == word)
             return {&kind, 0, single ? "" : text.substr(colon + 1)};
+    for (NodeKind const& kind : nodeKinds())
+        if (!kind.single && (word == kind.address || word == kind.listName))
+            throw Failure(NotFound, fmt::format("no node '{}': write {}:NAME; 'mihost list {}' "
+                                                "shows them",
+                                                text, kind.address, kind.listName));
     throw Failure(NotFound, fmt::format("no node '{}': a node is {}", text, forms));
 }
 
@@ -56,11 +74,13 @@ IC::MutableNode& findNode(std::vector<IC::MutableNode*> const& nodes, std::strin
     Address const wanted = parseAddress(address);
     auto const found = std::find_if(nodes.begin(), nodes.end(),
                                     [&wanted](auto const* node) { return matches(wanted, *node); });
-    if (found == nodes.end())
-        throw Failure(
-            NotFound,
-            fmt::format("no node '{}' in the tree; 'mihost tree' shows all of them", address));
-    return **found;
+    if (found != nodes.end())
+        return **found;
+    std::string const meant = nameMeant(nodes, wanted);
+    throw Failure(NotFound, fmt::format("no node '{}' in the tree; {}", address,
+                                        meant.empty() ? "'mihost tree' shows all of them"
+                                                      : fmt::format("did you mean {}:{}?",
+                                                                    wanted.kind->address, meant)));
 }
 
 std::string storedText(IC::MutableNode const& node, unsigned int property)
@@ -75,7 +95,8 @@ std::string addressOf(IC::MutableNode const& node)
     NodeKind const* const kind = findKind(node.getNodeType());
     if (!kind)
         return std::to_string(node.getNodeId());
-    return kind->single ? kind->address : fmt::format("{}:{}", kind->address, storedText(node, kind->nameProperty));
+    return kind->single ? kind->address
+                        : fmt::format("{}:{}", kind->address, storedText(node, kind->nameProperty));
 }
 
 } // namespace mihost

@@ -1,6 +1,7 @@
 #include "mihost/cli/CommandLine.h"
 
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/Suggestion.h"
 
 #include <CLI/Config.hpp>
 #include <CLI/Formatter.hpp>
@@ -9,6 +10,58 @@
 
 namespace mihost
 {
+
+namespace
+{
+
+/** What to type for the help that fits the words given. */
+std::string helpFor(CLI::App const& app, bool inShell)
+{
+    auto const chosen = app.get_subcommands();
+    if (chosen.empty())
+        return inShell ? "help" : "mihost --help";
+    return fmt::format(inShell ? "help {}" : "mihost {} --help", chosen.front()->get_name());
+}
+
+std::vector<std::string> commandNames(CLI::App const& app)
+{
+    std::vector<std::string> names;
+    for (CLI::App const* command : app.get_subcommands({}))
+        names.push_back(command->get_name());
+    return names;
+}
+
+/** Those that may stand where the words were given. */
+std::vector<std::string> optionNames(CLI::App const& app)
+{
+    std::vector<std::string> names;
+    auto const add = [&names](CLI::App const& one) {
+        for (CLI::Option const* option : one.get_options())
+            for (std::string const& name : option->get_lnames())
+                names.push_back("--" + name);
+    };
+    add(app);
+    for (CLI::App const* command : app.get_subcommands())
+        add(*command);
+    return names;
+}
+
+/** What is wrong with the first word that nothing takes. */
+std::string excessOf(CLI::App const& app, std::string const& help)
+{
+    std::string const word = app.remaining(true).front();
+    if (word[0] == '-') {
+        std::string const meant = nearest(word.substr(0, word.find('=')), optionNames(app));
+        return meant.empty() ? fmt::format("no option '{}' ({} tells more)", word, help)
+                             : fmt::format("no option '{}'; did you mean {}?", word, meant);
+    }
+    if (app.get_subcommands().empty())
+        return fmt::format("no command '{}'; {}", word,
+                           suggestion(word, commandNames(app), "there are"));
+    return fmt::format("'{}' is one argument too many ({} tells more)", word, help);
+}
+
+} // namespace
 
 CommandLine::CommandLine(Place place, Options const& defaults) : place_(place), options_(defaults)
 {
@@ -69,9 +122,11 @@ void CommandLine::parse(std::vector<std::string> words)
     } catch (CLI::CallForVersion const& version) {
         answer_ = fmt::format("{}\n", version.what());
         return;
+    } catch (CLI::ExtrasError const&) {
+        throw Failure(BadUsage, excessOf(app, helpFor(app, inShell)));
     } catch (CLI::ParseError const& error) {
-        throw Failure(BadUsage, fmt::format("{} ({} tells more)", error.what(),
-                                            inShell ? "help" : "mihost --help"));
+        throw Failure(BadUsage,
+                      fmt::format("{} ({} tells more)", error.what(), helpFor(app, inShell)));
     }
     options_.sandbox = options_.sandbox || !options_.overlay.empty();
     auto const chosen = app.get_subcommands();

@@ -3,10 +3,10 @@
 #include "mihost/cli/Day.h"
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/Safety.h"
+#include "mihost/cli/Suggestion.h"
 
 #include <algorithm>
 #include <fmt/format.h>
-#include <fmt/ranges.h>
 
 namespace mihost
 {
@@ -14,17 +14,12 @@ namespace mihost
 namespace
 {
 
-template <class Rows> std::string listOf(Rows const& rows)
-{
-    return rows.empty() ? "none" : fmt::format("{}", fmt::join(rowNames(rows), ", "));
-}
-
 Method const& method(std::string_view name)
 {
     Method const* const found = findMethod(name);
     if (!found)
-        throw Failure(BadUsage,
-                      fmt::format("no method '{}'; there are {}", name, listOf(methods())));
+        throw Failure(BadUsage, fmt::format("no method '{}'; {}", name,
+                                            suggestion(name, rowNames(methods()), "there are")));
     return *found;
 }
 
@@ -32,8 +27,9 @@ Parameter const& parameter(Method const& method, std::string_view name)
 {
     Parameter const* const found = findParameter(method, name);
     if (!found)
-        throw Failure(BadUsage, fmt::format("{} has no parameter '{}'; it has {}", method.name,
-                                            name, listOf(method.parameters)));
+        throw Failure(BadUsage,
+                      fmt::format("{} has no parameter '{}'; {}", method.name, name,
+                                  suggestion(name, rowNames(method.parameters), "it has")));
     return *found;
 }
 
@@ -53,8 +49,9 @@ void checkWhole(MethodCall const& call)
         if (given > 1)
             throw Failure(BadUsage, fmt::format("{} is given twice", parameter.name));
         if (given == 0 && parameter.required)
-            throw Failure(BadUsage, fmt::format("{} needs {}: {}", call.method->name,
-                                                parameter.name, parameter.meaning));
+            throw Failure(BadUsage,
+                          fmt::format("{0} needs {1}, {2}; 'mihost methods {0}' has all",
+                                      call.method->name, parameter.name, parameter.meaning));
     }
 }
 
@@ -110,6 +107,11 @@ MethodCall parseCall(std::string const& name, std::vector<std::string> const& as
     MethodCall call{&method(name), {}};
     for (std::string const& assignment : assignments) {
         std::size_t const equals = assignment.find('=');
+        if (equals == std::string::npos && !findParameter(*call.method, assignment))
+            throw Failure(BadUsage,
+                          fmt::format("'{}' is not NAME=VALUE; {}", assignment,
+                                      suggestion(assignment, rowNames(call.method->parameters),
+                                                 name + " takes")));
         Parameter const& known =
             parameter(*call.method, std::string_view(assignment).substr(0, equals));
         if (equals == std::string::npos)

@@ -1,12 +1,12 @@
 #include "mihost/cli/NodeTable.h"
 
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/Suggestion.h"
 #include "mihost/cli/TextTable.h"
 #include "mihost/runtime/Text.h"
 
 #include <algorithm>
 #include <fmt/format.h>
-#include <fmt/ranges.h>
 
 namespace mihost
 {
@@ -52,8 +52,8 @@ NodeTable::Column NodeTable::columnOf(NodeKind const& kind, std::string const& n
     for (Attribute const& attribute : attributes)
         if (attribute.name == name)
             return {attribute.name, attribute.of, 0};
-    throw Failure(NotFound, fmt::format("no column '{}' for {}; there are {}", name, kind.listName,
-                                        fmt::join(namesFor(kind), ", ")));
+    throw Failure(NotFound, fmt::format("no column '{}' for {}; {}", name, kind.listName,
+                                        suggestion(name, namesFor(kind), "there are")));
 }
 
 std::string NodeTable::cell(Column const& column, NodeView const& view)

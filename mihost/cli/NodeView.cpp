@@ -3,9 +3,9 @@
 #include "mihost/cli/Address.h"
 #include "mihost/cli/Decimal.h"
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/Suggestion.h"
 
 #include <fmt/format.h>
-#include <fmt/ranges.h>
 #include <set>
 
 namespace mihost
@@ -94,8 +94,8 @@ NodeView liveView(IC::MutableNode const& node, std::vector<std::string> const& n
         IC::Error const error = node.getProperty(id, value);
         if (error.getStatus() != 0)
             throw Failure(PluginRefused,
-                          fmt::format("property '{}' of node '{}': {}", name, addressOf(node),
-                                      static_cast<std::string>(error)));
+                          fmt::format("property '{}' of node '{}': {}; see 'mihost doctor'", name,
+                                      addressOf(node), static_cast<std::string>(error)));
         result.properties.push_back(view(kind, id, value, secrets));
     }
     return result;
@@ -114,9 +114,8 @@ unsigned int propertyId(IC::MutableNode const& node, std::string const& name)
         Property const* const row = kind ? findProperty(*kind, each) : nullptr;
         known.push_back(row ? row->name : std::to_string(each));
     }
-    throw Failure(NotFound,
-                  fmt::format("node '{}' has no property '{}'; it has {}", addressOf(node), name,
-                              known.empty() ? "none" : fmt::format("{}", fmt::join(known, ", "))));
+    throw Failure(NotFound, fmt::format("node '{}' has no property '{}'; {}", addressOf(node), name,
+                                        suggestion(name, known, "it has")));
 }
 
 std::string valueText(PropertyView const& property)

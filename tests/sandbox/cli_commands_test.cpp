@@ -148,13 +148,21 @@ TEST(MihostGet, ExitsWith4ForAnUnknownNodeOrProperty)
     }
 }
 
+TEST(MihostGet, SaysSoWhereANodeHasNoProperties)
+{
+    Outcome const outcome = mihostRun({"get", "root"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_EQ(outcome.err, "mihost: node 'root' has no properties\n");
+}
+
 TEST(MihostGet, ExitsWith1WhereThePluginAnswersWithANonZeroStatus)
 {
     machine::lay("plain"); // no release file there, so no version is stored
     Outcome const outcome = mihostRun({"get", "os", "os-version"});
     EXPECT_EQ(outcome.code, 1);
     EXPECT_EQ(outcome.err, "mihost: property 'os-version' of node 'os': status 1: property 134 is "
-                           "not set\n");
+                           "not set; see 'mihost doctor'\n");
 }
 
 TEST(MihostList, IsATableOfOneKind)
@@ -307,6 +315,27 @@ TEST(MihostUsage, ExitsWith2AndOneLineForWrongArguments)
         EXPECT_EQ(outcome.out, "");
         EXPECT_EQ(linesOf(outcome.err).size(), 1U) << outcome.err;
     }
+}
+
+TEST(MihostUsage, TellsWhatWasMeantOrWhereToReadOn)
+{
+    std::vector<std::pair<Lines, std::string>> const refusals = {
+        {{"tre"}, "no command 'tre'; did you mean tree?"},
+        {{"tre", "os"}, "no command 'tre'; did you mean tree?"},
+        {{"--fsat", "tree"}, "no option '--fsat'; did you mean --fast?"},
+        {{"tree", "--al"}, "no option '--al'; did you mean --all?"},
+        {{"list", "users", "--colums=id"}, "no option '--colums=id'; did you mean --columns?"},
+        {{"tree", "--nothing"}, "no option '--nothing' (mihost tree --help tells more)"},
+        {{"tree", "os", "extra"},
+         "'extra' is one argument too many (mihost tree --help tells more)"},
+        {{"get"}, "NODE is required (mihost get --help tells more)"}};
+    for (auto const& [arguments, told] : refusals)
+        EXPECT_EQ(mihostRun(arguments).err, "mihost: " + told + "\n");
+    EXPECT_EQ(mihostRun({"nonsense"})
+                  .err.rfind("mihost: no command 'nonsense'; there are tree, list, ", 0),
+              0U);
+    EXPECT_EQ(mihostRun({"shell"}, "get").err,
+              "mihost: line 1: NODE is required (help get tells more)\n");
 }
 
 TEST(MihostUsage, TakesOptionsBeforeAndBehindTheCommand)

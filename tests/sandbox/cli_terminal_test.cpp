@@ -306,6 +306,7 @@ TEST_F(MihostTerminal, ComesBackToTheShellWhenCtrlCStopsAWatch)
     run.type("watch os os-name --interval 1000\n");
     run.waitFor("108 os-name  Linux");
     run.type(ctrlC);
+    run.waitFor("^C\r\n");
     run.waitFor(prompt);
     run.type(ctrlD);
     EXPECT_EQ(run.end(), 0);

@@ -218,6 +218,16 @@ TEST(MihostSet, RefusesANameForANodeThatAShellWouldActOn)
     EXPECT_EQ(mihostRun({"set", "user:jdoe", "108", "other"}).code, 0);
 }
 
+TEST(MihostSet, SaysWhereOnlyTheTreeChanges)
+{
+    makeMachine();
+    Outcome const outcome = mihostRun({"set", "user:jdoe", "full-name", "J. Doe"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.err, "mihost: full-name changed in this tree alone; 'mihost properties user' "
+                           "tells which properties act on the machine\n");
+    EXPECT_EQ(mihostRun({"set", "user:jdoe", "password-expiration", "2030-01-01"}).err, "");
+}
+
 TEST(MihostSet, TakesAMethodCallApart)
 {
     makeMachine();

@@ -31,6 +31,16 @@ protected:
         return mihost::findNode(nodes_, address).getNodeId();
     }
 
+    std::string refusalOf(std::string const& address) const
+    {
+        try {
+            find(address);
+        } catch (Failure const& failure) {
+            return failure.what();
+        }
+        return "";
+    }
+
     int codeOf(std::string const& address) const
     {
         try {
@@ -88,14 +98,25 @@ TEST_F(Addresses, ThatNoNodeHasAreNotFound)
 TEST_F(Addresses, ThatAreNoneAreNotFoundAndTheMessageSaysWhatOneLooksLike)
 {
     for (char const* address : {"", "user", "os:1", "-1", "4x", "99999999999", "nonsense:x"}) {
-        try {
-            find(address);
-            ADD_FAILURE() << address;
-        } catch (Failure const& failure) {
-            EXPECT_EQ(failure.code(), mihost::NotFound) << address;
-            EXPECT_NE(std::string(failure.what()).find("user:NAME"), std::string::npos);
-        }
+        EXPECT_EQ(codeOf(address), mihost::NotFound) << address;
+        EXPECT_NE(refusalOf(address).find("user:NAME"), std::string::npos) << address;
     }
+}
+
+TEST_F(Addresses, ThatNameAKindOfNodeAreToldHowToListIt)
+{
+    EXPECT_EQ(refusalOf("group"),
+              "no node 'group': write group:NAME; 'mihost list groups' shows them");
+    EXPECT_EQ(refusalOf("drivers"),
+              "no node 'drivers': write driver:NAME; 'mihost list drivers' shows them");
+}
+
+TEST_F(Addresses, ThatNearlyNameANodeOfTheirKindAreToldItsName)
+{
+    EXPECT_EQ(refusalOf("user:jdoo"), "no node 'user:jdoo' in the tree; did you mean user:jdoe?");
+    for (char const* address : {"user:ext4", "user:", "log:2", "3"})
+        EXPECT_EQ(refusalOf(address), std::string("no node '") + address +
+                                          "' in the tree; 'mihost tree' shows all of them");
 }
 
 TEST_F(Addresses, OfNodesReadBackAsTheyAreShown)

@@ -53,14 +53,25 @@ TEST(MethodCall, AsksForAPasswordThatIsADash)
 
 TEST(MethodCall, IsRefusedWithTheNamesThatWouldBeRight)
 {
-    EXPECT_NE(refusal([] { textFor("Useradd", {}); }).find("UserAdd, UserDel"), std::string::npos);
+    EXPECT_EQ(refusal([] { textFor("Useradd", {}); }),
+              "no method 'Useradd'; did you mean UserAdd?");
+    EXPECT_NE(refusal([] { textFor("Adduser", {}); }).find("UserAdd, UserDel"), std::string::npos);
     EXPECT_EQ(refusal([] { textFor("LocalGroupAdd", {"Name=staff"}); }),
               "LocalGroupAdd has no parameter 'Name'; it has GroupName");
 }
 
+TEST(MethodCall, IsRefusedWhereAParameterHasNoName)
+{
+    EXPECT_EQ(refusal([] { textFor("LocalGroupAddUser", {"jdoe"}); }),
+              "'jdoe' is not NAME=VALUE; LocalGroupAddUser takes LocalGroupName, DomainAndMember");
+    EXPECT_EQ(refusal([] { textFor("GetShadowing", {"now"}); }),
+              "'now' is not NAME=VALUE; GetShadowing takes none");
+}
+
 TEST(MethodCall, IsRefusedWhereAParameterIsMissingDoubleOrWithoutValue)
 {
-    EXPECT_EQ(refusal([] { textFor("UserDel", {}); }), "UserDel needs UserName: login name");
+    EXPECT_EQ(refusal([] { textFor("UserDel", {}); }),
+              "UserDel needs UserName, login name; 'mihost methods UserDel' has all");
     EXPECT_EQ(refusal([] {
                   textFor("UserDel", {"UserName=a", "UserName=b"});
               }),

@@ -18,7 +18,9 @@ class Call : public Command
 public:
     void declare(CLI::App& app) override
     {
-        method_ = app.add_option("METHOD", name_, "such as UserAdd")->required();
+        method_ = app.add_option("METHOD", name_,
+                                 "such as UserAdd; --help behind it tells its parameters")
+                      ->required();
         app.add_option("PARAMETER", assignments_,
                        "NAME=VALUE; days as YYYY-MM-DD; Password=- is asked for, or read from "
                        "standard input");

@@ -1,6 +1,9 @@
 #include "mihost/cli/PropertyText.h"
+#include "mihost/cli/Say.h"
 #include "mihost/cli/Session.h"
 #include "mihost/cli/commands/makers.h"
+
+#include <fmt/format.h>
 
 namespace mihost
 {
@@ -13,8 +16,11 @@ class Get : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("NODE", address_, "an id, or a name such as os or user:root")->required();
-        app.add_option("PROPERTY", names_, "ids or names; all of them where none is given");
+        app.add_option("NODE", address_,
+                       "an id, or a name such as os or user:root; tree shows them")
+            ->required();
+        app.add_option("PROPERTY", names_,
+                       "ids or names, which properties explains; all of them where none is given");
     }
 
     void run(Session& session) override
@@ -24,6 +30,8 @@ public:
                                              : liveView(node, names_, session.secrets());
         if (session.options().json)
             session.out().json(toJson(view));
+        else if (view.properties.empty())
+            say(fmt::format("mihost: node '{}' has no properties\n", address_));
         else
             writeProperties(view.properties, "", session.out());
     }

@@ -27,6 +27,11 @@ std::size_t countOf(std::vector<IC::MutableNode*> const& nodes, unsigned int typ
     return count;
 }
 
+std::string counted(std::size_t count, char const* one, char const* several)
+{
+    return fmt::format("{} {}", count, count == 1 ? one : several);
+}
+
 class Refresh : public Command
 {
 public:
@@ -38,8 +43,9 @@ public:
         if (session.options().json)
             return;
         auto const nodes = session.nodes();
-        session.out().line(fmt::format("{} users, {} groups", countOf(nodes, NODES::userType),
-                                       countOf(nodes, NODES::groupType)));
+        session.out().line(
+            fmt::format("{}, {}", counted(countOf(nodes, NODES::userType), "user", "users"),
+                        counted(countOf(nodes, NODES::groupType), "group", "groups")));
     }
 };
 
@@ -56,7 +62,7 @@ public:
             return;
         // Whether it worked is not told; the entries that are left tell.
         session.out().line(
-            fmt::format("{} log entries", countOf(session.nodes(), NODES::logEntryType)));
+            counted(countOf(session.nodes(), NODES::logEntryType), "log entry", "log entries"));
     }
 };
 

@@ -1,6 +1,7 @@
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/MethodCall.h"
 #include "mihost/cli/Safety.h"
+#include "mihost/cli/Say.h"
 #include "mihost/cli/Session.h"
 #include "mihost/cli/ValueText.h"
 #include "mihost/cli/Write.h"
@@ -69,8 +70,10 @@ class Set : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("NODE", address_, "an id, or a name such as os or user:root")->required();
-        app.add_option("PROPERTY", name_, "an id or a name")->required();
+        app.add_option("NODE", address_,
+                       "an id, or a name such as os or user:root; tree shows them")
+            ->required();
+        app.add_option("PROPERTY", name_, "an id or a name, which properties explains")->required();
         app.add_option("VALUE", text_,
                        "a date as YYYY-MM-DD, true or false, lists with commas; - for a password "
                        "is asked for, or read from standard input")
@@ -89,7 +92,7 @@ public:
                                       "it is not written",
                                       name_, address_));
         if (property->has(Property::Secret) && text_ == toBeAsked)
-            text_ = session.askSecret(property->name);
+            text_ = session.askSecret(fmt::format("{} hash", property->name));
 
         IC::PropertyValue const value = parseValue(*property, text_);
         if (node.getNodeType() == NODES::userType && property->has(Property::Acts))
@@ -97,6 +100,10 @@ public:
         if (std::string const danger = dangerOf(node, *property, value); !danger.empty())
             session.confirm(danger);
         carryOut(session, {node, id, value, secretOf(*property, text_)});
+        if (!property->has(Property::Acts) && !session.options().json)
+            say(fmt::format("mihost: {} changed in this tree alone; 'mihost properties {}' tells "
+                            "which properties act on the machine\n",
+                            property->name, kind->name));
     }
 
 private:

@@ -1,6 +1,8 @@
 #include "mihost/cli/Interrupts.h"
 #include "mihost/cli/PropertyText.h"
+#include "mihost/cli/Say.h"
 #include "mihost/cli/Session.h"
+#include "mihost/cli/Terminal.h"
 #include "mihost/cli/commands/makers.h"
 
 #include <cmath>
@@ -26,8 +28,9 @@ class Watch : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("NODE", address_, "an id, or a name such as os or log:1")->required();
-        app.add_option("PROPERTY", names_, "ids or names")->required();
+        app.add_option("NODE", address_, "an id, or a name such as os or log:1; tree shows them")
+            ->required();
+        app.add_option("PROPERTY", names_, "ids or names, which properties explains")->required();
         app.add_option("--interval", interval_, "seconds between two readings")
             ->check(CLI::Range(0.0, 86400.0))
             ->check(objectionToNan)
@@ -75,6 +78,8 @@ private:
         auto const event = signals.wait({out.descriptor(), 0, 0}, seconds);
         if (event == Noted::Event::Ready)
             throw OutputClosed();
+        if (event == Noted::Event::Signal && terminal::canAsk())
+            say("\n"); // the terminal shows ^C
         return event == Noted::Event::Timeout;
     }
 

@@ -1,0 +1,55 @@
+#include "mihost/cli/Suggestion.h"
+
+#include <gtest/gtest.h>
+
+namespace
+{
+
+using mihost::nearest;
+using mihost::suggestion;
+
+std::vector<std::string> const names = {"tree",    "list",    "get",    "set",
+                                        "UserAdd", "UserDel", "os-name"};
+
+TEST(Suggestion, IsTheNameInAnotherCase)
+{
+    EXPECT_EQ(nearest("useradd", names), "UserAdd");
+    EXPECT_EQ(nearest("TREE", names), "tree");
+}
+
+TEST(Suggestion, IsTheNameWithALetterMissingAddedReplacedOrSwapped)
+{
+    EXPECT_EQ(nearest("tre", names), "tree");
+    EXPECT_EQ(nearest("treee", names), "tree");
+    EXPECT_EQ(nearest("lost", names), "list");
+    EXPECT_EQ(nearest("lits", names), "list");
+}
+
+TEST(Suggestion, MayBeTwoSlipsAwayOnlyFromALongWord)
+{
+    EXPECT_EQ(nearest("osname1", names), "os-name");
+    EXPECT_EQ(nearest("lit1", names), "");
+}
+
+TEST(Suggestion, IsTheNearestOfSeveral)
+{
+    EXPECT_EQ(nearest("UserDell", names), "UserDel");
+    EXPECT_EQ(nearest("UserDd", {"UserDel", "UserAdd"}), "UserAdd");
+}
+
+TEST(Suggestion, IsNoneForALetterAPageOrAnotherWord)
+{
+    EXPECT_EQ(nearest("g", names), "");
+    EXPECT_EQ(nearest("", names), "");
+    EXPECT_EQ(nearest(std::string(65, 'x'), {std::string(65, 'x')}), "");
+    EXPECT_EQ(nearest("reboot", names), "");
+}
+
+TEST(Suggestion, AsksForANameThatIsNearAndListsAllOtherwise)
+{
+    EXPECT_EQ(suggestion("gte", {"get", "set"}, "there are"), "did you mean get?");
+    EXPECT_EQ(suggestion("refresh", {"get", "set"}, "there are"), "there are get, set");
+    EXPECT_EQ(suggestion("refresh", {}, "it has"), "it has none");
+}
+
+} // namespace

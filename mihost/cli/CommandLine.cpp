@@ -56,8 +56,8 @@ std::string excessOf(CLI::App const& app, std::string const& help)
                              : fmt::format("no option '{}'; did you mean {}?", word, meant);
     }
     if (app.get_subcommands().empty())
-        return fmt::format("no command '{}'; {}", word,
-                           suggestion(word, commandNames(app), "there are"));
+        return fmt::format("no command '{}'; {} ({} tells more)", word,
+                           suggestion(word, commandNames(app), "there are"), help);
     return fmt::format("'{}' is one argument too many ({} tells more)", word, help);
 }
 
@@ -107,7 +107,8 @@ void CommandLine::parse(std::vector<std::string> words)
     bool const inShell = place_ == Place::Shell;
     CLI::App app(inShell
                      ? "Commands run on the loaded plug-in. help COMMAND tells more, exit leaves."
-                     : "Loads the management-interface plug-in, shows its tree and drives it.",
+                     : "Loads the management-interface plug-in, shows its tree and drives it.\n"
+                       "Without a command it shows the tree; mihost COMMAND --help tells of one.",
                  inShell ? "" : "mihost");
     declare(app);
     try {

@@ -320,8 +320,8 @@ TEST(MihostUsage, ExitsWith2AndOneLineForWrongArguments)
 TEST(MihostUsage, TellsWhatWasMeantOrWhereToReadOn)
 {
     std::vector<std::pair<Lines, std::string>> const refusals = {
-        {{"tre"}, "no command 'tre'; did you mean tree?"},
-        {{"tre", "os"}, "no command 'tre'; did you mean tree?"},
+        {{"tre"}, "no command 'tre'; did you mean tree? (mihost --help tells more)"},
+        {{"tre", "os"}, "no command 'tre'; did you mean tree? (mihost --help tells more)"},
         {{"--fsat", "tree"}, "no option '--fsat'; did you mean --fast?"},
         {{"tree", "--al"}, "no option '--al'; did you mean --all?"},
         {{"list", "users", "--colums=id"}, "no option '--colums=id'; did you mean --columns?"},

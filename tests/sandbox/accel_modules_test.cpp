@@ -176,7 +176,7 @@ TEST(AccelModinfo, AgreesWithModinfoOnThousandsOfModules)
     constexpr int modules = 1000;
     for (int i = 0; i < modules; ++i)
         kernelModules::write("kernel/drivers/mod-" + std::to_string(i) + ".ko",
-                            randomModule(random));
+                             randomModule(random));
     kernelModules::index();
     int leftOut = 0; // a changed byte may have made a key too long
     for (int i = 0; i < modules; ++i)

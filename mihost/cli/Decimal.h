@@ -7,7 +7,7 @@
 namespace mihost
 {
 
-/** The number that the text is, digits from its first to its last; nothing where it does not fit. */
+/** The number that the whole text is, in digits; nothing where it is none or does not fit. */
 std::optional<unsigned int> parseDecimal(std::string_view text);
 
 } // namespace mihost

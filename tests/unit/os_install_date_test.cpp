@@ -122,6 +122,16 @@ TEST_F(InstallDate, IsZeroWhenTheLineHoldsNoDate)
     EXPECT_EQ(log.remarks(), std::vector<std::string>{"Invalid YY: YY = 0"});
 }
 
+TEST_F(InstallDate, TakesWhatALineLacksForZero)
+{
+    constexpr long midnight = may2010 - 10 * hour - 23 * 60 - 45;
+    EXPECT_EQ(dateOf("Change: 2010-05-12 10:23\n"), may2010 - 45);
+    EXPECT_EQ(dateOf("Change: 2010-05-12 10\n"), midnight + 10 * hour);
+    EXPECT_EQ(dateOf("Change: 2010-05-12\n"), midnight);
+    EXPECT_EQ(dateOf("Change: 2010-05\n"), midnight - 12 * 24 * hour);
+    EXPECT_EQ(dateOf("Change: 2010\n"), 1262217600); // 31 December 2009
+}
+
 TEST_F(InstallDate, NeedsTheLineToBeginWithChange)
 {
     EXPECT_EQ(dateOf(" Change: 2010-05-12 10:23:45\n"), 0);

@@ -347,6 +347,16 @@ TEST_F(UserListing, LogsAnUnparsableRuleUnderItsOwnNameAsAnError)
     }
 }
 
+TEST_F(UserListing, AllowsNoFailuresWhereTheRulesDoNotSayHowMany)
+{
+    files_.write("/etc/passwd", account("jdoe", 1000));
+    for (char const* rules : {"", "auth required pam_unix.so\n", "deny=x\n"}) {
+        files_.write("/etc/pam.d/login", rules);
+        for (userInfo& user : list())
+            EXPECT_EQ(user.getMaxLoginFailures(), 0) << rules;
+    }
+}
+
 TEST_F(UserListing, ReadsRulesOfAnyLengthToTheirEnd)
 {
     files_.write("/etc/passwd", account("jdoe", 1000) + account("mary", 1001));

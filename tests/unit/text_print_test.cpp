@@ -20,4 +20,11 @@ TEST(PrintIntoABuffer, RefusesATextOneByteTooLong)
     EXPECT_EQ(std::string(buffer), "abcd-");
 }
 
+TEST(PrintIntoABuffer, TakesAnEmptyText)
+{
+    char buffer[] = "abc";
+    EXPECT_TRUE(NQ::TEXT::print(buffer, sizeof buffer, "%s", ""));
+    EXPECT_STREQ(buffer, "");
+}
+
 } // namespace

@@ -125,7 +125,7 @@ constexpr char const* date = "CMPI_dateTime";
 Parameter const userName{"UserName", text, Form::AccountName, true, "login name"};
 Parameter const groupName{"GroupName", text, Form::AccountName, true, "the group's name"};
 Parameter const comment{"Comment", text, Form::Words, false, "the account's comment field"};
-Parameter const homeDir{"HomeDir", text, Form::Path, false, "home directory; files are moved there"};
+Parameter const homeDir{"HomeDir", text, Form::Path, false, "home directory; made, or moved there with its files"};
 Parameter const scriptPath{"ScriptPath", text, Form::Path, false, "login shell"};
 Parameter const password{"Password", text, Form::Password, false, "plain password"};
 Parameter const minDays{"daysMustKeepPassword", number, Form::Digits, false, "days before a password may be changed"};

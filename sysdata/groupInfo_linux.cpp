@@ -67,7 +67,8 @@ void groupInfo::setGroupId(unsigned int groupId)
 
 void groupInfo::setGroupMembers(char** members)
 {
-    setGroupMembers(members, GROUP_INFO::PrimaryMembers());
+    LOG::Scope const scope(unit);
+    members_ = GROUP_INFO::withMembers(GROUP_INFO::PrimaryMembers().of(groupId_), members);
 }
 
 void groupInfo::setGroupMembers(char** members, GROUP_INFO::PrimaryMembers const& primary)
@@ -89,9 +90,9 @@ void groupInfo::Tokenize(std::string const& text, std::vector<std::string>& toke
 {
     LOG::Scope const scope(unit);
     for (std::string& token : TEXT::split(text, delimiters)) {
-        LOG::write(unit, LOG::progress,
-                   LOG::message("str.substr(lastPos, pos - lastPos) = ", token));
         tokens.push_back(std::move(token));
+        LOG::write(unit, LOG::progress,
+                   LOG::message("str.substr(lastPos, pos - lastPos) = ", tokens.back()));
     }
 }
 

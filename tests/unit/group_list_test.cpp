@@ -239,4 +239,14 @@ TEST_F(GroupListing, LogsWhatItDoesForEachGroup)
     }
 }
 
+TEST_F(GroupListing, EmptiesTheListBeforeItWaitsForItsMutex)
+{
+    std::vector<groupInfo> groups(3, groupInfo("old"));
+    std::size_t atLock = 4711;
+    MutexCalls mutexes;
+    mutexes.onLock = [&](NQ::Mutex const&, unsigned long) { atLock = groups.size(); };
+    NQ::getGroupInfo(groups);
+    EXPECT_EQ(atLock, 0U);
+}
+
 } // namespace

@@ -327,4 +327,41 @@ TEST_F(GroupNodes, SpeakOfAReadOfTheirBirthAndOfTheirDeath)
     EXPECT_EQ(log.texts(), Texts{"GroupNode::~GroupNode: entry"});
 }
 
+TEST_F(GroupNodes, SpeakOfEveryReadForTheFrame)
+{
+    frame.createGroupNodes(false);
+    for (unsigned int const id : {51U, 108U}) {
+        Recording const log;
+        IC::PropertyValue value = NODES::emptyValue();
+        groups()[0]->getProperty(id, value);
+        Texts const texts = log.texts(3000);
+        ASSERT_GE(texts.size(), 2U);
+        EXPECT_EQ(texts.front(), "GroupNode::getProperty: entry");
+        EXPECT_EQ(texts[1], id == 51 ? "getGroupInfo: entry" : "GroupNode::getProperty: exit");
+        EXPECT_EQ(texts.back(), "GroupNode::getProperty: exit");
+        for (LogRecord const& record : log.records())
+            if (record.function == "getProperty") {
+                EXPECT_EQ(record.file, "OsSwMI");
+                EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
+            }
+    }
+}
+
+TEST_F(GroupNodes, AreAnnouncedByTheDescriptionThatTheyHaveWhenTheyAreDeleted)
+{
+    frame.createGroupNodes(false);
+    groups()[1]->setDescription("Renamed");
+    Recording const log;
+    frame.createGroupNodes(true);
+    EXPECT_TRUE(log.has("Delete a group entry: Renamed", 3000));
+}
+
+TEST_F(GroupNodes, LeaveTheMarkOfTheUserBuilderAsItStands)
+{
+    IC::OSSWMI::MI_call = true;
+    frame.createGroupNodes(false);
+    EXPECT_TRUE(IC::OSSWMI::MI_call);
+    IC::OSSWMI::MI_call = false;
+}
+
 } // namespace

@@ -181,4 +181,32 @@ TEST(GroupRecord, LogsEntryAndExitOfEveryOperation)
     }
 }
 
+TEST(GroupRecord, TakesPrimaryMembersFromLinesOfAnyLength)
+{
+    FakeFiles const files;
+    files.write("/etc/passwd", "anna:x:1000:500:" + std::string(20000, 'x') + ":/:/bin/sh\n" +
+                                   account("ben", 500));
+    EXPECT_EQ(members(500, {}), (Names{"anna", "ben"}));
+}
+
+TEST(GroupRecord, ReadsTheAccountsBetweenItsEntryAndItsExit)
+{
+    FakeFiles const files;
+    files.write("/etc/passwd", account("ben", 500));
+    Recording const log;
+    std::vector<std::string> before;
+    auto const below = libc::hooks().fopen;
+    libc::hooks().fopen = [&](char const* path, char const* mode) {
+        before = log.texts();
+        return below(path, mode);
+    };
+    char* none[] = {nullptr};
+    NQ::groupInfo group("staff");
+    group.setGroupId(500);
+    group.setGroupMembers(none);
+    ASSERT_FALSE(before.empty());
+    EXPECT_EQ(before.back(), "setGroupMembers: entry");
+    EXPECT_EQ(log.texts().back(), "setGroupMembers: exit");
+}
+
 } // namespace

@@ -215,4 +215,18 @@ TEST(IdRanges, HoldsTheLowestIdsAndThenTheHighestAndNothingElse)
     EXPECT_EQ(fields, (std::array<unsigned int, 4>{1, 2, 3, 4}));
 }
 
+TEST(IdRanges, ReadsAFileOfAnyLengthToItsEnd)
+{
+    for (std::size_t const length : {4096U, 65536U, 1000000U})
+        EXPECT_EQ(ids("#" + std::string(length, 'x') + "\nUID_MIN 1000\n"), (Ids{1000, 0, 0, 0}))
+            << length;
+}
+
+TEST(IdRanges, ReadsAValueAsAnUnsignedDecimalBehindBlanksOfAnyKind)
+{
+    EXPECT_EQ(minUserId("UID_MIN 0100\n"), 100U);
+    EXPECT_EQ(minUserId("UID_MIN 0x10\n"), 0U);
+    EXPECT_EQ(minUserId("UID_MIN \n 1000\n"), 1000U); // a line end is skipped, too
+}
+
 } // namespace

@@ -409,4 +409,70 @@ TEST_F(AccountLock, IsFoundInTheFirst4999BytesOfAnyAmountOfOutput)
     EXPECT_EQ(commands_.open, 0);
 }
 
+TEST_F(AccountLock, LooksForTheSecondReleaseFileOnlyWithoutTheFirst)
+{
+    Lines opened;
+    auto const below = libc::hooks().fopen;
+    libc::hooks().fopen = [&opened, below](char const* path, char const* mode) {
+        opened.emplace_back(path);
+        return below(path, mode);
+    };
+    locked("jdoe PS");
+    EXPECT_EQ(opened, (Lines{"/etc/SuSE-release", "/etc/UnitedLinux-release"}));
+    files_.write("/etc/SuSE-release", "");
+    opened.clear();
+    locked("jdoe PS");
+    EXPECT_EQ(opened, Lines{"/etc/SuSE-release"});
+}
+
+TEST_F(AccountOperation, LeavesTheRecordAsItIs)
+{
+    userInfo user("jdoe");
+    user.setUserPassword("secret");
+    user.setPwdMaxDays(90);
+    user.setPwdExpDays(30);
+    commands_.otherwise = "Password expires : Jan 01, 2008\nLast password change : Jan 01, 2008\n";
+    user.setInactivityTimeout("2008-01-11 00:00:00", "jdoe");
+    user.setPasswordExpiration("2008-01-11 00:00:00", "jdoe");
+    user.setDelete("jdoe");
+    EXPECT_EQ(user.getUserName(), "jdoe");
+    EXPECT_EQ(user.getUserPassword(), "secret");
+    EXPECT_EQ(user.getPwdMaxDays(), 90U);
+    EXPECT_EQ(user.getPwdExpDays(), 30U);
+    EXPECT_FALSE(user.IsDelete());
+}
+
+TEST_P(AgeingOperation, SucceedsHoweverChageEnds)
+{
+    libc::hooks().pclose = [](FILE* stream) {
+        std::fclose(stream);
+        return 1 << 8;
+    };
+    answerListing("Jan 01, 2008");
+    commands_.answers[ageLine("10")] = "";
+    EXPECT_TRUE(set("2008-01-11 00:00:00"));
+}
+
+TEST_F(AccountLock, SpeaksLikeEveryOperationAtLevel3000UnderTheUnitsName)
+{
+    commands_.otherwise = "";
+    char command[] = "chage -l jdoe";
+    char label[] = "Password expires";
+    char user[] = "jdoe";
+    userInfo info;
+    info.setDelete(user);
+    info.setInactivityTimeout("2008-01-11 00:00:00", user);
+    info.setPasswordExpiration("2008-01-11 00:00:00", user);
+    info.getDays(command, label, 0);
+    info.findIsAcctDisabled(user);
+    for (LogRecord const& record : log_.records()) {
+        if (record.file == "MyProcess")
+            continue; // the date conversions
+        EXPECT_EQ(record.level, 3000) << record.text;
+        EXPECT_EQ(record.file, "userInfo_linux");
+        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.UserInfo");
+        EXPECT_EQ(record.function, record.text.substr(0, record.text.find(':')));
+    }
+}
+
 } // namespace

@@ -14,6 +14,7 @@
 #include <locale>
 #include <new>
 #include <pwd.h>
+#include <shadow.h>
 #include <string>
 #include <vector>
 
@@ -373,6 +374,34 @@ TEST_F(UserListing, SeesAChangeOfTheFilesTheNextTime)
     EXPECT_EQ(names(), Lines{"jdoe"});
     files_.write("/etc/passwd", account("jdoe", 1000) + account("new", 1001));
     EXPECT_EQ(names(), (Lines{"jdoe", "new"}));
+}
+
+TEST_F(UserListing, HandsTheShadowReaderABufferOf4096Bytes)
+{
+    files_.write("/etc/passwd", account("a", 1000));
+    files_.write("/etc/shadow", shadow("a", "A"));
+    std::vector<std::size_t> sizes;
+    libc::hooks().fgetspent_r = [&sizes](FILE* stream, spwd* entry, char* line, std::size_t size,
+                                         spwd** found) {
+        sizes.push_back(size);
+        return libc::realFgetspent_r(stream, entry, line, size, found);
+    };
+    list();
+    EXPECT_EQ(sizes, std::vector<std::size_t>{4096});
+}
+
+TEST_F(UserListing, TakesNoShadowEntryWhoseNameOnlyBeginsWithTheAccounts)
+{
+    files_.write("/etc/passwd", account("ann", 1000));
+    files_.write("/etc/shadow", shadow("anna", "X") + shadow("an", "Y") + shadow("ann", "A"));
+    EXPECT_EQ(passwordsOf(list()), Lines{"A"});
+}
+
+TEST_F(UserListing, OpensNothingElseWithoutAnAccountFile)
+{
+    files_.write("/etc/shadow", shadow("root", "x"));
+    EXPECT_TRUE(list().empty());
+    EXPECT_EQ(steps_, Lines{"/etc/passwd ro"});
 }
 
 } // namespace

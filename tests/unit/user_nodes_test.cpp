@@ -420,4 +420,28 @@ TEST_F(UserNodes, SpeakOfTheirBirthAndOfTheirDeath)
     EXPECT_EQ(log.texts(), Texts{"UserNode::~UserNode: entry"});
 }
 
+TEST_F(UserNodes, AreAnnouncedByTheDescriptionThatTheyHaveWhenTheyAreDeleted)
+{
+    frame.createUserNodes(false);
+    users()[1]->setDescription("Renamed");
+    Recording const log;
+    frame.createUserNodes(true);
+    EXPECT_TRUE(log.has("Delete a user entry: Renamed", 3000));
+}
+
+TEST_F(UserNodes, SpeakOfAReadForTheFrame)
+{
+    frame.createUserNodes(false);
+    Recording const log;
+    IC::PropertyValue value = NODES::emptyValue();
+    users()[0]->getProperty(108, value);
+    ASSERT_EQ(log.records().size(), 4U);
+    for (LogRecord const& record : log.records()) {
+        EXPECT_EQ(record.level, 3000);
+        EXPECT_EQ(record.function, "getProperty");
+        EXPECT_EQ(record.file, "OsSwMI");
+        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
+    }
+}
+
 } // namespace

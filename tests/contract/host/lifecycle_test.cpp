@@ -503,4 +503,70 @@ TEST_F(Lifecycle, TheFrameSpeaksUnderItsOwnCategoryAndFile)
     EXPECT_EQ(count, (builders.size() + 2) * 4);
 }
 
+TEST_F(Library, LeavesTheIdRangesOnTheHeapWhenItIsClosed)
+{
+    freshHost();
+    libc::FileRoot const files{MACHINES_DIR "/redhat"};
+    libc::FakeCommands const commands;
+    auto plugin = std::make_unique<Plugin>();
+    plugin->initialize();
+    auto const* const ranges =
+        *static_cast<unsigned int const* const*>(plugin->symbol("_ZN2NQ8minMaxId9pinstanceE"));
+    auto* const ask =
+        reinterpret_cast<void const* (*)()>(plugin->symbol("_ZN2NQ8minMaxId8InstanceEv"));
+    EXPECT_EQ(ask(), ranges);
+    Dl_info info{};
+    EXPECT_EQ(dladdr(ranges, &info), 0); // part of no loaded file
+    plugin.reset();
+    EXPECT_EQ(Ids(ranges, ranges + 4), (Ids{500, 500, 60000, 60000}));
+}
+
+TEST_F(Library, ReadsTheIdRangesAgainWhenItIsLoadedAgain)
+{
+    freshHost();
+    libc::FakeCommands const commands;
+    Ids lowest;
+    for (char const* machine : {MACHINES_DIR "/redhat", MACHINES_DIR "/suse"}) {
+        libc::FileRoot const files{machine};
+        Plugin plugin;
+        plugin.initialize();
+        lowest.push_back(
+            **static_cast<unsigned int const* const*>(plugin.symbol("_ZN2NQ8minMaxId9pinstanceE")));
+    }
+    EXPECT_EQ(lowest, (Ids{500, 1000}));
+}
+
+TEST_F(Lifecycle, TheFlagIsUpWhileAUserNodeIsSetUpAndDownWhileAnyNodeIsMade)
+{
+    bool const& flag = object<bool>("_ZN2IC6OSSWMI7MI_callE");
+    host.onNode = [&flag] { EXPECT_FALSE(flag); };
+    host.onSetStatus = [&flag](IC::MutableNode const& node) {
+        EXPECT_EQ(flag, node.getNodeType() == NODES::userType) << node.getNodeType();
+    };
+    plugin.initialize();
+    EXPECT_GE(plugin.nodes(NODES::userType).size(), 2U);
+}
+
+TEST_F(Lifecycle, ARebuildHoldsTheLockFromItsBeginningToItsEnd)
+{
+    plugin.initialize();
+    struct {
+        std::string name;
+        char const* symbol;
+        int unlocks; // the listing of groups has a lock of its own
+    } const rebuilds[] = {{"createUserNodes", "_ZN2IC6OsSwMI15createUserNodesEb", 1},
+                          {"createGroupNodes", "_ZN2IC6OsSwMI16createGroupNodesEb", 2}};
+    for (auto const& made : rebuilds) {
+        host.events.clear();
+        rebuild(made.symbol);
+        Lines const& all = host.events;
+        ASSERT_GT(all.size(), 4U);
+        EXPECT_EQ(all[0], "log: " + made.name + ": entry");
+        EXPECT_EQ(all[1], "lock(4294967295)");
+        EXPECT_EQ(all[all.size() - 2], "unlock()");
+        EXPECT_EQ(all.back(), "log: " + made.name + ": exit");
+        EXPECT_EQ(std::count(all.begin(), all.end(), "unlock()"), made.unlocks);
+    }
+}
+
 } // namespace

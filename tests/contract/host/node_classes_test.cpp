@@ -2,6 +2,7 @@
 
 #include "tests/contract/host/Loaded.h"
 
+#include <filesystem>
 #include <memory>
 
 namespace
@@ -203,6 +204,28 @@ TEST_F(GroupNodeWrites, AreTheFrameworksOwnAndSayNothing)
     host.events.clear();
     node->setProperty(plainProperty, IC::PropertyValue("x", true));
     EXPECT_EQ(host.events, Lines{"setProperty(4711, text x true)"});
+}
+
+class UserCommandWrites : public Loaded
+{
+};
+
+TEST_F(UserCommandWrites, AnswerWhatTheStoreAnswersWhateverBecomesOfTheAction)
+{
+    std::filesystem::current_path("/proc"); // no "usrandpwd" can be made there
+    std::unique_ptr<IC::MutableNode> const user(construct("UserNode"));
+    host.setterStatus = 7;
+    for (unsigned int const id : {117U, 118U, 91U, 138U})
+        EXPECT_EQ(user->setProperty(id, IC::PropertyValue("1", true)).getStatus(), 7) << id;
+    EXPECT_FALSE(commands.ran.empty());
+    commands.ran.clear();
+    bool& flag = object<bool>("_ZN2IC6OSSWMI7MI_callE");
+    flag = true;
+    for (unsigned int const id : {117U, 118U, 91U, 138U})
+        EXPECT_EQ(user->setProperty(id, IC::PropertyValue("1", true)).getStatus(), 7) << id;
+    flag = false;
+    EXPECT_EQ(commands.ran, Lines());
+    std::filesystem::current_path("/");
 }
 
 } // namespace

@@ -77,4 +77,12 @@ TEST(Library, ThrowsNothingOfItsOwn)
     EXPECT_EQ(names.find("__cxa_throw"), std::string::npos);
 }
 
+TEST(Library, SignalsNobody)
+{
+    std::string const names = wanted();
+    ASSERT_NE(names.find(" popen"), std::string::npos);
+    for (char const* name : {" kill", " tgkill", " raise", " sigqueue"})
+        EXPECT_EQ(names.find(name), std::string::npos) << name;
+}
+
 } // namespace

@@ -1,10 +1,13 @@
 #include "nodes/OsNode.h"
 
 #include "tests/interposed/StandIns.h"
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Frame.h"
 
 #include <gtest/gtest.h>
 
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace
@@ -18,6 +21,28 @@ TEST(OsNodeWrite, MakesOneReaderOfEachKindForItsOwnTimeWhateverTheProperty)
         IC::PropertyValue const value =
             id == 74 ? IC::PropertyValue("dummy", true) : IC::PropertyValue(IC::Number(1U), true);
         EXPECT_EQ(node.setProperty(id, value).getStatus(), 0);
+        EXPECT_EQ(standIns().lives, (std::vector<std::string>{"OsInfo made", "logInfo made",
+                                                              "logInfo gone", "OsInfo gone"}))
+            << id;
+    }
+}
+
+TEST(OsNodeWrite, MakesNoOtherReadersForItsActions)
+{
+    FakeFiles const files;
+    libc::FakeCommands commands;
+    commands.otherwise = "";
+    Frame const frame;
+    IC::OsNode node(9, 7, {7}, 17, 0);
+    std::pair<unsigned int, IC::PropertyValue> const writes[] = {
+        {123, {IC::Number(9U), true}},
+        {123, {IC::Number(12U), true}},
+        {75, {IC::Number(0U), true}},
+        {74, {"LocalGroupAdd,GroupName:CMPI_string:g", true}},
+        {74, {"NoSuchMethod", true}}};
+    for (auto const& [id, value] : writes) {
+        standIns() = {};
+        node.setProperty(id, value);
         EXPECT_EQ(standIns().lives, (std::vector<std::string>{"OsInfo made", "logInfo made",
                                                               "logInfo gone", "OsInfo gone"}))
             << id;

@@ -17,6 +17,7 @@
 #include <fstream>
 #include <grp.h>
 #include <string>
+#include <sys/stat.h>
 #include <unistd.h>
 #include <vector>
 
@@ -397,6 +398,20 @@ TEST_F(Log, StaysAsItIsWhenAnEntryIsWritten)
     EXPECT_EQ(machine::read(path), lines(1));
     EXPECT_EQ(stored(*entries().at(0), NODES::message), "mine");
     EXPECT_EQ(text(*entries().at(0), NODES::message), "*message 1*");
+}
+
+TEST_F(Log, KeepsItsOwnerWhenItIsCleared)
+{
+    machine::write(path, lines(1), 0640);
+    ASSERT_EQ(chown(path, 12345, 23456), 0);
+    plugin.initialize();
+    plugin.node(NODES::operatingSystemType).setProperty(NODES::clearLog, {IC::Number(9U), true});
+    struct stat now {
+    };
+    ASSERT_EQ(stat(path, &now), 0);
+    EXPECT_EQ(now.st_size, 0);
+    EXPECT_EQ(now.st_uid, 12345U);
+    EXPECT_EQ(now.st_gid, 23456U);
 }
 
 } // namespace

@@ -5,9 +5,11 @@
 
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <climits>
 #include <cstdlib>
 #include <string>
+#include <thread>
 #include <vector>
 
 namespace
@@ -186,6 +188,31 @@ TEST(ItoTimeT, LogsAroundTheConversionByName)
         EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.MyProcess");
         EXPECT_EQ(record.file, "MyProcess");
     }
+}
+
+TEST(ToTimeT, AsksNothingOfTheSystemForYearsUpTo1900)
+{
+    useZone("AAA0");
+    setenv("TZ", "BBB0", 1); // which mktime would notice
+    named(1900, "Jan", 1, 0, 0, 0);
+    EXPECT_STREQ(tzname[0], "AAA");
+    named(1901, "Jan", 1, 0, 0, 0);
+    EXPECT_STREQ(tzname[0], "BBB");
+}
+
+TEST(ToTimeT, ConvertsInTwoThreadsAtOnce)
+{
+    useZone(utc);
+    std::atomic<int> wrong{0};
+    auto const convert = [&wrong](char const* month, time_t expected) {
+        for (int i = 0; i < 5000; ++i)
+            wrong += named(2009, month, 1, 0, 0, 0) == expected ? 0 : 1;
+    };
+    std::thread one(convert, "Jan", 1230768000);
+    std::thread other(convert, "Dec", 1259625600);
+    one.join();
+    other.join();
+    EXPECT_EQ(wrong, 0);
 }
 
 } // namespace

@@ -316,4 +316,32 @@ TEST_F(DriverInventory, ListsFourHundredModules)
     EXPECT_EQ(commands.ran.size(), 401U);
 }
 
+TEST_F(DriverInventory, CompletesARecordStepByStep)
+{
+    commands.answers = {{"lsmod", "loop 1 0\n"}, {"modinfo loop", ""}};
+    Recording const recording;
+    list();
+    Texts expected{"getDriverInfo: entry", "buffer = loop 1 0\n"};
+    for (std::string const setter :
+         {"setVersion", "setDescription", "setName", "setBuildNumber", "setManufacturer"}) {
+        expected.push_back(setter + ": entry");
+        expected.push_back(setter + ": exit");
+    }
+    expected.emplace_back("getDriverInfo: exit");
+    EXPECT_EQ(recording.texts(), expected);
+}
+
+TEST_F(DriverInventory, DoesNotLookAtHowItsCommandsEnded)
+{
+    commands.answers = {{"lsmod", "loop 1 0\n"},
+                        {"modinfo loop", "version: 1\ndescription: Disk\n"}};
+    libc::hooks().pclose = [close = libc::hooks().pclose](FILE* stream) {
+        close(stream);
+        return 1 << 8;
+    };
+    driverInfo const driver = only();
+    EXPECT_EQ(driver.getVersion(), "1");
+    EXPECT_EQ(driver.getDescription(), "Disk");
+}
+
 } // namespace

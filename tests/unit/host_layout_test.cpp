@@ -6,7 +6,10 @@
 #include "nodes/OsNode.h"
 #include "nodes/UserNode.h"
 
+#include "sysdata/driverInfo_linux.h"
+#include "sysdata/logInfo_linux.h"
 #include "tests/support/Libc.h"
+#include "util/MyProcess.h"
 
 #include <gtest/gtest.h>
 
@@ -101,5 +104,26 @@ TEST(HostLayout, LeavesTablesAndTypeInformationOfHostClassesToTheHost)
             EXPECT_EQ(symbols.find(std::string(" ") + of + type + "\n"), std::string::npos)
                 << of << type;
 }
+
+template <class Expected, class Actual> constexpr bool is(Actual)
+{
+    return std::is_same_v<Expected, Actual>;
+}
+
+// What symbols do not tell.
+static_assert(is<void (*)(std::vector<NQ::driverInfo>&)>(&NQ::getDriverInfo));
+static_assert(is<unsigned int (NQ::logInfo::*)()>(&NQ::logInfo::getMaxLine));
+static_assert(is<void (NQ::logInfo::*)(unsigned int, char*, int)>(&NQ::logInfo::getLog));
+static_assert(is<bool (NQ::logInfo::*)(std::string&, unsigned int)>(&NQ::logInfo::getData));
+static_assert(is<bool (NQ::logInfo::*)(long&, unsigned int)>(&NQ::logInfo::getCreationTime));
+static_assert(is<bool (NQ::logInfo::*)()>(&NQ::logInfo::clearLog));
+static_assert(is<void (NQ::logInfo::*)(char*, char, char)>(&NQ::logInfo::strreplace));
+static_assert(is<FILE* (NQ::MyProcess::*)(char const*, char const*)>(&NQ::MyProcess::mypopen));
+static_assert(is<char* (*)(char*, char)>(&NQ::strget));
+static_assert(is<time_t (*)(int, char*, int, int, int, int, int, int)>(&NQ::to_time_t));
+static_assert(is<time_t (*)(int, int, int, int, int, int, int, int)>(&NQ::ito_time_t));
+static_assert(is<void (IC::OsSwMI::*)()>(&IC::OsSwMI::createDriverNodes));
+static_assert(is<void (IC::OsSwMI::*)()>(&IC::OsSwMI::createLogNodes));
+static_assert(is<void (IC::OsSwMI::*)(bool)>(&IC::OsSwMI::createLogEntryNodes));
 
 } // namespace

@@ -451,4 +451,83 @@ TEST_F(LogNodes, AreNotDeletedWithoutARefresh)
     EXPECT_EQ(frame.logEntryNodes_.size(), 4U);
 }
 
+struct RefusingFrame : Frame {
+    IC::Error deleteNode(IC::Node* node) override
+    {
+        Frame::deleteNode(node);
+        return {1, IC::Number(IC::Number::EmptyKind), "refused"};
+    }
+};
+
+TEST_F(LogNodes, AreAllReplacedWhateverTheirDeletionAnswers)
+{
+    RefusingFrame other;
+    haveLines(3);
+    other.createLogNodes();
+    other.createLogEntryNodes(false);
+    auto const old = other.logEntryNodes_;
+    Recording const recording;
+    other.createLogEntryNodes(true);
+    EXPECT_EQ(other.deleted, old);
+    EXPECT_EQ(other.logEntryNodes_.size(), 3U);
+    EXPECT_EQ(other.published.size(), 3U);
+    EXPECT_EQ(recording.texts(6000), Texts{});
+}
+
+TEST_F(LogNodes, AreDeletedBeforeTheLogIsCountedAgain)
+{
+    haveLines(2);
+    build();
+    Recording const recording;
+    frame.createLogEntryNodes(true);
+    Texts const said = recording.texts();
+    ASSERT_GE(said.size(), 4U);
+    EXPECT_EQ(Texts(said.begin(), said.begin() + 4),
+              (Texts{"createLogEntryNodes: entry", "LogEntryNode::~LogEntryNode: entry",
+                     "LogEntryNode::~LogEntryNode: entry", "getMaxLine: entry"}));
+}
+
+struct WatchingFrame : Frame {
+    IC::Error addNewNode(IC::Node*& node) override
+    {
+        seen.push_back(node->getDescription() + " " + std::to_string(node->getStatus()) + " " +
+                       std::to_string(node->getProperties().size()));
+        return Frame::addNewNode(node);
+    }
+    Texts seen;
+};
+
+TEST_F(LogNodes, AreCompleteWhenTheyArePublished)
+{
+    WatchingFrame other;
+    haveLines(2);
+    other.createLogNodes();
+    other.createLogEntryNodes(true);
+    EXPECT_EQ(other.seen, Texts(2, "OS LogEntry 1 3"));
+}
+
+/** A node that answers with another id than it was made with. */
+struct Renumbered : IC::MutableNode {
+    using MutableNode::MutableNode;
+    unsigned int getNodeId() const override
+    {
+        return 99;
+    }
+};
+
+TEST_F(LogNodes, AskTheirParentsForTheirIds)
+{
+    haveLines(1);
+    Renumbered os(8, 7, {7}, 17, 0), log(9, 8, {7}, 35, 0);
+    IC::MutableNode* const before = frame.osNode_;
+    frame.osNode_ = &os;
+    frame.createLogNodes();
+    EXPECT_EQ(frame.logNode_->getLinkedId(), 99U);
+    frame.osNode_ = before;
+    frame.logNode_ = &log;
+    frame.createLogEntryNodes(false);
+    ASSERT_EQ(entries().size(), 1U);
+    EXPECT_EQ(entries()[0]->getLinkedId(), 99U);
+}
+
 } // namespace

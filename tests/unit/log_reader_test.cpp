@@ -629,4 +629,65 @@ TEST(LogStrreplace, LogsEntryAndExit)
     EXPECT_EQ(recording.texts(3000), (Texts{"strreplace: entry", "strreplace: exit"}));
 }
 
+TEST_F(LogClearing, SpeaksUnderItsUnitAndCategory)
+{
+    files.write("/var/log/messages", "one\n");
+    Recording const recording;
+    logInfo().clearLog();
+    ASSERT_EQ(recording.records().size(), 4U);
+    for (LogRecord const& record : recording.records()) {
+        EXPECT_EQ(record.function, "clearLog");
+        EXPECT_EQ(record.file, "logInfo_linux");
+        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.LogInfo");
+        EXPECT_EQ(record.level, 3000);
+    }
+}
+
+TEST_F(LogReader, EndsEveryReadOfATimeWithItsExit)
+{
+    auto const expectBothEnds = [this](unsigned int index) {
+        Recording const recording;
+        long time = 0;
+        log.getCreationTime(time, index);
+        Texts const said = recording.texts(3000);
+        EXPECT_EQ(said.front(), "getCreationTime: entry");
+        EXPECT_EQ(said.back(), "getCreationTime: exit");
+    };
+    expectBothEnds(12); // refused
+    expectBothEnds(1);
+    commands.answers["date"] = "2026\n"; // in another form
+    expectBothEnds(1);
+    commands.answers.erase("date"); // not started
+    expectBothEnds(1);
+    commands.answers[sed(10)] = "short\n"; // no stamp
+    expectBothEnds(1);
+}
+
+TEST_F(LogReader, NeitherReadsNorWritesItsString)
+{
+    auto& member = reinterpret_cast<std::string&>(log);
+    EXPECT_EQ(member, "");
+    for (std::string const content : {"", "something else"}) {
+        member = content;
+        EXPECT_EQ(log.getMaxLine(), 10U);
+        EXPECT_EQ(data(1), "*host sshd[1]: session opened*");
+        EXPECT_EQ(timeOf(1), at(2026, 11, 20, 10, 11, 12));
+        char letters[] = "a-b";
+        log.strreplace(letters, '-', ' ');
+        EXPECT_STREQ(letters, "a b");
+        EXPECT_EQ(member, content);
+    }
+}
+
+TEST_F(LogReader, DoesNotLookAtHowItsCommandsEnded)
+{
+    libc::hooks().pclose = [close = libc::hooks().pclose](FILE* stream) {
+        close(stream);
+        return 1 << 8;
+    };
+    EXPECT_EQ(log.getMaxLine(), 10U);
+    EXPECT_EQ(data(1), "*host sshd[1]: session opened*");
+    EXPECT_EQ(timeOf(1), at(2026, 11, 20, 10, 11, 12));
+}
+
 } // namespace

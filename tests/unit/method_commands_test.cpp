@@ -345,4 +345,26 @@ TEST_F(Methods, SayWhenTheyLeaveOnEveryPath)
     }
 }
 
+TEST_F(Shadowing, MakesNoDifferenceToTheHost)
+{
+    EXPECT_TRUE(call("GetShadowing"));
+    files_.write("/etc/shadow", "");
+    EXPECT_TRUE(call("GetShadowing"));
+}
+
+TEST_F(Shadowing, IsLeftAloneByEveryOtherMethod)
+{
+    for (bool const before : {true, false}) {
+        for (char const* method :
+             {"UserAdd", "UserDel", "UserSetAttrib", "LocalGroupAdd", "LocalGroupDel",
+              "LocalGroupAddUser", "LocalGroupDelUser", "UserSetFullName", "UserSetScriptPath",
+              "UserSetHomeDir", "UserSetPassword", "Unknown"}) {
+            shadowing_ = before;
+            NQ::OsInfo().executeMethod(method, {text("UserName", "jdoe")}, shadowing_);
+            EXPECT_EQ(shadowing_, before) << method;
+        }
+        files_.write("/etc/shadow", "");
+    }
+}
+
 } // namespace

@@ -188,4 +188,12 @@ TEST_F(SettingAPassword, NeverTouchesTheCallersOwnAccountForWantOfAUserName)
     EXPECT_EQ(log.texts(6000), Lines{"No user name for the password"});
 }
 
+TEST_F(Judging, OfANewUserTakesTheSameBeginningsAndTheCodeAnywhere)
+{
+    EXPECT_EQ(statusOf("no crontab for jdoe\nrc=9\n", ""), 0);
+    EXPECT_EQ(statusOf("usermod: no changes\nrc=9\n", ""), 0);
+    EXPECT_EQ(statusOf("useradd: src=0\nrc=9\n", ""), 0);
+    EXPECT_EQ(statusOf("rc=0\n", "chage: Aging information changed\n"), 1);
+}
+
 } // namespace

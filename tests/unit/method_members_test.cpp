@@ -250,4 +250,24 @@ TEST_F(GroupMemberChanges, LeaveALogOfWhatTheToolsSaid)
                "OsNode::executeMethod: exit"}));
 }
 
+TEST_F(GroupMemberChanges, AreListedTwiceWhereTheyAreAddedAgain)
+{
+    identity(identityOfJdoe);
+    EXPECT_EQ(add("sudo"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"sudo\""));
+    identity(identityOfJdoe);
+    EXPECT_EQ(remove("staff"), 0); // not a member
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\""));
+}
+
+TEST_F(GroupMemberChanges, AreMadeWhateverTypesOtherParametersHave)
+{
+    identity(identityOfJdoe);
+    EXPECT_EQ(execute("LocalGroupAddUser", {text("LocalGroupName", "staff"),
+                                            {"Colour", "CMPI_boolean", "red"},
+                                            text("DomainAndMember", "jdoe")}),
+              0);
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\""));
+}
+
 } // namespace

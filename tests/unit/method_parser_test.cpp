@@ -305,4 +305,52 @@ TEST(MethodParser, KeepsOnlyTheParameterNamedExactlyPasswordFromTheLog)
                       "paramInfo.type=CMPI_uint32", "paramInfo.value=3"}));
 }
 
+TEST(MethodParser, RejectsAnUnknownTypeAlsoWithoutAValueAndKnowsTypesExactly)
+{
+    for (char const* type :
+         {"CMPI_boolean", "CMPI_String", "CMPI_string8", "CMPI_datetime", "string"}) {
+        Recording const log;
+        Parsed const parsed(std::string("UserAdd,UserName:CMPI_string:jdoe,Active:") + type);
+        EXPECT_EQ(parsed.status, 1) << type;
+        EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"}) << type;
+        EXPECT_EQ(log.texts(6000), Texts{std::string("Unknown parameter type: ") + type});
+    }
+}
+
+TEST(MethodParser, ReadsDatesAsTheTwoScanningFormsDo)
+{
+    std::string const head = "passwordExpirationDate|CMPI_dateTime|";
+    EXPECT_EQ(dateOf("2010 1 2 3.4+5"), head + "2010-1-2");
+    EXPECT_EQ(dateOf("20101231000000.0-0"), head + "2010-12-31");
+    EXPECT_EQ(dateOf("20101231000000.000000+0609Z"), head + "2010-12-31");
+    EXPECT_EQ(dateOf("20101399999999.999999+999"), head + "2010-13-99");
+    EXPECT_EQ(dateOf("2010-1-2 3.4-5"), head + "2010--1--2");
+    EXPECT_EQ(Parsed("X,D:CMPI_dateTime:20101231000000.000000 +060").status, 1);
+}
+
+TEST(MethodParser, KnowsNoQuotesAndNoEscapes)
+{
+    EXPECT_EQ(Parsed("UserAdd,Comment:CMPI_string:\"a:b\"").params,
+              Texts{"Comment|CMPI_string|\"a"});
+    EXPECT_EQ(Parsed("UserAdd,Comment:CMPI_string:a\\,Colour:CMPI_string:b").params,
+              (Texts{"Comment|CMPI_string|a\\", "Colour|CMPI_string|b"}));
+    EXPECT_EQ(Parsed("UserAdd,Comment:CMPI_string:\"a,Colour:CMPI_string:b\"").params,
+              (Texts{"Comment|CMPI_string|\"a", "Colour|CMPI_string|b\""}));
+}
+
+TEST(MethodParser, SaysThatANumberIsBlank)
+{
+    EXPECT_EQ(said("UserSetAttrib,daysExpireAfter:CMPI_uint32:"),
+              inside({"method=UserSetAttrib", "paramInfo.name=daysExpireAfter",
+                      "paramInfo.type=CMPI_uint32", "This parameter is blank ---exiting "}));
+}
+
+TEST(MethodParser, SpeaksAtLevel3000AsLongAsItRejectsNothing)
+{
+    Recording const log;
+    Parsed const parsed("UserAdd,UserName:CMPI_string:jdoe,D:CMPI_dateTime:"
+                        "20101231000000.000000+000,Comment:CMPI_string:");
+    EXPECT_EQ(log.texts(3000), log.texts());
+}
+
 } // namespace

@@ -227,4 +227,10 @@ TEST_F(PasswordEncryption, TakesArgumentsOf254CharactersAndNoLongerOnes)
     }
 }
 
+TEST_F(PasswordEncryption, EndsTheLineAtAnEmptyPassword)
+{
+    set("", "jdoe");
+    EXPECT_EQ(commands_.ran, Lines{"echo 2>&1"});
+}
+
 } // namespace

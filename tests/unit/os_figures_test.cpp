@@ -8,6 +8,7 @@
 #include <ostream>
 #include <string>
 #include <sys/sysinfo.h>
+#include <utility>
 #include <vector>
 
 namespace
@@ -251,6 +252,84 @@ TEST(OsInfoLastBootTime, FailsAndLeavesTheCallersValueWhenTheKernelDoesNotAnswer
     EXPECT_FALSE(OsInfo().getLastBootTime(out));
     EXPECT_EQ(out, static_cast<long>(untouched));
     EXPECT_TRUE(log.remarks().empty());
+}
+
+TEST_P(OsInfoRam, IsShiftedBeforeItIsCutTo32Bits)
+{
+    unsigned long const most = ~0UL;
+    EXPECT_EQ(of(most, 1), static_cast<unsigned int>(most >> 10));
+    if (sizeof(unsigned long) > 4) {
+        EXPECT_EQ(of(static_cast<unsigned long>(17179869184ULL), 1), 16777216U); // 16 GiB
+    }
+}
+
+TEST_P(OsInfoRam, GoesToBothLogsBeforeItIsZero)
+{
+    using Operation = mihost::LogMessage::Operation;
+    kernel_.fails = true;
+    struct : mihost::LogSink {
+        void write(mihost::LogMessage const& message) override
+        {
+            if (message.text == failure && message.level == 3000)
+                seen.emplace_back(message.operation, out);
+        }
+        std::string failure;
+        unsigned int out = untouched;
+        std::vector<std::pair<Operation, unsigned int>> seen;
+    } sink;
+    sink.failure = GetParam().failure;
+    mihost::setLogSink(&sink);
+    EXPECT_TRUE((OsInfo().*GetParam().get)(sink.out));
+    mihost::setLogSink(nullptr);
+    EXPECT_EQ(sink.out, 0U);
+    ASSERT_EQ(sink.seen.size(), 2U);
+    EXPECT_TRUE(sink.seen[0] == std::pair(Operation::Log, untouched));
+    EXPECT_TRUE(sink.seen[1] == std::pair(Operation::Trace, untouched));
+}
+
+TEST(OsInfoLastBootTime, AsksTheKernelAndTheClockAgainEachTime)
+{
+    Kernel kernel;
+    time_t now = 1273659825;
+    libc::hooks().time = [&now] { return now; };
+    kernel.figures.uptime = 1000;
+    long out = 0;
+    EXPECT_TRUE(OsInfo().getLastBootTime(out));
+    EXPECT_EQ(kernel.calls, 1);
+    now = 1273660000;
+    kernel.figures.uptime = 5;
+    EXPECT_TRUE(OsInfo().getLastBootTime(out));
+    EXPECT_EQ(out, 1273659995);
+    EXPECT_EQ(kernel.calls, 2);
+}
+
+TEST(OsInfoFixedValues, ConsultNeitherFilesNorCommandsNorTheClock)
+{
+    Kernel const kernel; // whose guard takes the hooks away
+    int asked = 0;
+    auto const open = [&asked](char const*, char const*) -> FILE* {
+        ++asked;
+        return nullptr;
+    };
+    libc::hooks().popen = open;
+    libc::hooks().fopen = open;
+    libc::hooks().uname = [&asked](struct utsname*) {
+        ++asked;
+        return -1;
+    };
+    libc::hooks().time = [&asked] {
+        ++asked;
+        return time_t{0};
+    };
+    for (NumberGetter const get :
+         {&OsInfo::getProcessMaxNumber, &OsInfo::getProcessMaxMemory, &OsInfo::getLicensedUserCount,
+          &OsInfo::getVirtualMemorySize, &OsInfo::getVirtualMemoryFree})
+        read(get);
+    bool distributed = true;
+    OsInfo().getDistributed(distributed);
+    std::string text;
+    OsInfo().getOSCreateUser(text);
+    EXPECT_EQ(asked, 0);
 }
 
 } // namespace

@@ -191,4 +191,30 @@ TEST_F(InstallDate, HoldsTheReleaseFileOpenUntilTheCommandRuns)
     EXPECT_EQ(fcntl(probe, F_GETFD), -1);
 }
 
+TEST_F(InstallDate, ReadsLeadingZerosAsDecimal)
+{
+    EXPECT_EQ(dateOf("Change: 2010-08-09 08:09:08.000000000 +0200\n"), 1281341348);
+}
+
+TEST_F(InstallDate, ClosesTheReleaseFileBeforeItReadsTheOutput)
+{
+    files_.write("/etc/redhat-release", "a line\n");
+    commands_.answers[redhatCommand] = "Change: 2010-05-12 10:23:45\n";
+    int probe = -1;
+    libc::hooks().fopen = [&probe, below = libc::hooks().fopen](char const* path,
+                                                                char const* mode) {
+        FILE* const stream = below(path, mode);
+        if (stream)
+            probe = fileno(stream);
+        return stream;
+    };
+    bool openAtRead = true;
+    libc::hooks().fgets = [&](char* buffer, int size, FILE* stream) {
+        openAtRead = fcntl(probe, F_GETFD) != -1;
+        return libc::realFgets(buffer, size, stream);
+    };
+    EXPECT_EQ(date(), may2010);
+    EXPECT_FALSE(openAtRead);
+}
+
 } // namespace

@@ -104,6 +104,9 @@ TEST(CodeSet, IsUtf8ForPosix)
 {
     EXPECT_EQ(codeSet("POSIX"), "UTF-8");
     EXPECT_EQ(codeSet(" POSIX  "), "UTF-8");
+    EXPECT_EQ(codeSet("posix"), "posix");
+    EXPECT_EQ(codeSet("POSIX@x"), "POSIX@x");
+    EXPECT_EQ(codeSet("POSIX.ISO-8859-1"), "ISO-8859-1");
 }
 
 TEST(CodeSet, IsTheWholeLocaleWhenItHasNoDot)

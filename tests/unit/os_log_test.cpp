@@ -1,11 +1,13 @@
 #include "sysdata/osInfo_linux.h"
 
 #include "tests/support/FakeFiles.h"
+#include "tests/support/MutexCalls.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
 #include <functional>
+#include <map>
 #include <ostream>
 #include <string>
 #include <type_traits>
@@ -134,6 +136,37 @@ TEST(OsInfo, HoldsNothingAndIsSilentWhenItComesAndGoes)
         OsInfo const info;
     }
     EXPECT_TRUE(log.records().empty());
+}
+
+TEST_P(OsInfoLog, SaysNothingOfAFailureButThatMemoryIsUnknown)
+{
+    libc::hooks().sysinfo = [](struct sysinfo*) { return -1; };
+    std::map<std::string, std::string> const remarks = {
+        {"getPhysicalMemorySize", "physicalMemorySize failed"},
+        {"getPhysicalMemoryFree", "physicalMemoryFree failed"},
+        {"statusOffline", "Halt after shutdown."},
+        {"statusReset", "Reboot after shutdown."}};
+    std::vector<std::string> expected;
+    if (auto const found = remarks.find(GetParam().function); found != remarks.end())
+        expected.push_back(found->second);
+    Recording const log;
+    GetParam().call();
+    EXPECT_EQ(log.remarks(), expected);
+}
+
+TEST_P(OsInfoLog, TakesNoLockButThatOfTheAccountsForTheUserCount)
+{
+    int mutexes = 0;
+    int accounts = 0;
+    MutexCalls calls;
+    calls.onLock = [&mutexes](NQ::Mutex const&, unsigned long) { ++mutexes; };
+    libc::hooks().lckpwdf = [&accounts] {
+        ++accounts;
+        return 0;
+    };
+    GetParam().call();
+    EXPECT_EQ(mutexes, 0);
+    EXPECT_EQ(accounts, std::string(GetParam().function) == "getUserCount" ? 1 : 0);
 }
 
 } // namespace

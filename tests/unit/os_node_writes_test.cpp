@@ -363,4 +363,22 @@ TEST_F(OsNodeWrites, SayWhenTheyEndOnEveryPath)
     }
 }
 
+TEST_F(OsNodeWrites, TakeTheTextFormOfAnyValueForAMethod)
+{
+    Recording const log;
+    EXPECT_EQ(write(74, 5).getStatus(), 1);
+    EXPECT_TRUE(log.has("CreateUser: inMethodAndParams = 5", 3000));
+    EXPECT_TRUE(log.has("Unknown method: 5", 6000));
+}
+
+TEST_F(OsNodeWrites, OfNineInAnyFormToTheClearCommandClearTheLog)
+{
+    for (PropertyValue const& nine :
+         {PropertyValue("9", true), PropertyValue(IC::EnumValue(9U), true)}) {
+        files_.write("/var/log/messages", oldLog);
+        EXPECT_EQ(write(191, nine).getStatus(), 0);
+        EXPECT_TRUE(logWasCleared());
+    }
+}
+
 } // namespace

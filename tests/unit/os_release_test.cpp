@@ -3,13 +3,16 @@
 #include "sysdata/osInfo_linux.h"
 
 #include "tests/support/FakeFiles.h"
+#include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <cstring>
 #include <fcntl.h>
 #include <string>
 #include <sys/utsname.h>
+#include <thread>
 #include <unistd.h>
 #include <vector>
 
@@ -415,6 +418,37 @@ TEST_F(OSVersionCommand, JoinsTheNinthAndTheTwelfthWordOfASuseFile)
     files_.write("/etc/SuSE-release",
                  "SUSE Linux Enterprise Server 10 (x86_64)\nVERSION = 10\nPATCHLEVEL = 2\n");
     EXPECT_EQ(version(), "10.2");
+}
+
+TEST_F(OSVersion, FailsWithoutAMessage)
+{
+    Recording const log;
+    writeCommandFiles();
+    EXPECT_EQ(version(), "none"); // the command cannot be started
+    files_.write("/etc/UnitedLinux-release", "x\n");
+    unameFails_ = true;
+    EXPECT_EQ(version(), "none");
+    EXPECT_TRUE(log.remarks().empty());
+}
+
+TEST_F(OSName, AndVersionAreToldToSeveralThreadsAtOnce)
+{
+    files_.write("/etc/release", "Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2\n");
+    std::atomic<int> wrong{0};
+    std::vector<std::thread> threads;
+    for (int thread = 0; thread < 4; ++thread)
+        threads.emplace_back([&wrong] {
+            for (int round = 0; round < 50; ++round) {
+                std::string name;
+                std::string number;
+                OsInfo().getOSName(name);
+                OsInfo().getOSVersion(number);
+                wrong += name == "Kesto Linux" && number == "10.2" ? 0 : 1;
+            }
+        });
+    for (std::thread& thread : threads)
+        thread.join();
+    EXPECT_EQ(wrong, 0);
 }
 
 } // namespace

@@ -10,7 +10,9 @@
 #include <dlfcn.h>
 #include <memory>
 #include <new>
+#include <set>
 #include <sys/sysinfo.h>
+#include <utility>
 
 namespace
 {
@@ -250,8 +252,12 @@ TEST_F(Lifecycle, TheTreeStandsWhateverTheSettersAnswer)
         figures->uptime = 1000;
         return 0;
     };
-    commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
+    commands.answers = {{"lsmod", "exnet 24576 0\nexfs 1 0\n"},
+                        {"modinfo exnet", ""},
+                        {"modinfo exfs", ""},
+                        {"wc -l /var/log/messages", "3 /var/log/messages\n"}};
     plugin.initialize();
+    ASSERT_EQ(plugin.nodes(NODES::driverType).size(), 2U);
     Ids const whole = nodeTypes();
     Lines const said = host.messages();
     plugin.unload();
@@ -567,6 +573,68 @@ TEST_F(Lifecycle, ARebuildHoldsTheLockFromItsBeginningToItsEnd)
         EXPECT_EQ(all.back(), "log: " + made.name + ": exit");
         EXPECT_EQ(std::count(all.begin(), all.end(), "unlock()"), made.unlocks);
     }
+}
+
+TEST_F(Lifecycle, HasTheCategoryOfEveryUnitBeforeAnythingIsAskedOfIt)
+{
+    std::pair<char const*, char const*> const units[] = {
+        {"_ZN2IC6OSSWMI12loggerOsSwMIB5cxx11E", ""},
+        {"_ZN2NQ15loggerMyProcessB5cxx11E", ".MyProcess"},
+        {"_ZN2NQ12loggerOsInfoB5cxx11E", ".OsInfo"},
+        {"_ZN2NQ9USER_INFO14loggerUserInfoB5cxx11E", ".UserInfo"},
+        {"_ZN2NQ15loggerGroupInfoB5cxx11E", ".GroupInfo"},
+        {"_ZN2NQ16loggerDriverInfoB5cxx11E", ".DriverInfo"},
+        {"_ZN2NQ13loggerLogInfoB5cxx11E", ".LogInfo"}};
+    for (auto const& [symbol, end] : units)
+        EXPECT_EQ(object<std::string>(symbol), std::string("Veltrix.IC.MI.OsSwMI") + end);
+}
+
+TEST_F(Lifecycle, LeavesTheDriversAloneWhenOtherNodesAreMadeAnew)
+{
+    commands.answers = {{"lsmod", "exnet 24576 0\n"},
+                        {"modinfo exnet", ""},
+                        {"wc -l /var/log/messages", "1 /var/log/messages\n"}};
+    plugin.initialize();
+    auto const drivers = plugin.nodes(NODES::driverType);
+    ASSERT_EQ(drivers.size(), 1U);
+    unsigned int const id = drivers[0]->getNodeId();
+    commands.ran.clear();
+    host.events.clear();
+    plugin.node(NODES::operatingSystemType).setProperty(75, {IC::Number(0U), true});
+    rebuild("_ZN2IC6OsSwMI19createLogEntryNodesEb");
+    EXPECT_EQ(plugin.nodes(NODES::driverType), drivers);
+    EXPECT_EQ(drivers[0]->getNodeId(), id);
+    for (std::string const& event : host.events) // an address may be used again
+        EXPECT_EQ(event.find(", 44, "), std::string::npos) << event;
+    for (std::string const& command : commands.ran)
+        EXPECT_NE(command, "lsmod");
+}
+
+TEST_F(Publishing, OfLogEntriesTakesNoLock)
+{
+    commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
+    rebuild("_ZN2IC6OsSwMI19createLogEntryNodesEb");
+    EXPECT_EQ(plugin.nodes(NODES::logEntryType).size(), 3U);
+    for (std::string const& event : host.events)
+        EXPECT_EQ(event.find("lock("), std::string::npos) << event;
+}
+
+TEST_F(Lifecycle, OpensNoFileButThoseOfTheSystemThatItIsToRead)
+{
+    std::set<std::string> opened;
+    libc::hooks().fopen = [&opened, below = libc::hooks().fopen](char const* path,
+                                                                 char const* mode) {
+        opened.insert(path);
+        return below(path, mode);
+    };
+    plugin.initialize();
+    std::set<std::string> const known = {
+        "/etc/login.defs",     "/etc/passwd",       "/etc/shadow",
+        "/etc/pam.d/login",    "/etc/release",      "/etc/vmware-release",
+        "/etc/redhat-release", "/etc/SuSE-release", "/etc/UnitedLinux-release"};
+    EXPECT_FALSE(opened.empty());
+    for (std::string const& path : opened)
+        EXPECT_EQ(known.count(path), 1U) << path;
 }
 
 } // namespace

@@ -228,4 +228,43 @@ TEST_F(UserCommandWrites, AnswerWhatTheStoreAnswersWhateverBecomesOfTheAction)
     std::filesystem::current_path("/");
 }
 
+class LogEntryReads : public Loaded
+{
+};
+
+TEST_F(LogEntryReads, ThatSucceedMakeOneEmptySuccessAndTakeNoLock)
+{
+    commands.answers = {{"wc -l /var/log/messages", "16 f\n"},
+                        {"sed -n '1p' /var/log/messages", "Nov 20 10:11:12 host\n"},
+                        {"date", "Sat Nov 21 03:15:30 UTC 2026\n"}};
+    std::unique_ptr<IC::MutableNode> const node(construct("LogEntryNode")); // its index is 16
+    for (unsigned int const id : {81U, 79U}) {
+        host.errors.clear();
+        host.events.clear();
+        IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
+        EXPECT_EQ(node->getProperty(id, value).getStatus(), 0);
+        EXPECT_EQ(host.errors, Lines{success});
+        for (std::string const& event : host.events)
+            EXPECT_EQ(event.find("lock("), std::string::npos) << event;
+    }
+}
+
+TEST_F(CommandWrites, AnswerWhatTheStoreAnswersWhateverBecameOfTheRebuild)
+{
+    commands.otherwise = "";
+    plugin.initialize();
+    host.addNewNodeStatus = 1;
+    host.logCalls.clear();
+    for (unsigned char const status :
+         {static_cast<unsigned char>(0), static_cast<unsigned char>(7)}) {
+        host.setterStatus = status;
+        EXPECT_EQ(os->setProperty(75, IC::PropertyValue(IC::Number(0U), true)).getStatus(), status);
+        EXPECT_EQ(
+            os->setProperty(74, IC::PropertyValue("LocalGroupAdd,GroupName:CMPI_string:g", true))
+                .getStatus(),
+            status);
+    }
+    EXPECT_FALSE(host.messages(6000).empty()); // the refusals
+}
+
 } // namespace

@@ -1,0 +1,112 @@
+// What the building of log entries asks of them and of the log's reader.
+
+#include "nodes/LogEntryNode.h"
+#include "sysdata/logInfo_linux.h"
+#include "tests/interposed/StandIns.h"
+#include "tests/support/Frame.h"
+#include "tests/support/Libc.h"
+#include "tests/support/Next.h"
+#include "tests/support/Shown.h"
+#include "tests/support/TimeZone.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace
+{
+
+using Texts = std::vector<std::string>;
+
+struct Asked {
+    Texts reads;
+    std::vector<void const*> values;
+    Texts fetches;
+};
+
+Asked& asked()
+{
+    static Asked inUse;
+    return inUse;
+}
+
+} // namespace
+
+IC::Error IC::LogEntryNode::getProperty(unsigned int id, PropertyValue& value) const
+{
+    static auto* const real = next<Error(LogEntryNode const*, unsigned int, PropertyValue&)>(
+        "_ZNK2IC12LogEntryNode11getPropertyEjRNS_13PropertyValueE");
+    asked().reads.push_back(std::to_string(id) + " " + shown(value));
+    asked().values.push_back(&value);
+    return real(this, id, value);
+}
+
+void NQ::logInfo::getLog(unsigned int line, char* buffer, int length)
+{
+    static auto* const real =
+        next<void(logInfo*, unsigned int, char*, int)>("_ZN2NQ7logInfo6getLogEjPci");
+    asked().fetches.push_back(std::to_string(line) + " " + std::to_string(length));
+    real(this, line, buffer, length);
+}
+
+namespace
+{
+
+class LogEntryBuild : public testing::Test
+{
+protected:
+    LogEntryBuild()
+    {
+        useZone("UTC0");
+        commands.answers = {{"wc -l /var/log/messages", "1 f\n"},
+                            {"sed -n '1p' /var/log/messages", "Nov 20 10:11:12 host\n"},
+                            {"date", "Sat Nov 21 03:15:30 UTC 2026\n"}};
+        frame.createLogNodes();
+        standIns() = {};
+        asked() = {};
+        frame.createLogEntryNodes(false);
+    }
+
+    static Texts readers(int count)
+    {
+        Texts lives;
+        for (int i = 0; i < count; ++i)
+            lives.insert(lives.end(), {"logInfo made", "logInfo gone"});
+        return lives;
+    }
+
+    libc::FakeCommands commands;
+    Frame frame;
+};
+
+TEST_F(LogEntryBuild, ReadsMessageAndTimeIntoOneValueThatStartsEmpty)
+{
+    EXPECT_EQ(asked().reads, (Texts{"81 empty  true", "79 text *host* true"}));
+    ASSERT_EQ(asked().values.size(), 2U);
+    EXPECT_EQ(asked().values[0], asked().values[1]);
+}
+
+TEST_F(LogEntryBuild, FetchesAtMost511Characters)
+{
+    EXPECT_EQ(asked().fetches, (Texts{"1 511", "1 511"}));
+}
+
+TEST_F(LogEntryBuild, GivesNothingBesideTheSecondsOfItsTime)
+{
+    EXPECT_EQ(standIns().dates, (std::vector<std::pair<long, unsigned short>>{{1795169472, 0}}));
+}
+
+TEST_F(LogEntryBuild, TakesAFreshReaderForTheCountAndForEachRead)
+{
+    EXPECT_EQ(standIns().lives, readers(3));
+    for (unsigned int const id : {81U, 89U, 79U, 4711U}) {
+        standIns().lives.clear();
+        IC::PropertyValue value("", true);
+        frame.logEntryNodes_.at(0)->getProperty(id, value);
+        EXPECT_EQ(standIns().lives, readers(1)) << id;
+    }
+}
+
+} // namespace

@@ -9,18 +9,18 @@ namespace IC
 void OsSwMI::createOsSwNodes()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
+    osSwNode_ = adopt(std::make_unique<MutableNode>(miId_, 0, miIds_, NODES::osSwType, 0));
     nodeIds_->push_back(miId_);
-    osSwNode_ = adopt(std::make_unique<MutableNode>(miId_, 0, miIds_, NODES::osSwType, 0),
-                      "OsSw Management Interface");
+    setUp("OsSw Management Interface");
 }
 
 void OsSwMI::createRootNode()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
+    rootNode_ = adopt(std::make_unique<MutableNode>(nodeId, miId_, miIds_, NODES::rootType, 0));
     nodeIds_->push_back(miId_); // kept: the interface's own id stands in the list twice
-    rootNode_ = adopt(std::make_unique<MutableNode>(nodeId, miId_, miIds_, NODES::rootType, 0),
-                      "ROOT Node");
+    setUp("ROOT Node");
 }
 
 void OsSwMI::createComputerNodes()
@@ -28,8 +28,8 @@ void OsSwMI::createComputerNodes()
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     computerNode_ = adopt(std::make_unique<MutableNode>(nodeId, rootNode_->getNodeId(), miIds_,
-                                                        NODES::computerType, 0),
-                          "Computer");
+                                                        NODES::computerType, 0));
+    setUp("Computer");
     std::string name;
     if (NQ::ComputerInfo::getComputerName(name))
         computerNode_->setProperty(NODES::name, NODES::text(name));

@@ -55,17 +55,20 @@ unsigned int OsSwMI::takeNodeId(bool note)
     return nextNodeId_++;
 }
 
-MutableNode* OsSwMI::adopt(std::unique_ptr<MutableNode> node, std::string const& description,
-                           std::vector<Node*>* kin)
+MutableNode* OsSwMI::adopt(std::unique_ptr<MutableNode> node, std::vector<Node*>* kin)
 {
     nodes_.push_back(nullptr); // may fail for want of memory, while the node is still ours
     currentNode_ = node.release();
     nodes_.back() = currentNode_;
     if (kin)
         kin->push_back(currentNode_);
+    return currentNode_;
+}
+
+void OsSwMI::setUp(std::string const& description)
+{
     currentNode_->setStatus(NODES::statusOk);
     currentNode_->setDescription(description);
-    return currentNode_;
 }
 
 void OsSwMI::dropNodes(std::vector<Node*>& nodes, bool refresh, char const* announcement,

@@ -75,8 +75,10 @@ private:
      * @return the node, the framework's from here on
      */
     MI_INTERNAL MutableNode* adopt(std::unique_ptr<MutableNode> node,
-                                   std::string const& description,
                                    std::vector<Node*>* kin = nullptr);
+
+    /** Gives the current node its status and its description. */
+    MI_INTERNAL void setUp(std::string const& description);
 
     /**
      * Empties a list of user or group nodes; on a refresh each node is announced in the log and

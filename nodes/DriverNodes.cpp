@@ -14,10 +14,9 @@ void OsSwMI::createDriverNodes()
     unsigned int index = 0;
     for (NQ::driverInfo const& driver : drivers) {
         unsigned int const nodeId = takeNodeId();
-        MutableNode* const node =
-            adopt(std::make_unique<MutableNode>(nodeId, osNode_->getNodeId(), miIds_,
-                                                NODES::driverType, ++index),
-                  driver.getDescription());
+        MutableNode* const node = adopt(std::make_unique<MutableNode>(
+            nodeId, osNode_->getNodeId(), miIds_, NODES::driverType, ++index));
+        setUp(driver.getDescription());
         NODES::setProperties(*node, {{NODES::version, NODES::text(driver.getVersion())},
                                      {NODES::name, NODES::text(driver.getName())},
                                      {NODES::buildNumber, NODES::text(driver.getBuildNumber())},

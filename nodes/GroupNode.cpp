@@ -50,7 +50,8 @@ void OsSwMI::createGroupNodes(bool refresh)
         MutableNode* const node =
             adopt(std::make_unique<GroupNode>(nodeId, osNode_->getNodeId(), miIds_,
                                               NODES::groupType, ++position),
-                  "Group", &groupNodes_);
+                  &groupNodes_);
+        setUp("Group");
         std::string const name = group.getGroupName();
         unsigned int const id = group.getGroupId();
         NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("Name = ", name));

@@ -78,7 +78,8 @@ void OsSwMI::createLogEntryNodes(bool refresh)
         MutableNode* const node =
             adopt(std::make_unique<LogEntryNode>(nodeId, logNode_->getNodeId(), miIds_,
                                                  NODES::logEntryType, index),
-                  "OS LogEntry", &logEntryNodes_);
+                  &logEntryNodes_);
+        setUp("OS LogEntry");
         node->setProperty(NODES::id, NODES::number(index));
         PropertyValue value = NODES::emptyValue();
         for (unsigned int const id : {NODES::message, NODES::creationTime})

@@ -10,8 +10,8 @@ void OsSwMI::createLogNodes()
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     logNode_ = adopt(
-        std::make_unique<MutableNode>(nodeId, osNode_->getNodeId(), miIds_, NODES::logType, 0),
-        "OS Log");
+        std::make_unique<MutableNode>(nodeId, osNode_->getNodeId(), miIds_, NODES::logType, 0));
+    setUp("OS Log");
     NODES::setProperties(*logNode_, {{NODES::requestedState, NODES::enumeration(1)},
                                      {NODES::fixedNumbers, NODES::fixedNumberList()},
                                      {NODES::logNumber, NODES::number(0)},

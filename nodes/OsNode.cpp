@@ -122,8 +122,8 @@ void OsSwMI::createOsNodes()
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     osNode_ = adopt(std::make_unique<OsNode>(nodeId, computerNode_->getNodeId(), miIds_,
-                                             NODES::operatingSystemType, 0),
-                    "Operating System");
+                                             NODES::operatingSystemType, 0));
+    setUp("Operating System");
     NODES::setProperties(
         *osNode_, {{NODES::fixedEnumeration, {EnumValue(static_cast<unsigned short>(35)), true}},
                    {NODES::requestedState, {EnumValue(1U), false}}, // the only false flag
@@ -132,7 +132,7 @@ void OsSwMI::createOsNodes()
     OsInfo info;
     store(info, namingFacts, *osNode_);
     NODES::setProperties(
-        *osNode_, {{NODES::createUser, NODES::text("dummy")}, {NODES::refresh, NODES::number(1)}});
+        *osNode_, {{NODES::createUser, {"dummy", true}}, {NODES::refresh, NODES::number(1)}});
     bool distributed = false;
     if (info.getDistributed(distributed))
         osNode_->setProperty(NODES::distributed, NODES::truth(distributed));

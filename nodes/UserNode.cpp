@@ -71,7 +71,7 @@ void setUserProperties(MutableNode& node, userInfo& user, std::size_t userCount)
          {NODES::inactiveTime, inactiveTime},
          {NODES::passwordHistoryDepth,
           number(static_cast<unsigned long>(user.getPasswordHistoryDepth()))},
-         {NODES::reservedText, NODES::text("")},
+         {NODES::reservedText, {"", true}},
          {NODES::passwordExpiration, inactiveTime}, // kept: a write gives it its meaning
          {NODES::lastPwdChange, date(user.getLstPwdChg())},
          {NODES::maxLoginFailures, number(static_cast<unsigned long>(user.getMaxLoginFailures()))},
@@ -175,7 +175,8 @@ void OsSwMI::createUserNodes(bool refresh)
                                                NODES::userType, ++position);
         {
             BuilderWrites const ours;
-            adopt(std::move(node), "User Account", &userNodes_);
+            adopt(std::move(node), &userNodes_);
+            setUp("User Account");
             setUserProperties(*currentNode_, user, users.size());
         }
         if (refresh)

@@ -1,6 +1,7 @@
 #include "tests/interposed/StandIns.h"
 
 #include "host/Number.h"
+#include "host/PropertyValue.h"
 #include "nodes/OsNode.h"
 #include "sysdata/logInfo_linux.h"
 #include "sysdata/minMaxId.h"
@@ -57,6 +58,12 @@ IC::Number::Number(long seconds, unsigned short subSeconds)
     : kind_(DateKind), subSeconds_(subSeconds), value_(seconds)
 {
     standIns().dates.emplace_back(seconds, subSeconds);
+}
+
+IC::PropertyValue::PropertyValue(char const* text, bool const& flag)
+    : kind_(TextKind), flag_(flag), content_(std::string(text))
+{
+    standIns().literals.emplace_back(text);
 }
 
 namespace NQ

@@ -8,8 +8,8 @@
 #include <vector>
 
 /**
- * Stands in for the facts of the operating system, the id ranges, points in time and the store of
- * its node, all of which this program replaces.
+ * Stands in for the facts of the operating system, the id ranges, points in time, values made of
+ * literals and the store of its node, all of which this program replaces.
  *
  * The fact getters answer with what is given here and consult nothing.
  */
@@ -26,6 +26,9 @@ struct StandIns {
 
     /** The points in time that were made, in order: seconds and what was given beside them. */
     std::vector<std::pair<long, unsigned short>> dates;
+
+    /** The texts of values that were made of literals, in order. */
+    std::vector<std::string> literals;
 
     /** The fact and log readers that came and went, in order, such as "OsInfo made". */
     std::vector<std::string> lives;

@@ -424,4 +424,11 @@ TEST_F(OsNodeRead, LogsItsEntryAndExitUnderTheClassName)
     }
 }
 
+TEST_F(OsNodeBuild, MakesItsOneLiteralTextOfTheLiteral)
+{
+    standIns().literals.clear();
+    build();
+    EXPECT_EQ(standIns().literals, std::vector<std::string>{"dummy"});
+}
+
 } // namespace

@@ -4,6 +4,7 @@
 #include "sysdata/minMaxId.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
+#include "tests/support/Lines.h"
 #include "tests/support/MutexCalls.h"
 #include "tests/support/Recording.h"
 
@@ -362,6 +363,24 @@ TEST_F(GroupNodes, LeaveTheMarkOfTheUserBuilderAsItStands)
     frame.createGroupNodes(false);
     EXPECT_TRUE(IC::OSSWMI::MI_call);
     IC::OSSWMI::MI_call = false;
+}
+
+TEST_F(GroupNodes, SpeakFromTheLineOnWhichEachMessageStands)
+{
+    Texts const source = linesOf(contentOf(TESTS_DIR "/../nodes/GroupNode.cpp"));
+    Recording const log;
+    frame.createGroupNodes(false);
+    int found = 0;
+    for (LogRecord const& record : log.records())
+        for (std::string const text : {"groups.size() = ", "Name = ", "Id = "})
+            if (record.category == "Veltrix.IC.MI.OsSwMI" && record.text.rfind(text, 0) == 0) {
+                ++found;
+                EXPECT_NE(
+                    source.at(static_cast<std::size_t>(record.line - 1)).find('"' + text + '"'),
+                    std::string::npos)
+                    << record.text << " from line " << record.line;
+            }
+    EXPECT_EQ(found, 2 * (1 + 2 + 2)); // both operations; two groups
 }
 
 } // namespace

@@ -331,7 +331,9 @@ TEST_F(OsNodeWrites, AreStoredOnceTheyHaveBeenActedOn)
 
 TEST_F(OsNodeWrites, OfAnyOtherPropertyAreStoredOnly)
 {
-    for (unsigned int const id : {0U, 9U, 73U, 76U, 108U, 138U, 144U, 190U, 192U, 4711U}) {
+    for (unsigned int const id :
+         {0U,   9U,   73U,  76U,  108U, 125U, 128U, 134U, 138U, 139U, 140U, 141U, 142U, 143U, 144U,
+          145U, 146U, 147U, 148U, 149U, 150U, 151U, 152U, 153U, 154U, 155U, 190U, 192U, 4711U}) {
         Recording const log;
         EXPECT_EQ(write(id, 9).getStatus(), 0);
         EXPECT_EQ(stored(id), "number 9 true");

@@ -62,6 +62,10 @@ public:
     {
         return mi.*(&Insides::computerNode_);
     }
+    static auto& logNode(IC::OsSwMI& mi)
+    {
+        return mi.*(&Insides::logNode_);
+    }
     static auto& osNode(IC::OsSwMI& mi)
     {
         return mi.*(&Insides::osNode_);

@@ -228,4 +228,57 @@ TEST_F(FixedNodes, ALaterInterfaceIdShowsInTheNodesMadeAfterIt)
     EXPECT_EQ(plugin.node(NODES::computerType).getMIIds(), (Ids{5, 9}));
 }
 
+TEST_F(FixedNodes, StandInTheMemberOfTheirKindBeforeTheirStatusIsSet)
+{
+    Ids seen;
+    host.onSetStatus = [this, &seen](IC::MutableNode& node) {
+        for (IC::MutableNode* member :
+             {Insides::osSwNode(mi()), Insides::rootNode(mi()), Insides::computerNode(mi()),
+              Insides::osNode(mi()), Insides::logNode(mi())})
+            if (member == &node)
+                seen.push_back(node.getNodeType());
+    };
+    plugin.initialize(5);
+    EXPECT_EQ(seen, (Ids{39, 59, 40, 17, 35}));
+}
+
+TEST_F(FixedNodes, NoteTheInterfacesOwnIdOnceTheyAreMade)
+{
+    Ids noted;
+    host.onNode = [this, &noted] {
+        noted.push_back(static_cast<unsigned int>(Insides::nodeIds(mi())->size()));
+    };
+    plugin.initialize(5);
+    ASSERT_GE(noted.size(), 3U);
+    EXPECT_EQ(Ids(noted.begin(), noted.begin() + 3), (Ids{0, 2, 4}));
+}
+
+TEST_F(FixedNodes, TakeTheCountersValueOfTheMoment)
+{
+    host.onSetStatus = [this](IC::MutableNode& node) {
+        if (node.getNodeType() == NODES::osSwType)
+            Insides::nextNodeId(mi()) = 40;
+    };
+    plugin.initialize(5);
+    EXPECT_EQ(plugin.node(NODES::rootType).getNodeId(), 40U);
+    EXPECT_EQ(plugin.node(NODES::rootType).getLinkedId(), 5U);
+    EXPECT_EQ(plugin.node(NODES::computerType).getNodeId(), 41U);
+    EXPECT_EQ(plugin.node(NODES::computerType).getLinkedId(), 40U);
+    EXPECT_EQ(firstIds(4), (Ids{5, 40, 5, 41}));
+}
+
+TEST_F(FixedNodes, TheOperatingSystemIsSetUpBeforeItsPropertiesAreSet)
+{
+    plugin.initialize(5);
+    Lines const events = eventsOf("createOsNodes");
+    ASSERT_GE(events.size(), 13U);
+    EXPECT_EQ(Lines(events.begin(), events.begin() + 13),
+              (Lines{"MutableNode(8, 7, [5], 17, 0)", "log: OsNode::OsNode: entry", "setStatus(1)",
+                     "setDescription(Operating System)", "log: OsNode::setProperty: entry",
+                     "setProperty(128, enumeration 35 true)", "log: OsNode::setProperty: exit",
+                     "log: OsNode::setProperty: entry", "setProperty(123, enumeration 1 false)",
+                     "log: OsNode::setProperty: exit", "log: OsNode::setProperty: entry",
+                     "setProperty(125, numbers 0,1,24 true)", "log: OsNode::setProperty: exit"}));
+}
+
 } // namespace

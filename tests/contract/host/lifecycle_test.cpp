@@ -637,4 +637,17 @@ TEST_F(Lifecycle, OpensNoFileButThoseOfTheSystemThatItIsToRead)
         EXPECT_EQ(known.count(path), 1U) << path;
 }
 
+TEST_F(Lifecycle, InitializeKeepsTheFrameworksAnswerFirstAndReturnsWhatIsKeptAtTheEnd)
+{
+    host.initializeStatus = 3;
+    Ids kept;
+    host.onNode = [this, &kept] {
+        kept.push_back(plugin.status().getStatus());
+        object<IC::Error>("_ZN2IC6OSSWMI5myerrE") = IC::Error(9, IC::Number(0U), "later");
+    };
+    EXPECT_EQ(plugin.initialize().getStatus(), 9);
+    ASSERT_FALSE(kept.empty());
+    EXPECT_EQ(kept.front(), 3U);
+}
+
 } // namespace

@@ -1,0 +1,30 @@
+#include "frame/OsSwMI.h"
+
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Libc.h"
+
+#include <gtest/gtest.h>
+
+namespace
+{
+
+class Another : public IC::OsSwMI
+{
+public:
+    ~Another() override
+    {
+        OsSwMI::unload();
+        IC::pOsSwMI = nullptr;
+    }
+};
+
+TEST(Interface, IsTheOneInUseOnceItIsInitialised)
+{
+    FakeFiles const files;
+    libc::FakeCommands const commands;
+    Another interface;
+    interface.initialize(5, IC::Number(0U), IC::Number(0U));
+    EXPECT_EQ(IC::pOsSwMI, &interface);
+}
+
+} // namespace

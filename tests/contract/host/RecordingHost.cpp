@@ -182,6 +182,8 @@ Error ManagementInterface::addNewNode(Node*& node)
 Error ManagementInterface::deleteNode(Node* node)
 {
     note("deleteNode(" + node->getDescription() + ")");
+    if (recordingHost().deleteNodeStatus != 0)
+        return {recordingHost().deleteNodeStatus, Number(0U), "busy"};
     nodes_.erase(std::find(nodes_.begin(), nodes_.end(), node));
     delete node;
     return success();

@@ -41,6 +41,7 @@ struct RecordingHost {
 
     // What the framework answers.
     unsigned char initializeStatus = 0;
+    unsigned char deleteNodeStatus = 0; // else the node stays
     unsigned char addNewNodeStatus = 0;
     unsigned char setterStatus = 0; // of a node's setStatus, setDescription and setProperty
     int lockStatus = 0;             // of a mutex, which is locked all the same

@@ -211,7 +211,11 @@ TEST_F(FixedNodes, AreParentsByTheIdThatTheyAnswerWith)
 TEST_F(FixedNodes, CarryTheInterfaceIdsOfTheMomentAtWhichTheyWereMade)
 {
     host.miIds = {5, 9};
+    commands.answers = {{"lsmod", "exnet 24576 0\n"},
+                        {"modinfo exnet", ""},
+                        {"wc -l /var/log/messages", "2 /var/log/messages\n"}};
     plugin.initialize(5);
+    ASSERT_EQ(plugin.nodes(NODES::logEntryType).size(), 2U);
     Insides::miIds(mi()).push_back(10);
     for (IC::MutableNode const* node : plugin.nodes())
         EXPECT_EQ(node->getMIIds(), (Ids{5, 9})) << node->getDescription();
@@ -279,6 +283,43 @@ TEST_F(FixedNodes, TheOperatingSystemIsSetUpBeforeItsPropertiesAreSet)
                      "log: OsNode::setProperty: entry", "setProperty(123, enumeration 1 false)",
                      "log: OsNode::setProperty: exit", "log: OsNode::setProperty: entry",
                      "setProperty(125, numbers 0,1,24 true)", "log: OsNode::setProperty: exit"}));
+}
+
+/** A node that answers with another id than it was made with. */
+class Renumbered : public IC::MutableNode
+{
+public:
+    Renumbered() : MutableNode(1, 0, {1}, 0, 0) {}
+    unsigned int getNodeId() const override
+    {
+        return 77;
+    }
+};
+
+TEST_F(FixedNodes, LikeAllParentsAreAskedForTheirIds)
+{
+    commands.answers = {{"lsmod", "exnet 24576 0\n"},
+                        {"modinfo exnet", ""},
+                        {"wc -l /var/log/messages", "1 /var/log/messages\n"}};
+    plugin.initialize(5);
+    Renumbered parent;
+    auto const parentOf = [this, &parent](IC::MutableNode*& member, std::string const& builder) {
+        member = &parent;
+        std::string const symbol = "_ZN2IC6OsSwMI" + builder;
+        void* const code = plugin.symbol(symbol.c_str());
+        if (builder.back() == 'b')
+            reinterpret_cast<void (*)(IC::OsSwMI*, bool)>(code)(&mi(), false);
+        else
+            reinterpret_cast<void (*)(IC::OsSwMI*)>(code)(&mi());
+        return plugin.nodes().back()->getLinkedId();
+    };
+    IC::OsSwMI& all = mi();
+    EXPECT_EQ(parentOf(Insides::rootNode(all), "19createComputerNodesEv"), 77U);
+    EXPECT_EQ(parentOf(Insides::computerNode(all), "13createOsNodesEv"), 77U);
+    for (char const* builder : {"17createDriverNodesEv", "15createUserNodesEb",
+                                "16createGroupNodesEb", "14createLogNodesEv"})
+        EXPECT_EQ(parentOf(Insides::osNode(all), builder), 77U) << builder;
+    EXPECT_EQ(parentOf(Insides::logNode(all), "19createLogEntryNodesEb"), 77U);
 }
 
 } // namespace

@@ -650,4 +650,23 @@ TEST_F(Lifecycle, InitializeKeepsTheFrameworksAnswerFirstAndReturnsWhatIsKeptAtT
     EXPECT_EQ(kept.front(), 3U);
 }
 
+TEST_P(Rebuilding, SaysNothingOfADeletionThatFailsAndGoesOn)
+{
+    commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
+    rebuild(GetParam().builder);
+    Lines const errors = host.messages(6000);
+    std::size_t const nodes = plugin.nodes(GetParam().type).size();
+    ASSERT_GE(nodes, 3U);
+    host.logCalls.clear();
+    host.events.clear();
+    host.deleteNodeStatus = 1;
+    rebuild(GetParam().builder);
+    EXPECT_EQ(host.messages(6000), errors);
+    EXPECT_EQ(plugin.nodes(GetParam().type).size(), 2 * nodes); // the old ones stay
+    Lines const calls = host.calls();
+    EXPECT_EQ(std::count_if(calls.begin(), calls.end(),
+                            [](auto const& call) { return call.rfind("deleteNode(", 0) == 0; }),
+              static_cast<std::ptrdiff_t>(nodes)); // each asked for once
+}
+
 } // namespace

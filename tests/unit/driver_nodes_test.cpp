@@ -126,26 +126,4 @@ TEST_F(DriverNodes, AreNoneWhenLsmodCannotBeStartedAndSayNoMoreThanThat)
     EXPECT_EQ(first.level, 3000);
 }
 
-/** A node that answers with another id than it was made with. */
-struct Renumbered : IC::MutableNode {
-    using MutableNode::MutableNode;
-    unsigned int getNodeId() const override
-    {
-        return 99;
-    }
-};
-
-TEST_F(DriverNodes, AskTheOperatingSystemsNodeForItsId)
-{
-    haveThreeModules();
-    Renumbered os(8, 7, {7}, 17, 0);
-    IC::MutableNode* const before = frame.osNode_;
-    frame.osNode_ = &os;
-    frame.createDriverNodes();
-    frame.osNode_ = before;
-    ASSERT_EQ(drivers().size(), 3U);
-    for (IC::MutableNode const* node : drivers())
-        EXPECT_EQ(node->getLinkedId(), 99U);
-}
-
 } // namespace

@@ -506,28 +506,4 @@ TEST_F(LogNodes, AreCompleteWhenTheyArePublished)
     EXPECT_EQ(other.seen, Texts(2, "OS LogEntry 1 3"));
 }
 
-/** A node that answers with another id than it was made with. */
-struct Renumbered : IC::MutableNode {
-    using MutableNode::MutableNode;
-    unsigned int getNodeId() const override
-    {
-        return 99;
-    }
-};
-
-TEST_F(LogNodes, AskTheirParentsForTheirIds)
-{
-    haveLines(1);
-    Renumbered os(8, 7, {7}, 17, 0), log(9, 8, {7}, 35, 0);
-    IC::MutableNode* const before = frame.osNode_;
-    frame.osNode_ = &os;
-    frame.createLogNodes();
-    EXPECT_EQ(frame.logNode_->getLinkedId(), 99U);
-    frame.osNode_ = before;
-    frame.logNode_ = &log;
-    frame.createLogEntryNodes(false);
-    ASSERT_EQ(entries().size(), 1U);
-    EXPECT_EQ(entries()[0]->getLinkedId(), 99U);
-}
-
 } // namespace

@@ -11,10 +11,11 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <atomic>
 
 namespace
 {
-std::size_t taken = 0; // texts that were taken out of buffers
+std::atomic<std::size_t> taken{0}; // texts that were taken out of buffers
 }
 
 namespace VXLog

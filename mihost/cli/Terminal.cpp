@@ -9,6 +9,7 @@
 #include <fmt/format.h>
 #include <langinfo.h>
 #include <optional>
+#include <poll.h>
 #include <string_view>
 #include <sys/ioctl.h>
 #include <termios.h>
@@ -33,6 +34,9 @@ std::optional<std::string> readLine()
 {
     std::string line;
     for (;;) {
+        // Waited for here: under the thread sanitizer a waiting read holds signals back.
+        pollfd input{STDIN_FILENO, POLLIN, 0};
+        poll(&input, 1, -1);
         char byte = 0;
         ssize_t const count = read(STDIN_FILENO, &byte, 1);
         if (count < 0 && errno == EINTR)

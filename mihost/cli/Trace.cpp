@@ -1,11 +1,9 @@
 #include "mihost/cli/Trace.h"
 
 #include "mihost/cli/Catalogue.h"
-#include "mihost/cli/Failure.h"
+#include "mihost/cli/TraceFile.h"
 
 #include <cerrno>
-#include <cstring>
-#include <fmt/format.h>
 
 namespace mihost
 {
@@ -15,18 +13,15 @@ namespace
 
 constexpr char standardError[] = "-";
 
-Failure cannotWrite(std::string const& file, int problem)
-{
-    return {BadUsage, fmt::format("cannot write the trace '{}': {}", file, std::strerror(problem))};
-}
-
 std::FILE* openTrace(std::string const& file)
 {
     if (file == standardError)
         return stderr;
-    std::FILE* const stream = std::fopen(file.c_str(), "we"); // kept from the commands
+    Descriptor opened = openTraceFile(file);
+    std::FILE* const stream = fdopen(opened.get(), "we"); // kept from the commands
     if (!stream)
-        throw cannotWrite(file, errno);
+        throw cannotWriteTrace(file, errno);
+    opened.release();
     return stream;
 }
 
@@ -49,7 +44,7 @@ void Trace::finish()
 {
     // A reader that went early has seen what it wanted.
     if (int const problem = writer_.finish(); problem != 0 && problem != EPIPE)
-        throw cannotWrite(file_, problem);
+        throw cannotWriteTrace(file_, problem);
 }
 
 } // namespace mihost

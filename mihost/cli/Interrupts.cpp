@@ -1,5 +1,7 @@
 #include "mihost/cli/Interrupts.h"
 
+#include "mihost/cli/PrivateDirectory.h"
+
 #include <algorithm>
 #include <cerrno>
 #include <cmath>
@@ -25,13 +27,13 @@ char const* volatile lastWords = nullptr;
 volatile std::sig_atomic_t noted = 0; // the signal
 int screen = STDERR_FILENO;
 
-/** The one file that the plug-in makes where it stands. */
 void removeFolder(char const* path)
 {
     int const opened = open(path, O_PATH | O_DIRECTORY | O_CLOEXEC);
     if (opened < 0)
         return;
-    unlinkat(opened, "usrandpwd", 0);
+    for (char const* const file : privateDirectoryFiles)
+        unlinkat(opened, file, 0);
     close(opened);
     rmdir(path);
 }
@@ -94,9 +96,10 @@ void install()
     for (int const signal : endingSignals)
         if (!isIgnored(signal)) // as nohup leaves it
             setHandler(signal, handle, SA_RESTART);
-    // A reader that goes early is an error of writing, not the end. Not SIG_IGN, which the commands
-    // would inherit.
-    setHandler(SIGPIPE, ignore, SA_RESTART);
+    // A reader that goes early or a file that grows too long is an error of writing, not the end.
+    // Not SIG_IGN, which the commands would inherit.
+    for (int const signal : {SIGPIPE, SIGXFSZ})
+        setHandler(signal, ignore, SA_RESTART);
 }
 
 void setFolderToRemove(char const* path)

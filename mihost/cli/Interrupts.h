@@ -14,7 +14,10 @@
 namespace mihost::interrupts
 {
 
-/** Takes over SIGINT, SIGTERM, SIGHUP and SIGQUIT, and keeps SIGPIPE from ending the program. */
+/**
+ * Takes over SIGINT, SIGTERM, SIGHUP and SIGQUIT, and keeps SIGPIPE and SIGXFSZ from ending the
+ * program.
+ */
 void install();
 
 /** @param path  a folder to remove when a signal ends the program; null for none */

@@ -1,12 +1,15 @@
 #include "mihost/cli/CommandTap.h"
 
+#include "mihost/cli/BoundedText.h"
+#include "mihost/cli/DrainedPipe.h"
 #include "mihost/sandbox/Descriptor.h"
 
 #include <array>
 #include <dlfcn.h>
 #include <fcntl.h>
-#include <map>
-#include <sys/mman.h>
+#include <memory>
+#include <set>
+#include <system_error>
 
 namespace mihost::commandTap
 {
@@ -19,14 +22,21 @@ template <class Function> Function* next(char const* name)
     return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
 }
 
+struct Note {
+    std::string line;
+    BoundedText output;
+    int status;
+};
+
 struct State {
     Runner runner{next<Runner::Open>("popen"), next<Runner::Close>("pclose")};
     Listener* listener = nullptr;
     unsigned int count = 0;
     bool recording = false;
-    std::vector<RunCommand> recorded;
-    std::map<std::FILE*, int> finished; // streams of commands that have ended: the exit status
-    Descriptor standardError;
+    std::vector<std::shared_ptr<Note>> recorded;
+    std::set<std::FILE*> noting; // streams whose output is noted
+    int status = 0;              // of the command whose noting stream was closed last
+    std::unique_ptr<DrainedPipe> standardError;
 };
 
 State& state()
@@ -60,12 +70,16 @@ private:
     Descriptor before_;
 };
 
-int standardErrorFile()
+/** Negative where no pipe can be had: then commands complain where this program does. */
+int standardErrorEnd()
 {
-    Descriptor& file = state().standardError;
-    if (!file)
-        file = Descriptor(memfd_create("standard error of commands", MFD_CLOEXEC));
-    return file.get();
+    try {
+        if (!state().standardError)
+            state().standardError = std::make_unique<DrainedPipe>();
+        return state().standardError->writeEnd();
+    } catch (std::system_error const&) {
+        return -1;
+    }
 }
 
 std::FILE* start(char const* line, char const* mode)
@@ -73,41 +87,53 @@ std::FILE* start(char const* line, char const* mode)
     Descriptor const nothing(::open("/dev/null", O_RDONLY | O_CLOEXEC));
     std::fflush(stderr);
     Redirection const input(STDIN_FILENO, nothing.get());
-    Redirection const complaints(STDERR_FILENO, standardErrorFile());
+    Redirection const complaints(STDERR_FILENO, standardErrorEnd());
     return state().runner.open(line, mode);
 }
 
-std::string readToEnd(std::FILE* stream)
+/** Reads the stream to its end. */
+void readInto(BoundedText& text, std::FILE* stream)
 {
-    std::string text;
     std::array<char, 4096> block{};
     while (std::size_t const length = std::fread(block.data(), 1, block.size(), stream))
-        text.append(block.data(), length);
-    return text;
+        text.append({block.data(), length});
 }
 
-std::FILE* streamOf(std::string const& text)
+/** A stream of the plug-in's, which reads the command's own. */
+struct NotingStream {
+    std::FILE* command;
+    std::shared_ptr<Note> note;
+};
+
+ssize_t readNoting(void* cookie, char* buffer, std::size_t size)
 {
-    Descriptor file(memfd_create("output of a command", MFD_CLOEXEC));
-    std::FILE* const stream = file ? fdopen(file.get(), "w+e") : nullptr;
-    if (!stream)
-        return nullptr;
-    file.release();
-    std::fwrite(text.data(), 1, text.size(), stream);
-    std::rewind(stream);
-    return stream;
+    auto const& stream = *static_cast<NotingStream*>(cookie);
+    std::size_t const length = std::fread(buffer, 1, size, stream.command);
+    stream.note->output.append({buffer, length});
+    return length == 0 && std::ferror(stream.command) != 0 ? -1 : static_cast<ssize_t>(length);
 }
 
-std::FILE* record(char const* line, std::FILE* running)
+int closeNoting(void* cookie)
 {
-    std::string const output = readToEnd(running);
+    std::unique_ptr<NotingStream> const stream(static_cast<NotingStream*>(cookie));
+    readInto(stream->note->output, stream->command);
     // cppcheck-suppress AssignmentAddressToInteger ; it takes the call for the function
-    int const status = state().runner.close(running);
-    state().recorded.push_back({line, output});
-    std::FILE* const stream = streamOf(output);
-    if (stream)
-        state().finished[stream] = status;
-    return stream;
+    stream->note->status = state().runner.close(stream->command);
+    state().status = stream->note->status;
+    return 0;
+}
+
+std::FILE* note(char const* line, std::FILE* running)
+{
+    auto const& noted = state().recorded.emplace_back(std::make_shared<Note>(Note{line, {}, 0}));
+    auto stream = std::make_unique<NotingStream>(NotingStream{running, noted});
+    std::FILE* const noting =
+        fopencookie(stream.get(), "r", {readNoting, nullptr, nullptr, closeNoting});
+    if (!noting)
+        return running;
+    stream.release();
+    state().noting.insert(noting);
+    return noting;
 }
 
 } // namespace
@@ -138,25 +164,17 @@ Recording::~Recording()
     state().recording = false;
 }
 
-std::vector<RunCommand> const& Recording::commands() const
+std::vector<RunCommand> Recording::commands() const
 {
-    return state().recorded;
+    std::vector<RunCommand> commands;
+    for (auto const& note : state().recorded)
+        commands.push_back({note->line, note->output.text(), note->status});
+    return commands;
 }
 
 std::string takeStandardError()
 {
-    int const file = standardErrorFile();
-    std::string text;
-    std::array<char, 4096> block{};
-    off_t at = 0;
-    for (ssize_t length = 0; (length = pread(file, block.data(), block.size(), at)) > 0;) {
-        text.append(block.data(), static_cast<std::size_t>(length));
-        at += length;
-    }
-    if (ftruncate(file, 0) != 0)
-        text.clear();
-    lseek(file, 0, SEEK_SET);
-    return text;
+    return state().standardError ? state().standardError->take() : "";
 }
 
 std::string outputOf(std::string const& line)
@@ -164,9 +182,10 @@ std::string outputOf(std::string const& line)
     std::FILE* const running = start(line.c_str(), "r");
     if (!running)
         return "";
-    std::string output = readToEnd(running);
+    BoundedText output;
+    readInto(output, running);
     state().runner.close(running);
-    return output;
+    return output.text();
 }
 
 std::FILE* open(char const* line, char const* mode)
@@ -177,20 +196,17 @@ std::FILE* open(char const* line, char const* mode)
         tapped.listener->commandStarts(line);
     std::FILE* const running = start(line, mode);
     // A stream that the plug-in closed as an ordinary file may come back as another one.
-    tapped.finished.erase(running);
-    return running && tapped.recording ? record(line, running) : running;
+    tapped.noting.erase(running);
+    return running && tapped.recording ? note(line, running) : running;
 }
 
 int close(std::FILE* stream)
 {
-    auto const found = state().finished.find(stream);
-    if (found == state().finished.end())
+    if (state().noting.erase(stream) == 0)
         // cppcheck-suppress CastAddressToIntegerAtReturn ; as above
         return state().runner.close(stream);
-    int const status = found->second;
-    state().finished.erase(found);
     std::fclose(stream);
-    return status;
+    return state().status;
 }
 
 } // namespace mihost::commandTap

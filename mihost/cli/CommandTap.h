@@ -16,10 +16,11 @@
 namespace mihost::commandTap
 {
 
-/** A command line that was run, and what it wrote to its standard output. */
+/** A command line that was run, the beginning of its standard output (see BoundedText), its end. */
 struct RunCommand {
     std::string line;
     std::string output;
+    int status; // as from wait; 0 while the plug-in has its stream open
 };
 
 /** What runs the commands that pass through; libc's own two from the start. */
@@ -48,8 +49,8 @@ void setListener(Listener* listener);
 unsigned int count();
 
 /**
- * Notes every command and its output for as long as it lives. Each then runs to its end before the
- * plug-in reads the first byte of it.
+ * Notes every command, and its output as the plug-in reads it. What the plug-in leaves unread is
+ * read when it closes the stream, so each command runs to its end.
  */
 class Recording
 {
@@ -59,13 +60,17 @@ public:
     Recording(Recording const&) = delete;
     Recording& operator=(Recording const&) = delete;
 
-    std::vector<RunCommand> const& commands() const;
+    std::vector<RunCommand> commands() const;
 };
 
-/** What commands have written to their standard error since this was last asked. */
+/** The beginning of what commands wrote to their standard error since the last call. */
 std::string takeStandardError();
 
-/** Runs a command line of the program's own. @return what it prints; empty where it cannot start */
+/**
+ * Runs a command line of the program's own.
+ *
+ * @return the beginning of what it prints; empty if it cannot start
+ */
 std::string outputOf(std::string const& line);
 
 /** Where popen and pclose come in. */

@@ -37,7 +37,7 @@ Result perform(Write const& write, Secrets secrets)
     Result result{write.node.setProperty(write.property, write.value), {}, {}, {}, {}};
     for (RunCommand const& command : recording.commands())
         result.commands.push_back({withoutSecret(command.line, write.secret),
-                                   withoutSecret(command.output, write.secret)});
+                                   withoutSecret(command.output, write.secret), command.status});
     result.accounts = readAccountFiles();
     result.changes = changesBetween(before, result.accounts, secrets);
     result.complaints = withoutSecret(commandTap::takeStandardError(), write.secret);

@@ -5,6 +5,7 @@
 #include "tests/support/ScratchFolder.h"
 
 #include <cstdlib>
+#include <filesystem>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 #include <unistd.h>
@@ -67,6 +68,20 @@ TEST_F(MihostSandbox, HidesPasswordsInCommandsAndFiles)
         EXPECT_NE(outcome.out.find("-p (hidden)"), std::string::npos) << outcome.out;
         EXPECT_EQ((outcome.out + outcome.err).find("geheim42"), std::string::npos);
     }
+}
+
+TEST_F(MihostSandbox, ShowsTheBeginningOfALongOutputAndHowMuchFollowed)
+{
+    ScratchFolder const machine;
+    std::string const tool =
+        machine.write("usr/sbin/groupadd", "#!/bin/sh\nyes out | head -c 8388608\n");
+    std::filesystem::permissions(tool, std::filesystem::perms::owner_all);
+    Outcome const outcome =
+        mihostRun({"--json", "--overlay", machine.name(), "call", "LocalGroupAdd", "GroupName=g"});
+    Json const answer = Json::parse(outcome.out);
+    constexpr std::size_t kept = 1048576;
+    std::string const output = answer["commands"][0]["output"];
+    EXPECT_EQ(output.substr(kept - 4), "out\n... (7340032 more bytes)\n");
 }
 
 TEST_F(MihostSandbox, WritesTheTraceOutsideOfIt)

@@ -4,7 +4,12 @@
 namespace IC
 {
 
-/** One value of an enumeration whose meaning belongs to the property that carries it. */
+/**
+ * One value of an enumeration whose meaning belongs to the property that carries it.
+ *
+ * Contract: the plug-in makes room for objects of this class itself, so their size is fixed; see
+ * OpenMI.h.
+ */
 class EnumValue
 {
 public:

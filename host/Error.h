@@ -12,6 +12,9 @@ namespace IC
  * The outcome of a framework operation. Status 0 is success, anything else is failure.
  *
  * A value type, returned by value and never thrown.
+ *
+ * Contract: the plug-in makes room for objects of this class itself, so their size is fixed; see
+ * OpenMI.h.
  */
 class Error
 {

@@ -14,11 +14,13 @@ namespace IC
 {
 
 /**
- * The object that a plug-in hands to its host.
+ * The object that a plug-in passes to its host, and the base class that the host provides for it.
  *
  * Life: the host takes it from OpenMI, may call setLoadCallBack, calls initialize once, uses the
- * tree, calls unload and then closes the library. The order of the virtual operations and of the
- * protected members is part of the contract: none must be moved, added between or taken away.
+ * tree, calls unload and then closes the library.
+ *
+ * Contract: the plug-in derives from this class, so the order of the virtual operations and of the
+ * protected members is fixed; see OpenMI.h.
  */
 class ManagementInterface
 {
@@ -43,7 +45,12 @@ public:
 
     virtual Error registerForAlerts(AlertCallBack callBack, void const* context);
 
-    /** Remembers who is told of new nodes and who finds nodes by path. Calls neither. */
+    /**
+     * Stores who is informed of new nodes and who finds nodes by path. Calls neither.
+     *
+     * The nodes that initialize builds cause no call: take them from getMap. A rebuild passes each
+     * of its new nodes to addNewNode, which calls once for each.
+     */
     virtual void setLoadCallBack(LoadCallBack callBack, void const* context, LookupCallBack lookup)
     {
         loadCallBack_ = callBack;
@@ -62,13 +69,15 @@ public:
     virtual operator std::string() const;
 
     /**
-     * Makes a node known to the host and lists it unless it stands in the list already.
+     * Informs the host of a node through the load callback, and lists the node unless it is in the
+     * list already.
      *
-     * @return the host's answer; on a non-zero status the node stays where it is
+     * @return the callback's answer; on a non-zero status the node stays where it is
      */
     virtual Error addNewNode(Node*& node);
 
-    /** Unlists the node, tells the host and deletes it. Status 1 for a node that is not listed. */
+    /** Unlists the node, informs the host and deletes it. Status 1 for a node that is not listed.
+     */
     virtual Error deleteNode(Node* node);
 
     /** Finds a node by the text of its id. Status 1 where there is none. */
@@ -77,8 +86,7 @@ public:
 protected:
     unsigned int nextNodeId_;
     unsigned int miId_;
-    // Owned; a management interface appends here directly. A deleted node may leave a null pointer
-    // until the next look at the list.
+    // Owned; a management interface appends here directly and reads nothing here.
     std::vector<Node*> nodes_;
     std::vector<unsigned int> miIds_;
     LoadCallBack loadCallBack_;

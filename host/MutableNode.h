@@ -13,8 +13,10 @@ namespace IC
 /**
  * The base of every node that a management interface builds.
  *
- * Interfaces create nodes with new and hand them to the framework, which owns them from then on.
- * The order of the virtual operations is part of the contract: the first seven are those of Node.
+ * Interfaces create nodes with new and pass them to the framework, which owns them from then on.
+ *
+ * Contract: the plug-in creates and derives from objects of this class, so its size and the order
+ * of its virtual operations are fixed, the first seven being those of Node; see OpenMI.h.
  */
 class MutableNode : public Node
 {

@@ -6,7 +6,12 @@
 namespace NQ
 {
 
-/** A lock between threads, not to be taken twice by the same thread. */
+/**
+ * A lock between threads, not to be taken twice by the same thread.
+ *
+ * Contract: the plug-in makes room for objects of this class itself, so their size is fixed; see
+ * OpenMI.h.
+ */
 class Mutex
 {
 public:
@@ -19,7 +24,7 @@ public:
      */
     int lock(unsigned long timeout);
 
-    /** @return 0 for success */
+    /** @return 0 for success; the plug-in's getGroupInfo returns this number as its own result */
     int unlock();
 
 private:
@@ -27,7 +32,7 @@ private:
     Mutex& operator=(Mutex const&) = delete;
 
     struct Handle;
-    std::unique_ptr<Handle> handle_; // the host's own
+    std::unique_ptr<Handle> handle_; // the host's own; what it points to is free
 };
 
 } // namespace NQ

@@ -8,6 +8,9 @@ namespace IC
  * An unsigned number, a truth value or a point in time.
  *
  * A value type: copies are independent, and reading one from several threads is safe.
+ *
+ * Contract: the plug-in makes room for objects of this class itself, so their size is fixed; see
+ * OpenMI.h.
  */
 class Number
 {

@@ -17,6 +17,9 @@ namespace IC
  *
  * Every constructor takes a flag, which the value keeps for the host. A value type: copies are
  * independent.
+ *
+ * Contract: the plug-in makes room for objects of this class itself, so their size is fixed; see
+ * OpenMI.h.
  */
 class PropertyValue
 {

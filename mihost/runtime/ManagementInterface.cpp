@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <mutex>
+#include <unordered_map>
 
 namespace IC
 {
@@ -28,8 +29,10 @@ struct ManagementInterface::Own {
     // Guards the node list, for one look or one change at a time, since different threads may
     // rebuild nodes of different kinds at once. Nobody outside is called while it is held.
     std::mutex listLock;
-    std::size_t gaps = 0;    // null pointers that deleted nodes left in the list
-    std::size_t lastGap = 0; // the youngest of them
+    // Where each node is in the list, up to that position. Deleted nodes leave null pointers until
+    // the next look: closing each gap at once would cost a rebuild the square of the nodes.
+    std::unordered_map<Node const*, std::size_t> positions;
+    std::size_t indexed = 0;
     AlertCallBack alertCallBack = nullptr;
     void const* alertContext = nullptr;
 
@@ -37,31 +40,25 @@ struct ManagementInterface::Own {
     void closeGaps(std::vector<Node*>& nodes);
 };
 
-/**
- * Leaves a gap in the node's place: moving up all that stand behind it for each one deleted would
- * cost a rebuild the square of the number of nodes.
- */
 bool ManagementInterface::Own::unlist(std::vector<Node*>& nodes, Node const* node)
 {
-    // Nodes of one kind are deleted in the order in which they stand.
-    auto const next = static_cast<std::ptrdiff_t>(std::min(lastGap + 1, nodes.size()));
-    auto found = nodes.begin() + next;
-    if (found == nodes.end() || *found != node)
-        found = std::find(nodes.begin(), nodes.end(), node);
-    if (!node || found == nodes.end())
+    for (; indexed < nodes.size(); ++indexed)
+        positions[nodes[indexed]] = indexed;
+    auto const found = positions.find(node);
+    if (!node || found == positions.end())
         return false;
-    *found = nullptr;
-    lastGap = static_cast<std::size_t>(found - nodes.begin());
-    ++gaps;
+    nodes[found->second] = nullptr;
+    positions.erase(found);
     return true;
 }
 
 void ManagementInterface::Own::closeGaps(std::vector<Node*>& nodes)
 {
-    if (gaps == 0)
+    if (indexed == 0) // nothing was deleted since
         return;
     nodes.erase(std::remove(nodes.begin(), nodes.end(), nullptr), nodes.end());
-    gaps = 0;
+    positions.clear();
+    indexed = 0;
 }
 
 ManagementInterface::ManagementInterface()
@@ -105,8 +102,8 @@ void ManagementInterface::unload()
     std::vector<Node*> nodes;
     {
         std::lock_guard const held(own_->listLock);
+        own_->closeGaps(nodes_);
         nodes.swap(nodes_);
-        own_->gaps = 0;
     }
     for (Node* node : nodes)
         delete node;

@@ -6,7 +6,9 @@
 #include "util/log.h"
 #include "util/text.h"
 
+#include <atomic>
 #include <grp.h>
+#include <thread>
 #include <utility>
 
 namespace NQ
@@ -41,6 +43,41 @@ public:
     }
 };
 
+/**
+ * The primary members that a listing reads once for all of its groups: reading /etc/passwd again
+ * for each group would cost the product of groups and accounts. setGroupMembers finds them here,
+ * but only when the listing's own thread calls it.
+ */
+class SharedPrimaryMembers
+{
+public:
+    /** To be made by one listing at a time. */
+    SharedPrimaryMembers()
+    {
+        shared = &primary_;
+        owner = std::this_thread::get_id();
+    }
+    ~SharedPrimaryMembers()
+    {
+        owner = std::thread::id();
+    }
+    SharedPrimaryMembers(SharedPrimaryMembers const&) = delete;
+    SharedPrimaryMembers& operator=(SharedPrimaryMembers const&) = delete;
+
+    /** Those of a group, read from /etc/passwd unless this thread is in the middle of a listing. */
+    static std::string of(unsigned int groupId)
+    {
+        bool const listing = owner.load() == std::this_thread::get_id();
+        return listing ? shared->of(groupId) : GROUP_INFO::PrimaryMembers().of(groupId);
+    }
+
+private:
+    static inline std::atomic<std::thread::id> owner;
+    static inline GROUP_INFO::PrimaryMembers const* shared = nullptr; // the owner's alone
+
+    GROUP_INFO::PrimaryMembers const primary_;
+};
+
 } // namespace
 
 groupInfo::groupInfo() = default;
@@ -68,13 +105,7 @@ void groupInfo::setGroupId(unsigned int groupId)
 void groupInfo::setGroupMembers(char** members)
 {
     LOG::Scope const scope(unit);
-    members_ = GROUP_INFO::withMembers(GROUP_INFO::PrimaryMembers().of(groupId_), members);
-}
-
-void groupInfo::setGroupMembers(char** members, GROUP_INFO::PrimaryMembers const& primary)
-{
-    LOG::Scope const scope(unit);
-    members_ = GROUP_INFO::withMembers(primary.of(groupId_), members);
+    members_ = GROUP_INFO::withMembers(SharedPrimaryMembers::of(groupId_), members);
 }
 
 std::vector<std::string> groupInfo::getGroupMembers()
@@ -104,15 +135,13 @@ int getGroupInfo(std::vector<groupInfo>& groups)
     MutexLock lock(mutex);
     {
         GroupDatabase database;
-        // The members of every group come out of one reading of /etc/passwd: reading it again for
-        // each group would cost the product of groups and accounts.
-        GROUP_INFO::PrimaryMembers const primary;
+        SharedPrimaryMembers const primary;
         while (group const* entry = database.next()) {
             if (!isReportedGroup(entry->gr_gid))
                 continue;
             groupInfo found(entry->gr_name);
             found.setGroupId(entry->gr_gid);
-            found.setGroupMembers(entry->gr_mem, primary);
+            found.setGroupMembers(entry->gr_mem);
             groups.push_back(std::move(found));
         }
     }

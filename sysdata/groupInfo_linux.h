@@ -1,18 +1,11 @@
 #ifndef SYSDATA_GROUPINFO_LINUX_H
 #define SYSDATA_GROUPINFO_LINUX_H
 
-#include "util/internal.h"
-
 #include <string>
 #include <vector>
 
 namespace NQ
 {
-
-namespace GROUP_INFO
-{
-class PrimaryMembers;
-}
 
 /** Logger category of this source unit. */
 extern std::string loggerGroupInfo;
@@ -22,7 +15,7 @@ class groupInfo
 {
 public:
     groupInfo();
-    explicit groupInfo(std::string name);
+    groupInfo(std::string name);
 
     std::string getGroupName();
 
@@ -46,11 +39,6 @@ public:
                   std::string const& delimiters);
 
 private:
-    friend int getGroupInfo(std::vector<groupInfo>& groups);
-
-    /** As above, for a listing that has read /etc/passwd already. */
-    MI_INTERNAL void setGroupMembers(char** members, GROUP_INFO::PrimaryMembers const& primary);
-
     std::string name_;
     std::string members_; // joined by ","
     unsigned int groupId_ = 0;

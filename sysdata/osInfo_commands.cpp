@@ -54,7 +54,7 @@ constexpr Option options[] = {
     {ParamType::text, "Comment", Item::plain, "-c"},
     {ParamType::text, "ScriptPath", Item::scriptPath, "-s"},
     {ParamType::text, "HomeDir", Item::homeDir, "-d"},
-    {ParamType::text, "Password", Item::password, "-p"},
+    {ParamType::text, passwordName, Item::password, "-p"},
     {ParamType::text, "UserName", Item::userName, nullptr},
     {ParamType::text, "GroupName", Item::plain, nullptr},
     {ParamType::number, "daysMustKeepPassword", Item::plain, "-m"},
@@ -71,17 +71,6 @@ Option const* findOption(ParamType type, std::string const& name)
             return option.type == type && name == option.name;
         });
     return found == std::end(options) ? nullptr : found;
-}
-
-std::string withEscapedBlanks(std::string const& value)
-{
-    std::string escaped;
-    for (char const c : value) {
-        if (c == ' ')
-            escaped += '\\';
-        escaped += c;
-    }
-    return escaped;
 }
 
 void addText(Method const& method, Option const& option, std::string const& value,
@@ -155,6 +144,14 @@ bool closeLists(Method const& method, Commands& commands)
     return true;
 }
 
+bool fits(Arguments const& arguments)
+{
+    return arguments.size() <= argumentLimit + 1 &&
+           std::all_of(arguments.begin(), arguments.end(),
+                       [](std::string const& entry) { return entry.size() <= lengthLimit; }) &&
+           commandLine(arguments).size() < bufferSize;
+}
+
 template <std::size_t count>
 bool beginsWithAny(std::string const& text, char const* const (&beginnings)[count])
 {
@@ -179,6 +176,17 @@ ParamType typeOf(std::string const& name)
     return ParamType::unknown;
 }
 
+std::string withEscapedBlanks(std::string const& value)
+{
+    std::string escaped;
+    for (char const c : value) {
+        if (c == ' ')
+            escaped += '\\';
+        escaped += c;
+    }
+    return escaped;
+}
+
 Method const* findMethod(std::string const& name)
 {
     for (Method const& method : methodTable)
@@ -196,14 +204,6 @@ std::string commandLine(Arguments const& arguments)
     if (line.find("useradd") != std::string::npos)
         line += " 2>&1;echo rc=$?"; // kept, and so is the redirection that then follows
     return line + " 2>&1";
-}
-
-bool fits(Arguments const& arguments)
-{
-    return arguments.size() <= argumentLimit + 1 &&
-           std::all_of(arguments.begin(), arguments.end(),
-                       [](std::string const& entry) { return entry.size() <= lengthLimit; }) &&
-           commandLine(arguments).size() < bufferSize;
 }
 
 bool makeCommands(Method const& method, std::string const& program,

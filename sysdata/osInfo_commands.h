@@ -20,6 +20,12 @@ enum class ParamType { text, number, date, unknown };
 
 ParamType typeOf(std::string const& name);
 
+/** The parameter whose value is kept out of the log. */
+constexpr char passwordName[] = "Password";
+
+/** The value as it is on a command line, each blank after a backslash. */
+std::string withEscapedBlanks(std::string const& value);
+
 /** What a method needs beyond its program. */
 enum class MethodKind {
     userAdd,
@@ -51,9 +57,6 @@ constexpr std::size_t bufferSize = 5000;
 /** The shell line of a list, standard error merged in. */
 std::string commandLine(Arguments const& arguments);
 
-/** At most 39 arguments of 254 characters, and a line within the buffer. */
-bool fits(Arguments const& arguments);
-
 /** The commands of one call. */
 struct Commands {
     Arguments main;
@@ -64,7 +67,8 @@ struct Commands {
 };
 
 /**
- * Builds the commands of one call.
+ * Builds the commands of one call. A list holds at most 39 arguments of 254 characters, and its
+ * line must fit the buffer.
  *
  * @param program    what to run; the method's own program, possibly with options
  * @param complaint  on failure what to log, if anything

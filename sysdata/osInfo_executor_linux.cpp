@@ -37,8 +37,7 @@ int runTools(OsInfo& info, Method const& method, std::vector<ParamInfo> const& p
         return 1;
     }
     bool const adding = method.kind == MethodKind::userAdd;
-    Ran const main =
-        OSINFO::runLogged(info, commands.main, commands.password.has_value(), function);
+    Ran const main = OSINFO::runLogged(info, commands.main, params, function);
     bool const added = adding && main.output.find("rc=0") != std::string::npos;
     if (main.status != 0 && !OSINFO::isBenign(main.output) && !added)
         return main.status;
@@ -46,7 +45,7 @@ int runTools(OsInfo& info, Method const& method, std::vector<ParamInfo> const& p
         info.executePasswordEncryption(commands.password->data(), commands.user.data());
     if (!adding)
         return 0;
-    Ran const aging = OSINFO::runLogged(info, commands.aging, false, function);
+    Ran const aging = OSINFO::runLogged(info, commands.aging, params, function);
     return OSINFO::isAgingNotice(aging.output) ? 0 : aging.status;
 }
 
@@ -68,7 +67,7 @@ int OsInfo::executeMethod(std::string method, std::vector<ParamInfo> params, boo
     LOG::Scope const scope(methods, {"OsNode::executeMethod"});
     Method const* known = OSINFO::findMethod(method);
     if (!known) {
-        LOG::write(methods, LOG::error, LOG::message("Unknown method: ", OSINFO::loggable(method)));
+        LOG::write(methods, LOG::error, LOG::message("Unknown method: ", method));
         return 1;
     }
     switch (known->kind) {

@@ -1,9 +1,11 @@
 #ifndef SYSDATA_OSINFO_LOG_H
 #define SYSDATA_OSINFO_LOG_H
 
+#include "sysdata/ParamInfo.h"
 #include "util/log.h"
 
 #include <string>
+#include <vector>
 
 namespace NQ
 {
@@ -11,25 +13,18 @@ namespace NQ
 namespace OSINFO MI_INTERNAL
 {
 
-/** The facts speak under the frame's source name. Kept: hosts filter on it. */
+/** Contract: the facts speak under the frame's source name, which hosts filter on. */
 extern LOG::Unit const facts;
 
 /** The administration methods speak under their own source name. */
 extern LOG::Unit const methods;
 
 /**
- * The text, or nothing where a password may stand in it: where it holds "Password" and is more
- * than one plain word, such as a method-call text with the wrong separators.
+ * What a tool printed, for the log. Tools and shells may quote the line that they could not read,
+ * so the value of each parameter named "Password", as given or with its blanks escaped, becomes
+ * "(hidden)".
  */
-std::string loggable(std::string const& text);
-
-/**
- * What a command printed, for the log. Tools and shells may quote the line that they could not
- * read, so of a secret line's output only what cannot come from the line is kept.
- *
- * @param secret  whether the command line held a password
- */
-std::string loggableOutput(std::string const& output, bool secret);
+std::string withoutPasswords(std::string const& output, std::vector<ParamInfo> const& params);
 
 // Error messages.
 std::string unknownType(std::string const& type);

@@ -101,13 +101,19 @@ bool OsInfo::groupMemberChanges(std::string method, std::vector<ParamInfo> param
     LOG::Scope const scope(OSINFO::methods);
     std::string const group = quoted(textOf(params, "LocalGroupName"));
     std::string const member = quoted(textOf(params, "DomainAndMember"));
-    std::string const identity = OSINFO::runLogged(*this, {"/usr/bin/id", member}).output;
+    std::string const identity =
+        OSINFO::runLogged(*this, {"/usr/bin/id", member}, params, __func__).output;
+    if (identity.size() == OSINFO::bufferSize - 1) {
+        // Perhaps cut: usermod would take the member out of the groups that are missing.
+        LOG::write(OSINFO::methods, LOG::error, "Output too long: /usr/bin/id");
+        return true;
+    }
     if (holds(identity, "No such user") || !holds(identity, "gid"))
         return true;
     bool const adding = method == "LocalGroupAddUser";
     OSINFO::Arguments const change{"/usr/sbin/usermod", "-G",
                                    OSINFO::supplementaryGroups(identity, group, adding), member};
-    Ran const changed = OSINFO::runLogged(*this, change);
+    Ran const changed = OSINFO::runLogged(*this, change, params, __func__);
     return changed.status != 0 && !holds(changed.output, "is primary group name");
 }
 

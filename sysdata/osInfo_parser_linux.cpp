@@ -20,18 +20,15 @@ using OSINFO::ParamType;
 
 enum class Outcome { next, stop, reject };
 
-/** Whether a password stands in the item: it has that name, or the separators are wrong. */
-bool carriesPassword(std::string const& item)
+bool isPassword(std::string const& item)
 {
     std::vector<std::string> const parts = TEXT::split(item, ":");
-    return (!parts.empty() && parts.front() == "Password") ||
-           std::any_of(parts.begin(), parts.end(),
-                       [](std::string const& part) { return OSINFO::loggable(part) != part; });
+    return !parts.empty() && parts.front() == OSINFO::passwordName;
 }
 
 void note(char const* what, std::string const& text, char const* function)
 {
-    LOG::write(methods, LOG::progress, LOG::message(what, OSINFO::loggable(text)), function);
+    LOG::write(methods, LOG::progress, LOG::message(what, text), function);
 }
 
 /** Year, month and day of a date-time text; its time of day, fraction and offset are dropped. */
@@ -56,43 +53,50 @@ Outcome stopAtBlank(char const* function)
 }
 
 /**
- * Takes one item and appends the parameter that it makes.
+ * The parts of an item.
  *
- * @param secret  whether the call carries a password. A comma within that makes items of its
- *                pieces, so then only what is plainly a parameter is logged.
+ * @param secret  keeps them out of the log: a comma in a password makes items of its pieces
  */
+std::vector<std::string> partsOf(std::string const& item, bool secret)
+{
+    std::vector<std::string> parts;
+    if (!secret) {
+        Tokenize(item, parts, ":");
+        return parts;
+    }
+    // Tokenize does not log a text that holds this word.
+    Tokenize(item + ":" + OSINFO::passwordName, parts, ":");
+    parts.pop_back();
+    return parts;
+}
+
+/** Takes one item and appends the parameter that it makes. */
 Outcome parseItem(std::string const& item, bool secret, std::vector<ParamInfo>& params,
                   char const* function)
 {
-    std::vector<std::string> parts;
-    if (secret)
-        TEXT::tokenize(item, parts, ":", secret);
-    else
-        Tokenize(item, parts, ":");
+    std::vector<std::string> const parts = partsOf(item, secret);
     if (parts.size() < 2)
         return stopAtBlank(function);
 
     ParamInfo param{parts[0], parts[1], ""};
+    note("paramInfo.name=", param.name, function);
+    note("paramInfo.type=", param.type, function);
     ParamType const type = OSINFO::typeOf(param.type);
-    bool const shown = !secret || type != ParamType::unknown;
-    if (shown) {
-        note("paramInfo.name=", param.name, function);
-        note("paramInfo.type=", param.type, function);
-    }
     if (type == ParamType::unknown) {
-        LOG::write(methods, LOG::error, OSINFO::unknownType(shown ? param.type : ""), function);
+        LOG::write(methods, LOG::error, OSINFO::unknownType(param.type), function);
         return Outcome::reject;
     }
 
     bool const hasValue = parts.size() > 2;
-    if (!hasValue && type != ParamType::date)
+    bool const date = type == ParamType::date;
+    if (!hasValue && !date)
         return stopAtBlank(function);
     if (hasValue) {
-        if (type != ParamType::date)
+        if (!date)
             param.value = parts[2];
         else if (!readDate(parts[2], param.value))
             return Outcome::reject;
-        if (param.name != "Password")
+        if (date || param.name != OSINFO::passwordName)
             note("paramInfo.value=", param.value, function);
     }
     params.push_back(param);
@@ -111,7 +115,7 @@ int OsInfo::parseMethodAndParams(std::string methodAndParams, std::string& metho
         return 0;
     method = items.front();
     note("method=", method, __func__);
-    bool const secret = std::any_of(items.begin(), items.end(), carriesPassword);
+    bool const secret = std::any_of(items.begin() + 1, items.end(), isPassword);
     for (auto item = items.begin() + 1; item != items.end(); ++item) {
         Outcome const outcome = parseItem(*item, secret, params, __func__);
         if (outcome != Outcome::next)

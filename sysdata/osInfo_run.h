@@ -17,18 +17,16 @@ struct Ran {
     std::string output; // up to the first NUL
 };
 
-// The function is the one whose messages these are. A list that does not fit is logged and fails.
-
 /** Runs a list through executeCommand. */
-Ran run(OsInfo& info, Arguments arguments, char const* function = __builtin_FUNCTION());
+Ran run(OsInfo& info, Arguments arguments);
 
 /**
- * As run, and logs the output.
+ * As run, and logs the output for the function.
  *
- * @param secret  whether the list holds a password
+ * @param params  those of the call, whose passwords are hidden
  */
-Ran runLogged(OsInfo& info, Arguments const& arguments, bool secret = false,
-              char const* function = __builtin_FUNCTION());
+Ran runLogged(OsInfo& info, Arguments const& arguments, std::vector<ParamInfo> const& params,
+              char const* function);
 
 } // namespace MI_INTERNAL
 

@@ -16,12 +16,8 @@ using OSINFO::methods;
 
 } // namespace
 
-OSINFO::Ran OSINFO::run(OsInfo& info, Arguments arguments, char const* function)
+OSINFO::Ran OSINFO::run(OsInfo& info, Arguments arguments)
 {
-    if (!fits(arguments)) {
-        LOG::write(methods, LOG::error, tooLong(arguments.front()), function);
-        return {1, ""};
-    }
     std::vector<char*> entries;
     for (std::string& argument : arguments)
         entries.push_back(argument.data());
@@ -32,12 +28,12 @@ OSINFO::Ran OSINFO::run(OsInfo& info, Arguments arguments, char const* function)
     return {status, output};
 }
 
-OSINFO::Ran OSINFO::runLogged(OsInfo& info, Arguments const& arguments, bool secret,
-                              char const* function)
+OSINFO::Ran OSINFO::runLogged(OsInfo& info, Arguments const& arguments,
+                              std::vector<ParamInfo> const& params, char const* function)
 {
-    Ran ran = run(info, arguments, function);
+    Ran ran = run(info, arguments);
     LOG::write(methods, LOG::progress,
-               LOG::message("outputBuffer: ", loggableOutput(ran.output, secret)), function);
+               LOG::message("outputBuffer: ", withoutPasswords(ran.output, params)), function);
     return ran;
 }
 

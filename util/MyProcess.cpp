@@ -59,18 +59,12 @@ char* strget(char* str, char c)
 void Tokenize(std::string const& text, std::vector<std::string>& tokens,
               std::string const& delimiters)
 {
-    TEXT::tokenize(text, tokens, delimiters, text.find("Password") != std::string::npos);
-}
-
-void TEXT::tokenize(std::string const& text, std::vector<std::string>& tokens,
-                    std::string const& delimiters, bool secret)
-{
-    constexpr char const* function = "Tokenize";
-    LOG::Scope const scope(unit, {function}, function);
-    for (std::string const& token : split(text, delimiters)) {
+    LOG::Scope const scope(unit);
+    bool const secret = text.find("Password") != std::string::npos;
+    for (std::string const& token : TEXT::split(text, delimiters)) {
         if (!secret)
             LOG::write(unit, LOG::progress,
-                       LOG::message("str.substr(lastPos, pos - lastPos) = ", token), function);
+                       LOG::message("str.substr(lastPos, pos - lastPos) = ", token));
         tokens.push_back(token);
     }
 }

@@ -1,8 +1,6 @@
 #ifndef UTIL_MYPROCESS_H
 #define UTIL_MYPROCESS_H
 
-#include "util/internal.h"
-
 #include <cstdio>
 #include <ctime>
 #include <string>
@@ -51,19 +49,10 @@ char* strget(char* str, char c);
 
 /**
  * Appends every maximal run of characters of the text that holds no delimiter. The list is not
- * cleared. Texts that hold "Password" anywhere are not written to the log.
+ * cleared. The tokens of a text that holds "Password" anywhere are not logged.
  */
 void Tokenize(std::string const& text, std::vector<std::string>& tokens,
               std::string const& delimiters);
-
-namespace TEXT MI_INTERNAL
-{
-
-/** NQ::Tokenize for a text that the caller knows to be secret, or not: no token is looked at. */
-void tokenize(std::string const& text, std::vector<std::string>& tokens,
-              std::string const& delimiters, bool secret);
-
-} // namespace MI_INTERNAL
 
 /**
  * Calendar fields to seconds since 1970, read as local time; fields out of range are carried over.

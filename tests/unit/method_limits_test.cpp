@@ -164,10 +164,11 @@ protected:
     Params params_;
 };
 
-TEST_F(MemberLimits, LetTheGroupListHave254Characters)
+TEST_F(MemberLimits, AreTheRunnersBufferForTheGroupList)
 {
     // users,"...","g"
-    std::string const longest(254 - 6 - 3 - 3, 'x');
+    std::string const ends = "/usr/sbin/usermod -G users,\"\",\"g\" \"jdoe\" 2>&1";
+    std::string const longest(4999 - ends.size(), 'x');
     prepare(longest);
     EXPECT_EQ(execute("LocalGroupAddUser", params_), 0);
     EXPECT_EQ(commands_.ran, (Lines{idLine_, "/usr/sbin/usermod -G users,\"" + longest +
@@ -181,9 +182,43 @@ TEST_F(MemberLimits, LetTheGroupListHave254Characters)
     EXPECT_EQ(log.remarks().back(), "outputBuffer: ");
 }
 
-TEST_F(MemberLimits, LetTheQuotedMemberHave254Characters)
+TEST_F(MemberLimits, LetAMemberOf200GroupsJoinOneMore)
 {
-    std::string const longest(252, 'x');
+    std::string identity = "uid=1000(jdoe) gid=100(users) groups=100(users)";
+    std::string list = "users,\"users\",";
+    for (int group = 1001; group < 1201; ++group) {
+        std::string const name = "project" + std::to_string(group);
+        identity += "," + std::to_string(group) + "(" + name + ")";
+        list += "\"" + name + "\",";
+    }
+    commands_.answers[idLine_] = identity + "\n";
+    EXPECT_EQ(execute("LocalGroupAddUser",
+                      {text("LocalGroupName", "g"), text("DomainAndMember", "jdoe")}),
+              0);
+    EXPECT_EQ(commands_.ran,
+              (Lines{idLine_, "/usr/sbin/usermod -G " + list + "\"g\" \"jdoe\" 2>&1"}));
+}
+
+TEST_F(MemberLimits, KeepAMemberInGroupsThatIdHadNoRoomFor)
+{
+    // One byte more would be cut off, and with it a group that usermod then takes away.
+    std::string const ends = "uid=1000(jdoe) gid=100(users) groups=27()\n";
+    std::string const names(4999 - ends.size(), 'x');
+    prepare(names);
+    Recording const log;
+    EXPECT_EQ(execute("LocalGroupDelUser", params_), 1);
+    EXPECT_EQ(commands_.ran, Lines{idLine_});
+    EXPECT_EQ(log.texts(6000), Lines{"Output too long: /usr/bin/id"});
+
+    prepare(names.substr(1));
+    EXPECT_EQ(execute("LocalGroupDelUser", params_), 0);
+    EXPECT_EQ(commands_.ran.size(), 2U);
+}
+
+TEST_F(MemberLimits, AreTheRunnersBufferForTheMember)
+{
+    std::string const ends = "/usr/bin/id \"\" 2>&1";
+    std::string const longest(4999 - ends.size(), 'x');
     execute("LocalGroupAddUser", {text("LocalGroupName", "g"), text("DomainAndMember", longest)});
     EXPECT_EQ(commands_.ran, Lines{"/usr/bin/id \"" + longest + "\" 2>&1"});
     expectRefused("LocalGroupAddUser",

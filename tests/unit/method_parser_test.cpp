@@ -286,25 +286,6 @@ TEST(MethodParser, TokenizesTheTextAndThenEachItem)
                 "paramInfo.name=UserName", "paramInfo.type=CMPI_string", "paramInfo.value=jdoe"}));
 }
 
-TEST(MethodParser, LogsNoTokenOfACallThatCarriesAPasswordAndNotItsValue)
-{
-    Recording const log;
-    Parsed const parsed("UserSetPassword,UserName:CMPI_string:jdoe,Password:CMPI_string:Zq7Wx9");
-    EXPECT_EQ(parsed.params, (Texts{"UserName|CMPI_string|jdoe", "Password|CMPI_string|Zq7Wx9"}));
-    EXPECT_EQ(log.texts(),
-              inside({"Tokenize: entry", "Tokenize: exit", "method=UserSetPassword",
-                      "Tokenize: entry", "Tokenize: exit", "paramInfo.name=UserName",
-                      "paramInfo.type=CMPI_string", "paramInfo.value=jdoe", "Tokenize: entry",
-                      "Tokenize: exit", "paramInfo.name=Password", "paramInfo.type=CMPI_string"}));
-}
-
-TEST(MethodParser, KeepsOnlyTheParameterNamedExactlyPasswordFromTheLog)
-{
-    EXPECT_EQ(said("UserSetAttrib,daysMustKeepPassword:CMPI_uint32:3"),
-              inside({"method=UserSetAttrib", "paramInfo.name=daysMustKeepPassword",
-                      "paramInfo.type=CMPI_uint32", "paramInfo.value=3"}));
-}
-
 TEST(MethodParser, RejectsAnUnknownTypeAlsoWithoutAValueAndKnowsTypesExactly)
 {
     for (char const* type :

@@ -119,7 +119,7 @@ void act(MutableNode const& node, unsigned int id, PropertyValue const& value, c
         break;
     case NODES::deleteUser:
         if (static_cast<unsigned int>(value) == 1)
-            userInfo().setDelete(textOf(node, NODES::id)); // kept: by id, hosts rely on it
+            userInfo().setDelete(textOf(node, NODES::id)); // Contract: by id, not by name
         break;
     default:
         break;
@@ -142,7 +142,7 @@ UserNode::~UserNode()
 
 Error UserNode::getProperty(unsigned int id, PropertyValue& value) const
 {
-    // Kept: the messages name the class twice; hosts rely on it.
+    // Contract: the messages name the class twice, which log filters of hosts expect.
     NQ::LOG::Scope const scope(OSSWMI::unit, {"UserNode::UserNode"});
     if (id != NODES::elementCount)
         return MutableNode::getProperty(id, value);

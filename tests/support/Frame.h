@@ -74,6 +74,21 @@ public:
     std::vector<IC::Node*> deleted;
 };
 
+/** A node that has another id each time it is asked: 101, 102 and so on. */
+class Counter : public IC::MutableNode
+{
+public:
+    Counter() : MutableNode(100, 0, {7}, NODES::operatingSystemType, 0) {}
+
+    unsigned int getNodeId() const override
+    {
+        return ++id_;
+    }
+
+private:
+    mutable unsigned int id_ = 100;
+};
+
 /** A stored property as shown() writes it; "unset" where there is none. */
 inline std::string storedValue(IC::Node const& node, unsigned int id)
 {

@@ -121,6 +121,12 @@ int realUname(struct utsname* system)
     return real(system);
 }
 
+std::time_t realMktime(std::tm* fields)
+{
+    static auto* const real = next<std::time_t(std::tm*)>("mktime");
+    return real(fields);
+}
+
 void refuse(std::string const& command)
 {
     hooks().popen = [command](char const* asked, char const* mode) -> FILE* {
@@ -278,6 +284,11 @@ time_t time(time_t* out) noexcept
     if (out)
         *out = now;
     return now;
+}
+
+time_t mktime(std::tm* fields) noexcept
+{
+    return hooks().mktime ? hooks().mktime(fields) : libc::realMktime(fields);
 }
 
 void setgrent()

@@ -42,6 +42,7 @@ struct Hooks {
         fgetspent_r;
     std::function<char*(char* buffer, int size, FILE* stream)> fgets;
     std::function<std::time_t()> time;
+    std::function<std::time_t(std::tm* fields)> mktime;
     std::function<void()> setgrent;
     std::function<struct group*()> getgrent;
     std::function<void()> endgrent;
@@ -60,6 +61,7 @@ int realFgetspent_r(FILE* stream, struct spwd* entry, char* buffer, std::size_t 
                     struct spwd** found);
 char* realFgets(char* buffer, int size, FILE* stream);
 int realUname(struct utsname* system);
+std::time_t realMktime(std::tm* fields);
 
 /** From now on this command, and it alone, cannot be started: popen yields null. */
 void refuse(std::string const& command);

@@ -1,5 +1,6 @@
 #include "util/MyProcess.h"
 
+#include "tests/support/Libc.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 
@@ -213,6 +214,26 @@ TEST(ToTimeT, ConvertsInTwoThreadsAtOnce)
     one.join();
     other.join();
     EXPECT_EQ(wrong, 0);
+}
+
+TEST(DateConversion, PassesEveryFieldButTheDayOfTheYearToMktime)
+{
+    libc::HookGuard const guard;
+    std::tm passed{};
+    libc::hooks().mktime = [&passed](std::tm* fields) {
+        passed = *fields;
+        return time_t{1};
+    };
+    char month[] = "Mar";
+    EXPECT_EQ(NQ::to_time_t(2010, month, 12, 5, 10, 23, 45, 1), 1);
+    EXPECT_EQ(passed.tm_year, 110);
+    EXPECT_EQ(passed.tm_mon, 2);
+    EXPECT_EQ(passed.tm_mday, 12);
+    EXPECT_EQ(passed.tm_wday, 5);
+    EXPECT_EQ(passed.tm_hour, 10);
+    EXPECT_EQ(passed.tm_min, 23);
+    EXPECT_EQ(passed.tm_sec, 45);
+    EXPECT_EQ(passed.tm_isdst, 1);
 }
 
 } // namespace

@@ -14,6 +14,7 @@
 #include <new>
 #include <string>
 #include <typeinfo>
+#include <utility>
 #include <vector>
 
 namespace
@@ -381,6 +382,17 @@ TEST_F(GroupNodes, SpeakFromTheLineOnWhichEachMessageStands)
                     << record.text << " from line " << record.line;
             }
     EXPECT_EQ(found, 2 * (1 + 2 + 2)); // both operations; two groups
+}
+
+TEST_F(GroupNodes, AskTheirParentForItsIdOnceEach)
+{
+    Counter parent;
+    IC::MutableNode* const real = std::exchange(frame.osNode_, &parent);
+    frame.createGroupNodes(false);
+    frame.osNode_ = real;
+    ASSERT_EQ(groups().size(), 2U);
+    EXPECT_EQ(groups()[0]->getLinkedId(), 101U);
+    EXPECT_EQ(groups()[1]->getLinkedId(), 102U);
 }
 
 } // namespace

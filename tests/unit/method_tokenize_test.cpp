@@ -1,5 +1,6 @@
 #include "util/MyProcess.h"
 
+#include "sysdata/groupInfo_linux.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
@@ -99,6 +100,48 @@ TEST(Tokenize, LogsATextThatHoldsPasswordInLowerCaseOnly)
     Recording const log;
     tokens("password", ",");
     EXPECT_EQ(log.remarks(), Texts{"str.substr(lastPos, pos - lastPos) = password"});
+}
+
+/** How many tokens the list holds when each of them is logged. */
+class CountAtLog : public mihost::LogSink
+{
+public:
+    explicit CountAtLog(Texts const& tokens) : tokens_(tokens)
+    {
+        mihost::setLogSink(this);
+    }
+    ~CountAtLog() override
+    {
+        mihost::setLogSink(nullptr);
+    }
+
+    void write(mihost::LogMessage const& message) override
+    {
+        if (message.operation == mihost::LogMessage::Operation::Log &&
+            std::string(message.text).rfind("str.substr", 0) == 0)
+            counts.push_back(tokens_.size());
+    }
+
+    std::vector<std::size_t> counts;
+
+private:
+    Texts const& tokens_;
+};
+
+TEST(Tokenize, LogsEachTokenBeforeItAppendsIt)
+{
+    Texts found;
+    CountAtLog const log(found);
+    NQ::Tokenize("one,two", found, ",");
+    EXPECT_EQ(log.counts, (std::vector<std::size_t>{0, 1}));
+}
+
+TEST(GroupTokenize, AppendsEachPieceBeforeItLogsIt)
+{
+    Texts found;
+    CountAtLog const log(found);
+    NQ::groupInfo().Tokenize("one,two", found, ",");
+    EXPECT_EQ(log.counts, (std::vector<std::size_t>{1, 2}));
 }
 
 } // namespace

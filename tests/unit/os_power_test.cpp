@@ -5,8 +5,10 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdio>
 #include <ostream>
 #include <string>
+#include <unistd.h>
 #include <vector>
 
 namespace
@@ -63,6 +65,21 @@ TEST_P(OsInfoPower, ClosesThePipeAndReadsNeitherOutputNorStatus)
     EXPECT_TRUE((OsInfo().*GetParam().act)());
     EXPECT_EQ(commands_.ran, std::vector<std::string>{GetParam().command});
     EXPECT_EQ(commands_.open, 0);
+}
+
+TEST_P(OsInfoPower, TakesNothingOutOfTheCommandsPipe)
+{
+    FILE* const output = std::tmpfile();
+    std::fputs("shutdown: Permission denied\n", output);
+    std::rewind(output);
+    libc::hooks().popen = [&](char const*, char const*) { return output; };
+    long read = -1;
+    libc::hooks().pclose = [&read](FILE* stream) {
+        read = lseek(fileno(stream), 0, SEEK_CUR);
+        return std::fclose(stream);
+    };
+    EXPECT_TRUE((OsInfo().*GetParam().act)());
+    EXPECT_EQ(read, 0);
 }
 
 } // namespace

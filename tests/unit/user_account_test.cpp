@@ -195,6 +195,17 @@ TEST_P(AgeingOperation, ReadsADateWithoutLeadingZerosOrTimeOfDay)
     EXPECT_EQ(commands_.ran.back(), ageLine("10"));
 }
 
+TEST_P(AgeingOperation, ReadsTwoDigitsOfMonthAndDay)
+{
+    answerListing("Jan 01, 2008");
+    set("2008-01-111"); // the 11th
+    EXPECT_EQ(commands_.ran.back(), ageLine("10"));
+    set("2008-123-1"); // December, and no day: the last of November
+    EXPECT_EQ(commands_.ran.back(), ageLine("334"));
+    set("20081-01-1"); // the year 2008 alone: no month counts as January, no day as the day before
+    EXPECT_EQ(commands_.ran.back(), ageLine("99999"));
+}
+
 TEST_P(AgeingOperation, RunsNothingWhereTheListingDoesNotFitItsBufferOf1024Bytes)
 {
     EXPECT_FALSE(set("2008-01-11 00:00:00", std::string(1024 - 9, 'x')));

@@ -16,6 +16,7 @@
 #include <pwd.h>
 #include <shadow.h>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace
@@ -355,6 +356,48 @@ TEST_F(UserListing, AllowsNoFailuresWhereTheRulesDoNotSayHowMany)
         files_.write("/etc/pam.d/login", rules);
         for (userInfo& user : list())
             EXPECT_EQ(user.getMaxLoginFailures(), 0) << rules;
+    }
+}
+
+TEST_F(UserListing, StartsTheFailuresAtZeroForEachUser)
+{
+    files_.write("/etc/passwd", account("jdoe", 1000) + account("mary", 1001));
+    files_.write("/etc/pam.d/login", "deny=4\n");
+    for (userInfo& user : list())
+        EXPECT_EQ(user.getMaxLoginFailures(), 4);
+    files_.write("/etc/pam.d/login", "auth required pam_unix.so\n");
+    for (userInfo& user : list())
+        EXPECT_EQ(user.getMaxLoginFailures(), 0);
+    files_.remove("/etc/pam.d/login");
+    for (userInfo& user : list())
+        EXPECT_EQ(user.getMaxLoginFailures(), 0);
+
+    // The rules change while the accounts are read: the second user has none.
+    bool first = true;
+    auto const below = libc::hooks().fopen;
+    libc::hooks().fopen = [&](char const* path, char const* mode) {
+        if (path == std::string("/etc/pam.d/login"))
+            files_.write(path, std::exchange(first, false) ? "deny=4\n" : "none\n");
+        return below(path, mode);
+    };
+    std::vector<userInfo> users = list();
+    ASSERT_EQ(users.size(), 2U);
+    EXPECT_EQ(users[0].getMaxLoginFailures(), 4);
+    EXPECT_EQ(users[1].getMaxLoginFailures(), 0);
+}
+
+TEST_F(UserListing, ReadsTheFailuresAsADecimalNumber)
+{
+    files_.write("/etc/passwd", account("jdoe", 1000));
+    for (auto const& [rule, failures] : {std::pair{"deny=010", 10L},
+                                         {"deny=0x10", 0L},
+                                         {"deny=-3", -3L},
+                                         {"deny= 5", 5L},
+                                         {"deny=7x", 7L}}) {
+        files_.write("/etc/pam.d/login", std::string("deny=99\n") + rule + "\n");
+        std::vector<userInfo> users = list();
+        ASSERT_EQ(users.size(), 1U);
+        EXPECT_EQ(users[0].getMaxLoginFailures(), failures) << rule;
     }
 }
 

@@ -15,6 +15,7 @@
 #include <new>
 #include <string>
 #include <typeinfo>
+#include <utility>
 #include <vector>
 
 namespace
@@ -442,6 +443,28 @@ TEST_F(UserNodes, SpeakOfAReadForTheFrame)
         EXPECT_EQ(record.file, "OsSwMI");
         EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
     }
+}
+
+TEST_F(UserNodes, CountTheDigitsOfTheirIdApartFromTheirName)
+{
+    files.write("/etc/passwd", account("christopher", 1000) + account("jo", 50001));
+    frame.createUserNodes(false);
+    ASSERT_EQ(users().size(), 2U);
+    EXPECT_EQ(storedValue(*users()[0], 109), "number 11 true");
+    EXPECT_EQ(storedValue(*users()[0], 90), "number 4 true");
+    EXPECT_EQ(storedValue(*users()[1], 109), "number 2 true");
+    EXPECT_EQ(storedValue(*users()[1], 90), "number 5 true");
+}
+
+TEST_F(UserNodes, AskTheirParentForItsIdOnceEach)
+{
+    Counter parent;
+    IC::MutableNode* const real = std::exchange(frame.osNode_, &parent);
+    frame.createUserNodes(false);
+    frame.osNode_ = real;
+    ASSERT_EQ(users().size(), 3U);
+    for (unsigned int i = 0; i < 3; ++i)
+        EXPECT_EQ(users()[i]->getLinkedId(), 101 + i);
 }
 
 } // namespace

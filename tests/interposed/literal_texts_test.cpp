@@ -1,0 +1,64 @@
+// Which text properties are made of literals, and which of texts.
+
+#include "tests/interposed/StandIns.h"
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Frame.h"
+
+#include <gtest/gtest.h>
+
+#include <sys/utsname.h>
+
+namespace
+{
+
+using Lines = std::vector<std::string>;
+
+class LiteralTexts : public testing::Test
+{
+protected:
+    LiteralTexts()
+    {
+        standIns() = {};
+    }
+
+    /** Property 108 of the computer's node on a machine of this name. */
+    std::string computerName(std::string const& name)
+    {
+        libc::hooks().uname = [name](utsname* system) {
+            *system = {};
+            name.copy(system->nodename, sizeof system->nodename - 1);
+            return 0;
+        };
+        frame_.createOsSwNodes();
+        frame_.createRootNode();
+        frame_.createComputerNodes();
+        libc::hooks().uname = nullptr;
+        return storedValue(*frame_.currentNode_, 108);
+    }
+
+    FakeFiles const files_;
+    Frame frame_;
+};
+
+TEST_F(LiteralTexts, TheComputersNameIsNone)
+{
+    EXPECT_EQ(computerName("harbour"), "text harbour true");
+    EXPECT_EQ(standIns().literals, Lines());
+}
+
+TEST_F(LiteralTexts, AnEmptyComputersNameIsSetAndIsNone)
+{
+    EXPECT_EQ(computerName(""), "text  true");
+    EXPECT_EQ(standIns().literals, Lines());
+}
+
+TEST_F(LiteralTexts, Property113OfAUserIsTheOnlyOne)
+{
+    files_.write("/etc/passwd", "anna:x:1000:100::/home/anna:/bin/sh\n");
+    frame_.createUserNodes(false);
+    EXPECT_EQ(standIns().literals, Lines{""});
+    EXPECT_EQ(storedValue(*frame_.currentNode_, 113), "text  true");
+    EXPECT_EQ(storedValue(*frame_.currentNode_, 312), "text  true");
+}
+
+} // namespace

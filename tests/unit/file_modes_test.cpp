@@ -1,0 +1,122 @@
+// The mode in which each file is opened, whatever it is opened for.
+
+#include "sysdata/groupInfo_linux.h"
+#include "sysdata/logInfo_linux.h"
+#include "sysdata/minMaxId.h"
+#include "sysdata/osInfo_linux.h"
+#include "sysdata/userInfo_linux.h"
+#include "tests/support/FakeFiles.h"
+
+#include <gtest/gtest.h>
+
+#include <functional>
+#include <set>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+using Opened = std::set<std::string>;
+
+/** A machine with every file that is probed; notes path and mode of each that is opened. */
+class FileModes : public testing::Test
+{
+protected:
+    FileModes()
+    {
+        files_.write("/etc/passwd", "jdoe:x:0:0::/home/jdoe:/bin/sh\n");
+        files_.write("/etc/shadow", "jdoe:*:14000::::::\n");
+        files_.write("/etc/group", "root:x:0:\n");
+        files_.write("/etc/pam.d/login", "deny=3\n");
+        files_.write("/var/log/messages", "line\n");
+        NQ::minMaxId::Instance(); // has read its file now
+        commands_.otherwise = "";
+        auto const below = libc::hooks().fopen;
+        libc::hooks().fopen = [this, below](char const* path, char const* mode) {
+            if (noting_)
+                opened_.insert(std::string(path) + "|" + mode);
+            return below(path, mode);
+        };
+    }
+
+    /** What is opened while the operations run. */
+    Opened openedBy(std::function<void()> const& operations)
+    {
+        opened_.clear();
+        noting_ = true;
+        operations();
+        noting_ = false;
+        return opened_;
+    }
+
+    void searchReleaseFiles()
+    {
+        long date = 0;
+        std::string version;
+        info_.getInstallDate(date);
+        info_.getOSVersion(version);
+    }
+
+    void haveReleaseFiles()
+    {
+        for (char const* path : {"/etc/SuSE-release", "/etc/UnitedLinux-release",
+                                 "/etc/redhat-release", "/etc/vmware-release"})
+            files_.write(path, "");
+    }
+
+    FakeFiles const files_;
+    libc::FakeCommands commands_;
+    bool noting_ = false;
+    Opened opened_;
+    NQ::OsInfo info_;
+};
+
+TEST_F(FileModes, OfTheListingsAreThreeKinds)
+{
+    auto const list = [this] {
+        std::vector<NQ::userInfo> users;
+        NQ::getUserInfo(users);
+        std::vector<NQ::groupInfo> groups;
+        NQ::getGroupInfo(groups);
+        unsigned int count = 0;
+        info_.getUserCount(count);
+    };
+    EXPECT_EQ(openedBy(list), (Opened{"/etc/passwd|ro", "/etc/shadow|ro", "/etc/pam.d/login|r"}));
+}
+
+TEST_F(FileModes, OfASearchForReleaseFilesIsReading)
+{
+    auto const search = [this] {
+        searchReleaseFiles();
+        char user[] = "jdoe";
+        NQ::userInfo().findIsAcctDisabled(user);
+    };
+    EXPECT_EQ(openedBy(search),
+              (Opened{"/etc/SuSE-release|r", "/etc/UnitedLinux-release|r", "/etc/redhat-release|r",
+                      "/etc/release|r", "/etc/vmware-release|r"}));
+}
+
+TEST_F(FileModes, OfFoundReleaseFilesIsReading)
+{
+    haveReleaseFiles();
+    EXPECT_EQ(openedBy([this] { searchReleaseFiles(); }),
+              (Opened{"/etc/release|r", "/etc/SuSE-release|r", "/etc/UnitedLinux-release|r"}));
+}
+
+TEST_F(FileModes, OfTheProbesOfMethodsIsReading)
+{
+    auto const probe = [this] {
+        bool shadowing = false;
+        info_.executeMethod("UserAdd", {{"UserName", "CMPI_string", "jdoe"}}, shadowing);
+        info_.executeMethod("GetShadowing", {}, shadowing);
+    };
+    EXPECT_EQ(openedBy(probe), (Opened{"/etc/redhat-release|r", "/etc/shadow|r"}));
+}
+
+TEST_F(FileModes, OfTheLogThatIsClearedIsWriting)
+{
+    EXPECT_EQ(openedBy([] { NQ::logInfo().clearLog(); }), Opened{"/var/log/messages|w"});
+}
+
+} // namespace

@@ -4,10 +4,12 @@
 #include "mihost/sandbox/Descriptor.h"
 #include "mihost/sandbox/Failure.h"
 #include "mihost/sandbox/MountTable.h"
+#include "mihost/sandbox/Self.h"
 
 #include <cstdlib>
 #include <fcntl.h>
 #include <fstream>
+#include <sched.h>
 #include <sstream>
 #include <sys/mount.h>
 #include <sys/stat.h>
@@ -159,13 +161,57 @@ void addKernelFileSystems()
         bind(path, path);
         makeReadOnly(path);
     }
-    bind("/sys", copyRoot + "/sys", MS_REC);
-    makeReadOnly(copyRoot + "/sys");
+    if (access("/sys", F_OK) == 0) {
+        bind("/sys", copyRoot + "/sys", MS_REC);
+        makeReadOnly(copyRoot + "/sys");
+    }
 }
 
-void makeRoot(std::string const& root)
+Descriptor openRoot(std::string const& path)
 {
-    check(chdir(root.c_str()), "cannot enter the copy");
+    return Descriptor(
+        check(open(path.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC), "cannot open " + path));
+}
+
+void changeRoot(Descriptor const& root)
+{
+    check(fchdir(root.get()), "cannot enter a root");
+    check(chroot("."), "cannot change the root");
+}
+
+/**
+ * Keeps what is mounted from now on from the machine.
+ *
+ * The caller's root need not be a mount point: it may be any directory, as in a chroot. So the root
+ * of the whole mount namespace is taken, and with it every mount.
+ *
+ * @return that root
+ */
+Descriptor keepMountsPrivate()
+{
+    Descriptor const ownRoot = openRoot("/");
+    check(setns(openSelf().get(), CLONE_NEWNS), "cannot enter the root of all mounts");
+    Descriptor top = openRoot("/");
+    check(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr), "cannot keep mounts private");
+    changeRoot(ownRoot);
+    return top;
+}
+
+/** From a /proc of its own: the machine's may be missing, as in a chroot. */
+std::string readMountTable()
+{
+    mountAt(stage, "proc", MS_NOSUID | MS_NODEV | MS_NOEXEC, "");
+    std::string table = readText(stage + "/self/mountinfo");
+    check(umount2(stage.c_str(), MNT_DETACH), "cannot leave " + stage);
+    return table;
+}
+
+/** @param top  the root of all mounts: only from there another one can take its place */
+void makeRoot(std::string const& root, Descriptor const& top)
+{
+    Descriptor const copy = openRoot(root);
+    changeRoot(top);
+    check(fchdir(copy.get()), "cannot enter the copy");
     check(syscall(SYS_pivot_root, ".", "."), "cannot make the copy the root");
     check(umount2(".", MNT_DETACH), "cannot leave the machine's own files");
     check(chdir("/"), "cannot enter the copy");
@@ -178,9 +224,9 @@ void enterMachineCopy()
     char* const there = getcwd(nullptr, 0);
     std::string const workingDirectory = there ? there : "/";
     std::free(there);
-    std::vector<std::string> const mounts = mountsToCopy(readText("/proc/self/mountinfo"));
 
-    check(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr), "cannot keep mounts private");
+    Descriptor const top = keepMountsPrivate();
+    std::vector<std::string> const mounts = mountsToCopy(readMountTable());
     mountAt(stage, "tmpfs", MS_NODEV, "mode=0700");
     makeFolder(copyRoot, 0755);
     Overlays overlays;
@@ -192,7 +238,7 @@ void enterMachineCopy()
     addKernelFileSystems();
     addDevices();
     mountAt(copyRoot + "/run", "tmpfs", MS_NOSUID | MS_NODEV, "mode=0755");
-    makeRoot(copyRoot);
+    makeRoot(copyRoot, top);
     if (chdir(workingDirectory.c_str()) != 0)
         check(chdir("/"), "cannot enter the copy");
 }

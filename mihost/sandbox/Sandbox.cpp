@@ -7,6 +7,7 @@
 #include "mihost/sandbox/MachineCopy.h"
 #include "mihost/sandbox/Power.h"
 #include "mihost/sandbox/Relay.h"
+#include "mihost/sandbox/Self.h"
 
 #include <cstdio>
 #include <fcntl.h>
@@ -58,8 +59,7 @@ std::string readToEnd(Descriptor const& from)
 /** The child is the first process of a process namespace; later children are not in it. */
 pid_t forkFirstProcess()
 {
-    Descriptor const own(
-        check(open("/proc/self/ns/pid", O_RDONLY | O_CLOEXEC), "cannot read /proc"));
+    Descriptor const own = openSelf();
     check(unshare(CLONE_NEWPID), "cannot have a process namespace");
     pid_t const child = fork();
     int const problemOfFork = errno;

@@ -1,0 +1,119 @@
+// A copy of a machine whose root is no mount point but any directory, as chroot(8) makes it.
+
+#include "tests/sandbox/border/Caller.h"
+#include "tests/support/Lines.h"
+#include "tests/support/ScratchFolder.h"
+
+#include <filesystem>
+#include <fstream>
+#include <sched.h>
+#include <sys/mount.h>
+#include <sys/stat.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace
+{
+
+class Chroot : public BorderTest
+{
+protected:
+    /** A machine with nothing in it but empty directories and one file. */
+    void SetUp() override
+    {
+        BorderTest::SetUp();
+        for (char const* name : {"proc", "sys", "dev", "run", "tmp", "sbin"})
+            std::filesystem::create_directory(root_.path(name));
+        root_.write("etc/file", "before");
+    }
+
+    void enter() const
+    {
+        if (chroot(root_.name().c_str()) != 0 || chdir("/etc") != 0)
+            _exit(1);
+    }
+
+    ScratchFolder const root_;
+};
+
+TEST_F(Chroot, IsCopiedOnWrite)
+{
+    Caller caller(
+        [] {
+            char path[4096] = "";
+            Caller::say(getcwd(path, sizeof path) ? path : "none");
+            Caller::say(contentOf("file"));
+            std::ofstream("/etc/file") << "after";
+            std::ofstream("/tmp/new") << "new";
+            Caller::say(contentOf("/etc/file") + contentOf("/tmp/new"));
+            return exists("/proc/1/stat") && exists("/sbin/shutdown") ? 0 : 1;
+        },
+        "", [this] { enter(); });
+    EXPECT_EQ(caller.hearAll(), "/etcbeforeafternew");
+    EXPECT_EQ(caller.wait(), 0);
+    EXPECT_EQ(contentOf(root_.path("etc/file")), "before");
+    EXPECT_FALSE(exists(root_.path("tmp/new")));
+    EXPECT_FALSE(exists(root_.path("sbin/shutdown")));
+}
+
+TEST_F(Chroot, IsCopiedWithWhatIsMountedInIt)
+{
+    std::filesystem::create_directory(root_.path("disk"));
+    Caller caller(
+        [] {
+            Caller::say(contentOf("/disk/file"));
+            std::ofstream("/disk/file") << "after";
+            return contentOf("/disk/file") == "after" ? 0 : 1;
+        },
+        "",
+        [this] {
+            if (unshare(CLONE_NEWNS) != 0 ||
+                mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0 ||
+                mount("tmpfs", root_.path("disk").c_str(), "tmpfs", 0, "") != 0)
+                _exit(1);
+            root_.write("disk/file", "before");
+            enter();
+            // The machine, from here on, is what this process sees; it looks once all is over.
+            if (pid_t const child = fork()) {
+                int status = 0;
+                waitpid(child, &status, 0);
+                Caller::say(" " + contentOf("/disk/file"));
+                _exit(WEXITSTATUS(status));
+            }
+        });
+    EXPECT_EQ(caller.hearAll(), "before before");
+    EXPECT_EQ(caller.wait(), 0);
+}
+
+TEST_F(Chroot, LeavesTheMountsOfTheMachineAsTheyAre)
+{
+    std::string const before = contentOf("/proc/self/mountinfo");
+    Caller caller(
+        []() -> int {
+            Caller::say(".");
+            for (;;)
+                pause();
+        },
+        "", [this] { enter(); });
+    ASSERT_EQ(caller.hear(1), ".");
+    EXPECT_EQ(contentOf("/proc/self/mountinfo"), before);
+}
+
+TEST_F(Chroot, IsNotLeftByTheCopy)
+{
+    // Nothing of the file system around the directory is in the copy, whichever way is tried.
+    Caller caller(
+        [] {
+            std::filesystem::create_directory("/tmp/deep");
+            if (chroot("/tmp/deep") != 0)
+                return 1;
+            for (int level = 0; level < 100; ++level)
+                if (chdir("..") != 0)
+                    return 1;
+            return exists("etc/file") && !exists("etc/passwd") ? 0 : 1;
+        },
+        "", [this] { enter(); });
+    EXPECT_EQ(caller.wait(), 0);
+}
+
+} // namespace

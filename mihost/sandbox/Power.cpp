@@ -6,10 +6,7 @@
 
 #include <fcntl.h>
 #include <fstream>
-#include <linux/capability.h>
-#include <sys/prctl.h>
 #include <sys/stat.h>
-#include <sys/syscall.h>
 #include <unistd.h>
 
 namespace mihost
@@ -17,15 +14,6 @@ namespace mihost
 
 namespace
 {
-
-constexpr unsigned int machinePrivileges[] = {
-    CAP_SYS_BOOT,   // power off, restart, load another kernel
-    CAP_SYS_MODULE, // load and unload kernel modules
-    CAP_SYS_TIME,   // set the clock
-    CAP_SYS_RAWIO,  // ports and memory of the hardware
-    CAP_MKNOD,      // a device file of one's own making
-    CAP_NET_ADMIN,  // interfaces, routes, packet filters: the network is the machine's
-};
 
 char const* const notes = "/run/power-commands";
 
@@ -46,22 +34,6 @@ void replace(std::string const& path)
 }
 
 } // namespace
-
-void dropMachinePrivileges()
-{
-    __user_cap_header_struct header{_LINUX_CAPABILITY_VERSION_3, 0};
-    __user_cap_data_struct data[_LINUX_CAPABILITY_U32S_3]{};
-    check(syscall(SYS_capget, &header, data), "cannot read the privileges");
-    for (unsigned int const privilege : machinePrivileges) {
-        check(prctl(PR_CAPBSET_DROP, privilege, 0, 0, 0), "cannot drop a privilege");
-        __user_cap_data_struct& word = data[CAP_TO_INDEX(privilege)];
-        unsigned int const kept = ~CAP_TO_MASK(privilege);
-        word.effective &= kept;
-        word.permitted &= kept;
-        word.inheritable &= kept;
-    }
-    check(syscall(SYS_capset, &header, data), "cannot drop privileges");
-}
 
 void replacePowerCommands()
 {

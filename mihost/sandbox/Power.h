@@ -4,9 +4,6 @@
 namespace mihost
 {
 
-/** Takes away for good what reaches past a copy of the machine to the machine itself. */
-void dropMachinePrivileges();
-
 /** Puts a command that only says and notes what it was asked for in place of the power commands. */
 void replacePowerCommands();
 

@@ -5,7 +5,9 @@
 #include "mihost/sandbox/Failure.h"
 #include "mihost/sandbox/LayOver.h"
 #include "mihost/sandbox/MachineCopy.h"
+#include "mihost/sandbox/Network.h"
 #include "mihost/sandbox/Power.h"
+#include "mihost/sandbox/Privileges.h"
 #include "mihost/sandbox/Relay.h"
 #include "mihost/sandbox/Self.h"
 
@@ -80,11 +82,14 @@ void dieWithTheCaller(Descriptor const& report)
 
 void makeSandbox(Descriptor const& overlay)
 {
-    check(unshare(CLONE_NEWNS | CLONE_NEWIPC | CLONE_NEWUTS), "cannot have namespaces");
+    check(unshare(CLONE_NEWNS | CLONE_NEWIPC | CLONE_NEWUTS | CLONE_NEWNET),
+          "cannot have namespaces");
+    startLoopback();
     enterMachineCopy();
     if (overlay)
         layOver(overlay);
     replacePowerCommands();
+    refuseKernelsRecords();
     dropMachinePrivileges();
 }
 

@@ -17,11 +17,12 @@ namespace mihost
  * the child ends, by its exit code or its signal, without any exit handlers; by then nothing is
  * left of the copy. Should it be killed, everything in the copy dies with it.
  *
- * The copy has its own mounts, processes, IPC objects and host name; a fresh /proc, an empty /run,
- * a /dev with the harmless devices only and a read-only /sys. Powering off, loading modules,
- * setting the clock, changing the network and reaching hardware are not permitted there, and the
- * power commands are replaced by one that only says what it would do. This guards against what
- * commands do by their nature; it is no prison for hostile ones.
+ * The copy has its own mounts, processes, IPC objects, host name and network; a fresh /proc, an
+ * empty /run, a /dev with the harmless devices only and a read-only /sys. Powering off, loading
+ * modules, setting the clock, reaching hardware and the kernel's log and audit records are not
+ * permitted there, and the power commands are replaced by one that only says what it would do. This
+ * guards against what commands do by their nature; it is not a security boundary against hostile
+ * commands.
  *
  * Call it before any thread is started. Needs CAP_SYS_ADMIN, as root has it. An unprivileged user
  * namespace is no way round: it may not overlay / and knows no accounts to change.

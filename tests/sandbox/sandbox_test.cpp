@@ -10,10 +10,13 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <linux/capability.h>
+#include <linux/netlink.h>
 #include <sched.h>
 #include <set>
 #include <signal.h>
+#include <sys/klog.h>
 #include <sys/prctl.h>
+#include <sys/socket.h>
 #include <sys/stat.h>
 #include <sys/syscall.h>
 #include <sys/wait.h>
@@ -112,12 +115,42 @@ TEST_P(Privilege, IsGoneFromEverySet)
 
 INSTANTIATE_TEST_SUITE_P(All, Privilege,
                          testing::Values(CAP_SYS_BOOT, CAP_SYS_MODULE, CAP_SYS_TIME, CAP_SYS_RAWIO,
-                                         CAP_MKNOD, CAP_NET_ADMIN));
+                                         CAP_MKNOD, CAP_NET_ADMIN, CAP_AUDIT_WRITE,
+                                         CAP_AUDIT_CONTROL, CAP_AUDIT_READ, CAP_SYSLOG,
+                                         CAP_SYS_PACCT, CAP_SYS_TTY_CONFIG, CAP_MAC_ADMIN,
+                                         CAP_MAC_OVERRIDE, CAP_WAKE_ALARM, CAP_BLOCK_SUSPEND,
+                                         CAP_BPF, CAP_PERFMON));
+
+TEST(Copy, DoesNotReachTheKernelsLog)
+{
+    constexpr int readAll = 3;
+    constexpr int clear = 5;
+    char text[16] = "";
+    EXPECT_EQ(klogctl(readAll, text, sizeof text), -1);
+    EXPECT_EQ(errno, EPERM);
+    EXPECT_EQ(klogctl(clear, nullptr, 0), -1);
+    EXPECT_EQ(errno, EPERM);
+}
+
+TEST(Copy, LooksLikeAMachineWithoutAuditing)
+{
+    EXPECT_EQ(socket(AF_NETLINK, SOCK_RAW, NETLINK_AUDIT), -1);
+    EXPECT_EQ(errno, EAFNOSUPPORT);
+    EXPECT_EQ(socket(AF_NETLINK, SOCK_RAW | SOCK_CLOEXEC, NETLINK_AUDIT), -1);
+    EXPECT_EQ(errno, EAFNOSUPPORT);
+    EXPECT_GE(socket(AF_NETLINK, SOCK_RAW, NETLINK_ROUTE), 0);
+}
+
+TEST(Copy, LetsACommandBecomeAnotherUser)
+{
+    EXPECT_EQ(std::system("su -s /bin/sh -c 'test $(id -un) = nobody' nobody"), 0);
+}
 
 TEST(Copy, LetsRootAdministerItAllTheSame)
 {
     EXPECT_EQ(std::system("useradd -m jdoe && chage -M 90 jdoe && echo jdoe:pw | chpasswd && "
-                          "groupadd staffers && usermod -G staffers jdoe && userdel -r jdoe"),
+                          "printf 'pw\\npw\\n' | passwd jdoe && groupadd staffers && usermod -G "
+                          "staffers jdoe && userdel -r jdoe"),
               0);
 }
 

@@ -9,10 +9,14 @@
 #include <cstdio>
 #include <fcntl.h>
 #include <fstream>
+#include <net/if.h>
+#include <netinet/in.h>
 #include <sched.h>
 #include <sys/mount.h>
 #include <sys/shm.h>
+#include <sys/socket.h>
 #include <sys/stat.h>
+#include <sys/un.h>
 #include <sys/utsname.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -269,6 +273,53 @@ TEST_F(Border, SharedMemoryMadeInsideDoesNotShowOnTheMachine)
     });
     ASSERT_EQ(caller.hear(1), ".");
     EXPECT_LT(shmget(key, 4096, 0600), 0);
+}
+
+/** Binds an abstract socket or connects to it. @return 0 for success */
+template <class Call> int abstractSocket(std::string const& name, Call call)
+{
+    sockaddr_un address{};
+    address.sun_family = AF_UNIX;
+    name.copy(address.sun_path + 1, sizeof address.sun_path - 1);
+    int const socket = ::socket(AF_UNIX, SOCK_DGRAM | SOCK_CLOEXEC, 0);
+    return call(socket, reinterpret_cast<sockaddr const*>(&address), sizeof address);
+}
+
+TEST_F(Border, AbstractSocketsOfTheMachineAreNotInside)
+{
+    std::string const name = "oswmi-border-" + std::to_string(getpid());
+    Caller caller(
+        [&name] { return abstractSocket(name, connect) != 0 && errno == ECONNREFUSED ? 0 : 1; }, "",
+        [&name] {
+            if (abstractSocket(name, bind) != 0 || abstractSocket(name, connect) != 0)
+                _exit(2);
+        });
+    EXPECT_EQ(caller.wait(), 0);
+}
+
+TEST_F(Border, TheNetworkInsideIsItsOwnLoopbackAlone)
+{
+    Caller caller([] {
+        std::string said;
+        struct if_nameindex* const all = if_nameindex();
+        for (auto const* interface = all; interface && interface->if_name; ++interface)
+            said += interface->if_name + std::string(" ");
+        if_freenameindex(all);
+        Caller::say(said);
+        // Something listens on the loopback, and something else gets through to it.
+        int const listener = socket(AF_INET, SOCK_STREAM, 0);
+        sockaddr_in address{};
+        address.sin_family = AF_INET;
+        address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+        socklen_t length = sizeof address;
+        auto* const place = reinterpret_cast<sockaddr*>(&address);
+        if (bind(listener, place, length) != 0 || listen(listener, 1) != 0 ||
+            getsockname(listener, place, &length) != 0)
+            return 1;
+        return connect(socket(AF_INET, SOCK_STREAM, 0), place, length) == 0 ? 0 : 2;
+    });
+    EXPECT_EQ(caller.hearAll(), "lo ");
+    EXPECT_EQ(caller.wait(), 0);
 }
 
 TEST_F(Border, TheHostNameInsideIsNotTheMachines)

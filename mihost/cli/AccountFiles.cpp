@@ -2,8 +2,6 @@
 
 #include "mihost/cli/Lines.h"
 
-#include <algorithm>
-
 namespace mihost
 {
 
@@ -12,8 +10,10 @@ namespace
 
 struct File {
     char const* path;
-    bool secret; // the second field of a line is a password hash
+    bool secret; // the password field of a line is a hash
 };
+
+constexpr std::size_t passwordField = 1; // the first being 0
 
 constexpr File files[] = {
     {"/etc/passwd", false},
@@ -26,34 +26,6 @@ std::vector<std::string> linesIn(AccountFiles const& all, char const* path)
 {
     auto const found = all.find(path);
     return found == all.end() ? std::vector<std::string>() : found->second;
-}
-
-std::vector<std::string> missingIn(std::vector<std::string> const& lines,
-                                   std::vector<std::string> const& others)
-{
-    std::vector<std::string> missing;
-    std::copy_if(lines.begin(), lines.end(), std::back_inserter(missing),
-                 [&others](std::string const& line) {
-                     return std::find(others.begin(), others.end(), line) == others.end();
-                 });
-    return missing;
-}
-
-/** What stands in the second field of an account that has no password. */
-bool saysNothing(std::string const& field)
-{
-    return field.find_first_not_of("!*x") == std::string::npos;
-}
-
-void hideHash(std::string& line)
-{
-    std::size_t const first = line.find(':');
-    if (first == std::string::npos)
-        return;
-    std::size_t const second = std::min(line.find(':', first + 1), line.size());
-    std::size_t const length = second - first - 1;
-    if (!saysNothing(line.substr(first + 1, length)))
-        line.replace(first + 1, length, "(hidden)");
 }
 
 } // namespace
@@ -73,12 +45,16 @@ std::vector<FileChange> changesBetween(AccountFiles const& before, AccountFiles 
     for (File const& file : files) {
         auto const old = linesIn(before, file.path);
         auto const now = linesIn(after, file.path);
-        FileChange change{file.path, missingIn(old, now), missingIn(now, old)};
+        FileChange change;
+        change.file = file.path;
+        change.removed = missingIn(old, now);
+        change.added = missingIn(now, old);
         if (change.removed.empty() && change.added.empty())
             continue;
         if (file.secret && secrets == Secrets::Hide) {
-            std::for_each(change.removed.begin(), change.removed.end(), hideHash);
-            std::for_each(change.added.begin(), change.added.end(), hideHash);
+            for (auto* const lines : {&change.removed, &change.added})
+                for (std::string& line : *lines)
+                    hideHash(line, passwordField);
         }
         changes.push_back(change);
     }

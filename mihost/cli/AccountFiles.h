@@ -1,6 +1,7 @@
 #ifndef MIHOST_CLI_ACCOUNTFILES_H
 #define MIHOST_CLI_ACCOUNTFILES_H
 
+#include "mihost/cli/FileChange.h"
 #include "mihost/cli/NodeView.h"
 
 #include <map>
@@ -16,13 +17,6 @@ constexpr char shadowFile[] = "/etc/shadow";
 using AccountFiles = std::map<std::string, std::vector<std::string>>;
 
 AccountFiles readAccountFiles();
-
-/** The lines that went and came in one file, each in the file's order. */
-struct FileChange {
-    std::string file;
-    std::vector<std::string> removed;
-    std::vector<std::string> added;
-};
 
 /** The files in which lines differ. Password hashes in them are hidden unless they are asked for.
  */

@@ -26,6 +26,9 @@ template <class Step> int guarded(Step step)
     } catch (Failure const& failure) {
         tell(failure);
         return failure.code();
+    } catch (std::exception const& error) { // no memory or no descriptor is left
+        tell({PluginRefused, error.what()});
+        return PluginRefused;
     }
 }
 

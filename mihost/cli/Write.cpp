@@ -5,11 +5,13 @@
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/Interrupts.h"
 #include "mihost/cli/Lines.h"
+#include "mihost/cli/SandboxChanges.h"
 #include "mihost/cli/Say.h"
 #include "mihost/runtime/Text.h"
 #include "mihost/sandbox/Sandbox.h"
 #include "nodes/ids.h"
 
+#include <filesystem>
 #include <fmt/format.h>
 
 namespace mihost
@@ -33,23 +35,16 @@ Result perform(Write const& write, Secrets secrets)
     interrupts::Held const held;
     commandTap::Recording const recording;
     commandTap::takeStandardError();
-    AccountFiles const before = readAccountFiles();
+    CopyState const before = CopyState::read();
     Result result{write.node.setProperty(write.property, write.value), {}, {}, {}, {}};
     for (RunCommand const& command : recording.commands())
         result.commands.push_back({withoutSecret(command.line, write.secret),
                                    withoutSecret(command.output, write.secret), command.status});
     result.accounts = readAccountFiles();
-    result.changes = changesBetween(before, result.accounts, secrets);
+    result.changes =
+        shownChanges(before.changesTo(CopyState::read()), std::filesystem::current_path(), secrets);
     result.complaints = withoutSecret(commandTap::takeStandardError(), write.secret);
     return result;
-}
-
-Json listOf(std::vector<std::string> const& lines)
-{
-    Json list = Json::array();
-    for (std::string const& line : lines)
-        list.push_back(toJson(line));
-    return list;
 }
 
 Json documentOf(Result const& result)
@@ -60,13 +55,8 @@ Json documentOf(Result const& result)
     Json commands = Json::array();
     for (RunCommand const& command : result.commands)
         commands.push_back({{"command", toJson(command.line)}, {"output", toJson(command.output)}});
-    Json changes = Json::array();
-    for (FileChange const& change : result.changes)
-        changes.push_back({{"file", change.file},
-                           {"removed", listOf(change.removed)},
-                           {"added", listOf(change.added)}});
     document["commands"] = commands;
-    document["changes"] = changes;
+    document["changes"] = toJson(result.changes);
     return document;
 }
 
@@ -87,13 +77,7 @@ void writeText(Result const& result, Output& out)
         for (std::string const& line : linesOf(command.output))
             out.line("     " + shown(line));
     }
-    for (FileChange const& change : result.changes) {
-        out.line(change.file);
-        for (std::string const& line : change.removed)
-            out.line("  - " + printable(line));
-        for (std::string const& line : change.added)
-            out.line("  + " + printable(line));
-    }
+    writeText(result.changes, out);
 }
 
 /**

@@ -3,6 +3,7 @@
 #include "mihost/sandbox/Content.h"
 #include "mihost/sandbox/Descriptor.h"
 #include "mihost/sandbox/Failure.h"
+#include "mihost/sandbox/Layers.h"
 #include "mihost/sandbox/MountTable.h"
 #include "mihost/sandbox/Self.h"
 
@@ -85,6 +86,7 @@ public:
         std::string const options = "lowerdir=.,upperdir=" + upper + ",workdir=" + work;
         check(mount("overlay", (copyRoot + path).c_str(), "overlay", MS_NODEV, options.c_str()),
               "cannot overlay " + path);
+        layers().push_back({path == "/" ? "" : path, openReadOnly(path), openReadOnly(upper)});
     }
 
 private:

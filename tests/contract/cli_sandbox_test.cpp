@@ -8,12 +8,23 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
+#include <sys/stat.h>
 #include <unistd.h>
 
 namespace
 {
 
 using Json = nlohmann::ordered_json;
+using Lines = std::vector<std::string>;
+
+/** Null if the file is not among the changes. */
+Json changeOf(std::string const& file, Json const& answer)
+{
+    for (Json const& change : answer["changes"])
+        if (change["file"] == file)
+            return change;
+    return Json();
+}
 
 /** Tests of the option itself need the privilege for it. */
 class MihostSandbox : public testing::Test
@@ -42,9 +53,10 @@ TEST_F(MihostSandbox, ShowsTheCommandsTheirOutputAndTheLinesThatChanged)
     ASSERT_EQ(answer["commands"].size(), 2U);
     EXPECT_EQ(answer["commands"][0]["command"], "/usr/sbin/useradd sandboxed 2>&1;echo rc=$? 2>&1");
     EXPECT_EQ(answer["commands"][0]["output"], "rc=0\n");
-    EXPECT_EQ(answer["changes"][0]["file"], "/etc/passwd");
-    EXPECT_EQ(answer["changes"][0]["removed"], Json::array());
-    std::string const added = answer["changes"][0]["added"][0];
+    Json const account = changeOf("/etc/passwd", answer);
+    EXPECT_EQ(account["change"], "changed");
+    EXPECT_EQ(account["removed"], Json::array());
+    std::string const added = account["added"][0];
     EXPECT_EQ(added.substr(0, 12), "sandboxed:x:");
     EXPECT_EQ(contentOf("/etc/passwd"), before);
 }
@@ -53,10 +65,52 @@ TEST_F(MihostSandbox, ShowsTheSameToPeople)
 {
     Outcome const outcome =
         mihostRun({"--overlay", plain_, "call", "LocalGroupAdd", "GroupName=sandboxed"});
-    EXPECT_EQ(outcome.out.rfind(
-                  "ran  /usr/sbin/groupadd sandboxed 2>&1\n/etc/group\n  + sandboxed:x:", 0),
+    EXPECT_EQ(outcome.out.rfind("ran  /usr/sbin/groupadd sandboxed 2>&1\n"
+                                "changed /etc/group\n  + sandboxed:x:",
+                                0),
               0U)
         << outcome.out;
+}
+
+TEST_F(MihostSandbox, ShowsEveryFileThatCameWentOrChanged)
+{
+    ScratchFolder const machine;
+    std::string const tool =
+        machine.write("usr/sbin/groupadd", "#!/bin/sh\n"
+                                           "mkdir -m 700 /home/new; echo x >/home/new/.profile\n"
+                                           "chown -R 12:34 /home/new\n"
+                                           "rm -r /srv/old; chmod 600 /etc/settings\n"
+                                           "echo two >/etc/settings; : >/etc/.pwd.lock\n");
+    std::filesystem::permissions(tool, std::filesystem::perms::owner_all);
+    machine.write("srv/old/file", "");
+    chmod(machine.write("etc/settings", "one\n").c_str(), 0644);
+    Lines const call{"--overlay", machine.name(), "call", "LocalGroupAdd", "GroupName=g"};
+    EXPECT_EQ(mihostRun(call).out, "ran  /usr/sbin/groupadd g 2>&1\n"
+                                   "changed /etc/settings (mode 0644 -> 0600)\n"
+                                   "created /home/new (directory, mode 0700, owner 12:34)\n"
+                                   "created /home/new/.profile (mode 0600, owner 12:34)\n"
+                                   "removed /srv/old (directory)\n"
+                                   "removed /srv/old/file\n");
+    Lines asJson = call;
+    asJson.insert(asJson.begin(), {"--json", "--show-secrets"});
+    Json const answer = Json::parse(mihostRun(asJson).out);
+    EXPECT_EQ(changeOf("/etc/settings", answer).dump(),
+              R"({"file":"/etc/settings","change":"changed","kind":"file","removed":["one"],)"
+              R"("added":["two"],"mode":{"before":"0644","after":"0600"}})");
+    EXPECT_EQ(changeOf("/home/new", answer)["owner"].dump(), R"({"before":null,"after":"12:34"})");
+    EXPECT_EQ(changeOf("/srv/old/file", answer)["change"], "removed");
+}
+
+TEST_F(MihostSandbox, ShowsOfEachWriteOnlyWhatItChanged)
+{
+    Outcome const outcome =
+        mihostRun({"--json", "--overlay", plain_, "shell"},
+                  "call LocalGroupAdd GroupName=one\ncall LocalGroupAdd GroupName=two\n");
+    Lines const answers = linesOf(outcome.out);
+    ASSERT_EQ(answers.size(), 2U) << outcome.out << outcome.err;
+    Json const added = changeOf("/etc/group", Json::parse(answers[1]))["added"];
+    ASSERT_EQ(added.size(), 1U);
+    EXPECT_EQ(added[0].get<std::string>().substr(0, 4), "two:");
 }
 
 TEST_F(MihostSandbox, HidesPasswordsInCommandsAndFiles)

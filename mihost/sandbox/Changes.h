@@ -1,0 +1,63 @@
+#ifndef MIHOST_SANDBOX_CHANGES_H
+#define MIHOST_SANDBOX_CHANGES_H
+
+#include <map>
+#include <optional>
+#include <string>
+#include <sys/stat.h>
+#include <vector>
+
+namespace mihost
+{
+
+/** A file, directory, link or anything else that has a path. */
+struct FileState {
+    mode_t mode; // with its type
+    uid_t owner;
+    gid_t group;
+    std::string target; // of a symbolic link
+};
+
+/** What became of one path. */
+struct PathChange {
+    std::string path;
+    std::optional<FileState> before; // none: it was not there
+    std::optional<FileState> after;
+    // Of a text file in /etc that is not too long, and empty for one that is not there. Both or
+    // none.
+    std::optional<std::string> oldText;
+    std::optional<std::string> newText;
+};
+
+/** What was written in the copy of the machine so far, on every file system that is copied. */
+class CopyState
+{
+public:
+    /** As it is now; nothing outside of a copy. @throws std::system_error */
+    static CopyState read();
+
+    /**
+     * What changed from this state to a later one: by path, each once, everything in a directory
+     * that came or went included. A time stamp alone is not a change.
+     *
+     * @throws std::system_error
+     */
+    std::vector<PathChange> changesTo(CopyState const& later) const;
+
+private:
+    struct Entry {
+        struct stat status;
+        std::string target;
+        bool opaque; // a directory that hides the machine's own
+        std::optional<std::string> text;
+    };
+    using Entries = std::map<std::string, Entry>; // by the path in the layer
+
+    friend class LayerComparison;
+
+    std::vector<Entries> layers_;
+};
+
+} // namespace mihost
+
+#endif

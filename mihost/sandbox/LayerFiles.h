@@ -1,0 +1,43 @@
+#ifndef MIHOST_SANDBOX_LAYERFILES_H
+#define MIHOST_SANDBOX_LAYERFILES_H
+
+#include "mihost/sandbox/Descriptor.h"
+
+#include <functional>
+#include <optional>
+#include <string>
+#include <sys/stat.h>
+
+/**
+ * Files below an open directory, whose path begins with a slash and is taken from there. All throw
+ * std::system_error for what cannot be read.
+ */
+namespace mihost::layerFiles
+{
+
+/** None if nothing is there. */
+std::optional<struct stat> statusOf(Descriptor const& root, std::string const& path);
+
+/** What a symbolic link leads to. */
+std::string targetOf(Descriptor const& root, std::string const& path);
+
+/** None for a file that holds a zero byte or is longer than 8 MiB. */
+std::optional<std::string> textOf(Descriptor const& root, std::string const& path);
+
+/** Whether the file at the path holds the same bytes below both directories. */
+bool sameContent(Descriptor const& root, Descriptor const& otherRoot, std::string const& path);
+
+/** Whether an overlay's directory hides the one below it. */
+bool isOpaque(Descriptor const& root, std::string const& path);
+
+/** Whether it is an overlay's mark that nothing is there. */
+bool isWhiteout(struct stat const& status);
+
+using Visit = std::function<void(std::string const& path, struct stat const& status)>;
+
+/** Visits all that is below a path, a directory before what is in it; "" is the open directory. */
+void walk(Descriptor const& root, std::string const& path, Visit const& visit);
+
+} // namespace mihost::layerFiles
+
+#endif

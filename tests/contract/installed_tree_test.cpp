@@ -32,7 +32,7 @@ public:
         fs::create_directory(top_ / "work");
         shell("cmake --install '" BUILD_DIR "' --prefix '" + (top_ / "first").string() + "'");
         fs::rename(top_ / "first", prefix());
-        fs::copy(DOCS_DIR "/examples/minimal_host.cpp", top_ / "work");
+        fs::copy(prefix() / "share/doc/mihost/examples", work());
     }
 
 protected:
@@ -75,8 +75,8 @@ TEST_F(InstalledTree, StandsInTheUsualDirectories)
     for (char const* file :
          {"bin/mihost", "include/mihost/host/OpenMI.h", "include/mihost/mihost/runtime/Runtime.h"})
         EXPECT_TRUE(fs::is_regular_file(prefix() / file)) << file;
-    for (char const* file :
-         {"libzorvvxicosswmi.so.1", "libmihost.so", "libmihost.so.0", "pkgconfig/mihost.pc"})
+    for (char const* file : {"libzorvvxicosswmi.so.1", "libmihost.so", "libmihost.so.0",
+                             "pkgconfig/mihost.pc", "pkgconfig/mihost-headers.pc"})
         EXPECT_TRUE(fs::is_regular_file(libraries() / file)) << file;
 }
 
@@ -97,29 +97,84 @@ TEST_F(InstalledTree, RunsMihostWithTheAcceleratorBesideIt)
 }
 #endif
 
-TEST_F(InstalledTree, GivesAHostHeadersAndRuntimeThroughPkgConfig)
+/** Runs the page's lines for a compiler and pkg-config, with the compiler of this build. */
+class ThroughPkgConfig : public InstalledTree
 {
-    setenv("PKG_CONFIG_PATH", (libraries() / "pkgconfig").c_str(), 1);
-    setenv("LD_LIBRARY_PATH", libraries().c_str(), 1);
-    std::ofstream(work() / "g++") << "#!/bin/sh\nexec '" HOST_COMPILER_PROGRAM
-                                     "' " HOST_COMPILER_FLAGS " \"$@\"\n";
-    fs::permissions(work() / "g++", fs::perms::owner_all);
-    std::string const tree = shell("PATH=.:$PATH\n" + blockOf("sh", "pkg-config --cflags"));
+protected:
+    ThroughPkgConfig()
+    {
+        setenv("PKG_CONFIG_PATH", (libraries() / "pkgconfig").c_str(), 1);
+        setenv("LD_LIBRARY_PATH", libraries().c_str(), 1);
+        std::ofstream(work() / "g++")
+            << "#!/bin/sh\nexec '" HOST_COMPILER_PROGRAM "' " HOST_COMPILER_FLAGS " \"$@\"\n";
+        fs::permissions(work() / "g++", fs::perms::owner_all);
+    }
+
+    std::string build(std::string const& text, std::string const& then = "") const
+    {
+        return shell("PATH=.:$PATH\n" + blockOf("sh", text) + then);
+    }
+};
+
+TEST_F(ThroughPkgConfig, AHostGetsHeadersAndRuntime)
+{
+    std::string const tree = build("--libs mihost)");
     EXPECT_EQ(tree.find(topOfTheTree), 0U) << tree;
 }
 
-TEST_F(InstalledTree, GivesAHostHeadersAndRuntimeThroughFindPackage)
+TEST_F(ThroughPkgConfig, AFrameworkGetsTheHeadersAlone)
 {
-    std::ofstream(work() / "CMakeLists.txt")
-        << "cmake_minimum_required(VERSION 3.25)\nproject(host LANGUAGES CXX)\n"
-        << blockOf("cmake", "find_package(mihost");
-    std::string const tree = shell(
-        "cmake -G Ninja -S . -B build -DCMAKE_PREFIX_PATH='" + prefix().string() +
-        "' -DCMAKE_CXX_COMPILER='" HOST_COMPILER_PROGRAM "' -DCMAKE_CXX_FLAGS='" HOST_COMPILER_FLAGS
-        "' -DCMAKE_EXE_LINKER_FLAGS='" HOST_LINKER_FLAGS "' >&2\n"
-        "cmake --build build >&2\n"
-        "build/minimal_host");
+    build("mihost-headers");
+    EXPECT_TRUE(fs::is_regular_file(work() / "own_framework.o"));
+    EXPECT_EQ(shell("pkg-config --libs mihost-headers"), "\n");
+}
+
+#ifdef ACCEL_FILE
+TEST_F(ThroughPkgConfig, AHostGetsTheAccelerator)
+{
+    std::string const tree = build("--libs mihost miaccel)", "readelf -d fast_host\n./fast_host\n");
+    EXPECT_NE(tree.find("[libmiaccel.so.0]"), std::string::npos) << tree;
+    EXPECT_NE(tree.find(topOfTheTree), std::string::npos) << tree;
+}
+#endif
+
+/** Builds the page's lines for CMake with the compiler of this build. */
+class ThroughFindPackage : public InstalledTree
+{
+protected:
+    std::string build(std::string const& text, std::string const& then) const
+    {
+        std::ofstream(work() / "CMakeLists.txt")
+            << "cmake_minimum_required(VERSION 3.25)\nproject(host LANGUAGES CXX)\n"
+            << blockOf("cmake", text);
+        return shell("cmake -G Ninja -S . -B build -DCMAKE_PREFIX_PATH='" + prefix().string() +
+                     "' -DCMAKE_CXX_COMPILER='" HOST_COMPILER_PROGRAM
+                     "' -DCMAKE_CXX_FLAGS='" HOST_COMPILER_FLAGS
+                     "' -DCMAKE_EXE_LINKER_FLAGS='" HOST_LINKER_FLAGS "' >&2\n"
+                     "cmake --build build >&2\n" +
+                     then);
+    }
+};
+
+TEST_F(ThroughFindPackage, AHostGetsHeadersAndRuntime)
+{
+    std::string const tree = build("mihost::mihost)", "build/minimal_host");
     EXPECT_EQ(tree.find(topOfTheTree), 0U) << tree;
 }
+
+TEST_F(ThroughFindPackage, AFrameworkGetsTheHeadersAlone)
+{
+    build("mihost::headers)", "test -f build/CMakeFiles/own_framework.dir/own_framework.cpp.o");
+}
+
+#ifdef ACCEL_FILE
+TEST_F(ThroughFindPackage, AHostGetsTheAccelerator)
+{
+    std::string const tree =
+        build("mihost::miaccel)", "readelf -d build/fast_host\nbuild/fast_host\n");
+    EXPECT_NE(tree.find("[libmiaccel.so.0]"), std::string::npos) << tree;
+    EXPECT_NE(tree.find(topOfTheTree), std::string::npos) << tree;
+}
+#endif
 
 } // namespace

@@ -1,0 +1,46 @@
+// Carries out a method call, such as "LocalGroupAdd,GroupName:CMPI_string:builders", as root.
+// A refused call carries no reason, so this host collects it from the log.
+
+#include "load_plugin.h"
+#include "mihost/runtime/Runtime.h"
+
+#include <iostream>
+
+constexpr unsigned int methodCall = 74;
+constexpr int errorLevel = 6000;
+
+class Reasons : public mihost::LogSink
+{
+public:
+    void write(mihost::LogMessage const& message) override
+    {
+        bool const output = message.text.rfind("outputBuffer: ", 0) == 0;
+        bool const once = message.operation == mihost::LogMessage::Operation::Log;
+        if (once && (output || message.level == errorLevel))
+            lines.push_back(message.text);
+    }
+
+    std::vector<std::string> lines;
+};
+
+int main(int argc, char** argv)
+{
+    if (argc != 3) {
+        std::cerr << "usage: method_call PLUGIN CALL\n";
+        return 2;
+    }
+    LoadedPlugin plugin(argv[1]);
+    plugin.start();
+    IC::MutableNode& os = *plugin.nodes(operatingSystemType).front();
+
+    Reasons reasons;
+    mihost::setLogSink(&reasons);
+    IC::Error const error = os.setProperty(methodCall, IC::PropertyValue(argv[2], true));
+    mihost::setLogSink(nullptr);
+    if (error.getStatus() == 0)
+        return 0;
+    std::cerr << "refused with status " << int{error.getStatus()} << '\n';
+    for (std::string const& line : reasons.lines)
+        std::cerr << line << '\n';
+    return 1;
+}

@@ -13,7 +13,7 @@ namespace mihost
 class BoundedText
 {
 public:
-    static constexpr std::size_t limit = 1024 * 1024; // bytes
+    static constexpr std::size_t limit = 1'048'576; // bytes
 
     void append(std::string_view part);
 

@@ -131,7 +131,7 @@ std::FILE* note(char const* line, std::FILE* running)
         fopencookie(stream.get(), "r", {readNoting, nullptr, nullptr, closeNoting});
     if (!noting)
         return running;
-    stream.release();
+    static_cast<void>(stream.release()); // closeNoting deletes it
     state().noting.insert(noting);
     return noting;
 }

@@ -83,7 +83,9 @@ public:
         check(chown(upper.c_str(), status.st_uid, status.st_gid), "cannot set the owner of a copy");
         // Named by ".", the path needs no escaping. Device files are dead in the copy.
         check(chdir(path.c_str()), "cannot enter " + path);
-        std::string const options = "lowerdir=.,upperdir=" + upper + ",workdir=" + work;
+        // Without shortcuts every file that changes is in the layer; see CopyState.
+        std::string const options =
+            "lowerdir=.,upperdir=" + upper + ",workdir=" + work + ",redirect_dir=off,metacopy=off";
         check(mount("overlay", (copyRoot + path).c_str(), "overlay", MS_NODEV, options.c_str()),
               "cannot overlay " + path);
         layers().push_back({path == "/" ? "" : path, openReadOnly(path), openReadOnly(upper)});

@@ -5,6 +5,7 @@
 #include "tests/support/Lines.h"
 #include "tests/support/ScratchFolder.h"
 
+#include <cstdlib>
 #include <fcntl.h>
 #include <filesystem>
 #include <fstream>
@@ -173,6 +174,19 @@ TEST_F(Changes, SeeADirectoryThatWasMadeAgain)
               "home/sub 40755:0:0 -\n"
               "home/sub/two 100644:0:0 -\n"
               "home/three - 100644:0:0\n");
+}
+
+TEST_F(Changes, SeeADirectoryThatWasMoved)
+{
+    EXPECT_EQ(changesOf([] { EXPECT_EQ(std::system("mv home house"), 0); }),
+              "home 40755:0:0 -\n"
+              "home/one 100644:0:0 -\n"
+              "home/sub 40755:0:0 -\n"
+              "home/sub/two 100644:0:0 -\n"
+              "house - 40755:0:0\n"
+              "house/one - 100644:0:0\n"
+              "house/sub - 40755:0:0\n"
+              "house/sub/two - 100644:0:0\n");
 }
 
 TEST_F(Changes, SeeAFileInTheDirectorysPlace)

@@ -3,6 +3,7 @@
 #include "mihost/cli/Address.h"
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/MethodCall.h"
+#include "mihost/runtime/Text.h"
 
 #include <CLI/Config.hpp>
 #include <CLI/Formatter.hpp>
@@ -101,7 +102,8 @@ Candidates names(NodeKind const& kind, std::string const& before, NodeNames cons
 {
     Candidates all;
     for (std::string const& name : nodeNames(kind))
-        all.push_back({before + name, ""});
+        if (printable(name) == name)
+            all.push_back({before + name, ""});
     return all;
 }
 

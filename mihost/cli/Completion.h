@@ -24,7 +24,10 @@ struct Completion {
     std::vector<Candidate> candidates; // none for files and folders
 };
 
-/** The names that nodes of a kind go by, such as login names for users. */
+/**
+ * The names that nodes of a kind go by, such as login names for users. Those that hold control
+ * characters or bytes that are no UTF-8 are not offered.
+ */
 using NodeNames = std::function<std::vector<std::string>(NodeKind const& kind)>;
 
 /**

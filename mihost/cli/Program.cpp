@@ -1,5 +1,6 @@
 #include "mihost/cli/Program.h"
 
+#include "mihost/cli/BashCompletion.h"
 #include "mihost/cli/CommandLine.h"
 #include "mihost/cli/Completion.h"
 #include "mihost/cli/Failure.h"
@@ -48,6 +49,8 @@ int runProgram(int argc, char** argv)
     if (argc > 1 && std::string_view(argv[1]) == "__complete")
         // What the completion scripts of shells run. Their words are no command line yet.
         return answer(completionText(complete({argv + 2, argv + argc}, localNames)));
+    if (argc == 4 && std::string_view(argv[1]) == "__complete-bash")
+        return answer(bashCompletionText(argv[2], argv[3], localNames));
     // The code set is the user's; everything else, dates and numbers, stays as the plug-in expects.
     std::setlocale(LC_CTYPE, "");
     interrupts::install();

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <fmt/format.h>
+#include <utility>
 
 namespace mihost
 {
@@ -15,7 +16,7 @@ namespace
 class Splitter
 {
 public:
-    explicit Splitter(std::string const& line)
+    explicit Splitter(std::string const& line, std::string breaks = "") : breaks_(std::move(breaks))
     {
         for (char const byte : line)
             take(byte);
@@ -23,25 +24,39 @@ public:
 
     std::vector<std::string> words;
     bool inWord = false;
-    char quote = '\0'; // ' or " within one; \ where the next byte is kept as it is
-    char outer = '\0'; // the quote that a backslash stands in
+    char quote = '\0';    // ' or " within one; \ where the next byte is kept as it is
+    char outer = '\0';    // the quote that a backslash stands in
+    std::size_t kept = 0; // bytes of the last word before the last break
 
 private:
+    void begin()
+    {
+        if (inWord)
+            return;
+        words.emplace_back();
+        inWord = true;
+        kept = 0;
+    }
+
     void add(char byte)
     {
-        if (!inWord)
-            words.emplace_back();
-        inWord = true;
+        begin();
         words.back() += byte;
+    }
+
+    void noteBreak(char byte)
+    {
+        if (breaks_.find(byte) != std::string::npos)
+            kept = words.back().size();
     }
 
     void open(char sign)
     {
-        if (!inWord)
-            words.emplace_back();
-        inWord = true;
+        begin();
         outer = quote;
         quote = sign;
+        if (sign != '\\')
+            kept = words.back().size();
     }
 
     void take(char byte)
@@ -56,19 +71,23 @@ private:
         } else if (escapes || quotes) {
             open(byte);
         } else if (quote != '\0') {
-            if (byte == quote)
+            if (byte == quote) {
                 quote = '\0';
-            else
+                noteBreak(byte);
+            } else {
                 add(byte);
+            }
         } else if (byte == ' ' || byte == '\t') {
             inWord = false;
         } else if (byte == '#' && !inWord) {
             inComment_ = true;
         } else {
             add(byte);
+            noteBreak(byte);
         }
     }
 
+    std::string breaks_;
     bool inComment_ = false;
 };
 
@@ -93,6 +112,17 @@ std::vector<std::string> wordsBeingTyped(std::string const& line)
     if (!splitter.inWord)
         splitter.words.emplace_back();
     return splitter.words;
+}
+
+TypedLine typedLine(std::string const& line, std::string const& breaks)
+{
+    Splitter splitter(line, breaks);
+    if (!splitter.inWord) {
+        splitter.words.emplace_back();
+        splitter.kept = 0;
+    }
+    char const quote = splitter.quote == '\\' ? splitter.outer : splitter.quote;
+    return {splitter.words, splitter.kept, quote};
 }
 
 bool holdsPassword(std::string const& line)

@@ -15,7 +15,7 @@ std::string inBash(std::string const& line)
         compopt() { echo "$@"; }
         . "$1/mihost.bash"
         COMP_LINE=$3 COMP_POINT=${4:-${#3}}
-        _mihost mihost
+        _mihost mihost "${3##* }"
         printf '%s\n' "${COMPREPLY[@]}")",
                   "bash", COMPLETIONS_DIR, mihost.substr(0, mihost.rfind('/')), line});
     EXPECT_EQ(outcome.err, "");

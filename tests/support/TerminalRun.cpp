@@ -10,9 +10,10 @@
 #include <termios.h>
 #include <unistd.h>
 
-TerminalRun::TerminalRun(std::vector<std::string> arguments, unsigned short columns)
+TerminalRun::TerminalRun(std::vector<std::string> arguments, unsigned short columns,
+                         std::string const& program)
 {
-    arguments.insert(arguments.begin(), MIHOST_FILE);
+    arguments.insert(arguments.begin(), program);
     std::vector<char*> list;
     for (std::string& argument : arguments)
         list.push_back(argument.data());

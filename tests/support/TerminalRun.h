@@ -5,11 +5,15 @@
 #include <sys/types.h>
 #include <vector>
 
-/** mihost run at a terminal, as a person sees it. What it writes and shows comes as one stream. */
+/**
+ * mihost, or another program, run at a terminal as a person sees it. What it writes and shows comes
+ * as one stream.
+ */
 class TerminalRun
 {
 public:
-    explicit TerminalRun(std::vector<std::string> arguments, unsigned short columns = 80);
+    explicit TerminalRun(std::vector<std::string> arguments, unsigned short columns = 80,
+                         std::string const& program = MIHOST_FILE);
     ~TerminalRun();
     TerminalRun(TerminalRun const&) = delete;
     TerminalRun& operator=(TerminalRun const&) = delete;

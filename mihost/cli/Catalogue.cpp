@@ -123,7 +123,9 @@ constexpr char const* number = "CMPI_uint32";
 constexpr char const* date = "CMPI_dateTime";
 
 Parameter const userName{"UserName", text, Form::AccountName, true, "login name"};
+Parameter const newUserName{"UserName", text, Form::PlainName, true, "login name"};
 Parameter const groupName{"GroupName", text, Form::AccountName, true, "the group's name"};
+Parameter const newGroupName{"GroupName", text, Form::PlainName, true, "the group's name"};
 Parameter const comment{"Comment", text, Form::Words, false, "the account's comment field"};
 Parameter const homeDir{"HomeDir", text, Form::Path, false, "home directory; made, or moved there with its files"};
 Parameter const scriptPath{"ScriptPath", text, Form::Path, false, "login shell"};
@@ -133,7 +135,7 @@ Parameter const maxDays{"daysMustChangePasswordAfter", number, Form::Digits, fal
 Parameter const warnDays{"daysWarnBeforePasswordExpire", number, Form::Digits, false, "days of warning before it expires"};
 Parameter const expireDays{"daysExpireAfter", number, Form::Digits, false, "days from a password's expiry until the account goes inactive"};
 Parameter const expirationDate{"passwordExpirationDate", date, Form::Day, false, "day on which the account expires; never, where it is not given"};
-Parameter const localGroup{"LocalGroupName", text, Form::AccountName, true, "the group's name"};
+Parameter const localGroup{"LocalGroupName", text, Form::PlainName, true, "the group's name"};
 Parameter const member{"DomainAndMember", text, Form::AccountName, true, "login name of the member"};
 
 Parameter required(Parameter parameter)
@@ -144,14 +146,14 @@ Parameter required(Parameter parameter)
 
 std::vector<Method> const allMethods = {
     {"UserAdd", "makes a user account and sets its password ageing",
-     {userName, comment, homeDir, scriptPath, password, minDays, maxDays, warnDays, expireDays, expirationDate}},
+     {newUserName, comment, homeDir, scriptPath, password, minDays, maxDays, warnDays, expireDays, expirationDate}},
     {"UserDel", "deletes a user account; home directory and mail stay", {userName}},
     {"UserSetAttrib", "sets an account's password ageing", {userName, minDays, maxDays, warnDays, expireDays, expirationDate}},
     {"UserSetFullName", "sets an account's comment field", {userName, {"FullName", text, Form::Words, true, "full name"}}},
     {"UserSetScriptPath", "sets an account's login shell", {userName, required(scriptPath)}},
     {"UserSetHomeDir", "moves an account's home directory", {userName, required(homeDir)}},
     {"UserSetPassword", "sets an account's password", {userName, required(password)}},
-    {"LocalGroupAdd", "makes a group", {groupName}},
+    {"LocalGroupAdd", "makes a group", {newGroupName}},
     {"LocalGroupDel", "deletes a group", {groupName}},
     {"LocalGroupAddUser", "adds a user to a group", {localGroup, member}},
     {"LocalGroupDelUser", "takes a user out of a group", {localGroup, member}},

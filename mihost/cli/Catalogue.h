@@ -21,6 +21,7 @@ using ValueKind = IC::PropertyValue::KindType;
 enum class Form {
     Free,        // anything; the plug-in only stores it
     AccountName, // the name of a user or group
+    PlainName,   // such a name that no tool reads as an id or a path
     Digits,      // an id or a count
     Path,        // an absolute path
     Words,       // text with single blanks in it

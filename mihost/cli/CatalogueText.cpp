@@ -162,6 +162,7 @@ char const* formName(Form form)
 {
     switch (form) {
     case Form::AccountName:
+    case Form::PlainName:
         return "name";
     case Form::Digits:
         return "number";

@@ -12,7 +12,6 @@ namespace mihost
 namespace
 {
 
-constexpr std::string_view metacharacters = "|&;<>()$`\\\"'*?[]#~=%!{}^";
 constexpr std::string_view separators = ",:";
 constexpr std::size_t mostDigits = 9;
 
@@ -32,7 +31,7 @@ std::optional<std::string> objectionToCharacters(std::string_view text)
                                hexByte(static_cast<unsigned char>(text[0])));
         if (isControl(piece.character))
             return fmt::format("holds the control character {}", printable(shown));
-        if (metacharacters.find(shown) != std::string_view::npos)
+        if (shellMetacharacters.find(shown) != std::string_view::npos)
             return fmt::format("holds '{}', which a shell would act on", shown);
         if (separators.find(shown) != std::string_view::npos)
             return fmt::format("holds '{}', which separates values", shown);
@@ -50,15 +49,39 @@ std::optional<std::string> objectionToWord(std::string_view text)
     return std::nullopt;
 }
 
+std::optional<std::string> objectionToName(std::string_view text)
+{
+    if (auto reason = objectionToWord(text))
+        return reason;
+    if (text[0] == '+')
+        return "begins with '+', so tools would read it as an id";
+    return std::nullopt;
+}
+
 bool isDecimal(std::string_view text)
 {
     return !text.empty() && text.find_first_not_of("0123456789") == std::string_view::npos;
+}
+
+/** Tools would make another account's id, or a folder, out of such a name. */
+std::optional<std::string> objectionToPlainName(std::string_view text)
+{
+    if (auto reason = objectionToName(text))
+        return reason;
+    if (isDecimal(text))
+        return "consists of digits only, so tools would read it as an id";
+    if (text.find('/') != std::string_view::npos || text == "." || text == "..")
+        return "would be read as a path";
+    return std::nullopt;
 }
 
 std::optional<std::string> objectionToForm(Form form, std::string_view text)
 {
     switch (form) {
     case Form::AccountName:
+        return objectionToName(text);
+    case Form::PlainName:
+        return objectionToPlainName(text);
     case Form::Password:
         return objectionToWord(text);
     case Form::Path:

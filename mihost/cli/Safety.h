@@ -14,6 +14,9 @@
 namespace mihost
 {
 
+/** Bytes that mean something to a shell, one way or another. */
+constexpr std::string_view shellMetacharacters = "|&;<>()$`\\\"'*?[]#~=%!{}^";
+
 /** A command's argument may be this long, blanks escaped. */
 constexpr std::size_t longestArgument = 254;
 

@@ -120,6 +120,35 @@ TEST(MethodCallValues, AreRefusedWhereACommandWouldTakeThemForAnOption)
     EXPECT_EQ(objection(Form::Words, "-r"), std::nullopt); // always stands behind its option
 }
 
+TEST(Names, AreRefusedIfToolsWouldReadThemAsIdsOrPaths)
+{
+    EXPECT_EQ(objection(Form::PlainName, "1001"),
+              "consists of digits only, so tools would read it as an id");
+    EXPECT_EQ(objection(Form::AccountName, "1001"), std::nullopt); // such an account may be there
+    for (Form const form : {Form::AccountName, Form::PlainName})
+        EXPECT_EQ(objection(form, "+1"), "begins with '+', so tools would read it as an id");
+    for (char const* path : {"/", "a/b", ".", ".."})
+        EXPECT_EQ(objection(Form::PlainName, path), "would be read as a path") << path;
+    for (char const* right : {"1a", "a1", "a+", "...", "a.b", "_x"})
+        EXPECT_EQ(objection(Form::PlainName, right), std::nullopt) << right;
+}
+
+TEST(Names, OfDigitsAloneMakeNoAccountAndNoGroupAndLeadToNoGroup)
+{
+    for (auto const& [method, words] :
+         std::initializer_list<std::pair<char const*, std::vector<std::string>>>{
+             {"UserAdd", {"UserName=1001"}},
+             {"LocalGroupAdd", {"GroupName=1001"}},
+             {"LocalGroupAddUser", {"LocalGroupName=1001", "DomainAndMember=jdoe"}},
+             {"LocalGroupDelUser", {"LocalGroupName=1001", "DomainAndMember=jdoe"}}})
+        EXPECT_NE(refusal([&, method = method, &words = words] {
+                      parseCall(method, words, noSecret);
+                  }).find("consists of digits only"),
+                  std::string::npos)
+            << method;
+    EXPECT_EQ(refusal([] { parseCall("UserDel", {"UserName=1001"}, noSecret); }), "accepted");
+}
+
 TEST(MethodCallValues, AreRefusedWhereTheyAreEmpty)
 {
     for (Form const form :

@@ -5,6 +5,7 @@
 #include "mihost/sandbox/Descriptor.h"
 
 #include <array>
+#include <cerrno>
 #include <dlfcn.h>
 #include <fcntl.h>
 #include <memory>
@@ -30,6 +31,7 @@ struct Note {
 
 struct State {
     Runner runner{next<Runner::Open>("popen"), next<Runner::Close>("pclose")};
+    Guard* guard = nullptr;
     Listener* listener = nullptr;
     unsigned int count = 0;
     bool recording = false;
@@ -143,6 +145,11 @@ void setRunner(Runner const& runner)
     state().runner = runner;
 }
 
+void setGuard(Guard* guard)
+{
+    state().guard = guard;
+}
+
 void setListener(Listener* listener)
 {
     state().listener = listener;
@@ -191,6 +198,10 @@ std::string outputOf(std::string const& line)
 std::FILE* open(char const* line, char const* mode)
 {
     State& tapped = state();
+    if (tapped.guard && !tapped.guard(line)) {
+        errno = EPERM;
+        return nullptr;
+    }
     ++tapped.count;
     if (tapped.listener)
         tapped.listener->commandStarts(line);

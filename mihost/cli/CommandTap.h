@@ -34,6 +34,13 @@ struct Runner {
 
 void setRunner(Runner const& runner);
 
+/** Decides whether a command line may run. One that may not cannot be started: popen yields null.
+ */
+using Guard = bool(char const* line);
+
+/** @param guard  asked about each command line of the plug-in; null for nobody */
+void setGuard(Guard* guard);
+
 /** Told of each command line before it starts. */
 class Listener
 {

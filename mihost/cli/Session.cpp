@@ -1,5 +1,7 @@
 #include "mihost/cli/Session.h"
 
+#include "mihost/cli/CommandGuard.h"
+#include "mihost/cli/CommandTap.h"
 #include "mihost/cli/Progress.h"
 #include "mihost/cli/Say.h"
 #include "mihost/cli/Terminal.h"
@@ -72,6 +74,7 @@ Plugin& Session::plugin()
         directory_ = std::make_unique<PrivateDirectory>();
         // The plug-in scans what commands print in English. It reads LANG itself, which stays.
         setenv("LC_ALL", "C", 1);
+        commandTap::setGuard(mayRun);
         timing_.begin("load");
         plugin_ = std::make_unique<Plugin>(pluginFile_);
         timing_.end();

@@ -92,6 +92,11 @@ void CommandLine::declare(CLI::App& app)
     app.add_flag("--json", options_.json, "print JSON");
     app.add_flag("--show-secrets", options_.showSecrets, "show password hashes");
     app.add_flag("--yes", options_.yes, "do what would be asked about without asking");
+    app.add_option("--lock-timeout", options_.lockTimeout,
+                   "give up after S seconds if another mihost is changing this machine")
+        ->check(CLI::Range(0U, 86400U))
+        ->type_name("S")
+        ->capture_default_str();
     app.require_subcommand(0, 1);
 
     for (CommandRow const& row : commands()) {

@@ -16,7 +16,8 @@ struct Options {
     bool showSecrets = false;
     bool yes = false; // do without asking
     bool timing = false;
-    bool fast = false; // commands answered in the process where they can be
+    unsigned int lockTimeout = 60; // seconds to wait for another mihost that changes the machine
+    bool fast = false;             // commands answered in the process where they can be
 };
 
 } // namespace mihost

@@ -1,5 +1,6 @@
 #include "mihost/cli/CatalogueText.h"
-#include "mihost/cli/MethodCall.h"
+#include "mihost/cli/Clearance.h"
+#include "mihost/cli/MembershipCheck.h"
 #include "mihost/cli/Session.h"
 #include "mihost/cli/Write.h"
 #include "mihost/cli/commands/makers.h"
@@ -23,7 +24,8 @@ public:
                       ->required();
         app.add_option("PARAMETER", assignments_,
                        "NAME=VALUE; days as YYYY-MM-DD; Password=- is asked for, or read from "
-                       "standard input");
+                       "standard input, but account tools still get the password or its hash "
+                       "as an argument");
         // Asked for help, the words given so far are known but not handed out yet.
         app.footer([this] {
             Method const* const known =
@@ -39,10 +41,11 @@ public:
         MethodCall const call = parseCall(name_, assignments_, [&session](std::string const& name) {
             return session.askSecret(name);
         });
-        if (std::string const danger = dangerOf(call); !danger.empty())
-            session.confirm(danger);
-        carryOut(session, {session.node("os"), NODES::createUser,
-                           IC::PropertyValue(textOf(call), true), secretOf(call)});
+        IC::MutableNode& os = session.node("os");
+        ChangeLock const lock =
+            clearChange(session, dangerOf(call), [&call] { checkMembership(call); });
+        carryOut(session,
+                 {os, NODES::createUser, IC::PropertyValue(textOf(call), true), secretOf(call)});
     }
 
 private:

@@ -1,6 +1,6 @@
 // The operating-system node's command properties, under names of their own.
 
-#include "mihost/cli/Session.h"
+#include "mihost/cli/Clearance.h"
 #include "mihost/cli/Write.h"
 #include "mihost/cli/commands/makers.h"
 #include "nodes/ids.h"
@@ -56,8 +56,9 @@ public:
 
     void run(Session& session) override
     {
-        session.confirm("empty the system log");
-        carryOut(session, {session.node("os"), NODES::clearLog, number(9), ""});
+        IC::MutableNode& os = session.node("os");
+        ChangeLock const lock = clearChange(session, "empty the system log");
+        carryOut(session, {os, NODES::clearLog, number(9), ""});
         if (session.options().json)
             return;
         // Whether it worked is not told; the entries that are left tell.
@@ -79,9 +80,10 @@ public:
     void run(Session& session) override
     {
         unsigned int const state = action_ == "restart" ? 9 : 12;
-        session.confirm(action_ + " the machine");
-        carryOut(session, {session.node("os"), NODES::requestedState,
-                           IC::PropertyValue(IC::EnumValue(state), true), ""});
+        IC::MutableNode& os = session.node("os");
+        ChangeLock const lock = clearChange(session, action_ + " the machine");
+        carryOut(session,
+                 {os, NODES::requestedState, IC::PropertyValue(IC::EnumValue(state), true), ""});
     }
 
 private:

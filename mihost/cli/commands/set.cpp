@@ -1,8 +1,8 @@
+#include "mihost/cli/Clearance.h"
 #include "mihost/cli/Failure.h"
-#include "mihost/cli/MethodCall.h"
-#include "mihost/cli/Safety.h"
+#include "mihost/cli/MembershipCheck.h"
 #include "mihost/cli/Say.h"
-#include "mihost/cli/Session.h"
+#include "mihost/cli/UserCheck.h"
 #include "mihost/cli/ValueText.h"
 #include "mihost/cli/Write.h"
 #include "mihost/cli/commands/makers.h"
@@ -31,25 +31,20 @@ constexpr Danger dangers[] = {
     {NODES::userType, NODES::deleteUser, 1, "delete the account {} and its home directory"},
 };
 
-/** A user node's writes put its stored name or id into a command line. */
-void checkAccount(IC::MutableNode const& node)
+/** The call in a value, if it is one that the plug-in carries out rather than only stores. */
+std::optional<MethodCall> callIn(Property const& property, IC::PropertyValue const& value)
 {
-    NodeKind const& kind = *findKind(NODES::userType);
-    for (unsigned int const id : {NODES::name, NODES::id}) {
-        Property const& property = *findProperty(kind, id);
-        if (auto const reason = objection(property.form, storedText(node, id)))
-            throw Failure(BadUsage, fmt::format("nothing is run for this account: its {} {}",
-                                                property.name, *reason));
-    }
+    std::string const text = static_cast<std::string>(value);
+    if (property.form != Form::MethodCall || callsNothing(text))
+        return std::nullopt;
+    return takeApart(text);
 }
 
 std::string dangerOf(IC::MutableNode const& node, Property const& property,
                      IC::PropertyValue const& value)
 {
-    if (property.form == Form::MethodCall) {
-        std::string const text = static_cast<std::string>(value);
-        return callsNothing(text) ? "" : dangerOf(takeApart(text));
-    }
+    if (auto const call = callIn(property, value))
+        return dangerOf(*call);
     for (Danger const& danger : dangers)
         if (danger.nodeType == node.getNodeType() && danger.property == property.id &&
             danger.value == static_cast<unsigned int>(value))
@@ -57,12 +52,29 @@ std::string dangerOf(IC::MutableNode const& node, Property const& property,
     return "";
 }
 
+/** Rebuilding nodes reads the machine only. */
+bool changesMachine(Property const& property)
+{
+    return property.has(Property::Acts) && property.id != NODES::refresh;
+}
+
+void checkMachine(IC::MutableNode const& node, Property const& property,
+                  IC::PropertyValue const& value)
+{
+    if (auto const call = callIn(property, value))
+        checkMembership(*call);
+    bool const deletes = property.id == NODES::deleteUser;
+    if (node.getNodeType() == NODES::userType &&
+        (!deletes || static_cast<unsigned int>(value) == 1))
+        checkUserWrite(node, deletes ? UserWrite::Delete : UserWrite::Change);
+}
+
 std::string secretOf(Property const& property, std::string const& text)
 {
     if (property.has(Property::Secret))
         return text;
-    bool const isCall = property.form == Form::MethodCall && !callsNothing(text);
-    return isCall ? secretOf(takeApart(text)) : "";
+    auto const call = callIn(property, {text, true});
+    return call ? secretOf(*call) : "";
 }
 
 class Set : public Command
@@ -95,10 +107,10 @@ public:
             text_ = session.askSecret(fmt::format("{} hash", property->name));
 
         IC::PropertyValue const value = parseValue(*property, text_);
-        if (node.getNodeType() == NODES::userType && property->has(Property::Acts))
-            checkAccount(node);
-        if (std::string const danger = dangerOf(node, *property, value); !danger.empty())
-            session.confirm(danger);
+        std::optional<ChangeLock> lock;
+        if (changesMachine(*property))
+            lock = clearChange(session, dangerOf(node, *property, value),
+                               [&] { checkMachine(node, *property, value); });
         carryOut(session, {node, id, value, secretOf(*property, text_)});
         if (!property->has(Property::Acts) && !session.options().json)
             say(fmt::format("mihost: {} changed in this tree alone; 'mihost properties {}' tells "

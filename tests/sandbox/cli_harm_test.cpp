@@ -1,0 +1,196 @@
+// Writes that would reach another account or group than the one meant are refused before anything
+// runs.
+
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <gtest/gtest.h>
+
+namespace
+{
+
+using Lines = std::vector<std::string>;
+
+constexpr char hash[] = "$6$saltsalt$hashhashhash";
+
+bool stands(std::string const& text, std::string const& part)
+{
+    return text.find(part) != std::string::npos;
+}
+
+/** Whether a command line that begins so reached the shell. */
+bool ran(std::string const& start)
+{
+    Lines const lines = machine::ran();
+    return std::any_of(lines.begin(), lines.end(),
+                       [&start](std::string const& line) { return line.rfind(start, 0) == 0; });
+}
+
+void addAccount(std::string const& arguments)
+{
+    ASSERT_EQ(std::system(("/usr/sbin/useradd -s /bin/sh " + arguments).c_str()), 0);
+}
+
+class MihostHarm : public testing::Test
+{
+protected:
+    MihostHarm()
+    {
+        machine::lay("plain");
+        machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\n"
+                                          "GID_MAX 60000\nUSERGROUPS_ENAB yes\n");
+        machine::recordShell();
+    }
+};
+
+TEST_F(MihostHarm, DeletesNoOtherAccountThatIsNamedLikeTheUid)
+{
+    addAccount("-m -u 1500 jdoe");
+    addAccount("-m -u 1077 the1500th");
+    // As the tools of some machines let it be named.
+    ASSERT_EQ(std::system("sed -i 's/^the1500th:/1500:/' /etc/passwd /etc/shadow"), 0);
+    Outcome const outcome = mihostRun({"--yes", "set", "user:jdoe", "delete", "true"});
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_EQ(outcome.err,
+              "mihost: nothing is run for user:jdoe: userdel would be given the UID 1500, which is "
+              "the name of another account: '1500' would be deleted (use 'mihost call UserDel "
+              "UserName=jdoe', which keeps the home directory)\n");
+    EXPECT_FALSE(ran("userdel"));
+    EXPECT_FALSE(machine::entry("/etc/passwd", "1500").empty());
+    EXPECT_FALSE(machine::entry("/etc/passwd", "jdoe").empty());
+    EXPECT_TRUE(std::filesystem::exists("/home/the1500th"));
+}
+
+TEST_F(MihostHarm, RunsNoUserdelThatWouldFindNobody)
+{
+    addAccount("-M -u 1500 jdoe");
+    Outcome const outcome = mihostRun({"set", "user:jdoe", "delete", "true"}); // asks for nothing
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_TRUE(stands(outcome.err, "takes names only (use 'mihost call UserDel UserName=jdoe'"))
+        << outcome.err;
+    EXPECT_FALSE(ran("userdel"));
+    EXPECT_EQ(mihostRun({"call", "UserDel", "UserName=jdoe"}).code, 0);
+    EXPECT_TRUE(machine::entry("/etc/passwd", "jdoe").empty());
+}
+
+TEST_F(MihostHarm, WritesNothingForANodeWhoseNameOrUidIsAnotherAccounts)
+{
+    addAccount("-M -u 1500 jdoe");
+    addAccount("-M -u 1501 ann");
+    std::string const shadow = machine::read("/etc/shadow");
+    for (std::string const write : {"inactive-time 2030-01-01", "password-expiration 2030-01-01",
+                                    "password '$6$saltsalt$hashhashhash'", "delete true --yes"}) {
+        // Both in memory only, but read by the write.
+        Outcome const named = mihostRun(
+            {"shell", "--keep-going"}, "set user:jdoe user-id 1501\nset user:jdoe " + write + "\n");
+        EXPECT_EQ(named.code, 2) << write;
+        EXPECT_TRUE(stands(named.err, "'jdoe' is now an account with UID 1500, not 1501"))
+            << named.err;
+    }
+    EXPECT_FALSE(ran("chage") || ran("chpasswd") || ran("userdel"));
+    EXPECT_EQ(machine::read("/etc/shadow"), shadow);
+    EXPECT_EQ(mihostRun({"set", "user:jdoe", "password", hash}).code, 0);
+    EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), hash);
+}
+
+TEST_F(MihostHarm, MakesNoAccountOrGroupWhoseNameIsANumber)
+{
+    for (Lines const& arguments :
+         {Lines{"call", "UserAdd", "UserName=1001"}, Lines{"call", "UserAdd", "UserName=+1"},
+          Lines{"call", "LocalGroupAdd", "GroupName=0"},
+          Lines{"set", "os", "create-user", "UserAdd,UserName:CMPI_string:1001"}}) {
+        Outcome const outcome = mihostRun(arguments);
+        EXPECT_EQ(outcome.code, 2) << arguments.back();
+        EXPECT_TRUE(stands(outcome.err, "would read it as an id")) << outcome.err;
+    }
+    EXPECT_FALSE(ran("/usr/sbin/"));
+}
+
+class MihostMembership : public MihostHarm
+{
+protected:
+    MihostMembership()
+    {
+        addAccount("-M -u 1500 jdoe");
+        EXPECT_EQ(std::system("groupadd crew"), 0);
+    }
+
+    /** Adds jdoe to a group of this name, whatever groupadd would say to it. */
+    static void addToGroup(std::string const& name)
+    {
+        machine::write("/etc/group", machine::read("/etc/group") + name + ":x:1700:jdoe\n");
+    }
+
+    static void expectRefusal(std::string const& reason, std::string const& member = "jdoe")
+    {
+        for (char const* method : {"LocalGroupAddUser", "LocalGroupDelUser"}) {
+            std::string const text = std::string(method) + ",LocalGroupName:CMPI_string:crew," +
+                                     "DomainAndMember:CMPI_string:" + member;
+            for (Lines const& arguments :
+                 {Lines{"call", method, "LocalGroupName=crew", "DomainAndMember=" + member},
+                  Lines{"set", "os", "create-user", text}}) {
+                Outcome const outcome = mihostRun(arguments);
+                EXPECT_EQ(outcome.code, 2);
+                EXPECT_EQ(outcome.err, "mihost: the groups of '" + member +
+                                           "' are not changed: " + reason + "\n");
+            }
+        }
+        EXPECT_FALSE(ran("/usr/sbin/usermod"));
+    }
+};
+
+TEST_F(MihostMembership, IsNotChangedIfAGroupIsNamedLikeACommand)
+{
+    addToGroup("x`touch${IFS}/root/PWNED`");
+    expectRefusal("its group 'x`touch${IFS}/root/PWNED`' holds '`', which a shell would act on");
+    EXPECT_FALSE(std::filesystem::exists("/root/PWNED"));
+}
+
+TEST_F(MihostMembership, IsNotChangedIfAGroupNameLooksLikeTwo)
+{
+    addToGroup("x)(root");
+    expectRefusal("id says: uid=1500(jdoe) gid=1500(jdoe) groups=1500(jdoe),1700(x)(root), which "
+                  "is not its usual form");
+    EXPECT_EQ(machine::entry("/etc/group", "root").at(3), "");
+}
+
+TEST_F(MihostMembership, IsNotChangedIfAGroupNameIsANumber)
+{
+    addToGroup("0");
+    expectRefusal("its group '0' has a name that usermod reads as a GID");
+}
+
+TEST_F(MihostMembership, IsNotChangedIfAGroupNameIsTakenTwice)
+{
+    addToGroup("root");
+    expectRefusal("its group 'root' has GID 1700, but usermod finds GID 0");
+}
+
+TEST_F(MihostMembership, IsNotChangedForAUidInPlaceOfAName)
+{
+    expectRefusal("id reads it as a UID, that of the account 'jdoe'", "1500");
+}
+
+TEST_F(MihostMembership, IsChangedForHarmlessGroups)
+{
+    addToGroup("staff-2");
+    EXPECT_EQ(
+        mihostRun({"call", "LocalGroupAddUser", "LocalGroupName=crew", "DomainAndMember=jdoe"})
+            .code,
+        0);
+    EXPECT_EQ(machine::entry("/etc/group", "crew").at(3), "jdoe");
+    EXPECT_EQ(machine::entry("/etc/group", "staff-2").at(3), "jdoe");
+}
+
+TEST_F(MihostMembership, OfNobodyIsLeftToThePlugin)
+{
+    Outcome const outcome =
+        mihostRun({"call", "LocalGroupAddUser", "LocalGroupName=crew", "DomainAndMember=no-such"});
+    EXPECT_EQ(outcome.code, 1);
+    EXPECT_TRUE(stands(outcome.err, "no such user")) << outcome.err;
+}
+
+} // namespace

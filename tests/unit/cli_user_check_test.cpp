@@ -1,0 +1,85 @@
+#include "mihost/cli/UserCheck.h"
+
+#include <cctype>
+#include <gtest/gtest.h>
+
+namespace
+{
+
+using mihost::Account;
+using mihost::objectionToUserWrite;
+using mihost::UserWrite;
+
+std::vector<Account> const accounts = {
+    {"root", "0"},   {"jdoe", "1500"}, {"1500", "1077"},
+    {"ann", "1001"}, {"1002", "1002"}, {"ann", "0"},
+};
+
+std::string objectionToDelete(Account const& node)
+{
+    return objectionToUserWrite(node, UserWrite::Delete, accounts).value_or("none");
+}
+
+std::string objectionToChange(Account const& node)
+{
+    return objectionToUserWrite(node, UserWrite::Change, accounts).value_or("none");
+}
+
+TEST(UserDelete, IsRefusedIfTheUidIsTheNameOfAnotherAccount)
+{
+    EXPECT_EQ(objectionToDelete({"jdoe", "1500"}),
+              "userdel would be given the UID 1500, which is the name of another account: '1500' "
+              "would be deleted (use 'mihost call UserDel UserName=jdoe', which keeps the home "
+              "directory)");
+}
+
+TEST(UserDelete, IsRefusedIfTheUidIsNobodysName)
+{
+    EXPECT_EQ(objectionToDelete({"ann", "1001"}),
+              "userdel would be given the UID 1001, but takes names only (use 'mihost call UserDel "
+              "UserName=ann', which keeps the home directory)");
+}
+
+TEST(UserDelete, IsDoneIfTheAccountIsNamedLikeItsOwnUid)
+{
+    EXPECT_EQ(objectionToDelete({"1002", "1002"}), "none");
+}
+
+TEST(UserWrites, ReachTheAccountOfTheNode)
+{
+    for (Account const& account : {accounts[0], accounts[1], accounts[2], accounts[3]})
+        EXPECT_EQ(objectionToChange(account), "none") << account.name;
+}
+
+TEST(UserWrites, AreRefusedIfTheNameIsGoneOrBelongsToAnotherUid)
+{
+    EXPECT_EQ(objectionToChange({"gone", "1001"}),
+              "no account is named 'gone' (run 'mihost refresh')");
+    EXPECT_EQ(objectionToChange({"jdoe", "1501"}),
+              "'jdoe' is now an account with UID 1500, not 1501 (run 'mihost refresh')");
+    // Of two accounts with one name, tools take the first.
+    EXPECT_EQ(objectionToChange({"ann", "0"}),
+              "'ann' is now an account with UID 1001, not 0 (run 'mihost refresh')");
+}
+
+TEST(UserWrites, AreRefusedForEveryByteThatAShellOrAToolWouldActOn)
+{
+    for (int byte = 1; byte < 256; ++byte) {
+        bool const isNamePart =
+            std::isalnum(byte) ||
+            std::string("@+-./_").find(static_cast<char>(byte)) != std::string::npos;
+        for (std::string const& name :
+             {std::string("ab"), std::string("a") + static_cast<char>(byte) + "b"}) {
+            Account const account{name, "1000"};
+            bool const isRefused =
+                objectionToUserWrite(account, UserWrite::Change, {account}).has_value();
+            EXPECT_EQ(isRefused, name.size() == 3 && (byte >= 0x80 || !isNamePart)) << byte;
+        }
+        Account const oddId{"jdoe", std::string("1") + static_cast<char>(byte)};
+        EXPECT_EQ(objectionToUserWrite(oddId, UserWrite::Change, {oddId}).has_value(),
+                  !std::isdigit(byte))
+            << byte;
+    }
+}
+
+} // namespace

@@ -15,7 +15,7 @@ namespace mihost::layerFiles
 namespace
 {
 
-constexpr off_t longestText = 8 * 1024 * 1024;
+constexpr off_t longestText = 8'388'608;
 
 /** As the calls that take an open directory want it. */
 std::string below(std::string const& path)
@@ -115,7 +115,8 @@ bool isWhiteout(struct stat const& status)
 void walk(Descriptor const& root, std::string const& path, Visit const& visit)
 {
     for (std::string const& name : namesIn(openBelow(root, path, O_DIRECTORY), path)) {
-        std::string const place = path + "/" + name;
+        std::string place = path;
+        place.append("/").append(name);
         auto const status = statusOf(root, place);
         if (!status)
             continue; // something still running removed it

@@ -15,7 +15,7 @@ namespace
 {
 
 // Not truncated: first it is seen what it is.
-constexpr int opening = O_WRONLY | O_CREAT | O_CLOEXEC | O_NOCTTY;
+constexpr int writing = O_WRONLY | O_CLOEXEC | O_NOCTTY;
 constexpr mode_t ownersOnly = S_IRUSR | S_IWUSR;
 
 Failure refusal(std::string const& path, std::string const& reason)
@@ -39,13 +39,20 @@ void expectOwnLink(std::string const& path)
         throw refusal(path, "the link belongs to another user (name another file)");
 }
 
+Descriptor create(std::string const& path)
+{
+    return Descriptor(open(path.c_str(), writing | O_CREAT | O_EXCL | O_NOFOLLOW, ownersOnly));
+}
+
 Opened openAny(std::string const& path)
 {
-    Descriptor file(open(path.c_str(), opening | O_NOFOLLOW, ownersOnly));
+    Descriptor file(open(path.c_str(), writing | O_NOFOLLOW));
+    if (!file && errno == ENOENT)
+        file = create(path);
     bool const byLink = !file && errno == ELOOP;
     if (byLink) {
         expectOwnLink(path);
-        file = Descriptor(open(path.c_str(), opening, ownersOnly));
+        file = Descriptor(open(path.c_str(), writing | O_CREAT, ownersOnly));
     }
     if (!file)
         throw cannotWriteTrace(path, errno);
@@ -82,7 +89,7 @@ Descriptor replace(std::string const& path, bool byLink)
         throw cannotWriteTrace(path, problem.value());
     if (unlink(place.c_str()) != 0)
         throw cannotWriteTrace(path, errno);
-    Descriptor file(open(place.c_str(), opening | O_EXCL | O_NOFOLLOW, ownersOnly));
+    Descriptor file = create(place);
     if (!file)
         throw cannotWriteTrace(path, errno);
     return file;

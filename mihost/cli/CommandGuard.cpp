@@ -13,6 +13,10 @@ namespace mihost
 namespace
 {
 
+constexpr std::string_view suseVersionLine =
+    "echo $(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 9)."
+    "$(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 12) | tr -d [:space:]";
+
 /** Command lines of the plug-in that use the shell themselves and hold no text of anybody's. */
 constexpr std::string_view fixedLines[] = {
     "chpasswd -e < usrandpwd ; rm -f usrandpwd",
@@ -21,8 +25,7 @@ constexpr std::string_view fixedLines[] = {
     "stat /etc/redhat-release | grep Change",
     " cat /etc/vmware-release  | tr -d '[:alpha:][:space:][()]'",
     "cat /etc/redhat-release  | tr -d '[:alpha:][:space:][()]'",
-    "echo $(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 9)."
-    "$(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 12) | tr -d [:space:]",
+    suseVersionLine,
 };
 
 /** What the plug-in adds to the arguments, longer ones first. */

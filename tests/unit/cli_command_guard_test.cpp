@@ -32,7 +32,9 @@ TEST(CommandGuard, PassesTheCommandLinesOfThePlugin)
           "/usr/sbin/usermod -G jdoe,\"jdoe\",\"domain users\",\"crew\" \"jdoe\" 2>&1",
           "echo secret | /usr/bin/passwd jdoe --stdin 2>&1",
           "stat /etc/redhat-release | grep Change",
-          "cat /etc/redhat-release  | tr -d '[:alpha:][:space:][()]'"})
+          "cat /etc/redhat-release  | tr -d '[:alpha:][:space:][()]'",
+          "echo $(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 9).$(cat "
+          "/etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 12) | tr -d [:space:]"})
         EXPECT_EQ(objectionToCommand(line), std::nullopt) << line;
 }
 

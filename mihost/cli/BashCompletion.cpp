@@ -44,7 +44,9 @@ std::string bashCompletionText(std::string const& line, std::string const& break
                                NodeNames const& names)
 {
     TypedLine typed = typedLine(line, breaks);
-    typed.words.erase(typed.words.begin()); // the program's name
+    if (typed.words.size() < 2)
+        return completionText({}); // the cursor is in the program's name
+    typed.words.erase(typed.words.begin());
     Completion completion = complete(typed.words, names);
     for (Candidate& candidate : completion.candidates)
         candidate = {quotedForBash(candidate.word.substr(typed.kept), typed.quote), ""};

@@ -45,6 +45,12 @@ TEST(BashCompletionText, HasNoNameWithControlCharactersOrBytesThatAreNoText)
     EXPECT_EQ(inBash("mihost get user:"), "words\nev\\`id\\>x\\`\njdoe\nJürgen\n");
 }
 
+TEST(BashCompletionText, IsEmptyWhileTheProgramIsTyped)
+{
+    for (char const* line : {"", "mihost", "/home/jdoe=x:y/mihost", "'mih"})
+        EXPECT_EQ(inBash(line), "words\n") << line;
+}
+
 TEST(BashCompletionText, LeavesFilesToBash)
 {
     EXPECT_EQ(inBash("mihost --trace "), "files\n");

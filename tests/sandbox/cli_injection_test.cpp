@@ -181,6 +181,19 @@ TEST_F(InjectionInto, AnyArgumentOfAnyCommandReachesNoShell)
     expectHarmless(start);
 }
 
+TEST_F(InjectionInto, AnyOptionOfTheProgramReachesNoShell)
+{
+    for (std::string const& word : hostileWords()) {
+        EXPECT_EQ(mihostRun({"--plugin", word, "tree"}).code, 3) << word;
+        EXPECT_EQ(mihostRun({"--overlay", word, "tree"}).code, 2) << word;
+        EXPECT_EQ(mihostRun({"--lock-timeout", word, "tree"}).code, 2) << word;
+        mihostRun({"--trace", word, "get", "os", "os-name"}); // some are names of files
+        mihostRun({"__complete", word, "get", word});
+        mihostRun({"__complete-bash", "mihost get " + word, word});
+    }
+    expectHarmless(machine::ran());
+}
+
 TEST_F(InjectionInto, AnArgumentWithALineEndReachesNoShell)
 {
     for (Lines const& arguments :

@@ -80,7 +80,7 @@ std::vector<Property> const userProperties = {
     {NODES::passwordExpiration, "password-expiration", V::DateKind, "", P::Acts, Form::Day, "account expiry, as inactive-time; writing a day lets the password expire then"},
     {NODES::lastPwdChange, "last-password-change", V::DateKind, "", P::Plain, Form::Day, "when the password was last changed"},
     {NODES::maxLoginFailures, "max-login-failures", V::NumberKind, "", P::Plain, Form::Digits, "the deny= of /etc/pam.d/login, 0 for none"},
-    {NODES::deleteUser, "delete", V::BooleanKind, "", P::Acts, Form::Free, "reads false; writing true deletes the account, home directory included"},
+    {NODES::deleteUser, "delete", V::BooleanKind, "", P::Acts, Form::Free, "reads false; writing true deletes the account that is named like this UID, home directory included"},
     {NODES::elementCount, "user-count", V::NumberKind, "accounts", P::Live, Form::Digits, "reported accounts at this moment"},
 };
 

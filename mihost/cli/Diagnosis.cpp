@@ -5,6 +5,8 @@
 #include "mihost/cli/FileForms.h"
 #include "mihost/cli/Lines.h"
 #include "mihost/cli/LocalNames.h"
+#include "mihost/cli/PasswordHash.h"
+#include "mihost/cli/Privilege.h"
 #include "nodes/ids.h"
 
 #include <algorithm>
@@ -23,8 +25,6 @@ namespace mihost
 namespace
 {
 
-constexpr char accountFile[] = "/etc/passwd";
-constexpr char groupFile[] = "/etc/group";
 constexpr char rangeFile[] = "/etc/login.defs";
 constexpr char releaseFile[] = "/etc/release";
 constexpr char logFile[] = "/var/log/messages";
@@ -45,7 +45,7 @@ bool isThere(std::string const& path)
 
 struct CommandNeed {
     char const* command;
-    char const* cost;
+    char const* effect;
     char const* debian; // package
     char const* redHat; // package
 };
@@ -104,22 +104,29 @@ Need needOfPath(CommandNeed const& row, Need need)
 
 Need needOf(CommandNeed const& row)
 {
-    Need need{fmt::format("command {}", row.command), std::nullopt, row.cost,
+    Need need{fmt::format("command {}", row.command),
+              std::nullopt,
+              row.effect,
               fmt::format("apt-get install {}", row.debian),
-              fmt::format("dnf install {}", row.redHat)};
+              fmt::format("dnf install {}", row.redHat),
+              ""};
     if (row.command[0] != '/')
         return needOfPath(row, need);
     need.problem = accessProblem(row.command, X_OK);
     return need;
 }
 
-/** Whether passwd takes a password from a pipe; it does not on every distribution. */
-Problem passwordPipeProblem(std::string const& program)
+/** Whether packages of Red Hat and similar systems can be installed. */
+bool hasRedHatPackages()
 {
-    if (commandTap::outputOf("LC_ALL=C " + program + " --help 2>&1").find("--stdin") !=
-        std::string::npos)
-        return std::nullopt;
-    return "passwd does not know it";
+    return isThere("/usr/bin/dnf") || isThere("/usr/bin/yum");
+}
+
+/** Fixed by a package of Red Hat and similar systems only. */
+Need redHatNeed(std::string const& what, Problem const& problem, std::string const& effect,
+                std::string const& redHat, std::string const& noFix)
+{
+    return {what, problem, effect, "", redHat, hasRedHatPackages() ? "" : noFix};
 }
 
 /** Where there is this file, UserAdd gives useradd an option that newer ones do not have. */
@@ -130,22 +137,53 @@ std::vector<Need> groupOption()
     std::string const said = commandTap::outputOf("LC_ALL=C /usr/sbin/useradd -n 2>&1");
     bool const isUnknown = said.find("invalid option") != std::string::npos;
     return {{"useradd -n", isUnknown ? Problem("useradd does not know it") : std::nullopt,
-             "the method UserAdd", "none: it is not asked for there",
-             "none: add accounts with useradd itself"}};
+             "the method UserAdd", "", "",
+             "the useradd of this system has no such option: add accounts with useradd itself"}};
 }
 
 // Surroundings.
 
+struct CapabilityNeed {
+    cap_value_t capability;
+    char const* name;
+    char const* effect;
+};
+
+constexpr CapabilityNeed capabilityNeeds[] = {
+    {CAP_SYS_ADMIN, "CAP_SYS_ADMIN", "--sandbox and --overlay"},
+    {CAP_DAC_OVERRIDE, "CAP_DAC_OVERRIDE", "passwords and ageing of users, every change"},
+    {CAP_CHOWN, "CAP_CHOWN", "every change of accounts and groups"},
+};
+
+/** Root lacks some in containers and in restricted services. */
+std::vector<Need> capabilities()
+{
+    std::vector<Need> needs;
+    for (CapabilityNeed const& row : capabilityNeeds)
+        needs.push_back(
+            {fmt::format("capability {}", row.name),
+             hasCapability(row.capability) ? std::nullopt : Problem("root does not have it here"),
+             row.effect, "", "",
+             "no process can gain it: it has to be granted where this container or service is "
+             "started"});
+    return needs;
+}
+
 std::vector<Need> surroundings()
 {
     char const* const language = std::getenv("LANG");
-    return {
-        {"root's privileges", geteuid() == 0 ? std::nullopt : Problem("not run as root"),
-         "passwords and ageing of users, every change", "sudo mihost", "sudo mihost"},
+    bool const isRoot = geteuid() == 0;
+    std::vector<Need> needs = {
+        {"root's privileges", isRoot ? std::nullopt : Problem("not run as root"),
+         "passwords and ageing of users, every change", "sudo mihost", "sudo mihost", ""},
         {"locale in LANG", language && *language ? std::nullopt : Problem("LANG is not set"),
          "language-edition and code-set of os", "update-locale LANG=C.UTF-8",
-         "localectl set-locale LANG=C.UTF-8"},
+         "localectl set-locale LANG=C.UTF-8", ""},
     };
+    if (isRoot)
+        for (Need const& need : capabilities())
+            needs.push_back(need);
+    return needs;
 }
 
 std::vector<Need> commandLines()
@@ -153,11 +191,12 @@ std::vector<Need> commandLines()
     std::vector<Need> needs;
     for (CommandNeed const& row : commandNeeds)
         needs.push_back(needOf(row));
-    if (std::string const passwd = "/usr/bin/passwd"; !accessProblem(passwd, X_OK))
-        needs.push_back({"passwd --stdin", passwordPipeProblem(passwd),
-                         "Password in methods: what is stored opens nothing",
-                         "openssl passwd -6 | mihost set user:NAME password -",
-                         "dnf install passwd"});
+    if (isThere("/usr/bin/passwd"))
+        needs.push_back(redHatNeed(
+            "passwd --stdin",
+            passwdReadsStdin() ? std::nullopt : Problem("passwd does not know it"),
+            "Password in methods: mihost passes a hash, other hosts store the plain text",
+            "dnf install passwd", "the passwd of this system has no such option"));
     return needs;
 }
 
@@ -171,28 +210,29 @@ std::vector<Need> accounts()
     std::vector<Need> needs = {
         {"id ranges in /etc/login.defs",
          isThere(rangeFile) ? problemOfRanges(contentOf(rangeFile)) : accessProblem(rangeFile),
-         "ordinary users, ordinary groups", missingConfiguration, "dnf reinstall shadow-utils"},
+         "ordinary users, ordinary groups", missingConfiguration, "dnf reinstall shadow-utils", ""},
         {"accounts in /etc/passwd", accessProblem(accountFile), "all users",
-         "cp /usr/share/base-passwd/passwd.master /etc/passwd", "dnf reinstall setup"},
+         "cp /usr/share/base-passwd/passwd.master /etc/passwd", "dnf reinstall setup", ""},
         {"groups in /etc/group", accessProblem(groupFile), "all groups",
-         "cp /usr/share/base-passwd/group.master /etc/group", "dnf reinstall setup"},
+         "cp /usr/share/base-passwd/group.master /etc/group", "dnf reinstall setup", ""},
         {"login failures in /etc/pam.d/login", accessProblem("/etc/pam.d/login"),
-         "max-login-failures of users", missingConfiguration, "dnf reinstall util-linux"},
+         "max-login-failures of users", missingConfiguration, "dnf reinstall util-linux", ""},
         {"passwords in /etc/shadow", accessProblem(shadowFile), "passwords and ageing of users",
-         "sudo mihost, or pwconv", "sudo mihost, or pwconv"},
+         "sudo mihost, or pwconv", "sudo mihost, or pwconv", ""},
     };
     if (isThere(accountFile))
         needs.push_back({"form of /etc/passwd", problemOfAccounts(contentOf(accountFile)),
-                         "that user; behind a line that is too long, all users", "vipw", "vipw"});
+                         "that user; after a line that is too long, all users", "vipw", "vipw",
+                         ""});
     if (isThere(groupFile))
         needs.push_back({"form of /etc/group", problemOfGroups(contentOf(groupFile)), "that group",
-                         "vigr", "vigr"});
+                         "vigr", "vigr", ""});
     if (isThere(accountFile) && isThere(shadowFile))
         needs.push_back(
             {"order of /etc/shadow",
              problemOfShadow(localNames(*findKind(NODES::userType)), contentOf(shadowFile)),
-             "passwords and ageing of that user and of all behind it", "pwconv; pwck -s",
-             "pwconv; pwck -s"});
+             "passwords and ageing of that user and of all after it", "pwconv; pwck -s",
+             "pwconv; pwck -s", ""});
     return needs;
 }
 
@@ -220,14 +260,14 @@ std::vector<Need> release()
         "\"$VERSION_ID\") >/etc/release";
     std::string const install = "dnf install system-release";
     return {
-        {"name in a release file", noneOf(named), "os-name of os: it says Linux", write, install},
-        {"version in a release file", version, "os-version of os", write, install},
-        {"date of a release file", noneOf(dated), "install-date of os",
-         "none: such a file would make it another distribution", install},
+        {"name in a release file", noneOf(named), "os-name is just \"Linux\"", write, install, ""},
+        {"version in a release file", version, "os-version of os", write, install, ""},
+        redHatNeed("date of a release file", noneOf(dated), "install-date of os", install,
+                   "such a file would make this another distribution"),
     };
 }
 
-/** Why no module is listed. Nothing where lsmod is missing, which is told by itself. */
+/** Why no module is listed. Empty if lsmod is missing; that is reported separately. */
 Problem emptyModuleList(std::string const& file)
 {
     bool const isListed = linesOf(commandTap::outputOf("lsmod 2>/dev/null")).size() > 1;
@@ -241,10 +281,11 @@ Problem emptyModuleList(std::string const& file)
 std::vector<Need> modules()
 {
     std::string const file = "/proc/modules";
-    std::string const advice =
-        isThere(file) ? "modprobe MODULE" : "none: the kernel is of one piece";
-    std::vector<Need> needs = {
-        {"loaded kernel modules", emptyModuleList(file), "all drivers", advice, advice}};
+    bool const takesModules = isThere(file);
+    std::string const advice = takesModules ? "modprobe MODULE" : "";
+    std::vector<Need> needs = {{"loaded kernel modules", emptyModuleList(file), "all drivers",
+                                advice, advice,
+                                takesModules ? "" : "this kernel has no loadable modules"}};
     utsname system{};
     if (linesOf(contentOf(file)).empty() || uname(&system) != 0)
         return needs;
@@ -252,7 +293,7 @@ std::vector<Need> modules()
                      accessProblem(fmt::format("/lib/modules/{}", system.release)),
                      "versions and descriptions of drivers",
                      "apt-get install linux-image-$(uname -r)",
-                     "dnf install kernel-modules-$(uname -r)"});
+                     "dnf install kernel-modules-$(uname -r)", ""});
     return needs;
 }
 
@@ -284,13 +325,13 @@ std::vector<Need> log()
         {"system log in /var/log/messages", accessProblem(logFile), "all log entries",
          "apt-get install rsyslog; echo '*.info;authpriv.none -/var/log/messages;"
          "RSYSLOG_TraditionalFileFormat' >/etc/rsyslog.d/messages.conf; systemctl restart rsyslog",
-         "dnf install rsyslog; systemctl enable --now rsyslog"}};
+         "dnf install rsyslog; systemctl enable --now rsyslog", ""}};
     if (!isThere(logFile))
         return needs;
     needs.push_back({"classic stamps in the system log", problemOfStamps(newestLogLines()),
-                     "messages and times of log entries", traditional, traditional});
+                     "messages and times of log entries", traditional, traditional, ""});
     needs.push_back({"leave to empty the system log", accessProblem(logFile, W_OK), "clear-log",
-                     "sudo mihost", "sudo mihost"});
+                     "sudo mihost", "sudo mihost", ""});
     return needs;
 }
 

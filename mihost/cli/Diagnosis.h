@@ -8,13 +8,14 @@
 namespace mihost
 {
 
-/** One thing that a full tree needs. */
+/** One thing that a full tree, or a change, needs. */
 struct Need {
     std::string what;
-    std::optional<std::string> problem; // nothing where all is well
-    std::string cost;                   // what suffers without it
-    std::string debian;                 // what mends it on Debian and its kin
-    std::string redHat;                 // and on Red Hat and its kin
+    std::optional<std::string> problem; // nothing if all is well
+    std::string effect;                 // what suffers without it
+    std::string debian;                 // the fix on Debian and similar systems; empty for none
+    std::string redHat;                 // and on Red Hat and similar systems
+    std::string noFix;                  // why nothing on this machine fixes it; empty if it can be
 };
 
 /**

@@ -54,16 +54,36 @@ protected:
     }
 
     static void expectMissing(std::string const& name, std::string const& problem,
-                              std::string const& cost)
+                              std::string const& effect)
     {
         Json const found = need(name);
         ASSERT_FALSE(found.is_null()) << name;
         EXPECT_EQ(found["ok"], false) << name;
         EXPECT_EQ(found["problem"], problem) << name;
-        EXPECT_EQ(found["cost"], cost) << name;
-        EXPECT_NE(found["debian"], "") << name;
-        EXPECT_NE(found["red-hat"], "") << name;
+        EXPECT_EQ(found["effect"], effect) << name;
+        EXPECT_EQ(found["fixable"], true) << name;
+        EXPECT_EQ(found["no-fix"], nullptr) << name;
+        EXPECT_TRUE(found["red-hat"].is_string()) << name;
         EXPECT_EQ(mihostRun({"doctor"}).code, 1) << name;
+    }
+
+    /** That this is all that is missing, and nothing here fixes it. */
+    static void expectNoFix(std::string const& name, std::string const& problem,
+                            std::string const& why)
+    {
+        Json const found = need(name);
+        ASSERT_FALSE(found.is_null()) << name;
+        EXPECT_EQ(found["ok"], false) << name;
+        EXPECT_EQ(found["problem"], problem) << name;
+        EXPECT_EQ(found["fixable"], false) << name;
+        EXPECT_EQ(found["no-fix"], why) << name;
+        Outcome const outcome = mihostRun({"doctor"});
+        EXPECT_EQ(outcome.code, 0) << outcome.out;
+        EXPECT_NE(outcome.out.find("no fix   " + name + ": " + problem + "\n"), std::string::npos)
+            << outcome.out;
+        EXPECT_NE(outcome.out.find("           no fix   " + why + "\n"), std::string::npos)
+            << outcome.out;
+        EXPECT_NE(outcome.out.find(" 1 cannot be fixed here\n"), std::string::npos) << outcome.out;
     }
 
     /** Follows the advice for Debian. */
@@ -94,13 +114,13 @@ TEST_F(Doctor, LoadsNoPlugin)
     EXPECT_EQ(mihostRun({"--plugin", "/none.so", "doctor"}).code, 0);
 }
 
-TEST_F(Doctor, ShowsWhatIsMissingLastWithItsCostAndWhatMendsIt)
+TEST_F(Doctor, ShowsWhatIsMissingLastWithItsEffectAndFix)
 {
     machine::remove("/usr/sbin/lsmod");
     machine::remove("/usr/bin/lsmod");
     std::string const out = mihostRun({"doctor"}).out;
     std::string const told = "missing  command lsmod: not found in PATH\n"
-                             "           costs    all drivers\n"
+                             "           effect   all drivers\n"
                              "           Debian   apt-get install kmod\n"
                              "           Red Hat  dnf install kmod\n"
                              "1 of ";
@@ -151,17 +171,46 @@ TEST_F(Doctor, TellsACommandThatIsThereFromAPathThatIsTooShort)
 TEST_F(Doctor, MissesAPasswdThatTakesPasswordsFromAPipe)
 {
     machine::fake("/usr/bin/passwd", "echo 'nothing of the kind'\n");
+    expectNoFix("passwd --stdin", "passwd does not know it",
+                "the passwd of this system has no such option");
+    machine::fake("/usr/bin/dnf", "");
     expectMissing("passwd --stdin", "passwd does not know it",
-                  "Password in methods: what is stored opens nothing");
+                  "Password in methods: mihost passes a hash, other hosts store the plain text");
 }
 
 TEST_F(Doctor, MissesAUseraddThatKnowsTheOptionOfItsFamily)
 {
     machine::fake("/usr/sbin/useradd",
                   "[ \"$*\" = -n ] && echo \"useradd: invalid option -- 'n'\"\n");
-    expectMissing("useradd -n", "useradd does not know it", "the method UserAdd");
+    expectNoFix("useradd -n", "useradd does not know it",
+                "the useradd of this system has no such option: add accounts with useradd itself");
     machine::remove("/etc/redhat-release");
     EXPECT_EQ(need("useradd -n"), nullptr);
+}
+
+TEST_F(Doctor, ExitsWith1WhereOneThingOfTwoCanBeFixed)
+{
+    machine::fake("/usr/bin/passwd", "echo 'nothing of the kind'\n");
+    machine::remove("/usr/sbin/groupdel");
+    Outcome const outcome = mihostRun({"doctor"});
+    EXPECT_EQ(outcome.code, 1);
+    EXPECT_NE(outcome.out.find("2 of "), std::string::npos) << outcome.out;
+    EXPECT_GT(outcome.out.find("missing  command"), outcome.out.find("no fix   passwd"));
+}
+
+TEST_F(Doctor, NamesTheCapabilityThatRootLacks)
+{
+    Outcome const outcome =
+        runToEnd({"/usr/bin/setpriv", "--inh-caps=-sys_admin", "--bounding-set=-sys_admin",
+                  MIHOST_FILE, "--json", "doctor"});
+    EXPECT_EQ(outcome.code, 0) << outcome.out;
+    std::vector<std::string> missing;
+    for (Json const& each : Json::parse(outcome.out))
+        if (each["ok"] == false)
+            missing.push_back(each["need"].get<std::string>() + ": " +
+                              each["effect"].get<std::string>());
+    EXPECT_EQ(missing, std::vector<std::string>{"capability CAP_SYS_ADMIN: --sandbox and "
+                                                "--overlay"});
 }
 
 TEST_F(Doctor, MissesALocale)
@@ -189,7 +238,7 @@ TEST_F(Doctor, MissesAccountFilesAndTheirForm)
     EXPECT_EQ(need("form of /etc/group"), nullptr);
     machine::write("/etc/passwd", "root:x:0:0::/:/bin/sh\nnonsense\n");
     expectMissing("form of /etc/passwd", "line 2 is malformed",
-                  "that user; behind a line that is too long, all users");
+                  "that user; after a line that is too long, all users");
     machine::remove("/etc/passwd");
     expectMissing("accounts in /etc/passwd", "No such file or directory", "all users");
     machine::remove("/etc/pam.d/login");
@@ -199,13 +248,13 @@ TEST_F(Doctor, MissesAccountFilesAndTheirForm)
 
 TEST_F(Doctor, MissesShadowEntriesInTheirOrderAndKnowsHowToSortThem)
 {
-    std::string const cost = "passwords and ageing of that user and of all behind it";
+    std::string const effect = "passwords and ageing of that user and of all after it";
     machine::write("/etc/shadow",
                    "bin:*:19000:0:99999:7:::\nben:!:19000:0:99999:7:::\n"
                    "anna:!:19000:0:99999:7:::\nroot:*:19000:0:99999:7:::\n",
                    0600);
     expectMissing("order of /etc/shadow",
-                  "no entry for 'anna' where the order of /etc/passwd wants it", cost);
+                  "no entry for 'anna' where the order of /etc/passwd wants it", effect);
     follow(need("order of /etc/shadow"));
     EXPECT_EQ(need("order of /etc/shadow")["ok"], true);
     machine::remove("/etc/shadow");
@@ -218,12 +267,12 @@ TEST_F(Doctor, MissesAReleaseFileAndKnowsHowToWriteOne)
 {
     machine::remove("/etc/redhat-release");
     machine::write("/etc/os-release", "PRETTY_NAME=\"Some System 12\"\nVERSION_ID=\"12\"\n");
-    expectMissing("date of a release file", "none of the files that are known",
-                  "install-date of os");
+    EXPECT_EQ(need("date of a release file")["no-fix"],
+              "such a file would make this another distribution");
     expectMissing("version in a release file", "none of the files that are known",
                   "os-version of os");
     expectMissing("name in a release file", "none of the files that are known",
-                  "os-name of os: it says Linux");
+                  "os-name is just \"Linux\"");
     follow(need("name in a release file"));
     EXPECT_EQ(need("name in a release file")["ok"], true);
     EXPECT_EQ(need("version in a release file")["ok"], true);
@@ -270,7 +319,8 @@ TEST_F(Doctor, NeverObeysWhatALogLineHolds)
 TEST_F(Doctor, MissesLoadedModulesAndAKernelThatHasAny)
 {
     machine::fake("/usr/sbin/lsmod", "echo 'Error: no list' >&2\nexit 1\n");
-    expectMissing("loaded kernel modules", "this kernel has no /proc/modules", "all drivers");
+    expectNoFix("loaded kernel modules", "this kernel has no /proc/modules",
+                "this kernel has no loadable modules");
     machine::fake("/usr/sbin/lsmod", "echo Module Size Used by\n");
     machine::write("/proc/modules", "");
     expectMissing("loaded kernel modules", "none is loaded", "all drivers");
@@ -287,6 +337,7 @@ TEST_F(Doctor, MissesRootsPrivilegesWhereItHasNone)
     Outcome const outcome = runToEnd(
         {"/usr/bin/setpriv", "--reuid=65534", "--clear-groups", MIHOST_FILE, "--json", "doctor"});
     EXPECT_EQ(outcome.code, 1);
+    EXPECT_EQ(outcome.out.find("capability"), std::string::npos); // a user has none
     int found = 0;
     for (Json const& need : Json::parse(outcome.out))
         for (char const* name :

@@ -14,6 +14,7 @@ namespace
 constexpr int firstYear = 1901; // years before it the plug-in takes for none
 constexpr int lastYear = 9999;
 constexpr std::size_t dayLength = 10;
+constexpr long dayOf1970 = 719468; // counted from March 1 of year 0
 
 /** Whether the text looks like the pattern, where 0 stands for any digit. */
 bool looksLike(std::string_view text, std::string_view pattern)
@@ -71,6 +72,35 @@ std::optional<Day> parseDateTime(std::string_view text)
 std::string dateTimeText(Day const& day)
 {
     return fmt::format("{:04}{:02}{:02}000000.000000+000", day.year, day.month, day.day);
+}
+
+std::string dayText(Day const& day)
+{
+    return fmt::format("{:04}-{:02}-{:02}", day.year, day.month, day.day);
+}
+
+long dayNumber(Day const& day)
+{
+    // Years begin in March here, so that the day that comes and goes is their last.
+    int const year = day.month > 2 ? day.year : day.year - 1;
+    int const month = day.month > 2 ? day.month - 3 : day.month + 9;
+    int const dayOfYear = (153 * month + 2) / 5 + day.day - 1;
+    return 365L * year + year / 4 - year / 100 + year / 400 + dayOfYear - dayOf1970;
+}
+
+std::optional<Day> dayOfNumber(long number)
+{
+    if (number < dayNumber({firstYear, 1, 1}) || number > dayNumber({lastYear, 12, 31}))
+        return std::nullopt;
+    int year = static_cast<int>(1970 + number / 366); // at most a few years early or late
+    while (dayNumber({year, 1, 1}) > number)
+        --year;
+    while (dayNumber({year + 1, 1, 1}) <= number)
+        ++year;
+    int month = 12;
+    while (dayNumber({year, month, 1}) > number)
+        --month;
+    return Day{year, month, static_cast<int>(number - dayNumber({year, month, 1})) + 1};
 }
 
 std::optional<long> parseTime(std::string_view text)

@@ -27,6 +27,15 @@ std::optional<Day> parseDateTime(std::string_view text);
 /** The day as such a date-time. */
 std::string dateTimeText(Day const& day);
 
+/** The day as YYYY-MM-DD. */
+std::string dayText(Day const& day);
+
+/** Days since 1970, as the shadow file counts. */
+long dayNumber(Day const& day);
+
+/** The day of such a number; nothing if its year cannot be written. */
+std::optional<Day> dayOfNumber(long number);
+
 /** Seconds since 1970 of a point in local time, written as timeForm says. */
 std::optional<long> parseTime(std::string_view text);
 

@@ -75,12 +75,4 @@ Json toJson(NodeView const& view)
     return object;
 }
 
-Json toJson(IC::Error const& error)
-{
-    Json object;
-    object["status"] = error.getStatus();
-    object["text"] = toJson(error.getText());
-    return object;
-}
-
 } // namespace mihost

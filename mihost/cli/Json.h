@@ -17,9 +17,6 @@ Json toJson(std::string const& text);
 Json toJson(PropertyView const& property);
 Json toJson(NodeView const& node);
 
-/** What set, call and their kin answer. */
-Json toJson(IC::Error const& error);
-
 } // namespace mihost
 
 #endif

@@ -159,15 +159,6 @@ std::string valueOf(MethodCall const& call, std::string_view name)
     return found == call.arguments.end() ? "" : found->value;
 }
 
-std::string secretOf(MethodCall const& call)
-{
-    auto const found =
-        std::find_if(call.arguments.begin(), call.arguments.end(), [](auto const& argument) {
-            return argument.parameter->form == Form::Password;
-        });
-    return found == call.arguments.end() ? "" : found->value;
-}
-
 std::string dangerOf(MethodCall const& call)
 {
     bool const deletes = std::string_view(call.method->name) == "UserDel";

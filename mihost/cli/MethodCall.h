@@ -47,9 +47,6 @@ std::string textOf(MethodCall const& call);
 /** The value of a parameter, empty where it is not given. */
 std::string valueOf(MethodCall const& call, std::string_view name);
 
-/** The plain password in it, empty for none. */
-std::string secretOf(MethodCall const& call);
-
 /** What must be confirmed before it is carried out; empty for nothing. */
 std::string dangerOf(MethodCall const& call);
 

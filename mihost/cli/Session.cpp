@@ -34,7 +34,8 @@ Session::Session(Options options)
 {
     if (!options_.trace.empty()) {
         trace_ = std::make_unique<Trace>(options_.trace);
-        sinks_.add(trace_->sink());
+        traceSink_ = std::make_unique<RedactingSink>(trace_->sink());
+        sinks_.add(*traceSink_);
     }
     if (options_.fast)
         accelerator_ = std::make_unique<Accelerator>();

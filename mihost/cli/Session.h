@@ -10,6 +10,7 @@
 #include "mihost/cli/Phases.h"
 #include "mihost/cli/Plugin.h"
 #include "mihost/cli/PrivateDirectory.h"
+#include "mihost/cli/Redaction.h"
 #include "mihost/cli/Timing.h"
 #include "mihost/cli/Trace.h"
 
@@ -100,6 +101,7 @@ private:
     std::unique_ptr<Accelerator> accelerator_;
     std::unique_ptr<PrivateDirectory> directory_;
     std::unique_ptr<Plugin> plugin_;
+    std::unique_ptr<RedactingSink> traceSink_;
     SinkGroup sinks_; // the last, so that no message comes in while the others go
 };
 

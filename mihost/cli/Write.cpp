@@ -2,17 +2,22 @@
 
 #include "mihost/cli/AccountFiles.h"
 #include "mihost/cli/CommandTap.h"
+#include "mihost/cli/Decimal.h"
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/Interrupts.h"
 #include "mihost/cli/Lines.h"
+#include "mihost/cli/Redaction.h"
 #include "mihost/cli/SandboxChanges.h"
 #include "mihost/cli/Say.h"
+#include "mihost/cli/WriteReport.h"
 #include "mihost/runtime/Text.h"
 #include "mihost/sandbox/Sandbox.h"
-#include "nodes/ids.h"
 
+#include <algorithm>
 #include <filesystem>
 #include <fmt/format.h>
+#include <fmt/ranges.h>
+#include <sys/wait.h>
 
 namespace mihost
 {
@@ -22,137 +27,213 @@ namespace
 
 using commandTap::RunCommand;
 
+/** What was found after the plug-in had carried a write out. */
 struct Result {
     IC::Error error;
     std::vector<RunCommand> commands;
-    AccountFiles accounts; // as they are afterwards
+    bool hasNewAccounts; // the account files differ
     std::vector<FileChange> changes;
-    std::string complaints; // what the commands wrote to their standard error
+    std::vector<std::string> before; // what the expectations found
+    std::vector<std::string> after;
+    std::vector<std::string> complaints; // lines that commands wrote to their standard error
 };
+
+std::vector<std::string> findings(std::vector<Expectation> const& expectations)
+{
+    std::vector<std::string> all;
+    for (Expectation const& expectation : expectations)
+        all.push_back(expectation.actual());
+    return all;
+}
 
 Result perform(Write const& write, Secrets secrets)
 {
     interrupts::Held const held;
-    commandTap::Recording const recording;
+    RedactingSink::Hiding const hiding(write.secrets);
+    std::vector<std::string> const foundBefore = findings(write.expectations);
+    AccountFiles const accounts = readAccountFiles();
+    CopyState const copy = CopyState::read();
     commandTap::takeStandardError();
-    CopyState const before = CopyState::read();
-    Result result{write.node.setProperty(write.property, write.value), {}, {}, {}, {}};
+    commandTap::Recording const recording;
+    Result result{
+        write.node.setProperty(write.property, write.value), {}, false, {}, foundBefore, {}, {}};
     for (RunCommand const& command : recording.commands())
-        result.commands.push_back({withoutSecret(command.line, write.secret),
-                                   withoutSecret(command.output, write.secret), command.status});
-    result.accounts = readAccountFiles();
-    result.changes =
-        shownChanges(before.changesTo(CopyState::read()), std::filesystem::current_path(), secrets);
-    result.complaints = withoutSecret(commandTap::takeStandardError(), write.secret);
+        result.commands.push_back({withoutSecrets(command.line, write.secrets),
+                                   withoutSecrets(command.output, write.secrets), command.status});
+    result.complaints = linesOf(withoutSecrets(commandTap::takeStandardError(), write.secrets));
+    result.changes = changesBetween(accounts, readAccountFiles(), secrets);
+    result.hasNewAccounts = !result.changes.empty();
+    if (inSandbox()) // where every file can be compared
+        result.changes = shownChanges(copy.changesTo(CopyState::read()),
+                                      std::filesystem::current_path(), secrets);
+    result.after = findings(write.expectations);
     return result;
 }
 
-Json documentOf(Result const& result)
+constexpr std::string_view statusMark = "rc="; // the plug-in has useradd's exit status printed so
+
+/** The words of a command, without the status line. */
+std::vector<std::string> wordsOf(RunCommand const& command)
 {
-    Json document = toJson(result.error);
-    if (!inSandbox())
-        return document;
-    Json commands = Json::array();
-    for (RunCommand const& command : result.commands)
-        commands.push_back({{"command", toJson(command.line)}, {"output", toJson(command.output)}});
-    document["commands"] = commands;
-    document["changes"] = toJson(result.changes);
-    return document;
+    std::vector<std::string> lines = linesOf(command.output);
+    lines.erase(std::remove_if(lines.begin(), lines.end(),
+                               [](std::string const& line) {
+                                   return line.empty() || line.rfind(statusMark, 0) == 0;
+                               }),
+                lines.end());
+    return lines;
 }
 
-/** One line of a command's output; tabs stay, since they lay it out. */
-std::string shown(std::string const& line)
+bool hasFailed(RunCommand const& command)
 {
-    std::string text;
-    std::size_t start = 0;
-    for (std::size_t tab = 0; (tab = line.find('\t', start)) != std::string::npos; start = tab + 1)
-        text += printable(line.substr(start, tab - start)) + '\t';
-    return text + printable(line.substr(start));
-}
-
-void writeText(Result const& result, Output& out)
-{
-    for (RunCommand const& command : result.commands) {
-        out.line("ran  " + printable(command.line));
-        for (std::string const& line : linesOf(command.output))
-            out.line("     " + shown(line));
-    }
-    writeText(result.changes, out);
+    if (command.status != 0)
+        return true;
+    std::vector<std::string> const lines = linesOf(command.output);
+    if (lines.empty() || lines.back().rfind(statusMark, 0) != 0)
+        return false;
+    return parseDecimal(std::string_view(lines.back()).substr(statusMark.size())) != 0U;
 }
 
 /**
- * What the last command that said anything said first: mostly why it failed. Empty where none did.
+ * The plug-in offers every password to passwd, also where that refuses; the password itself is
+ * among the expectations.
  */
-std::string likelyReason(std::vector<RunCommand> const& commands)
+bool isPasswordOffer(RunCommand const& command)
 {
-    for (auto command = commands.rbegin(); command != commands.rend(); ++command)
-        for (std::string const& line : linesOf(command->output))
-            if (!line.empty() && line.rfind("rc=", 0) != 0)
-                return line;
+    return command.line.find(" | /usr/bin/passwd ") != std::string::npos;
+}
+
+/** Whether what the command printed is an answer to the plug-in rather than a complaint. */
+bool isAnswer(RunCommand const& command)
+{
+    bool const isQuery = command.line.compare(0, 12, "/usr/bin/id ") == 0 ||
+                         command.line.compare(0, 9, "chage -l ") == 0;
+    return isPasswordOffer(command) || (isQuery && command.status == 0);
+}
+
+/** What the last command that complained said first: mostly why it failed. Empty for nothing. */
+std::string lastWords(Result const& result)
+{
+    for (auto command = result.commands.rbegin(); command != result.commands.rend(); ++command)
+        if (auto const words = wordsOf(*command); !isAnswer(*command) && !words.empty())
+            return words.front();
+    return result.complaints.empty() ? "" : result.complaints.front();
+}
+
+std::string statusText(int status)
+{
+    return WIFEXITED(status) ? fmt::format("exit status {}", WEXITSTATUS(status))
+                             : fmt::format("signal {}", WTERMSIG(status));
+}
+
+/** The first expectation that does not hold; empty if all do. */
+std::string unmet(Write const& write, Result const& result)
+{
+    for (std::size_t at = 0; at < write.expectations.size(); ++at) {
+        Expectation const& expectation = write.expectations[at];
+        if (result.after[at] != expectation.wanted)
+            return fmt::format("{} is {}, not {}", expectation.subject, result.after[at],
+                               expectation.wanted);
+    }
     return "";
 }
 
-void warnOfPlainPassword(AccountFiles const& accounts, std::string const& password)
+/** The first command that failed; empty for none. */
+std::string failedCommand(Result const& result)
 {
-    auto const shadow = accounts.find(shadowFile);
-    if (password.empty() || shadow == accounts.end())
-        return;
-    for (std::string const& line : shadow->second) {
-        std::size_t const first = line.find(':');
-        std::size_t const second = line.find(':', first + 1);
-        if (first != std::string::npos && line.substr(first + 1, second - first - 1) == password)
-            say(fmt::format(
-                "mihost: the password of '{}' now stands in {} as it is and opens nothing: "
-                "/usr/bin/passwd here does not take passwords from a pipe; set it with "
-                "passwd\n",
-                printable(line.substr(0, first)), shadowFile));
-    }
+    for (RunCommand const& command : result.commands)
+        if (hasFailed(command) && !isPasswordOffer(command))
+            return fmt::format("a command failed: '{}', {}", command.line,
+                               statusText(command.status));
+    return "";
 }
 
-bool endsWord(char character)
+bool ranTool(Write const& write, Result const& result)
 {
-    return std::string_view(" \t\n'\"`:").find(character) != std::string_view::npos;
+    return std::any_of(result.commands.begin(), result.commands.end(), [&write](auto const& each) {
+        return each.line.compare(0, write.tool.size(), write.tool) == 0;
+    });
+}
+
+bool isChanged(Write const& write, Result const& result, bool hasFailed)
+{
+    bool const isToolsChange = !write.tool.empty() && !hasFailed;
+    return write.acts && (result.hasNewAccounts || result.before != result.after || isToolsChange);
+}
+
+/** Why the write failed, without the commands' words; empty if it did not. */
+std::string problemOf(Write const& write, Result const& result)
+{
+    std::string const failed = failedCommand(result);
+    std::string const missed = unmet(write, result);
+    // The plug-in also fails what an account tool comments on, such as "no changes".
+    bool const isAsAsked = !write.expectations.empty() && missed.empty() && failed.empty() &&
+                           !result.commands.empty() && !isChanged(write, result, false);
+    if (result.error.getStatus() != 0)
+        return isAsAsked
+                   ? ""
+                   : fmt::format("the plug-in answered {}", static_cast<std::string>(result.error));
+    if (!missed.empty())
+        return missed;
+    if (!write.tool.empty() && !ranTool(write, result))
+        return fmt::format("{} was not started", write.tool);
+    return failed;
+}
+
+WriteReport judged(Write const& write, Result const& result)
+{
+    std::string problem = problemOf(write, result);
+    WriteReport report{"", isChanged(write, result, !problem.empty()), result.changes,
+                       write.warnings, result.commands};
+    std::vector<std::string> complaints = result.complaints;
+    if (!problem.empty()) {
+        std::string const words = lastWords(result);
+        if (!words.empty())
+            problem += "; a command said: " + words;
+        report.error = problem;
+        complaints.erase(std::remove(complaints.begin(), complaints.end(), words),
+                         complaints.end());
+    }
+    for (std::string const& line : complaints)
+        report.warnings.push_back("a command said: " + line);
+    return report;
+}
+
+/** Says that everything was as asked for already. */
+void tellUnchanged(Write const& write)
+{
+    std::vector<std::string> facts;
+    for (Expectation const& expectation : write.expectations)
+        facts.push_back(fmt::format("{} is already {}", expectation.subject, expectation.wanted));
+    say(fmt::format("mihost: nothing changed: {}\n",
+                    printable(fmt::format("{}", fmt::join(facts, ", ")))));
+}
+
+void warn(std::string const& text)
+{
+    say(fmt::format("mihost: {}\n", printable(text)));
 }
 
 } // namespace
 
-std::string withoutSecret(std::string const& text, std::string const& secret)
-{
-    if (secret.empty())
-        return text;
-    std::string result;
-    std::size_t start = 0;
-    while (start <= text.size()) {
-        std::size_t end = start;
-        while (end < text.size() && !endsWord(text[end]))
-            ++end;
-        std::string const word = text.substr(start, end - start);
-        result += word == secret ? "(hidden)" : word;
-        if (end < text.size())
-            result += text[end];
-        start = end + 1;
-    }
-    return result;
-}
-
 void carryOut(Session& session, Write const& write)
 {
+    for (std::string const& warning : write.warnings)
+        warn(warning);
     Result const result = perform(write, session.secrets());
+    WriteReport const report = judged(write, result);
     if (session.options().json)
-        session.out().json(documentOf(result));
+        session.out().json(toJson(report));
     else if (inSandbox())
-        writeText(result, session.out());
+        writeText(report, session.out());
     session.out().flush();
-    for (std::string const& line : linesOf(result.complaints))
-        say(fmt::format("mihost: a command said: {}\n", printable(line)));
-    if (write.property == NODES::createUser)
-        warnOfPlainPassword(result.accounts, write.secret);
-    if (result.error.getStatus() == 0)
-        return;
-    std::string const reason = likelyReason(result.commands);
-    throw Failure(PluginRefused,
-                  fmt::format("the plug-in answered {}{}{}", static_cast<std::string>(result.error),
-                              reason.empty() ? "" : "; a command said: ", reason));
+    for (std::size_t at = write.warnings.size(); at < report.warnings.size(); ++at)
+        warn(report.warnings[at]);
+    if (!report.error.empty())
+        throw Failure(PluginRefused, fmt::format("{}: {}", write.what, report.error));
+    bool const isUnchanged = write.acts && !report.changed && !write.expectations.empty();
+    if (isUnchanged && !session.options().json)
+        tellUnchanged(write);
 }
 
 } // namespace mihost

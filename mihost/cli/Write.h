@@ -1,31 +1,37 @@
 #ifndef MIHOST_CLI_WRITE_H
 #define MIHOST_CLI_WRITE_H
 
+#include "mihost/cli/Expectation.h"
 #include "mihost/cli/Session.h"
 
 #include <string>
+#include <vector>
 
 namespace mihost
 {
 
 /** One write of a property, to be carried out. */
 struct Write {
+    std::string what; // such as "call UserAdd"
     IC::MutableNode& node;
     unsigned int property;
     IC::PropertyValue value;
-    std::string secret; // never shown, wherever it turns up; empty for none
+    bool acts; // on the machine, not only in the tree
+    std::vector<Expectation> expectations;
+    std::vector<std::string> secrets;  // shown nowhere
+    std::vector<std::string> warnings; // what the user should know first
+    std::string tool;                  // the command whose success is the change; empty for none
 };
 
 /**
- * Carries the write out and tells what came of it. In a sandbox that includes the commands that
- * were run, their output, and the lines that changed in the account files.
+ * Gives the warnings, carries the write out, checks that what it asked for holds now, and reports
+ * what changed. In a sandbox that includes the commands that were run and their output.
  *
- * @throws Failure (PluginRefused) where the plug-in answers with a non-zero status
+ * A write that finds everything as it asked for succeeds and says that nothing changed.
+ *
+ * @throws Failure (PluginRefused) if the plug-in or a command refuses, or the change is not there
  */
 void carryOut(Session& session, Write const& write);
-
-/** The text with each word that is the secret replaced; words end at blanks and quotes. */
-std::string withoutSecret(std::string const& text, std::string const& secret);
 
 } // namespace mihost
 

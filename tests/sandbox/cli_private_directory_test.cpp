@@ -142,7 +142,7 @@ TEST_F(MihostPrivateDirectory, IsRemovedWhereAFileGrowsTooLong)
 TEST_F(MihostPrivateDirectory, LeavesTheFileSizeSignalToTheCommands)
 {
     fakeChpasswd("grep SigIgn /proc/$$/status >/tmp/ignored\n");
-    EXPECT_EQ(bash("$mihost set user:jdoe password -").code, 0);
+    EXPECT_EQ(bash("$mihost set user:jdoe password -").code, 1); // it sets no password
     std::string const mask = machine::read("/tmp/ignored").substr(sizeof "SigIgn:");
     EXPECT_EQ(std::stoull(mask, nullptr, 16) & (1ULL << (SIGXFSZ - 1)), 0U) << mask;
 }

@@ -19,12 +19,15 @@ Outcome bash(std::string const& line)
 void makeMachine(int users = 3)
 {
     machine::lay("plain");
+    std::string shadow = "root:*:19000:0:99999:7:::\n";
     std::string accounts = "root:x:0:0:\x1b[31m\xff \"quoted\" \\ back\t\x01:/:/bin/sh\n";
-    for (int id = 1000; id < 1000 + users; ++id)
+    for (int id = 1000; id < 1000 + users; ++id) {
         accounts += "user" + std::to_string(id) + ":x:" + std::to_string(id) + ":100:" + "李明" +
                     std::to_string(id) + ":/:/bin/sh\n";
+        shadow += "user" + std::to_string(id) + ":!:19000:0:99999:7:::\n";
+    }
     machine::write("/etc/passwd", accounts);
-    machine::write("/etc/shadow", "root:*:19000:0:99999:7:::\n", 0600);
+    machine::write("/etc/shadow", shadow, 0600);
     machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
     machine::write("/var/log/messages", "Jan  2 03:04:05 \x80 \"\x7f\" \xc0\xaf\x1b]0;x\x07\n");
 }
@@ -98,8 +101,9 @@ TEST(MihostJson, IsReadByJqWhateverTheSystemsTextsHold)
              {"list log", ".[0].kind", R"("log-entry")"},
              {"get log:1", ".kind", R"("log-entry")"},
              {"get user:root password", ".properties.\"117\" | [.value, .hidden]", "[null,true]"},
-             {"set user:root full-name plain", ".", R"({"status":0,"text":""})"},
-             {"call GetShadowing", ".", R"({"status":0,"text":""})"},
+             {"set user:root full-name plain 2>/dev/null", "[.status, .changed]", "[0,false]"},
+             {"call GetShadowing", ".",
+              R"({"status":0,"changed":false,"changes":[],"warnings":[]})"},
              {"refresh", ".status", "0"},
              {"--yes clear-log", ".status", "0"},
              {"--yes power restart 2>/dev/null", ".status", "0"},

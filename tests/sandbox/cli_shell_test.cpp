@@ -60,7 +60,7 @@ TEST_F(MihostScript, EndsAtTheFirstLineThatFailsAndNamesIt)
              {"--plugin x.so get os", 2, "mihost: line 2: "},
              {"shell", 2, "mihost: line 2: "},
              {"call UserDel UserName=a;b", 2, "mihost: line 2: UserName holds ';'"},
-             {"call UserDel UserName=nobody-here", 1, "mihost: line 2: the plug-in answered"},
+             {"call UserDel UserName=nobody-here", 1, "mihost: line 2: call UserDel: the plug-in"},
              {"power halt", 2, "mihost: line 2: to halt the machine needs --yes"}}) {
         Outcome const outcome =
             mihostRun({"shell"}, "get os 108\n" + std::string(script.line) + "\nget os 108\n");
@@ -106,12 +106,12 @@ TEST_F(MihostScript, PrintsOneJsonLineForEachCommand)
     EXPECT_EQ(Json::parse(lines[2])["exit"], 4);
     EXPECT_EQ(Json::parse(lines[2])["error"].get<std::string>().find("line 3: no node"), 0U);
     EXPECT_EQ(Json::parse(lines[3])["exit"], 2);
-    EXPECT_EQ(lines[4], R"({"status":0,"text":""})");
-    EXPECT_EQ(lines[5], R"({"status":0,"text":""})");
+    EXPECT_EQ(Json::parse(lines[4])["status"], 0);
+    EXPECT_EQ(Json::parse(lines[5])["changed"], true);
     EXPECT_EQ(Json::parse(lines[6])["text"].get<std::string>().find("read properties"), 0U);
     EXPECT_TRUE(Json::parse(lines[7]).contains("plugin"));
     EXPECT_TRUE(Json::parse(lines[8]).is_array());
-    EXPECT_EQ(lines[9], R"({"status":1,"text":""})");
+    EXPECT_EQ(Json::parse(lines[9])["status"], 1);
 }
 
 TEST_F(MihostScript, TakesOptionsForOneLineOnly)

@@ -38,7 +38,11 @@ TEST(MihostCall, RunsTheMethodAndAnswersAsJson)
         mihostRun({"--json", "call", "UserAdd", "UserName=jdoe", "Comment=John Smith"});
     EXPECT_EQ(outcome.code, 0);
     EXPECT_EQ(outcome.err, "");
-    EXPECT_EQ(Json::parse(outcome.out).dump(), R"({"status":0,"text":""})");
+    Json const answer = Json::parse(outcome.out);
+    EXPECT_EQ(answer["status"], 0);
+    EXPECT_EQ(answer["changed"], true);
+    EXPECT_EQ(answer["warnings"], Json::array());
+    EXPECT_EQ(answer["changes"][0]["file"], "/etc/passwd");
     EXPECT_EQ(machine::entry("/etc/passwd", "jdoe").at(4), "John Smith");
     Lines const ran = machine::ran();
     EXPECT_NE(std::find(ran.begin(), ran.end(),
@@ -51,9 +55,12 @@ TEST(MihostCall, ExitsWith1AndTellsWhatTheCommandSaidWhereItFails)
     machine::lay("plain");
     Outcome const outcome = mihostRun({"--json", "call", "UserDel", "UserName=nobody-here"});
     EXPECT_EQ(outcome.code, 1);
-    EXPECT_EQ(outcome.out, "{\"status\":1,\"text\":\"\"}\n");
-    EXPECT_EQ(outcome.err, "mihost: the plug-in answered status 1; a command said: userdel: user "
-                           "'nobody-here' does not exist\n");
+    std::string const error = "the plug-in answered status 1; a command said: userdel: user "
+                              "'nobody-here' does not exist";
+    EXPECT_EQ(outcome.out, "{\"status\":1,\"changed\":false,\"changes\":[],\"warnings\":[],"
+                           "\"error\":\"" +
+                               error + "\"}\n");
+    EXPECT_EQ(outcome.err, "mihost: call UserDel: " + error + "\n");
 }
 
 TEST(MihostCall, RefusesWhatAShellWouldActOnBeforeThePluginSeesIt)
@@ -75,39 +82,9 @@ TEST(MihostCall, DeletesRootOnlyWhenTold)
     machine::fake("/usr/sbin/userdel", "echo \"$@\" >/tmp/deleted\n");
     EXPECT_EQ(mihostRun({"call", "UserDel", "UserName=root"}).code, 2);
     EXPECT_FALSE(std::filesystem::exists("/tmp/deleted"));
-    EXPECT_EQ(mihostRun({"--yes", "call", "UserDel", "UserName=root"}).code, 0);
+    Outcome const told = mihostRun({"--yes", "call", "UserDel", "UserName=root"});
+    EXPECT_EQ(told.code, 1); // the fake one deletes nothing
     EXPECT_EQ(machine::read("/tmp/deleted"), "root\n");
-}
-
-TEST(MihostPasswords, ComeFromStandardInputAndShowNowhere)
-{
-    makeMachine();
-    machine::fake("/usr/bin/passwd", "exit 1\n");
-    Outcome const outcome = mihostRun(
-        {"--trace", "/tmp/trace", "call", "UserSetPassword", "UserName=jdoe", "Password=-"},
-        "geheim42\nnext line\n");
-    EXPECT_EQ(outcome.code, 0);
-    EXPECT_FALSE(stands(outcome.out + outcome.err, "geheim42"));
-    EXPECT_FALSE(stands(machine::read("/tmp/trace"), "geheim42"));
-    EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), "geheim42"); // no crypt without passwd
-}
-
-TEST(MihostPasswords, ThatStandInTheShadowFileAsTheyAreAreWarnedOf)
-{
-    makeMachine();
-    machine::fake("/usr/bin/passwd", "exit 1\n");
-    Outcome const plain =
-        mihostRun({"call", "UserSetPassword", "UserName=jdoe", "Password=-"}, "geheim42\n");
-    EXPECT_EQ(plain.err, "mihost: the password of 'jdoe' now stands in /etc/shadow as it is and "
-                         "opens nothing: /usr/bin/passwd here does not take passwords from a pipe; "
-                         "set it with passwd\n");
-    // As it is where passwd takes one.
-    machine::fake("/usr/bin/passwd", "read password\n"
-                                     "echo \"$1:$password\" | /usr/sbin/chpasswd -c SHA512\n");
-    Outcome const good =
-        mihostRun({"call", "UserSetPassword", "UserName=jdoe", "Password=-"}, "geheim42\n");
-    EXPECT_EQ(good.err, "");
-    EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1).substr(0, 3), "$6$");
 }
 
 TEST(MihostSecrets, AreHiddenWhereverTheyCouldShowAndShownWhenTold)
@@ -135,15 +112,6 @@ TEST(MihostSecrets, AreHiddenWhereverTheyCouldShowAndShownWhenTold)
     ASSERT_EQ(lines.size(), 2U) << kept.out << kept.err;
     EXPECT_EQ(lines[0], " 74 create-user  (hidden)");
     EXPECT_EQ(lines[1], lines[0]); // a plain password never shows
-}
-
-TEST(MihostPasswords, AreRefusedWhereStandardInputHoldsNone)
-{
-    makeMachine();
-    Outcome const outcome =
-        mihostRun({"call", "UserSetPassword", "UserName=jdoe", "Password=-"}, "");
-    EXPECT_EQ(outcome.code, 2);
-    EXPECT_EQ(outcome.err, "mihost: Password: standard input holds no line\n");
 }
 
 TEST(MihostSet, SetsAPasswordHashFromStandardInput)
@@ -186,7 +154,8 @@ TEST(MihostSet, DeletesAnAccountOnlyWhenTold)
     makeMachine();
     // The only kind of account whose UID userdel takes for its name.
     machine::write("/etc/passwd", machine::read("/etc/passwd") + "1500:x:1500:1500::/:/bin/sh\n");
-    machine::fake("/usr/sbin/userdel", "echo \"$@\" >/tmp/deleted\n");
+    machine::fake("/usr/sbin/userdel", "echo \"$@\" >/tmp/deleted\n"
+                                       "sed -i /^1500:/d /etc/passwd\n");
     Outcome const outcome = mihostRun({"set", "user:1500", "delete", "true"});
     EXPECT_EQ(outcome.code, 2);
     EXPECT_EQ(outcome.err, "mihost: to delete the account 1500 and its home directory needs --yes, "
@@ -219,16 +188,6 @@ TEST(MihostSet, RefusesANameForANodeThatAShellWouldActOn)
     EXPECT_EQ(mihostRun({"set", "user:jdoe", "108", "other"}).code, 0);
 }
 
-TEST(MihostSet, SaysWhereOnlyTheTreeChanges)
-{
-    makeMachine();
-    Outcome const outcome = mihostRun({"set", "user:jdoe", "full-name", "J. Doe"});
-    EXPECT_EQ(outcome.code, 0);
-    EXPECT_EQ(outcome.err, "mihost: full-name changed in this tree alone; 'mihost properties user' "
-                           "tells which properties act on the machine\n");
-    EXPECT_EQ(mihostRun({"set", "user:jdoe", "password-expiration", "2030-01-01"}).err, "");
-}
-
 TEST(MihostSet, TakesAMethodCallApart)
 {
     makeMachine();
@@ -237,18 +196,8 @@ TEST(MihostSet, TakesAMethodCallApart)
     EXPECT_EQ(bad.code, 2);
     Outcome const good =
         mihostRun({"--json", "set", "os", "74", "LocalGroupAdd,GroupName:CMPI_string:crew"});
-    EXPECT_EQ(good.out, "{\"status\":0,\"text\":\"\"}\n");
+    EXPECT_EQ(Json::parse(good.out)["changed"], true);
     EXPECT_EQ(machine::entry("/etc/group", "crew").at(0), "crew");
-}
-
-TEST(MihostSet, TellsWhatACommandComplainedAbout)
-{
-    makeMachine();
-    machine::fake("/usr/bin/chage", "echo 'chage: cannot open file' >&2\n");
-    Outcome const outcome = mihostRun({"set", "user:jdoe", "inactive-time", "2030-01-01"});
-    EXPECT_EQ(outcome.code, 0); // the plug-in does not look
-    EXPECT_EQ(outcome.err, "mihost: a command said: chage: cannot open file\n"
-                           "mihost: a command said: chage: cannot open file\n");
 }
 
 TEST(MihostRefresh, BuildsUserAndGroupNodesAnew)
@@ -282,8 +231,9 @@ TEST(MihostClearLog, EmptiesTheLogWhenTold)
 TEST(MihostPower, AsksTheMachineToRestartOrHaltWhenTold)
 {
     makeMachine();
-    EXPECT_EQ(mihostRun({"--json", "--yes", "power", "restart"}).out,
-              "{\"status\":0,\"text\":\"\"}\n");
+    Json const answer = Json::parse(mihostRun({"--json", "--yes", "power", "restart"}).out);
+    EXPECT_EQ(answer["status"], 0);
+    EXPECT_EQ(answer["changed"], true);
     EXPECT_EQ(mihostRun({"--yes", "power", "halt"}).code, 0);
     EXPECT_EQ(mihost::refusedPowerCommands(),
               (Lines{"/sbin/shutdown -r now", "/sbin/shutdown -h now"}));

@@ -1,5 +1,4 @@
 #include "mihost/cli/AccountFiles.h"
-#include "mihost/cli/Write.h"
 
 #include <gtest/gtest.h>
 
@@ -40,22 +39,6 @@ TEST(AccountFileChanges, HideHashesOfBrokenLines)
     AccountFiles const after = {{"/etc/shadow", {"jdoe:secret", "noColonAtAll"}}};
     EXPECT_EQ(changesBetween({}, after, Secrets::Hide).at(0).added,
               (Lines{"jdoe:(hidden)", "noColonAtAll"}));
-}
-
-TEST(WithoutSecret, ReplacesTheSecretWhereItStandsAsAWord)
-{
-    EXPECT_EQ(mihost::withoutSecret("/usr/sbin/usermod -p geheim jdoe 2>&1", "geheim"),
-              "/usr/sbin/usermod -p (hidden) jdoe 2>&1");
-    EXPECT_EQ(mihost::withoutSecret("invalid 'geheim'\ngeheim\n", "geheim"),
-              "invalid '(hidden)'\n(hidden)\n");
-    EXPECT_EQ(mihost::withoutSecret("/usr/sbin/usermod -p u u", "u"),
-              "/usr/sbin/usermod -p (hidden) (hidden)");
-}
-
-TEST(WithoutSecret, LeavesTextAloneWhereThereIsNone)
-{
-    EXPECT_EQ(mihost::withoutSecret("a  b\n\nc ", ""), "a  b\n\nc ");
-    EXPECT_EQ(mihost::withoutSecret("a  b\n\nc ", "x"), "a  b\n\nc ");
 }
 
 } // namespace

@@ -98,11 +98,4 @@ TEST(NodeAsJson, NeverShowsAMethodCallThatHoldsAPassword)
               "UserDel,UserName:CMPI_string:jdoe");
 }
 
-TEST(ErrorAsJson, IsStatusAndText)
-{
-    EXPECT_EQ(mihost::toJson(IC::Error(0, Number(0U), "")).dump(), R"({"status":0,"text":""})");
-    EXPECT_EQ(mihost::toJson(IC::Error(1, Number(0U), "no: \xFF")).dump(),
-              R"({"status":1,"text":"no: \\xff"})");
-}
-
 } // namespace

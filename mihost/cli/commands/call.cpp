@@ -1,10 +1,8 @@
 #include "mihost/cli/CatalogueText.h"
 #include "mihost/cli/Clearance.h"
 #include "mihost/cli/MembershipCheck.h"
-#include "mihost/cli/Session.h"
-#include "mihost/cli/Write.h"
+#include "mihost/cli/MethodWrite.h"
 #include "mihost/cli/commands/makers.h"
-#include "nodes/ids.h"
 
 #include <fmt/ranges.h>
 
@@ -44,8 +42,7 @@ public:
         IC::MutableNode& os = session.node("os");
         ChangeLock const lock =
             clearChange(session, dangerOf(call), [&call] { checkMembership(call); });
-        carryOut(session,
-                 {os, NODES::createUser, IC::PropertyValue(textOf(call), true), secretOf(call)});
+        carryOut(session, methodWrite(session, os, call));
     }
 
 private:

@@ -1,7 +1,7 @@
 // The operating-system node's command properties, under names of their own.
 
 #include "mihost/cli/Clearance.h"
-#include "mihost/cli/Write.h"
+#include "mihost/cli/PropertyWrite.h"
 #include "mihost/cli/commands/makers.h"
 #include "nodes/ids.h"
 
@@ -39,7 +39,8 @@ public:
 
     void run(Session& session) override
     {
-        carryOut(session, {session.node("os"), NODES::refresh, number(0), ""});
+        carryOut(session,
+                 osWrite(session, session.node("os"), "refresh", NODES::refresh, number(0)));
         if (session.options().json)
             return;
         auto const nodes = session.nodes();
@@ -58,10 +59,9 @@ public:
     {
         IC::MutableNode& os = session.node("os");
         ChangeLock const lock = clearChange(session, "empty the system log");
-        carryOut(session, {os, NODES::clearLog, number(9), ""});
+        carryOut(session, osWrite(session, os, "clear-log", NODES::clearLog, number(9)));
         if (session.options().json)
             return;
-        // Whether it worked is not told; the entries that are left tell.
         session.out().line(
             counted(countOf(session.nodes(), NODES::logEntryType), "log entry", "log entries"));
     }
@@ -82,8 +82,8 @@ public:
         unsigned int const state = action_ == "restart" ? 9 : 12;
         IC::MutableNode& os = session.node("os");
         ChangeLock const lock = clearChange(session, action_ + " the machine");
-        carryOut(session,
-                 {os, NODES::requestedState, IC::PropertyValue(IC::EnumValue(state), true), ""});
+        carryOut(session, osWrite(session, os, "power " + action_, NODES::requestedState,
+                                  IC::PropertyValue(IC::EnumValue(state), true)));
     }
 
 private:

@@ -1,10 +1,10 @@
 #include "mihost/cli/Clearance.h"
 #include "mihost/cli/Failure.h"
 #include "mihost/cli/MembershipCheck.h"
-#include "mihost/cli/Say.h"
+#include "mihost/cli/MethodWrite.h"
+#include "mihost/cli/PropertyWrite.h"
 #include "mihost/cli/UserCheck.h"
 #include "mihost/cli/ValueText.h"
-#include "mihost/cli/Write.h"
 #include "mihost/cli/commands/makers.h"
 #include "nodes/ids.h"
 
@@ -69,12 +69,12 @@ void checkMachine(IC::MutableNode const& node, Property const& property,
         checkUserWrite(node, deletes ? UserWrite::Delete : UserWrite::Change);
 }
 
-std::string secretOf(Property const& property, std::string const& text)
+Write writeOf(Session& session, IC::MutableNode& node, Property const& property,
+              IC::PropertyValue const& value)
 {
-    if (property.has(Property::Secret))
-        return text;
-    auto const call = callIn(property, {text, true});
-    return call ? secretOf(*call) : "";
+    if (auto const call = callIn(property, value))
+        return methodWrite(session, node, *call);
+    return propertyWrite(session, node, property, value);
 }
 
 class Set : public Command
@@ -111,11 +111,7 @@ public:
         if (changesMachine(*property))
             lock = clearChange(session, dangerOf(node, *property, value),
                                [&] { checkMachine(node, *property, value); });
-        carryOut(session, {node, id, value, secretOf(*property, text_)});
-        if (!property->has(Property::Acts) && !session.options().json)
-            say(fmt::format("mihost: {} changed in this tree alone; 'mihost properties {}' tells "
-                            "which properties act on the machine\n",
-                            property->name, kind->name));
+        carryOut(session, writeOf(session, node, *property, value));
     }
 
 private:

@@ -1,0 +1,318 @@
+// The program looks at what a change left behind, and says so if it is not what was asked for.
+
+#include "tests/support/Lines.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+
+#include <cstdlib>
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+
+namespace
+{
+
+using Json = nlohmann::ordered_json;
+using Lines = std::vector<std::string>;
+
+constexpr char hash[] = "$6$saltsalt$hashhashhash";
+constexpr char silent[] = "exit 0\n";
+
+/** A machine with jdoe, who is in the group crew and not in the group staff2. */
+class VerifiedWrite : public testing::Test
+{
+protected:
+    VerifiedWrite()
+    {
+        machine::lay("plain");
+        EXPECT_EQ(std::system("useradd -M -s /bin/sh -c 'J. Doe' jdoe && "
+                              "chage -d 2020-01-01 -m 0 -M 99999 -W 7 jdoe && "
+                              "groupadd crew && groupadd staff2 && usermod -aG crew jdoe"),
+                  0);
+        // The only kind of account whose UID userdel takes for its name.
+        machine::write("/etc/passwd",
+                       machine::read("/etc/passwd") + "1500:x:1500:100::/:/bin/sh\n");
+    }
+
+    /** Tools that say nothing and do nothing. */
+    static void makeToolsIdle()
+    {
+        for (char const* tool :
+             {"useradd", "userdel", "usermod", "groupadd", "groupdel", "chpasswd"})
+            machine::fake(std::string("/usr/sbin/") + tool, silent);
+        for (char const* tool : {"chage", "passwd"})
+            machine::fake(std::string("/usr/bin/") + tool, silent);
+    }
+
+    /** As a user without privileges, who may run the program wherever it was built. */
+    static Outcome runAsUser(Lines arguments)
+    {
+        using std::filesystem::perms;
+        for (auto folder = std::filesystem::path(MIHOST_FILE).parent_path(); folder != "/";
+             folder = folder.parent_path())
+            permissions(folder, perms::group_exec | perms::others_exec,
+                        std::filesystem::perm_options::add);
+        arguments.insert(arguments.begin(),
+                         {"/usr/bin/setpriv", "--reuid=65534", "--clear-groups", MIHOST_FILE});
+        return runToEnd(arguments);
+    }
+};
+
+struct Idle {
+    Lines words;
+    char const* what;
+    char const* problem;
+};
+
+TEST_F(VerifiedWrite, FailsWhereTheToolsDidNothing)
+{
+    makeToolsIdle();
+    for (Idle const& row : std::initializer_list<Idle>{
+             {{"call", "UserAdd", "UserName=new"},
+              "call UserAdd",
+              "account new is absent, not present"},
+             {{"call", "UserDel", "UserName=jdoe"},
+              "call UserDel",
+              "account jdoe is present, not absent"},
+             {{"call", "UserSetAttrib", "UserName=jdoe", "daysMustKeepPassword=3"},
+              "call UserSetAttrib",
+              "minimum password age of jdoe is 0, not 3"},
+             {{"call", "UserSetAttrib", "UserName=jdoe", "daysMustChangePasswordAfter=30"},
+              "call UserSetAttrib",
+              "maximum password age of jdoe is 99999, not 30"},
+             {{"call", "UserSetAttrib", "UserName=jdoe", "daysWarnBeforePasswordExpire=3"},
+              "call UserSetAttrib",
+              "password warning of jdoe is 7, not 3"},
+             {{"call", "UserSetAttrib", "UserName=jdoe", "daysExpireAfter=3"},
+              "call UserSetAttrib",
+              "inactivity time of jdoe is none, not 3"},
+             {{"call", "UserSetAttrib", "UserName=jdoe", "passwordExpirationDate=2030-01-02"},
+              "call UserSetAttrib",
+              "account expiry of jdoe is never, not 2030-01-02"},
+             {{"call", "UserSetFullName", "UserName=jdoe", "FullName=Joe Doe"},
+              "call UserSetFullName",
+              "full name of jdoe is J. Doe, not Joe Doe"},
+             {{"call", "UserSetScriptPath", "UserName=jdoe", "ScriptPath=/bin/bash"},
+              "call UserSetScriptPath",
+              "login shell of jdoe is /bin/sh, not /bin/bash"},
+             {{"call", "UserSetHomeDir", "UserName=jdoe", "HomeDir=/home/j2"},
+              "call UserSetHomeDir",
+              "home directory of jdoe is /home/jdoe, not /home/j2"},
+             {{"call", "UserSetPassword", "UserName=jdoe", "Password=geheim42"},
+              "call UserSetPassword",
+              "password of jdoe is another one, not the given one"},
+             {{"call", "UserSetScriptPath", "UserName=none", "ScriptPath=/bin/bash"},
+              "call UserSetScriptPath",
+              "login shell of none is unknown, not /bin/bash"},
+             {{"call", "LocalGroupAdd", "GroupName=new"},
+              "call LocalGroupAdd",
+              "group new is absent, not present"},
+             {{"call", "LocalGroupDel", "GroupName=crew"},
+              "call LocalGroupDel",
+              "group crew is present, not absent"},
+             {{"call", "LocalGroupAddUser", "LocalGroupName=staff2", "DomainAndMember=jdoe"},
+              "call LocalGroupAddUser",
+              "membership of jdoe in staff2 is absent, not present"},
+             {{"call", "LocalGroupDelUser", "LocalGroupName=crew", "DomainAndMember=jdoe"},
+              "call LocalGroupDelUser",
+              "membership of jdoe in crew is present, not absent"},
+             {{"set", "user:jdoe", "password", hash},
+              "set password",
+              "password hash of jdoe is another one, not the given one"},
+             {{"set", "os", "create-user", "UserDel,UserName:CMPI_string:jdoe"},
+              "call UserDel",
+              "account jdoe is present, not absent"}}) {
+        Lines words = row.words;
+        words.insert(words.begin(), "--json");
+        Outcome const outcome = mihostRun(words);
+        EXPECT_EQ(outcome.code, 1) << row.problem;
+        EXPECT_EQ(outcome.err, "mihost: " + std::string(row.what) + ": " + row.problem + "\n");
+        Json const answer = Json::parse(outcome.out);
+        EXPECT_EQ(answer["status"], 1) << row.problem;
+        EXPECT_EQ(answer["changed"], false) << row.problem;
+        EXPECT_EQ(answer["error"], row.problem);
+    }
+}
+
+TEST_F(VerifiedWrite, FailsWhereAUserNodesWriteDidNothing)
+{
+    makeToolsIdle();
+    Outcome const deletion = mihostRun({"--yes", "set", "user:1500", "delete", "true"});
+    EXPECT_EQ(deletion.code, 1);
+    EXPECT_EQ(deletion.err, "mihost: set delete: account 1500 is present, not absent\n");
+    Outcome const expiry = mihostRun({"set", "user:jdoe", "password-expiration", "2030-01-01"});
+    EXPECT_EQ(expiry.code, 1);
+    EXPECT_EQ(linesOf(expiry.err).back(),
+              "mihost: set password-expiration: password expiry of jdoe is never, not 2030-01-01");
+    Outcome const inactivity = mihostRun({"set", "user:jdoe", "inactive-time", "2030-01-01"});
+    EXPECT_EQ(inactivity.code, 1);
+    EXPECT_EQ(linesOf(inactivity.err).back(),
+              "mihost: set inactive-time: inactivity of jdoe is never, not 2030-01-01");
+}
+
+TEST_F(VerifiedWrite, SucceedsWhereEverythingIsAsAskedFor)
+{
+    for (Lines const& words : std::initializer_list<Lines>{
+             {"call", "UserAdd", "UserName=new", "Comment=A B", "HomeDir=/home/new/",
+              "ScriptPath=/bin/sh", "Password=geheim42", "daysMustKeepPassword=007",
+              "daysMustChangePasswordAfter=30", "daysWarnBeforePasswordExpire=5",
+              "daysExpireAfter=9", "passwordExpirationDate=2030-01-05"},
+             {"call", "UserSetAttrib", "UserName=jdoe", "daysMustKeepPassword=3",
+              "daysMustChangePasswordAfter=30", "daysWarnBeforePasswordExpire=5",
+              "daysExpireAfter=9", "passwordExpirationDate=2030-01-05"},
+             {"call", "UserSetFullName", "UserName=jdoe", "FullName=Joe Doe"},
+             {"call", "UserSetScriptPath", "UserName=jdoe", "ScriptPath=/bin/bash"},
+             {"call", "UserSetPassword", "UserName=jdoe", "Password=geheim42"},
+             {"call", "LocalGroupAddUser", "LocalGroupName=staff2", "DomainAndMember=jdoe"},
+             {"call", "LocalGroupDelUser", "LocalGroupName=crew", "DomainAndMember=jdoe"},
+             {"call", "LocalGroupAdd", "GroupName=fresh"},
+             {"call", "LocalGroupDel", "GroupName=fresh"},
+             {"set", "user:jdoe", "password", hash},
+             {"set", "user:jdoe", "password-expiration", "2031-01-31"},
+             {"set", "user:jdoe", "inactive-time", "2031-02-28"},
+             {"call", "UserDel", "UserName=new"}}) {
+        Lines json = words;
+        json.insert(json.begin(), "--json");
+        Outcome const outcome = mihostRun(json);
+        EXPECT_EQ(outcome.code, 0) << words[1] << ' ' << words[2] << ": " << outcome.err;
+        EXPECT_EQ(Json::parse(outcome.out)["changed"], true) << words[1] << ' ' << words[2];
+    }
+}
+
+TEST_F(VerifiedWrite, SaysThatNothingChangedWhereAllWasAsAskedFor)
+{
+    ASSERT_EQ(std::system(("usermod -p '" + std::string(hash) + "' jdoe").c_str()), 0);
+    ASSERT_EQ(std::system("chage -d \"$(date +%F)\" jdoe"), 0); // as chpasswd writes it
+    machine::write("/var/log/messages", "");
+    struct Row {
+        Lines words;
+        char const* fact;
+    };
+    for (Row const& row : std::initializer_list<Row>{
+             {{"call", "UserSetScriptPath", "UserName=jdoe", "ScriptPath=/bin/sh"},
+              "login shell of jdoe is already /bin/sh"},
+             {{"call", "UserSetAttrib", "UserName=jdoe", "daysMustKeepPassword=0",
+               "daysWarnBeforePasswordExpire=7"},
+              "minimum password age of jdoe is already 0, password warning of jdoe is already 7"},
+             {{"call", "LocalGroupDelUser", "LocalGroupName=staff2", "DomainAndMember=jdoe"},
+              "membership of jdoe in staff2 is already absent"},
+             {{"set", "user:jdoe", "password", hash},
+              "password hash of jdoe is already the given one"},
+             {{"clear-log"}, "system log is already empty"}}) {
+        Lines words = row.words;
+        words.insert(words.begin(), "--yes");
+        Outcome const outcome = mihostRun(words);
+        EXPECT_EQ(outcome.code, 0) << row.fact;
+        EXPECT_EQ(outcome.err, "mihost: nothing changed: " + std::string(row.fact) + "\n");
+        words.insert(words.begin(), "--json");
+        Json const answer = Json::parse(mihostRun(words).out);
+        EXPECT_EQ(answer["changed"], false) << row.fact;
+        EXPECT_EQ(answer["status"], 0) << row.fact;
+    }
+}
+
+TEST_F(VerifiedWrite, SaysThatAMembershipIsThereAlready)
+{
+    // Twice: the first call also adds what the plug-in adds by itself, the primary group.
+    Lines const words = {"call", "LocalGroupAddUser", "LocalGroupName=crew",
+                         "DomainAndMember=jdoe"};
+    EXPECT_EQ(mihostRun(words).code, 0);
+    Outcome const again = mihostRun(words);
+    EXPECT_EQ(again.code, 0);
+    EXPECT_EQ(again.err,
+              "mihost: nothing changed: membership of jdoe in crew is already present\n");
+}
+
+TEST_F(VerifiedWrite, FailsToEndAMembershipOfThePrimaryGroup)
+{
+    ASSERT_EQ(std::system("gpasswd -d jdoe crew >/dev/null && usermod -g crew jdoe"), 0);
+    Outcome const outcome =
+        mihostRun({"call", "LocalGroupDelUser", "LocalGroupName=crew", "DomainAndMember=jdoe"});
+    EXPECT_EQ(outcome.code, 1);
+    EXPECT_NE(outcome.err.find("membership of jdoe in crew is "), std::string::npos) << outcome.err;
+}
+
+TEST_F(VerifiedWrite, FailsForWhatCannotBeMadeTwice)
+{
+    EXPECT_EQ(mihostRun({"call", "UserAdd", "UserName=jdoe"}).code, 1);
+    EXPECT_EQ(mihostRun({"call", "LocalGroupAdd", "GroupName=crew"}).code, 1);
+    EXPECT_EQ(mihostRun({"call", "LocalGroupDel", "GroupName=none"}).code, 1);
+}
+
+TEST_F(VerifiedWrite, FailsWithTheToolsWordsWhereAToolComplains)
+{
+    machine::fake("/usr/bin/chage",
+                  "echo 'chage: cannot open file' >&2\necho second >&2\nexit 1\n");
+    Outcome const outcome =
+        mihostRun({"--json", "set", "user:jdoe", "password-expiration", "2030-01-01"});
+    EXPECT_EQ(outcome.code, 1);
+    Json const answer = Json::parse(outcome.out);
+    EXPECT_EQ(answer["error"], "password expiry of jdoe is never, not 2030-01-01; a command said: "
+                               "chage: cannot open file");
+    EXPECT_EQ(answer["warnings"].back(), "a command said: second");
+}
+
+TEST_F(VerifiedWrite, FailsWhereAToolFailsThoughTheChangeIsThere)
+{
+    machine::fake("/usr/sbin/userdel",
+                  "sed -i /^1500:/d /etc/passwd\necho 'userdel: no home' >&2\nexit 12\n");
+    Outcome const outcome = mihostRun({"--yes", "--json", "set", "user:1500", "delete", "true"});
+    EXPECT_EQ(outcome.code, 1);
+    Json const answer = Json::parse(outcome.out);
+    EXPECT_EQ(answer["changed"], true);
+    EXPECT_NE(
+        answer["error"].get<std::string>().find("exit status 12; a command said: userdel: no home"),
+        std::string::npos)
+        << answer;
+}
+
+TEST_F(VerifiedWrite, PassesOnWhatASuccessfulToolSays)
+{
+    machine::fake("/usr/sbin/userdel", "sed -i /^1500:/d /etc/passwd\necho 'no mail' >&2\n");
+    Outcome const outcome = mihostRun({"--yes", "--json", "set", "user:1500", "delete", "true"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(Json::parse(outcome.out)["warnings"], Json::array({"a command said: no mail"}));
+    EXPECT_EQ(outcome.err, "mihost: a command said: no mail\n");
+}
+
+TEST_F(VerifiedWrite, FailsWithoutPrivilege)
+{
+    machine::write("/var/log/messages", "Jan  2 03:04:05 line\n");
+    Outcome const log = runAsUser({"--yes", "clear-log"});
+    EXPECT_EQ(log.code, 1);
+    EXPECT_EQ(log.err, "mihost: clear-log: system log is 21 bytes long, not empty\n");
+    Outcome const expiry = runAsUser({"set", "user:jdoe", "password-expiration", "2030-01-01"});
+    EXPECT_EQ(expiry.code, 1);
+    std::string const error =
+        "mihost: set password-expiration: password expiry of jdoe is unknown, "
+        "not 2030-01-01; a command said: chage: ";
+    EXPECT_EQ(linesOf(expiry.err).back().rfind(error, 0), 0U) << expiry.err;
+}
+
+TEST_F(VerifiedWrite, FailsWhereTheMachineRefusesToHalt)
+{
+    machine::fake("/sbin/shutdown", "echo 'must be root' >&2\nexit 1\n");
+    Outcome const refused = mihostRun({"--yes", "--json", "power", "halt"});
+    EXPECT_EQ(refused.code, 1);
+    EXPECT_EQ(Json::parse(refused.out)["changed"], false);
+    EXPECT_EQ(refused.err, "mihost: power halt: a command failed: '/sbin/shutdown -h now', exit "
+                           "status 1; a command said: must be root\n");
+    machine::remove("/sbin/shutdown");
+    Outcome const missing = mihostRun({"--yes", "power", "restart"});
+    EXPECT_EQ(missing.code, 1);
+    EXPECT_NE(missing.err.find("exit status 127; a command said: "), std::string::npos)
+        << missing.err;
+}
+
+TEST_F(VerifiedWrite, FailsWhereARefreshMissesAnAccount)
+{
+    // The plug-in reads no account after a line that is too long.
+    machine::write("/etc/passwd", machine::read("/etc/passwd") +
+                                      "long:x:1400:1400:" + std::string(5000, 'x') +
+                                      ":/:/bin/sh\nlast:x:1500:1500::/:/bin/sh\n");
+    Outcome const outcome = mihostRun({"refresh"});
+    EXPECT_EQ(outcome.code, 1);
+    EXPECT_EQ(outcome.err, "mihost: refresh: list of users is without 'long', not complete\n");
+}
+
+} // namespace

@@ -50,8 +50,12 @@ Json toJson(PropertyView const& property)
     object["name"] = property.row ? Json(property.row->name) : Json(nullptr);
     object["kind"] = valueKindName(property.value.getKind());
     object["flag"] = property.value.getFlag();
-    object["value"] = property.hidden ? Json(nullptr) : valueToJson(property.value);
-    if (property.hidden)
+    bool const isUnknown = !property.unknown.empty();
+    noteUnknown(property);
+    object["value"] = isUnknown || property.hidden ? Json(nullptr) : valueToJson(property.value);
+    if (isUnknown)
+        object["unknown"] = toJson(property.unknown);
+    else if (property.hidden)
         object["hidden"] = true;
     return object;
 }

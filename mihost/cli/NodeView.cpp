@@ -3,10 +3,12 @@
 #include "mihost/cli/Address.h"
 #include "mihost/cli/Decimal.h"
 #include "mihost/cli/Failure.h"
+#include "mihost/cli/ShadowGap.h"
 #include "mihost/cli/Suggestion.h"
 
 #include <fmt/format.h>
 #include <set>
+#include <utility>
 
 namespace mihost
 {
@@ -26,10 +28,10 @@ bool isHidden(Property const* row, IC::PropertyValue const& value, Secrets secre
 }
 
 PropertyView view(NodeKind const* kind, unsigned int id, IC::PropertyValue const& value,
-                  Secrets secrets)
+                  Secrets secrets, ShadowGap const& gap)
 {
     Property const* const row = kind ? findProperty(*kind, id) : nullptr;
-    return {id, row, value, isHidden(row, value, secrets)};
+    return {id, row, value, isHidden(row, value, secrets), gap.reasonFor(id, value)};
 }
 
 IC::PropertyValue emptyValue()
@@ -51,11 +53,18 @@ std::set<unsigned int> idsOf(IC::MutableNode const& node)
 }
 
 /** Adds what the node answers for the property now, where it answers. */
-void addLive(NodeView& to, unsigned int id, Secrets secrets)
+void addLive(NodeView& to, unsigned int id, Secrets secrets, ShadowGap const& gap)
 {
     IC::PropertyValue value = emptyValue();
     if (to.node->getProperty(id, value).getStatus() == 0)
-        to.properties.push_back(view(findKind(to.node->getNodeType()), id, value, secrets));
+        to.properties.push_back(view(findKind(to.node->getNodeType()), id, value, secrets, gap));
+}
+
+/** Why values are unknown, for the warning that is still to be given. */
+std::string& pendingReason()
+{
+    static std::string reason;
+    return reason;
 }
 
 } // namespace
@@ -64,22 +73,24 @@ NodeView storedView(IC::MutableNode const& node, Secrets secrets)
 {
     NodeKind const* const kind = findKind(node.getNodeType());
     auto const stored = node.getProperties();
+    ShadowGap const gap(node);
     NodeView result{&node, {}};
     for (unsigned int const id : idsOf(node)) {
         auto const found = stored.find(id);
         if (found != stored.end())
-            result.properties.push_back(view(kind, id, found->second, secrets));
+            result.properties.push_back(view(kind, id, found->second, secrets, gap));
         else
-            addLive(result, id, secrets);
+            addLive(result, id, secrets, gap);
     }
     return result;
 }
 
 NodeView liveView(IC::MutableNode const& node, Secrets secrets)
 {
+    ShadowGap const gap(node);
     NodeView result{&node, {}};
     for (unsigned int const id : idsOf(node))
-        addLive(result, id, secrets);
+        addLive(result, id, secrets, gap);
     return result;
 }
 
@@ -87,6 +98,7 @@ NodeView liveView(IC::MutableNode const& node, std::vector<std::string> const& n
                   Secrets secrets)
 {
     NodeKind const* const kind = findKind(node.getNodeType());
+    ShadowGap const gap(node);
     NodeView result{&node, {}};
     for (std::string const& name : names) {
         unsigned int const id = propertyId(node, name);
@@ -96,7 +108,7 @@ NodeView liveView(IC::MutableNode const& node, std::vector<std::string> const& n
             throw Failure(PluginRefused,
                           fmt::format("property '{}' of node '{}': {}; see 'mihost doctor'", name,
                                       addressOf(node), static_cast<std::string>(error)));
-        result.properties.push_back(view(kind, id, value, secrets));
+        result.properties.push_back(view(kind, id, value, secrets, gap));
     }
     return result;
 }
@@ -120,7 +132,25 @@ unsigned int propertyId(IC::MutableNode const& node, std::string const& name)
 
 std::string valueText(PropertyView const& property)
 {
+    noteUnknown(property);
+    if (!property.unknown.empty())
+        return "-";
     return property.hidden ? "(hidden)" : static_cast<std::string>(property.value);
+}
+
+void noteUnknown(PropertyView const& property)
+{
+    if (pendingReason().empty())
+        pendingReason() = property.unknown;
+}
+
+std::string takeUnknownWarning()
+{
+    std::string const reason = std::exchange(pendingReason(), "");
+    return reason.empty() ? ""
+                          : fmt::format("reading passwords and ageing: {}, so some values are "
+                                        "unknown (see 'mihost doctor')",
+                                        reason);
 }
 
 std::string nameOf(PropertyView const& property)

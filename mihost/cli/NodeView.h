@@ -15,7 +15,8 @@ struct PropertyView {
     unsigned int id;
     Property const* row; // null for a property that the catalogue does not know
     IC::PropertyValue value;
-    bool hidden; // a secret that is not to be shown
+    bool hidden;         // a secret that is not to be shown
+    std::string unknown; // why the plug-in could not read it; empty if it could
 };
 
 struct NodeView {
@@ -44,8 +45,14 @@ NodeView liveView(IC::MutableNode const& node, std::vector<std::string> const& n
 /** A property by id or catalogue name. @throws Failure (NotFound) naming those that there are */
 unsigned int propertyId(IC::MutableNode const& node, std::string const& name);
 
-/** The value as a person reads it; not yet safe for a terminal. */
+/** The value as a person reads it, "-" if it is unknown; not yet safe for a terminal. */
 std::string valueText(PropertyView const& property);
+
+/** Notes that an unknown value is shown. valueText does so, too. */
+void noteUnknown(PropertyView const& property);
+
+/** The warning for all unknown values shown since the last call; empty for none. */
+std::string takeUnknownWarning();
 
 /** The property's catalogue name, or its id where it has none. */
 std::string nameOf(PropertyView const& property);

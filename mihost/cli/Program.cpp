@@ -64,6 +64,7 @@ int runProgram(int argc, char** argv)
     int const run = guarded([&] {
         session = std::make_unique<Session>(line.options());
         line.command()->run(*session);
+        Session::warnOfUnknown();
     });
     if (!session)
         return run;

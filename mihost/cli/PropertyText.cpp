@@ -15,7 +15,7 @@ void writeProperties(std::vector<PropertyView> const& properties, std::string co
     for (PropertyView const& property : properties)
         width = std::max(width, nameOf(property).size());
     for (PropertyView const& property : properties) {
-        bool const hasUnit = property.row && *property.row->unit;
+        bool const hasUnit = property.row && *property.row->unit && property.unknown.empty();
         std::string line = fmt::format("{}{:>3} {:<{}}  {}{}{}", indent, property.id,
                                        nameOf(property), width, printable(valueText(property)),
                                        hasUnit ? " " : "", hasUnit ? property.row->unit : "");

@@ -142,4 +142,10 @@ void Session::confirm(std::string const& what) const
         throw Failure(BadUsage, fmt::format("not confirmed: did not {}", what));
 }
 
+void Session::warnOfUnknown()
+{
+    if (std::string const warning = takeUnknownWarning(); !warning.empty())
+        say(fmt::format("mihost: {}\n", printable(warning)));
+}
+
 } // namespace mihost

@@ -87,6 +87,9 @@ public:
      */
     void confirm(std::string const& what) const;
 
+    /** Gives one warning if values were shown as unknown since it was last called. */
+    static void warnOfUnknown();
+
 private:
     void start();
     std::string timingReport() const;
@@ -98,10 +101,10 @@ private:
     std::string pluginFile_;
     Timing timing_;
     std::unique_ptr<Trace> trace_;
+    std::unique_ptr<RedactingSink> traceSink_;
     std::unique_ptr<Accelerator> accelerator_;
     std::unique_ptr<PrivateDirectory> directory_;
     std::unique_ptr<Plugin> plugin_;
-    std::unique_ptr<RedactingSink> traceSink_;
     SinkGroup sinks_; // the last, so that no message comes in while the others go
 };
 

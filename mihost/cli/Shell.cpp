@@ -57,6 +57,7 @@ bool Shell::runLine(std::string const& line)
     if (command.command()) {
         session_.setOptions(command.options());
         command.command()->run(session_);
+        Session::warnOfUnknown();
     } else if (command.options().json) {
         session_.out().json({{"text", command.answer()}});
     } else {

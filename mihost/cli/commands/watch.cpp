@@ -61,6 +61,10 @@ public:
             }
             view.properties = changed;
             show(session, view);
+            if (reading == 1)
+                Session::warnOfUnknown();
+            else
+                takeUnknownWarning(); // it was given
             if (reading == count_ || !goesOn(session.out(), signals, interval_))
                 return;
         }

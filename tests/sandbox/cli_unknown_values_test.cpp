@@ -1,0 +1,131 @@
+// What the plug-in could not read is shown as unknown, not as zero.
+
+#include "tests/support/Lines.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+
+namespace
+{
+
+using Json = nlohmann::ordered_json;
+using Lines = std::vector<std::string>;
+
+class UnknownValues : public testing::Test
+{
+protected:
+    UnknownValues()
+    {
+        machine::lay("plain");
+        machine::write("/etc/login.defs",
+                       "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+        machine::write("/etc/passwd", "root:x:0:0:root:/root:/bin/sh\n"
+                                      "anna:x:1000:1000::/home/anna:/bin/sh\n"
+                                      "ben:x:1001:1001::/home/ben:/bin/sh\n");
+        writeShadow("root:*:19000:0:99999:7:::\nanna:!:19001:1:98:6:5:21919:\n"
+                    "ben:!:19002:0:99999:7:::\n");
+    }
+
+    static void writeShadow(std::string const& text)
+    {
+        machine::write("/etc/shadow", text, 0600);
+    }
+
+    static Outcome runAsUser(Lines arguments, std::string const& input = "")
+    {
+        using std::filesystem::perms;
+        for (auto folder = std::filesystem::path(MIHOST_FILE).parent_path(); folder != "/";
+             folder = folder.parent_path())
+            permissions(folder, perms::group_exec | perms::others_exec,
+                        std::filesystem::perm_options::add);
+        arguments.insert(arguments.begin(),
+                         {"/usr/bin/setpriv", "--reuid=65534", "--clear-groups", MIHOST_FILE});
+        return runToEnd(arguments, input);
+    }
+
+    /** The names of the properties that are shown as unknown. */
+    static Lines unknownOf(std::string const& user, std::string const& reason)
+    {
+        Lines names;
+        Json const node = Json::parse(mihostRun({"--json", "get", user}).out);
+        for (Json const& property : node["properties"])
+            if (property.contains("unknown")) {
+                EXPECT_EQ(property["unknown"], reason);
+                EXPECT_EQ(property["value"], nullptr);
+                names.push_back(property["name"]);
+            }
+        return names;
+    }
+
+    Lines const all_ = {"password-expiry-days", "password-expiration", "password",
+                        "inactive-time",        "password-length",     "last-password-change",
+                        "password-min-days",    "password-warn-days",  "password-max-days"};
+};
+
+constexpr char warning[] = "mihost: reading passwords and ageing: /etc/shadow cannot be read: "
+                           "Permission denied, so some values are unknown (see 'mihost doctor')\n";
+
+TEST_F(UnknownValues, ShowAsADashWithOneWarning)
+{
+    Outcome const outcome = runAsUser(
+        {"get", "user:anna", "password-max-days", "password", "last-password-change", "user-name"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.out, "163 password-max-days     -\n117 password              -\n"
+                           "160 last-password-change  -\n108 user-name             anna\n");
+    EXPECT_EQ(outcome.err, warning);
+    for (Lines const& words :
+         {Lines{"tree", "--all"}, Lines{"--json", "tree"},
+          Lines{"list", "users", "--columns", "user-name,password-max-days"},
+          Lines{"watch", "user:root", "inactive-time", "--count", "2", "--interval", "0"}})
+        EXPECT_EQ(runAsUser(words).err, warning) << words[0];
+}
+
+TEST_F(UnknownValues, AreWarnedOfOnlyIfTheyShow)
+{
+    for (Lines const& words : {Lines{"tree"}, Lines{"list", "users"},
+                               Lines{"get", "user:anna", "user-name"}, Lines{"get", "os"}})
+        EXPECT_EQ(runAsUser(words).err, "") << words[0];
+}
+
+TEST_F(UnknownValues, AreWarnedOfForEachLineOfAScript)
+{
+    Outcome const outcome =
+        runAsUser({"shell"}, "get user:anna 163\nget os 108\nget user:anna 163\n");
+    EXPECT_EQ(outcome.err, std::string(warning) + warning);
+}
+
+TEST_F(UnknownValues, AreNullInJsonWithTheReason)
+{
+    Outcome const outcome = runAsUser({"--json", "get", "user:anna", "118", "117"});
+    Json const properties = Json::parse(outcome.out)["properties"];
+    for (Json const& property : properties) {
+        EXPECT_EQ(property["value"], nullptr) << property;
+        EXPECT_EQ(property["unknown"], "/etc/shadow cannot be read: Permission denied") << property;
+        EXPECT_FALSE(property.contains("hidden")) << property;
+    }
+    EXPECT_EQ(properties.size(), 2U);
+}
+
+TEST_F(UnknownValues, AreThoseOfAUserWithoutAShadowEntryAndOfAllAfterIt)
+{
+    writeShadow("root:*:19000:0:99999:7:::\nben:!:19002:0:99999:7:::\n");
+    EXPECT_EQ(unknownOf("user:root", ""), Lines());
+    EXPECT_EQ(unknownOf("user:anna", "'anna' has no entry in /etc/shadow"), all_);
+    EXPECT_EQ(unknownOf("user:ben",
+                        "the entry of 'ben' in /etc/shadow is out of the order of /etc/passwd"),
+              all_);
+}
+
+TEST_F(UnknownValues, AreNoZerosThatTheShadowFileHolds)
+{
+    writeShadow("root:*:0:0:0:0:0:0:\nanna:!:19001:0:0:0::21919:\nben:!:19002:0:99999:7:::\n");
+    for (char const* user : {"user:root", "user:anna", "user:ben"}) {
+        EXPECT_EQ(unknownOf(user, ""), Lines()) << user;
+        EXPECT_EQ(mihostRun({"get", user}).err, "") << user;
+    }
+}
+
+} // namespace

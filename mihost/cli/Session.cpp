@@ -2,6 +2,7 @@
 
 #include "mihost/cli/CommandGuard.h"
 #include "mihost/cli/CommandTap.h"
+#include "mihost/cli/Privilege.h"
 #include "mihost/cli/Progress.h"
 #include "mihost/cli/Say.h"
 #include "mihost/cli/Terminal.h"
@@ -23,8 +24,15 @@ namespace
 
 void goIntoSandbox(std::string const& overlay)
 {
-    if (auto const reason = enterSandbox(overlay))
-        throw Failure(BadUsage, fmt::format("no sandbox, so nothing was run: {}", *reason));
+    auto const reason = enterSandbox(overlay);
+    if (!reason)
+        return;
+    bool const isLimitedRoot = geteuid() == 0 && !hasCapability(CAP_SYS_ADMIN);
+    throw Failure(BadUsage,
+                  fmt::format("no sandbox, so nothing was run: {}{}", *reason,
+                              isLimitedRoot ? " (root lacks CAP_SYS_ADMIN here: grant it "
+                                              "where this container or service is started)"
+                                            : ""));
 }
 
 } // namespace

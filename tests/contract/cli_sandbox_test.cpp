@@ -161,6 +161,19 @@ TEST_F(MihostSandbox, ExitsAsTheCommandInsideDoes)
     EXPECT_EQ(mihostRun({"--sandbox", "--plugin", "/nonexistent", "tree"}).code, 3);
 }
 
+TEST_F(MihostSandbox, NamesTheCapabilityThatRootLacks)
+{
+    Outcome const outcome =
+        runToEnd({"/usr/bin/setpriv", "--inh-caps=-sys_admin", "--bounding-set=-sys_admin",
+                  MIHOST_FILE, "--sandbox", "version"});
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_NE(outcome.err.find(" (root lacks CAP_SYS_ADMIN here: grant it where this container or "
+                               "service is started)\n"),
+              std::string::npos)
+        << outcome.err;
+}
+
 TEST(MihostWithoutTheSandbox, IsNeverSilent)
 {
     Outcome const outcome = mihostRun({"--overlay", "/nonexistent", "tree"});

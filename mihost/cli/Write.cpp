@@ -31,7 +31,7 @@ using commandTap::RunCommand;
 struct Result {
     IC::Error error;
     std::vector<RunCommand> commands;
-    bool hasNewAccounts; // the account files differ
+    bool accountsDiffer;
     std::vector<FileChange> changes;
     std::vector<std::string> before; // what the expectations found
     std::vector<std::string> after;
@@ -62,7 +62,7 @@ Result perform(Write const& write, Secrets secrets)
                                    withoutSecrets(command.output, write.secrets), command.status});
     result.complaints = linesOf(withoutSecrets(commandTap::takeStandardError(), write.secrets));
     result.changes = changesBetween(accounts, readAccountFiles(), secrets);
-    result.hasNewAccounts = !result.changes.empty();
+    result.accountsDiffer = !result.changes.empty();
     if (inSandbox()) // where every file can be compared
         result.changes = shownChanges(copy.changesTo(CopyState::read()),
                                       std::filesystem::current_path(), secrets);
@@ -106,9 +106,23 @@ bool isPasswordOffer(RunCommand const& command)
 /** Whether what the command printed is an answer to the plug-in rather than a complaint. */
 bool isAnswer(RunCommand const& command)
 {
-    bool const isQuery = command.line.compare(0, 12, "/usr/bin/id ") == 0 ||
-                         command.line.compare(0, 9, "chage -l ") == 0;
+    static constexpr std::string_view queries[] = {"/usr/bin/id ", "chage -l "};
+    bool const isQuery =
+        std::any_of(std::begin(queries), std::end(queries), [&command](std::string_view query) {
+            return command.line.compare(0, query.size(), query) == 0;
+        });
     return isPasswordOffer(command) || (isQuery && command.status == 0);
+}
+
+/** What useradd says of a success. The plug-in fails a call for a word of any other tool. */
+std::vector<std::string> remarksOf(Result const& result)
+{
+    std::vector<std::string> remarks;
+    for (RunCommand const& command : result.commands)
+        if (command.line.find("/usr/sbin/useradd ") == 0)
+            for (std::string const& line : wordsOf(command))
+                remarks.push_back(line);
+    return remarks;
 }
 
 /** What the last command that complained said first: mostly why it failed. Empty for nothing. */
@@ -158,7 +172,7 @@ bool ranTool(Write const& write, Result const& result)
 bool isChanged(Write const& write, Result const& result, bool hasFailed)
 {
     bool const isToolsChange = !write.tool.empty() && !hasFailed;
-    return write.acts && (result.hasNewAccounts || result.before != result.after || isToolsChange);
+    return write.acts && (result.accountsDiffer || result.before != result.after || isToolsChange);
 }
 
 /** Why the write failed, without the commands' words; empty if it did not. */
@@ -185,16 +199,18 @@ WriteReport judged(Write const& write, Result const& result)
     std::string problem = problemOf(write, result);
     WriteReport report{"", isChanged(write, result, !problem.empty()), result.changes,
                        write.warnings, result.commands};
-    std::vector<std::string> complaints = result.complaints;
-    if (!problem.empty()) {
+    std::vector<std::string> said = result.complaints;
+    if (problem.empty()) {
+        std::vector<std::string> const remarks = remarksOf(result);
+        said.insert(said.end(), remarks.begin(), remarks.end());
+    } else {
         std::string const words = lastWords(result);
         if (!words.empty())
             problem += "; a command said: " + words;
         report.error = problem;
-        complaints.erase(std::remove(complaints.begin(), complaints.end(), words),
-                         complaints.end());
+        said.erase(std::remove(said.begin(), said.end(), words), said.end());
     }
-    for (std::string const& line : complaints)
+    for (std::string const& line : said)
         report.warnings.push_back("a command said: " + line);
     return report;
 }

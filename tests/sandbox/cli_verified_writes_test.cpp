@@ -1,5 +1,6 @@
 // The program looks at what a change left behind, and says so if it is not what was asked for.
 
+#include "mihost/sandbox/Sandbox.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
@@ -8,6 +9,7 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
+#include <unistd.h>
 
 namespace
 {
@@ -275,18 +277,38 @@ TEST_F(VerifiedWrite, PassesOnWhatASuccessfulToolSays)
     EXPECT_EQ(outcome.err, "mihost: a command said: no mail\n");
 }
 
+TEST_F(VerifiedWrite, PassesOnWhatUseraddSaysOfASuccess)
+{
+    machine::fake("/usr/sbin/useradd", "echo 'new:x:1600:100::/:/bin/sh' >>/etc/passwd\n"
+                                       "echo 'new:!:20000:0:99999:7:::' >>/etc/shadow\n"
+                                       "echo 'useradd: warning: home exists'\n");
+    Outcome const outcome = mihostRun({"call", "UserAdd", "UserName=new"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.err, "mihost: a command said: useradd: warning: home exists\n");
+}
+
+TEST_F(VerifiedWrite, FailsWhereTheLogCannotBeEmptied)
+{
+    machine::write("/var/log/messages", "Jan  2 03:04:05 line\n");
+    ASSERT_EQ(chown("/var/log/messages", 65534, 65534), 0);
+    Outcome const outcome =
+        runToEnd({"/usr/bin/setpriv", "--inh-caps=-dac_override", "--bounding-set=-dac_override",
+                  MIHOST_FILE, "--yes", "--json", "clear-log"});
+    EXPECT_EQ(outcome.code, 1);
+    EXPECT_EQ(outcome.err, "mihost: clear-log: system log is 21 bytes long, not empty\n");
+    EXPECT_EQ(Json::parse(outcome.out)["changed"], false);
+}
+
 TEST_F(VerifiedWrite, FailsWithoutPrivilege)
 {
     machine::write("/var/log/messages", "Jan  2 03:04:05 line\n");
-    Outcome const log = runAsUser({"--yes", "clear-log"});
-    EXPECT_EQ(log.code, 1);
-    EXPECT_EQ(log.err, "mihost: clear-log: system log is 21 bytes long, not empty\n");
-    Outcome const expiry = runAsUser({"set", "user:jdoe", "password-expiration", "2030-01-01"});
-    EXPECT_EQ(expiry.code, 1);
-    std::string const error =
-        "mihost: set password-expiration: password expiry of jdoe is unknown, "
-        "not 2030-01-01; a command said: chage: ";
-    EXPECT_EQ(linesOf(expiry.err).back().rfind(error, 0), 0U) << expiry.err;
+    for (Lines const& words : {Lines{"clear-log"}, Lines{"power", "halt"},
+                               Lines{"set", "user:jdoe", "password-expiration", "2030-01-01"}}) {
+        Lines arguments = words;
+        arguments.insert(arguments.begin(), "--yes");
+        EXPECT_EQ(runAsUser(arguments).code, 1) << words[0];
+    }
+    EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
 }
 
 TEST_F(VerifiedWrite, FailsWhereTheMachineRefusesToHalt)

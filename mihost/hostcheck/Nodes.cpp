@@ -302,8 +302,8 @@ Checks nodeChecks()
         {"IC::MutableNode::getProperty", "fails for an unset property, the value untouched",
          failsForUnset},
         {"IC::MutableNode::getProperties", "returns a copy of all stored values", listsAll},
-        {"IC::MutableNode::getProperty", "does not call a derived one", baseRead},
-        {"IC::MutableNode::setProperty", "does not call a derived one", baseWrite},
+        {"IC::MutableNode::setProperty", "does not call the derived one again", baseWrite},
+        {"IC::MutableNode::getProperty", "does not call the derived one again", baseRead},
         {"IC::Node", "stores properties itself", plainNode},
         {"IC::MutableNode", "can be used beside another node in another thread", nodesInTwoThreads},
     };

@@ -93,8 +93,8 @@ Checks textChecks()
         {"NQ::make_string(char const*)", "is empty for a null pointer", fromNull},
         {toWideName, "makes one wide character of each UTF-8 character", toWide},
         {"NQ::make_string(std::wstring const&)", "writes UTF-8", fromWide},
-        {toWideName, "loses nothing of empty, long and odd texts", oddTextsBack},
         {toWideName, "keeps bytes that are not UTF-8", invalidBack},
+        {toWideName, "loses nothing of empty, long and odd texts", oddTextsBack},
     };
 }
 

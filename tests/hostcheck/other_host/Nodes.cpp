@@ -127,11 +127,13 @@ std::map<unsigned int, PropertyValue> MutableNode::getProperties() const
 
 Error MutableNode::setProperty(unsigned int const& id, PropertyValue const& value)
 {
-    Error const stored = Node::setProperty(id, value);
-    PropertyValue current(PropertyValue::EmptyKind, true);
-    if (broken(Way::BaseCallsDerived))
-        static_cast<Node*>(this)->getProperty(id, current);
-    return stored;
+    static bool again = false;
+    if (!broken(Way::BaseCallsDerived) || again)
+        return Node::setProperty(id, value);
+    again = true;
+    Error const error = static_cast<Node*>(this)->setProperty(id, value);
+    again = false;
+    return error;
 }
 
 unsigned int MutableNode::getNodeId() const

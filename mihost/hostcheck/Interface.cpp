@@ -51,9 +51,9 @@ Error noteLoad(Node* const& node, void const* context)
 class TestInterface : public IC::ManagementInterface
 {
 public:
-    TestInterface()
+    explicit TestInterface(unsigned int id = 1)
+        : started(initialize(id, IC::Number(0U), IC::Number(IC::Number::EmptyKind)))
     {
-        initialize(1, IC::Number(0U), IC::Number(0U));
     }
 
     ~TestInterface() override
@@ -83,13 +83,14 @@ public:
 
     using IC::ManagementInterface::miId_;
     using IC::ManagementInterface::nextNodeId_;
+
+    Error const started;
 };
 
 std::string initializes()
 {
-    TestInterface interface;
-    Error const error = interface.initialize(41, IC::Number(0U), IC::Number(IC::Number::EmptyKind));
-    return firstOf({equal("the status", error.getStatus(), 0),
+    TestInterface const interface(41);
+    return firstOf({equal("the status", interface.started.getStatus(), 0),
                     equal("miId_ after the id 41", interface.miId_, 41),
                     equal("nextNodeId_ after the id 41", interface.nextNodeId_, 42)});
 }

@@ -68,14 +68,14 @@ std::string numbersInAList()
 
 std::string messageBuffer()
 {
-    InRoom<VXLog::VXMessageBuffer> buffer;
+    InRoom<VXLog::VXMessageBuffer> buffer{};
     *buffer << "text" << 5;
     return within(buffer);
 }
 
 std::string mutex()
 {
-    InRoom<NQ::Mutex> lock;
+    InRoom<NQ::Mutex> lock{};
     lock->lock(0xFFFFFFFFUL);
     lock->unlock();
     return within(lock);
@@ -89,7 +89,7 @@ std::string node()
 
 std::string interface()
 {
-    InRoom<IC::ManagementInterface> object;
+    InRoom<IC::ManagementInterface> object{};
     return within(object);
 }
 

@@ -202,7 +202,7 @@ std::string getNumbers()
 
 std::string getTexts()
 {
-    std::vector<std::string> const list = oddTexts();
+    std::vector<std::string> const& list = oddTexts();
     return firstOf({holds(PropertyValue(list, true).getTexts() == list, "the texts are others"),
                     holds(text("5").getTexts().empty(), "a single text has a list")});
 }

@@ -33,8 +33,7 @@ std::string fromPointer()
 
 std::string fromNull()
 {
-    char const* const none = nullptr;
-    return equal("the text of a null pointer", make_string(none), "");
+    return equal("the text of a null pointer", make_string(static_cast<char const*>(nullptr)), "");
 }
 
 std::string toWide()

@@ -75,8 +75,9 @@ TEST_F(InstalledTree, StandsInTheUsualDirectories)
     for (char const* file :
          {"bin/mihost", "include/mihost/host/OpenMI.h", "include/mihost/mihost/runtime/Runtime.h"})
         EXPECT_TRUE(fs::is_regular_file(prefix() / file)) << file;
-    for (char const* file : {"libzorvvxicosswmi.so.1", "libmihost.so", "libmihost.so.0",
-                             "pkgconfig/mihost.pc", "pkgconfig/mihost-headers.pc"})
+    for (char const* file :
+         {"libzorvvxicosswmi.so.1", "libmihost.so", "libmihost.so.0", "libmihostcheck.so",
+          "pkgconfig/mihost.pc", "pkgconfig/mihost-headers.pc"})
         EXPECT_TRUE(fs::is_regular_file(libraries() / file)) << file;
 }
 

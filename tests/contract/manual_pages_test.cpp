@@ -49,8 +49,10 @@ TEST_P(ManualPage, HoldsToTheMacros)
             ADD_FAILURE() << note;
 }
 
-INSTANTIATE_TEST_SUITE_P(Both, ManualPage, testing::Values(MIHOST_PAGE, PLUGIN_PAGE),
-                         [](auto const& which) { return which.index == 0 ? "Mihost" : "Plugin"; });
+char const* const pageNames[] = {"Mihost", "Plugin", "HostCheck"};
+
+INSTANTIATE_TEST_SUITE_P(All, ManualPage, testing::Values(MIHOST_PAGE, PLUGIN_PAGE, HOSTCHECK_PAGE),
+                         [](auto const& which) { return std::string(pageNames[which.index]); });
 
 TEST(ManualPageOfMihost, TellsOfEveryOption)
 {

@@ -28,7 +28,7 @@ struct ManagementInterface::Own {
         arrived.clear();
     }
 
-    std::list<Node*>::iterator find(Node const* node)
+    std::list<Node*>::iterator placeOf(Node const* node)
     {
         auto const at = std::find(nodes.rbegin(), nodes.rend(), node);
         return at == nodes.rend() ? nodes.end() : std::prev(at.base());
@@ -85,7 +85,7 @@ ManagementInterface::operator std::string() const
 Error ManagementInterface::addNewNode(Node*& node)
 {
     own_->take(nodes_);
-    if (own_->find(node) == own_->nodes.end() || broken(Way::ListsTwice))
+    if (own_->placeOf(node) == own_->nodes.end() || broken(Way::ListsTwice))
         own_->nodes.push_back(node);
     if (!loadCallBack_)
         return result(0);
@@ -98,7 +98,7 @@ Error ManagementInterface::addNewNode(Node*& node)
 Error ManagementInterface::deleteNode(Node* node)
 {
     own_->take(nodes_);
-    auto const at = own_->find(node);
+    auto const at = own_->placeOf(node);
     if (at == own_->nodes.end())
         return result(broken(Way::UnlistedIsDeleted) ? 0 : 1);
     own_->nodes.erase(at);

@@ -180,9 +180,10 @@ std::vector<Need> surroundings()
          "language-edition and code-set of os", "update-locale LANG=C.UTF-8",
          "localectl set-locale LANG=C.UTF-8", ""},
     };
-    if (isRoot)
-        for (Need const& need : capabilities())
-            needs.push_back(need);
+    if (isRoot) {
+        std::vector<Need> const ofRoot = capabilities();
+        needs.insert(needs.end(), ofRoot.begin(), ofRoot.end());
+    }
     return needs;
 }
 

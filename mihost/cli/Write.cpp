@@ -41,6 +41,7 @@ struct Result {
 std::vector<std::string> findings(std::vector<Expectation> const& expectations)
 {
     std::vector<std::string> all;
+    all.reserve(expectations.size());
     for (Expectation const& expectation : expectations)
         all.push_back(expectation.actual());
     return all;
@@ -178,8 +179,8 @@ bool isChanged(Write const& write, Result const& result, bool hasFailed)
 /** Why the write failed, without the commands' words; empty if it did not. */
 std::string problemOf(Write const& write, Result const& result)
 {
-    std::string const failed = failedCommand(result);
-    std::string const missed = unmet(write, result);
+    std::string failed = failedCommand(result);
+    std::string missed = unmet(write, result);
     // The plug-in also fails what an account tool comments on, such as "no changes".
     bool const isAsAsked = !write.expectations.empty() && missed.empty() && failed.empty() &&
                            !result.commands.empty() && !isChanged(write, result, false);
@@ -219,6 +220,7 @@ WriteReport judged(Write const& write, Result const& result)
 void tellUnchanged(Write const& write)
 {
     std::vector<std::string> facts;
+    facts.reserve(write.expectations.size());
     for (Expectation const& expectation : write.expectations)
         facts.push_back(fmt::format("{} is already {}", expectation.subject, expectation.wanted));
     say(fmt::format("mihost: nothing changed: {}\n",

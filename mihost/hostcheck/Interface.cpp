@@ -143,6 +143,8 @@ std::string addsWithoutCallBack()
 std::string listsOnce()
 {
     auto interface = std::make_unique<TestInterface>();
+    Loads loads;
+    interface->setLoadCallBack(noteLoad, &loads, nullptr);
     Node* listed = interface->append();
     Node* unlisted = new CountedNode(99);
     interface->addNewNode(listed);

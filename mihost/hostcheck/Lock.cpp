@@ -39,8 +39,8 @@ Answer lockElsewhere(NQ::Mutex& mutex, unsigned long timeout)
 
 std::string locks()
 {
-    NQ::Mutex mutex;
     for (unsigned long const timeout : {withoutLimit, ULONG_MAX, 0UL, 1UL}) {
+        NQ::Mutex mutex;
         if (mutex.lock(timeout) != 0)
             return "a free lock is not taken with a time limit of " + std::to_string(timeout);
         mutex.unlock();

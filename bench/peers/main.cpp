@@ -123,8 +123,8 @@ private:
 struct Compared {
     Peer const& peer;
     Samples its = {};
-    Samples plain = {};
-    Samples fast = {};
+    Samples mihost = {};
+    Samples plain = {}; // without the accelerator
 };
 
 std::string mihostTelling(std::string const& options, std::string const& script)
@@ -137,7 +137,7 @@ void compare(std::vector<Peer> const& peers, int users, std::string const& scrip
 {
     madeUp::accounts(users);
     Table table({"With " + number(users) + " users", "Its time, ms", "mihost, ms",
-                 "mihost --fast, ms", "mihost / its", "mihost --fast / its", "It leaves out"});
+                 "mihost --no-accel, ms", "mihost / its", "mihost --no-accel / its", "It leaves out"});
     for (Peer const& peer : peers) {
         Compared found{peer};
         auto const run = [](std::string const& line) {
@@ -146,11 +146,11 @@ void compare(std::vector<Peer> const& peers, int users, std::string const& scrip
         run(peer.command); // what it keeps for the next time is there from now on
         byTurns(quick ? quickRounds : rounds,
                 {[&] { found.its.push_back(run(peer.command)); },
-                 [&] { found.plain.push_back(run(mihostTelling("", script))); },
-                 [&] { found.fast.push_back(run(mihostTelling("--fast", script))); }});
-        table.add({peer.name, shown(found.its), shown(found.plain), shown(found.fast),
-                   shown(ratios(found.plain, found.its), 2),
-                   shown(ratios(found.fast, found.its), 3), peer.leavesOut});
+                 [&] { found.mihost.push_back(run(mihostTelling("", script))); },
+                 [&] { found.plain.push_back(run(mihostTelling("--no-accel", script))); }});
+        table.add({peer.name, shown(found.its), shown(found.mihost), shown(found.plain),
+                   shown(ratios(found.mihost, found.its), 3),
+                   shown(ratios(found.plain, found.its), 2), peer.leavesOut});
     }
     table.print();
 }

@@ -1,13 +1,7 @@
-#include "mihost/accel/Accelerator.h"
-
 #include "mihost/accel/Accel.h"
 #include "mihost/accel/Command.h"
-#include "mihost/accel/Date.h"
-#include "mihost/accel/Modules.h"
-#include "mihost/accel/Resolve.h"
-#include "mihost/accel/Sed.h"
 #include "mihost/accel/Stream.h"
-#include "mihost/accel/Wc.h"
+#include "mihost/accel/Trust.h"
 
 #include <algorithm>
 #include <atomic>
@@ -23,88 +17,76 @@ namespace
 
 std::atomic<bool> enabled{true};
 
-struct Count {
+struct Row {
     char const* command;
+    char const* form;
+    Tool tool;
+    Answer (*answer)(Operands const& operands);
     std::atomic<unsigned long> answered{0};
     std::atomic<unsigned long> handedOn{0};
     std::atomic<Reason> reason{nullptr};
 };
 
-/** In the order of Kind; the last one is for everything else. */
-Count counts[] = {{"wc"}, {"sed"}, {"date"}, {"lsmod"}, {"modinfo"}, {"other"}};
+Row rows[] = {
+    {"wc", "wc -l @", Tool::Any, wc},
+    {"sed", "sed -n '#p' @", Tool::Any, sed},
+    {"date", "date", Tool::Any, date},
+    {"lsmod", "lsmod", Tool::Kmod, lsmod},
+    {"modinfo", "modinfo ~", Tool::Kmod, modinfo},
+    {"other", nullptr, Tool::Any, nullptr},
+};
 
-Count& countOf(std::optional<Command> const& command)
+Answer ask(Row const& row, Operands const& operands)
 {
-    return command ? counts[static_cast<std::size_t>(command->kind)] : *std::prev(std::end(counts));
+    Reason const reason = distrust(row.command, row.tool);
+    return reason ? declined(reason) : row.answer(operands);
 }
 
-Answer ask(Command const& command)
+FILE* open(Row& row, Answer answer)
 {
-    switch (command.kind) {
-    case Kind::Wc:
-        return wc(command.name);
-    case Kind::Sed:
-        return sed(command.name, command.line);
-    case Kind::Date:
-        return date();
-    case Kind::Lsmod:
-    case Kind::Modinfo:
-        if (Reason const reason = strangeLibrary())
-            return Answer::none(reason);
-        return command.kind == Kind::Lsmod ? lsmod() : modinfo(command.name);
+    FILE* const stream = answer.text ? openStream(*std::move(answer.text)) : nullptr;
+    if (stream && !answer.reason) {
+        ++row.answered;
+    } else {
+        ++row.handedOn;
+        row.reason = answer.reason ? answer.reason : "no stream could be made";
     }
-    return Answer::none("not known here");
+    return stream;
 }
 
-Answer answer(std::optional<Command> const& command)
+FILE* openAnswerTo(std::string_view line, std::string_view mode)
 {
-    if (!command)
-        return Answer::none("not one of the commands that are answered here");
-    if (Reason const reason = unsure(command->kind))
-        return Answer::none(reason);
-    return ask(*command);
-}
-
-bool isPlainRead(std::string_view mode)
-{
-    return mode == "r" || mode == "re";
+    bool const isPlainRead = mode == "r" || mode == "re";
+    std::optional<Operands> operands;
+    for (Row& row : rows)
+        if (row.form && isPlainRead && (operands = operandsOf(row.form, line)))
+            return open(row, ask(row, *operands));
+    return open(*std::prev(std::end(rows)),
+                declined("not one of the commands that are answered here"));
 }
 
 } // namespace
 
-FILE* openAnswer(char const* line, char const* mode) noexcept
+FILE* openAnswer(char const* command, char const* mode) noexcept
 try {
-    if (!enabled)
-        return nullptr;
-    std::optional<Command> const command = isPlainRead(mode) ? recognise(line) : std::nullopt;
-    Count& count = countOf(command);
-    Answer found = answer(command);
-    FILE* const stream = found.declined ? nullptr : openStream(std::move(found.text));
-    if (stream) {
-        ++count.answered;
-    } else {
-        ++count.handedOn;
-        count.reason = found.declined ? found.declined : "no stream could be made";
-    }
-    return stream;
+    return enabled ? openAnswerTo(command, mode) : nullptr;
 } catch (std::exception const&) {
     return nullptr;
 }
 
 } // namespace miaccel
 
-using miaccel::counts;
-
 extern "C" int miaccel_enable(int on)
 {
     return miaccel::enabled.exchange(on != 0) ? 1 : 0;
 }
 
-extern "C" std::size_t miaccel_counts(miaccel_count* rows, std::size_t room)
+extern "C" std::size_t miaccel_counts(miaccel_count* counts, std::size_t room)
 {
-    std::size_t const count = std::size(counts);
-    std::transform(counts, counts + std::min(count, room), rows, [](miaccel::Count const& from) {
-        return miaccel_count{from.command, from.answered, from.handedOn, from.reason};
+    using miaccel::rows;
+    std::size_t const count = std::size(rows);
+    std::transform(rows, rows + std::min(count, room), counts, [](auto const& row) {
+        return miaccel_count{row.command, row.answered, row.handedOn, row.reason};
     });
     return count;
 }

@@ -1,7 +1,6 @@
 #include "mihost/accel/Command.h"
 
 #include <algorithm>
-#include <vector>
 
 namespace miaccel
 {
@@ -9,124 +8,67 @@ namespace miaccel
 namespace
 {
 
-using Words = std::vector<std::string>;
-
 bool isDigit(char c)
 {
     return c >= '0' && c <= '9';
 }
 
-/** Characters that every shell leaves alone, wherever in a word they stand. */
-bool isPlain(char c)
+bool isOfModuleName(char c)
 {
-    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || isDigit(c) || c == '/' || c == '.' ||
-           c == '_' || c == '-' || c == '+' || c == ',' || c == ':' || c == '@';
+    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || isDigit(c) || c == '_' || c == '-';
 }
 
-bool isBlank(char c)
+/** Characters without a meaning to any shell. */
+bool isOfFileName(char c)
 {
-    return c == ' ' || c == '\t';
+    return isOfModuleName(c) || std::string_view("/.+,:@").find(c) != std::string_view::npos;
 }
 
-/** Nothing where the line holds anything else than plain words, bare or wholly in quotes. */
-std::optional<Words> wordsOf(std::string_view line)
+/** Takes the characters of a kind off the line's front. */
+std::string take(std::string_view& line, bool (*isOfKind)(char))
 {
-    Words words;
-    auto at = line.begin();
-    while ((at = std::find_if_not(at, line.end(), isBlank)) != line.end()) {
-        bool const quoted = *at == '\'';
-        if (quoted)
-            ++at;
-        auto const end = std::find_if_not(at, line.end(), isPlain);
-        if (end == at)
-            return std::nullopt;
-        words.emplace_back(at, end);
-        at = end;
-        if (quoted && (at == line.end() || *at++ != '\''))
-            return std::nullopt;
-        if (at != line.end() && !isBlank(*at))
-            return std::nullopt;
-    }
-    return words;
+    auto const end = std::find_if_not(line.begin(), line.end(), isOfKind);
+    std::string word(line.begin(), end);
+    line.remove_prefix(word.size());
+    return word;
 }
 
-/** The number of a "Np" script; 0, which sed refuses, where it is none. */
-std::uint64_t lineOfScript(std::string const& script)
+bool takeName(std::string_view& line, bool (*isOfKind)(char), Operands& operands)
 {
-    constexpr std::size_t maxDigits = 18; // whatever they are, they fit
-    std::size_t const digits = script.size() - 1;
-    if (digits < 1 || digits > maxDigits || script.back() != 'p' || script.front() == '0' ||
-        !std::all_of(script.begin(), script.end() - 1, isDigit))
-        return 0;
-    return std::stoull(script);
+    operands.name = take(line, isOfKind);
+    return !operands.name.empty() && operands.name.front() != '-';
 }
 
-bool isOperand(std::string const& word)
+bool takeNumber(std::string_view& line, Operands& operands)
 {
-    return word.front() != '-';
+    constexpr std::size_t maxDigits = 18; // 64 bits hold them all
+    std::string const digits = take(line, isDigit);
+    if (digits.empty() || digits.size() > maxDigits || digits.front() == '0')
+        return false;
+    operands.line = std::stoull(digits);
+    return true;
 }
 
-bool isModuleName(std::string const& word)
+bool takeOne(char inForm, std::string_view& line, Operands& operands)
 {
-    return isOperand(word) && word.find_first_of("/.+,:@") == std::string::npos;
+    if (inForm == '#')
+        return takeNumber(line, operands);
+    if (inForm == '@' || inForm == '~')
+        return takeName(line, inForm == '@' ? isOfFileName : isOfModuleName, operands);
+    bool const isThere = !line.empty() && line.front() == inForm;
+    line.remove_prefix(isThere ? 1 : 0);
+    return isThere;
 }
-
-std::optional<Command> wc(Words const& words)
-{
-    if (words.size() != 3 || words[1] != "-l" || !isOperand(words[2]))
-        return std::nullopt;
-    return Command{Kind::Wc, words[2]};
-}
-
-std::optional<Command> sed(Words const& words)
-{
-    if (words.size() != 4 || words[1] != "-n" || !isOperand(words[3]))
-        return std::nullopt;
-    std::uint64_t const line = lineOfScript(words[2]);
-    if (line == 0)
-        return std::nullopt;
-    return Command{Kind::Sed, words[3], line};
-}
-
-std::optional<Command> date(Words const& words)
-{
-    if (words.size() != 1)
-        return std::nullopt;
-    return Command{Kind::Date, {}};
-}
-
-std::optional<Command> lsmod(Words const& words)
-{
-    if (words.size() != 1)
-        return std::nullopt;
-    return Command{Kind::Lsmod, {}};
-}
-
-std::optional<Command> modinfo(Words const& words)
-{
-    if (words.size() != 2 || !isModuleName(words[1]))
-        return std::nullopt;
-    return Command{Kind::Modinfo, words[1]};
-}
-
-constexpr struct {
-    char const* name;
-    std::optional<Command> (*parse)(Words const&);
-} grammar[] = {
-    {"wc", wc}, {"sed", sed}, {"date", date}, {"lsmod", lsmod}, {"modinfo", modinfo},
-};
 
 } // namespace
 
-std::optional<Command> recognise(std::string_view line)
+std::optional<Operands> operandsOf(std::string_view form, std::string_view line)
 {
-    std::optional<Words> const words = wordsOf(line);
-    if (!words || words->empty())
-        return std::nullopt;
-    for (auto const& command : grammar)
-        if (words->front() == command.name)
-            return command.parse(*words);
-    return std::nullopt;
+    Operands operands;
+    for (char const inForm : form)
+        if (!takeOne(inForm, line, operands))
+            return std::nullopt;
+    return line.empty() ? std::optional(std::move(operands)) : std::nullopt;
 }
 
 } // namespace miaccel

@@ -1,29 +1,19 @@
 #ifndef MIHOST_ACCEL_COMMAND_H
 #define MIHOST_ACCEL_COMMAND_H
 
-#include <cstdint>
-#include <optional>
-#include <string>
+#include "mihost/accel/Answers.h"
+
 #include <string_view>
 
 namespace miaccel
 {
 
-/** The commands known here, by the order in which they are counted. */
-enum class Kind { Wc, Sed, Date, Lsmod, Modinfo };
-
-/** A command line taken apart. */
-struct Command {
-    Kind kind;
-    std::string name;       // a file, or a module; empty where the command takes none
-    std::uint64_t line = 0; // of sed
-};
-
 /**
- * Recognises the command lines that are answered here. Nothing that a shell would expand,
- * redirect or read in any other way than as plain words, bare or in single quotes, is recognised.
+ * The operands of a command line that has the given form, such as "sed -n '#p' @". A # is a line
+ * number from 1 on, @ the name of a file and ~ that of a module, none of which a shell would expand
+ * or a tool mistake for an option. Everything else must be as it is in the form.
  */
-std::optional<Command> recognise(std::string_view line);
+std::optional<Operands> operandsOf(std::string_view form, std::string_view line);
 
 } // namespace miaccel
 

@@ -1,9 +1,9 @@
 #include "mihost/accel/LineIndex.h"
 
 #include <algorithm>
+#include <array>
 #include <cstring>
-#include <functional>
-#include <string_view>
+#include <unistd.h>
 
 namespace miaccel
 {
@@ -11,160 +11,106 @@ namespace miaccel
 namespace
 {
 
-constexpr std::uint64_t chunk = 16 * kibibyte; // bytes read at a time
+using Buffer = std::array<char, LineIndex::block>;
 
 /** Counts in bytes, as many as cannot overflow one, which compilers turn into wide instructions. */
 std::uint64_t countLineEnds(char const* text, std::uint64_t length)
 {
+    constexpr std::uint64_t stretch = 255;
     std::uint64_t count = 0;
-    while (length > 0) {
-        std::uint64_t const stretch = std::min<std::uint64_t>(length, 255);
+    for (char const* const end = text + length; text != end;) {
+        char const* const stop = text + std::min<std::uint64_t>(stretch, end - text);
         std::uint8_t found = 0;
-        for (std::uint64_t i = 0; i < stretch; ++i)
-            found = static_cast<std::uint8_t>(found + (text[i] == '\n'));
+        for (; text != stop; ++text)
+            found = static_cast<std::uint8_t>(found + (*text == '\n'));
         count += found;
-        text += stretch;
-        length -= stretch;
     }
     return count;
 }
 
+bool isSameFile(struct stat const& one, struct stat const& other)
+{
+    return one.st_dev == other.st_dev && one.st_ino == other.st_ino;
+}
+
 } // namespace
 
-LineIndex::LineIndex() : LineIndex(Limits{}) {}
-
-LineIndex::LineIndex(Limits limits) : limits_(limits)
+bool readAt(int file, char* buffer, std::uint64_t length, std::uint64_t offset)
 {
-    clear();
+    return pread(file, buffer, length, static_cast<off_t>(offset)) == static_cast<ssize_t>(length);
 }
 
-void LineIndex::clear()
+bool isUnchanged(struct stat const& before, struct stat const& now)
 {
-    stamp_.reset();
-    indexed_ = 0;
-    lineEnds_ = 0;
-    block_ = limits_.block;
-    before_.clear();
+    return isSameFile(before, now) && before.st_size == now.st_size &&
+           before.st_ctim.tv_sec == now.st_ctim.tv_sec &&
+           before.st_ctim.tv_nsec == now.st_ctim.tv_nsec;
 }
 
-bool LineIndex::update(TextFile const& file)
+bool LineIndex::update(int file, struct stat const& now)
 {
-    std::optional<FileStamp> const now = file.stamp();
-    if (!now)
-        return false;
-    if (stamp_ && now->isUnchangedSince(*stamp_))
+    auto const size = static_cast<std::uint64_t>(now.st_size);
+    bool const isContinued =
+        edges_ && isSameFile(state_, now) && size >= indexed_ && edges(file) == edges_;
+    if (isContinued && isUnchanged(state_, now))
         return true;
-    if (!isAppendedTo(file, *now))
-        clear();
-    stamp_.reset();
-    if (!extend(file, now->size()))
-        return false;
-    std::optional<Ends> const seen = ends(file);
-    if (!seen)
-        return false;
-    ends_ = *seen;
-    stamp_ = now;
-    return true;
+    if (!isContinued || size == indexed_)
+        *this = {};
+    state_ = now;
+    edges_ = extend(file, size) ? edges(file) : std::nullopt;
+    return edges_.has_value();
 }
 
-bool LineIndex::isAppendedTo(TextFile const& file, FileStamp const& now) const
+bool LineIndex::extend(int file, std::uint64_t size)
 {
-    return stamp_ && indexed_ > limits_.cheap && now.isSameFile(*stamp_) && now.size() > indexed_ &&
-           ends(file) == ends_;
-}
-
-std::optional<LineIndex::Ends> LineIndex::ends(TextFile const& file) const
-{
-    constexpr std::uint64_t most = 4096;
-    std::uint64_t const length = std::min(most, indexed_);
-    std::array<char, most> buffer;
-    Ends digests{};
-    std::array<std::uint64_t, 2> const offsets{0, indexed_ - length};
-    for (std::size_t end = 0; end < digests.size(); ++end) {
-        if (!file.read(buffer.data(), length, offsets[end]))
-            return std::nullopt;
-        digests[end] = std::hash<std::string_view>()({buffer.data(), length});
-    }
-    return digests;
-}
-
-bool LineIndex::extend(TextFile const& file, std::uint64_t size)
-{
-    std::array<char, chunk> buffer;
+    Buffer buffer;
     while (indexed_ < size) {
-        if (indexed_ == before_.size() * block_)
-            beginBlock();
-        std::uint64_t const want =
-            std::min({chunk, before_.size() * block_ - indexed_, size - indexed_});
-        if (!file.read(buffer.data(), want, indexed_))
+        std::uint64_t const inBlock = indexed_ % block;
+        if (inBlock == 0)
+            before_.push_back(lineEnds_);
+        std::uint64_t const want = std::min(block - inBlock, size - indexed_);
+        if (!readAt(file, buffer.data(), want, indexed_))
             return false;
         lineEnds_ += countLineEnds(buffer.data(), want);
+        hasNul_ = hasNul_ || std::memchr(buffer.data(), '\0', want);
         indexed_ += want;
     }
     return true;
 }
 
-void LineIndex::beginBlock()
+std::optional<std::string> LineIndex::edges(int file) const
 {
-    if (before_.size() == limits_.maxBlocks) {
-        for (std::size_t kept = 0; kept < before_.size() / 2; ++kept)
-            before_[kept] = before_[2 * kept];
-        before_.resize(before_.size() / 2);
-        block_ *= 2;
-    }
-    before_.push_back(lineEnds_);
+    std::uint64_t const length = std::min(edge, indexed_);
+    std::string text(2 * length, '\0');
+    if (!readAt(file, text.data(), length, 0) ||
+        !readAt(file, text.data() + length, length, indexed_ - length))
+        return std::nullopt;
+    return text;
 }
 
-std::uint64_t LineIndex::lineEnds() const
+std::optional<std::uint64_t> LineIndex::find(int file, std::uint64_t line) const
 {
-    return lineEnds_;
-}
-
-std::optional<Extent> LineIndex::find(TextFile const& file, std::uint64_t line) const
-{
+    if (line == 1)
+        return 0;
     if (line > lineEnds_ + 1)
-        return Extent{indexed_, 0};
-    std::uint64_t begin = 0;
-    if (line > 1) {
-        std::optional<std::uint64_t> const previous = lineEnd(file, line - 1);
-        if (!previous)
-            return std::nullopt;
-        begin = *previous + 1;
-    }
-    std::uint64_t end = indexed_;
-    if (line <= lineEnds_) {
-        std::optional<std::uint64_t> const own = lineEnd(file, line);
-        if (!own || *own < begin)
-            return std::nullopt;
-        end = *own + 1;
-    }
-    return Extent{begin, end - begin};
-}
-
-/** The offset of a line end, 1 for the first; it must be one of those counted. */
-std::optional<std::uint64_t> LineIndex::lineEnd(TextFile const& file, std::uint64_t number) const
-{
+        return indexed_;
+    std::uint64_t const number = line - 1; // of the line end before it
     auto const next = std::lower_bound(before_.begin(), before_.end(), number);
-    auto const block = static_cast<std::uint64_t>(next - before_.begin()) - 1;
-    std::uint64_t left = number - before_[block];
-    std::uint64_t at = block * block_;
-    std::uint64_t const stop = std::min(at + block_, indexed_);
-    std::array<char, chunk> buffer;
-    while (at < stop) {
-        std::uint64_t const want = std::min(chunk, stop - at);
-        if (!file.read(buffer.data(), want, at))
+    auto const index = static_cast<std::uint64_t>(next - before_.begin()) - 1;
+    std::uint64_t const offset = index * block;
+    std::uint64_t const length = std::min(block, indexed_ - offset);
+    Buffer buffer;
+    if (!readAt(file, buffer.data(), length, offset))
+        return std::nullopt;
+    char const* const end = buffer.data() + length;
+    char const* at = buffer.data();
+    for (std::uint64_t left = number - before_[index]; left > 0; --left) {
+        at = std::find(at, end, '\n');
+        if (at == end)
             return std::nullopt;
-        char const* const end = buffer.data() + want;
-        char const* from = buffer.data();
-        while (void const* found = std::memchr(from, '\n', static_cast<std::size_t>(end - from))) {
-            char const* const lineFeed = static_cast<char const*>(found);
-            if (--left == 0)
-                return at + static_cast<std::uint64_t>(lineFeed - buffer.data());
-            from = lineFeed + 1;
-        }
-        at += want;
+        ++at;
     }
-    return std::nullopt;
+    return offset + static_cast<std::uint64_t>(at - buffer.data());
 }
 
 } // namespace miaccel

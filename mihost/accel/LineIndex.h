@@ -1,81 +1,71 @@
 #ifndef MIHOST_ACCEL_LINEINDEX_H
 #define MIHOST_ACCEL_LINEINDEX_H
 
-#include "mihost/accel/FileStamp.h"
-#include "mihost/accel/TextFile.h"
-
-#include <array>
-#include <cstddef>
 #include <cstdint>
 #include <optional>
+#include <string>
+#include <sys/stat.h>
 #include <vector>
 
 namespace miaccel
 {
 
-constexpr std::uint64_t kibibyte = 1024;
+/** Fills the whole buffer; false if the file ends before that or cannot be read. */
+bool readAt(int file, char* buffer, std::uint64_t length, std::uint64_t offset);
 
-/** A stretch of a file, in bytes. */
-struct Extent {
-    std::uint64_t offset;
-    std::uint64_t length;
-};
+/** Whether two states are those of one file, without a change in between. */
+bool isUnchanged(struct stat const& before, struct stat const& now);
 
 /**
- * Where the lines of a file are: for every block of the file, how many line ends stand before it.
+ * Where the lines of a file are: how many line ends are before each block of the file.
  *
- * Finding a line reads the block where it begins and the block where it ends, and nothing else.
- * Blocks double when there are too many, so the memory is bounded.
+ * Finding a line reads one block of the file. Files are given by their descriptors.
  */
 class LineIndex
 {
 public:
-    struct Limits {
-        std::uint64_t block = 16 * kibibyte;
-        std::size_t maxBlocks = 16384; // an even number
-        /** Up to this size a file that changed is read again as a whole. */
-        std::uint64_t cheap = 1024 * kibibyte;
-    };
-
-    LineIndex();
-    explicit LineIndex(Limits limits);
+    static constexpr std::uint64_t block = std::uint64_t{64} * 1024;
+    /** So much of both ends of what is indexed is compared each time. */
+    static constexpr std::uint64_t edge = std::uint64_t{16} * 1024;
 
     /**
-     * Makes the index that of the file as it is now.
+     * Makes the index that of the file, reading what was added, or everything if it is another file
+     * or has changed in any other way.
      *
-     * @return false where the file cannot be read to the end that it had at first
+     * @param now  the file's state, which was taken before
+     * @return false if the file cannot be read to the end that it had then
      */
-    bool update(TextFile const& file);
+    bool update(int file, struct stat const& now);
 
-    /** Line ends in the file; text after the last one is not counted. */
-    std::uint64_t lineEnds() const;
+    /** Line ends in the file; text after the last one does not count. */
+    std::uint64_t lineEnds() const
+    {
+        return lineEnds_;
+    }
+    bool hasNul() const
+    {
+        return hasNul_;
+    }
 
     /**
-     * Where a line stands, its end included. A line that the file does not have is empty.
+     * The offset at which a line begins: the end of the file past the last line.
      *
      * @param line  1 for the first
-     * @return nothing where the file is no longer the one of the index
+     * @return nothing if the file is no longer the one of the index
      */
-    std::optional<Extent> find(TextFile const& file, std::uint64_t line) const;
+    std::optional<std::uint64_t> find(int file, std::uint64_t line) const;
 
 private:
-    /** Digests of the first and of the last bytes that are indexed. */
-    using Ends = std::array<std::size_t, 2>;
+    bool extend(int file, std::uint64_t size);
+    std::optional<std::string> edges(int file) const;
 
-    void clear();
-    bool isAppendedTo(TextFile const& file, FileStamp const& now) const;
-    std::optional<Ends> ends(TextFile const& file) const;
-    bool extend(TextFile const& file, std::uint64_t size);
-    void beginBlock();
-    std::optional<std::uint64_t> lineEnd(TextFile const& file, std::uint64_t number) const;
-
-    Limits limits_;
-    std::optional<FileStamp> stamp_; // of what is indexed; none where that is nothing
-    std::uint64_t indexed_ = 0;      // bytes
+    struct stat state_ {
+    };
+    std::uint64_t indexed_ = 0; // bytes
     std::uint64_t lineEnds_ = 0;
-    std::uint64_t block_ = 0;
+    bool hasNul_ = false;
     std::vector<std::uint64_t> before_; // line ends before each block
-    Ends ends_{};
+    std::optional<std::string> edges_;  // none: nothing is indexed
 };
 
 } // namespace miaccel

@@ -1,17 +1,13 @@
-#include "mihost/accel/Modules.h"
-
-#include "mihost/accel/FileStamp.h"
-#include "mihost/accel/Tool.h"
+#include "mihost/accel/Answers.h"
 
 #include <algorithm>
+#include <array>
 #include <cstdarg>
-#include <cstdlib>
-#include <cstring>
-#include <dlfcn.h>
+#include <cstdio>
 #include <libkmod.h>
-#include <list>
 #include <memory>
 #include <string_view>
+#include <vector>
 
 namespace miaccel
 {
@@ -20,234 +16,165 @@ namespace
 {
 
 constexpr Reason complaint = "the command would write to standard error";
-constexpr Reason longKey = "versions of modinfo differ in how they show a long key";
-
 constexpr std::size_t valueColumn = 16;
 
-template <class Owned, auto release> struct Release {
-    void operator()(Owned* owned) const
+template <auto release> struct Release {
+    template <class Owned> void operator()(Owned* owned) const
     {
         release(owned);
     }
 };
-template <class Owned, auto release> using Owner = std::unique_ptr<Owned, Release<Owned, release>>;
+using Module = std::unique_ptr<kmod_module, Release<kmod_module_unref>>;
+using Modules = std::unique_ptr<kmod_list, Release<kmod_module_unref_list>>;
+using Facts = std::unique_ptr<kmod_list, Release<kmod_module_info_free_list>>;
 
-using Context = Owner<kmod_ctx, kmod_unref>;
-using Module = Owner<kmod_module, kmod_module_unref>;
-using Modules = Owner<kmod_list, kmod_module_unref_list>;
-using Facts = Owner<kmod_list, kmod_module_info_free_list>;
-
-/** One question to libkmod. What it would write to standard error is noted instead. */
-class Session
+/** libkmod for one query. What it would write to standard error is noted instead. */
+class Library
 {
 public:
-    Session() : context_(kmod_new(runningKernel, noConfiguration))
+    Library() : context_(kmod_new(runningKernel, noConfiguration))
     {
         if (context_)
-            kmod_set_log_fn(context_.get(), &Session::note, this);
+            kmod_set_log_fn(context_.get(), &Library::note, &complained_);
     }
-    Session(Session const&) = delete;
-    Session& operator=(Session const&) = delete;
 
     kmod_ctx* context() const
     {
         return context_.get();
     }
-
-    void stepAside(Reason reason)
+    bool complained() const
     {
-        reason_ = reason;
-    }
-
-    Answer answer(std::string text) const
-    {
-        return reason_ ? Answer::none(reason_) : Answer::with(std::move(text));
+        return complained_;
     }
 
 private:
-    static void note(void* self, int, char const*, int, char const*, char const*, va_list)
+    static void note(void* complained, int, char const*, int, char const*, char const*, va_list)
     {
-        static_cast<Session*>(self)->stepAside(complaint);
+        *static_cast<bool*>(complained) = true;
     }
 
     static constexpr char const* runningKernel = nullptr;
     static constexpr char const* noConfiguration[] = {nullptr};
 
-    Context context_;
-    Reason reason_ = nullptr;
+    std::unique_ptr<kmod_ctx, Release<kmod_unref>> context_;
+    bool complained_ = false;
 };
 
-template <class Do> void forEach(kmod_list const* list, Do each)
+template <class Do> void forEachModule(kmod_list const* list, Do each)
 {
     for (kmod_list const* entry = list; entry; entry = kmod_list_next(list, entry))
-        each(entry);
-}
-
-std::string padded(std::string text, std::size_t width)
-{
-    text.resize(std::max(text.size(), width), ' ');
-    return text;
-}
-
-std::string rightAligned(std::string const& text, std::size_t width)
-{
-    return std::string(width - std::min(width, text.size()), ' ') + text;
+        each(Module(kmod_module_get_module(entry)).get());
 }
 
 std::string holdersOf(kmod_module const* module)
 {
-    Modules const holders(kmod_module_get_holders(module));
     std::string names;
-    forEach(holders.get(), [&](kmod_list const* entry) {
-        Module const holder(kmod_module_get_module(entry));
+    forEachModule(Modules(kmod_module_get_holders(module)).get(), [&](kmod_module const* holder) {
         names += names.empty() ? ' ' : ',';
-        names += kmod_module_get_name(holder.get());
+        names += kmod_module_get_name(holder);
     });
     return names;
 }
 
 std::string loadedLine(kmod_module const* module)
 {
-    return padded(kmod_module_get_name(module), 19) + ' ' +
-           rightAligned(std::to_string(kmod_module_get_size(module)), 8) + "  " +
-           std::to_string(kmod_module_get_refcnt(module)) + holdersOf(module) + '\n';
+    std::array<char, 256> line{};
+    std::snprintf(line.data(), line.size(), "%-19s %8ld  %d", kmod_module_get_name(module),
+                  kmod_module_get_size(module), kmod_module_get_refcnt(module));
+    return line.data() + holdersOf(module) + '\n';
 }
 
-std::string factLine(std::string_view key, std::string_view value)
+std::string factLine(std::string_view key, std::string const& value)
 {
     std::string line(key);
     line += ':';
-    return padded(line, valueColumn).append(value) + '\n';
+    line.resize(std::max(line.size(), valueColumn), ' ');
+    return line + value + '\n';
 }
 
-/** A module's parameters; modules give the text and the type of one apart, in any order. */
-class Parameters
-{
-public:
-    /** @return false where the value has no colon */
-    bool add(std::string_view value, bool isType)
+/** A module has the text and the type of a parameter apart, in any order. */
+struct Parameter {
+    std::string name;
+    std::optional<std::string> text = {};
+    std::optional<std::string> type = {};
+
+    std::string line() const
     {
-        std::string_view::size_type const colon = value.find(':');
-        if (colon == std::string_view::npos)
-            return false;
-        Parameter& parameter = named(value.substr(0, colon));
-        (isType ? parameter.type : parameter.text) = value.substr(colon + 1);
-        return true;
+        if (!text)
+            return factLine("parm", name + ':' + *type);
+        return factLine("parm", name + ':' + *text + (type ? " (" + *type + ')' : ""));
     }
-
-    /** The parameter first seen last comes first. */
-    std::string lines() const
-    {
-        std::string text;
-        for (Parameter const& parameter : parameters_)
-            text += factLine("parm", std::string(parameter.name) + ':' + described(parameter));
-        return text;
-    }
-
-private:
-    struct Parameter {
-        std::string_view name;
-        std::string_view text; // its data is null where there is none
-        std::string_view type; // likewise
-    };
-
-    static std::string described(Parameter const& parameter)
-    {
-        if (!parameter.text.data())
-            return std::string(parameter.type);
-        std::string text(parameter.text);
-        if (parameter.type.data())
-            text.append(" (").append(parameter.type).append(")");
-        return text;
-    }
-
-    Parameter& named(std::string_view name)
-    {
-        auto const known =
-            std::find_if(parameters_.begin(), parameters_.end(),
-                         [name](Parameter const& parameter) { return parameter.name == name; });
-        if (known != parameters_.end())
-            return *known;
-        parameters_.push_front({name, {}, {}});
-        return parameters_.front();
-    }
-
-    std::list<Parameter> parameters_;
 };
 
-std::string factsOf(kmod_module const* module, Session& session)
+/** @return false if the value is not that of a parameter */
+bool add(std::vector<Parameter>& parameters, std::string const& value, bool isType)
+{
+    std::string::size_type const colon = value.find(':');
+    if (colon == std::string::npos)
+        return false;
+    std::string const name = value.substr(0, colon);
+    auto found = std::find_if(parameters.begin(), parameters.end(),
+                              [&name](Parameter const& one) { return one.name == name; });
+    if (found == parameters.end())
+        found = parameters.insert(found, {name});
+    (isType ? found->type : found->text) = value.substr(colon + 1);
+    return true;
+}
+
+Answer factsOf(kmod_module const* module)
 {
     char const* const path = kmod_module_get_path(module);
-    std::string text;
     if (!path)
-        text += factLine("name", kmod_module_get_name(module));
-    text += factLine("filename", path ? path : "(builtin)");
+        return declined("not every modinfo knows modules that are built in");
     kmod_list* list = nullptr;
     int const got = kmod_module_get_info(module, &list);
     Facts const facts(list);
-    // Old kernels say nothing of what they have built in, and the command takes that as it is.
-    if (got < 0 && (path || got != -ENOENT))
-        session.stepAside(complaint);
     if (got < 0)
-        return text;
-    Parameters parameters;
-    forEach(facts.get(), [&](kmod_list const* entry) {
-        std::string_view const key = kmod_module_info_get_key(entry);
-        char const* const value = kmod_module_info_get_value(entry);
+        return declined(complaint);
+    std::string text = factLine("filename", path);
+    std::vector<Parameter> parameters;
+    for (kmod_list const* fact = list; fact; fact = kmod_list_next(list, fact)) {
+        std::string_view const key = kmod_module_info_get_key(fact);
+        std::string const value = kmod_module_info_get_value(fact);
         if (key.size() >= valueColumn)
-            session.stepAside(longKey);
+            return declined("not every modinfo prints a long key alike");
         if (key != "parm" && key != "parmtype")
             text += factLine(key, value);
-        else if (!parameters.add(value, key == "parmtype"))
-            session.stepAside(complaint);
-    });
-    return text + parameters.lines();
+        else if (!add(parameters, value, key == "parmtype"))
+            return declined(complaint);
+    }
+    // The parameter that was first seen last comes first.
+    std::for_each(parameters.rbegin(), parameters.rend(),
+                  [&text](Parameter const& parameter) { text += parameter.line(); });
+    return {std::move(text)};
 }
 
 } // namespace
 
-Reason strangeLibrary()
+Answer lsmod(Operands const&)
 {
-    Dl_info own{};
-    if (dladdr(reinterpret_cast<void*>(&kmod_new), &own) == 0)
-        return "libkmod cannot be found";
-    std::unique_ptr<char, decltype(&std::free)> const path(realpath(own.dli_fname, nullptr),
-                                                           &std::free);
-    std::optional<FileStamp> const stamp = FileStamp::of(path ? path.get() : "");
-    if (!stamp || !stamp->isOlderThanProcess() || !isGenuine({path.get(), "libkmod2", "30+ 34.2-"}))
-        return "libkmod is not the one of the commands";
-    return nullptr;
-}
-
-Answer lsmod()
-{
-    Session session;
+    Library const library;
     kmod_list* list = nullptr;
-    if (!session.context() || kmod_module_new_from_loaded(session.context(), &list) < 0)
-        return Answer::none(complaint);
+    if (!library.context() || kmod_module_new_from_loaded(library.context(), &list) < 0)
+        return declined(complaint);
     Modules const modules(list);
     std::string text = "Module                  Size  Used by\n";
-    forEach(modules.get(), [&text](kmod_list const* entry) {
-        Module const module(kmod_module_get_module(entry));
-        text += loadedLine(module.get());
-    });
-    return session.answer(std::move(text));
+    forEachModule(list, [&text](kmod_module const* module) { text += loadedLine(module); });
+    return library.complained() ? declined(complaint) : Answer{std::move(text)};
 }
 
-Answer modinfo(std::string const& name)
+Answer modinfo(Operands const& operands)
 {
-    Session session;
+    Library const library;
     kmod_list* list = nullptr;
-    if (!session.context() ||
-        kmod_module_new_from_lookup(session.context(), name.c_str(), &list) < 0 || !list)
-        return Answer::none(complaint);
+    if (!library.context() ||
+        kmod_module_new_from_lookup(library.context(), operands.name.c_str(), &list) < 0 || !list)
+        return declined(complaint);
     Modules const modules(list);
-    std::string text;
-    forEach(modules.get(), [&](kmod_list const* entry) {
-        Module const module(kmod_module_get_module(entry));
-        text += factsOf(module.get(), session);
-    });
-    return session.answer(std::move(text));
+    if (kmod_list_next(list, list))
+        return declined("the name is an alias of several modules");
+    Answer facts = factsOf(Module(kmod_module_get_module(list)).get());
+    return library.complained() ? declined(complaint) : facts;
 }
 
 } // namespace miaccel

@@ -1,9 +1,8 @@
 #include "mihost/accel/Stream.h"
 
-#include <cerrno>
+#include <array>
+#include <dlfcn.h>
 #include <memory>
-#include <mutex>
-#include <unordered_set>
 
 namespace miaccel
 {
@@ -11,39 +10,9 @@ namespace miaccel
 namespace
 {
 
-/** The streams that are open. Never destroyed: threads may run to the very end of the process. */
-class Registry
-{
-public:
-    void add(FILE* stream)
-    {
-        std::lock_guard const held(lock_);
-        streams_.insert(stream);
-    }
-
-    /** @return false where it was not there */
-    bool remove(FILE* stream)
-    {
-        std::lock_guard const held(lock_);
-        return streams_.erase(stream) != 0;
-    }
-
-private:
-    std::mutex lock_;
-    std::unordered_set<FILE*> streams_;
-};
-
-Registry& registry()
-{
-    static auto& open = *new Registry;
-    return open;
-}
-
-/** What a stream reads from; its C library calls come one at a time. */
 struct Source {
     std::string text;
     std::size_t at = 0;
-    FILE* stream = nullptr;
 };
 
 ssize_t readSource(void* cookie, char* buffer, std::size_t size)
@@ -54,24 +23,15 @@ ssize_t readSource(void* cookie, char* buffer, std::size_t size)
     return static_cast<ssize_t>(length);
 }
 
-int seekSource(void*, off64_t*, int)
-{
-    errno = ESPIPE;
-    return -1;
-}
-
-struct CloseFile {
-    void operator()(FILE* stream) const
-    {
-        std::fclose(stream);
-    }
-};
-
 int closeSource(void* cookie)
 {
     std::unique_ptr<Source> const source(static_cast<Source*>(cookie));
-    registry().remove(source->stream);
     return 0;
+}
+
+template <class Function> Function* next(char const* name)
+{
+    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
 }
 
 } // namespace
@@ -79,21 +39,35 @@ int closeSource(void* cookie)
 FILE* openStream(std::string text)
 {
     auto source = std::make_unique<Source>(Source{std::move(text)});
-    std::unique_ptr<FILE, CloseFile> stream(
-        fopencookie(source.get(), "r", {readSource, nullptr, seekSource, closeSource}));
-    if (!stream)
-        return nullptr;
-    source.release()->stream = stream.get(); // the stream's own from now on
-    registry().add(stream.get());
-    return stream.release();
+    FILE* const stream =
+        fopencookie(source.get(), "r", {readSource, nullptr, nullptr, closeSource});
+    if (stream)
+        (void)source.release(); // closeSource deletes it
+    return stream;
 }
 
-bool closeStream(FILE* stream)
+FILE* realPopen(char const* command, char const* mode)
 {
-    if (!registry().remove(stream))
-        return false;
-    std::fclose(stream);
-    return true;
+    static auto* const real = next<FILE*(char const*, char const*)>("popen");
+    return real(command, mode);
+}
+
+int realPclose(FILE* stream)
+{
+    static auto* const real = next<int(FILE*)>("pclose");
+    return real(stream);
+}
+
+std::optional<std::string> realOutput(char const* command)
+{
+    FILE* const stream = realPopen(command, "re");
+    if (!stream)
+        return std::nullopt;
+    std::string text;
+    std::array<char, 512> block{};
+    while (std::size_t const length = std::fread(block.data(), 1, block.size(), stream))
+        text.append(block.data(), length);
+    return realPclose(stream) == 0 ? std::optional(std::move(text)) : std::nullopt;
 }
 
 } // namespace miaccel

@@ -2,9 +2,7 @@
 
 #include "mihost/accel/Accel.h"
 #include "mihost/cli/CommandTap.h"
-#include "mihost/cli/Failure.h"
 
-#include <algorithm>
 #include <dlfcn.h>
 #include <fmt/format.h>
 
@@ -19,14 +17,6 @@ template <class Function> Function* find(void* library, char const* name)
     return reinterpret_cast<Function*>(dlsym(library, name));
 }
 
-void* load()
-{
-    void* const library = dlopen(MIHOST_ACCELERATOR, RTLD_NOW | RTLD_LOCAL);
-    if (!library)
-        throw Failure(BadUsage, fmt::format("no accelerator, so nothing was run: {}", dlerror()));
-    return library;
-}
-
 Accelerator::Row rowOf(miaccel_count const& count)
 {
     return {count.command, count.answered, count.handed_on, count.reason ? count.reason : ""};
@@ -34,14 +24,19 @@ Accelerator::Row rowOf(miaccel_count const& count)
 
 } // namespace
 
-Accelerator::Accelerator() : library_(load())
+Accelerator::Accelerator() : library_(dlopen(MIHOST_ACCELERATOR, RTLD_NOW | RTLD_LOCAL))
 {
-    commandTap::setRunner({find<commandTap::Runner::Open>(library_, "popen"),
-                           find<commandTap::Runner::Close>(library_, "pclose")});
+    if (library_)
+        commandTap::setRunner({find<commandTap::Runner::Open>(library_, "popen"),
+                               find<commandTap::Runner::Close>(library_, "pclose")});
+    else
+        problem_ = dlerror();
 }
 
 std::vector<Accelerator::Row> Accelerator::rows() const
 {
+    if (!library_)
+        return {{"all", 0, commandTap::count(), problem_}};
     auto* const counts = find<decltype(miaccel_counts)>(library_, "miaccel_counts");
     std::vector<miaccel_count> all(counts(nullptr, 0));
     counts(all.data(), all.size());

@@ -10,10 +10,8 @@ namespace mihost
 {
 
 /**
- * From its making to the end of the process, commands are answered by the accelerator where it can.
- *
- * Its library is loaded only then, behind the program's own popen: a run without it is spared
- * everything that the library needs.
+ * From its making to the end of the process, commands are answered by the accelerator if it can.
+ * Without its library, which is loaded only now, every command is run.
  */
 class Accelerator
 {
@@ -23,10 +21,9 @@ public:
         std::string command;
         unsigned long answered; // in the process
         unsigned long run;
-        std::string reason; // why it was last run; empty where it never was
+        std::string reason; // why it was last run; empty if it never was
     };
 
-    /** @throws Failure where the library cannot be loaded */
     Accelerator();
 
     /** In the library's order, without the commands that were never asked for. */
@@ -34,6 +31,7 @@ public:
 
 private:
     void* library_;
+    std::string problem_; // why it could not be loaded
 };
 
 /** For people to read. */

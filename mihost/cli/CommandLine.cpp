@@ -78,9 +78,10 @@ void CommandLine::declareForProgram(CLI::App& app)
                  "run everything in a copy of this machine; nothing on the machine changes");
     app.add_option("--overlay", options_.overlay, "lay the files of DIR over the sandbox first")
         ->type_name("DIR");
-    app.add_flag("--fast", options_.fast,
-                 "answer read-only commands of the plug-in inside the process");
-    app.add_flag("--timing", options_.timing, "tell how long each phase of the start took");
+    app.add_flag("--no-accel", options_.noAccel,
+                 "run every command of the plug-in, also those that could be answered in-process");
+    app.add_flag("--timing", options_.timing,
+                 "show the time of each phase of the start, and what was answered in-process");
 }
 
 void CommandLine::declare(CLI::App& app)

@@ -17,7 +17,7 @@ struct Options {
     bool yes = false; // do without asking
     bool timing = false;
     unsigned int lockTimeout = 60; // seconds to wait for another mihost that changes the machine
-    bool fast = false;             // commands answered in the process where they can be
+    bool noAccel = false;          // every command of the plug-in is run
 };
 
 } // namespace mihost

@@ -45,8 +45,6 @@ Session::Session(Options options)
         traceSink_ = std::make_unique<RedactingSink>(trace_->sink());
         sinks_.add(*traceSink_);
     }
-    if (options_.fast)
-        accelerator_ = std::make_unique<Accelerator>();
     // The trace stays the machine's own: it is open by now. The plug-in's file has its full path.
     if (options_.sandbox)
         goIntoSandbox(options_.overlay);
@@ -85,6 +83,8 @@ Plugin& Session::plugin()
         setenv("LC_ALL", "C", 1);
         commandTap::setGuard(mayRun);
         timing_.begin("load");
+        if (!options_.noAccel)
+            accelerator_ = std::make_unique<Accelerator>();
         plugin_ = std::make_unique<Plugin>(pluginFile_);
         timing_.end();
     }

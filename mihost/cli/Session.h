@@ -24,7 +24,7 @@ class Session
 {
 public:
     /**
-     * Opens the trace and, where that is asked for, loads the accelerator and goes on in a sandbox.
+     * Opens the trace and, where that is asked for, goes on in a sandbox.
      *
      * @throws Failure where one of them cannot be had
      */

@@ -93,7 +93,7 @@ TEST_F(InstalledTree, RunsMihostWithTheAcceleratorBesideIt)
 {
     EXPECT_TRUE(fs::is_regular_file(libraries() / "libmiaccel.so"));
     EXPECT_TRUE(fs::is_regular_file(prefix() / "include/mihost/mihost/accel/Accel.h"));
-    Outcome const outcome = runToEnd({prefix() / "bin/mihost", "--fast", "get", "os", "os-name"});
+    Outcome const outcome = runToEnd({prefix() / "bin/mihost", "--timing", "get", "os", "os-name"});
     EXPECT_EQ(outcome.code, 0) << outcome.err;
 }
 #endif

@@ -4,36 +4,34 @@
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
+#include <cstdlib>
 #include <filesystem>
 #include <gtest/gtest.h>
 
 namespace
 {
 
-/** What a fresh process prints for date, by itself and with the accelerator. */
-struct Dates {
-    std::string real;
-    std::string accelerated;
-    bool answered;
-};
-
-/** Asked again where the second changed in between. */
-Dates dates()
-{
-    Outcome before;
-    Outcome between;
-    do {
-        before = runToEnd({PROBE_FILE, "date"});
-        between = runToEnd({ACCEL_PROBE_FILE, "date"});
-    } while (before.out != runToEnd({PROBE_FILE, "date"}).out);
-    return {before.out, between.out, between.err.find("date 1 0\n") != std::string::npos};
-}
-
 void makeLocale(std::string const& name)
 {
     std::string const command =
         "localedef -i " + name + " -f UTF-8 " + name + ".UTF-8 2>/dev/null || test $? = 1";
     ASSERT_EQ(std::system(command.c_str()), 0) << name;
+}
+
+/**
+ * What a fresh process gets for date the second time, when it is not run to compare. It says on
+ * standard error how it came by that.
+ */
+Outcome acceleratedDate()
+{
+    Outcome before;
+    Outcome between;
+    do {
+        before = runToEnd({PROBE_FILE, "date", "date"});
+        between = runToEnd({ACCEL_PROBE_FILE, "date", "date"});
+    } while (before.out != runToEnd({PROBE_FILE, "date", "date"}).out);
+    EXPECT_EQ(between.out, before.out);
+    return between;
 }
 
 class AccelLocale : public testing::TestWithParam<char const*>
@@ -46,31 +44,19 @@ TEST_P(AccelLocale, GivesTheDateThatDateGives)
     unsetenv("LC_ALL");
     setenv("LC_TIME", (std::string(GetParam()) + ".UTF-8").c_str(), 1);
     setenv("TZ", "America/St_Johns", 1);
-    Dates const found = dates();
-    EXPECT_EQ(found.accelerated, found.real);
+    acceleratedDate();
 }
 
 INSTANTIATE_TEST_SUITE_P(Languages, AccelLocale,
-                         testing::Values("en_US", "en_GB", "de_DE", "ru_RU", "ja_JP", "th_TH",
-                                         "fa_IR", "ar_SA"));
+                         testing::Values("en_GB", "ru_RU", "ja_JP", "th_TH", "fa_IR", "ar_SA"));
 
-TEST(AccelLocales, OfTheUsualEnglishAreAnsweredInTheProcess)
+TEST(AccelLocales, AreFollowedInTheProcess)
 {
-    makeLocale("en_US");
-    setenv("LC_ALL", "en_US.UTF-8", 1);
-    Dates const found = dates();
-    EXPECT_TRUE(found.answered);
-    EXPECT_EQ(found.accelerated, found.real);
-    EXPECT_NE(found.real.find('M'), std::string::npos) << "no AM or PM: " << found.real;
-}
-
-TEST(AccelLocales, NewerThanTheProcessAreLeftToDate)
-{
-    makeLocale("en_US");
-    setenv("LC_ALL", "en_US.UTF-8", 1);
-    EXPECT_FALSE(bothways::answered("date"));
-    setenv("LC_ALL", "C", 1);
-    EXPECT_TRUE(bothways::answered("date"));
+    for (char const* locale : {"en_US", "de_DE"}) {
+        makeLocale(locale);
+        setenv("LC_ALL", (std::string(locale) + ".UTF-8").c_str(), 1);
+        EXPECT_NE(acceleratedDate().err.find("date 1 1\n"), std::string::npos) << locale;
+    }
 }
 
 TEST(AccelZones, FollowTheSystemsOwnZoneFile)
@@ -81,6 +67,7 @@ TEST(AccelZones, FollowTheSystemsOwnZoneFile)
         machine::remove("/etc/localtime");
         std::filesystem::create_symlink(std::string("/usr/share/zoneinfo/") + zone,
                                         "/etc/localtime");
+        bothways::answered("date"); // runs it
         std::string before;
         std::optional<std::string> between;
         do {
@@ -89,6 +76,7 @@ TEST(AccelZones, FollowTheSystemsOwnZoneFile)
         } while (before != bothways::real("date"));
         EXPECT_EQ(between, before);
     }
+    EXPECT_GE(bothways::countOf("date").answered, 3U);
 }
 
 } // namespace

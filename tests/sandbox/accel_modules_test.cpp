@@ -7,6 +7,7 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <random>
+#include <sys/mount.h>
 
 namespace
 {
@@ -70,18 +71,11 @@ TEST(AccelLsmod, IsAsNegativeAsLsmodForModulesThatJustWent)
     EXPECT_EQ(answered("lsmod"), real("lsmod"));
 }
 
-TEST(AccelLsmod, LetsAStandInWin)
+TEST(AccelLsmod, ListsTheModulesOfThisMachine)
 {
-    kernelModules::load({});
-    machine::fake("/usr/local/bin/lsmod", "echo stand-in\n");
-    setenv("PATH", "/usr/local/bin:/usr/sbin:/usr/bin", 1);
-    EXPECT_EQ(real("lsmod"), "stand-in\n");
-    EXPECT_FALSE(answered("lsmod"));
-    machine::remove("/usr/local/bin/lsmod");
-    EXPECT_TRUE(answered("lsmod"));
-    machine::remove("/usr/sbin/lsmod");
-    machine::fake("/usr/sbin/lsmod", "echo stand-in\n");
-    EXPECT_FALSE(answered("lsmod"));
+    if (!std::filesystem::exists("/proc/modules"))
+        GTEST_SKIP() << "the kernel has no loadable modules";
+    EXPECT_EQ(answered("lsmod"), real("lsmod"));
 }
 
 TEST(AccelModinfo, TellsWhatModinfoTells)
@@ -185,13 +179,42 @@ TEST(AccelModinfo, AgreesWithModinfoOnThousandsOfModules)
     EXPECT_LT(leftOut, modules / 50);
 }
 
-TEST(AccelModinfo, IsLeftToModinfoForAKeyLongerThanItsColumn)
+TEST(AccelModinfo, IsLeftToModinfoWhenNotAllOfThemPrintAlike)
 {
     kernelModules::write("one.ko", kernelModules::file({"version=1", "sixteen_letters_=x"}));
     kernelModules::write("two.ko", kernelModules::file({"version=1", "fifteen_letters=x"}));
+    kernelModules::write("a.ko", kernelModules::file({"alias=of-both"}));
+    kernelModules::write("b.ko", kernelModules::file({"alias=of-both"}));
+    kernelModules::write("modules.builtin", "kernel/built_in.ko\n");
     kernelModules::index();
     EXPECT_FALSE(answered("modinfo one"));
+    EXPECT_FALSE(answered("modinfo of-both"));
+    EXPECT_FALSE(answered("modinfo built_in"));
     expectAgreement("two");
+}
+
+/** The name of a module from its file's: without what follows the first dot. */
+std::string moduleOf(std::filesystem::path const& file)
+{
+    std::string const name = file.filename();
+    return name.substr(0, name.find('.'));
+}
+
+TEST(AccelModinfo, AgreesWithModinfoOnTheModulesOfInstalledKernels)
+{
+    std::filesystem::create_directories(kernelModules::folder());
+    std::size_t compared = 0;
+    for (auto const& kernel : std::filesystem::directory_iterator("/lib/modules")) {
+        std::string const own = kernelModules::folder();
+        ASSERT_EQ(mount(kernel.path().c_str(), own.c_str(), nullptr, MS_BIND, nullptr), 0);
+        for (auto const& file : std::filesystem::recursive_directory_iterator(own))
+            if (file.path().filename().string().find(".ko") != std::string::npos &&
+                compared++ % 10 == 0)
+                expectAgreement(moduleOf(file));
+        umount2(own.c_str(), MNT_DETACH);
+    }
+    if (compared == 0)
+        GTEST_SKIP() << "no kernel with modules is installed";
 }
 
 TEST(AccelModinfo, AgreesWithModinfoOnNamesThatAreNotThoseOfOneModule)
@@ -207,8 +230,11 @@ TEST(AccelModinfo, AgreesWithModinfoOnNamesThatAreNotThoseOfOneModule)
                                      "known.parm=x:text\0known.parmtype=x:int\0",
                                      75));
     kernelModules::index();
-    for (char const* name : {"a", "b", "c", "net-pf-1", "net_pf_1", "net-pf-2", "net-pf-9",
-                             "other_name", "other-name", "built_in", "known", "nothing", "A", "ab"})
+    // Several modules, or built in ones, are left to modinfo.
+    for (char const* name :
+         {"net-pf-1", "net_pf_1", "net-pf-9", "other_name", "other-name", "built_in", "known"})
+        isLeftOut(name);
+    for (char const* name : {"a", "b", "c", "net-pf-2", "nothing", "A", "ab"})
         expectAgreement(name);
 }
 

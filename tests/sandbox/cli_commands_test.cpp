@@ -322,7 +322,7 @@ TEST(MihostUsage, TellsWhatWasMeantOrWhereToReadOn)
     std::vector<std::pair<Lines, std::string>> const refusals = {
         {{"tre"}, "no command 'tre'; did you mean tree? (mihost --help tells more)"},
         {{"tre", "os"}, "no command 'tre'; did you mean tree? (mihost --help tells more)"},
-        {{"--fsat", "tree"}, "no option '--fsat'; did you mean --fast?"},
+        {{"--timng", "tree"}, "no option '--timng'; did you mean --timing?"},
         {{"tree", "--al"}, "no option '--al'; did you mean --all?"},
         {{"list", "users", "--colums=id"}, "no option '--colums=id'; did you mean --columns?"},
         {{"tree", "--nothing"}, "no option '--nothing' (mihost tree --help tells more)"},

@@ -1,7 +1,8 @@
 #ifndef TESTS_SUPPORT_BOTHWAYS_H
 #define TESTS_SUPPORT_BOTHWAYS_H
 
-#include "mihost/accel/Accelerator.h"
+#include "mihost/accel/Accel.h"
+#include "mihost/accel/Stream.h"
 #include "tests/support/Libc.h"
 
 #include <array>
@@ -31,7 +32,7 @@ inline std::string real(std::string const& command)
     return text;
 }
 
-/** By the accelerator; nothing where it leaves the command to the real popen. */
+/** By the accelerator; nothing if it leaves the command to the real popen. */
 inline std::optional<std::string> answered(std::string const& command)
 {
     FILE* const stream = miaccel::openAnswer(command.c_str(), "r");
@@ -40,6 +41,24 @@ inline std::optional<std::string> answered(std::string const& command)
     std::string text = readAll(stream);
     std::fclose(stream);
     return text;
+}
+
+/** The counts of one command, by its row in the table. */
+inline miaccel_count countOf(std::string const& command)
+{
+    std::array<miaccel_count, 16> counts{};
+    miaccel_counts(counts.data(), counts.size());
+    for (miaccel_count const& count : counts)
+        if (count.command && command == count.command)
+            return count;
+    return {};
+}
+
+/** Why the command was last run. */
+inline std::string reasonOf(std::string const& command)
+{
+    char const* const reason = countOf(command).reason;
+    return reason ? reason : "";
 }
 
 } // namespace bothways

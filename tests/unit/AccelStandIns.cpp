@@ -36,16 +36,6 @@ Guard::~Guard()
     hooks() = {};
 }
 
-LongAfterwards::LongAfterwards()
-{
-    hooks().clock_gettime = [](clockid_t clock, timespec* now) {
-        int const result = realClockGettime(clock, now);
-        if (clock == CLOCK_REALTIME_COARSE)
-            now->tv_sec += 3600;
-        return result;
-    };
-}
-
 ReadCounter::ReadCounter()
 {
     hooks().pread = [this](int descriptor, void* buffer, std::size_t size, off_t offset) {

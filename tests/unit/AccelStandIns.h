@@ -37,19 +37,6 @@ public:
     Guard& operator=(Guard const&) = delete;
 };
 
-/**
- * For as long as it lives, the clock of file systems stands an hour ahead for whoever asks for it,
- * so that every file seems to have been left alone for a while.
- */
-class LongAfterwards
-{
-public:
-    LongAfterwards();
-
-private:
-    Guard guard_;
-};
-
 /** Counts the bytes that pread gives from now on. */
 class ReadCounter
 {

@@ -1,6 +1,6 @@
 // date, asked in both ways and compared byte by byte.
 
-#include "mihost/accel/Date.h"
+#include "mihost/accel/Answers.h"
 #include "tests/support/BothWays.h"
 #include "tests/support/ScratchFolder.h"
 #include "tests/unit/AccelStandIns.h"
@@ -15,6 +15,7 @@ namespace
 {
 
 using bothways::answered;
+using bothways::countOf;
 using bothways::real;
 
 constexpr std::time_t day = 24 * 60 * 60;
@@ -40,27 +41,12 @@ std::string realDates(ScratchFolder const& folder)
     return real("date -f " + folder.path("times"));
 }
 
-std::string answeredDates()
+std::string expectedDates()
 {
     std::string text;
-    for (std::time_t const time : instants()) {
-        miaccel::Answer const answer = miaccel::dateAt(time);
-        text += answer.declined ? answer.declined : answer.text;
-    }
+    for (std::time_t const time : instants())
+        text += miaccel::dateAt(time);
     return text;
-}
-
-TEST(AccelDate, IsThatOfTheMoment)
-{
-    std::string before;
-    std::string between;
-    std::string after;
-    do {
-        before = real("date");
-        between = answered("date").value();
-        after = real("date");
-    } while (before != after);
-    EXPECT_EQ(between, before);
 }
 
 TEST(AccelDate, IsThatOfDateInEveryTimeZoneThereIs)
@@ -75,7 +61,7 @@ TEST(AccelDate, IsThatOfDateInEveryTimeZoneThereIs)
             name.rfind("posix/", 0) == 0)
             continue;
         setenv("TZ", name.c_str(), 1);
-        ASSERT_EQ(answeredDates(), realDates(folder)) << name;
+        ASSERT_EQ(expectedDates(), realDates(folder)) << name;
         ++zones;
     }
     EXPECT_GT(zones, 300U);
@@ -90,49 +76,84 @@ TEST(AccelDate, IsThatOfDateForZonesOfEveryForm)
           "EST5EDT4", "nonsense", "Europe/Nowhere", "A", "12", "../../../etc/localtime",
           "right/UTC", " UTC"}) {
         setenv("TZ", zone, 1);
-        EXPECT_EQ(answeredDates(), realDates(folder)) << zone;
+        EXPECT_EQ(expectedDates(), realDates(folder)) << zone;
     }
     unsetenv("TZ");
-    EXPECT_EQ(answeredDates(), realDates(folder));
+    EXPECT_EQ(expectedDates(), realDates(folder));
 }
 
-TEST(AccelDate, IsThatOfDateInEveryLocaleOfTheSystemAndInNone)
+TEST(AccelDate, IsThatOfDateInLocalesThatAreThereAndThatAreNot)
 {
     ScratchFolder const folder;
     char const* const variables[] = {"LC_ALL", "LC_TIME", "LANG", "LC_COLLATE"};
-    for (char const* locale :
-         {"C", "POSIX", "C.UTF-8", "C.utf8", "xx_YY.UTF-8", "", "/tmp", "../x"})
+    for (char const* locale : {"C", "POSIX", "C.UTF-8", "xx_YY.UTF-8", "", "/tmp", "../x"})
         for (char const* variable : variables) {
             for (char const* other : variables)
                 unsetenv(other);
             setenv("LC_TIME", "C.UTF-8", 1);
             setenv(variable, locale, 1);
-            EXPECT_EQ(answeredDates(), realDates(folder)) << variable << '=' << locale;
+            EXPECT_EQ(expectedDates(), realDates(folder)) << variable << '=' << locale;
         }
 }
 
-TEST(AccelDate, ReadsTheClockThatDateReads)
+TEST(AccelDate, IsRunOnceAndThenAnswered)
 {
-    setenv("TZ", "UTC0", 1);
-    setenv("LC_ALL", "C", 1);
-    accelStandIns::Guard const guard;
-    accelStandIns::hooks().clock_gettime = [](clockid_t clock, timespec* now) {
-        int const result = accelStandIns::realClockGettime(clock, now);
-        if (clock == CLOCK_REALTIME)
-            *now = {1000000000, 999999999};
-        return result;
-    };
-    EXPECT_EQ(answered("date"), "Sun Sep  9 01:46:40 UTC 2001\n");
+    std::string before;
+    std::string between;
+    do {
+        before = real("date");
+        between = answered("date").value();
+    } while (before != real("date"));
+    EXPECT_EQ(between, before);
+    answered("date");
+    EXPECT_GE(countOf("date").answered, 1U);
+    EXPECT_GE(countOf("date").handed_on, 1U); // the hour may have changed
+    EXPECT_EQ(bothways::reasonOf("date"), "date is run once an hour, to compare");
 }
 
-TEST(AccelDate, StepsAsideForAZoneFileThatIsNewerThanTheProcess)
+TEST(AccelDate, IsRunAgainInAnotherEnvironment)
 {
-    ScratchFolder const folder;
-    std::filesystem::copy_file("/usr/share/zoneinfo/UTC", folder.path("zone"));
-    setenv("TZ", folder.path("zone").c_str(), 1);
+    for (char const* zone : {"Asia/Tokyo", "Europe/Berlin"}) {
+        setenv("TZ", zone, 1);
+        unsigned long const before = countOf("date").handed_on;
+        EXPECT_TRUE(answered("date"));
+        EXPECT_EQ(countOf("date").handed_on, before + 1) << zone;
+    }
+}
+
+/** For as long as it lives, this process has another time than the commands that it runs. */
+void shiftClock(std::time_t seconds)
+{
+    accelStandIns::hooks().clock_gettime = [seconds](clockid_t clock, timespec* now) {
+        int const result = accelStandIns::realClockGettime(clock, now);
+        now->tv_sec += seconds;
+        return result;
+    };
+}
+
+TEST(AccelDate, IsLeftToADateThatPrintsSomethingElse)
+{
+    setenv("TZ", "UTC0", 1);
+    accelStandIns::Guard const guard;
+    shiftClock(2 * day);
+    std::string const first = answered("date").value();
+    EXPECT_EQ(first.substr(0, 10), real("date").substr(0, 10)) << "not what the real one printed";
     EXPECT_FALSE(answered("date"));
-    setenv("TZ", (":" + folder.path("zone")).c_str(), 1);
-    EXPECT_FALSE(answered("date"));
+    EXPECT_EQ(bothways::reasonOf("date"), "date prints something else than expected here");
+    shiftClock(0); // another hour, so it is compared again
+    EXPECT_TRUE(answered("date"));
+    EXPECT_TRUE(answered("date"));
+}
+
+TEST(AccelDate, IsRunAgainInEveryOtherHour)
+{
+    setenv("TZ", "UTC0", 1);
+    EXPECT_TRUE(answered("date"));
+    unsigned long const before = countOf("date").handed_on;
+    accelStandIns::Guard const guard;
+    shiftClock(3600);
+    EXPECT_TRUE(answered("date"));
+    EXPECT_EQ(countOf("date").handed_on, before + 1);
 }
 
 } // namespace

@@ -8,7 +8,7 @@ namespace
 std::vector<mihost::Accelerator::Row> const rows{
     {"wc", 301, 0, ""}, {"lsmod", 0, 1, "PATH leads elsewhere"}, {"other", 0, 12, "unknown"}};
 
-TEST(AnswersText, TellsHowEachCommandWasAnsweredAndWhyItWasRun)
+TEST(AnswersText, ShowsHowEachCommandWasAnsweredAndWhyItWasRun)
 {
     EXPECT_EQ(answersText(rows),
               "wc                          301 answered      0 run\n"
@@ -17,7 +17,7 @@ TEST(AnswersText, TellsHowEachCommandWasAnsweredAndWhyItWasRun)
     EXPECT_EQ(mihost::answersText({}), "");
 }
 
-TEST(AnswersJson, HasNullWhereNoReasonIsKnown)
+TEST(AnswersJson, HasNullIfNoReasonIsKnown)
 {
     EXPECT_EQ(toJson(rows).dump(),
               R"([{"command":"wc","answered":301,"run":0,"reason":null},)"

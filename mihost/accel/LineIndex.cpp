@@ -33,18 +33,17 @@ bool isSameFile(struct stat const& one, struct stat const& other)
     return one.st_dev == other.st_dev && one.st_ino == other.st_ino;
 }
 
+bool isUnchanged(struct stat const& before, struct stat const& now)
+{
+    return before.st_size == now.st_size && before.st_ctim.tv_sec == now.st_ctim.tv_sec &&
+           before.st_ctim.tv_nsec == now.st_ctim.tv_nsec;
+}
+
 } // namespace
 
 bool readAt(int file, char* buffer, std::uint64_t length, std::uint64_t offset)
 {
     return pread(file, buffer, length, static_cast<off_t>(offset)) == static_cast<ssize_t>(length);
-}
-
-bool isUnchanged(struct stat const& before, struct stat const& now)
-{
-    return isSameFile(before, now) && before.st_size == now.st_size &&
-           before.st_ctim.tv_sec == now.st_ctim.tv_sec &&
-           before.st_ctim.tv_nsec == now.st_ctim.tv_nsec;
 }
 
 bool LineIndex::update(int file, struct stat const& now)

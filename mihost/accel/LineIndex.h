@@ -13,9 +13,6 @@ namespace miaccel
 /** Fills the whole buffer; false if the file ends before that or cannot be read. */
 bool readAt(int file, char* buffer, std::uint64_t length, std::uint64_t offset);
 
-/** Whether two states are those of one file, without a change in between. */
-bool isUnchanged(struct stat const& before, struct stat const& now);
-
 /**
  * Where the lines of a file are: how many line ends are before each block of the file.
  *

@@ -82,11 +82,10 @@ template <class Work> Answer withIndex(std::string const& path, Work work)
     if (!index.update(file, before))
         return declined(unsteady);
     Answer answer = work(file, index);
-    // What was added meanwhile a command that began earlier would not have seen either.
+    // What was added meanwhile, a command that began earlier would not have seen either.
     struct stat after {
     };
-    if (fstat(file, &after) != 0 ||
-        (after.st_size <= before.st_size && !isUnchanged(before, after)))
+    if (fstat(file, &after) != 0 || after.st_size < before.st_size)
         return declined(unsteady);
     return answer;
 }

@@ -137,7 +137,8 @@ void compare(std::vector<Peer> const& peers, int users, std::string const& scrip
 {
     madeUp::accounts(users);
     Table table({"With " + number(users) + " users", "Its time, ms", "mihost, ms",
-                 "mihost --no-accel, ms", "mihost / its", "mihost --no-accel / its", "It leaves out"});
+                 "mihost --no-accel, ms", "mihost / its", "mihost --no-accel / its",
+                 "It leaves out"});
     for (Peer const& peer : peers) {
         Compared found{peer};
         auto const run = [](std::string const& line) {

@@ -8,6 +8,7 @@
 //                popen and reads what they print
 //   plug-in      startup_host: loads the plug-in and initialises it, from its start to its end
 //   accelerated  startup_host_fast: the same host, linked to the accelerator
+//   mihost       mihost get os: the first answer of the program, which uses the accelerator
 //
 // Prints for each log the time of each, from its start to its end, and the processor time that
 // bare and plug-in take themselves, without that of their children; then what reading a log
@@ -94,6 +95,7 @@ struct Result {
     Runs bare{{STARTUP_COMMANDS, list}};
     Runs plugin{{STARTUP_HOST, PLUGIN_FILE}};
     Runs fast{{STARTUP_HOST_FAST, PLUGIN_FILE}};
+    Runs mihost{{MIHOST_FILE, "get", "os"}};
     Runs pluginReads{{STARTUP_HOST, PLUGIN_FILE, "5"}};
     Runs fastReads{{STARTUP_HOST_FAST, PLUGIN_FILE, "500"}};
 };
@@ -103,9 +105,9 @@ Result measure(Size const& size, bool quick)
     madeUp::systemLog(size.logLines);
     timed({STARTUP_HOST, PLUGIN_FILE, "0", list});
     Result result{size.logLines, countCommands()};
-    byTurns(
-        quick ? quickRounds : size.rounds,
-        {[&] { result.bare.once(); }, [&] { result.plugin.once(); }, [&] { result.fast.once(); }});
+    byTurns(quick ? quickRounds : size.rounds,
+            {[&] { result.bare.once(); }, [&] { result.plugin.once(); },
+             [&] { result.fast.once(); }, [&] { result.mihost.once(); }});
     byTurns(quickRounds, {[&] { result.pluginReads.once(); }, [&] { result.fastReads.once(); }});
     return result;
 }
@@ -114,13 +116,15 @@ void printWhole(std::vector<Result> const& results)
 {
     say("Time of a start in milliseconds, from the start of the process to its end.");
     Table table({"Log lines", "Commands", "Bare loop", "Plug-in", "Plug-in / bare",
-                 "Likewise, processor time", "With accelerator", "Accelerated / bare"});
+                 "The same, processor time", "With accelerator", "Accelerated / bare",
+                 "mihost get os"});
     for (Result const& result : results)
         table.add(
             {number(result.logLines), number(result.commands), shown(result.bare.whole),
              shown(result.plugin.whole), shown(ratios(result.plugin.whole, result.bare.whole), 3),
              shown(ratios(result.plugin.cpu, result.bare.cpu), 3), shown(result.fast.whole, 1),
-             shown(ratios(result.fast.whole, result.bare.whole), 4)});
+             shown(ratios(result.fast.whole, result.bare.whole), 4),
+             shown(result.mihost.whole, 1)});
     table.print();
 }
 

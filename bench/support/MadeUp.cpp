@@ -4,6 +4,7 @@
 #include "tests/support/Machine.h"
 
 #include <fstream>
+#include <string>
 #include <vector>
 
 namespace madeUp
@@ -61,8 +62,12 @@ void systemLog(int lines)
 {
     machine::write("/var/log/messages", "");
     std::ofstream log("/var/log/messages");
-    for (int i = 0; i < lines; ++i)
-        log << "Nov 20 10:11:12 host systemd[1]: Started Session " << i << " of user root.\n";
+    constexpr std::size_t length = 100; // with its end
+    for (int i = 0; i < lines; ++i) {
+        std::string line = "Nov 20 10:11:12 host systemd[1]: Started Session " + std::to_string(i);
+        line.resize(length - 1, '.');
+        log << line << '\n';
+    }
 }
 
 } // namespace madeUp

@@ -81,7 +81,7 @@ std::optional<std::string> objectionToModule(std::string_view name)
     return fmt::format("the name of the module '{}' {}", printable(name), *reason);
 }
 
-/** @param text  behind "echo ": a password and the command that reads it from a pipe */
+/** @param text  after "echo ": a password and the command that reads it from a pipe */
 std::optional<std::string> objectionToPasswordPipe(std::string_view text)
 {
     constexpr std::string_view reader = " | /usr/bin/passwd ";

@@ -1,4 +1,4 @@
-// A copy of a machine whose root is no mount point but any directory, as chroot(8) makes it.
+// A copy of a machine whose root is not a mount point but any directory, as chroot(8) makes it.
 
 #include "tests/sandbox/border/Caller.h"
 #include "tests/support/Lines.h"

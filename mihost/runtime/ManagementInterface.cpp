@@ -82,7 +82,8 @@ Error ManagementInterface::initialize(unsigned int first, Number const&, Number 
     miId_ = first;
     miIds_.assign(1, first);
     nextNodeId_ = first + 1;
-    return success();
+    Error const* const answer = mihost::initializeAnswer();
+    return answer ? *answer : success();
 }
 
 Error ManagementInterface::registerForAlerts(AlertCallBack callBack, void const* context)

@@ -8,7 +8,8 @@ namespace mihost
 namespace
 {
 std::atomic<NodeObserver*> observerInUse{nullptr};
-}
+std::atomic<IC::Error const*> initializeAnswerInUse{nullptr};
+} // namespace
 
 void setNodeObserver(NodeObserver* observer)
 {
@@ -18,6 +19,16 @@ void setNodeObserver(NodeObserver* observer)
 NodeObserver* nodeObserver()
 {
     return observerInUse.load(std::memory_order_acquire);
+}
+
+void setInitializeAnswer(IC::Error const* answer)
+{
+    initializeAnswerInUse.store(answer, std::memory_order_release);
+}
+
+IC::Error const* initializeAnswer()
+{
+    return initializeAnswerInUse.load(std::memory_order_acquire);
 }
 
 } // namespace mihost

@@ -5,8 +5,9 @@
 
 namespace IC
 {
+class Error;
 class Node;
-}
+} // namespace IC
 
 namespace mihost
 {
@@ -54,6 +55,15 @@ void setLogSink(LogSink* sink);
 void setNodeObserver(NodeObserver* observer);
 
 NodeObserver* nodeObserver();
+
+/**
+ * Sets what the framework's initialize answers from now on, null for success. The interface is
+ * prepared all the same, so a plug-in can be seen to build its tree after a failure. The answer
+ * stays the caller's and must outlive its use.
+ */
+void setInitializeAnswer(IC::Error const* answer);
+
+IC::Error const* initializeAnswer();
 
 } // namespace mihost
 

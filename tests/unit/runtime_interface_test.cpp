@@ -397,4 +397,17 @@ TEST_F(RuntimeInterface, LetsThreadsRebuildNodesOfDifferentKindsAtOnce)
     EXPECT_TRUE(listed().empty());
 }
 
+TEST_F(RuntimeInterface, FailsToInitializeOnRequestButIsPrepared)
+{
+    IC::Error const failure(9, IC::Number(0U), "on request");
+    mihost::setInitializeAnswer(&failure);
+    IC::Error const error = interface_.initialize(30, IC::Number(0U), IC::Number(0U));
+    mihost::setInitializeAnswer(nullptr);
+    EXPECT_EQ(error.getStatus(), 9U);
+    EXPECT_EQ(error.getText(), "on request");
+    EXPECT_EQ(interface_.miId_, 30U);
+    EXPECT_EQ(interface_.nextNodeId_, 31U);
+    EXPECT_EQ(interface_.initialize(30, IC::Number(0U), IC::Number(0U)).getStatus(), 0U);
+}
+
 } // namespace

@@ -28,6 +28,7 @@ struct CommandRow {
     char const* summary;
     std::unique_ptr<Command> (*make)();
     bool notInShell = false;
+    bool alwaysInSandbox = false;
 };
 
 /** Every command, in the order of the help text. */

@@ -141,6 +141,9 @@ void CommandLine::parse(std::vector<std::string> words)
     for (auto const& [known, command] : all_)
         if (known == name)
             command_ = command.get();
+    for (CommandRow const& row : commands())
+        if (row.name == name && row.alwaysInSandbox)
+            options_.sandbox = true;
 }
 
 } // namespace mihost

@@ -60,11 +60,10 @@ Plugin::Plugin(std::string const& file) : library_(dlopen(file.c_str(), RTLD_NOW
     if (!library_)
         throw cannotLoad(file, loaderReason(file));
     auto const open = reinterpret_cast<decltype(&OpenMI)>(dlsym(library_, "OpenMI"));
-    IC::Error* status = nullptr; // what it comes to hold, initialize returns
     std::string reason;
     if (!open)
         reason = "it has no entry point OpenMI";
-    else if (int const answer = open(&interface_, &status); answer != 0)
+    else if (int const answer = open(&interface_, &status_); answer != 0)
         reason = fmt::format("OpenMI answered {}", answer);
     else if (!interface_)
         reason = "OpenMI handed out no interface";

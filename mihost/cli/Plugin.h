@@ -38,6 +38,12 @@ public:
         return *interface_;
     }
 
+    /** The status object, as OpenMI handed it out; may be null. */
+    IC::Error const* status() const
+    {
+        return status_;
+    }
+
     /** The file that was loaded, as an absolute path. */
     std::string path() const;
 
@@ -47,6 +53,7 @@ public:
 private:
     void* library_;
     IC::ManagementInterface* interface_ = nullptr;
+    IC::Error* status_ = nullptr; // what it comes to hold, initialize returns
     bool started_ = false;
 };
 

@@ -74,6 +74,13 @@ TEST(Completion, LeavesFilesAndFoldersToTheShell)
     EXPECT_EQ(complete({"--plugin=", ""}, namesOf).what, Completion::What::Words);
 }
 
+TEST(Completion, OffersFilesAndFormsToCheck)
+{
+    EXPECT_EQ(complete({"check", ""}, namesOf).what, Completion::What::Files);
+    EXPECT_EQ(after({"check", "--format", ""}), (Words{"text", "tap", "junit"}));
+    EXPECT_EQ(after({"check", "--r"}), Words{"--rounds"});
+}
+
 TEST(Completion, GoesOnBehindAnOptionWithItsValue)
 {
     EXPECT_EQ(after({"--plugin", "file", "ge"}), Words{"get"});

@@ -18,6 +18,7 @@ std::unique_ptr<Command> power();
 std::unique_ptr<Command> watch();
 std::unique_ptr<Command> shell();
 std::unique_ptr<Command> doctor();
+std::unique_ptr<Command> check();
 std::unique_ptr<Command> version();
 std::unique_ptr<Command> properties();
 std::unique_ptr<Command> methods();

@@ -18,6 +18,8 @@ std::vector<CommandRow> const& commands()
         {"watch", "print properties whenever they change", commandMakers::watch},
         {"shell", "run many commands on one loaded plug-in", commandMakers::shell, true},
         {"doctor", "tell what this machine lacks for a full tree", commandMakers::doctor},
+        {"check", "check a plug-in in a sandbox, as a host sees it", commandMakers::check, true,
+         true},
         {"version", "show the versions of program, contract and plug-in", commandMakers::version},
         {"properties", "describe the properties of each kind of node", commandMakers::properties},
         {"methods", "describe the administration methods", commandMakers::methods},

@@ -1,0 +1,62 @@
+#ifndef MIHOST_CLI_CHECK_CHECK_H
+#define MIHOST_CLI_CHECK_CHECK_H
+
+#include <optional>
+#include <string>
+#include <vector>
+
+/** The checks of `mihost check`: what a host may expect of any plug-in with this contract. */
+namespace mihost::checks
+{
+
+class Subject;
+
+/** What is wrong, one line each; empty if nothing is. */
+using Findings = std::vector<std::string>;
+
+/** What a check has to say. */
+struct Verdict {
+    Findings findings;
+    std::vector<std::string> notes = {};               // worth knowing, but not wrong
+    std::optional<std::string> skipped = std::nullopt; // why the check could not be carried out
+};
+
+/** That a check could not be carried out. */
+inline Verdict skippedFor(std::string const& reason)
+{
+    return {{}, {}, reason};
+}
+
+struct Check {
+    char const* name;    // unique in its scenario; scripts rely on it
+    char const* meaning; // what holds if the check passes
+    Verdict (*run)(Subject& subject);
+};
+
+/** Checks that follow one another on one plug-in, in a process of their own. */
+struct Scenario {
+    char const* name;
+    std::vector<Check> checks;
+};
+
+/** Every scenario, in the order in which they run. */
+std::vector<Scenario> const& scenarios();
+
+struct Result {
+    std::string name; // "scenario.check"
+    std::string meaning;
+    Verdict verdict;
+
+    bool passed() const
+    {
+        return verdict.findings.empty() && !verdict.skipped;
+    }
+    bool failed() const
+    {
+        return !verdict.findings.empty();
+    }
+};
+
+} // namespace mihost::checks
+
+#endif

@@ -1,0 +1,29 @@
+#ifndef MIHOST_CLI_CHECK_ISOLATED_H
+#define MIHOST_CLI_CHECK_ISOLATED_H
+
+#include "mihost/cli/check/Check.h"
+
+#include <chrono>
+#include <string>
+
+namespace mihost::checks
+{
+
+struct Settings {
+    std::string file; // the plug-in's
+    unsigned int rounds;
+    std::chrono::seconds timeLimit; // for each scenario
+};
+
+/**
+ * Runs one scenario in a process of its own, so that a crash, an abort, an exit or a hang of the
+ * plug-in is a finding of the check that it came in. Checks after that one are skipped.
+ *
+ * @return a result for each check of the scenario
+ * @throws Failure (NoPlugin) if the plug-in cannot be loaded
+ */
+std::vector<Result> runIsolated(Scenario const& scenario, Settings const& settings);
+
+} // namespace mihost::checks
+
+#endif

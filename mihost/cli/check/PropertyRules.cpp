@@ -1,0 +1,241 @@
+#include "mihost/cli/check/PropertyRules.h"
+
+#include "mihost/cli/Catalogue.h"
+#include "nodes/ids.h"
+
+#include <algorithm>
+#include <fmt/format.h>
+#include <iterator>
+#include <limits>
+#include <map>
+#include <set>
+
+namespace mihost::checks
+{
+
+namespace
+{
+
+using Values = std::map<unsigned int, IC::PropertyValue>;
+
+struct Place {
+    unsigned int type;
+    unsigned int property;
+
+    bool operator==(Place const& other) const
+    {
+        return type == other.type && property == other.property;
+    }
+};
+
+// Unset if the system does not say. So are most of the operating system's; see neverMissing.
+constexpr Place mayBeMissing[] = {
+    {NODES::computerType, NODES::name},
+    {NODES::logEntryType, NODES::message},
+    {NODES::logEntryType, NODES::creationTime},
+};
+
+constexpr unsigned int neverMissing[] = {
+    NODES::fixedEnumeration, NODES::requestedState, NODES::fixedNumbers,
+    NODES::createUser,       NODES::refresh,
+};
+
+struct FixedValue {
+    Place place;
+    char const* text;
+};
+
+constexpr char fixedNumbers[] = "0,1,24";
+
+constexpr FixedValue fixedValues[] = {
+    {{NODES::operatingSystemType, NODES::fixedEnumeration}, "35"},
+    {{NODES::operatingSystemType, NODES::requestedState}, "1"},
+    {{NODES::operatingSystemType, NODES::fixedNumbers}, fixedNumbers},
+    {{NODES::operatingSystemType, NODES::createUser}, "dummy"},
+    {{NODES::operatingSystemType, NODES::refresh}, "1"},
+    {{NODES::driverType, NODES::buildNumber}, ""},
+    {{NODES::driverType, NODES::manufacturer}, ""},
+    {{NODES::userType, NODES::requestedState}, "1"},
+    {{NODES::userType, NODES::fixedNumbers}, fixedNumbers},
+    {{NODES::userType, NODES::reservedText}, ""},
+    {{NODES::userType, NODES::deleteUser}, "false"},
+    {{NODES::logType, NODES::requestedState}, "1"},
+    {{NODES::logType, NODES::fixedNumbers}, fixedNumbers},
+    {{NODES::logType, NODES::logNumber}, "0"},
+    {{NODES::logType, NODES::name}, "OS Log"},
+    {{NODES::logType, NODES::logState}, "2"},
+    {{NODES::logType, NODES::dataType}, "*string LogData*"},
+};
+
+struct LengthRule {
+    unsigned int length; // the property that holds the length
+    unsigned int of;     // of this text
+};
+
+constexpr LengthRule userLengths[] = {
+    {NODES::nameLength, NODES::name},
+    {NODES::idLength, NODES::id},
+    {NODES::passwordLength, NODES::password},
+};
+
+bool isRequired(NodeKind const& kind, Property const& property)
+{
+    if (property.has(Property::Unstored))
+        return false;
+    if (kind.type == NODES::operatingSystemType)
+        return std::find(std::begin(neverMissing), std::end(neverMissing), property.id) !=
+               std::end(neverMissing);
+    return std::find(std::begin(mayBeMissing), std::end(mayBeMissing),
+                     Place{kind.type, property.id}) == std::end(mayBeMissing);
+}
+
+/** A figure that could not be read when the tree was built holds the value before it, or none. */
+bool isKind(Property const& property, IC::PropertyValue const& value)
+{
+    return value.getKind() == property.kind ||
+           (property.has(Property::Live) && value.getKind() == ValueKind::EmptyKind);
+}
+
+std::string nameOf(IC::MutableNode const& node, Property const& property)
+{
+    return fmt::format("{}: {} ({})", checks::nameOf(node), property.name, property.id);
+}
+
+/** Looks at each stored value whose property is known. */
+template <class Look> void forEachValue(Nodes const& nodes, Look look)
+{
+    for (IC::MutableNode const* node : nodes) {
+        NodeKind const* const kind = findKind(node->getNodeType());
+        if (!kind)
+            continue;
+        for (auto const& [id, value] : node->getProperties())
+            if (Property const* const property = findProperty(*kind, id))
+                look(*node, *property, value);
+    }
+}
+
+std::string textOf(Values const& values, unsigned int id)
+{
+    auto const found = values.find(id);
+    return found == values.end() ? "" : static_cast<std::string>(found->second);
+}
+
+void expectText(Findings& findings, IC::MutableNode const& node, unsigned int id,
+                std::string const& expected)
+{
+    NodeKind const* const kind = findKind(node.getNodeType());
+    Property const* const property = findProperty(*kind, id);
+    std::string const found = textOf(node.getProperties(), id);
+    if (found != expected)
+        findings.push_back(
+            fmt::format("{}: '{}' rather than '{}'", nameOf(node, *property), found, expected));
+}
+
+void checkRead(Findings& findings, IC::MutableNode const& node, Property const& property,
+               bool stored)
+{
+    IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
+    bool const answered = node.getProperty(property.id, value).getStatus() == 0;
+    bool const expected = stored || property.has(Property::Unstored);
+    if (expected && !answered)
+        findings.push_back(fmt::format("{}: cannot be read", nameOf(node, property)));
+    else if (answered && !isKind(property, value))
+        findings.push_back(fmt::format("{}: reads as {} rather than {}", nameOf(node, property),
+                                       valueKindName(value.getKind()),
+                                       valueKindName(property.kind)));
+}
+
+} // namespace
+
+Findings wrongPropertyIds(Nodes const& nodes)
+{
+    Findings findings;
+    for (IC::MutableNode const* node : nodes) {
+        NodeKind const* const kind = findKind(node->getNodeType());
+        if (!kind)
+            continue;
+        Values const values = node->getProperties();
+        for (Property const& property : kind->properties)
+            if (isRequired(*kind, property) && values.count(property.id) == 0)
+                findings.push_back(fmt::format("{}: not set", nameOf(*node, property)));
+        for (auto const& [id, value] : values)
+            if (!findProperty(*kind, id))
+                findings.push_back(
+                    fmt::format("{}: unknown property {}", checks::nameOf(*node), id));
+    }
+    return findings;
+}
+
+Findings wrongKinds(Nodes const& nodes)
+{
+    Findings findings;
+    forEachValue(nodes, [&findings](IC::MutableNode const& node, Property const& property,
+                                    IC::PropertyValue const& value) {
+        if (!isKind(property, value))
+            findings.push_back(fmt::format("{}: {} rather than {}", nameOf(node, property),
+                                           valueKindName(value.getKind()),
+                                           valueKindName(property.kind)));
+    });
+    return findings;
+}
+
+Findings wrongFlags(Nodes const& nodes)
+{
+    // Contract: the one value with a false flag.
+    constexpr Place withoutFlag{NODES::operatingSystemType, NODES::requestedState};
+    Findings findings;
+    forEachValue(nodes, [&](IC::MutableNode const& node, Property const& property,
+                            IC::PropertyValue const& value) {
+        bool const expected = !(Place{node.getNodeType(), property.id} == withoutFlag);
+        if (value.getFlag() != expected)
+            findings.push_back(fmt::format("{}: flag {} rather than {}", nameOf(node, property),
+                                           value.getFlag(), expected));
+    });
+    return findings;
+}
+
+Findings wrongValues(Nodes const& nodes)
+{
+    Findings findings;
+    std::map<unsigned int, unsigned int> counts;
+    for (IC::MutableNode const* node : nodes)
+        ++counts[node->getNodeType()];
+    for (IC::MutableNode const* node : nodes) {
+        unsigned int const type = node->getNodeType();
+        for (FixedValue const& fixed : fixedValues)
+            if (fixed.place.type == type)
+                expectText(findings, *node, fixed.place.property, fixed.text);
+        Values const values = node->getProperties();
+        if (type == NODES::userType)
+            for (LengthRule const& rule : userLengths)
+                expectText(findings, *node, rule.length,
+                           std::to_string(textOf(values, rule.of).size()));
+        if (type == NODES::userType || type == NODES::groupType)
+            expectText(findings, *node, NODES::elementCount, std::to_string(counts[type]));
+        if (type == NODES::logEntryType)
+            expectText(findings, *node, NODES::id, std::to_string(node->getIndex()));
+    }
+    return findings;
+}
+
+Findings wrongReads(Nodes const& nodes)
+{
+    constexpr unsigned int unknown = std::numeric_limits<unsigned int>::max();
+    Findings findings;
+    std::set<unsigned int> seen;
+    for (IC::MutableNode const* node : nodes) {
+        NodeKind const* const kind = findKind(node->getNodeType());
+        if (!kind || !seen.insert(kind->type).second)
+            continue;
+        Values const values = node->getProperties();
+        for (Property const& property : kind->properties)
+            checkRead(findings, *node, property, values.count(property.id) != 0);
+        IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
+        if (node->getProperty(unknown, value).getStatus() == 0)
+            findings.push_back(
+                fmt::format("{}: answers the unknown property {}", checks::nameOf(*node), unknown));
+    }
+    return findings;
+}
+
+} // namespace mihost::checks

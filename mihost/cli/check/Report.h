@@ -1,0 +1,27 @@
+#ifndef MIHOST_CLI_CHECK_REPORT_H
+#define MIHOST_CLI_CHECK_REPORT_H
+
+#include "mihost/cli/Json.h"
+#include "mihost/cli/Output.h"
+#include "mihost/cli/check/Check.h"
+
+/** The results of all checks in the forms that people and programs read. */
+namespace mihost::checks
+{
+
+using Results = std::vector<Result>;
+
+/** One line a check, what is wrong below it, and a sum at the end. */
+void writeText(Results const& results, Output& out);
+
+/** The Test Anything Protocol, version 14. */
+std::string tapText(Results const& results);
+
+/** An XML document as JUnit writes it, a test suite for each scenario. */
+std::string junitText(Results const& results);
+
+Json toJson(Results const& results);
+
+} // namespace mihost::checks
+
+#endif

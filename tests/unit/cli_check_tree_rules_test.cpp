@@ -1,0 +1,195 @@
+#include "mihost/cli/check/PropertyRules.h"
+#include "mihost/cli/check/TreeRules.h"
+
+#include "nodes/ids.h"
+#include "nodes/values.h"
+
+#include <gtest/gtest.h>
+#include <memory>
+
+namespace
+{
+
+using namespace mihost::checks;
+
+constexpr unsigned int ownId = 50;
+
+/** The smallest whole tree: the single nodes, and two groups. */
+class CheckOfTheTree : public testing::Test
+{
+protected:
+    CheckOfTheTree()
+    {
+        add(NODES::osSwType, 0, 0, "OsSw Management Interface");
+        add(NODES::rootType, 50, 0, "ROOT Node");
+        add(NODES::computerType, 51, 0, "Computer");
+        add(NODES::operatingSystemType, 52, 0, "Operating System");
+        NODES::setProperties(at(NODES::operatingSystemType),
+                             {{NODES::fixedEnumeration, NODES::enumeration(35)},
+                              {NODES::requestedState, IC::PropertyValue(IC::EnumValue(1U), false)},
+                              {NODES::fixedNumbers, NODES::fixedNumberList()},
+                              {NODES::createUser, NODES::text("dummy")},
+                              {NODES::refresh, NODES::number(1)}});
+        for (unsigned int index : {1U, 2U}) {
+            add(NODES::groupType, 53, index, "Group");
+            NODES::setProperties(*nodes_.back(), {{NODES::name, NODES::text("staff")},
+                                                  {NODES::id, NODES::number(index)},
+                                                  {NODES::members, NODES::texts({})},
+                                                  {NODES::elementCount, NODES::number(2)}});
+        }
+        add(NODES::logType, 53, 0, "OS Log");
+        NODES::setProperties(*nodes_.back(), {{NODES::requestedState, NODES::enumeration(1)},
+                                              {NODES::fixedNumbers, NODES::fixedNumberList()},
+                                              {NODES::logNumber, NODES::number(0)},
+                                              {NODES::name, NODES::text("OS Log")},
+                                              {NODES::logState, NODES::enumeration(2)},
+                                              {NODES::dataType, NODES::text("*string LogData*")}});
+    }
+
+    void add(unsigned int type, unsigned int parent, unsigned int index,
+             std::string const& description)
+    {
+        auto const id = ownId + static_cast<unsigned int>(owned_.size());
+        owned_.push_back(
+            std::make_unique<IC::MutableNode>(id, parent, std::vector{ownId}, type, index));
+        nodes_.push_back(owned_.back().get());
+        nodes_.back()->setStatus(1);
+        nodes_.back()->setDescription(description);
+    }
+
+    IC::MutableNode& at(unsigned int type)
+    {
+        for (IC::MutableNode* node : nodes_)
+            if (node->getNodeType() == type)
+                return *node;
+        throw std::logic_error("no such node");
+    }
+
+    std::vector<std::unique_ptr<IC::MutableNode>> owned_;
+    Nodes nodes_;
+};
+
+TEST_F(CheckOfTheTree, FindsNothingWrongWithAWholeOne)
+{
+    EXPECT_EQ(wrongTypeOrder(nodes_), Findings());
+    EXPECT_EQ(wrongIds(nodes_, ownId), Findings());
+    EXPECT_EQ(wrongParents(nodes_), Findings());
+    EXPECT_EQ(wrongIndexes(nodes_), Findings());
+    EXPECT_EQ(wrongStatuses(nodes_), Findings());
+    EXPECT_EQ(wrongDescriptions(nodes_), Findings());
+    EXPECT_EQ(wrongMiIds(nodes_, ownId), Findings());
+    EXPECT_EQ(wrongPropertyIds(nodes_), Findings());
+    EXPECT_EQ(wrongKinds(nodes_), Findings());
+    EXPECT_EQ(wrongFlags(nodes_), Findings());
+    EXPECT_EQ(wrongValues(nodes_), Findings());
+}
+
+TEST_F(CheckOfTheTree, MissesSingleNodesAndNamesUnknownOnes)
+{
+    nodes_.pop_back();
+    add(99, 0, 0, "Other");
+    EXPECT_EQ(wrongTypes(nodes_), (Findings{"node #57: unknown node type 99",
+                                            "0 nodes of the kind log rather than 1"}));
+    add(NODES::logType, 53, 0, "OS Log");
+    add(NODES::logType, 53, 0, "OS Log");
+    EXPECT_EQ(wrongTypes(nodes_).back(), "2 nodes of the kind log rather than 1");
+}
+
+TEST_F(CheckOfTheTree, KnowsTheOrderOfBuilding)
+{
+    std::swap(nodes_[4], nodes_.back());
+    EXPECT_EQ(wrongTypeOrder(nodes_), (Findings{"group #55: listed after a node of the kind log",
+                                                "group #54: listed after a node of the kind log"}));
+    EXPECT_EQ(wrongTypes(nodes_), Findings());
+}
+
+TEST_F(CheckOfTheTree, NamesWrongNumbers)
+{
+    EXPECT_EQ(wrongIds(nodes_, ownId - 1).front(), "mi #50: node id 50 rather than 49");
+    EXPECT_EQ(wrongMiIds(nodes_, 1).size(), nodes_.size());
+    at(NODES::logType).setStatus(2);
+    EXPECT_EQ(wrongStatuses(nodes_), Findings{"log #56: status 2 rather than 1"});
+    add(NODES::logEntryType, 53, 2, "OS LogEntry");
+    EXPECT_EQ(wrongParents(nodes_), Findings{"log-entry #57: parent id 53 rather than 56"});
+    EXPECT_EQ(wrongIndexes(nodes_), Findings{"log-entry #57: index 2 rather than 1"});
+}
+
+TEST_F(CheckOfTheTree, NamesWrongDescriptions)
+{
+    at(NODES::rootType).setDescription("root");
+    add(NODES::driverType, 53, 1, "anything");
+    EXPECT_EQ(wrongDescriptions(nodes_),
+              Findings{"root #51: description 'root' rather than 'ROOT Node'"});
+    nodes_.back()->setDescription("");
+    EXPECT_EQ(wrongDescriptions(nodes_).back(), "driver #57: no description");
+}
+
+TEST_F(CheckOfTheTree, MissesPropertiesAndNamesUnknownOnes)
+{
+    at(NODES::rootType).setProperty(7, NODES::number(1));
+    add(NODES::driverType, 53, 1, "one");
+    EXPECT_EQ(wrongPropertyIds(nodes_),
+              (Findings{"root #51: unknown property 7", "driver #57: driver-version (134): not set",
+                        "driver #57: driver-name (108): not set",
+                        "driver #57: build-number (70): not set",
+                        "driver #57: manufacturer (36): not set"}));
+}
+
+TEST_F(CheckOfTheTree, NamesWrongKindsAndFlags)
+{
+    IC::MutableNode& os = at(NODES::operatingSystemType);
+    os.setProperty(NODES::refresh, IC::PropertyValue("1", false));
+    os.setProperty(NODES::requestedState, NODES::enumeration(1));
+    EXPECT_EQ(wrongKinds(nodes_), Findings{"os #53: refresh (75): text rather than number"});
+    EXPECT_EQ(wrongFlags(nodes_),
+              (Findings{"os #53: refresh (75): flag false rather than true",
+                        "os #53: requested-state (123): flag true rather than false"}));
+}
+
+TEST_F(CheckOfTheTree, LetsAFigureThatCouldNotBeReadStayEmpty)
+{
+    IC::MutableNode& os = at(NODES::operatingSystemType);
+    os.setProperty(NODES::processCount, NODES::emptyValue());
+    EXPECT_EQ(wrongKinds(nodes_), Findings());
+    os.setProperty(NODES::userCount, NODES::emptyValue());
+    EXPECT_EQ(wrongKinds(nodes_), Findings{"os #53: user-count (145): empty rather than number"});
+}
+
+TEST_F(CheckOfTheTree, NamesWrongValuesLengthsAndCounts)
+{
+    at(NODES::logType).setProperty(NODES::logNumber, NODES::number(1));
+    at(NODES::groupType).setProperty(NODES::elementCount, NODES::number(3));
+    EXPECT_EQ(wrongValues(nodes_), (Findings{"group #54: group-count (51): '3' rather than '2'",
+                                             "log #56: log-number (37): '1' rather than '0'"}));
+}
+
+/** Answers what the real nodes do not. */
+class AnswersAll : public IC::MutableNode
+{
+public:
+    using MutableNode::MutableNode;
+
+    IC::Error getProperty(unsigned int, IC::PropertyValue& value) const override
+    {
+        value = IC::PropertyValue("all", true);
+        return NODES::success();
+    }
+};
+
+TEST(CheckOfReads, NamesUnknownPropertiesThatAreAnsweredAndWrongKinds)
+{
+    AnswersAll node(9, 0, {}, NODES::computerType, 0);
+    EXPECT_EQ(wrongReads({&node}),
+              Findings{"computer #9: answers the unknown property 4294967295"});
+    AnswersAll group(9, 0, {}, NODES::groupType, 1);
+    EXPECT_EQ(wrongReads({&group}).front(),
+              "group #9: group-id (89): reads as text rather than number");
+}
+
+TEST(CheckOfReads, NamesStoredPropertiesThatAreNotAnswered)
+{
+    IC::MutableNode os(9, 0, {}, NODES::operatingSystemType, 0);
+    EXPECT_EQ(wrongReads({&os}), Findings{"os #9: clear-log (191): cannot be read"});
+}
+
+} // namespace

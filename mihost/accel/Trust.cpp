@@ -121,7 +121,8 @@ std::string found(std::string const& name)
         // An empty one is the working directory; dash takes a % in PATH for more than a character.
         if (directory.empty() || directory[0] != '/' || directory.find('%') != std::string::npos)
             return {};
-        std::string candidate = directory + '/' + name;
+        std::string candidate = directory;
+        candidate.append("/").append(name);
         struct stat state {
         };
         if (lstat(candidate.c_str(), &state) == 0)

@@ -104,10 +104,10 @@ std::optional<std::uint64_t> LineIndex::find(int file, std::uint64_t line) const
     char const* const end = buffer.data() + length;
     char const* at = buffer.data();
     for (std::uint64_t left = number - before_[index]; left > 0; --left) {
-        at = std::find(at, end, '\n');
-        if (at == end)
+        void const* const found = std::memchr(at, '\n', static_cast<std::size_t>(end - at));
+        if (!found)
             return std::nullopt;
-        ++at;
+        at = static_cast<char const*>(found) + 1;
     }
     return offset + static_cast<std::uint64_t>(at - buffer.data());
 }

@@ -21,9 +21,9 @@ bool readAt(int file, char* buffer, std::uint64_t length, std::uint64_t offset);
 class LineIndex
 {
 public:
-    static constexpr std::uint64_t block = std::uint64_t{64} * 1024;
+    static constexpr std::uint64_t block = 65'536;
     /** So much of both ends of what is indexed is compared each time. */
-    static constexpr std::uint64_t edge = std::uint64_t{16} * 1024;
+    static constexpr std::uint64_t edge = 16'384;
 
     /**
      * Makes the index that of the file, reading what was added, or everything if it is another file

@@ -14,7 +14,7 @@ namespace miaccel
 namespace
 {
 
-constexpr std::uint64_t longestLine = std::uint64_t{16} * 1024 * 1024;
+constexpr std::uint64_t longestLine = 16'777'216;
 constexpr Reason unsteady = "the file changes while it is read";
 
 /**
@@ -43,8 +43,14 @@ Reason doubt(int file, struct stat& state)
     return nullptr;
 }
 
-Answer lineText(int file, LineIndex const& index, std::uint64_t line)
+Answer countText(int, LineIndex const& index, Operands const& operands)
 {
+    return {std::to_string(index.lineEnds()) + ' ' + operands.name + '\n'};
+}
+
+Answer lineText(int file, LineIndex const& index, Operands const& operands)
+{
+    std::uint64_t const line = operands.line;
     // busybox ends a line at NUL, and adds the end that the last line may lack.
     if (index.hasNul())
         return declined("the file has NUL bytes, which not every sed reads alike");
@@ -66,13 +72,14 @@ Answer lineText(int file, LineIndex const& index, std::uint64_t line)
  * Works with the file and its index, brought up to date. One index is kept, that of the last file:
  * the plug-in reads a single log.
  */
-template <class Work> Answer withIndex(std::string const& path, Work work)
+Answer withIndex(Operands const& operands,
+                 Answer (*work)(int file, LineIndex const& index, Operands const& operands))
 {
     static auto& lock = *new std::mutex; // threads may run to the very end of the process
     static auto& index = *new LineIndex;
     // Opening never waits, as it would for a pipe.
     mihost::Descriptor const opened(
-        open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY));
+        open(operands.name.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY));
     int const file = opened.get();
     std::lock_guard const held(lock);
     struct stat before {
@@ -81,7 +88,7 @@ template <class Work> Answer withIndex(std::string const& path, Work work)
         return declined(reason);
     if (!index.update(file, before))
         return declined(unsteady);
-    Answer answer = work(file, index);
+    Answer answer = work(file, index, operands);
     // What was added meanwhile, a command that began earlier would not have seen either.
     struct stat after {
     };
@@ -94,16 +101,12 @@ template <class Work> Answer withIndex(std::string const& path, Work work)
 
 Answer wc(Operands const& operands)
 {
-    return withIndex(operands.name, [&operands](int, LineIndex const& index) {
-        return Answer{std::to_string(index.lineEnds()) + ' ' + operands.name + '\n'};
-    });
+    return withIndex(operands, countText);
 }
 
 Answer sed(Operands const& operands)
 {
-    return withIndex(operands.name, [&operands](int file, LineIndex const& index) {
-        return lineText(file, index, operands.line);
-    });
+    return withIndex(operands, lineText);
 }
 
 } // namespace miaccel

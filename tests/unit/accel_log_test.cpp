@@ -43,6 +43,16 @@ TEST_F(AccelLog, OfLinesOf2MegabytesIsReadAsTheCommandsDo)
         EXPECT_TRUE(answered(sed(number)) == real(sed(number))) << number;
 }
 
+TEST_F(AccelLog, IsIndexedOnceForBothCommands)
+{
+    constexpr std::size_t size = 4'000'000;
+    folder_.write("log", std::string(size, '\n'));
+    accelStandIns::ReadCounter const counter;
+    EXPECT_TRUE(answered(wc_));
+    EXPECT_TRUE(answered(sed(size)));
+    EXPECT_LT(counter.bytes(), size + size / 10);
+}
+
 TEST_F(AccelLog, IsReadByWhateverNameItHas)
 {
     folder_.write("log", "1\n2\n");

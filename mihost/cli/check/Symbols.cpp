@@ -47,11 +47,12 @@ public:
         return nullptr;
     }
 
-    /** The address that one of its undefined names is bound to. */
-    void const* boundTo(std::string const& symbol) const
+    /** What one of its undefined names means: in the libraries that it brings, else in the host. */
+    void const* find(std::string const& symbol) const
     {
-        void const* const address = dlsym(RTLD_DEFAULT, symbol.c_str());
-        return address ? address : dlsym(handle_, symbol.c_str());
+        // A host, or a sanitizer, may put a function of its own before that of a library.
+        void const* const brought = dlsym(handle_, symbol.c_str());
+        return brought ? brought : dlsym(RTLD_DEFAULT, symbol.c_str());
     }
 
     /** The names of the libraries that it asks for. */
@@ -176,7 +177,7 @@ Findings wantedBeyondTheContract(std::vector<Symbol> const& symbols, std::string
         if (symbol.defined || symbol.weak || symbol.versioned ||
             symbol.name.compare(0, ofTheCompiler.size(), ofTheCompiler) == 0)
             continue;
-        std::string const provider = fileOf(library.boundTo(symbol.name));
+        std::string const provider = fileOf(library.find(symbol.name));
         bool const declared = provider == runtime && isHostName(symbol.name);
         if (!declared && needed.count(lastPart(provider)) == 0)
             findings.push_back(fmt::format("{}: no header of host/ declares it, although {} has it",

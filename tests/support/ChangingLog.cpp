@@ -1,6 +1,7 @@
 #include "tests/support/ChangingLog.h"
 
 #include <algorithm>
+#include <cstdint>
 #include <fcntl.h>
 #include <filesystem>
 #include <sys/mman.h>
@@ -33,7 +34,8 @@ std::string ChangingLog::text()
 /** Near the beginning, so that it is among the bytes that are compared. */
 void ChangingLog::overwriteMapped()
 {
-    std::size_t const size = std::min<std::size_t>(fs::file_size(path()), 16384);
+    auto const size =
+        static_cast<std::size_t>(std::min<std::uintmax_t>(fs::file_size(path()), 16384));
     if (size == 0)
         return;
     int const file = open(path().c_str(), O_RDWR | O_CLOEXEC);
@@ -50,7 +52,7 @@ void ChangingLog::overwriteMapped()
 void ChangingLog::change()
 {
     folder_.append("log", ""); // it is there from now on
-    auto const size = fs::file_size(path());
+    auto const size = static_cast<std::size_t>(fs::file_size(path()));
     switch (choose(12)) {
     case 0:
         folder_.write("log", text());

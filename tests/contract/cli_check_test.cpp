@@ -177,11 +177,20 @@ protected:
     }
 };
 
+// A sanitizer's allocator does not say what is in use, so there the check of memory is skipped.
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+constexpr bool countsMemory = false;
+#else
+constexpr bool countsMemory = true;
+#endif
+
 TEST_F(Check, PassesThePluginOnAFixtureMachine)
 {
     Outcome const outcome = checkRun(PLUGIN_FILE);
     expectAllPassed(outcome);
-    EXPECT_NE(outcome.out.find(" checks failed, 0 skipped\n"), std::string::npos) << outcome.out;
+    char const* const summary =
+        countsMemory ? " checks failed, 0 skipped\n" : " checks failed, 1 skipped\n";
+    EXPECT_NE(outcome.out.find(summary), std::string::npos) << outcome.out;
     EXPECT_EQ(outcome.out.find("note: "), std::string::npos) << outcome.out;
 }
 
@@ -207,8 +216,10 @@ TEST_F(Check, SkipsTheMethodOnAMachineWhereItCannotWork)
     EXPECT_EQ(outcome.code, 0) << outcome.out << outcome.err;
     EXPECT_NE(outcome.out.find("a group cannot be added here: groupadd: locked"), std::string::npos)
         << outcome.out;
-    EXPECT_EQ(namesWith(Json::parse(outcome.out), "skipped"),
-              (Json{"method.success", "method.group-node"}));
+    Json expected{"method.success", "method.group-node"};
+    if (!countsMemory)
+        expected.push_back("rounds.memory");
+    EXPECT_EQ(namesWith(Json::parse(outcome.out), "skipped"), expected);
 }
 
 TEST_F(Check, TakesThePluginOfTheOptionToo)

@@ -14,7 +14,7 @@ using namespace mihost;
 using namespace mihost::checks;
 
 Results const results = {
-    {"load.library", "it loads", {}},
+    {"load.opening", "it loads", {}},
     {"load.names", "it has names", {{}, {"one <name> is missing"}}},
     {"start.tree", "the tree is whole", {{"a & \"b\"\x01", "more"}}},
     {"start.reads", "reads work", {{}, {}, "no machine"}},
@@ -30,7 +30,7 @@ TEST(CheckReport, ShowsFindingsNotesAndReasonsBelowTheLine)
     std::string text(4096, '\0');
     text.resize(std::fread(text.data(), 1, text.size(), file));
     std::fclose(file);
-    EXPECT_EQ(text, "passed     load.library  it loads\n"
+    EXPECT_EQ(text, "passed     load.opening  it loads\n"
                     "passed     load.names    it has names\n"
                     "           note: one <name> is missing\n"
                     "failed     start.tree    the tree is whole\n"
@@ -45,7 +45,7 @@ TEST(CheckReport, SpeaksTap)
 {
     EXPECT_EQ(tapText(results), "TAP version 14\n"
                                 "1..4\n"
-                                "ok 1 - load.library\n"
+                                "ok 1 - load.opening\n"
                                 "ok 2 - load.names\n"
                                 "# one <name> is missing\n"
                                 "not ok 3 - start.tree\n"
@@ -63,7 +63,7 @@ TEST(CheckReport, WritesJunitXml)
               "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
               "<testsuites name=\"mihost check\" tests=\"4\" failures=\"1\">\n"
               "  <testsuite name=\"load\" tests=\"2\" failures=\"0\" skipped=\"0\">\n"
-              "    <testcase classname=\"load\" name=\"library\"/>\n"
+              "    <testcase classname=\"load\" name=\"opening\"/>\n"
               "    <testcase classname=\"load\" name=\"names\">\n"
               "      <system-out>one &lt;name&gt; is missing\n</system-out>\n"
               "    </testcase>\n"

@@ -98,7 +98,7 @@ Scenario loadScenario()
 {
     return {"load",
             {
-                {"library", "the library is loaded and gives its interface", library},
+                {"opening", "the library is loaded and gives its interface", library},
                 {"entry-point", "OpenMI answers 0 and the same two addresses each time",
                  entryPointTwice},
                 {"own-symbols", "the file itself defines OpenMI", ownSymbols},

@@ -64,7 +64,7 @@ Scenario startScenario()
         {"parents", "each node names its parent", onTree<wrongParents>},
         {"indexes", "single nodes have the index 0, others count from 1", onTree<wrongIndexes>},
         {"status", "each node has the status 1", onTree<wrongStatuses>},
-        {"descriptions", "each node has the description of its kind", onTree<wrongDescriptions>},
+        {"descriptions", "each node has its kind's description", onTree<wrongDescriptions>},
         {"interface-ids", "each node belongs to this interface alone", onOwnTree<wrongMiIds>},
         {"property-ids", "each kind of node has its properties and no others",
          onTree<wrongPropertyIds>},

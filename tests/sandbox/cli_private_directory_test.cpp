@@ -96,7 +96,8 @@ TEST_F(MihostPrivateDirectory, OfARunningStartStays)
                                  "echo get os 108 >&${COPROC[1]}; read -u ${COPROC[0]}\n"
                                  "ls $TMPDIR >/tmp/before\n"
                                  "$mihost get os 108\n"
-                                 "ls $TMPDIR >/tmp/after\n");
+                                 "ls $TMPDIR >/tmp/after\n"
+                                 "shell=$COPROC_PID; exec {COPROC[1]}>&-; wait $shell\n");
     EXPECT_EQ(outcome.out, "108 os-name  Linux\n");
     EXPECT_EQ(linesOf(machine::read("/tmp/before")).size(), 1U);
     EXPECT_EQ(machine::read("/tmp/after"), machine::read("/tmp/before"));

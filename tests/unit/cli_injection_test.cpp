@@ -5,6 +5,7 @@
 #include "mihost/cli/MethodCall.h"
 #include "mihost/cli/ValueText.h"
 #include "tests/unit/Methods.h"
+#include "tests/unit/RightValue.h"
 
 #include <array>
 #include <optional>
@@ -23,20 +24,6 @@ constexpr char const* attacks[] = {
     "x\xC2\x85y",  "x\xFFy",   "-x",       "+1",        "x\ty",       "x\x1B[2J", "",
     "x\" \"y",     "x 2>&1",   "--help",
 };
-
-std::string rightValue(Form form)
-{
-    switch (form) {
-    case Form::Digits:
-        return "7";
-    case Form::Path:
-        return "/home/jdoe";
-    case Form::Day:
-        return "2030-12-31";
-    default:
-        return "jdoe";
-    }
-}
 
 /** The text with each byte from 1 to 255 at its start, in its middle and at its end, and attacks.
  */

@@ -1,6 +1,7 @@
 #include "mihost/cli/MethodCall.h"
 #include "mihost/cli/Safety.h"
 #include "tests/unit/Refusal.h"
+#include "tests/unit/RightValue.h"
 
 #include <functional>
 #include <gtest/gtest.h>
@@ -11,21 +12,6 @@ namespace
 using mihost::Form;
 using mihost::objection;
 using mihost::parseCall;
-
-/** A value of the form that is right. */
-std::string rightValue(Form form)
-{
-    switch (form) {
-    case Form::Digits:
-        return "7";
-    case Form::Path:
-        return "/home/jdoe";
-    case Form::Day:
-        return "2030-12-31";
-    default:
-        return "jdoe";
-    }
-}
 
 /** Every method with all its parameters, the value of one of them replaced. */
 void forEachParameter(

@@ -48,7 +48,7 @@ public:
      * The offset at which a line begins: the end of the file past the last line.
      *
      * @param line  1 for the first
-     * @return nothing if the file is no longer the one of the index
+     * @return nothing if another file has taken the place of the indexed one
      */
     std::optional<std::uint64_t> find(int file, std::uint64_t line) const;
 

@@ -31,7 +31,7 @@ struct FileChange {
 std::vector<std::string> missingIn(std::vector<std::string> const& lines,
                                    std::vector<std::string> const& others);
 
-/** Replaces a field of a record, the first being 0, unless it says that there is no password. */
+/** Replaces a field of a record, the first being 0, unless it marks that there is none. */
 void hideHash(std::string& record, std::size_t field);
 
 Json toJson(std::vector<FileChange> const& changes);

@@ -25,7 +25,7 @@ public:
     std::vector<std::string> words;
     bool inWord = false;
     char quote = '\0';    // ' or " within one; \ where the next byte is kept as it is
-    char outer = '\0';    // the quote that a backslash stands in
+    char outer = '\0';    // the quote around a backslash
     std::size_t kept = 0; // bytes of the last word before the last break
 
 private:

@@ -25,7 +25,7 @@ struct TypedLine {
     char quote = '\0';              // the quote that the cursor is in
 };
 
-/** @param breaks  the characters behind which the replaced part begins if they are not quoted */
+/** @param breaks  the characters after which the replaced part begins if they are not quoted */
 TypedLine typedLine(std::string const& line, std::string const& breaks);
 
 /** Whether a password stands in the line, so that it must not be kept. */

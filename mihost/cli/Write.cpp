@@ -115,7 +115,7 @@ bool isAnswer(RunCommand const& command)
     return isPasswordOffer(command) || (isQuery && command.status == 0);
 }
 
-/** What useradd says of a success. The plug-in fails a call for a word of any other tool. */
+/** What useradd prints about a success. The plug-in fails a call for a word of any other tool. */
 std::vector<std::string> remarksOf(Result const& result)
 {
     std::vector<std::string> remarks;

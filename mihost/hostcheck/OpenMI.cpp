@@ -66,7 +66,7 @@ private:
 
 /**
  * Returns 1, and no objects, to a host whose classes are not those of host/: it could call nothing
- * of them. Standard error has the reason, since there is no other way to tell it.
+ * of them. Standard error has the reason, since nothing else can carry it.
  */
 extern "C" int OpenMI(IC::ManagementInterface** managementInterface, IC::Error** error)
 {

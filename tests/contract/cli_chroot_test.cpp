@@ -1,4 +1,4 @@
-// The sandbox where the machine is a chroot: a root that is no mount point, without /proc and /dev.
+// The sandbox in a chroot: a root that is not a mount point, without /proc and /dev.
 
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"

@@ -1,4 +1,4 @@
-// The program looks at what a change left behind, and says so if it is not what was asked for.
+// The program reads back what a change did, and reports what differs from the request.
 
 #include "mihost/sandbox/Sandbox.h"
 #include "tests/support/Lines.h"

@@ -42,7 +42,7 @@ TEST(CommandGuard, RefusesEveryByteThatAShellWouldActOnInEveryText)
 {
     struct Line {
         std::string before;
-        std::string behind;
+        std::string after;
     };
     for (Line const& line :
          std::initializer_list<Line>{{"modinfo a", "b"},
@@ -57,8 +57,8 @@ TEST(CommandGuard, RefusesEveryByteThatAShellWouldActOnInEveryText)
                                      {"echo a | /usr/bin/passwd a", "b --stdin 2>&1"}})
         for (int byte = 1; byte < 256; ++byte) {
             bool const isModule = line.before.rfind("modinfo", 0) == 0;
-            // Two bytes, since a backslash may escape the one behind it.
-            std::string const text = line.before + static_cast<char>(byte) + ";" + line.behind;
+            // Two bytes, since a backslash may escape the one after it.
+            std::string const text = line.before + static_cast<char>(byte) + ";" + line.after;
             if (byte != '\\' || isModule) {
                 EXPECT_NE(objectionToCommand(text), std::nullopt) << text;
             }
@@ -66,9 +66,9 @@ TEST(CommandGuard, RefusesEveryByteThatAShellWouldActOnInEveryText)
                 byte < 0x20 || byte == 0x7F ||
                 (byte < 0x80 && std::strchr("|&;<>()$`\"'*?[]#~=%!{}^", byte) != nullptr);
             if (isActedOn) {
-                EXPECT_NE(objectionToCommand(line.before + static_cast<char>(byte) + line.behind),
+                EXPECT_NE(objectionToCommand(line.before + static_cast<char>(byte) + line.after),
                           std::nullopt)
-                    << line.before << static_cast<char>(byte) << line.behind;
+                    << line.before << static_cast<char>(byte) << line.after;
             }
         }
 }

@@ -1,7 +1,7 @@
 // fill TEMPLATE: prints a manual page, with lists from the catalogue where the template has
 // @PROPERTIES@ and @METHODS@ on lines of their own.
 
-#include "mihost/cli/CatalogueText.h"
+#include "mihost/cli/output/CatalogueText.h"
 
 #include <cctype>
 #include <cstdlib>

@@ -1,5 +1,5 @@
 #include "mihost/accel/Accel.h"
-#include "mihost/accel/Command.h"
+#include "mihost/accel/CommandForm.h"
 #include "mihost/accel/Stream.h"
 #include "mihost/accel/Trust.h"
 

@@ -1,6 +1,6 @@
-#include "mihost/cli/Failure.h"
-#include "mihost/cli/Program.h"
-#include "mihost/cli/StandardFiles.h"
+#include "mihost/cli/commands/Program.h"
+#include "mihost/cli/system/Failure.h"
+#include "mihost/cli/system/StandardFiles.h"
 
 #include <cstdio>
 

@@ -1,7 +1,7 @@
 // The plug-in calls popen and pclose by their ordinary names. The loader binds them to the
 // program's own, which stand before libc's.
 
-#include "mihost/cli/CommandTap.h"
+#include "mihost/cli/plugin/CommandTap.h"
 
 extern "C" FILE* popen(char const* line, char const* mode)
 {

@@ -1,6 +1,6 @@
 #include "mihost/sandbox/Content.h"
 
-#include "mihost/sandbox/Failure.h"
+#include "mihost/sandbox/SystemCall.h"
 
 namespace mihost
 {

@@ -1,6 +1,6 @@
 #include "mihost/sandbox/Folder.h"
 
-#include "mihost/sandbox/Failure.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <dirent.h>
 #include <fcntl.h>

@@ -1,9 +1,9 @@
 #include "mihost/sandbox/LayOver.h"
 
 #include "mihost/sandbox/Content.h"
-#include "mihost/sandbox/Failure.h"
 #include "mihost/sandbox/Folder.h"
 #include "mihost/sandbox/Sandbox.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <cstdio>
 #include <fcntl.h>

@@ -1,7 +1,7 @@
 #include "mihost/sandbox/LayerFiles.h"
 
-#include "mihost/sandbox/Failure.h"
 #include "mihost/sandbox/Folder.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <algorithm>
 #include <array>

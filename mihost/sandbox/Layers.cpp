@@ -1,6 +1,6 @@
 #include "mihost/sandbox/Layers.h"
 
-#include "mihost/sandbox/Failure.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <fcntl.h>
 #include <sys/mount.h>

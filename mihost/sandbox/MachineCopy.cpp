@@ -2,10 +2,10 @@
 
 #include "mihost/sandbox/Content.h"
 #include "mihost/sandbox/Descriptor.h"
-#include "mihost/sandbox/Failure.h"
 #include "mihost/sandbox/Layers.h"
 #include "mihost/sandbox/MountTable.h"
 #include "mihost/sandbox/Self.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <cstdlib>
 #include <fcntl.h>

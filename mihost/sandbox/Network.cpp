@@ -1,7 +1,7 @@
 #include "mihost/sandbox/Network.h"
 
 #include "mihost/sandbox/Descriptor.h"
-#include "mihost/sandbox/Failure.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <cstring>
 #include <net/if.h>

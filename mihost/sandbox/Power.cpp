@@ -1,8 +1,8 @@
 #include "mihost/sandbox/Power.h"
 
 #include "mihost/sandbox/Content.h"
-#include "mihost/sandbox/Failure.h"
 #include "mihost/sandbox/Sandbox.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <fcntl.h>
 #include <fstream>

@@ -1,6 +1,6 @@
 #include "mihost/sandbox/Privileges.h"
 
-#include "mihost/sandbox/Failure.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <cstdint>
 #include <linux/netlink.h>

@@ -2,7 +2,6 @@
 
 #include "mihost/sandbox/Content.h"
 #include "mihost/sandbox/Descriptor.h"
-#include "mihost/sandbox/Failure.h"
 #include "mihost/sandbox/LayOver.h"
 #include "mihost/sandbox/MachineCopy.h"
 #include "mihost/sandbox/Network.h"
@@ -10,6 +9,7 @@
 #include "mihost/sandbox/Privileges.h"
 #include "mihost/sandbox/Relay.h"
 #include "mihost/sandbox/Self.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <cstdio>
 #include <fcntl.h>

@@ -2,7 +2,7 @@
 #define MIHOST_SANDBOX_SELF_H
 
 #include "mihost/sandbox/Descriptor.h"
-#include "mihost/sandbox/Failure.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <sys/syscall.h>
 #include <unistd.h>

@@ -1,9 +1,9 @@
 // The whole program with a recorder for what reaches the shell: hostile arguments of every command
 // and hostile names on the machine run nothing.
 
-#include "mihost/cli/Catalogue.h"
-#include "mihost/cli/Command.h"
-#include "mihost/cli/CommandGuard.h"
+#include "mihost/cli/catalogue/Catalogue.h"
+#include "mihost/cli/input/Command.h"
+#include "mihost/cli/plugin/CommandGuard.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

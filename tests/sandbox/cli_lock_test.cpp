@@ -1,6 +1,6 @@
 // One mihost at a time changes the machine.
 
-#include "mihost/cli/ChangeLock.h"
+#include "mihost/cli/change/ChangeLock.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

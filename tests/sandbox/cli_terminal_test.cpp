@@ -1,6 +1,6 @@
 // The program at a terminal: what a person sees, types and interrupts.
 
-#include "mihost/cli/TextTable.h"
+#include "mihost/cli/output/TextTable.h"
 #include "mihost/sandbox/Sandbox.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

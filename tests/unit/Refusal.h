@@ -1,7 +1,7 @@
 #ifndef TESTS_UNIT_REFUSAL_H
 #define TESTS_UNIT_REFUSAL_H
 
-#include "mihost/cli/Failure.h"
+#include "mihost/cli/system/Failure.h"
 
 #include <gtest/gtest.h>
 #include <string>

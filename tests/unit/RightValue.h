@@ -1,7 +1,7 @@
 #ifndef TESTS_UNIT_RIGHTVALUE_H
 #define TESTS_UNIT_RIGHTVALUE_H
 
-#include "mihost/cli/Catalogue.h"
+#include "mihost/cli/catalogue/Catalogue.h"
 
 #include <string>
 

@@ -1,4 +1,4 @@
-#include "mihost/accel/Command.h"
+#include "mihost/accel/CommandForm.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "mihost/cli/Accelerator.h"
+#include "mihost/cli/plugin/AcceleratorLoader.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "mihost/cli/AccountFiles.h"
+#include "mihost/cli/change/AccountChanges.h"
 
 #include <gtest/gtest.h>
 

@@ -1,5 +1,5 @@
-#include "mihost/cli/Address.h"
-#include "mihost/cli/Failure.h"
+#include "mihost/cli/input/Address.h"
+#include "mihost/cli/system/Failure.h"
 
 #include <gtest/gtest.h>
 #include <memory>

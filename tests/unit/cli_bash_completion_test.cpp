@@ -1,6 +1,7 @@
-#include "mihost/cli/BashCompletion.h"
+#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/shell/BashCompletion.h"
 
-#include "mihost/cli/Words.h"
+#include "mihost/cli/input/ShellWords.h"
 
 #include <gtest/gtest.h>
 
@@ -18,14 +19,15 @@ std::vector<std::string> names(NodeKind const&)
 
 std::string inBash(std::string const& line)
 {
-    return bashCompletionText(line, breaks, names);
+    return bashCompletionText(line, breaks, names, mihost::commandTable());
 }
 
 TEST(BashCompletionText, ReplacesWhatFollowsTheLastBreak)
 {
     EXPECT_EQ(inBash("mihost get user:j"), "words\njdoe\n");
     EXPECT_EQ(inBash("mihost call UserDel UserName=j"), "words\njdoe\n");
-    EXPECT_EQ(bashCompletionText("mihost get user:j", " ", names), "words\nuser:jdoe\n");
+    EXPECT_EQ(bashCompletionText("mihost get user:j", " ", names, mihost::commandTable()),
+              "words\nuser:jdoe\n");
     EXPECT_EQ(inBash("mihost power "), "words\nrestart\nhalt\n");
 }
 

@@ -1,4 +1,4 @@
-#include "mihost/cli/BoundedText.h"
+#include "mihost/cli/system/BoundedText.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "mihost/cli/Catalogue.h"
+#include "mihost/cli/catalogue/Catalogue.h"
 
 #include <gtest/gtest.h>
 #include <set>

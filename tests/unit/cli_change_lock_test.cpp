@@ -1,6 +1,6 @@
-#include "mihost/cli/ChangeLock.h"
+#include "mihost/cli/change/ChangeLock.h"
 
-#include "mihost/cli/Failure.h"
+#include "mihost/cli/system/Failure.h"
 #include "tests/support/ScratchFolder.h"
 
 #include <array>

@@ -1,4 +1,4 @@
-#include "mihost/cli/CommandGuard.h"
+#include "mihost/cli/plugin/CommandGuard.h"
 
 #include <cctype>
 #include <cstring>

@@ -1,7 +1,7 @@
 // What the program keeps of the commands that pass through it, and what the plug-in reads of them.
 
-#include "mihost/cli/BoundedText.h"
-#include "mihost/cli/CommandTap.h"
+#include "mihost/cli/plugin/CommandTap.h"
+#include "mihost/cli/system/BoundedText.h"
 
 #include <array>
 #include <csignal>

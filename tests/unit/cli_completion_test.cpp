@@ -1,4 +1,5 @@
-#include "mihost/cli/Completion.h"
+#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/shell/Completion.h"
 
 #include "nodes/ids.h"
 
@@ -32,7 +33,7 @@ Words wordsOf(Completion const& completion)
 
 Words after(Words const& words)
 {
-    return wordsOf(complete(words, namesOf));
+    return wordsOf(complete(words, namesOf, mihost::commandTable()));
 }
 
 TEST(Completion, BeginsWithTheCommands)
@@ -68,15 +69,20 @@ TEST(Completion, OffersEachOptionOnce)
 
 TEST(Completion, LeavesFilesAndFoldersToTheShell)
 {
-    EXPECT_EQ(complete({"--plugin", ""}, namesOf).what, Completion::What::Files);
-    EXPECT_EQ(complete({"get", "--trace", "x"}, namesOf).what, Completion::What::Files);
-    EXPECT_EQ(complete({"--overlay", ""}, namesOf).what, Completion::What::Folders);
-    EXPECT_EQ(complete({"--plugin=", ""}, namesOf).what, Completion::What::Words);
+    EXPECT_EQ(complete({"--plugin", ""}, namesOf, mihost::commandTable()).what,
+              Completion::What::Files);
+    EXPECT_EQ(complete({"get", "--trace", "x"}, namesOf, mihost::commandTable()).what,
+              Completion::What::Files);
+    EXPECT_EQ(complete({"--overlay", ""}, namesOf, mihost::commandTable()).what,
+              Completion::What::Folders);
+    EXPECT_EQ(complete({"--plugin=", ""}, namesOf, mihost::commandTable()).what,
+              Completion::What::Words);
 }
 
 TEST(Completion, OffersFilesAndFormsToCheck)
 {
-    EXPECT_EQ(complete({"check", ""}, namesOf).what, Completion::What::Files);
+    EXPECT_EQ(complete({"check", ""}, namesOf, mihost::commandTable()).what,
+              Completion::What::Files);
     EXPECT_EQ(after({"check", "--format", ""}), (Words{"text", "tap", "junit"}));
     EXPECT_EQ(after({"check", "--r"}), Words{"--rounds"});
 }

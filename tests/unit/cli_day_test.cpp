@@ -1,4 +1,4 @@
-#include "mihost/cli/Day.h"
+#include "mihost/cli/input/Day.h"
 
 #include <gtest/gtest.h>
 

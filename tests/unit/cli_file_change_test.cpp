@@ -1,7 +1,7 @@
 // Changed files as they are shown.
 
-#include "mihost/cli/FileChange.h"
-#include "mihost/cli/SandboxChanges.h"
+#include "mihost/cli/change/FileChange.h"
+#include "mihost/cli/change/SandboxChanges.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "mihost/cli/FileForms.h"
+#include "mihost/cli/doctor/FileChecks.h"
 
 #include <gtest/gtest.h>
 

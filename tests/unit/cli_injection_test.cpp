@@ -1,9 +1,9 @@
 // Every byte in every place of every argument: what mihost lets through reaches the shell as it is.
 
-#include "mihost/cli/CommandGuard.h"
-#include "mihost/cli/Failure.h"
-#include "mihost/cli/MethodCall.h"
-#include "mihost/cli/ValueText.h"
+#include "mihost/cli/input/MethodCall.h"
+#include "mihost/cli/input/ValueText.h"
+#include "mihost/cli/plugin/CommandGuard.h"
+#include "mihost/cli/system/Failure.h"
 #include "tests/unit/Methods.h"
 #include "tests/unit/RightValue.h"
 

@@ -1,4 +1,4 @@
-#include "mihost/cli/Json.h"
+#include "mihost/cli/output/Json.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "mihost/cli/LineEditor.h"
+#include "mihost/cli/shell/LineEditor.h"
 
 #include <algorithm>
 #include <gtest/gtest.h>

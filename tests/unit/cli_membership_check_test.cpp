@@ -1,4 +1,4 @@
-#include "mihost/cli/MembershipCheck.h"
+#include "mihost/cli/change/MembershipCheck.h"
 
 #include "sysdata/osInfo_commands.h"
 

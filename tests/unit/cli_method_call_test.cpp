@@ -1,4 +1,4 @@
-#include "mihost/cli/MethodCall.h"
+#include "mihost/cli/input/MethodCall.h"
 #include "tests/unit/Refusal.h"
 
 #include <gtest/gtest.h>

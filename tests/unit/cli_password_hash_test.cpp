@@ -1,4 +1,4 @@
-#include "mihost/cli/PasswordHash.h"
+#include "mihost/cli/change/PasswordHash.h"
 #include "tests/unit/Refusal.h"
 
 namespace

@@ -1,7 +1,7 @@
-#include "mihost/cli/Phases.h"
+#include "mihost/cli/plugin/Phases.h"
 
 #include "host/VXLogger.h"
-#include "mihost/cli/Timing.h"
+#include "mihost/cli/plugin/Timing.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "mihost/cli/Redaction.h"
+#include "mihost/cli/plugin/Redaction.h"
 
 #include <gtest/gtest.h>
 

@@ -1,5 +1,5 @@
-#include "mihost/cli/MethodCall.h"
-#include "mihost/cli/Safety.h"
+#include "mihost/cli/input/InputValidation.h"
+#include "mihost/cli/input/MethodCall.h"
 #include "tests/unit/Refusal.h"
 #include "tests/unit/RightValue.h"
 

@@ -1,4 +1,4 @@
-#include "mihost/cli/Suggestion.h"
+#include "mihost/cli/input/Suggestion.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "mihost/cli/TextTable.h"
+#include "mihost/cli/output/TextTable.h"
 
 #include <gtest/gtest.h>
 

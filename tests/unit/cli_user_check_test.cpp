@@ -1,4 +1,4 @@
-#include "mihost/cli/UserCheck.h"
+#include "mihost/cli/change/UserCheck.h"
 
 #include <cctype>
 #include <gtest/gtest.h>

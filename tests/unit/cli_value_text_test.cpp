@@ -1,4 +1,4 @@
-#include "mihost/cli/ValueText.h"
+#include "mihost/cli/input/ValueText.h"
 #include "tests/support/TimeZone.h"
 #include "tests/unit/Refusal.h"
 

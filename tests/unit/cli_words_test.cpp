@@ -1,4 +1,4 @@
-#include "mihost/cli/Words.h"
+#include "mihost/cli/input/ShellWords.h"
 #include "tests/unit/Refusal.h"
 
 #include <gtest/gtest.h>

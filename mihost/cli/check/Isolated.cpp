@@ -1,11 +1,11 @@
 #include "mihost/cli/check/Isolated.h"
 
-#include "mihost/cli/Failure.h"
-#include "mihost/cli/Json.h"
 #include "mihost/cli/check/Subject.h"
+#include "mihost/cli/output/Json.h"
+#include "mihost/cli/system/Failure.h"
 #include "mihost/runtime/Text.h"
 #include "mihost/sandbox/Descriptor.h"
-#include "mihost/sandbox/Failure.h"
+#include "mihost/sandbox/SystemCall.h"
 
 #include <algorithm>
 #include <csignal>

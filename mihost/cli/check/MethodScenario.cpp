@@ -1,8 +1,8 @@
-#include "mihost/cli/CommandTap.h"
 #include "mihost/cli/check/Accounts.h"
 #include "mihost/cli/check/LogRules.h"
 #include "mihost/cli/check/Scenarios.h"
 #include "mihost/cli/check/Subject.h"
+#include "mihost/cli/plugin/CommandTap.h"
 #include "nodes/ids.h"
 
 #include <cstdlib>

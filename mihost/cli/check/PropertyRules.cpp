@@ -1,6 +1,6 @@
 #include "mihost/cli/check/PropertyRules.h"
 
-#include "mihost/cli/Catalogue.h"
+#include "mihost/cli/catalogue/Catalogue.h"
 #include "nodes/ids.h"
 
 #include <algorithm>

@@ -1,9 +1,9 @@
 #ifndef MIHOST_CLI_CHECK_REPORT_H
 #define MIHOST_CLI_CHECK_REPORT_H
 
-#include "mihost/cli/Json.h"
-#include "mihost/cli/Output.h"
 #include "mihost/cli/check/Check.h"
+#include "mihost/cli/output/Json.h"
+#include "mihost/cli/output/Output.h"
 
 /** The results of all checks in the forms that people and programs read. */
 namespace mihost::checks

@@ -1,6 +1,6 @@
 #include "mihost/cli/check/Subject.h"
 
-#include "mihost/cli/Address.h"
+#include "mihost/cli/input/Address.h"
 #include "nodes/ids.h"
 
 #include <stdexcept>

@@ -1,10 +1,10 @@
 #ifndef MIHOST_CLI_CHECK_SUBJECT_H
 #define MIHOST_CLI_CHECK_SUBJECT_H
 
-#include "mihost/cli/Plugin.h"
 #include "mihost/cli/check/HostEvents.h"
 #include "mihost/cli/check/LogRecord.h"
 #include "mihost/cli/check/TreeRules.h"
+#include "mihost/cli/plugin/Plugin.h"
 
 #include <memory>
 #include <string>

@@ -1,6 +1,6 @@
 #include "mihost/cli/check/TreeRules.h"
 
-#include "mihost/cli/Catalogue.h"
+#include "mihost/cli/catalogue/Catalogue.h"
 #include "nodes/ids.h"
 
 #include <fmt/format.h>

@@ -1,7 +1,15 @@
 #ifndef MIHOST_CLI_COMMANDS_MAKERS_H
 #define MIHOST_CLI_COMMANDS_MAKERS_H
 
-#include "mihost/cli/Command.h"
+#include "mihost/cli/input/Command.h"
+
+namespace mihost
+{
+
+/** All of the program's commands. */
+CommandTable const& commandTable();
+
+} // namespace mihost
 
 /** One maker for each command, defined in the command's own file. */
 namespace mihost::commandMakers

@@ -1,0 +1,40 @@
+#include "mihost/cli/accounts/AccountFiles.h"
+
+#include "mihost/cli/system/TextFile.h"
+
+namespace mihost
+{
+
+std::vector<std::string> fieldsOf(std::string const& line, char separator)
+{
+    std::vector<std::string> fields;
+    std::size_t start = 0;
+    for (std::size_t end = 0; end != std::string::npos; start = end + 1) {
+        end = line.find(separator, start);
+        fields.push_back(line.substr(start, end - start));
+    }
+    return fields;
+}
+
+Record recordOf(std::string const& file, std::string const& name)
+{
+    constexpr std::size_t mostFields = 9; // of a shadow record
+    std::string const start = name + ':';
+    for (std::string const& line : linesOf(contentOf(file)))
+        if (line.compare(0, start.size(), start) == 0) {
+            Record record = fieldsOf(line, ':');
+            record.resize(std::max(record.size(), mostFields));
+            return record;
+        }
+    return {};
+}
+
+AccountFiles readAccountFiles()
+{
+    AccountFiles all;
+    for (char const* const path : {accountFile, shadowFile, groupFile, groupShadowFile})
+        all[path] = linesOf(contentOf(path));
+    return all;
+}
+
+} // namespace mihost

@@ -1,0 +1,31 @@
+#ifndef MIHOST_CLI_CHANGE_CLEARANCE_H
+#define MIHOST_CLI_CHANGE_CLEARANCE_H
+
+#include "mihost/cli/change/ChangeLock.h"
+#include "mihost/cli/plugin/Session.h"
+
+#include <functional>
+#include <string>
+
+namespace mihost
+{
+
+/** Throws Failure if the machine, as it is now, would make something else of a change. */
+using MachineCheck = std::function<void()>;
+
+/**
+ * Clears one change: checks it, asks for the user's consent if it is dangerous, and keeps every
+ * other mihost from changing the machine for as long as the result lives.
+ *
+ * The check runs under the lock; for a dangerous change also before, so that nobody is asked in
+ * vain.
+ *
+ * @param danger  what to ask about, such as "halt the machine"; empty for nothing
+ * @throws Failure
+ */
+ChangeLock clearChange(
+    Session const& session, std::string const& danger, MachineCheck const& check = [] {});
+
+} // namespace mihost
+
+#endif

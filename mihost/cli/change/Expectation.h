@@ -1,0 +1,41 @@
+#ifndef MIHOST_CLI_CHANGE_EXPECTATION_H
+#define MIHOST_CLI_CHANGE_EXPECTATION_H
+
+#include "mihost/cli/catalogue/Catalogue.h"
+#include "mihost/cli/input/MethodCall.h"
+
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/** Something that holds once a write has done what it was asked to do. */
+struct Expectation {
+    std::string subject;                 // such as "login shell of jdoe"
+    std::string wanted;                  // such as "/bin/bash"
+    std::function<std::string()> actual; // what it is now, written as the wanted one
+};
+
+/** What a method call asks for, in the account files. */
+std::vector<Expectation> expectationsOf(MethodCall const& call);
+
+/** That the account's shadow record holds this hash. */
+Expectation passwordHash(std::string const& user, std::string const& hash);
+
+/** That the account is gone. */
+Expectation deletedAccount(std::string const& user);
+
+/** That the account's password expires on this day, YYYY-MM-DD. */
+Expectation passwordExpiryDay(std::string const& user, std::string const& day);
+
+/** That the account becomes inactive on this day, some days after its password expired. */
+Expectation inactivityDay(std::string const& user, std::string const& day);
+
+/** That the system log has lost what it holds now. */
+Expectation emptiedLog();
+
+} // namespace mihost
+
+#endif

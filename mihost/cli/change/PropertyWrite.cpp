@@ -1,0 +1,207 @@
+#include "mihost/cli/change/PropertyWrite.h"
+
+#include "mihost/cli/accounts/LocalNames.h"
+#include "mihost/cli/input/Address.h"
+#include "nodes/ids.h"
+
+#include <fmt/format.h>
+#include <optional>
+#include <set>
+
+namespace mihost
+{
+
+namespace
+{
+
+/** What a write of one property asks for. */
+struct Act {
+    unsigned int nodeType;
+    unsigned int property;
+    std::optional<unsigned int> value; // the only one that acts; nothing if every one does
+    bool onMachine;                    // not only on the tree
+    char const* tool;                  // as in Write
+    std::vector<Expectation> (*expectations)(Session& session, IC::MutableNode const& node,
+                                             IC::PropertyValue const& value);
+    char const* warning; // "" for none; {} is the account's name
+};
+
+std::string userOf(IC::MutableNode const& node)
+{
+    return storedText(node, NODES::name);
+}
+
+/** The plug-in reads the day of a date and drops the time. */
+std::string dayOf(IC::PropertyValue const& value)
+{
+    constexpr std::size_t dayLength = 10;
+    return static_cast<std::string>(value).substr(0, dayLength);
+}
+
+/** That every account of the files has a node. */
+Expectation completeList(Session& session, NodeKind const& kind)
+{
+    return {fmt::format("list of {}", kind.listName), "complete",
+            [&session, &kind]() -> std::string {
+                std::set<std::string> shown;
+                for (IC::MutableNode const* node : session.nodes())
+                    if (node->getNodeType() == kind.type)
+                        shown.insert(storedText(*node, kind.nameProperty));
+                for (std::string const& name : localNames(kind))
+                    if (shown.count(name) == 0)
+                        return fmt::format("without '{}'", name);
+                return "complete";
+            }};
+}
+
+std::vector<Expectation> noExpectations(Session&, IC::MutableNode const&, IC::PropertyValue const&)
+{
+    return {};
+}
+
+std::vector<Expectation> completeLists(Session& session, IC::MutableNode const&,
+                                       IC::PropertyValue const&)
+{
+    return {completeList(session, *findKind(NODES::userType)),
+            completeList(session, *findKind(NODES::groupType))};
+}
+
+std::vector<Expectation> emptyLog(Session&, IC::MutableNode const&, IC::PropertyValue const&)
+{
+    return {emptiedLog()};
+}
+
+std::vector<Expectation> hash(Session&, IC::MutableNode const& node, IC::PropertyValue const& value)
+{
+    return {passwordHash(userOf(node), static_cast<std::string>(value))};
+}
+
+std::vector<Expectation> inactivity(Session&, IC::MutableNode const& node,
+                                    IC::PropertyValue const& value)
+{
+    return {inactivityDay(userOf(node), dayOf(value))};
+}
+
+std::vector<Expectation> expiry(Session&, IC::MutableNode const& node,
+                                IC::PropertyValue const& value)
+{
+    return {passwordExpiryDay(userOf(node), dayOf(value))};
+}
+
+std::vector<Expectation> deletion(Session&, IC::MutableNode const& node, IC::PropertyValue const&)
+{
+    return {deletedAccount(userOf(node))};
+}
+
+constexpr char shutdownTool[] = "/sbin/shutdown";
+constexpr char inactivityWarning[] =
+    "inactive-time reads the account's expiry date, but writing it sets how long after its "
+    "password's expiry the account stays active (for the date, use 'mihost call UserSetAttrib "
+    "UserName={} passwordExpirationDate=YYYY-MM-DD')";
+constexpr char expirationWarning[] =
+    "password-expiration reads the account's expiry date, but writing it sets the password's "
+    "maximum age (for the date, use 'mihost call UserSetAttrib UserName={} "
+    "passwordExpirationDate=YYYY-MM-DD')";
+
+// clang-format off
+constexpr Act acts[] = {
+    {NODES::operatingSystemType, NODES::requestedState, 9, true, shutdownTool, noExpectations, ""},
+    {NODES::operatingSystemType, NODES::requestedState, 12, true, shutdownTool, noExpectations, ""},
+    {NODES::operatingSystemType, NODES::refresh, 0, false, "", completeLists, ""},
+    {NODES::operatingSystemType, NODES::clearLog, 9, true, "", emptyLog, ""},
+    {NODES::userType, NODES::password, std::nullopt, true, "", hash, ""},
+    {NODES::userType, NODES::inactiveTime, std::nullopt, true, "", inactivity, inactivityWarning},
+    {NODES::userType, NODES::passwordExpiration, std::nullopt, true, "", expiry, expirationWarning},
+    {NODES::userType, NODES::deleteUser, 1, true, "", deletion, ""},
+};
+
+/** What to use in place of a write that stays in the tree. */
+struct Instead {
+    unsigned int nodeType;
+    unsigned int property;
+    char const* command;
+};
+
+constexpr Instead instead[] = {
+    {NODES::userType, NODES::name, "usermod -l"},
+    {NODES::userType, NODES::id, "usermod -u"},
+    {NODES::userType, NODES::groupId, "usermod -g"},
+    {NODES::userType, NODES::fullName, "mihost call UserSetFullName"},
+    {NODES::userType, NODES::homeDir, "mihost call UserSetHomeDir"},
+    {NODES::userType, NODES::scriptPath, "mihost call UserSetScriptPath"},
+    {NODES::userType, NODES::pwdMaxDays, "mihost call UserSetAttrib"},
+    {NODES::userType, NODES::pwdWarnDays, "mihost call UserSetAttrib"},
+    {NODES::userType, NODES::pwdMinDays, "mihost call UserSetAttrib"},
+    {NODES::userType, NODES::pwdExpDays, "mihost call UserSetAttrib"},
+    {NODES::userType, NODES::lastPwdChange, "chage -d"},
+    {NODES::groupType, NODES::name, "groupmod -n"},
+    {NODES::groupType, NODES::id, "groupmod -g"},
+    {NODES::groupType, NODES::members, "mihost call LocalGroupAddUser"},
+};
+// clang-format on
+
+Act const* findAct(IC::MutableNode const& node, unsigned int property,
+                   IC::PropertyValue const& value)
+{
+    for (Act const& act : acts)
+        if (act.nodeType == node.getNodeType() && act.property == property &&
+            (!act.value || *act.value == static_cast<unsigned int>(value)))
+            return &act;
+    return nullptr;
+}
+
+/** That the node holds the value now. */
+Expectation storedValue(IC::MutableNode const& node, Property const& property,
+                        IC::PropertyValue const& value)
+{
+    return {property.name, static_cast<std::string>(value),
+            [&node, id = property.id] { return storedText(node, id); }};
+}
+
+std::string memoryWarning(IC::MutableNode const& node, Property const& property)
+{
+    std::string text = fmt::format("{} changed in memory only", property.name);
+    for (Instead const& each : instead)
+        if (each.nodeType == node.getNodeType() && each.property == property.id)
+            text += fmt::format("; use '{}'", each.command);
+    return text;
+}
+
+} // namespace
+
+Write propertyWrite(Session& session, IC::MutableNode& node, Property const& property,
+                    IC::PropertyValue const& value)
+{
+    Act const* const act = findAct(node, property.id, value);
+    Write write{fmt::format("set {}", property.name),
+                node,
+                property.id,
+                value,
+                act && act->onMachine,
+                {},
+                {},
+                {},
+                act ? act->tool : ""};
+    if (property.has(Property::Secret))
+        write.secrets.push_back(static_cast<std::string>(value));
+    if (!act) {
+        write.expectations.push_back(storedValue(node, property, value));
+        write.warnings.push_back(memoryWarning(node, property));
+        return write;
+    }
+    write.expectations = act->expectations(session, node, value);
+    if (*act->warning)
+        write.warnings.push_back(fmt::format(act->warning, userOf(node)));
+    return write;
+}
+
+Write osWrite(Session& session, IC::MutableNode& os, std::string const& what, unsigned int property,
+              IC::PropertyValue const& value)
+{
+    Property const& row = *findProperty(*findKind(NODES::operatingSystemType), property);
+    Write write = propertyWrite(session, os, row, value);
+    write.what = what;
+    return write;
+}
+
+} // namespace mihost

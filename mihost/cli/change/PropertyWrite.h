@@ -1,0 +1,26 @@
+#ifndef MIHOST_CLI_CHANGE_PROPERTYWRITE_H
+#define MIHOST_CLI_CHANGE_PROPERTYWRITE_H
+
+#include "mihost/cli/change/Write.h"
+
+namespace mihost
+{
+
+/**
+ * The write of a property that the catalogue knows, save that of a method call. It warns of what
+ * the write does beside the expected, or that it changes nothing outside of the tree.
+ */
+Write propertyWrite(Session& session, IC::MutableNode& node, Property const& property,
+                    IC::PropertyValue const& value);
+
+/**
+ * The same for an acting property of the operating-system node.
+ *
+ * @param what  the command that the user gave, such as "power halt"
+ */
+Write osWrite(Session& session, IC::MutableNode& os, std::string const& what, unsigned int property,
+              IC::PropertyValue const& value);
+
+} // namespace mihost
+
+#endif

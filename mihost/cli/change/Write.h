@@ -1,0 +1,38 @@
+#ifndef MIHOST_CLI_CHANGE_WRITE_H
+#define MIHOST_CLI_CHANGE_WRITE_H
+
+#include "mihost/cli/change/Expectation.h"
+#include "mihost/cli/plugin/Session.h"
+
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/** One write of a property, to be carried out. */
+struct Write {
+    std::string what; // such as "call UserAdd"
+    IC::MutableNode& node;
+    unsigned int property;
+    IC::PropertyValue value;
+    bool acts; // on the machine, not only in the tree
+    std::vector<Expectation> expectations;
+    std::vector<std::string> secrets;  // shown nowhere
+    std::vector<std::string> warnings; // what the user should know first
+    std::string tool;                  // the command whose success is the change; empty for none
+};
+
+/**
+ * Gives the warnings, carries the write out, checks that what it asked for holds now, and reports
+ * what changed. In a sandbox that includes the commands that were run and their output.
+ *
+ * A write that finds everything as it asked for succeeds and says that nothing changed.
+ *
+ * @throws Failure (PluginRefused) if the plug-in or a command refuses, or the change is not there
+ */
+void carryOut(Session& session, Write const& write);
+
+} // namespace mihost
+
+#endif

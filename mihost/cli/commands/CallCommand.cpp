@@ -1,0 +1,61 @@
+#include "mihost/cli/change/Clearance.h"
+#include "mihost/cli/change/MembershipCheck.h"
+#include "mihost/cli/change/MethodWrite.h"
+#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/output/CatalogueText.h"
+
+#include <fmt/ranges.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+class Call : public Command
+{
+public:
+    void declare(CLI::App& app) override
+    {
+        method_ = app.add_option("METHOD", name_,
+                                 "such as UserAdd; --help behind it tells its parameters")
+                      ->required();
+        app.add_option("PARAMETER", assignments_,
+                       "NAME=VALUE; days as YYYY-MM-DD; Password=- is asked for, or read from "
+                       "standard input, but account tools still get the password or its hash "
+                       "as an argument");
+        // Asked for help, the words given so far are known but not handed out yet.
+        app.footer([this] {
+            Method const* const known =
+                method_->empty() ? nullptr : findMethod(method_->results().front());
+            return fmt::format(
+                "{}",
+                fmt::join(known ? methodLines(*known, Room()) : methodListLines(Room()), "\n"));
+        });
+    }
+
+    void run(Session& session) override
+    {
+        MethodCall const call = parseCall(name_, assignments_, [&session](std::string const& name) {
+            return session.askSecret(name);
+        });
+        IC::MutableNode& os = session.node("os");
+        ChangeLock const lock =
+            clearChange(session, dangerOf(call), [&call] { checkMembership(call); });
+        carryOut(session, methodWrite(session, os, call));
+    }
+
+private:
+    CLI::Option* method_ = nullptr;
+    std::string name_;
+    std::vector<std::string> assignments_;
+};
+
+} // namespace
+
+std::unique_ptr<Command> commandMakers::call()
+{
+    return std::make_unique<Call>();
+}
+
+} // namespace mihost

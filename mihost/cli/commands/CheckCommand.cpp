@@ -1,0 +1,102 @@
+#include "mihost/cli/check/Isolated.h"
+#include "mihost/cli/check/Report.h"
+#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/plugin/Session.h"
+#include "mihost/sandbox/Sandbox.h"
+
+#include <CLI/Validators.hpp>
+#include <algorithm>
+#include <cstdlib>
+#include <stdexcept>
+#include <sys/stat.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+constexpr char text[] = "text";
+constexpr char tap[] = "tap";
+constexpr char junit[] = "junit";
+
+class CheckCommand : public Command
+{
+public:
+    void declare(CLI::App& app) override
+    {
+        app.add_option("PLUGIN", plugin_, "the file to check; without it the one of --plugin")
+            ->type_name("FILE");
+        app.add_option("--format", format_, "how to show the results")
+            ->check(CLI::IsMember({text, tap, junit}))
+            ->capture_default_str();
+        app.add_option("--rounds", rounds_, "how often to start and stop when looking for leaks")
+            ->check(CLI::Range(1U, 1000U))
+            ->capture_default_str();
+        app.add_option("--time-limit", timeLimit_, "how long each group of checks may take")
+            ->type_name("SECONDS")
+            ->check(CLI::Range(1U, 86400U))
+            ->capture_default_str();
+    }
+
+    void run(Session& session) override
+    {
+        refuseWhatDoesNotFit(session.options());
+        checks::Results const results = runAll(session.options());
+        write(results, session);
+        if (std::any_of(results.begin(), results.end(),
+                        [](checks::Result const& result) { return result.failed(); }))
+            session.endWith(PluginRefused);
+    }
+
+private:
+    void refuseWhatDoesNotFit(Options const& options) const
+    {
+        if (options.json && format_ != text)
+            throw Failure(BadUsage, "--json and --format exclude each other");
+        if (!options.trace.empty())
+            throw Failure(BadUsage, "check writes no trace (leave out --trace)");
+    }
+
+    checks::Results runAll(Options const& options) const
+    {
+        if (!inSandbox())
+            throw std::logic_error("plug-ins are checked in a sandbox only");
+        // As for a plug-in that is loaded for use; see Session::plugin.
+        umask(077);
+        setenv("LC_ALL", "C", 1);
+        checks::Settings const settings{pluginFile(plugin_.empty() ? options.plugin : plugin_),
+                                        rounds_, std::chrono::seconds(timeLimit_)};
+        checks::Results all;
+        for (checks::Scenario const& scenario : checks::scenarios())
+            for (checks::Result const& result : checks::runIsolated(scenario, settings))
+                all.push_back(result);
+        return all;
+    }
+
+    void write(checks::Results const& results, Session& session) const
+    {
+        if (session.options().json)
+            session.out().json(checks::toJson(results));
+        else if (format_ == tap)
+            session.out().write(checks::tapText(results));
+        else if (format_ == junit)
+            session.out().write(checks::junitText(results));
+        else
+            checks::writeText(results, session.out());
+    }
+
+    std::string plugin_;
+    std::string format_ = text;
+    unsigned int rounds_ = 5;
+    unsigned int timeLimit_ = 120; // seconds
+};
+
+} // namespace
+
+std::unique_ptr<Command> commandMakers::check()
+{
+    return std::make_unique<CheckCommand>();
+}
+
+} // namespace mihost

@@ -1,0 +1,130 @@
+#include "mihost/cli/change/Clearance.h"
+#include "mihost/cli/change/MembershipCheck.h"
+#include "mihost/cli/change/MethodWrite.h"
+#include "mihost/cli/change/PropertyWrite.h"
+#include "mihost/cli/change/UserCheck.h"
+#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/input/ValueText.h"
+#include "mihost/cli/system/Failure.h"
+#include "nodes/ids.h"
+
+#include <fmt/format.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+/** A write that is asked about first. */
+struct Danger {
+    unsigned int nodeType;
+    unsigned int property;
+    unsigned int value;
+    char const* what; // {} stands for the account's name
+};
+
+constexpr Danger dangers[] = {
+    {NODES::operatingSystemType, NODES::requestedState, 9, "restart the machine"},
+    {NODES::operatingSystemType, NODES::requestedState, 12, "halt the machine"},
+    {NODES::operatingSystemType, NODES::clearLog, 9, "empty the system log"},
+    {NODES::userType, NODES::deleteUser, 1, "delete the account {} and its home directory"},
+};
+
+/** The call in a value, if it is one that the plug-in carries out rather than only stores. */
+std::optional<MethodCall> callIn(Property const& property, IC::PropertyValue const& value)
+{
+    std::string const text = static_cast<std::string>(value);
+    if (property.form != Form::MethodCall || callsNothing(text))
+        return std::nullopt;
+    return takeApart(text);
+}
+
+std::string dangerOf(IC::MutableNode const& node, Property const& property,
+                     IC::PropertyValue const& value)
+{
+    if (auto const call = callIn(property, value))
+        return dangerOf(*call);
+    for (Danger const& danger : dangers)
+        if (danger.nodeType == node.getNodeType() && danger.property == property.id &&
+            danger.value == static_cast<unsigned int>(value))
+            return fmt::format(danger.what, storedText(node, NODES::name));
+    return "";
+}
+
+/** Rebuilding nodes reads the machine only. */
+bool changesMachine(Property const& property)
+{
+    return property.has(Property::Acts) && property.id != NODES::refresh;
+}
+
+void checkMachine(IC::MutableNode const& node, Property const& property,
+                  IC::PropertyValue const& value)
+{
+    if (auto const call = callIn(property, value))
+        checkMembership(*call);
+    bool const deletes = property.id == NODES::deleteUser;
+    if (node.getNodeType() == NODES::userType &&
+        (!deletes || static_cast<unsigned int>(value) == 1))
+        checkUserWrite(node, deletes ? UserWrite::Delete : UserWrite::Change);
+}
+
+Write writeOf(Session& session, IC::MutableNode& node, Property const& property,
+              IC::PropertyValue const& value)
+{
+    if (auto const call = callIn(property, value))
+        return methodWrite(session, node, *call);
+    return propertyWrite(session, node, property, value);
+}
+
+class Set : public Command
+{
+public:
+    void declare(CLI::App& app) override
+    {
+        app.add_option("NODE", address_,
+                       "an id, or a name such as os or user:root; tree shows them")
+            ->required();
+        app.add_option("PROPERTY", name_, "an id or a name, which properties explains")->required();
+        app.add_option("VALUE", text_,
+                       "a date as YYYY-MM-DD, true or false, lists with commas; - for a password "
+                       "is asked for, or read from standard input")
+            ->required();
+    }
+
+    void run(Session& session) override
+    {
+        IC::MutableNode& node = session.node(address_);
+        unsigned int const id = propertyId(node, name_);
+        NodeKind const* const kind = findKind(node.getNodeType());
+        Property const* const property = kind ? findProperty(*kind, id) : nullptr;
+        if (!property)
+            throw Failure(NotFound,
+                          fmt::format("nothing is known of property '{}' of node '{}', so "
+                                      "it is not written",
+                                      name_, address_));
+        if (property->has(Property::Secret) && text_ == toBeAsked)
+            text_ = session.askSecret(fmt::format("{} hash", property->name));
+
+        IC::PropertyValue const value = parseValue(*property, text_);
+        std::optional<ChangeLock> lock;
+        if (changesMachine(*property))
+            lock = clearChange(session, dangerOf(node, *property, value),
+                               [&] { checkMachine(node, *property, value); });
+        carryOut(session, writeOf(session, node, *property, value));
+    }
+
+private:
+    std::string address_;
+    std::string name_;
+    std::string text_;
+};
+
+} // namespace
+
+std::unique_ptr<Command> commandMakers::set()
+{
+    return std::make_unique<Set>();
+}
+
+} // namespace mihost

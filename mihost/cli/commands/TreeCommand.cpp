@@ -1,0 +1,63 @@
+#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/output/TreeText.h"
+#include "mihost/cli/plugin/Session.h"
+
+#include <unordered_set>
+
+namespace mihost
+{
+
+namespace
+{
+
+/** The node and everything below it; parents stand before their children in the list. */
+std::vector<IC::MutableNode*> branchOf(std::vector<IC::MutableNode*> const& nodes,
+                                       IC::MutableNode const& top)
+{
+    std::unordered_set<unsigned int> inside = {top.getNodeId()};
+    std::vector<IC::MutableNode*> branch;
+    for (IC::MutableNode* const node : nodes)
+        if (node == &top || inside.count(node->getLinkedId()) != 0) {
+            inside.insert(node->getNodeId());
+            branch.push_back(node);
+        }
+    return branch;
+}
+
+class Tree : public Command
+{
+public:
+    void declare(CLI::App& app) override
+    {
+        app.add_option("NODE", address_, "show only this node and what is below it");
+        app.add_flag("--all", all_, "with every node's properties");
+    }
+
+    void run(Session& session) override
+    {
+        std::vector<IC::MutableNode*> nodes = session.nodes();
+        if (!address_.empty())
+            nodes = branchOf(nodes, findNode(nodes, address_));
+        if (session.options().json) {
+            Json document = Json::array();
+            for (IC::MutableNode const* node : nodes)
+                document.push_back(toJson(storedView(*node, session.secrets())));
+            session.out().json(document);
+            return;
+        }
+        writeTree(nodes, {all_, session.secrets()}, session.out());
+    }
+
+private:
+    std::string address_;
+    bool all_ = false;
+};
+
+} // namespace
+
+std::unique_ptr<Command> commandMakers::tree()
+{
+    return std::make_unique<Tree>();
+}
+
+} // namespace mihost

@@ -1,0 +1,29 @@
+#ifndef MIHOST_CLI_DOCTOR_DIAGNOSIS_H
+#define MIHOST_CLI_DOCTOR_DIAGNOSIS_H
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/** One thing that a full tree, or a change, needs. */
+struct Need {
+    std::string what;
+    std::optional<std::string> problem; // nothing if all is well
+    std::string effect;                 // what suffers without it
+    std::string debian;                 // the fix on Debian and similar systems; empty for none
+    std::string redHat;                 // and on Red Hat and similar systems
+    std::string noFix;                  // why nothing on this machine fixes it; empty if it can be
+};
+
+/**
+ * Looks at this machine. Changes nothing on it. What can only be told of something that is missing
+ * itself is left out.
+ */
+std::vector<Need> diagnose();
+
+} // namespace mihost
+
+#endif

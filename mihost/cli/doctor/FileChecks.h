@@ -1,0 +1,40 @@
+#ifndef MIHOST_CLI_DOCTOR_FILECHECKS_H
+#define MIHOST_CLI_DOCTOR_FILECHECKS_H
+
+#include <optional>
+#include <string>
+#include <vector>
+
+/** What keeps the plug-in from reading the contents of files; nothing where all is as it wants. */
+namespace mihost
+{
+
+using Problem = std::optional<std::string>;
+
+/** @param text  of /etc/login.defs */
+Problem problemOfRanges(std::string const& text);
+
+/** @param text  of /etc/passwd */
+Problem problemOfAccounts(std::string const& text);
+
+/** @param text  of /etc/group */
+Problem problemOfGroups(std::string const& text);
+
+/**
+ * Shadow entries are matched going forward only, so one that is missing, malformed or out of order
+ * takes those of all accounts behind it away.
+ *
+ * @param accounts  names of the accounts that are shown, in the order of /etc/passwd
+ * @param text      of /etc/shadow
+ */
+Problem problemOfShadow(std::vector<std::string> const& accounts, std::string const& text);
+
+/** @param text  of /etc/release: a line, then "NAME = MAJOR" and "NAME = MINOR" */
+Problem problemOfRelease(std::string const& text);
+
+/** @param lines  the newest lines of the system log, the newest last */
+Problem problemOfStamps(std::vector<std::string> const& lines);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,57 @@
+#ifndef MIHOST_CLI_INPUT_COMMANDLINE_H
+#define MIHOST_CLI_INPUT_COMMANDLINE_H
+
+#include "mihost/cli/input/Command.h"
+#include "mihost/cli/input/Options.h"
+
+namespace mihost
+{
+
+/** The arguments, taken apart. */
+class CommandLine
+{
+public:
+    /** In the shell the options that settle how the plug-in is loaded are out of reach. */
+    enum class Place { Program, Shell };
+
+    /** @param table  the commands to know; must outlive this */
+    explicit CommandLine(CommandTable const& table, Place place = Place::Program,
+                         Options const& defaults = {});
+
+    /** Adds all options and commands. What the application is given then ends up here. */
+    void declare(CLI::App& app);
+
+    /** @throws Failure (BadUsage) */
+    void parse(std::vector<std::string> words);
+
+    Options const& options() const
+    {
+        return options_;
+    }
+
+    /** What is to run; null where help or the version was asked for. */
+    Command* command() const
+    {
+        return command_;
+    }
+
+    /** The help or the version that was asked for. */
+    std::string const& answer() const
+    {
+        return answer_;
+    }
+
+private:
+    void declareForProgram(CLI::App& app);
+
+    CommandTable const& table_;
+    Place place_;
+    Options options_;
+    std::vector<std::pair<std::string, std::unique_ptr<Command>>> all_;
+    Command* command_ = nullptr;
+    std::string answer_;
+};
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,168 @@
+#include "mihost/cli/input/MethodCall.h"
+
+#include "mihost/cli/input/Day.h"
+#include "mihost/cli/input/InputValidation.h"
+#include "mihost/cli/input/Suggestion.h"
+#include "mihost/cli/system/Failure.h"
+
+#include <algorithm>
+#include <fmt/format.h>
+
+namespace mihost
+{
+
+namespace
+{
+
+Method const& method(std::string_view name)
+{
+    Method const* const found = findMethod(name);
+    if (!found)
+        throw Failure(BadUsage, fmt::format("no method '{}'; {}", name,
+                                            suggestion(name, rowNames(methods()), "there are")));
+    return *found;
+}
+
+Parameter const& parameter(Method const& method, std::string_view name)
+{
+    Parameter const* const found = findParameter(method, name);
+    if (!found)
+        throw Failure(BadUsage,
+                      fmt::format("{} has no parameter '{}'; {}", method.name, name,
+                                  suggestion(name, rowNames(method.parameters), "it has")));
+    return *found;
+}
+
+/** @param value  as a person writes it */
+void checkValue(Parameter const& parameter, std::string_view value)
+{
+    if (auto const reason = objection(parameter.form, value))
+        throw Failure(BadUsage, fmt::format("{} {}", parameter.name, *reason));
+}
+
+void checkWhole(MethodCall const& call)
+{
+    for (Parameter const& parameter : call.method->parameters) {
+        auto const given = std::count_if(
+            call.arguments.begin(), call.arguments.end(),
+            [&parameter](auto const& argument) { return argument.parameter == &parameter; });
+        if (given > 1)
+            throw Failure(BadUsage, fmt::format("{} is given twice", parameter.name));
+        if (given == 0 && parameter.required)
+            throw Failure(BadUsage,
+                          fmt::format("{0} needs {1}, {2}; 'mihost methods {0}' has all",
+                                      call.method->name, parameter.name, parameter.meaning));
+    }
+}
+
+std::string toTextForm(Parameter const& parameter, std::string const& value)
+{
+    if (parameter.form != Form::Day)
+        return value;
+    return dateTimeText(*parseDay(value));
+}
+
+/** The pieces between separators, empty ones left out, as the plug-in splits. */
+std::vector<std::string> split(std::string const& text, char separator)
+{
+    std::vector<std::string> pieces;
+    std::size_t start = 0;
+    while ((start = text.find_first_not_of(separator, start)) != std::string::npos) {
+        std::size_t const end = std::min(text.find(separator, start), text.size());
+        pieces.push_back(text.substr(start, end - start));
+        start = end;
+    }
+    return pieces;
+}
+
+/** @param value  as it stands in the text form */
+void checkTextForm(Parameter const& parameter, std::string const& value)
+{
+    if (parameter.form != Form::Day)
+        checkValue(parameter, value);
+    else if (!parseDateTime(value))
+        throw Failure(BadUsage, fmt::format("{} is no date-time: it must be {}", parameter.name,
+                                            dateTimeForm));
+}
+
+MethodCall::Argument argumentOf(Method const& method, std::string const& item)
+{
+    std::vector<std::string> const parts = split(item, ':');
+    Parameter const& known = parameter(method, parts.empty() ? std::string_view() : parts[0]);
+    if (parts.size() != 3)
+        throw Failure(BadUsage, fmt::format("{} must be written {}:{}:VALUE, without ':' in VALUE",
+                                            known.name, known.name, known.type));
+    if (parts[1] != known.type)
+        throw Failure(BadUsage,
+                      fmt::format("{} is of type {}, not '{}'", known.name, known.type, parts[1]));
+    checkTextForm(known, parts[2]);
+    return {&known, parts[2]};
+}
+
+} // namespace
+
+MethodCall parseCall(std::string const& name, std::vector<std::string> const& assignments,
+                     AskSecret const& ask)
+{
+    MethodCall call{&method(name), {}};
+    for (std::string const& assignment : assignments) {
+        std::size_t const equals = assignment.find('=');
+        if (equals == std::string::npos && !findParameter(*call.method, assignment))
+            throw Failure(BadUsage,
+                          fmt::format("'{}' is not NAME=VALUE; {}", assignment,
+                                      suggestion(assignment, rowNames(call.method->parameters),
+                                                 name + " takes")));
+        Parameter const& known =
+            parameter(*call.method, std::string_view(assignment).substr(0, equals));
+        if (equals == std::string::npos)
+            throw Failure(BadUsage,
+                          fmt::format("{} needs a value: {}=VALUE", known.name, known.name));
+        std::string value = assignment.substr(equals + 1);
+        if (known.form == Form::Password && value == toBeAsked)
+            value = ask(known.name);
+        checkValue(known, value);
+        call.arguments.push_back({&known, toTextForm(known, value)});
+    }
+    checkWhole(call);
+    return call;
+}
+
+bool callsNothing(std::string const& text)
+{
+    return text.empty() || text == "dummy";
+}
+
+MethodCall takeApart(std::string const& text)
+{
+    std::vector<std::string> const items = split(text, ',');
+    MethodCall call{&method(items.empty() ? std::string_view() : items[0]), {}};
+    for (std::size_t at = 1; at < items.size(); ++at)
+        call.arguments.push_back(argumentOf(*call.method, items[at]));
+    checkWhole(call);
+    return call;
+}
+
+std::string textOf(MethodCall const& call)
+{
+    std::string text = call.method->name;
+    for (MethodCall::Argument const& argument : call.arguments)
+        text += fmt::format(",{}:{}:{}", argument.parameter->name, argument.parameter->type,
+                            argument.value);
+    return text;
+}
+
+std::string valueOf(MethodCall const& call, std::string_view name)
+{
+    auto const found =
+        std::find_if(call.arguments.begin(), call.arguments.end(),
+                     [name](auto const& argument) { return argument.parameter->name == name; });
+    return found == call.arguments.end() ? "" : found->value;
+}
+
+std::string dangerOf(MethodCall const& call)
+{
+    bool const deletes = std::string_view(call.method->name) == "UserDel";
+    return deletes && valueOf(call, "UserName") == "root" ? "delete the account root" : "";
+}
+
+} // namespace mihost

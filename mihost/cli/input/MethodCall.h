@@ -1,0 +1,55 @@
+#ifndef MIHOST_CLI_INPUT_METHODCALL_H
+#define MIHOST_CLI_INPUT_METHODCALL_H
+
+#include "mihost/cli/catalogue/Catalogue.h"
+
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/** A call that was checked value by value. */
+struct MethodCall {
+    struct Argument {
+        Parameter const* parameter;
+        std::string value; // as in the text form
+    };
+
+    Method const* method;
+    std::vector<Argument> arguments; // in the order given; commands are built in it
+};
+
+/** What stands in a secret's place where it is to be asked for. */
+constexpr char toBeAsked[] = "-";
+
+/** Asks for a value that is not to stand on the command line; gets the parameter's name. */
+using AskSecret = std::function<std::string(std::string const& name)>;
+
+/**
+ * A call from "NAME=VALUE" words. A password given as "-" is asked for.
+ *
+ * @throws Failure (BadUsage) naming what is wrong and what would be right
+ */
+MethodCall parseCall(std::string const& method, std::vector<std::string> const& assignments,
+                     AskSecret const& ask);
+
+/** Whether property 74 only stores this text, as the empty one and that of a fresh tree. */
+bool callsNothing(std::string const& text);
+
+/** A call from its text form. @throws Failure (BadUsage) as above */
+MethodCall takeApart(std::string const& text);
+
+/** The text form, as property 74 takes it. */
+std::string textOf(MethodCall const& call);
+
+/** The value of a parameter, empty where it is not given. */
+std::string valueOf(MethodCall const& call, std::string_view name);
+
+/** What must be confirmed before it is carried out; empty for nothing. */
+std::string dangerOf(MethodCall const& call);
+
+} // namespace mihost
+
+#endif

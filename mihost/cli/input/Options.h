@@ -1,0 +1,25 @@
+#ifndef MIHOST_CLI_INPUT_OPTIONS_H
+#define MIHOST_CLI_INPUT_OPTIONS_H
+
+#include <string>
+
+namespace mihost
+{
+
+/** What stands before the command and holds for all of them. */
+struct Options {
+    std::string plugin;  // empty for the one that was installed with this program
+    std::string trace;   // empty for none, "-" for standard error
+    std::string overlay; // a folder to lay over the sandbox; empty for none
+    bool sandbox = false;
+    bool json = false;
+    bool showSecrets = false;
+    bool yes = false; // do without asking
+    bool timing = false;
+    unsigned int lockTimeout = 60; // seconds to wait for another mihost that changes the machine
+    bool noAccel = false;          // every command of the plug-in is run
+};
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,21 @@
+#ifndef MIHOST_CLI_INPUT_VALUETEXT_H
+#define MIHOST_CLI_INPUT_VALUETEXT_H
+
+#include "host/PropertyValue.h"
+#include "mihost/cli/catalogue/Catalogue.h"
+
+#include <string>
+
+namespace mihost
+{
+
+/**
+ * A value of the property's kind, from what a person writes.
+ *
+ * @throws Failure (BadUsage) saying which form is right, or what may not stand in it
+ */
+IC::PropertyValue parseValue(Property const& property, std::string const& text);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,37 @@
+#ifndef MIHOST_CLI_OUTPUT_CATALOGUETEXT_H
+#define MIHOST_CLI_OUTPUT_CATALOGUETEXT_H
+
+#include "mihost/cli/catalogue/Catalogue.h"
+#include "mihost/cli/output/Json.h"
+#include "mihost/cli/output/TextTable.h"
+
+#include <string>
+#include <vector>
+
+/** The catalogue as text for people, as JSON, and as the reference documents. */
+namespace mihost
+{
+
+std::vector<std::string> kindLines(NodeKind const& kind, Room const& room);
+std::vector<std::string> methodLines(Method const& method, Room const& room);
+std::vector<std::string> methodListLines(Room const& room);
+
+Json toJson(NodeKind const& kind);
+Json toJson(Method const& method);
+
+/** docs/properties.md and docs/methods.md, word for word. */
+std::string propertiesDocument();
+std::string methodsDocument();
+
+/** A property's kind with its unit, such as "number, KiB". */
+std::string typeText(Property const& property);
+
+/** What is known of a property beyond its kind: "live, acts". */
+std::string traitsText(Property const& property);
+
+/** How a value of this form is written. */
+char const* formName(Form form);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,62 @@
+#ifndef MIHOST_CLI_OUTPUT_NODEVIEW_H
+#define MIHOST_CLI_OUTPUT_NODEVIEW_H
+
+#include "host/MutableNode.h"
+#include "mihost/cli/catalogue/Catalogue.h"
+
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/** One property of a node, with what the catalogue knows of it. */
+struct PropertyView {
+    unsigned int id;
+    Property const* row; // null for a property that the catalogue does not know
+    IC::PropertyValue value;
+    bool hidden;         // a secret that is not to be shown
+    std::string unknown; // why the plug-in could not read it; empty if it could
+};
+
+struct NodeView {
+    IC::MutableNode const* node;
+    std::vector<PropertyView> properties; // by id
+};
+
+/** Whether secrets are to be shown. */
+enum class Secrets { Hide, Show };
+
+/** Everything that is stored, and what answers only live. */
+NodeView storedView(IC::MutableNode const& node, Secrets secrets);
+
+/** Every property read anew through the node; those that do not answer are left out. */
+NodeView liveView(IC::MutableNode const& node, Secrets secrets);
+
+/**
+ * Reads the named properties anew through the node.
+ *
+ * @param names  ids or catalogue names
+ * @throws Failure for a property that the node does not have or that does not answer
+ */
+NodeView liveView(IC::MutableNode const& node, std::vector<std::string> const& names,
+                  Secrets secrets);
+
+/** A property by id or catalogue name. @throws Failure (NotFound) naming those that there are */
+unsigned int propertyId(IC::MutableNode const& node, std::string const& name);
+
+/** The value as a person reads it, "-" if it is unknown; not yet safe for a terminal. */
+std::string valueText(PropertyView const& property);
+
+/** Notes that an unknown value is shown. valueText does so, too. */
+void noteUnknown(PropertyView const& property);
+
+/** The warning for all unknown values shown since the last call; empty for none. */
+std::string takeUnknownWarning();
+
+/** The property's catalogue name, or its id where it has none. */
+std::string nameOf(PropertyView const& property);
+
+} // namespace mihost
+
+#endif

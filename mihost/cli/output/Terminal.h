@@ -1,0 +1,35 @@
+#ifndef MIHOST_CLI_OUTPUT_TERMINAL_H
+#define MIHOST_CLI_OUTPUT_TERMINAL_H
+
+#include <string>
+
+/** The terminal that a person sits at, where there is one. */
+namespace mihost::terminal
+{
+
+/** Columns of the terminal behind a descriptor; 0 where it is none. */
+unsigned int width(int descriptor);
+
+/** Whether the cursor may be moved and colours set there: NO_COLOR and TERM=dumb forbid colours. */
+bool takesControls(int descriptor);
+bool takesColours(int descriptor);
+
+/** Whether the user's code set has the signs that lines and cuts are drawn with. */
+bool hasUnicode();
+
+/** Whether somebody can be asked: standard input is a terminal. */
+bool canAsk();
+
+/** Asks on standard error. @return whether the answer was yes */
+bool confirm(std::string const& question);
+
+/**
+ * Reads one line from standard input; at a terminal after a prompt and without showing it.
+ *
+ * @throws Failure where there is none
+ */
+std::string readSecret(std::string const& prompt);
+
+} // namespace mihost::terminal
+
+#endif

@@ -1,0 +1,44 @@
+#ifndef MIHOST_CLI_PLUGIN_ACCELERATORLOADER_H
+#define MIHOST_CLI_PLUGIN_ACCELERATORLOADER_H
+
+#include "mihost/cli/output/Json.h"
+
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/**
+ * From its making to the end of the process, commands are answered by the accelerator if it can.
+ * Without its library, which is loaded only now, every command is run.
+ */
+class Accelerator
+{
+public:
+    /** How often a command was asked for. */
+    struct Row {
+        std::string command;
+        unsigned long answered; // in the process
+        unsigned long run;
+        std::string reason; // why it was last run; empty if it never was
+    };
+
+    Accelerator();
+
+    /** In the library's order, without the commands that were never asked for. */
+    std::vector<Row> rows() const;
+
+private:
+    void* library_;
+    std::string problem_; // why it could not be loaded
+};
+
+/** For people to read. */
+std::string answersText(std::vector<Accelerator::Row> const& rows);
+
+Json toJson(std::vector<Accelerator::Row> const& rows);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,89 @@
+#ifndef MIHOST_CLI_PLUGIN_COMMANDTAP_H
+#define MIHOST_CLI_PLUGIN_COMMANDTAP_H
+
+#include <cstdio>
+#include <string>
+#include <vector>
+
+/**
+ * The program's own popen and pclose stand in front of libc's (see popen.cpp). Commands that the
+ * plug-in starts therefore pass through here. They run just as they are given, but with no standard
+ * input, so that none can eat what is meant for this program, and with their standard error kept
+ * apart from it.
+ *
+ * All state is the process's, as popen itself is. One thread at a time.
+ */
+namespace mihost::commandTap
+{
+
+/** A command line that was run, the beginning of its standard output (see BoundedText), its end. */
+struct RunCommand {
+    std::string line;
+    std::string output;
+    int status; // as from wait; 0 while the plug-in has its stream open
+};
+
+/** What runs the commands that pass through; libc's own two from the start. */
+struct Runner {
+    using Open = std::FILE*(char const* line, char const* mode);
+    using Close = int(std::FILE* stream);
+
+    Open* open;
+    Close* close;
+};
+
+void setRunner(Runner const& runner);
+
+/** Decides whether a command line may run. One that may not cannot be started: popen yields null.
+ */
+using Guard = bool(char const* line);
+
+/** @param guard  asked about each command line of the plug-in; null for nobody */
+void setGuard(Guard* guard);
+
+/** Told of each command line before it starts. */
+class Listener
+{
+public:
+    virtual ~Listener() = default;
+    virtual void commandStarts(char const* line) = 0;
+};
+
+/** @param listener  stays the caller's; null for nobody */
+void setListener(Listener* listener);
+
+/** How many commands were started so far. */
+unsigned int count();
+
+/**
+ * Notes every command, and its output as the plug-in reads it. What the plug-in leaves unread is
+ * read when it closes the stream, so each command runs to its end.
+ */
+class Recording
+{
+public:
+    Recording();
+    ~Recording();
+    Recording(Recording const&) = delete;
+    Recording& operator=(Recording const&) = delete;
+
+    std::vector<RunCommand> commands() const;
+};
+
+/** The beginning of what commands wrote to their standard error since the last call. */
+std::string takeStandardError();
+
+/**
+ * Runs a command line of the program's own.
+ *
+ * @return the beginning of what it prints; empty if it cannot start
+ */
+std::string outputOf(std::string const& line);
+
+/** Where popen and pclose come in. */
+std::FILE* open(char const* line, char const* mode);
+int close(std::FILE* stream);
+
+} // namespace mihost::commandTap
+
+#endif

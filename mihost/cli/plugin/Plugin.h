@@ -1,0 +1,62 @@
+#ifndef MIHOST_CLI_PLUGIN_PLUGIN_H
+#define MIHOST_CLI_PLUGIN_PLUGIN_H
+
+#include "host/ManagementInterface.h"
+
+#include <string>
+
+namespace mihost
+{
+
+/** The plug-in's file as named, or where it stands beside this program, or its plain name. */
+std::string pluginFile(std::string const& named);
+
+/** A loaded plug-in; going away, it unloads what it started and then the library. */
+class Plugin
+{
+public:
+    /**
+     * Loads the library and asks it for its interface.
+     *
+     * @param file  a path, or a plain name for the loader to look up
+     * @throws Failure naming the file and the reason
+     */
+    explicit Plugin(std::string const& file);
+    ~Plugin();
+    Plugin(Plugin const&) = delete;
+    Plugin& operator=(Plugin const&) = delete;
+
+    /** Builds the tree. @throws Failure where the plug-in says that it could not */
+    void start();
+
+    bool started() const
+    {
+        return started_;
+    }
+    IC::ManagementInterface& interface()
+    {
+        return *interface_;
+    }
+
+    /** The status object, as OpenMI handed it out; may be null. */
+    IC::Error const* status() const
+    {
+        return status_;
+    }
+
+    /** The file that was loaded, as an absolute path. */
+    std::string path() const;
+
+    /** The name that the library gives itself, empty where it gives none. */
+    std::string soname() const;
+
+private:
+    void* library_;
+    IC::ManagementInterface* interface_ = nullptr;
+    IC::Error* status_ = nullptr; // what it comes to hold, initialize returns
+    bool started_ = false;
+};
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,43 @@
+#ifndef MIHOST_CLI_PLUGIN_TRACE_H
+#define MIHOST_CLI_PLUGIN_TRACE_H
+
+#include "mihost/runtime/Sinks.h"
+
+#include <cstdio>
+#include <string>
+
+namespace mihost
+{
+
+/** The --trace file. Notes nodes that come and go for as long as it lives. */
+class Trace
+{
+public:
+    /**
+     * @param file  a path, or "-" for standard error
+     * @throws Failure where the file cannot be opened for writing
+     */
+    explicit Trace(std::string const& file);
+    ~Trace();
+    Trace(Trace const&) = delete;
+    Trace& operator=(Trace const&) = delete;
+
+    /** Takes the log messages. */
+    LogSink& sink()
+    {
+        return lines_;
+    }
+
+    /** @throws Failure where something could not be written */
+    void finish();
+
+private:
+    std::string file_;
+    std::FILE* stream_;
+    LineWriter writer_;
+    JsonLines lines_;
+};
+
+} // namespace mihost
+
+#endif

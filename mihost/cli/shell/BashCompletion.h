@@ -1,0 +1,32 @@
+#ifndef MIHOST_CLI_SHELL_BASHCOMPLETION_H
+#define MIHOST_CLI_SHELL_BASHCOMPLETION_H
+
+#include "mihost/cli/shell/Completion.h"
+
+#include <string>
+#include <string_view>
+
+namespace mihost
+{
+
+/**
+ * What bash's completion script reads: a line that says words, files or folders, then a line for
+ * each text that may replace what readline replaces of the word being typed. bash inserts them as
+ * they are, so they are quoted.
+ *
+ * @param line    the command line up to the cursor, the program's name included
+ * @param breaks  bash's COMP_WORDBREAKS
+ */
+std::string bashCompletionText(std::string const& line, std::string const& breaks,
+                               NodeNames const& names, CommandTable const& table);
+
+/**
+ * The text as bash reads it back, whatever it holds but control characters.
+ *
+ * @param quote  the quote that is open before it and is closed after it, ' or "; NUL for none
+ */
+std::string quotedForBash(std::string_view text, char quote);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,85 @@
+#ifndef MIHOST_CLI_SHELL_LINEEDITOR_H
+#define MIHOST_CLI_SHELL_LINEEDITOR_H
+
+#include "mihost/cli/system/SignalWaiter.h"
+
+#include <cstdio>
+#include <functional>
+#include <histedit.h>
+#include <memory>
+#include <optional>
+#include <string>
+#include <termios.h>
+#include <vector>
+
+namespace mihost
+{
+
+/** Reads lines that a person types, with editing, history and completion. */
+class LineEditor
+{
+public:
+    /** What the word that a line ends in may become; each goes on where it ends in ':' or '='. */
+    using Completer = std::function<std::vector<std::string>(std::string const& line)>;
+
+    enum class End { Line, Interrupted, Finished };
+
+    /** @param prompt  must outlive the editor */
+    LineEditor(char const* prompt, Completer completer);
+    ~LineEditor();
+    LineEditor(LineEditor const&) = delete;
+    LineEditor& operator=(LineEditor const&) = delete;
+
+    /** Reads a line, without its end. */
+    End read(std::string& line);
+
+    /** Puts a line into the history. */
+    void remember(std::string const& line);
+
+private:
+    static LineEditor& of(EditLine* editor);
+    static char* promptOf(EditLine* editor);
+    static int getCharacter(EditLine* editor, wchar_t* character);
+    static unsigned char completeWord(EditLine* editor, int key);
+
+    void obey(int signal);
+    unsigned char offer(std::vector<std::string> const& candidates, std::string const& typed);
+
+    struct CloseFile {
+        void operator()(std::FILE* file) const
+        {
+            std::fclose(file);
+        }
+    };
+    struct EndEditor {
+        void operator()(EditLine* editor) const
+        {
+            el_end(editor);
+        }
+    };
+    struct EndHistory {
+        void operator()(History* history) const
+        {
+            history_end(history);
+        }
+    };
+
+    std::optional<SignalWaiter> signals_; // while reading
+    bool interrupted_ = false;
+    std::string prompt_;
+    Completer completer_;
+    termios settings_{};                           // the terminal's, outside of reading
+    std::unique_ptr<std::FILE, CloseFile> screen_; // standard error, written piece by piece
+    std::unique_ptr<History, EndHistory> history_;
+    std::unique_ptr<EditLine, EndEditor> editor_;
+};
+
+/** Words side by side, with line ends; of very many only the first, and how many there are more. */
+std::string inColumns(std::vector<std::string> const& words, std::size_t width);
+
+/** What all candidates begin with. */
+std::string commonStart(std::vector<std::string> const& candidates);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,44 @@
+#ifndef MIHOST_CLI_SHELL_SHELL_H
+#define MIHOST_CLI_SHELL_SHELL_H
+
+#include "mihost/cli/input/Command.h"
+#include "mihost/cli/plugin/Session.h"
+
+#include <istream>
+#include <string>
+
+namespace mihost
+{
+
+/** Runs commands line by line on the session's plug-in. */
+class Shell
+{
+public:
+    /** @param table  the commands that lines may name; must outlive this */
+    Shell(Session& session, CommandTable const& table);
+
+    /** What a person types, until the end of input. */
+    void runInteractively();
+
+    /**
+     * A script. Lines that fail are told with their number.
+     *
+     * @param keepGoing  whether the script goes on behind a line that fails
+     * @throws Failure of the first line that fails, unless it is to go on
+     */
+    void runScript(std::istream& script, bool keepGoing);
+
+private:
+    /** @return whether the line was the last one */
+    bool runLine(std::string const& line);
+    void tellAsJson(Failure const& failure);
+    std::vector<std::string> candidatesFor(std::string const& line);
+
+    Session& session_;
+    CommandTable const& table_;
+    Options const options_; // what each line starts from
+};
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,46 @@
+#ifndef MIHOST_CLI_SYSTEM_DRAINEDPIPE_H
+#define MIHOST_CLI_SYSTEM_DRAINEDPIPE_H
+
+#include "mihost/cli/system/BoundedText.h"
+#include "mihost/sandbox/Descriptor.h"
+
+#include <mutex>
+#include <string>
+#include <thread>
+
+namespace mihost
+{
+
+/** A pipe that never fills up: a thread reads what is written and keeps its beginning. */
+class DrainedPipe
+{
+public:
+    /** @throws std::system_error if no pipe or no thread can be had */
+    DrainedPipe();
+    ~DrainedPipe();
+    DrainedPipe(DrainedPipe const&) = delete;
+    DrainedPipe& operator=(DrainedPipe const&) = delete;
+
+    int writeEnd() const
+    {
+        return writeEnd_.get();
+    }
+
+    /** The beginning of what was written since the last call. */
+    std::string take();
+
+private:
+    void drain();
+    void readWhatIsThere();
+
+    Descriptor readEnd_;
+    Descriptor writeEnd_;
+    Descriptor stop_;
+    std::mutex mutex_; // of reading and of the text
+    BoundedText text_;
+    std::thread thread_;
+};
+
+} // namespace mihost
+
+#endif

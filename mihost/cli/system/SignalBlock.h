@@ -1,0 +1,29 @@
+#ifndef MIHOST_CLI_SYSTEM_SIGNALBLOCK_H
+#define MIHOST_CLI_SYSTEM_SIGNALBLOCK_H
+
+#include <csignal>
+
+namespace mihost
+{
+
+/**
+ * Holds signals back for as long as it lives: a change to the system that has begun is finished. A
+ * terminal sends its signals to the commands as well, and a shell undoes a mask, so commands
+ * started meanwhile ignore them.
+ */
+class SignalBlock
+{
+public:
+    SignalBlock();
+    ~SignalBlock();
+    SignalBlock(SignalBlock const&) = delete;
+    SignalBlock& operator=(SignalBlock const&) = delete;
+
+private:
+    sigset_t before_;
+    struct sigaction actionsBefore_[3]{};
+};
+
+} // namespace mihost
+
+#endif

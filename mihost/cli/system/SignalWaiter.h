@@ -1,0 +1,46 @@
+#ifndef MIHOST_CLI_SYSTEM_SIGNALWAITER_H
+#define MIHOST_CLI_SYSTEM_SIGNALWAITER_H
+
+#include <csignal>
+#include <poll.h>
+#include <utility>
+#include <vector>
+
+namespace mihost
+{
+
+/**
+ * For as long as it lives, SIGINT and the other signals named do nothing and come only in wait: so
+ * none slips in between asking whether it came and waiting for it.
+ */
+class SignalWaiter
+{
+public:
+    explicit SignalWaiter(std::vector<int> const& others = {});
+    ~SignalWaiter();
+    SignalWaiter(SignalWaiter const&) = delete;
+    SignalWaiter& operator=(SignalWaiter const&) = delete;
+
+    enum class Event { Ready, Timeout, Signal };
+
+    /**
+     * @param file     what poll is to look at; ready also where it has something unasked to tell
+     * @param seconds  how long; negative for ever
+     */
+    Event wait(pollfd file, double seconds);
+
+    /** The one that the last wait ended by. */
+    int signal() const
+    {
+        return signal_;
+    }
+
+private:
+    sigset_t before_;
+    std::vector<std::pair<int, struct sigaction>> actionsBefore_;
+    int signal_ = 0;
+};
+
+} // namespace mihost
+
+#endif

@@ -10,6 +10,7 @@
 //
 // snmpd runs in a network of its own, of which nothing stays either.
 
+#include "TestPaths.h"
 #include "bench/peers/Loopback.h"
 #include "bench/support/MadeUp.h"
 #include "bench/support/Samples.h"

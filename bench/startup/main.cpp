@@ -14,6 +14,7 @@
 // bare and plug-in take themselves, without that of their children; then what reading a log
 // entry takes once the plug-in has started.
 
+#include "TestPaths.h"
 #include "bench/support/MadeUp.h"
 #include "bench/support/Samples.h"
 #include "bench/support/Table.h"

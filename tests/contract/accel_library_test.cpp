@@ -1,5 +1,6 @@
 // The built library, brought to a program in either of the two ways.
 
+#include "TestPaths.h"
 #include "tests/support/Program.h"
 #include "tests/support/ScratchFolder.h"
 

@@ -1,5 +1,6 @@
 // mihost check: that the plug-in passes, and that plug-ins broken on purpose are found and named.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 #include "tests/support/ScratchFolder.h"

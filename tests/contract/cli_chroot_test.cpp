@@ -1,5 +1,6 @@
 // The sandbox in a chroot: a root that is not a mount point, without /proc and /dev.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 #include "tests/support/ScratchFolder.h"

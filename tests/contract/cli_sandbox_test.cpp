@@ -1,5 +1,6 @@
 // The --sandbox option: what it shows, and that the machine stays as it is.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 #include "tests/support/ScratchFolder.h"

@@ -1,3 +1,4 @@
+#include "TestPaths.h"
 #include "tests/support/Program.h"
 
 #include <gtest/gtest.h>

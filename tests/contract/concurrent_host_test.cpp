@@ -2,6 +2,7 @@
 // administers the machine. script/concurrency lets it run for minutes; says most when it is built
 // with the thread sanitizer.
 
+#include "TestPaths.h"
 #include "nodes/ids.h"
 #include "tests/support/ErrorCount.h"
 #include "tests/support/Libc.h"

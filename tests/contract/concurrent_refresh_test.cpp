@@ -1,6 +1,7 @@
 // Users and groups refreshed from several threads while others read. Says most when it is built
 // with the thread sanitizer.
 
+#include "TestPaths.h"
 #include "nodes/ids.h"
 #include "tests/support/ErrorCount.h"
 #include "tests/support/Libc.h"

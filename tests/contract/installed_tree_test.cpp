@@ -1,5 +1,6 @@
 // What `cmake --install` puts in place, used by the page that tells how to write a host.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 #include "tests/support/ScratchFolder.h"

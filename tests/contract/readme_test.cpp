@@ -1,5 +1,6 @@
 // The session that the README shows is one that the program holds.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 

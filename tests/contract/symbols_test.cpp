@@ -2,6 +2,7 @@
 //
 // To write the lists anew, on purpose only: script/symbols --update
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 

@@ -1,5 +1,6 @@
 // The programs of docs/writing-a-host.md: they are in the page, and do what it says.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 

@@ -2,6 +2,7 @@
 // must hold each time: the plug-in lives, nothing stays open or locked, and the next start is
 // whole.
 
+#include "TestPaths.h"
 #include "frame/OsSwMI.h"
 #include "host/OpenMI.h"
 #include "nodes/ids.h"

@@ -1,5 +1,6 @@
 // libmihostcheck in hosts that are right, and in hosts that are wrong in one way each.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 #include "tests/support/ScratchFolder.h"

@@ -1,5 +1,6 @@
 // date in locales and time zones that the machine does not have yet.
 
+#include "TestPaths.h"
 #include "tests/support/BothWays.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

@@ -1,5 +1,6 @@
 // mihost shows and logs with the accelerator what it does without.
 
+#include "TestPaths.h"
 #include "tests/support/KernelModules.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"

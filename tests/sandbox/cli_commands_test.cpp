@@ -1,5 +1,6 @@
 // The program itself, run on fixture machines as a person or a script runs it.
 
+#include "TestPaths.h"
 #include "mihost/sandbox/Sandbox.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"

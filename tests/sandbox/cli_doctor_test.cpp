@@ -1,5 +1,6 @@
 // What the doctor finds on machines that lack one thing or another, and that its advice helps.
 
+#include "TestPaths.h"
 #include "tests/support/KernelModules.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

@@ -1,5 +1,6 @@
 // One mihost at a time changes the machine.
 
+#include "TestPaths.h"
 #include "mihost/cli/change/ChangeLock.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"

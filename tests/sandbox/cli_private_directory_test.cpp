@@ -1,5 +1,6 @@
 // The directory that mihost works in, which may hold a password hash: that nothing of it stays.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

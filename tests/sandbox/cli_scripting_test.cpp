@@ -1,5 +1,6 @@
 // mihost among other programs: what comes before and behind it in a pipe, and what JSON they read.
 
+#include "TestPaths.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 

@@ -1,5 +1,6 @@
 // mihost started with standard files missing: what it opens itself must not become one of them.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

@@ -1,5 +1,6 @@
 // The file that --trace writes: who can read it, and what it never replaces.
 
+#include "TestPaths.h"
 #include "mihost/sandbox/Descriptor.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

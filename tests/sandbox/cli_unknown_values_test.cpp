@@ -1,5 +1,6 @@
 // What the plug-in could not read is shown as unknown, not as zero.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

@@ -1,5 +1,6 @@
 // The program reads back what a change did, and reports what differs from the request.
 
+#include "TestPaths.h"
 #include "mihost/sandbox/Sandbox.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"

@@ -1,6 +1,7 @@
 // Completion as a person at a shell uses it: what Tab inserts is what mihost gets, and nothing
 // runs.
 
+#include "TestPaths.h"
 #include "tests/support/Machine.h"
 #include "tests/support/TerminalRun.h"
 

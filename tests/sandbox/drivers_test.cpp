@@ -1,5 +1,6 @@
 // Kernel modules as lsmod and modinfo really tell of them.
 
+#include "TestPaths.h"
 #include "nodes/ids.h"
 #include "tests/support/Libc.h"
 #include "tests/support/Lines.h"

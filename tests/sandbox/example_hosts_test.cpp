@@ -1,5 +1,6 @@
 // The example host that changes the machine.
 
+#include "TestPaths.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 

@@ -1,5 +1,7 @@
 #include "tests/support/Machine.h"
 
+#include "TestPaths.h"
+
 #include "mihost/sandbox/Sandbox.h"
 
 #include <algorithm>

@@ -1,11 +1,15 @@
 #include "tests/support/Plugin.h"
 
+#include "TestPaths.h"
+
 #include "host/OpenMI.h"
 #include "nodes/ids.h"
 
 #include <algorithm>
 #include <dlfcn.h>
 #include <stdexcept>
+
+Plugin::Plugin() : Plugin(PLUGIN_FILE) {}
 
 Plugin::Plugin(char const* file) : library_(dlopen(file, RTLD_NOW | RTLD_LOCAL))
 {

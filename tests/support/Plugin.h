@@ -17,8 +17,11 @@
 class Plugin
 {
 public:
-    /** @throws std::runtime_error where the library cannot be loaded */
-    explicit Plugin(char const* file = PLUGIN_FILE);
+    /** The plug-in of this build. @throws std::runtime_error if it cannot be loaded */
+    Plugin();
+
+    /** Another library. @throws as above */
+    explicit Plugin(char const* file);
     ~Plugin();
     Plugin(Plugin const&) = delete;
     Plugin& operator=(Plugin const&) = delete;

@@ -1,5 +1,7 @@
 #include "tests/support/Program.h"
 
+#include "TestPaths.h"
+
 #include <array>
 #include <cstdio>
 #include <memory>

@@ -1,6 +1,8 @@
 #ifndef TESTS_SUPPORT_TERMINALRUN_H
 #define TESTS_SUPPORT_TERMINALRUN_H
 
+#include "TestPaths.h"
+
 #include <string>
 #include <sys/types.h>
 #include <vector>

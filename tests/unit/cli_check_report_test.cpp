@@ -1,3 +1,4 @@
+#include "TestPaths.h"
 #include "mihost/cli/check/Report.h"
 #include "mihost/cli/check/Symbols.h"
 

@@ -1,3 +1,4 @@
+#include "TestPaths.h"
 #include "sysdata/groupInfo_linux.h"
 
 #include "sysdata/minMaxId.h"

@@ -1,3 +1,4 @@
+#include "TestPaths.h"
 #include "nodes/GroupNode.h"
 
 #include "nodes/values.h"

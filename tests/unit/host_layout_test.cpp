@@ -1,5 +1,6 @@
 // What a plug-in built against these headers relies on in memory.
 
+#include "TestPaths.h"
 #include "frame/OsSwMI.h"
 #include "nodes/GroupNode.h"
 #include "nodes/LogEntryNode.h"

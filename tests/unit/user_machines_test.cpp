@@ -1,5 +1,6 @@
 // What is listed on the fixture machines in tests/machines/users-*.
 
+#include "TestPaths.h"
 #include "sysdata/userInfo_linux.h"
 
 #include "tests/support/Libc.h"

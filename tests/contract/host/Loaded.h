@@ -1,6 +1,7 @@
 #ifndef TESTS_CONTRACT_HOST_LOADED_H
 #define TESTS_CONTRACT_HOST_LOADED_H
 
+#include "TestPaths.h"
 #include "frame/OsSwMI.h"
 #include "tests/contract/host/RecordingHost.h"
 #include "tests/support/Libc.h"

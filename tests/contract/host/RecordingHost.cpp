@@ -1,5 +1,6 @@
 #include "tests/contract/host/RecordingHost.h"
 
+#include "TestPaths.h"
 #include "host/Mutex.h"
 #include "host/VXLogger.h"
 #include "tests/support/Shown.h"

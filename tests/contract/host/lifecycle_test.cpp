@@ -1,5 +1,6 @@
 // From the loading of the library to its closing.
 
+#include "TestPaths.h"
 #include "tests/contract/host/Loaded.h"
 
 #include "host/OpenMI.h"

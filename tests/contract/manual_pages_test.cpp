@@ -50,9 +50,9 @@ TEST_P(ManualPage, HoldsToTheMacros)
             ADD_FAILURE() << note;
 }
 
-char const* const pageNames[] = {"Mihost", "Plugin", "HostCheck"};
+char const* const pageNames[] = {"Mihost", "Plugin", "HostCheck", "Ansible"};
 
-INSTANTIATE_TEST_SUITE_P(All, ManualPage, testing::Values(MIHOST_PAGE, PLUGIN_PAGE, HOSTCHECK_PAGE),
+INSTANTIATE_TEST_SUITE_P(All, ManualPage, testing::Values(MIHOST_PAGE, PLUGIN_PAGE, HOSTCHECK_PAGE, ANSIBLE_PAGE),
                          [](auto const& which) { return std::string(pageNames[which.index]); });
 
 TEST(ManualPageOfMihost, TellsOfEveryOption)

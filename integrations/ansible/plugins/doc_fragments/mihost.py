@@ -1,0 +1,41 @@
+from __future__ import absolute_import, division, print_function
+
+__metaclass__ = type
+
+
+class ModuleDocFragment(object):
+    """Options, attributes and return values that the modules share."""
+
+    DOCUMENTATION = r'''
+options:
+  mihost:
+    description:
+      - The program on the target, as a name that is looked up in the PATH or as an absolute path.
+    type: str
+    default: mihost
+requirements:
+  - mihost on the target
+'''
+
+    CHANGE = r'''
+options:
+  lock_timeout:
+    description:
+      - How many seconds to wait while another mihost is changing the target.
+      - The default is that of mihost, 60 seconds.
+    type: int
+attributes:
+  check_mode:
+    description:
+      - The change really runs, in a sandbox on the target which is gone afterwards.
+      - What the tools refuse there fails the task with their own words.
+      - Each task has a sandbox of its own, so a task that relies on the change of an earlier task
+        fails in check mode.
+    support: full
+  diff_mode:
+    description: The lines of the files that change, with password hashes hidden.
+    support: full
+notes:
+  - Changes need root on the target, as C(become: true) gives it.
+  - With C(pipelining = True) in the configuration each task takes one round trip over ssh.
+'''

@@ -1,0 +1,38 @@
+"""Turns mihost's nodes into native types keyed by name."""
+
+from __future__ import absolute_import, division, print_function
+
+__metaclass__ = type
+
+# The kinds with many nodes: the key of the result, and the property that names a node.
+LISTS = dict(
+    driver=('drivers', 'driver_name'),
+    user=('users', 'user_name'),
+    group=('groups', 'group_name'),
+)
+SINGLE = ('computer', 'os')
+
+
+def values_of(node):
+    """The properties of a node; a value that is hidden or unknown is None."""
+    values = {}
+    for key, entry in node['properties'].items():
+        name = entry.get('name') or key
+        values[name.replace('-', '_')] = entry['value']
+    return values
+
+
+def native(nodes):
+    """What the nodes say, without the nodes that say nothing about the machine."""
+    result = {}
+    for node in nodes:
+        kind = node['kind']
+        values = values_of(node)
+        if kind in SINGLE:
+            result[kind] = values
+        elif kind in LISTS:
+            key, name = LISTS[kind]
+            result.setdefault(key, {})[values[name]] = values
+        elif kind == 'log-entry':
+            result.setdefault('log', []).append(values)
+    return result

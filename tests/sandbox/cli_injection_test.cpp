@@ -194,6 +194,17 @@ TEST_F(InjectionInto, AnyOptionOfTheProgramReachesNoShell)
     expectHarmless(machine::ran());
 }
 
+TEST_F(InjectionInto, AnyFileOfMetricsReachesNoShell)
+{
+    for (std::string const& word : hostileWords()) {
+        EXPECT_EQ(mihostRun({"metrics", word}).code, 2) << word;
+        mihostRun({"metrics", "--output", word}); // some are names of files
+    }
+    for (std::string const& line : machine::ran())
+        EXPECT_EQ(line.find("pwned"), std::string::npos) << line;
+    EXPECT_FALSE(std::filesystem::exists(mark));
+}
+
 TEST_F(InjectionInto, AnArgumentWithALineEndReachesNoShell)
 {
     for (Lines const& arguments :

@@ -38,8 +38,8 @@ TEST(MihostInAPipe, EndsQuietlyWhenItsReaderGoes)
     makeMachine(1200); // more lines than fit into a pipe
     for (char const* arguments :
          {"tree", "--json tree", "tree --all", "list users", "--json list users", "get os",
-          "properties", "methods --markdown", "--help", "doctor || true", "shell < <(yes tree)",
-          "watch os os-name --interval 0"}) {
+          "properties", "methods --markdown", "--help", "doctor || true", "metrics",
+          "shell < <(yes tree)", "watch os os-name --interval 0"}) {
         Outcome const outcome = bash("{ $mihost " + std::string(arguments) + "; } | head -c 1");
         EXPECT_EQ(outcome.code, 0) << arguments;
         EXPECT_EQ(outcome.err, "") << arguments;
@@ -62,7 +62,7 @@ TEST(MihostInAPipe, TellsThatItsOutputCannotBeWritten)
 {
     makeMachine();
     for (char const* arguments : {"tree", "--json list users", "get os 108", "--help", "--version",
-                                  "doctor", "methods", "shell <<<'get os 108'"}) {
+                                  "doctor", "methods", "metrics", "shell <<<'get os 108'"}) {
         Outcome const outcome = bash("$mihost " + std::string(arguments) + " >/dev/full");
         EXPECT_EQ(outcome.code, 2) << arguments;
         EXPECT_NE(outcome.err.find("cannot write the output: No space left on device\n"),

@@ -1,10 +1,11 @@
-#include "mihost/cli/commands/CommandRows.h"
+#include "mihost/cli/commands/makers.h"
 #include "mihost/cli/output/NodeTable.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/Stderr.h"
 
 #include <algorithm>
 #include <fmt/format.h>
+#include <fmt/ranges.h>
 
 namespace mihost
 {
@@ -26,9 +27,11 @@ class List : public Command
 public:
     void declare(CLI::App& app) override
     {
-        choices_.restrict(app.add_option("KIND", kind_, "what to list"), listNames())->required();
+        app.add_option("KIND", kind_, fmt::format("{}", fmt::join(listNames(), ", ")))
+            ->required()
+            ->check(CLI::IsMember(listNames()));
         app.add_option("--columns", columns_,
-                       "show these properties, separated by commas; also "
+                       "properties to show, with commas between them; also "
                        "id, index, status, description")
             ->delimiter(',');
     }
@@ -59,15 +62,9 @@ private:
 
 } // namespace
 
-CommandRow const commandRows::list{
-    "list",
-    "show one kind of node as a table",
-    newCommand<List>,
-    {
-        {"mihost list users", "the user accounts"},
-        {"mihost list drivers --columns driver-name,driver-version",
-         "two columns of the kernel modules"},
-    },
-};
+std::unique_ptr<Command> commandMakers::list()
+{
+    return std::make_unique<List>();
+}
 
 } // namespace mihost

@@ -340,9 +340,16 @@ std::vector<Need> log()
 
 std::vector<Need> diagnose()
 {
+    std::vector<Need> all = surroundings();
+    for (Need const& need : diagnoseMachine())
+        all.push_back(need);
+    return all;
+}
+
+std::vector<Need> diagnoseMachine()
+{
     std::vector<Need> all;
-    for (auto const part :
-         {surroundings, commandLines, groupOption, accounts, release, modules, log})
+    for (auto const part : {commandLines, groupOption, accounts, release, modules, log})
         for (Need const& need : part())
             all.push_back(need);
     return all;

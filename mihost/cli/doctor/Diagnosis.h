@@ -24,6 +24,9 @@ struct Need {
  */
 std::vector<Need> diagnose();
 
+/** As diagnose, without what depends on who runs the program: privileges and the locale. */
+std::vector<Need> diagnoseMachine();
+
 } // namespace mihost
 
 #endif

@@ -1,0 +1,35 @@
+#ifndef MIHOST_CLI_METRICS_METRICTEXT_H
+#define MIHOST_CLI_METRICS_METRICTEXT_H
+
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace mihost
+{
+
+/** One value of a time series. */
+struct Sample {
+    std::vector<std::pair<std::string, std::string>> labels;
+    double value;
+};
+
+/** Time series of one name. */
+struct Metric {
+    char const* name;
+    char const* unit; // the end of the name, such as "bytes"; "" for none
+    char const* help;
+    std::vector<Sample> samples;
+};
+
+/**
+ * The metrics as OpenMetrics text.
+ *
+ * It is the older text format of Prometheus as well, which node_exporter's textfile collector
+ * reads: every metric is a gauge, and what only OpenMetrics knows is a comment there.
+ */
+std::string metricText(std::vector<Metric> const& metrics);
+
+} // namespace mihost
+
+#endif

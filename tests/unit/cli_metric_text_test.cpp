@@ -1,0 +1,46 @@
+// Metrics as text that Prometheus reads.
+
+#include "mihost/cli/metrics/MetricText.h"
+
+#include <gtest/gtest.h>
+
+namespace
+{
+
+using mihost::metricText;
+
+TEST(MetricText, HasHelpTypeUnitAndSamples)
+{
+    EXPECT_EQ(metricText({{"mi_free_bytes", "bytes", "Free.", {{{}, 1024}}}}),
+              "# HELP mi_free_bytes Free.\n"
+              "# TYPE mi_free_bytes gauge\n"
+              "# UNIT mi_free_bytes bytes\n"
+              "mi_free_bytes 1024\n"
+              "# EOF\n");
+}
+
+TEST(MetricText, JoinsLabelsAndLeavesOutAMissingUnit)
+{
+    EXPECT_EQ(
+        metricText({{"mi_x", "", "X.", {{{{"a", "1"}, {"b", ""}}, 0.25}, {{{"a", "2"}}, 2}}}}),
+        "# HELP mi_x X.\n"
+        "# TYPE mi_x gauge\n"
+        "mi_x{a=\"1\",b=\"\"} 0.25\n"
+        "mi_x{a=\"2\"} 2\n"
+        "# EOF\n");
+}
+
+TEST(MetricText, EscapesWhatWouldEndALabel)
+{
+    std::string const text = metricText({{"x", "", "X.", {{{{"n", "a\"b\\c\nd\xff"}}, 1}}}});
+    // A byte that is not UTF-8 becomes \xff, whose backslash is escaped in turn.
+    EXPECT_NE(text.find("x{n=\"a\\\"b\\\\c\\nd\\\\xff\"} 1\n"), std::string::npos) << text;
+}
+
+TEST(MetricText, WritesWholeNumbersInFull)
+{
+    std::string const text = metricText({{"x", "", "X.", {{{}, 1795276425}, {{}, 68719476736}}}});
+    EXPECT_NE(text.find("x 1795276425\nx 68719476736\n"), std::string::npos) << text;
+}
+
+} // namespace

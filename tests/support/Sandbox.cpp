@@ -1,6 +1,7 @@
 #include "tests/support/Sandbox.h"
 
 #include "mihost/sandbox/Sandbox.h"
+#include "tests/support/OneByOne.h"
 
 #include <cstdlib>
 #include <gtest/gtest.h>
@@ -37,7 +38,7 @@ int runTestsInSandbox(int argc, char* argv[])
     setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
     setenv("LC_ALL", "C", 1);
     testing::InitGoogleTest(&argc, argv);
-    if (!testing::GTEST_FLAG(list_tests)) {
+    return runTestsOneByOne([] {
         if (auto const reason = mihost::enterSandbox()) {
             if (sandboxIsRequired()) {
                 std::cerr << "no sandbox: " << *reason << '\n';
@@ -46,6 +47,6 @@ int runTestsInSandbox(int argc, char* argv[])
             testing::UnitTest::GetInstance()->listeners().Append(
                 new SkipAll("no sandbox: " + *reason));
         }
-    }
-    return RUN_ALL_TESTS();
+        return RUN_ALL_TESTS();
+    });
 }

@@ -2,7 +2,7 @@
 #define TESTS_SUPPORT_SANDBOX_H
 
 /**
- * Runs the program's tests in a copy of this machine, and lists them without one.
+ * Runs each of the program's tests in a copy of this machine, and lists them without one.
  *
  * Where no copy can be had every test is skipped with the reason, or, with MI_SANDBOX_REQUIRED=1
  * in the environment, the program fails.

@@ -321,25 +321,41 @@ TEST(MihostUsage, ExitsWith2AndOneLineForWrongArguments)
 TEST(MihostUsage, TellsWhatWasMeantOrWhereToReadOn)
 {
     std::vector<std::pair<Lines, std::string>> const refusals = {
-        {{"tre"}, "no command 'tre'; did you mean tree? (mihost --help tells more)"},
-        {{"tre", "os"}, "no command 'tre'; did you mean tree? (mihost --help tells more)"},
-        {{"--timng", "tree"}, "no option '--timng'; did you mean --timing?"},
-        {{"tree", "--al"}, "no option '--al'; did you mean --all?"},
-        {{"list", "users", "--colums=id"}, "no option '--colums=id'; did you mean --columns?"},
-        {{"tree", "--nothing"}, "no option '--nothing' (mihost tree --help tells more)"},
-        {{"tree", "os", "extra"},
-         "'extra' is one argument too many (mihost tree --help tells more)"},
-        {{"get"}, "NODE is required (mihost get --help tells more)"}};
+        {{"tre"}, "no command 'tre' (did you mean tree?)"},
+        {{"tre", "os"}, "no command 'tre' (did you mean tree?)"},
+        {{"--timng", "tree"}, "tree: no option '--timng' (did you mean --timing?)"},
+        {{"tree", "--al"}, "tree: no option '--al' (did you mean --all?)"},
+        {{"list", "users", "--colums=id"},
+         "list: no option '--colums=id' (did you mean --columns?)"},
+        {{"tree", "--nothing"}, "tree: no option '--nothing' (see 'mihost tree --help')"},
+        {{"--nothing"}, "no option '--nothing' (see 'mihost --help')"},
+        {{"tree", "os", "extra"}, "tree: unexpected argument 'extra' (see 'mihost tree --help')"},
+        {{"power", "hatl"}, "power: ACTION: unknown value 'hatl' (did you mean halt?)"},
+        {{"power", "sleep"}, "power: ACTION: unknown value 'sleep' (use restart, halt)"},
+        {{"get"}, "get: NODE is required (see 'mihost get --help')"},
+        {{"help", "gett"}, "help: no command 'gett' (did you mean get?)"},
+        {{"help", "get", "os"}, "help: unexpected argument 'os'"}};
     for (auto const& [arguments, told] : refusals)
         EXPECT_EQ(mihostRun(arguments).err, "mihost: " + told + "\n");
-    EXPECT_EQ(mihostRun({"nonsense"})
-                  .err.rfind("mihost: no command 'nonsense'; there are tree, list, ", 0),
-              0U);
+    EXPECT_EQ(
+        mihostRun({"nonsense"}).err.rfind("mihost: no command 'nonsense' (use tree, list, ", 0),
+        0U);
     EXPECT_EQ(mihostRun({"shell"}, "get").err,
-              "mihost: line 1: NODE is required (help get tells more)\n");
+              "mihost: line 1: get: NODE is required (see 'help get')\n");
 }
 
-TEST(MihostUsage, TakesOptionsBeforeAndBehindTheCommand)
+TEST(MihostUsage, ShowsTheHelpOfTheProgramAndOfEachCommand)
+{
+    EXPECT_EQ(mihostRun({"help"}).out, mihostRun({"--help"}).out);
+    EXPECT_EQ(mihostRun({"help", "get"}).out, mihostRun({"get", "--help"}).out);
+    std::string const help = mihostRun({"help", "get"}).out;
+    EXPECT_NE(help.find("\nUsage: mihost get [OPTIONS] NODE [PROPERTY...]\n"), std::string::npos);
+    EXPECT_NE(help.find("\nExamples:\n  mihost get os "), std::string::npos) << help;
+    EXPECT_NE(mihostRun({"shell"}, "help get").out.find("\nExamples:\n  get os "),
+              std::string::npos);
+}
+
+TEST(MihostUsage, TakesOptionsBeforeAndAfterTheCommand)
 {
     makeMachine();
     EXPECT_EQ(mihostRun({"get", "--json", "os", "108"}).out,

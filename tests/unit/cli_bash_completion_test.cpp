@@ -1,4 +1,4 @@
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/shell/BashCompletion.h"
 
 #include "mihost/cli/input/ShellWords.h"

@@ -1,4 +1,4 @@
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/shell/Completion.h"
 
 #include "nodes/ids.h"
@@ -87,7 +87,7 @@ TEST(Completion, OffersFilesAndFormsToCheck)
     EXPECT_EQ(after({"check", "--r"}), Words{"--rounds"});
 }
 
-TEST(Completion, GoesOnBehindAnOptionWithItsValue)
+TEST(Completion, GoesOnAfterAnOptionWithItsValue)
 {
     EXPECT_EQ(after({"--plugin", "file", "ge"}), Words{"get"});
     EXPECT_EQ(after({"--plugin=file", "ge"}), Words{"get"});
@@ -165,6 +165,22 @@ TEST(Completion, OffersTheFewWordsThatAnArgumentTakes)
     EXPECT_EQ(after({"power", ""}), (Words{"restart", "halt"}));
     EXPECT_EQ(after({"list", "u"}), Words{"users"});
     EXPECT_EQ(after({"properties", "log"}), (Words{"log", "log-entry"}));
+}
+
+TEST(Completion, OffersTheCommandsThatHelpExplains)
+{
+    EXPECT_EQ(after({"help", "po"}), Words{"power"});
+    EXPECT_EQ(after({"help", "power", ""}), Words());
+    EXPECT_EQ(after({"help", "nonsense", ""}), Words());
+}
+
+TEST(Completion, KnowsTheValueOfAShortOption)
+{
+    EXPECT_EQ(after({"watch", "-n", ""}), Words());
+    EXPECT_EQ(after({"watch", "-n", "5", "lo"}), (Words{"log", "log:"}));
+    EXPECT_EQ(after({"watch", "-n5", "lo"}), (Words{"log", "log:"}));
+    EXPECT_EQ(after({"-y", "power", "h"}), Words{"halt"});
+    EXPECT_EQ(after({"-q5", "power", "h"}), Words());
 }
 
 TEST(Completion, OffersColumnsOneAfterTheOther)

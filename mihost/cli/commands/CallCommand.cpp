@@ -1,7 +1,7 @@
 #include "mihost/cli/change/Clearance.h"
 #include "mihost/cli/change/MembershipCheck.h"
 #include "mihost/cli/change/MethodWrite.h"
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/output/CatalogueText.h"
 
 #include <fmt/ranges.h>
@@ -17,14 +17,14 @@ class Call : public Command
 public:
     void declare(CLI::App& app) override
     {
-        method_ = app.add_option("METHOD", name_,
-                                 "such as UserAdd; --help behind it tells its parameters")
+        method_ = app.add_option("METHOD", name_, "such as UserAdd; add --help for its parameters")
                       ->required();
-        app.add_option("PARAMETER", assignments_,
-                       "NAME=VALUE; days as YYYY-MM-DD; Password=- is asked for, or read from "
-                       "standard input, but account tools still get the password or its hash "
-                       "as an argument");
-        // Asked for help, the words given so far are known but not handed out yet.
+        app.add_option(
+            "PARAMETER", assignments_,
+            "NAME=VALUE; days as YYYY-MM-DD; Password=- reads it from a prompt or standard "
+            "input, but account tools still get the password or its hash as an "
+            "argument");
+        // When help is shown, the words given so far are known but not yet in name_.
         app.footer([this] {
             Method const* const known =
                 method_->empty() ? nullptr : findMethod(method_->results().front());
@@ -53,9 +53,14 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::call()
-{
-    return std::make_unique<Call>();
-}
+CommandRow const commandRows::call{
+    "call",
+    "run an administration method",
+    newCommand<Call>,
+    {
+        {"mihost call UserAdd UserName=asmith ScriptPath=/bin/bash", "add an account"},
+        {"mihost --sandbox call LocalGroupAdd GroupName=builders", "try adding a group"},
+    },
+};
 
 } // namespace mihost

@@ -1,6 +1,6 @@
 // The catalogue for reading: properties and methods.
 
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/output/CatalogueText.h"
 #include "mihost/cli/plugin/Session.h"
 
@@ -31,8 +31,8 @@ class Properties : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("KIND", kind_, "such as os or user; all kinds where none is given")
-            ->check(CLI::IsMember(rowNames(nodeKinds())));
+        choices_.restrict(app.add_option("KIND", kind_, "such as os or user; all kinds by default"),
+                          rowNames(nodeKinds()));
         app.add_flag("--markdown", markdown_, "as docs/properties.md");
     }
 
@@ -63,8 +63,9 @@ class Methods : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("METHOD", method_, "such as UserAdd; a list of all where none is given")
-            ->check(CLI::IsMember(rowNames(methods())));
+        choices_.restrict(
+            app.add_option("METHOD", method_, "such as UserAdd; a list of all by default"),
+            rowNames(methods()));
         app.add_flag("--markdown", markdown_, "as docs/methods.md");
     }
 
@@ -92,14 +93,24 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::properties()
-{
-    return std::make_unique<Properties>();
-}
+CommandRow const commandRows::properties{
+    "properties",
+    "describe the properties of each kind of node",
+    newCommand<Properties>,
+    {
+        {"mihost properties user", "the properties of user nodes"},
+        {"mihost --json properties", "all of them as JSON"},
+    },
+};
 
-std::unique_ptr<Command> commandMakers::methods()
-{
-    return std::make_unique<Methods>();
-}
+CommandRow const commandRows::methods{
+    "methods",
+    "describe the administration methods",
+    newCommand<Methods>,
+    {
+        {"mihost methods", "the methods"},
+        {"mihost methods UserAdd", "the parameters of one method"},
+    },
+};
 
 } // namespace mihost

@@ -1,6 +1,6 @@
 #include "mihost/cli/check/Isolated.h"
 #include "mihost/cli/check/Report.h"
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/sandbox/Sandbox.h"
 
@@ -25,15 +25,16 @@ class CheckCommand : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("PLUGIN", plugin_, "the file to check; without it the one of --plugin")
+        app.add_option("PLUGIN", plugin_, "the file to check; by default that of --plugin")
             ->type_name("FILE");
-        app.add_option("--format", format_, "how to show the results")
-            ->check(CLI::IsMember({text, tap, junit}))
+        choices_
+            .restrict(app.add_option("--format", format_, "how to show the results"),
+                      {text, tap, junit})
             ->capture_default_str();
-        app.add_option("--rounds", rounds_, "how often to start and stop when looking for leaks")
+        app.add_option("--rounds", rounds_, "start and stop so often when looking for leaks")
             ->check(CLI::Range(1U, 1000U))
             ->capture_default_str();
-        app.add_option("--time-limit", timeLimit_, "how long each group of checks may take")
+        app.add_option("--time-limit", timeLimit_, "end each group of checks after so many seconds")
             ->type_name("SECONDS")
             ->check(CLI::Range(1U, 86400U))
             ->capture_default_str();
@@ -53,9 +54,9 @@ private:
     void refuseWhatDoesNotFit(Options const& options) const
     {
         if (options.json && format_ != text)
-            throw Failure(BadUsage, "--json and --format exclude each other");
+            throw Failure(BadUsage, "check: --json and --format exclude each other");
         if (!options.trace.empty())
-            throw Failure(BadUsage, "check writes no trace (leave out --trace)");
+            throw Failure(BadUsage, "check: no trace can be written (leave out --trace)");
     }
 
     checks::Results runAll(Options const& options) const
@@ -94,9 +95,15 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::check()
-{
-    return std::make_unique<CheckCommand>();
-}
+CommandRow const commandRows::check{
+    "check",
+    "check a plug-in in a sandbox, as a host sees it",
+    newCommand<CheckCommand>,
+    {
+        {"mihost check --rounds 1", "check the installed plug-in"},
+        {"mihost check --rounds 1 --format tap", "print the results for a test harness"},
+    },
+    CommandRow::NotInShell | CommandRow::AlwaysSandbox,
+};
 
 } // namespace mihost

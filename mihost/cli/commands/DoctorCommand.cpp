@@ -1,4 +1,4 @@
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/doctor/Diagnosis.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/runtime/Text.h"
@@ -94,9 +94,14 @@ public:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::doctor()
-{
-    return std::make_unique<Doctor>();
-}
+CommandRow const commandRows::doctor{
+    "doctor",
+    "report what this machine lacks for a full tree",
+    newCommand<Doctor>,
+    {
+        {"mihost doctor", "what is missing, and how to install it"},
+        {"mihost --json doctor", "the same as JSON"},
+    },
+};
 
 } // namespace mihost

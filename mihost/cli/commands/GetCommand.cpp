@@ -1,4 +1,4 @@
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/output/PropertyText.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/Stderr.h"
@@ -17,10 +17,9 @@ public:
     void declare(CLI::App& app) override
     {
         app.add_option("NODE", address_,
-                       "an id, or a name such as os or user:root; tree shows them")
+                       "an id, or a name such as os or user:root; see 'mihost tree'")
             ->required();
-        app.add_option("PROPERTY", names_,
-                       "ids or names, which properties explains; all of them where none is given");
+        app.add_option("PROPERTY", names_, "ids or names, see 'mihost properties'; all by default");
     }
 
     void run(Session& session) override
@@ -43,9 +42,14 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::get()
-{
-    return std::make_unique<Get>();
-}
+CommandRow const commandRows::get{
+    "get",
+    "read properties of a node, live",
+    newCommand<Get>,
+    {
+        {"mihost get os physical-memory-free", "the memory that is free now"},
+        {"mihost get user:root", "all properties of an account"},
+    },
+};
 
 } // namespace mihost

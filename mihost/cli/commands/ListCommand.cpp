@@ -1,11 +1,10 @@
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/output/NodeTable.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/Stderr.h"
 
 #include <algorithm>
 #include <fmt/format.h>
-#include <fmt/ranges.h>
 
 namespace mihost
 {
@@ -27,11 +26,9 @@ class List : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("KIND", kind_, fmt::format("{}", fmt::join(listNames(), ", ")))
-            ->required()
-            ->check(CLI::IsMember(listNames()));
+        choices_.restrict(app.add_option("KIND", kind_, "what to list"), listNames())->required();
         app.add_option("--columns", columns_,
-                       "properties to show, with commas between them; also "
+                       "show these properties, separated by commas; also "
                        "id, index, status, description")
             ->delimiter(',');
     }
@@ -62,9 +59,15 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::list()
-{
-    return std::make_unique<List>();
-}
+CommandRow const commandRows::list{
+    "list",
+    "show one kind of node as a table",
+    newCommand<List>,
+    {
+        {"mihost list users", "the user accounts"},
+        {"mihost list drivers --columns driver-name,driver-version",
+         "two columns of the kernel modules"},
+    },
+};
 
 } // namespace mihost

@@ -1,4 +1,4 @@
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/metrics/MachineMetrics.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/ReplacedFile.h"
@@ -117,9 +117,15 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::metrics()
-{
-    return std::make_unique<Metrics>();
-}
+CommandRow const commandRows::metrics{
+    "metrics",
+    "print figures for Prometheus",
+    newCommand<Metrics>,
+    {
+        {"mihost metrics", "show the figures"},
+        {"mihost metrics --output /tmp/mihost.prom", "replace a file that node_exporter reads"},
+    },
+    CommandRow::NotInShell,
+};
 
 } // namespace mihost

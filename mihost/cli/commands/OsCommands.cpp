@@ -2,7 +2,7 @@
 
 #include "mihost/cli/change/Clearance.h"
 #include "mihost/cli/change/PropertyWrite.h"
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "nodes/ids.h"
 
 #include <fmt/format.h>
@@ -67,19 +67,22 @@ public:
     }
 };
 
+constexpr char restart[] = "restart";
+constexpr char halt[] = "halt";
+
 class Power : public Command
 {
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("ACTION", action_, "restart or halt")
-            ->required()
-            ->check(CLI::IsMember({"restart", "halt"}));
+        choices_
+            .restrict(app.add_option("ACTION", action_, "what the machine does"), {restart, halt})
+            ->required();
     }
 
     void run(Session& session) override
     {
-        unsigned int const state = action_ == "restart" ? 9 : 12;
+        unsigned int const state = action_ == restart ? 9 : 12;
         IC::MutableNode& os = session.node("os");
         ChangeLock const lock = clearChange(session, action_ + " the machine");
         carryOut(session, osWrite(session, os, "power " + action_, NODES::requestedState,
@@ -92,19 +95,34 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::refresh()
-{
-    return std::make_unique<Refresh>();
-}
+CommandRow const commandRows::refresh{
+    "refresh",
+    "build the user and group nodes again",
+    newCommand<Refresh>,
+    {
+        {"mihost refresh", "read the accounts again"},
+        {"mihost --json refresh", "print the result as JSON"},
+    },
+};
 
-std::unique_ptr<Command> commandMakers::clearLog()
-{
-    return std::make_unique<ClearLog>();
-}
+CommandRow const commandRows::clearLog{
+    "clear-log",
+    "empty the system log",
+    newCommand<ClearLog>,
+    {
+        {"mihost clear-log", "empty the log after a prompt"},
+        {"mihost --sandbox clear-log -y", "try it in a copy of this machine"},
+    },
+};
 
-std::unique_ptr<Command> commandMakers::power()
-{
-    return std::make_unique<Power>();
-}
+CommandRow const commandRows::power{
+    "power",
+    "restart or halt the machine",
+    newCommand<Power>,
+    {
+        {"mihost power restart", "restart after a prompt"},
+        {"mihost power halt -y", "halt without a prompt"},
+    },
+};
 
 } // namespace mihost

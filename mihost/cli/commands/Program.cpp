@@ -1,7 +1,7 @@
 #include "mihost/cli/commands/Program.h"
 
 #include "mihost/cli/accounts/LocalNames.h"
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/input/CommandLine.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/shell/BashCompletion.h"

@@ -3,7 +3,7 @@
 #include "mihost/cli/change/MethodWrite.h"
 #include "mihost/cli/change/PropertyWrite.h"
 #include "mihost/cli/change/UserCheck.h"
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/input/ValueText.h"
 #include "mihost/cli/system/Failure.h"
 #include "nodes/ids.h"
@@ -83,12 +83,13 @@ public:
     void declare(CLI::App& app) override
     {
         app.add_option("NODE", address_,
-                       "an id, or a name such as os or user:root; tree shows them")
+                       "an id, or a name such as os or user:root; see 'mihost tree'")
             ->required();
-        app.add_option("PROPERTY", name_, "an id or a name, which properties explains")->required();
-        app.add_option("VALUE", text_,
-                       "a date as YYYY-MM-DD, true or false, lists with commas; - for a password "
-                       "is asked for, or read from standard input")
+        app.add_option("PROPERTY", name_, "an id or a name, see 'mihost properties'")->required();
+        app.add_option(
+               "VALUE", text_,
+               "a date as YYYY-MM-DD, true or false, lists with commas; - reads a password from "
+               "a prompt or standard input")
             ->required();
     }
 
@@ -99,10 +100,10 @@ public:
         NodeKind const* const kind = findKind(node.getNodeType());
         Property const* const property = kind ? findProperty(*kind, id) : nullptr;
         if (!property)
-            throw Failure(NotFound,
-                          fmt::format("nothing is known of property '{}' of node '{}', so "
-                                      "it is not written",
-                                      name_, address_));
+            throw Failure(
+                NotFound,
+                fmt::format("set: property '{}' of node '{}' is unknown, so it is not written",
+                            name_, address_));
         if (property->has(Property::Secret) && text_ == toBeAsked)
             text_ = session.askSecret(fmt::format("{} hash", property->name));
 
@@ -122,9 +123,14 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::set()
-{
-    return std::make_unique<Set>();
-}
+CommandRow const commandRows::set{
+    "set",
+    "write one property of a node",
+    newCommand<Set>,
+    {
+        {"mihost set os refresh 0", "build the user and group nodes again"},
+        {"mihost --sandbox set user:jdoe password '!'", "try locking an account's password"},
+    },
+};
 
 } // namespace mihost

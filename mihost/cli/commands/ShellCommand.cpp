@@ -1,6 +1,6 @@
 #include "mihost/cli/shell/Shell.h"
 
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/output/Terminal.h"
 
 #include <iostream>
@@ -17,8 +17,8 @@ public:
     void declare(CLI::App& app) override
     {
         app.add_flag("--keep-going", keepGoing_,
-                     "let a script go on behind a command that fails; the first failure is what "
-                     "the exit code tells of");
+                     "continue a script after a command that fails; the exit status is that of the "
+                     "first failure");
     }
 
     void run(Session& session) override
@@ -37,9 +37,15 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::shell()
-{
-    return std::make_unique<ShellCommand>();
-}
+CommandRow const commandRows::shell{
+    "shell",
+    "run many commands on one loaded plug-in",
+    newCommand<ShellCommand>,
+    {
+        {"mihost --sandbox shell", "type commands in a copy of this machine"},
+        {"echo 'get os os-name' | mihost shell", "run a script"},
+    },
+    CommandRow::NotInShell,
+};
 
 } // namespace mihost

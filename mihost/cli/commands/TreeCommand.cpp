@@ -1,4 +1,4 @@
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/output/TreeText.h"
 #include "mihost/cli/plugin/Session.h"
 
@@ -30,7 +30,7 @@ public:
     void declare(CLI::App& app) override
     {
         app.add_option("NODE", address_, "show only this node and what is below it");
-        app.add_flag("--all", all_, "with every node's properties");
+        app.add_flag("--all", all_, "show every node's properties");
     }
 
     void run(Session& session) override
@@ -55,9 +55,14 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::tree()
-{
-    return std::make_unique<Tree>();
-}
+CommandRow const commandRows::tree{
+    "tree",
+    "show the tree, one line per node",
+    newCommand<Tree>,
+    {
+        {"mihost tree", "the whole tree"},
+        {"mihost tree os --all", "the operating system with its properties"},
+    },
+};
 
 } // namespace mihost

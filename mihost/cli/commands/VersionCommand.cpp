@@ -1,4 +1,4 @@
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/plugin/Session.h"
 
 #include <fmt/format.h>
@@ -32,9 +32,14 @@ public:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::version()
-{
-    return std::make_unique<Version>();
-}
+CommandRow const commandRows::version{
+    "version",
+    "show the versions of program, contract and plug-in",
+    newCommand<Version>,
+    {
+        {"mihost version", "the versions and the plug-in's file"},
+        {"mihost --json version", "the same as JSON"},
+    },
+};
 
 } // namespace mihost

@@ -1,4 +1,4 @@
-#include "mihost/cli/commands/makers.h"
+#include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/output/PropertyText.h"
 #include "mihost/cli/output/Terminal.h"
 #include "mihost/cli/plugin/Session.h"
@@ -15,10 +15,10 @@ namespace mihost
 namespace
 {
 
-/** A range alone lets through what is no number at all. */
+/** A range alone accepts what is not a number. */
 std::string objectionToNan(std::string const& text)
 {
-    return std::isnan(std::strtod(text.c_str(), nullptr)) ? text + " is no number" : "";
+    return std::isnan(std::strtod(text.c_str(), nullptr)) ? text + " is not a number" : "";
 }
 
 class Watch : public Command
@@ -26,15 +26,15 @@ class Watch : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("NODE", address_, "an id, or a name such as os or log:1; tree shows them")
+        app.add_option("NODE", address_, "an id, or a name such as os or log:1; see 'mihost tree'")
             ->required();
-        app.add_option("PROPERTY", names_, "ids or names, which properties explains")->required();
-        app.add_option("--interval", interval_, "seconds between two readings")
+        app.add_option("PROPERTY", names_, "ids or names, see 'mihost properties'")->required();
+        app.add_option("--interval", interval_, "wait S seconds between readings")
             ->check(CLI::Range(0.0, 86400.0))
             ->check(objectionToNan)
             ->type_name("S")
             ->capture_default_str();
-        app.add_option("--count", count_, "stop after so many readings; 0 for never")
+        app.add_option("-n,--count", count_, "stop after N readings; 0 means never")
             ->type_name("N")
             ->capture_default_str();
     }
@@ -104,9 +104,14 @@ private:
 
 } // namespace
 
-std::unique_ptr<Command> commandMakers::watch()
-{
-    return std::make_unique<Watch>();
-}
+CommandRow const commandRows::watch{
+    "watch",
+    "print properties whenever they change",
+    newCommand<Watch>,
+    {
+        {"mihost watch os physical-memory-free -n 2", "stop after two readings"},
+        {"mihost watch log:1 message --interval 0.5 -n 2", "read twice a second"},
+    },
+};
 
 } // namespace mihost

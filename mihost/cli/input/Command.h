@@ -1,6 +1,8 @@
 #ifndef MIHOST_CLI_INPUT_COMMAND_H
 #define MIHOST_CLI_INPUT_COMMAND_H
 
+#include "mihost/cli/input/Choices.h"
+
 #include <CLI/App.hpp>
 #include <memory>
 #include <vector>
@@ -21,18 +23,49 @@ public:
 
     /** @throws Failure */
     virtual void run(Session& session) = 0;
+
+    ChoiceTable const& choices() const
+    {
+        return choices_;
+    }
+
+protected:
+    ChoiceTable choices_; // of the options that declare adds
+};
+
+/** A command line as the help shows it. */
+struct Example {
+    char const* line; // a line for a shell
+    char const* meaning;
 };
 
 struct CommandRow {
+    enum Traits : unsigned {
+        Plain = 0,
+        NotInShell = 1,   // not among the commands of the shell
+        AlwaysSandbox = 2 // runs in a sandbox, asked for or not
+    };
+
     char const* name;
     char const* summary;
     std::unique_ptr<Command> (*make)();
-    bool notInShell = false;
-    bool alwaysInSandbox = false;
+    Example examples[2];
+    unsigned traits = Plain;
+
+    bool has(Traits trait) const
+    {
+        return (traits & trait) != 0;
+    }
 };
 
+/** For CommandRow::make. */
+template <class C> std::unique_ptr<Command> newCommand()
+{
+    return std::make_unique<C>();
+}
+
 /** Every command, in the order of the help text. */
-using CommandTable = std::vector<CommandRow>;
+using CommandTable = std::vector<CommandRow const*>;
 
 } // namespace mihost
 

@@ -1,5 +1,6 @@
 #include "mihost/cli/input/CommandLine.h"
 
+#include "mihost/cli/input/Help.h"
 #include "mihost/cli/input/Suggestion.h"
 #include "mihost/cli/system/Failure.h"
 
@@ -14,52 +15,87 @@ namespace mihost
 namespace
 {
 
+/** The commands that were given, as they are typed. */
+std::string wordsOf(std::vector<CLI::App const*> const& commands)
+{
+    std::string words;
+    for (CLI::App const* command : commands)
+        words += (words.empty() ? "" : " ") + command->get_name();
+    return words;
+}
+
 /** What to type for the help that fits the words given. */
 std::string helpFor(CLI::App const& app, bool inShell)
 {
-    auto const chosen = app.get_subcommands();
-    if (chosen.empty())
-        return inShell ? "help" : "mihost --help";
-    return fmt::format(inShell ? "help {}" : "mihost {} --help", chosen.front()->get_name());
-}
-
-std::vector<std::string> commandNames(CLI::App const& app)
-{
-    std::vector<std::string> names;
-    for (CLI::App const* command : app.get_subcommands({}))
-        names.push_back(command->get_name());
-    return names;
+    std::string const words = wordsOf(givenCommands(app));
+    if (!inShell)
+        return words + " --help";
+    return words.empty() ? "help" : "help " + words;
 }
 
 /** Those that may stand where the words were given. */
 std::vector<std::string> optionNames(CLI::App const& app)
 {
     std::vector<std::string> names;
-    auto const add = [&names](CLI::App const& one) {
-        for (CLI::Option const* option : one.get_options())
+    for (CLI::App const* command : givenCommands(app))
+        for (CLI::Option const* option : command->get_options())
             for (std::string const& name : option->get_lnames())
                 names.push_back("--" + name);
-    };
-    add(app);
-    for (CLI::App const* command : app.get_subcommands())
-        add(*command);
     return names;
+}
+
+/** The argument that was typed where a command of this command may stand; empty for none. */
+std::string wordForCommand(CLI::App const& command)
+{
+    if (command.get_subcommands({}).empty())
+        return "";
+    for (CLI::Option const* option : command.get_options())
+        if (option->get_positional() && option->count() > 0)
+            return option->results().front();
+    return "";
 }
 
 /** What is wrong with the first word that nothing takes. */
 std::string excessOf(CLI::App const& app, std::string const& help)
 {
     std::string const word = app.remaining(true).front();
+    CLI::App const& command = *givenCommands(app).back();
     if (word[0] == '-') {
         std::string const meant = nearest(word.substr(0, word.find('=')), optionNames(app));
-        return meant.empty() ? fmt::format("no option '{}' ({} tells more)", word, help)
-                             : fmt::format("no option '{}'; did you mean {}?", word, meant);
+        return meant.empty() ? fmt::format("no option '{}' (see '{}')", word, help)
+                             : fmt::format("no option '{}' (did you mean {}?)", word, meant);
     }
-    if (app.get_subcommands().empty())
-        return fmt::format("no command '{}'; {} ({} tells more)", word,
-                           suggestion(word, commandNames(app), "there are"), help);
-    return fmt::format("'{}' is one argument too many ({} tells more)", word, help);
+    if (&command == &app)
+        return fmt::format("no command '{}' ({})", word,
+                           suggestion(word, commandNames(app), "use"));
+    std::string const before = wordForCommand(command);
+    if (std::string const meant = nearest(before, commandNames(command)); !meant.empty())
+        return fmt::format("no command '{}' (did you mean {}?)", before, meant);
+    return fmt::format("unexpected argument '{}' (see '{}')", word, help);
 }
+
+/** The message, with the command that it is about first and a way on last. */
+std::string explained(CLI::App const& app, std::string const& message, std::string const& help)
+{
+    std::vector<CLI::App const*> commands = givenCommands(app);
+    commands.erase(commands.begin());
+    std::string const what = wordsOf(commands);
+    bool const hasWayOn = !message.empty() && message.back() == ')';
+    return fmt::format("{}{}{}{}", what, what.empty() ? "" : ": ", message,
+                       hasWayOn ? "" : fmt::format(" (see '{}')", help));
+}
+
+/** The type of an argument says nothing that its name does not say. */
+void hideTypesOfArguments(CLI::App& command)
+{
+    for (CLI::Option* option : command.get_options())
+        if (option->get_positional() && option->get_type_name() == "TEXT")
+            option->type_name("");
+    for (CLI::App* each : command.get_subcommands({}))
+        hideTypesOfArguments(*each);
+}
+
+constexpr char helpCommand[] = "help";
 
 } // namespace
 
@@ -88,39 +124,72 @@ void CommandLine::declareForProgram(CLI::App& app)
 void CommandLine::declare(CLI::App& app)
 {
     app.fallthrough();
-    app.set_help_all_flag("--help-all", "help for every command");
+    setHelpLabels(app);
     if (place_ == Place::Program)
         declareForProgram(app);
     app.add_flag("--json", options_.json, "print JSON");
     app.add_flag("--show-secrets", options_.showSecrets, "show password hashes");
-    app.add_flag("--yes", options_.yes, "do what would be asked about without asking");
+    app.add_flag("-y,--yes", options_.yes, "answer yes to all prompts");
     app.add_option("--lock-timeout", options_.lockTimeout,
                    "give up after S seconds if another mihost is changing this machine")
         ->check(CLI::Range(0U, 86400U))
         ->type_name("S")
         ->capture_default_str();
     app.require_subcommand(0, 1);
+    declareCommands(app);
+    hideTypesOfArguments(app);
+}
 
-    for (CommandRow const& row : table_) {
-        if (place_ == Place::Shell && row.notInShell)
+void CommandLine::declareCommands(CLI::App& app)
+{
+    for (CommandRow const* row : table_) {
+        if (place_ == Place::Shell && row->has(CommandRow::NotInShell))
             continue;
-        all_.emplace_back(row.name, row.make());
-        all_.back().second->declare(*app.add_subcommand(row.name, row.summary));
+        CLI::App& command = *app.add_subcommand(row->name, row->summary)->group("Commands");
+        all_.push_back({row, row->make()});
+        all_.back().command->declare(command);
+        setExamples(command, row->examples);
     }
+    app.add_subcommand(helpCommand, "show help for a command")
+        ->group("Commands")
+        ->add_option("COMMAND", helpWords_, "such as get, or user add");
+}
+
+Choices const* CommandLine::choicesOf(CLI::Option const& option) const
+{
+    for (Declared const& each : all_)
+        if (Choices const* const choices = each.command->choices().find(option))
+            return choices;
+    return choices_.find(option);
+}
+
+void CommandLine::choose(std::string const& name)
+{
+    for (Declared const& each : all_)
+        if (each.row->name == name) {
+            command_ = each.command.get();
+            options_.sandbox = options_.sandbox || each.row->has(CommandRow::AlwaysSandbox);
+        }
 }
 
 void CommandLine::parse(std::vector<std::string> words)
 {
     bool const inShell = place_ == Place::Shell;
-    CLI::App app(inShell
-                     ? "Commands run on the loaded plug-in. help COMMAND tells more, exit leaves."
-                     : "Loads the management-interface plug-in, shows its tree and drives it.\n"
-                       "Without a command it shows the tree; mihost COMMAND --help tells of one.",
-                 inShell ? "" : "mihost");
+    CLI::App app(
+        inShell ? "Commands run on the loaded plug-in. Run 'help COMMAND' for details, exit to "
+                  "leave."
+                : "Loads the management-interface plug-in, shows its tree and drives it.\n"
+                  "Without a command it shows the tree. Run 'mihost help COMMAND' for details.",
+        inShell ? "" : "mihost");
     declare(app);
     try {
         std::reverse(words.begin(), words.end()); // as it wants them
         app.parse(words);
+        if (app.got_subcommand(helpCommand)) {
+            app.clear(); // otherwise it would show the help for help
+            answer_ = helpOn(app, helpWords_);
+            return;
+        }
     } catch (CLI::CallForHelp const&) {
         answer_ = app.help();
         return;
@@ -131,20 +200,14 @@ void CommandLine::parse(std::vector<std::string> words)
         answer_ = fmt::format("{}\n", version.what());
         return;
     } catch (CLI::ExtrasError const&) {
-        throw Failure(BadUsage, excessOf(app, helpFor(app, inShell)));
+        std::string const help = helpFor(app, inShell);
+        throw Failure(BadUsage, explained(app, excessOf(app, help), help));
     } catch (CLI::ParseError const& error) {
-        throw Failure(BadUsage,
-                      fmt::format("{} ({} tells more)", error.what(), helpFor(app, inShell)));
+        throw Failure(BadUsage, explained(app, error.what(), helpFor(app, inShell)));
     }
     options_.sandbox = options_.sandbox || !options_.overlay.empty();
     auto const chosen = app.get_subcommands();
-    std::string const name = chosen.empty() ? "tree" : chosen.front()->get_name();
-    for (auto const& [known, command] : all_)
-        if (known == name)
-            command_ = command.get();
-    for (CommandRow const& row : table_)
-        if (row.name == name && row.alwaysInSandbox)
-            options_.sandbox = true;
+    choose(chosen.empty() ? "tree" : chosen.front()->get_name());
 }
 
 } // namespace mihost

@@ -21,6 +21,9 @@ public:
     /** Adds all options and commands. What the application is given then ends up here. */
     void declare(CLI::App& app);
 
+    /** The words that a declared option or argument takes; null if it takes any. */
+    Choices const* choicesOf(CLI::Option const& option) const;
+
     /** @throws Failure (BadUsage) */
     void parse(std::vector<std::string> words);
 
@@ -42,12 +45,21 @@ public:
     }
 
 private:
+    struct Declared {
+        CommandRow const* row;
+        std::unique_ptr<Command> command;
+    };
+
     void declareForProgram(CLI::App& app);
+    void declareCommands(CLI::App& app);
+    void choose(std::string const& name);
 
     CommandTable const& table_;
     Place place_;
     Options options_;
-    std::vector<std::pair<std::string, std::unique_ptr<Command>>> all_;
+    ChoiceTable choices_; // of the options that hold for all commands
+    std::vector<Declared> all_;
+    std::vector<std::string> helpWords_;
     Command* command_ = nullptr;
     std::string answer_;
 };

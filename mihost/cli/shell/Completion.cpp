@@ -1,6 +1,7 @@
 #include "mihost/cli/shell/Completion.h"
 
 #include "mihost/cli/input/Address.h"
+#include "mihost/cli/input/Help.h"
 #include "mihost/cli/input/MethodCall.h"
 #include "mihost/cli/system/Failure.h"
 #include "mihost/runtime/Text.h"
@@ -21,10 +22,14 @@ using Candidates = std::vector<Candidate>;
 
 /** A command line up to the word being typed. */
 struct Typed {
-    explicit Typed(CLI::App& app) : program(&app) {}
+    Typed(CommandLine const& declared, CLI::App& app)
+        : line(&declared), program(&app), command(&app)
+    {
+    }
 
+    CommandLine const* line; // that the program was declared by
     CLI::App* program;
-    CLI::App* command = nullptr;        // null before the command
+    CLI::App* command;                  // the program itself before the command
     std::vector<std::string> arguments; // of the command
     CLI::Option* waiting = nullptr;     // an option whose value comes next
     bool isWrong = false;               // no such command or option
@@ -44,20 +49,32 @@ bool looksLikeOption(Typed const& typed, std::string const& word)
 /** The command's own, or one that holds for all commands. */
 CLI::Option* findOption(Typed const& typed, std::string const& name)
 {
-    CLI::Option* option = nullptr;
-    if (typed.command)
-        option = typed.command->get_option_no_throw(name);
-    return option ? option : typed.program->get_option_no_throw(name);
+    for (CLI::App* app = typed.command; app; app = app->get_parent())
+        if (CLI::Option* const option = app->get_option_no_throw(name))
+            return option;
+    return nullptr;
+}
+
+/** The name of a short option is a letter, and its value may follow at once. */
+std::size_t lengthOfName(std::string const& word)
+{
+    constexpr std::size_t shortName = 2;
+    return word[1] == '-' ? word.find('=') : shortName;
 }
 
 void takeOption(Typed& typed, std::string const& word)
 {
-    std::size_t const equals = word.find('=');
-    CLI::Option* const option = findOption(typed, word.substr(0, equals));
+    std::size_t const length = lengthOfName(word);
+    CLI::Option* const option = findOption(typed, word.substr(0, length));
     if (!option)
         typed.isWrong = true;
-    else if (option->get_items_expected_max() > 0 && equals == std::string::npos)
+    else if (option->get_items_expected_max() > 0 && length >= word.size())
         typed.waiting = option;
+}
+
+bool mayNameCommand(Typed const& typed)
+{
+    return !typed.onlyArguments && typed.arguments.empty();
 }
 
 void take(Typed& typed, std::string const& word)
@@ -68,15 +85,13 @@ void take(Typed& typed, std::string const& word)
         typed.onlyArguments = true;
     } else if (looksLikeOption(typed, word)) {
         takeOption(typed, word);
-    } else if (typed.command) {
-        typed.arguments.push_back(word);
+    } else if (CLI::App* const command =
+                   mayNameCommand(typed) ? findCommand(*typed.command, word) : nullptr) {
+        typed.command = command;
+    } else if (typed.command == typed.program) {
+        typed.isWrong = true;
     } else {
-        auto const chosen = typed.program->get_subcommands(
-            [&word](CLI::App const* command) { return command->get_name() == word; });
-        if (chosen.empty())
-            typed.isWrong = true;
-        else
-            typed.command = chosen.front();
+        typed.arguments.push_back(word);
     }
 }
 
@@ -199,6 +214,23 @@ Candidates parameters(Typed const& typed, std::string const& word, NodeNames con
     return all;
 }
 
+Candidates commandsOf(CLI::App const& app)
+{
+    Candidates all;
+    for (CLI::App const* command : app.get_subcommands({}))
+        all.push_back({command->get_name(), command->get_description()});
+    return all;
+}
+
+/** The commands that help may be shown for. */
+Candidates commandsOfHelp(Typed const& typed, std::string const&, NodeNames const&)
+{
+    CLI::App* app = typed.program;
+    for (std::string const& word : typed.arguments)
+        app = app ? findCommand(*app, word) : nullptr;
+    return app ? commandsOf(*app) : Candidates();
+}
+
 /** Properties of the kind that is listed, the last of them being typed. */
 Candidates columns(Typed const& typed, std::string const& word, NodeNames const&)
 {
@@ -215,19 +247,21 @@ struct Place {
 };
 
 constexpr Place places[] = {
-    {"NODE", nodes},         {"PROPERTY", properties},  {"VALUE", values},
-    {"METHOD", methodNames}, {"PARAMETER", parameters}, {"--columns", columns},
+    {"NODE", nodes},
+    {"PROPERTY", properties},
+    {"VALUE", values},
+    {"METHOD", methodNames},
+    {"PARAMETER", parameters},
+    {"--columns", columns},
+    {"COMMAND", commandsOfHelp},
 };
 
-/** The words of an option that takes one of a few; its type then reads like TEXT:{restart,halt}. */
-Candidates choices(CLI::Option const& option)
+/** The words of an option that takes one of a few. */
+Candidates choices(CommandLine const& line, CLI::Option const& option)
 {
-    std::string const type = option.get_type_name();
-    std::size_t const open = type.find('{');
     Candidates all;
-    if (open != std::string::npos)
-        for (std::string const& word :
-             CLI::detail::split(type.substr(open + 1, type.find('}') - open - 1), ','))
+    if (Choices const* const words = line.choicesOf(option))
+        for (std::string const& word : *words)
             all.push_back({word, ""});
     return all;
 }
@@ -243,7 +277,7 @@ Completion completeValue(Typed const& typed, CLI::Option const& option, std::str
     for (Place const& place : places)
         if (place.name == name)
             return {Completion::What::Words, place.candidates(typed, word, nodeNames)};
-    return {Completion::What::Words, choices(option)};
+    return {Completion::What::Words, choices(*typed.line, option)};
 }
 
 /** An option's value behind its equals sign. */
@@ -277,17 +311,8 @@ void addOptions(CLI::App const& app, Candidates& all)
 Completion completeOption(Typed const& typed)
 {
     Completion completion;
-    if (typed.command)
-        addOptions(*typed.command, completion.candidates);
-    addOptions(*typed.program, completion.candidates);
-    return completion;
-}
-
-Completion completeCommand(CLI::App const& program)
-{
-    Completion completion;
-    for (CLI::App const* command : program.get_subcommands({}))
-        completion.candidates.push_back({command->get_name(), command->get_description()});
+    for (CLI::App const* app = typed.command; app; app = app->get_parent())
+        addOptions(*app, completion.candidates);
     return completion;
 }
 
@@ -315,8 +340,11 @@ Completion anything(Typed const& typed, std::string const& word, NodeNames const
     if (looksLikeOption(typed, word) || (word == "-" && !typed.onlyArguments))
         return word.find('=') == std::string::npos ? completeOption(typed)
                                                    : completeAssignment(typed, word, nodeNames);
-    return typed.command ? completeArgument(typed, word, nodeNames)
-                         : completeCommand(*typed.program);
+    Completion completion = completeArgument(typed, word, nodeNames);
+    if (mayNameCommand(typed))
+        for (Candidate const& command : commandsOf(*typed.command))
+            completion.candidates.push_back(command);
+    return completion;
 }
 
 } // namespace
@@ -327,7 +355,7 @@ Completion complete(std::vector<std::string> const& words, NodeNames const& name
     CommandLine line(table, place);
     CLI::App program;
     line.declare(program);
-    Typed typed(program);
+    Typed typed(line, program);
     for (std::size_t at = 0; at + 1 < words.size(); ++at)
         take(typed, words[at]);
     std::string const word = words.empty() ? "" : words.back();

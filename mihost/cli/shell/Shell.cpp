@@ -17,20 +17,11 @@ namespace
 {
 
 /** Words of the shell itself, beside the commands. */
-constexpr char const* ownWords[] = {"exit", "help", "quit"};
+constexpr char const* ownWords[] = {"exit", "quit"};
 
 bool isExit(std::vector<std::string> const& words)
 {
     return words.size() == 1 && (words[0] == "exit" || words[0] == "quit");
-}
-
-/** "help" and "help COMMAND" are what the option says. */
-void translateHelp(std::vector<std::string>& words)
-{
-    if (words[0] != "help")
-        return;
-    words.erase(words.begin());
-    words.emplace_back("--help");
 }
 
 /** Names that can be typed as they are. */
@@ -49,12 +40,11 @@ Shell::Shell(Session& session, CommandTable const& table)
 
 bool Shell::runLine(std::string const& line)
 {
-    std::vector<std::string> words = splitWords(line);
+    std::vector<std::string> const words = splitWords(line);
     if (words.empty())
         return false;
     if (isExit(words))
         return true;
-    translateHelp(words);
     CommandLine command(table_, CommandLine::Place::Shell, options_);
     command.parse(words);
     if (command.command()) {

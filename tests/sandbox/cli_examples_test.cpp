@@ -1,0 +1,105 @@
+// The examples that the help texts show, run as they stand there.
+
+#include "TestPaths.h"
+#include "mihost/cli/commands/CommandRows.h"
+#include "tests/support/Lines.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <gtest/gtest.h>
+
+namespace
+{
+
+using Lines = std::vector<std::string>;
+
+/** The lines that a help text shows as examples, without what they mean. */
+Lines examplesIn(std::string const& help)
+{
+    Lines examples;
+    bool isAtExamples = false;
+    for (std::string const& line : linesOf(help)) {
+        if (isAtExamples && line.rfind("  ", 0) == 0)
+            examples.push_back(line.substr(2, line.find("  ", 2) - 2));
+        isAtExamples = line == "Examples:" || (isAtExamples && line.rfind("  ", 0) == 0);
+    }
+    return examples;
+}
+
+/** The names that a help text shows as commands. */
+Lines commandsIn(std::string const& help)
+{
+    Lines commands;
+    bool isAtCommands = false;
+    for (std::string const& line : linesOf(help)) {
+        if (isAtCommands && line.rfind("  ", 0) == 0 && line.rfind("   ", 0) != 0)
+            commands.push_back(line.substr(2, line.find(' ', 2) - 2));
+        isAtCommands = line == "Commands:" || (isAtCommands && line.rfind("  ", 0) == 0);
+    }
+    return commands;
+}
+
+/** The help of the command and of all commands below it. */
+std::vector<std::pair<Lines, std::string>> allHelp(Lines const& command)
+{
+    Lines words = {"help"};
+    words.insert(words.end(), command.begin(), command.end());
+    std::string const help = mihostRun(words).out;
+    std::vector<std::pair<Lines, std::string>> all = {{command, help}};
+    for (std::string const& name : commandsIn(help)) {
+        Lines below = command;
+        below.push_back(name);
+        for (auto const& each : allHelp(below))
+            all.push_back(each);
+    }
+    return all;
+}
+
+/** A machine with what the examples name, and mihost and its sandbox as an administrator has them.
+ */
+void makeMachine()
+{
+    machine::lay("users-and-groups");
+    machine::write("/etc/release", "Example Linux\nVERSION = 1\nPATCHLEVEL = 0\n");
+    machine::write("/etc/shells", "/bin/sh\n/bin/bash\n");
+    machine::write("/var/log/messages", "Jan  2 03:04:05 host line\n");
+    for (char const* line : {"groupadd staff", "groupadd crew", "useradd -m -G crew jdoe"})
+        ASSERT_EQ(runToEnd({"/bin/sh", "-c", line}).code, 0) << line;
+    std::filesystem::path const directory = std::filesystem::path(MIHOST_FILE).parent_path();
+    setenv("PATH", (directory.string() + ":" + getenv("PATH")).c_str(), 1);
+}
+
+class Examples : public testing::TestWithParam<mihost::CommandRow const*>
+{
+};
+
+TEST_P(Examples, OfEachCommandWork)
+{
+    makeMachine();
+    bool const isShell = GetParam() == &mihost::commandRows::shell;
+    std::string const input = isShell ? "" : "Secret-1\n";
+    for (auto const& [command, help] : allHelp({GetParam()->name})) {
+        Lines const examples = examplesIn(help);
+        EXPECT_EQ(examples.size(), 2U) << help;
+        for (std::string const& example : examples) {
+            // Each runs in its own sandbox and answers yes; a password is there to be read.
+            std::size_t const at = example.find("mihost ");
+            ASSERT_NE(at, std::string::npos) << example;
+            std::string line = example;
+            line.insert(at + 7, "--sandbox --yes ");
+            Outcome const outcome = runToEnd({"/bin/sh", "-c", line}, input);
+            EXPECT_EQ(outcome.code, 0) << line << '\n' << outcome.out << outcome.err;
+        }
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(All, Examples, testing::ValuesIn(mihost::commandTable()),
+                         [](auto const& row) {
+                             std::string name = row.param->name;
+                             name.erase(std::remove(name.begin(), name.end(), '-'), name.end());
+                             return name;
+                         });
+
+} // namespace

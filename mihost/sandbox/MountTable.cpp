@@ -1,8 +1,11 @@
 #include "mihost/sandbox/MountTable.h"
 
-#include <algorithm>
+#include <cstdio>
+#include <libmount.h>
+#include <memory>
+#include <new>
 #include <set>
-#include <sstream>
+#include <stdexcept>
 
 namespace mihost
 {
@@ -10,26 +13,34 @@ namespace mihost
 namespace
 {
 
-bool isOctal(char character)
+using Table = std::unique_ptr<libmnt_table, decltype(&mnt_unref_table)>;
+using Iterator = std::unique_ptr<libmnt_iter, decltype(&mnt_free_iter)>;
+using Stream = std::unique_ptr<std::FILE, decltype(&std::fclose)>;
+
+template <class Type> Type* required(Type* made)
 {
-    return character >= '0' && character <= '7';
+    if (!made)
+        throw std::bad_alloc();
+    return made;
 }
 
-/** Blanks, tabs, newlines and backslashes stand as \ooo in the table. */
-std::string unescaped(std::string const& text)
+/** Lines that cannot be parsed are skipped. */
+int skipLine(libmnt_table*, char const*, int)
 {
-    std::string plain;
-    for (std::size_t at = 0; at < text.size(); ++at) {
-        std::string const digits = text.substr(at + 1, 3);
-        if (text[at] == '\\' && digits.size() == 3 &&
-            std::all_of(digits.begin(), digits.end(), isOctal)) {
-            plain.push_back(static_cast<char>(std::stoi(digits, nullptr, 8)));
-            at += digits.size();
-        } else {
-            plain.push_back(text[at]);
-        }
-    }
-    return plain;
+    return 1;
+}
+
+Table parse(std::string const& mountInfo)
+{
+    Table table(required(mnt_new_table()), mnt_unref_table);
+    if (mountInfo.empty())
+        return table; // fmemopen refuses it
+    mnt_table_set_parser_errcb(table.get(), skipLine);
+    std::string text = mountInfo;
+    Stream const stream(required(fmemopen(text.data(), text.size(), "r")), std::fclose);
+    if (mnt_table_parse_stream(table.get(), stream.get(), "mountinfo") != 0)
+        throw std::runtime_error("cannot parse the table of mounts");
+    return table;
 }
 
 bool isAtOrBelow(std::string const& path, std::string const& folder)
@@ -60,19 +71,13 @@ bool isKernelsOwn(std::string const& type)
 
 std::vector<std::string> mountsToCopy(std::string const& mountInfo)
 {
+    Table const table = parse(mountInfo);
+    Iterator const iterator(required(mnt_new_iter(MNT_ITER_FORWARD)), mnt_free_iter);
     std::set<std::string> paths;
-    std::istringstream lines(mountInfo);
-    for (std::string line; std::getline(lines, line);) {
-        // id, parent, device, root, mount point, options, any number of tags, "-", type
-        std::istringstream fields(line);
-        std::string skipped, path, type;
-        fields >> skipped >> skipped >> skipped >> skipped >> path;
-        while (fields >> skipped && skipped != "-") {
-        }
-        if (!(fields >> type))
-            continue;
-        path = unescaped(path);
-        if (!hasItsOwnInTheCopy(path) && !isKernelsOwn(type))
+    libmnt_fs* mount = nullptr;
+    while (mnt_table_next_fs(table.get(), iterator.get(), &mount) == 0) {
+        std::string const path = mnt_fs_get_target(mount);
+        if (!hasItsOwnInTheCopy(path) && !isKernelsOwn(mnt_fs_get_fstype(mount)))
             paths.insert(path);
     }
     return {paths.begin(), paths.end()};

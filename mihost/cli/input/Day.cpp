@@ -1,7 +1,5 @@
 #include "mihost/cli/input/Day.h"
 
-#include <algorithm>
-#include <charconv>
 #include <ctime>
 #include <fmt/format.h>
 
@@ -14,7 +12,7 @@ namespace
 constexpr int firstYear = 1901; // years before it the plug-in takes for none
 constexpr int lastYear = 9999;
 constexpr std::size_t dayLength = 10;
-constexpr long dayOf1970 = 719468; // counted from March 1 of year 0
+constexpr long secondsPerDay = 24L * 60 * 60;
 
 /** Whether the text looks like the pattern, where 0 stands for any digit. */
 bool looksLike(std::string_view text, std::string_view pattern)
@@ -29,27 +27,43 @@ bool looksLike(std::string_view text, std::string_view pattern)
     return true;
 }
 
-/** The digits from here on; the caller has looked at them. */
-int number(std::string_view text, std::size_t at, std::size_t length)
+std::optional<std::tm> parsed(std::string const& text, char const* format)
 {
-    int value = 0;
-    std::from_chars(text.data() + at, text.data() + at + length, value);
-    return value;
+    std::tm fields{};
+    fields.tm_isdst = -1;
+    char const* const end = strptime(text.c_str(), format, &fields);
+    return end && *end == '\0' ? std::optional(fields) : std::nullopt;
 }
 
-int daysIn(int month, int year)
+std::tm fieldsOf(Day const& day)
 {
-    static constexpr int days[] = {31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
-    bool const leap = year % 4 == 0 && (year % 100 != 0 || year % 400 == 0);
-    return month == 2 && leap ? 29 : days[month - 1];
+    std::tm fields{};
+    fields.tm_year = day.year - 1900;
+    fields.tm_mon = day.month - 1;
+    fields.tm_mday = day.day;
+    return fields;
 }
 
-std::optional<Day> dayOfCalendar(Day const& day)
+Day dayOf(std::tm const& fields)
 {
-    if (day.year < firstYear || day.year > lastYear || day.month < 1 || day.month > 12 ||
-        day.day < 1 || day.day > daysIn(day.month, day.year))
+    return {fields.tm_year + 1900, fields.tm_mon + 1, fields.tm_mday};
+}
+
+bool isSame(Day const& one, Day const& other)
+{
+    return one.year == other.year && one.month == other.month && one.day == other.day;
+}
+
+/** @param digits  YYYYMMDD */
+std::optional<Day> dayOfCalendar(std::string const& digits)
+{
+    auto const fields = parsed(digits, "%Y%m%d");
+    if (!fields)
         return std::nullopt;
-    return day;
+    Day const day = dayOf(*fields);
+    // strptime takes February 31.
+    auto const same = dayOfNumber(dayNumber(day));
+    return same && isSame(*same, day) ? same : std::nullopt;
 }
 
 } // namespace
@@ -58,7 +72,8 @@ std::optional<Day> parseDay(std::string_view text)
 {
     if (!looksLike(text, "0000-00-00"))
         return std::nullopt;
-    return dayOfCalendar({number(text, 0, 4), number(text, 5, 2), number(text, 8, 2)});
+    return dayOfCalendar(
+        fmt::format("{}{}{}", text.substr(0, 4), text.substr(5, 2), text.substr(8)));
 }
 
 std::optional<Day> parseDateTime(std::string_view text)
@@ -66,7 +81,7 @@ std::optional<Day> parseDateTime(std::string_view text)
     if (!looksLike(text, "00000000000000.000000+000") &&
         !looksLike(text, "00000000000000.000000-000"))
         return std::nullopt;
-    return dayOfCalendar({number(text, 0, 4), number(text, 4, 2), number(text, 6, 2)});
+    return dayOfCalendar(std::string(text.substr(0, 8)));
 }
 
 std::string dateTimeText(Day const& day)
@@ -81,47 +96,29 @@ std::string dayText(Day const& day)
 
 long dayNumber(Day const& day)
 {
-    // Years begin in March here, so that the day that comes and goes is their last.
-    int const year = day.month > 2 ? day.year : day.year - 1;
-    int const month = day.month > 2 ? day.month - 3 : day.month + 9;
-    int const dayOfYear = (153 * month + 2) / 5 + day.day - 1;
-    return 365L * year + year / 4 - year / 100 + year / 400 + dayOfYear - dayOf1970;
+    std::tm fields = fieldsOf(day);
+    return timegm(&fields) / secondsPerDay;
 }
 
 std::optional<Day> dayOfNumber(long number)
 {
     if (number < dayNumber({firstYear, 1, 1}) || number > dayNumber({lastYear, 12, 31}))
         return std::nullopt;
-    int year = static_cast<int>(1970 + number / 366); // at most a few years early or late
-    while (dayNumber({year, 1, 1}) > number)
-        --year;
-    while (dayNumber({year + 1, 1, 1}) <= number)
-        ++year;
-    int month = 12;
-    while (dayNumber({year, month, 1}) > number)
-        --month;
-    return Day{year, month, static_cast<int>(number - dayNumber({year, month, 1})) + 1};
+    std::time_t const time = number * secondsPerDay;
+    std::tm fields{};
+    return dayOf(*gmtime_r(&time, &fields));
 }
 
 std::optional<long> parseTime(std::string_view text)
 {
+    if (!looksLike(text, "0000-00-00") && !looksLike(text, "0000-00-00 00:00:00"))
+        return std::nullopt;
     auto const day = parseDay(text.substr(0, dayLength));
-    std::string_view const time = text.substr(std::min(text.size(), dayLength));
-    if (!day || (!time.empty() && !looksLike(time, " 00:00:00")))
+    bool const hasTime = text.size() > dayLength;
+    auto fields = parsed(std::string(text), hasTime ? "%Y-%m-%d %H:%M:%S" : "%Y-%m-%d");
+    if (!day || !fields || fields->tm_sec > 59)
         return std::nullopt;
-    std::tm fields{};
-    fields.tm_year = day->year - 1900;
-    fields.tm_mon = day->month - 1;
-    fields.tm_mday = day->day;
-    fields.tm_isdst = -1;
-    if (!time.empty()) {
-        fields.tm_hour = number(time, 1, 2);
-        fields.tm_min = number(time, 4, 2);
-        fields.tm_sec = number(time, 7, 2);
-    }
-    if (fields.tm_hour > 23 || fields.tm_min > 59 || fields.tm_sec > 59)
-        return std::nullopt;
-    return std::mktime(&fields);
+    return std::mktime(&*fields);
 }
 
 } // namespace mihost

@@ -9,9 +9,7 @@
 
 #include <cstdlib>
 #include <fcntl.h>
-#include <fstream>
 #include <sched.h>
-#include <sstream>
 #include <sys/mount.h>
 #include <sys/stat.h>
 #include <sys/syscall.h>
@@ -54,14 +52,6 @@ void makeReadOnly(std::string const& path)
     attributes.attr_set = MOUNT_ATTR_RDONLY;
     check(mount_setattr(AT_FDCWD, path.c_str(), AT_RECURSIVE, &attributes, sizeof attributes),
           "cannot make " + path + " read-only");
-}
-
-std::string readText(std::string const& path)
-{
-    std::ifstream file(path);
-    std::ostringstream text;
-    text << file.rdbuf();
-    return text.str();
 }
 
 /** Overlays one file system of the machine each, all writes going to the stage. */
@@ -202,12 +192,12 @@ Descriptor keepMountsPrivate()
 }
 
 /** From a /proc of its own: the machine's may be missing, as in a chroot. */
-std::string readMountTable()
+std::vector<std::string> readMounts()
 {
     mountAt(stage, "proc", MS_NOSUID | MS_NODEV | MS_NOEXEC, "");
-    std::string table = readText(stage + "/self/mountinfo");
+    std::vector<std::string> const mounts = mountsToCopy(stage + "/self/mountinfo");
     check(umount2(stage.c_str(), MNT_DETACH), "cannot leave " + stage);
-    return table;
+    return mounts;
 }
 
 /** @param top  the root of all mounts: only from there another one can take its place */
@@ -230,7 +220,7 @@ void enterMachineCopy()
     std::free(there);
 
     Descriptor const top = keepMountsPrivate();
-    std::vector<std::string> const mounts = mountsToCopy(readMountTable());
+    std::vector<std::string> const mounts = readMounts();
     mountAt(stage, "tmpfs", MS_NODEV, "mode=0700");
     makeFolder(copyRoot, 0755);
     Overlays overlays;

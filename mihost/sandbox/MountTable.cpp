@@ -1,6 +1,5 @@
 #include "mihost/sandbox/MountTable.h"
 
-#include <cstdio>
 #include <libmount.h>
 #include <memory>
 #include <new>
@@ -15,7 +14,6 @@ namespace
 
 using Table = std::unique_ptr<libmnt_table, decltype(&mnt_unref_table)>;
 using Iterator = std::unique_ptr<libmnt_iter, decltype(&mnt_free_iter)>;
-using Stream = std::unique_ptr<std::FILE, decltype(&std::fclose)>;
 
 template <class Type> Type* required(Type* made)
 {
@@ -30,16 +28,12 @@ int skipLine(libmnt_table*, char const*, int)
     return 1;
 }
 
-Table parse(std::string const& mountInfo)
+Table parse(std::string const& file)
 {
     Table table(required(mnt_new_table()), mnt_unref_table);
-    if (mountInfo.empty())
-        return table; // fmemopen refuses it
     mnt_table_set_parser_errcb(table.get(), skipLine);
-    std::string text = mountInfo;
-    Stream const stream(required(fmemopen(text.data(), text.size(), "r")), std::fclose);
-    if (mnt_table_parse_stream(table.get(), stream.get(), "mountinfo") != 0)
-        throw std::runtime_error("cannot parse the table of mounts");
+    if (mnt_table_parse_file(table.get(), file.c_str()) != 0)
+        throw std::runtime_error("cannot read the table of mounts in " + file);
     return table;
 }
 
@@ -69,9 +63,9 @@ bool isKernelsOwn(std::string const& type)
 
 } // namespace
 
-std::vector<std::string> mountsToCopy(std::string const& mountInfo)
+std::vector<std::string> mountsToCopy(std::string const& file)
 {
-    Table const table = parse(mountInfo);
+    Table const table = parse(file);
     Iterator const iterator(required(mnt_new_iter(MNT_ITER_FORWARD)), mnt_free_iter);
     std::set<std::string> paths;
     libmnt_fs* mount = nullptr;

@@ -12,9 +12,10 @@ namespace mihost
  * once, a parent before what is mounted below it. Those of the kernel's own file systems and those
  * below /proc, /sys, /dev and /run are left out.
  *
- * @param mountInfo  the text of /proc/self/mountinfo
+ * @param file  /proc/self/mountinfo, perhaps in another place
+ * @throws std::runtime_error if it cannot be read
  */
-std::vector<std::string> mountsToCopy(std::string const& mountInfo);
+std::vector<std::string> mountsToCopy(std::string const& file);
 
 } // namespace mihost
 

@@ -1,6 +1,7 @@
 #include "mihost/cli/doctor/FileChecks.h"
 
 #include "mihost/cli/system/TextFile.h"
+#include "mihost/sandbox/Stream.h"
 
 #include <algorithm>
 #include <array>
@@ -23,13 +24,6 @@ namespace
 
 constexpr std::size_t entryBuffer = 4096; // what the plug-in reads an account's entries into
 
-struct CloseFile {
-    void operator()(std::FILE* file) const
-    {
-        std::fclose(file);
-    }
-};
-
 /** Reads one line as libc reads a file of such entries. */
 template <class Entry> class LineEntry
 {
@@ -39,7 +33,7 @@ public:
     LineEntry(std::string line, Read read, std::size_t size) : line_(std::move(line)), buffer_(size)
     {
         line_ += '\n';
-        std::unique_ptr<std::FILE, CloseFile> const file(fmemopen(line_.data(), line_.size(), "r"));
+        Stream const file(fmemopen(line_.data(), line_.size(), "r"));
         Entry* found = nullptr;
         error_ = read(file.get(), &entry_, buffer_.data(), buffer_.size(), &found);
     }

@@ -50,9 +50,11 @@ TEST_P(ManualPage, HoldsToTheMacros)
             ADD_FAILURE() << note;
 }
 
-char const* const pageNames[] = {"Mihost", "Plugin", "HostCheck", "Ansible"};
+char const* const pageNames[] = {"Mihost", "Plugin", "HostCheck", "Ansible", "Exporter"};
 
-INSTANTIATE_TEST_SUITE_P(All, ManualPage, testing::Values(MIHOST_PAGE, PLUGIN_PAGE, HOSTCHECK_PAGE, ANSIBLE_PAGE),
+INSTANTIATE_TEST_SUITE_P(All, ManualPage,
+                         testing::Values(MIHOST_PAGE, PLUGIN_PAGE, HOSTCHECK_PAGE, ANSIBLE_PAGE,
+                                         EXPORTER_PAGE),
                          [](auto const& which) { return std::string(pageNames[which.index]); });
 
 TEST(ManualPageOfMihost, TellsOfEveryOption)

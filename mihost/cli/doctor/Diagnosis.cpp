@@ -13,6 +13,7 @@
 #include <cerrno>
 #include <cstdlib>
 #include <cstring>
+#include <fcntl.h>
 #include <fmt/format.h>
 #include <fstream>
 #include <sstream>
@@ -29,9 +30,10 @@ constexpr char rangeFile[] = "/etc/login.defs";
 constexpr char releaseFile[] = "/etc/release";
 constexpr char logFile[] = "/var/log/messages";
 
+/** By the rights that this process has, which need not be those of its user. */
 Problem accessProblem(std::string const& path, int mode = R_OK)
 {
-    if (access(path.c_str(), mode) == 0)
+    if (faccessat(AT_FDCWD, path.c_str(), mode, AT_EACCESS) == 0)
         return std::nullopt;
     return std::strerror(errno);
 }
@@ -180,6 +182,9 @@ std::vector<Need> surroundings()
          "language-edition and code-set of os", "update-locale LANG=C.UTF-8",
          "localectl set-locale LANG=C.UTF-8", ""},
     };
+    if (isThere(logFile))
+        needs.push_back({"leave to empty the system log", accessProblem(logFile, W_OK), "clear-log",
+                         "sudo mihost", "sudo mihost", ""});
     if (isRoot) {
         std::vector<Need> const ofRoot = capabilities();
         needs.insert(needs.end(), ofRoot.begin(), ofRoot.end());
@@ -331,8 +336,6 @@ std::vector<Need> log()
         return needs;
     needs.push_back({"classic stamps in the system log", problemOfStamps(newestLogLines()),
                      "messages and times of log entries", traditional, traditional, ""});
-    needs.push_back({"leave to empty the system log", accessProblem(logFile, W_OK), "clear-log",
-                     "sudo mihost", "sudo mihost", ""});
     return needs;
 }
 

@@ -36,6 +36,7 @@ class Controller:
             'ANSIBLE_PIPELINING': 'True',
             'ANSIBLE_SSH_ARGS': '-F none -C -o ControlMaster=auto -o ControlPersist=60s',
             'ANSIBLE_NOCOLOR': '1',
+            'PYTHONDONTWRITEBYTECODE': '1',
         }
         open(self.path('ansible.cfg'), 'w').close()
         targets.make_keys(self.folder)

@@ -36,8 +36,8 @@ def problem(tools):
     return None
 
 
-def main(*tools):
-    """Runs the tests of the calling file, or skips all of them with the reason."""
+def skip_or_fail_without(tools):
+    """Ends the program if the tests cannot run here."""
     reason = problem(tools)
     if reason and os.environ.get('MI_INTEGRATION_REQUIRED') != '1':
         # In the form that script/test looks for.
@@ -45,4 +45,19 @@ def main(*tools):
         sys.exit(SKIPPED)
     if reason:
         sys.exit(reason)
+
+
+def main(*tools):
+    """Runs the tests of the calling file, or skips all of them with the reason."""
+    skip_or_fail_without(tools)
+    unittest.main(verbosity=2)
+
+
+def main_in_sandbox(*tools):
+    """As main, all of it in a copy of this machine that is gone afterwards."""
+    skip_or_fail_without(tools)
+    inside = '--in-sandbox'
+    if inside not in sys.argv:
+        os.execv(SANDBOXED, [SANDBOXED, sys.executable, *sys.argv, inside])
+    sys.argv.remove(inside)
     unittest.main(verbosity=2)

@@ -8,11 +8,13 @@
 #include <map>
 #include <optional>
 #include <string>
+#include <sys/types.h>
 #include <vector>
 
 struct group;
 struct passwd;
 struct spwd;
+struct statfs;
 struct sysinfo;
 struct utsname;
 
@@ -46,6 +48,10 @@ struct Hooks {
     std::function<void()> setgrent;
     std::function<struct group*()> getgrent;
     std::function<void()> endgrent;
+    std::function<int(clockid_t clock, timespec* now)> clock_gettime;
+    std::function<ssize_t(int descriptor, void* buffer, std::size_t size, off_t offset)> pread;
+    std::function<int(int descriptor, struct statfs* system)> fstatfs;
+    std::function<uid_t()> geteuid;
 };
 
 Hooks& hooks();
@@ -62,6 +68,9 @@ int realFgetspent_r(FILE* stream, struct spwd* entry, char* buffer, std::size_t 
 char* realFgets(char* buffer, int size, FILE* stream);
 int realUname(struct utsname* system);
 std::time_t realMktime(std::tm* fields);
+int realClockGettime(clockid_t clock, timespec* now);
+ssize_t realPread(int descriptor, void* buffer, std::size_t size, off_t offset);
+int realFstatfs(int descriptor, struct statfs* system);
 
 /** From now on this command, and it alone, cannot be started: popen yields null. */
 void refuse(std::string const& command);
@@ -74,6 +83,20 @@ public:
     ~HookGuard();
     HookGuard(HookGuard const&) = delete;
     HookGuard& operator=(HookGuard const&) = delete;
+};
+
+/** Counts the bytes that pread reads from now on. */
+class ReadCounter
+{
+public:
+    ReadCounter();
+
+    std::size_t bytes() const;
+    void reset();
+
+private:
+    HookGuard guard_;
+    std::size_t bytes_ = 0;
 };
 
 /**

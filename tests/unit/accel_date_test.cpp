@@ -2,8 +2,8 @@
 
 #include "mihost/accel/Answers.h"
 #include "tests/support/BothWays.h"
+#include "tests/support/Libc.h"
 #include "tests/support/ScratchFolder.h"
-#include "tests/unit/AccelStandIns.h"
 
 #include <cstdlib>
 #include <filesystem>
@@ -124,8 +124,8 @@ TEST(AccelDate, IsRunAgainInAnotherEnvironment)
 /** For as long as it lives, this process has another time than the commands that it runs. */
 void shiftClock(std::time_t seconds)
 {
-    accelStandIns::hooks().clock_gettime = [seconds](clockid_t clock, timespec* now) {
-        int const result = accelStandIns::realClockGettime(clock, now);
+    libc::hooks().clock_gettime = [seconds](clockid_t clock, timespec* now) {
+        int const result = libc::realClockGettime(clock, now);
         now->tv_sec += seconds;
         return result;
     };
@@ -134,7 +134,7 @@ void shiftClock(std::time_t seconds)
 TEST(AccelDate, IsLeftToADateThatPrintsSomethingElse)
 {
     setenv("TZ", "UTC0", 1);
-    accelStandIns::Guard const guard;
+    libc::HookGuard const guard;
     shiftClock(2 * day);
     std::string const first = answered("date").value();
     EXPECT_EQ(first.substr(0, 10), real("date").substr(0, 10)) << "not what the real one printed";
@@ -150,7 +150,7 @@ TEST(AccelDate, IsRunAgainInEveryOtherHour)
     setenv("TZ", "UTC0", 1);
     EXPECT_TRUE(answered("date"));
     unsigned long const before = countOf("date").handed_on;
-    accelStandIns::Guard const guard;
+    libc::HookGuard const guard;
     shiftClock(3600);
     EXPECT_TRUE(answered("date"));
     EXPECT_EQ(countOf("date").handed_on, before + 1);

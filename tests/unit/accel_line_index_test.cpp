@@ -1,7 +1,7 @@
 #include "mihost/accel/LineIndex.h"
 #include "mihost/sandbox/Descriptor.h"
+#include "tests/support/Libc.h"
 #include "tests/support/ScratchFolder.h"
-#include "tests/unit/AccelStandIns.h"
 
 #include <algorithm>
 #include <fcntl.h>
@@ -34,7 +34,7 @@ protected:
     /** How much it reads for that. */
     std::size_t bytesToUpdate()
     {
-        accelStandIns::ReadCounter const counter;
+        libc::ReadCounter const counter;
         EXPECT_TRUE(update());
         return counter.bytes();
     }
@@ -98,7 +98,7 @@ TEST_F(AccelLineIndex, ReadsOneBlockToFindALine)
 {
     write(std::string(4'000'000, '\n'));
     ASSERT_TRUE(update());
-    accelStandIns::ReadCounter counter;
+    libc::ReadCounter counter;
     for (std::uint64_t line = 1; line < index_.lineEnds(); line += 99991) {
         counter.reset();
         ASSERT_EQ(index_.find(file_.get(), line), line - 1);
@@ -178,8 +178,8 @@ TEST_F(AccelLineIndex, FailsWhenTheFileEndsBeforeItsSize)
 {
     write("1\n2\n");
     {
-        accelStandIns::Guard const guard;
-        accelStandIns::hooks().pread = [](int, void*, std::size_t, off_t) -> ssize_t { return 0; };
+        libc::HookGuard const guard;
+        libc::hooks().pread = [](int, void*, std::size_t, off_t) -> ssize_t { return 0; };
         EXPECT_FALSE(update());
     }
     expectIndexOf("1\n2\n");

@@ -1,13 +1,13 @@
 // wc and sed, asked in both ways and compared byte by byte.
 
 #include "tests/support/ComparedLog.h"
-#include "tests/unit/AccelStandIns.h"
 
 #include <atomic>
 #include <filesystem>
 #include <fstream>
 #include <linux/magic.h>
 #include <sys/stat.h>
+#include <sys/vfs.h>
 #include <thread>
 
 namespace
@@ -47,7 +47,7 @@ TEST_F(AccelLog, IsIndexedOnceForBothCommands)
 {
     constexpr std::size_t size = 4'000'000;
     folder_.write("log", std::string(size, '\n'));
-    accelStandIns::ReadCounter const counter;
+    libc::ReadCounter const counter;
     EXPECT_TRUE(answered(wc_));
     EXPECT_TRUE(answered(sed(size)));
     EXPECT_LT(counter.bytes(), size + size / 10);
@@ -118,10 +118,10 @@ TEST_F(AccelLog, IsLeftToTheCommandsWhenItIsCutWhileItIsRead)
 {
     folder_.write("log", "1\n2\n3\n");
     {
-        accelStandIns::Guard const guard;
-        accelStandIns::hooks().pread = [&](int file, void* buffer, std::size_t size, off_t offset) {
+        libc::HookGuard const guard;
+        libc::hooks().pread = [&](int file, void* buffer, std::size_t size, off_t offset) {
             std::filesystem::resize_file(folder_.path("log"), 4);
-            return accelStandIns::realPread(file, buffer, size, offset);
+            return libc::realPread(file, buffer, size, offset);
         };
         EXPECT_FALSE(answered(wc_));
         EXPECT_EQ(reasonOf("wc"), "the file changes while it is read");
@@ -155,19 +155,19 @@ TEST_F(AccelLog, IsLeftToTheCommandsOnFileSystemsThatMayLieAboutTimes)
 {
     folder_.write("log", "1\n");
     ASSERT_TRUE(answered(wc_));
-    accelStandIns::Guard const guard;
+    libc::HookGuard const guard;
     for (unsigned long const type :
          {NFS_SUPER_MAGIC + 0UL, SMB2_SUPER_MAGIC + 0UL, CIFS_SUPER_MAGIC + 0UL,
           FUSE_SUPER_MAGIC + 0UL, V9FS_MAGIC + 0UL, CEPH_SUPER_MAGIC + 0UL}) {
-        accelStandIns::hooks().fstatfs = [type](int file, struct statfs* system) {
-            int const result = accelStandIns::realFstatfs(file, system);
+        libc::hooks().fstatfs = [type](int file, struct statfs* system) {
+            int const result = libc::realFstatfs(file, system);
             system->f_type = static_cast<decltype(system->f_type)>(type);
             return result;
         };
         EXPECT_FALSE(answered(wc_)) << type;
         EXPECT_EQ(reasonOf("wc"), "the file system may not give every change a new time");
     }
-    accelStandIns::hooks().fstatfs = [](int, struct statfs*) { return -1; };
+    libc::hooks().fstatfs = [](int, struct statfs*) { return -1; };
     EXPECT_FALSE(answered(wc_));
 }
 

@@ -1,8 +1,8 @@
 // Whenever the shell could run something else, the real popen is called.
 
 #include "tests/support/BothWays.h"
+#include "tests/support/Libc.h"
 #include "tests/support/ScratchFolder.h"
-#include "tests/unit/AccelStandIns.h"
 
 #include <cstdlib>
 #include <filesystem>
@@ -118,8 +118,8 @@ TEST_F(AccelTrust, StaysWithVariablesThatChangeNothing)
 
 TEST_F(AccelTrust, EndsInAProcessWithTwoIdentities)
 {
-    accelStandIns::Guard const guard;
-    accelStandIns::hooks().geteuid = [] { return getuid() + 1; };
+    libc::HookGuard const guard;
+    libc::hooks().geteuid = [] { return getuid() + 1; };
     EXPECT_FALSE(answered(wc_));
 }
 

@@ -25,7 +25,7 @@ class Controller:
         self.hosts = []
         self.environment = {
             'HOME': self.folder,
-            'PATH': os.environ['PATH'],
+            'PATH': '/usr/sbin:/usr/bin:/sbin:/bin',
             'LC_ALL': 'C.UTF-8',
             'ANSIBLE_HOME': self.path('ansible'),
             'ANSIBLE_CONFIG': self.path('ansible.cfg'),

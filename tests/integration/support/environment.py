@@ -31,7 +31,7 @@ def problem(tools):
     if os.geteuid() != 0:
         return 'only root can make copies of the machine'
     for tool in tools:
-        if not shutil.which(tool):
+        if not shutil.which(tool) and not os.path.exists(tool):
             return f"no {tool} here; 'script/bootstrap integration' installs it"
     return None
 

@@ -36,6 +36,6 @@ attributes:
     description: The lines of the files that change, with password hashes hidden.
     support: full
 notes:
-  - Changes need root on the target, as C(become: true) gives it.
+  - Changes need root on the target, which C(become) gives.
   - With C(pipelining = True) in the configuration each task takes one round trip over ssh.
 '''

@@ -13,7 +13,7 @@ description:
     desired state instead.
 version_added: 0.1.0
 author:
-  - The mihost developers
+  - The mihost developers (!UNKNOWN)
 options:
   method:
     description:

@@ -12,7 +12,7 @@ description:
     the system log, as native types keyed by name.
 version_added: 0.1.0
 author:
-  - The mihost developers
+  - The mihost developers (!UNKNOWN)
 options:
   kind:
     description:

@@ -13,7 +13,7 @@ description:
     known before.
 version_added: 0.1.0
 author:
-  - The mihost developers
+  - The mihost developers (!UNKNOWN)
 options:
   name:
     description:

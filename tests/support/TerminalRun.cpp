@@ -3,6 +3,7 @@
 #include <array>
 #include <csignal>
 #include <fcntl.h>
+#include <poll.h>
 #include <pty.h>
 #include <stdexcept>
 #include <sys/ioctl.h>
@@ -50,8 +51,13 @@ void TerminalRun::type(std::string const& text) const
         throw std::runtime_error("cannot type");
 }
 
-bool TerminalRun::readMore()
+bool TerminalRun::readMore(Clock::time_point deadline)
 {
+    auto const left =
+        std::chrono::duration_cast<std::chrono::milliseconds>(deadline - Clock::now());
+    pollfd terminal{master_, POLLIN, 0};
+    if (left.count() <= 0 || poll(&terminal, 1, static_cast<int>(left.count())) == 0)
+        throw std::runtime_error("nothing came in time after: " + output_.substr(seen_));
     std::array<char, 4096> block{};
     ssize_t const count = read(master_, block.data(), block.size());
     if (count > 0)
@@ -59,8 +65,9 @@ bool TerminalRun::readMore()
     return count > 0; // the terminal's other end closes with an error
 }
 
-std::string TerminalRun::waitFor(std::string const& text)
+std::string TerminalRun::waitFor(std::string const& text, std::chrono::milliseconds limit)
 {
+    Clock::time_point const deadline = Clock::now() + limit;
     for (;;) {
         std::size_t const found = output_.find(text, seen_);
         if (found != std::string::npos) {
@@ -68,7 +75,7 @@ std::string TerminalRun::waitFor(std::string const& text)
             seen_ = found + text.size();
             return read;
         }
-        if (!readMore())
+        if (!readMore(deadline))
             throw std::runtime_error("ended without '" + text + "': " + output_.substr(seen_));
     }
 }
@@ -108,9 +115,10 @@ void TerminalRun::waitForDescendants() const
     }
 }
 
-int TerminalRun::end()
+int TerminalRun::end(std::chrono::milliseconds limit)
 {
-    while (readMore()) {
+    Clock::time_point const deadline = Clock::now() + limit;
+    while (readMore(deadline)) {
     }
     int status = 0;
     waitpid(child_, &status, 0);

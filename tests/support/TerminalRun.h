@@ -3,6 +3,7 @@
 
 #include "TestPaths.h"
 
+#include <chrono>
 #include <string>
 #include <sys/types.h>
 #include <vector>
@@ -14,6 +15,8 @@
 class TerminalRun
 {
 public:
+    static constexpr std::chrono::milliseconds usualLimit = std::chrono::minutes(2);
+
     explicit TerminalRun(std::vector<std::string> arguments, unsigned short columns = 80,
                          std::string const& program = MIHOST_FILE);
     ~TerminalRun();
@@ -26,10 +29,11 @@ public:
     /**
      * Reads until the text turns up behind what was read before.
      *
+     * @param limit  how long at most; a failing test must end, a slow machine must not fail one
      * @return what was read, up to the end of the text
-     * @throws std::runtime_error where the program ends before
+     * @throws std::runtime_error if the program ends before, or the time does
      */
-    std::string waitFor(std::string const& text);
+    std::string waitFor(std::string const& text, std::chrono::milliseconds limit = usualLimit);
 
     void resize(unsigned short columns) const;
 
@@ -39,9 +43,13 @@ public:
     /** Whether the terminal shows what is typed. */
     bool showsInput() const;
 
-    /** Reads to the end. @return the exit code, or 128 and the number of the signal that ended it
+    /**
+     * Reads to the end.
+     *
+     * @return the exit code, or 128 and the number of the signal that ended it
+     * @throws std::runtime_error if the program does not end in time
      */
-    int end();
+    int end(std::chrono::milliseconds limit = usualLimit);
 
     /** Waits until the program is stopped, as Ctrl-Z does. */
     void waitForStop() const;
@@ -61,7 +69,9 @@ public:
     }
 
 private:
-    bool readMore();
+    using Clock = std::chrono::steady_clock;
+
+    bool readMore(Clock::time_point deadline);
 
     pid_t child_ = -1;
     int master_ = -1;

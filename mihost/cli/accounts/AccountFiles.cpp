@@ -2,6 +2,8 @@
 
 #include "mihost/cli/system/TextFile.h"
 
+#include <charconv>
+
 namespace mihost
 {
 
@@ -16,17 +18,32 @@ std::vector<std::string> fieldsOf(std::string const& line, char separator)
     return fields;
 }
 
-Record recordOf(std::string const& file, std::string const& name)
+Record recordIn(std::vector<std::string> const& lines, std::string const& name)
 {
     constexpr std::size_t mostFields = 9; // of a shadow record
+    if (name.find(':') != std::string::npos)
+        return {}; // more than a name
     std::string const start = name + ':';
-    for (std::string const& line : linesOf(contentOf(file)))
+    for (std::string const& line : lines)
         if (line.compare(0, start.size(), start) == 0) {
             Record record = fieldsOf(line, ':');
             record.resize(std::max(record.size(), mostFields));
             return record;
         }
     return {};
+}
+
+Record recordOf(std::string const& file, std::string const& name)
+{
+    return recordIn(linesOf(contentOf(file)), name);
+}
+
+std::optional<unsigned int> idOf(std::string const& field)
+{
+    unsigned int id = 0;
+    char const* const end = field.data() + field.size();
+    auto const [rest, problem] = std::from_chars(field.data(), end, id);
+    return problem == std::errc() && rest == end ? std::optional(id) : std::nullopt;
 }
 
 AccountFiles readAccountFiles()

@@ -2,6 +2,7 @@
 #define MIHOST_CLI_ACCOUNTS_ACCOUNTFILES_H
 
 #include <map>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -16,7 +17,7 @@ constexpr char groupShadowFile[] = "/etc/gshadow";
 /** The fields of a record. */
 namespace accountField
 {
-enum { Group = 3, Comment, Home, Shell };
+enum { Password = 1, Id, Group, Comment, Home, Shell };
 }
 namespace shadowField
 {
@@ -31,13 +32,19 @@ enum { Id = 2, Members };
 using Record = std::vector<std::string>;
 
 /**
- * The record of this name as the file has it now; empty if it has none or cannot be read. Fields
- * that are missing from its end are empty.
+ * The first record of this name; empty if there is none. Fields that are missing from its end are
+ * empty.
  */
+Record recordIn(std::vector<std::string> const& lines, std::string const& name);
+
+/** The record of this name as the file has it now; empty if it has none or cannot be read. */
 Record recordOf(std::string const& file, std::string const& name);
 
 /** The pieces between separators, empty ones included. */
 std::vector<std::string> fieldsOf(std::string const& line, char separator);
+
+/** A field that is an id; nothing for anything else. */
+std::optional<unsigned int> idOf(std::string const& field);
 
 /** The lines of the files that hold the accounts, by path. Files that cannot be read are empty. */
 using AccountFiles = std::map<std::string, std::vector<std::string>>;

@@ -1,13 +1,14 @@
 #include "mihost/cli/change/PasswordHash.h"
 
+#include "mihost/cli/accounts/LoginDefs.h"
 #include "mihost/cli/input/InputValidation.h"
 #include "mihost/cli/plugin/CommandTap.h"
 #include "mihost/cli/system/Failure.h"
-#include "mihost/cli/system/TextFile.h"
 
+#include <algorithm>
 #include <cctype>
 #include <crypt.h>
-#include <sstream>
+#include <iterator>
 
 namespace mihost
 {
@@ -30,19 +31,11 @@ constexpr HashMethod hashMethods[] = {
 /** Null, libcrypt's own choice, also for methods that are too weak by now. */
 char const* systemPrefix()
 {
-    char const* prefix = nullptr;
-    for (std::string const& line : linesOf(contentOf("/etc/login.defs"))) {
-        std::istringstream words(line);
-        std::string key;
-        std::string name;
-        if (!(words >> key >> name) || key != "ENCRYPT_METHOD")
-            continue;
-        prefix = nullptr;
-        for (HashMethod const& method : hashMethods)
-            if (name == method.name)
-                prefix = method.prefix;
-    }
-    return prefix;
+    std::string const name = readLoginDefs().encryptMethod();
+    auto const found =
+        std::find_if(std::begin(hashMethods), std::end(hashMethods),
+                     [&name](HashMethod const& method) { return name == method.name; });
+    return found == std::end(hashMethods) ? nullptr : found->prefix;
 }
 
 std::string hashWith(std::string const& password, char const* prefix)

@@ -1,3 +1,4 @@
+#include "mihost/cli/accounts/LoginDefs.h"
 #include "mihost/cli/check/Accounts.h"
 #include "mihost/cli/check/LogRules.h"
 #include "mihost/cli/check/Scenarios.h"
@@ -5,9 +6,7 @@
 #include "mihost/cli/plugin/CommandTap.h"
 #include "nodes/ids.h"
 
-#include <cstdlib>
 #include <fmt/format.h>
-#include <fstream>
 #include <grp.h>
 #include <unistd.h>
 
@@ -19,7 +18,6 @@ namespace
 
 constexpr char groupName[] = "mihostck";
 constexpr char groupTool[] = "/usr/sbin/groupadd";
-constexpr char idRanges[] = "/etc/login.defs";
 
 IC::Error call(Subject& subject, std::string const& text)
 {
@@ -106,25 +104,14 @@ bool isShown(Subject& subject)
     return false;
 }
 
-/** The last value of a key that begins a line; 0 without one, as for the plug-in. */
-unsigned long idLimit(std::string const& key)
-{
-    unsigned long limit = 0;
-    std::ifstream file(idRanges);
-    for (std::string word; std::getline(file, word);)
-        if (word.rfind(key, 0) == 0 && word.size() > key.size())
-            limit = std::strtoul(word.c_str() + key.size() + 1, nullptr, 10);
-    return limit;
-}
-
 Verdict groupNode(Subject& subject)
 {
     group const* const made = getgrnam(groupName);
     if (!made)
         return skippedFor("no group was made");
-    if (made->gr_gid < idLimit("GID_MIN") || made->gr_gid > idLimit("GID_MAX"))
-        return skippedFor(
-            fmt::format("id {} is outside of GID_MIN to GID_MAX in {}", made->gr_gid, idRanges));
+    std::string const objection = readLoginDefs().groups().objectionTo("gid", made->gr_gid);
+    if (!objection.empty())
+        return skippedFor(objection);
     if (!isShown(subject))
         return {{"the new group has no node"}};
     return {};

@@ -2,6 +2,7 @@
 
 #include "mihost/cli/accounts/AccountFiles.h"
 #include "mihost/cli/accounts/LocalNames.h"
+#include "mihost/cli/accounts/LoginDefs.h"
 #include "mihost/cli/change/PasswordHash.h"
 #include "mihost/cli/doctor/FileChecks.h"
 #include "mihost/cli/plugin/CommandTap.h"
@@ -26,7 +27,6 @@ namespace mihost
 namespace
 {
 
-constexpr char rangeFile[] = "/etc/login.defs";
 constexpr char releaseFile[] = "/etc/release";
 constexpr char logFile[] = "/var/log/messages";
 
@@ -215,7 +215,8 @@ std::vector<Need> accounts()
 {
     std::vector<Need> needs = {
         {"id ranges in /etc/login.defs",
-         isThere(rangeFile) ? problemOfRanges(contentOf(rangeFile)) : accessProblem(rangeFile),
+         isThere(loginDefsFile) ? problemOfRanges(contentOf(loginDefsFile))
+                                : accessProblem(loginDefsFile),
          "ordinary users, ordinary groups", missingConfiguration, "dnf reinstall shadow-utils", ""},
         {"accounts in /etc/passwd", accessProblem(accountFile), "all users",
          "cp /usr/share/base-passwd/passwd.master /etc/passwd", "dnf reinstall setup", ""},

@@ -1,5 +1,6 @@
 #include "mihost/cli/doctor/FileChecks.h"
 
+#include "mihost/cli/accounts/LoginDefs.h"
 #include "mihost/cli/system/TextFile.h"
 #include "mihost/sandbox/Stream.h"
 
@@ -114,18 +115,7 @@ bool isStamp(std::string_view line)
 
 Problem problemOfRanges(std::string const& text)
 {
-    auto const lines = linesOf(text);
-    std::vector<std::string> missing;
-    for (std::string const key : {"UID_MIN", "UID_MAX", "GID_MIN", "GID_MAX"}) {
-        auto const line = std::find_if(lines.begin(), lines.end(), [&key](std::string const& each) {
-            return each.compare(0, key.size(), key) == 0;
-        });
-        unsigned int value = 0;
-        bool const hasNumber = line != lines.end() && line->size() > key.size() &&
-                               std::sscanf(line->c_str() + key.size() + 1, "%u", &value) == 1;
-        if (!hasNumber)
-            missing.push_back(key);
-    }
+    std::vector<std::string> const missing = LoginDefs(text).missingKeys();
     if (missing.empty())
         return std::nullopt;
     return fmt::format("no line begins with {} and a number", fmt::join(missing, ", "));

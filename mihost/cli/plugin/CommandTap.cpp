@@ -32,7 +32,6 @@ struct Note {
 struct State {
     Runner runner{next<Runner::Open>("popen"), next<Runner::Close>("pclose")};
     Guard* guard = nullptr;
-    Listener* listener = nullptr;
     unsigned int count = 0;
     bool recording = false;
     std::vector<std::shared_ptr<Note>> recorded;
@@ -150,11 +149,6 @@ void setGuard(Guard* guard)
     state().guard = guard;
 }
 
-void setListener(Listener* listener)
-{
-    state().listener = listener;
-}
-
 unsigned int count()
 {
     return state().count;
@@ -203,8 +197,6 @@ std::FILE* open(char const* line, char const* mode)
         return nullptr;
     }
     ++tapped.count;
-    if (tapped.listener)
-        tapped.listener->commandStarts(line);
     std::FILE* const running = start(line, mode);
     // A stream that the plug-in closed as an ordinary file may come back as another one.
     tapped.noting.erase(running);

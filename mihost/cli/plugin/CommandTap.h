@@ -41,17 +41,6 @@ using Guard = bool(char const* line);
 /** @param guard  asked about each command line of the plug-in; null for nobody */
 void setGuard(Guard* guard);
 
-/** Told of each command line before it starts. */
-class Listener
-{
-public:
-    virtual ~Listener() = default;
-    virtual void commandStarts(char const* line) = 0;
-};
-
-/** @param listener  stays the caller's; null for nobody */
-void setListener(Listener* listener);
-
 /** How many commands were started so far. */
 unsigned int count();
 

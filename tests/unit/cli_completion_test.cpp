@@ -67,6 +67,21 @@ TEST(Completion, OffersEachOptionOnce)
     EXPECT_EQ(after({"list", "--help"}), (Words{"--help", "--help-all"}));
 }
 
+TEST(Completion, OffersTheAccountsOfUserAndGroup)
+{
+    EXPECT_EQ(after({"user", ""}), (Words{"root", "jdoe"}));
+    EXPECT_EQ(after({"user", "j"}), Words{"jdoe"});
+    EXPECT_EQ(after({"group", ""}), Words{"staff"});
+}
+
+TEST(Completion, KnowsThatAHostFollows)
+{
+    for (char const* option : {"--host", "-H"}) {
+        EXPECT_EQ(after({option, "box", "ge"}), Words{"get"});
+        EXPECT_EQ(after({option, "ge"}), Words());
+    }
+}
+
 TEST(Completion, LeavesFilesAndFoldersToTheShell)
 {
     EXPECT_EQ(complete({"--plugin", ""}, namesOf, mihost::commandTable()).what,

@@ -9,6 +9,8 @@
     COMMAND(list)                                                                                  \
     COMMAND(get)                                                                                   \
     COMMAND(set)                                                                                   \
+    COMMAND(user)                                                                                  \
+    COMMAND(group)                                                                                 \
     COMMAND(call)                                                                                  \
     COMMAND(refresh)                                                                               \
     COMMAND(clearLog)                                                                              \

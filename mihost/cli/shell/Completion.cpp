@@ -156,6 +156,13 @@ Candidates values(Typed const& typed, std::string const&, NodeNames const&)
     return {};
 }
 
+/** Of "user" and "group", which are called like the kind of node. */
+Candidates accounts(Typed const& typed, std::string const&, NodeNames const& nodeNames)
+{
+    NodeKind const* const kind = kindAt(typed.command->get_name() + ':');
+    return kind ? names(*kind, "", nodeNames) : Candidates();
+}
+
 Candidates methodNames(Typed const&, std::string const&, NodeNames const&)
 {
     Candidates all;
@@ -254,6 +261,7 @@ constexpr Place places[] = {
     {"PARAMETER", parameters},
     {"--columns", columns},
     {"COMMAND", commandsOfHelp},
+    {"NAME", accounts},
 };
 
 /** The words of an option that takes one of a few. */

@@ -1,0 +1,31 @@
+#ifndef MIHOST_CLI_ACCOUNTS_ACCOUNTDATA_H
+#define MIHOST_CLI_ACCOUNTS_ACCOUNTDATA_H
+
+#include "mihost/cli/accounts/AccountFiles.h"
+#include "mihost/cli/accounts/LoginDefs.h"
+
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/** Everything on this machine that describes its local accounts and groups. */
+struct AccountData {
+    AccountFiles files;
+    LoginDefs loginDefs;
+    std::string loginRules;    // the text of /etc/pam.d/login
+    std::string shadowProblem; // why /etc/shadow cannot be read; empty if it can
+};
+
+AccountData readAccountData();
+
+/** The first field of each record of a file. */
+std::vector<std::string> namesIn(AccountData const& data, std::string const& file);
+
+/** The login failures that the rules allow, by the last "deny=" with a number; 0 for any. */
+long allowedLoginFailures(std::string const& loginRules);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,45 @@
+#include "mihost/cli/accounts/GroupDescription.h"
+
+#include <algorithm>
+
+namespace mihost
+{
+
+namespace
+{
+
+std::vector<std::string> accountsOf(AccountData const& data, unsigned int group)
+{
+    std::vector<std::string> names;
+    for (std::string const& line : data.files.at(accountFile)) {
+        Record const account = fieldsOf(line, ':');
+        if (account.size() > accountField::Group && idOf(account[accountField::Group]) == group)
+            names.push_back(account[0]);
+    }
+    return names;
+}
+
+std::vector<GroupDescription::Member> membersIn(AccountData const& data, std::string const& list)
+{
+    std::vector<std::string> const known = namesIn(data, accountFile);
+    std::vector<GroupDescription::Member> members;
+    for (std::string const& name : fieldsOf(list, ','))
+        if (!name.empty())
+            members.push_back({name, std::find(known.begin(), known.end(), name) != known.end()});
+    return members;
+}
+
+} // namespace
+
+std::optional<GroupDescription> describeGroup(AccountData const& data, std::string const& name)
+{
+    Record const group = recordIn(data.files.at(groupFile), name);
+    auto const id = group.empty() ? std::nullopt : idOf(group[groupField::Id]);
+    if (!id)
+        return std::nullopt;
+    return GroupDescription{name, *id, accountsOf(data, *id),
+                            membersIn(data, group[groupField::Members]),
+                            data.loginDefs.groups().objectionTo("gid", *id)};
+}
+
+} // namespace mihost

@@ -1,0 +1,21 @@
+#ifndef MIHOST_CLI_COMMANDS_USERVIEW_H
+#define MIHOST_CLI_COMMANDS_USERVIEW_H
+
+#include <string>
+
+namespace mihost
+{
+
+class Session;
+
+/**
+ * Shows one local account as its administrator reads it, whether the plug-in has a node for it or
+ * not.
+ *
+ * @throws Failure (NotFound) if there is none of this name
+ */
+void showUser(Session& session, std::string const& name);
+
+} // namespace mihost
+
+#endif

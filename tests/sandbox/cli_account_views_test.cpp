@@ -1,0 +1,147 @@
+// `mihost user NAME` and `mihost group NAME`, at a terminal and in a pipe.
+
+#include "TestPaths.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+#include "tests/support/TerminalRun.h"
+
+#include <ctime>
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+
+namespace
+{
+
+using Json = nlohmann::ordered_json;
+using Lines = std::vector<std::string>;
+
+/** Accounts whose passwords were changed ten days ago. */
+class AccountViews : public testing::Test
+{
+protected:
+    AccountViews()
+    {
+        machine::lay("plain");
+        machine::write("/etc/login.defs",
+                       "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+        machine::write("/etc/passwd", "root:x:0:0:Super:/root:/bin/sh\n"
+                                      "jdoe:x:1000:1000:J. Doe:/home/jdoe:/bin/sh\n"
+                                      "nobody:x:65534:65534:\x1b[2J:/none:/usr/sbin/nologin\n");
+        std::string const changed = std::to_string(std::time(nullptr) / 86400 - 10);
+        machine::write("/etc/shadow",
+                       "root:*:" + changed + ":0:99999:7:::\njdoe:$6$salt$hash:" + changed +
+                           ":0:22:14:::\n",
+                       0600);
+        machine::write("/etc/group", "root:x:0:\njdoe:x:1000:\ncrew:x:1001:jdoe,gone\n");
+        machine::write("/etc/pam.d/login", "auth required pam_tally2.so deny=3\n");
+    }
+};
+
+bool holds(std::string const& text, std::string const& part)
+{
+    return text.find(part) != std::string::npos;
+}
+
+TEST_F(AccountViews, TellAboutOneUserWhatAPersonWantsToKnow)
+{
+    Outcome const outcome = mihostRun({"user", "jdoe"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.err, "");
+    for (char const* line : {
+             "User                  jdoe\n",
+             "Full name             J. Doe\n",
+             "UID                   1000\n",
+             "Primary group         jdoe (1000)\n",
+             "Other groups          crew (1001)\n",
+             "Home directory        /home/jdoe\n",
+             "Login shell           /bin/sh\n",
+             "State                 active; the password expires in 12 days\n",
+             "Password              set\n",
+             "Active until          for ever\n",
+             "Account expires       never\n",
+             "Login failures        3 allowed\n",
+             "Node                  user:jdoe\n",
+         })
+        EXPECT_TRUE(holds(outcome.out, line)) << line << outcome.out;
+    EXPECT_TRUE(holds(outcome.out, " (10 days ago)\n")) << outcome.out;
+    EXPECT_TRUE(holds(outcome.out, " (in 12 days)\n")) << outcome.out;
+    EXPECT_FALSE(holds(outcome.out, "hash")) << outcome.out;
+}
+
+TEST_F(AccountViews, ShowOneUserAsJson)
+{
+    Json const user = Json::parse(mihostRun({"--json", "user", "jdoe"}).out);
+    EXPECT_EQ(user["uid"], 1000);
+    EXPECT_EQ(user["primary-group"], (Json{{"name", "jdoe"}, {"gid", 1000}}));
+    EXPECT_EQ(user["other-groups"], Json::array({{{"name", "crew"}, {"gid", 1001}}}));
+    EXPECT_EQ(user["state"], "active; the password expires in 12 days");
+    EXPECT_EQ(user["password"], "set");
+    EXPECT_EQ(user["password-days-left"], 12);
+    EXPECT_EQ(user["account-expires"], nullptr);
+    EXPECT_EQ(user["login-failures-allowed"], 3);
+    EXPECT_EQ(user["node"], "user:jdoe");
+    EXPECT_EQ(user["no-node"], nullptr);
+    EXPECT_FALSE(user.contains("unknown"));
+}
+
+TEST_F(AccountViews, SayWhyAnAccountHasNoNode)
+{
+    Outcome const outcome = mihostRun({"user", "nobody"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_TRUE(holds(outcome.out, "Node                  none: uid 65534 is above UID_MAX "
+                                   "60000\n"))
+        << outcome.out;
+    EXPECT_TRUE(holds(outcome.out, "Primary group         65534 (no group has this id)\n"));
+    EXPECT_EQ(outcome.err, "mihost: reading passwords and ageing: 'nobody' has no entry in "
+                           "/etc/shadow, so some values are unknown (see 'mihost doctor')\n");
+    Json const user = Json::parse(mihostRun({"--json", "user", "nobody"}).out);
+    EXPECT_EQ(user["node"], nullptr);
+    EXPECT_EQ(user["no-node"], "uid 65534 is above UID_MAX 60000");
+    EXPECT_EQ(user["state"], nullptr);
+    EXPECT_EQ(user["unknown"], "'nobody' has no entry in /etc/shadow");
+}
+
+TEST_F(AccountViews, TellAboutOneGroupWhatAPersonWantsToKnow)
+{
+    Outcome const outcome = mihostRun({"group", "crew"});
+    EXPECT_EQ(outcome.out, "Group             crew\n"
+                           "GID               1001\n"
+                           "Primary group of  -\n"
+                           "Other members     jdoe, gone (no such local account)\n"
+                           "Node              group:crew\n");
+    EXPECT_EQ(outcome.code, 0);
+    Json const group = Json::parse(mihostRun({"--json", "group", "jdoe"}).out);
+    EXPECT_EQ(group["primary-group-of"], Json::array({"jdoe"}));
+    EXPECT_EQ(group["other-members"], Json::array());
+}
+
+TEST_F(AccountViews, EndWith4ForANameThatNobodyHas)
+{
+    Outcome const user = mihostRun({"user", "jdeo"});
+    EXPECT_EQ(user.code, 4);
+    EXPECT_EQ(user.out, "");
+    EXPECT_EQ(user.err, "mihost: no local user 'jdeo' (did you mean 'jdoe'?)\n");
+    Outcome const group = mihostRun({"group", "xyz"});
+    EXPECT_EQ(group.code, 4);
+    EXPECT_EQ(group.err, "mihost: no local group 'xyz' ('mihost list groups' shows them)\n");
+}
+
+TEST_F(AccountViews, ShowNoControlCharactersAtATerminal)
+{
+    TerminalRun run({"user", "nobody"});
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_FALSE(holds(run.output(), "\x1b[2J"));
+    EXPECT_TRUE(holds(run.output(), "UID                   65534\r\n")) << run.output();
+}
+
+TEST_F(AccountViews, SayWhatOnlyRootCanSee)
+{
+    Outcome const outcome = runToEnd(
+        {"/usr/bin/setpriv", "--reuid=65534", "--clear-groups", MIHOST_FILE, "user", "jdoe"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_TRUE(holds(outcome.out, "State                 -\n")) << outcome.out;
+    EXPECT_TRUE(holds(outcome.out, "Account expires       -\n")) << outcome.out;
+    EXPECT_TRUE(holds(outcome.err, "/etc/shadow cannot be read: Permission denied")) << outcome.err;
+}
+
+} // namespace

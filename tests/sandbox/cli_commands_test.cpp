@@ -1,12 +1,14 @@
 // The program itself, run on fixture machines as a person or a script runs it.
 
 #include "TestPaths.h"
+#include "mihost/cli/input/Day.h"
 #include "mihost/sandbox/Sandbox.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
 #include <algorithm>
+#include <ctime>
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
@@ -278,8 +280,14 @@ TEST(MihostTiming, TellsEachPhaseOfTheStartAndHowManyCommandsItRan)
 TEST(MihostWatch, PrintsTheFirstReadingAndThenOnlyWhatChanged)
 {
     makeMachine();
-    EXPECT_EQ(mihostRun({"watch", "os", "os-name", "--interval", "0", "--count", "3"}).out,
-              "108 os-name  Linux\n");
+    long const before = std::time(nullptr);
+    std::string const line =
+        mihostRun({"watch", "os", "os-name", "--interval", "0", "--count", "3"}).out;
+    EXPECT_EQ(line.substr(19), "  108 os-name  Linux\n");
+    auto const time = mihost::parseTime(line.substr(0, 19));
+    ASSERT_TRUE(time) << line;
+    EXPECT_GE(*time, before);
+    EXPECT_LE(*time, std::time(nullptr));
     // The log grows whenever it is counted.
     machine::fake("/usr/bin/wc", "n=$(sed -n '$=' /var/log/messages)\n"
                                  "echo \"Jan  2 03:04:05 line $((n + 1))\" >>/var/log/messages\n"
@@ -288,6 +296,7 @@ TEST(MihostWatch, PrintsTheFirstReadingAndThenOnlyWhatChanged)
                                            "--interval", "0", "--count", "2"})
                                     .out);
     ASSERT_EQ(lines.size(), 2U);
+    EXPECT_GE(Json::parse(lines[0])["time"], before);
     Json const first = Json::parse(lines[0])["properties"];
     Json const second = Json::parse(lines[1])["properties"];
     EXPECT_EQ(first.size(), 2U);

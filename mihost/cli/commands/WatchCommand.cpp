@@ -1,13 +1,18 @@
 #include "mihost/cli/commands/CommandRows.h"
+#include "mihost/cli/commands/Repetition.h"
+#include "mihost/cli/input/Address.h"
+#include "mihost/cli/input/Day.h"
 #include "mihost/cli/output/PropertyText.h"
-#include "mihost/cli/output/Terminal.h"
 #include "mihost/cli/plugin/Session.h"
-#include "mihost/cli/system/SignalWaiter.h"
 #include "mihost/cli/system/Stderr.h"
+#include "mihost/runtime/Text.h"
 
 #include <cmath>
 #include <cstdlib>
+#include <ctime>
+#include <fmt/format.h>
 #include <map>
+#include <utility>
 
 namespace mihost
 {
@@ -42,61 +47,85 @@ public:
     void run(Session& session) override
     {
         IC::MutableNode const& node = session.node(address_);
+        id_ = node.getNodeId();
+        address_ = addressOf(node);
         SignalWaiter signals;
         std::map<unsigned int, std::string> last;
+        bool isThere = true;
         for (unsigned int reading = 1;; ++reading) {
-            NodeView view = liveView(node, names_, session.secrets());
+            NodeView view = readNode(session, isThere);
             // Ctrl-C reaches the commands, too: what was read then is not to be shown.
-            if (!goesOn(session.out(), signals, 0))
+            if (!waitForNextRound(session.out(), signals, 0))
                 return;
-            std::vector<PropertyView> changed;
-            for (PropertyView const& property : view.properties) {
-                std::string const text = static_cast<std::string>(property.value);
-                auto const [entry, isNew] = last.try_emplace(property.id, text);
-                if (isNew || entry->second != text)
-                    changed.push_back(property);
-                entry->second = text;
-            }
-            view.properties = changed;
+            view.properties = changedOf(view, last);
             show(session, view);
             if (reading == 1)
                 Session::warnOfUnknown();
             else
                 takeUnknownWarning(); // it was given
-            if (reading == count_ || !goesOn(session.out(), signals, interval_))
+            if (reading == count_ || !waitForNextRound(session.out(), signals, interval_))
                 return;
         }
     }
 
 private:
-    /**
-     * Waits.
-     *
-     * @return whether the watch goes on
-     * @throws OutputClosed, which without a change would never be noticed
-     */
-    static bool goesOn(Output const& out, SignalWaiter& signals, double seconds)
+    /** The node, or the one of its name that the plug-in built in its place; null for none. */
+    IC::MutableNode const* findAgain(std::vector<IC::MutableNode*> const& nodes) const
     {
-        auto const event = signals.wait({out.descriptor(), 0, 0}, seconds);
-        if (event == SignalWaiter::Event::Ready)
-            throw OutputClosed();
-        if (event == SignalWaiter::Event::Signal && terminal::canAsk())
-            writeStderr("\n"); // the terminal shows ^C
-        return event == SignalWaiter::Event::Timeout;
+        IC::MutableNode const* found = nullptr;
+        for (IC::MutableNode const* node : nodes) {
+            if (node->getNodeId() == id_)
+                return node;
+            if (!found && addressOf(*node) == address_)
+                found = node;
+        }
+        return found;
+    }
+
+    /** Nothing while the plug-in does not have the node, which is reported once. */
+    NodeView readNode(Session& session, bool& isThere) const
+    {
+        IC::MutableNode const* const node = findAgain(session.nodes());
+        bool const wasThere = std::exchange(isThere, node != nullptr);
+        if (node)
+            return liveView(*node, names_, session.secrets());
+        if (wasThere)
+            writeStderr(fmt::format("mihost: watch: node '{}' is gone (waiting for it)\n",
+                                    printable(address_)));
+        return {nullptr, {}};
+    }
+
+    static std::vector<PropertyView> changedOf(NodeView const& view,
+                                               std::map<unsigned int, std::string>& last)
+    {
+        std::vector<PropertyView> changed;
+        for (PropertyView const& property : view.properties) {
+            std::string const text = static_cast<std::string>(property.value);
+            auto const [entry, isNew] = last.try_emplace(property.id, text);
+            if (isNew || entry->second != text)
+                changed.push_back(property);
+            entry->second = text;
+        }
+        return changed;
     }
 
     static void show(Session& session, NodeView const& view)
     {
         if (view.properties.empty())
             return;
-        if (session.options().json)
-            session.out().json(toJson(view));
-        else
-            writeProperties(view.properties, "", session.out());
+        long const now = std::time(nullptr);
+        if (session.options().json) {
+            Json document = {{"time", now}};
+            document.update(toJson(view));
+            session.out().json(document);
+        } else {
+            writeProperties(view.properties, timeText(now) + "  ", session.out());
+        }
         session.out().flush();
     }
 
     std::string address_;
+    unsigned int id_ = 0;
     std::vector<std::string> names_;
     double interval_ = 1;
     unsigned int count_ = 0;

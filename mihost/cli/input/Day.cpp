@@ -121,4 +121,14 @@ std::optional<long> parseTime(std::string_view text)
     return std::mktime(&*fields);
 }
 
+std::string timeText(long seconds)
+{
+    std::time_t const time = seconds;
+    std::tm fields{};
+    char text[sizeof "YYYY-MM-DD HH:MM:SS"];
+    bool const fits = localtime_r(&time, &fields) &&
+                      std::strftime(text, sizeof text, "%Y-%m-%d %H:%M:%S", &fields) != 0;
+    return fits ? text : "";
+}
+
 } // namespace mihost

@@ -39,6 +39,9 @@ std::optional<Day> dayOfNumber(long number);
 /** Seconds since 1970 of a point in local time, written as timeForm says. */
 std::optional<long> parseTime(std::string_view text);
 
+/** Such a point as "YYYY-MM-DD HH:MM:SS"; empty if its year cannot be written. */
+std::string timeText(long seconds);
+
 } // namespace mihost
 
 #endif

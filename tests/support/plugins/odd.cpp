@@ -3,6 +3,7 @@
 
 #include "host/MutableNode.h"
 #include "host/OpenMI.h"
+#include "nodes/ids.h"
 
 #include <cstdlib>
 #include <string>
@@ -28,6 +29,33 @@ public:
         nodes_.push_back(node);
         return {static_cast<unsigned char>(isOddIn("start") ? 5 : 0), IC::Number(0U), "no reason"};
     }
+
+    /** With "rebuild" the group "crew" is built again each time, with the count as its GID. */
+    IC::Error getMap(std::vector<IC::Node*>& nodes) override
+    {
+        if (isOddIn("rebuild") || isOddIn("vanish"))
+            rebuild();
+        return ManagementInterface::getMap(nodes);
+    }
+
+private:
+    void rebuild()
+    {
+        if (crew_)
+            deleteNode(crew_);
+        crew_ = nullptr;
+        ++rebuilt_;
+        if (isOddIn("vanish") && rebuilt_ % 2 == 0)
+            return;
+        crew_ = new IC::MutableNode(nextNodeId_++, 0, miIds_, NODES::groupType, 1);
+        crew_->setProperty(NODES::name, IC::PropertyValue("crew", true));
+        crew_->setProperty(NODES::id, IC::PropertyValue(IC::Number(rebuilt_), true));
+        IC::Node* node = crew_;
+        addNewNode(node);
+    }
+
+    IC::MutableNode* crew_ = nullptr;
+    unsigned int rebuilt_ = 0;
 };
 
 } // namespace

@@ -290,6 +290,54 @@ TEST_F(MihostTerminal, EndsTheShellOnCtrlD)
     EXPECT_TRUE(run.showsInput());
 }
 
+TEST_F(MihostTerminal, EndsTheShellOnCtrlDThatIsTypedWhileACommandRuns)
+{
+    machine::fake("/usr/sbin/userdel", "echo begun >/dev/tty; read go </tmp/go\n");
+    ASSERT_EQ(std::system("mkfifo /tmp/go"), 0);
+    TerminalRun run({"shell"});
+    run.waitFor(prompt);
+    run.type("call UserDel UserName=jdoe\n");
+    run.waitFor("begun");
+    run.type(std::string("get os 108\n") + ctrlD);
+    machine::write("/tmp/answer", "go\n");
+    ASSERT_EQ(std::system("cat /tmp/answer >/tmp/go"), 0);
+    run.waitFor("108 os-name  Linux");
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(run.showsInput());
+}
+
+TEST_F(MihostTerminal, RemembersTheLinesOfTheLastShellButNoPassword)
+{
+    setenv("HOME", "/tmp/home", 1);
+    unsetenv("XDG_STATE_HOME");
+    std::filesystem::create_directory("/tmp/home");
+    std::string const history = "/tmp/home/.local/state/mihost/history";
+    TerminalRun first({"shell"});
+    first.waitFor(prompt);
+    first.type("get os 108\n");
+    first.waitFor("108 os-name  Linux");
+    first.waitFor(prompt);
+    first.type("call UserSetPassword UserName=nobody-here Password=geheim42\n");
+    first.waitFor("mihost: call UserSetPassword");
+    first.waitFor(prompt);
+    first.type(ctrlD);
+    EXPECT_EQ(first.end(), 0);
+    EXPECT_EQ(machine::read(history), "get os 108\n");
+    EXPECT_EQ(std::filesystem::status(history).permissions(),
+              std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
+
+    TerminalRun second({"shell"});
+    second.waitFor(prompt);
+    second.type(up);
+    second.waitFor("get os 108");
+    second.type("\n");
+    second.waitFor("108 os-name  Linux");
+    second.waitFor(prompt);
+    second.type(ctrlD);
+    EXPECT_EQ(second.end(), 0);
+    EXPECT_EQ(machine::read(history), "get os 108\nget os 108\n");
+}
+
 TEST_F(MihostTerminal, DropsAShellsLineOnCtrlC)
 {
     TerminalRun run({"shell"});

@@ -3,6 +3,7 @@
 #include "mihost/cli/input/ShellWords.h"
 #include "mihost/cli/output/Terminal.h"
 #include "mihost/cli/output/TextTable.h"
+#include "mihost/cli/shell/HistoryFile.h"
 #include "mihost/cli/system/Failure.h"
 #include "mihost/cli/system/Interrupts.h"
 #include "mihost/cli/system/Stderr.h"
@@ -13,6 +14,7 @@
 #include <cwchar>
 #include <fcntl.h>
 #include <fmt/format.h>
+#include <sys/ioctl.h>
 #include <unistd.h>
 #include <utility>
 
@@ -22,7 +24,7 @@ namespace mihost
 namespace
 {
 
-constexpr int historySize = 1000;
+constexpr char ctrlD = '\x04';
 
 bool goesOn(std::string const& word)
 {
@@ -41,7 +43,7 @@ LineEditor::LineEditor(char const* prompt, Completer completer)
     if (!editor_)
         throw Failure(BadUsage, "the terminal cannot be used for editing lines");
     HistEvent event;
-    history(history_.get(), &event, H_SETSIZE, historySize);
+    history(history_.get(), &event, H_SETSIZE, historyLimit);
     history(history_.get(), &event, H_SETUNIQUE, 1);
     EditLine* const editor = editor_.get();
     el_set(editor, EL_CLIENTDATA, this);
@@ -88,6 +90,11 @@ int LineEditor::getCharacter(EditLine* editor, wchar_t* character)
         ssize_t const count = ::read(STDIN_FILENO, &byte, 1);
         if (count <= 0)
             return static_cast<int>(count);
+        // Ctrl-D typed while a command runs ends a line of the terminal, which keeps it as a NUL.
+        bool const isEarlyEnd = byte == '\0' && self.typedBefore_ > 0;
+        self.typedBefore_ = std::max(self.typedBefore_ - 1, 0);
+        if (isEarlyEnd)
+            byte = ctrlD;
         std::size_t const taken = std::mbrtowc(character, &byte, 1, &state);
         if (taken == static_cast<std::size_t>(-2))
             continue; // more bytes belong to it
@@ -146,6 +153,8 @@ LineEditor::End LineEditor::read(std::string& line)
     interrupts::setTerminalToRestore(&settings_);
     // It would show the prompt first; what is typed between the two would be taken amiss.
     el_set(editor_.get(), EL_PREP_TERM, 1);
+    if (ioctl(STDIN_FILENO, FIONREAD, &typedBefore_) != 0)
+        typedBefore_ = 0;
     int length = 0;
     char const* const text = el_gets(editor_.get(), &length);
     interrupts::setTerminalToRestore(nullptr);

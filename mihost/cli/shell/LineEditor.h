@@ -66,6 +66,7 @@ private:
 
     std::optional<SignalWaiter> signals_; // while reading
     bool interrupted_ = false;
+    int typedBefore_ = 0; // bytes left that were typed before the prompt
     std::string prompt_;
     Completer completer_;
     termios settings_{};                           // the terminal's, outside of reading

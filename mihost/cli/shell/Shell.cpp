@@ -3,6 +3,7 @@
 #include "mihost/cli/input/CommandLine.h"
 #include "mihost/cli/input/ShellWords.h"
 #include "mihost/cli/shell/Completion.h"
+#include "mihost/cli/shell/HistoryFile.h"
 #include "mihost/cli/shell/LineEditor.h"
 #include "mihost/runtime/Text.h"
 #include "mihost/sandbox/Sandbox.h"
@@ -95,12 +96,17 @@ void Shell::runInteractively()
 {
     char const* const prompt = inSandbox() ? "mihost (sandbox)> " : "mihost> ";
     LineEditor editor(prompt, [this](std::string const& line) { return candidatesFor(line); });
+    HistoryFile const history(historyPath());
+    for (std::string const& line : history.lines())
+        editor.remember(line);
     std::string line;
     for (auto end = editor.read(line); end != LineEditor::End::Finished; end = editor.read(line)) {
         if (end == LineEditor::End::Interrupted || line.empty())
             continue;
-        if (!holdsPassword(line))
+        if (!holdsPassword(line)) {
             editor.remember(line);
+            history.add(line);
+        }
         session_.setOptions(options_);
         try {
             if (runLine(line))

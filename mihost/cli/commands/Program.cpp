@@ -3,13 +3,18 @@
 #include "mihost/cli/accounts/LocalNames.h"
 #include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/input/CommandLine.h"
+#include "mihost/cli/input/Remote.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/shell/BashCompletion.h"
 #include "mihost/cli/shell/Completion.h"
 #include "mihost/cli/system/Failure.h"
 #include "mihost/cli/system/Interrupts.h"
 
+#include <cerrno>
 #include <clocale>
+#include <cstring>
+#include <fmt/format.h>
+#include <unistd.h>
 
 namespace mihost
 {
@@ -32,6 +37,28 @@ template <class Step> int guarded(Step step)
         tell({PluginRefused, error.what()});
         return PluginRefused;
     }
+}
+
+/** Somebody who types a password must not see it, which takes a terminal on both sides. */
+RemoteTerminal remoteTerminal()
+{
+    if (isatty(STDIN_FILENO) != 1)
+        return RemoteTerminal::None;
+    return isatty(STDOUT_FILENO) == 1 ? RemoteTerminal::Use : RemoteTerminal::Ignore;
+}
+
+/** ssh takes this program's place, with its streams; its exit status becomes this one's. */
+void runRemotely(std::string const& host, std::vector<std::string> const& words)
+{
+    auto const rest = withoutHost(words, host);
+    auto command = remoteCommand(host, rest, remoteTerminal());
+    std::vector<char*> arguments;
+    for (std::string& word : command)
+        arguments.push_back(word.data());
+    arguments.push_back(nullptr);
+    execvp(arguments[0], arguments.data());
+    throw Failure(BadUsage, fmt::format("--host: cannot run ssh: {} (install openssh-client)",
+                                        std::strerror(errno)));
 }
 
 int answer(std::string const& text)
@@ -62,6 +89,8 @@ int runProgram(int argc, char** argv)
         return code;
     if (!line.command())
         return answer(line.answer());
+    if (std::string const& host = line.options().host; !host.empty())
+        return guarded([&] { runRemotely(host, {argv + 1, argv + argc}); });
     std::unique_ptr<Session> session;
     int const run = guarded([&] {
         session = std::make_unique<Session>(line.options());

@@ -1,6 +1,7 @@
 #include "mihost/cli/input/CommandLine.h"
 
 #include "mihost/cli/input/Help.h"
+#include "mihost/cli/input/Remote.h"
 #include "mihost/cli/input/Suggestion.h"
 #include "mihost/cli/system/Failure.h"
 
@@ -107,6 +108,10 @@ CommandLine::CommandLine(CommandTable const& table, Place place, Options const& 
 void CommandLine::declareForProgram(CLI::App& app)
 {
     app.set_version_flag("--version", "mihost " MIHOST_VERSION);
+    app.add_option("-H,--host", options_.host,
+                   "run the command on HOST by ssh, with the mihost that is installed there")
+        ->type_name("[USER@]HOST")
+        ->each(expectHost);
     app.add_option("--plugin", options_.plugin, "load this plug-in file")->type_name("FILE");
     app.add_option("--trace", options_.trace,
                    "write every log message to FILE, - for standard error")

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <fmt/format.h>
+#include <string_view>
 #include <utility>
 
 namespace mihost
@@ -133,6 +134,24 @@ bool holdsPassword(std::string const& line)
     });
     auto const property = std::find_if(words.begin(), words.end(), isPasswordProperty);
     return inCall || words.end() - property > 1;
+}
+
+std::string quotedForShell(std::string const& word)
+{
+    constexpr std::string_view plain = "abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ"
+                                       "0123456789_-+./:,@";
+    if (!word.empty() && word.find_first_not_of(plain) == std::string::npos)
+        return word;
+    std::string quoted = "'";
+    for (char const byte : word) {
+        bool const isAwkward = byte == '\'' || byte == '\\' || byte == '!';
+        if (isAwkward)
+            quoted += "'\\";
+        quoted += byte;
+        if (isAwkward)
+            quoted += '\'';
+    }
+    return quoted + '\'';
 }
 
 } // namespace mihost

@@ -31,6 +31,12 @@ TypedLine typedLine(std::string const& line, std::string const& breaks);
 /** Whether a password stands in the line, so that it must not be kept. */
 bool holdsPassword(std::string const& line);
 
+/**
+ * The word so that a shell reads it as this one word: POSIX shells, and fish and csh too, which
+ * treat a backslash between quotes differently.
+ */
+std::string quotedForShell(std::string const& word);
+
 } // namespace mihost
 
 #endif

@@ -1,0 +1,36 @@
+#ifndef MIHOST_CLI_INPUT_REMOTE_H
+#define MIHOST_CLI_INPUT_REMOTE_H
+
+#include <string>
+#include <vector>
+
+namespace mihost
+{
+
+/** What ssh is to do with the terminal. */
+enum class RemoteTerminal {
+    Use,   // a terminal there, too: somebody sits here and sees the output
+    None,  // streams only
+    Ignore // nothing is read: what is typed here would be shown, a password too
+};
+
+/**
+ * The words without the one that names the host.
+ *
+ * @param host  as the words were understood
+ * @throws Failure (BadUsage) if it does not stand in the words by itself
+ */
+std::vector<std::string> withoutHost(std::vector<std::string> const& words,
+                                     std::string const& host);
+
+/** @throws Failure (BadUsage) for a text that ssh would not take for a host */
+void expectHost(std::string const& host);
+
+/** The arguments, "ssh" first, that run mihost with these words on a host. */
+std::vector<std::string> remoteCommand(std::string const& host,
+                                       std::vector<std::string> const& words,
+                                       RemoteTerminal terminal);
+
+} // namespace mihost
+
+#endif

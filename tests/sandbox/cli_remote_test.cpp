@@ -1,0 +1,225 @@
+// `mihost --host`, by the real ssh and the real sshd, which is started for each connection.
+
+#include "TestPaths.h"
+#include "tests/support/Lines.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+#include "tests/support/TerminalRun.h"
+
+#include <crypt.h>
+#include <csignal>
+#include <cstdlib>
+#include <filesystem>
+#include <gtest/gtest.h>
+
+namespace
+{
+
+namespace fs = std::filesystem;
+using Lines = std::vector<std::string>;
+
+bool holds(std::string const& text, std::string const& part)
+{
+    return text.find(part) != std::string::npos;
+}
+
+/** The host "box" is this machine, reached without a network. */
+class MihostRemote : public testing::Test
+{
+protected:
+    MihostRemote()
+    {
+        machine::lay("plain");
+        machine::write("/etc/login.defs",
+                       "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+        machine::write("/etc/shadow", "root:*:19000:0:99999:7:::\njdoe:!:19000:0:99999:7:::\n",
+                       0600);
+        machine::write("/etc/group", "root:x:0:\njdoe:x:1000:\nsshd:x:105:\n");
+        writeAccounts("/bin/sh");
+        machine::fake("/usr/sbin/lsmod", "echo 'Module Size'\n");
+        machine::write("/root/.ssh/config",
+                       "Host box\n"
+                       "  ProxyCommand /usr/sbin/sshd -i -f /etc/box.conf\n"
+                       "  StrictHostKeyChecking no\n"
+                       "  UserKnownHostsFile /dev/null\n"
+                       "  LogLevel ERROR\n"
+                       "  IdentityFile /root/.ssh/key\n",
+                       0600);
+        machine::write("/etc/box.conf", "HostKey /etc/box.key\n"
+                                        "AuthorizedKeysFile /root/.ssh/key.pub\n"
+                                        "StrictModes no\n"
+                                        "UsePAM no\n"
+                                        "PrintMotd no\n"
+                                        "PrintLastLog no\n");
+        for (char const* key : {"/etc/box.key", "/root/.ssh/key"})
+            if (runToEnd({"/usr/bin/ssh-keygen", "-q", "-t", "ed25519", "-N", "", "-f", key})
+                    .code != 0)
+                throw std::runtime_error("no key can be made");
+        fs::create_directories("/run/sshd");
+        fs::remove("/usr/local/bin/mihost");
+        fs::create_symlink(MIHOST_FILE, "/usr/local/bin/mihost");
+        setenv("TERM", "xterm", 1);
+    }
+
+    static void writeAccounts(std::string const& shellOfRoot)
+    {
+        machine::write("/etc/passwd", "root:x:0:0:Super:/root:" + shellOfRoot +
+                                          "\nsshd:x:105:65534::/run/sshd:/usr/sbin/nologin\n"
+                                          "jdoe:x:1000:1000:J. Doe:/home/jdoe:/bin/sh\n");
+    }
+
+    /** In its place, a program there that prints its arguments, one a line, each in brackets. */
+    static void printArgumentsThere()
+    {
+        fs::remove("/usr/local/bin/mihost");
+        machine::fake("/usr/local/bin/mihost", "printf '<%s>\\n' \"$@\"\n");
+    }
+
+    static bool hasPassword(std::string const& password)
+    {
+        std::string const hash = machine::entry("/etc/shadow", "jdoe").at(1);
+        return hash == crypt(password.c_str(), hash.c_str());
+    }
+};
+
+TEST_F(MihostRemote, PrintsWhatTheCommandPrintsThere)
+{
+    for (Lines const& command : {Lines{"get", "os", "os-name"}, Lines{"list", "users"},
+                                 Lines{"--json", "get", "user:jdoe"}}) {
+        Lines words = {"--host", "box"};
+        words.insert(words.end(), command.begin(), command.end());
+        Outcome const there = mihostRun(words);
+        EXPECT_EQ(there.out, mihostRun(command).out);
+        EXPECT_EQ(there.err, "");
+        EXPECT_EQ(there.code, 0);
+    }
+}
+
+TEST_F(MihostRemote, PassesErrorsAndTheExitStatusOn)
+{
+    Outcome const outcome = mihostRun({"-H", "root@box", "get", "user:jdeo"});
+    EXPECT_EQ(outcome.code, 4);
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_EQ(outcome.err, mihostRun({"get", "user:jdeo"}).err);
+}
+
+TEST_F(MihostRemote, PassesEveryArgumentOnAsItIs)
+{
+    printArgumentsThere();
+    std::string bytes;
+    for (int byte = 1; byte < 256; ++byte)
+        bytes += static_cast<char>(byte);
+    for (char const* shell : {"/bin/sh", "/bin/bash", "/usr/bin/fish", "/usr/bin/zsh"}) {
+        writeAccounts(shell);
+        for (std::string const& value :
+             {std::string(), std::string("it's a \"$HOME\" `id` \\ \\\\ \\' ! !! * ~ # ; & | > x"),
+              std::string("two\nlines"), std::string("~"), std::string("=ls"), bytes}) {
+            Outcome const outcome = mihostRun({"--host=box", "set", "os", "108", value, "--yes"});
+            EXPECT_EQ(outcome.code, 0) << shell << outcome.err;
+            EXPECT_EQ(outcome.out, "<set>\n<os>\n<108>\n<" + value + ">\n<--yes>\n")
+                << shell << outcome.err;
+        }
+    }
+}
+
+TEST_F(MihostRemote, KeepsASecretOnStandardInput)
+{
+    machine::record("/usr/bin/ssh");
+    Outcome const outcome = mihostRun(
+        {"--host", "box", "call", "UserSetPassword", "UserName=jdoe", "Password=-"}, "geheim42\n");
+    EXPECT_EQ(outcome.code, 0) << outcome.err;
+    EXPECT_TRUE(hasPassword("geheim42"));
+    auto const calls = machine::calls("/usr/bin/ssh");
+    ASSERT_EQ(calls.size(), 1U);
+    EXPECT_EQ(calls[0], (Lines{"-T", "--", "box",
+                               "exec mihost call UserSetPassword 'UserName=jdoe' 'Password=-'"}));
+}
+
+TEST_F(MihostRemote, RunsAScriptFromStandardInput)
+{
+    Outcome const outcome = mihostRun({"--host", "box", "shell"}, "get os 108\nget nothing\n");
+    EXPECT_EQ(outcome.code, 4);
+    EXPECT_EQ(outcome.out, "108 os-name  Linux\n");
+    EXPECT_TRUE(holds(outcome.err, "line 2: ")) << outcome.err;
+}
+
+TEST_F(MihostRemote, AsksAtTheTerminal)
+{
+    TerminalRun run({"--host", "box", "power", "halt"});
+    run.waitFor("halt the machine");
+    run.type("n\n");
+    EXPECT_EQ(run.end(), 2);
+    EXPECT_TRUE(run.showsInput());
+}
+
+TEST_F(MihostRemote, ShowsNoPasswordThatIsTyped)
+{
+    TerminalRun run({"--host", "box", "call", "UserSetPassword", "UserName=jdoe", "Password=-"});
+    run.waitFor("Password: ");
+    run.type("geheim42\n");
+    EXPECT_EQ(run.end(), 0) << run.output();
+    EXPECT_TRUE(hasPassword("geheim42"));
+    EXPECT_FALSE(holds(run.output(), "geheim42"));
+}
+
+TEST_F(MihostRemote, ReadsNothingFromATerminalIfItsOutputGoesElsewhere)
+{
+    std::string const command = std::string(MIHOST_FILE) +
+                                " --host box call UserSetPassword UserName=jdoe Password=- | cat";
+    TerminalRun run({"-c", command}, 200, "/bin/bash");
+    run.waitFor("standard input holds no line");
+    run.end();
+    EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), "!");
+}
+
+TEST_F(MihostRemote, EndsOnCtrlC)
+{
+    TerminalRun run({"--host", "box", "watch", "os", "os-name", "--interval", "1000"});
+    run.waitFor("os-name  Linux");
+    run.type("\x03");
+    EXPECT_EQ(run.end(), 0);
+}
+
+TEST_F(MihostRemote, EndsWith255IfSshCannotConnect)
+{
+    Outcome const outcome = mihostRun({"--host", "nowhere.invalid", "get", "os"});
+    EXPECT_EQ(outcome.code, 255);
+    EXPECT_TRUE(holds(outcome.err, "nowhere.invalid")) << outcome.err;
+}
+
+TEST_F(MihostRemote, SaysThatThereIsNoMihostThere)
+{
+    fs::remove("/usr/local/bin/mihost");
+    if (fs::exists("/usr/bin/mihost"))
+        GTEST_SKIP() << "mihost is installed here";
+    Outcome const outcome = mihostRun({"--host", "box", "get", "os"});
+    EXPECT_EQ(outcome.code, 127);
+    EXPECT_TRUE(holds(outcome.err, "mihost")) << outcome.err;
+}
+
+TEST_F(MihostRemote, NeedsSsh)
+{
+    setenv("PATH", "/nowhere", 1);
+    Outcome const outcome = mihostRun({"--host", "box", "get", "os"});
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_EQ(outcome.err, "mihost: --host: cannot run ssh: No such file or directory (install "
+                           "openssh-client)\n");
+}
+
+TEST_F(MihostRemote, LooksAtTheCommandBeforeItConnects)
+{
+    machine::record("/usr/bin/ssh");
+    for (Lines const& words :
+         {Lines{"--host", "-oProxyCommand=touch /tmp/run", "get", "os"}, Lines{"--host=", "get"},
+          Lines{"--host", "box", "nonsense"}, Lines{"--host", "box", "get"}})
+        EXPECT_EQ(mihostRun(words).code, 2) << words[1];
+    EXPECT_TRUE(machine::calls("/usr/bin/ssh").empty());
+    EXPECT_FALSE(fs::exists("/tmp/run"));
+}
+
+TEST_F(MihostRemote, IsNotForTheShellsLines)
+{
+    EXPECT_EQ(mihostRun({"shell"}, "--host box get os\n").code, 2);
+}
+
+} // namespace

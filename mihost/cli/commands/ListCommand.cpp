@@ -1,7 +1,9 @@
 #include "mihost/cli/commands/CommandRows.h"
+#include "mihost/cli/commands/LogOptions.h"
 #include "mihost/cli/output/NodeTable.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/Stderr.h"
+#include "nodes/ids.h"
 
 #include <algorithm>
 #include <fmt/format.h>
@@ -31,11 +33,21 @@ public:
                        "show these properties, separated by commas; also "
                        "id, index, status, description")
             ->delimiter(',');
+        logOptions_.declare(app);
     }
 
     void run(Session& session) override
     {
         NodeKind const& kind = *findList(kind_);
+        bool const isLog = kind.type == NODES::logEntryType;
+        if (std::string const option = logOptions_.firstGiven(); !isLog && !option.empty())
+            throw Failure(BadUsage, fmt::format("list {}: {} is an option of 'mihost list log'",
+                                                kind_, option));
+        logOptions_.check();
+        if (logOptions_.follows()) {
+            logOptions_.follow(session);
+            return;
+        }
         NodeTable const table(kind, columns_);
         std::vector<IC::MutableNode*> nodes = session.nodes();
         nodes.erase(std::remove_if(nodes.begin(), nodes.end(),
@@ -43,11 +55,17 @@ public:
                                        return node->getNodeType() != kind.type;
                                    }),
                     nodes.end());
+        bool const isEmpty = nodes.empty();
+        if (isLog)
+            nodes = logOptions_.chosen(nodes);
         if (session.options().json)
             session.out().json(table.json(nodes, session.secrets()));
         else
-            table.write(nodes, session.secrets(), session.out());
-        if (nodes.empty() && !session.options().json)
+            table.write(nodes, session.secrets(), session.out(),
+                        [this, isLog](PropertyView const& property) {
+                            return isLog ? logOptions_.shownText(property) : valueText(property);
+                        });
+        if (isEmpty && !session.options().json)
             writeStderr(
                 fmt::format("mihost: nothing to list under {}; see 'mihost doctor'\n", kind_));
     }
@@ -55,6 +73,7 @@ public:
 private:
     std::string kind_;
     std::vector<std::string> columns_;
+    LogOptions logOptions_;
 };
 
 } // namespace

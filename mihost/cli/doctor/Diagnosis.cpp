@@ -5,6 +5,8 @@
 #include "mihost/cli/accounts/LoginDefs.h"
 #include "mihost/cli/change/PasswordHash.h"
 #include "mihost/cli/doctor/FileChecks.h"
+#include "mihost/cli/log/LogFile.h"
+#include "mihost/cli/log/LogLine.h"
 #include "mihost/cli/plugin/CommandTap.h"
 #include "mihost/cli/system/Privilege.h"
 #include "mihost/cli/system/TextFile.h"
@@ -16,7 +18,6 @@
 #include <cstring>
 #include <fcntl.h>
 #include <fmt/format.h>
-#include <fstream>
 #include <sstream>
 #include <sys/utsname.h>
 #include <unistd.h>
@@ -28,7 +29,6 @@ namespace
 {
 
 constexpr char releaseFile[] = "/etc/release";
-constexpr char logFile[] = "/var/log/messages";
 
 /** By the rights that this process has, which need not be those of its user. */
 Problem accessProblem(std::string const& path, int mode = R_OK)
@@ -182,9 +182,9 @@ std::vector<Need> surroundings()
          "language-edition and code-set of os", "update-locale LANG=C.UTF-8",
          "localectl set-locale LANG=C.UTF-8", ""},
     };
-    if (isThere(logFile))
-        needs.push_back({"leave to empty the system log", accessProblem(logFile, W_OK), "clear-log",
-                         "sudo mihost", "sudo mihost", ""});
+    if (isThere(systemLog))
+        needs.push_back({"leave to empty the system log", accessProblem(systemLog, W_OK),
+                         "clear-log", "sudo mihost", "sudo mihost", ""});
     if (isRoot) {
         std::vector<Need> const ofRoot = capabilities();
         needs.insert(needs.end(), ofRoot.begin(), ofRoot.end());
@@ -304,38 +304,20 @@ std::vector<Need> modules()
     return needs;
 }
 
-/** Lines from the end of the log; there are no fewer than the plug-in shows unless they are long.
- */
-std::vector<std::string> newestLogLines()
-{
-    constexpr std::streamoff enough = 1 << 18;
-    constexpr std::size_t shown = 50;
-    std::ifstream file(logFile, std::ios::ate);
-    std::streamoff const start = std::max<std::streamoff>(file.tellg() - enough, 0);
-    file.seekg(start);
-    std::vector<std::string> lines;
-    for (std::string line; std::getline(file, line);)
-        lines.push_back(line);
-    if (start > 0 && !lines.empty())
-        lines.erase(lines.begin()); // the end of one
-    if (lines.size() > shown)
-        lines.erase(lines.begin(), lines.end() - shown);
-    return lines;
-}
-
 std::vector<Need> log()
 {
     std::string const traditional =
         "echo '$ActionFileDefaultTemplate RSYSLOG_TraditionalFileFormat' "
         ">/etc/rsyslog.d/00-stamp.conf; systemctl restart rsyslog";
     std::vector<Need> needs = {
-        {"system log in /var/log/messages", accessProblem(logFile), "all log entries",
+        {"system log in /var/log/messages", accessProblem(systemLog), "all log entries",
          "apt-get install rsyslog; echo '*.info;authpriv.none -/var/log/messages;"
          "RSYSLOG_TraditionalFileFormat' >/etc/rsyslog.d/messages.conf; systemctl restart rsyslog",
          "dnf install rsyslog; systemctl enable --now rsyslog", ""}};
-    if (!isThere(logFile))
+    if (!isThere(systemLog))
         return needs;
-    needs.push_back({"classic stamps in the system log", problemOfStamps(newestLogLines()),
+    needs.push_back({"classic stamps in the system log",
+                     problemOfStamps(LogFile(systemLog).newestLines(mostLogEntries)),
                      "messages and times of log entries", traditional, traditional, ""});
     return needs;
 }

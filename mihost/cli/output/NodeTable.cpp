@@ -56,18 +56,18 @@ NodeTable::Column NodeTable::columnOf(NodeKind const& kind, std::string const& n
                                         suggestion(name, namesFor(kind), "there are")));
 }
 
-std::string NodeTable::cell(Column const& column, NodeView const& view)
+std::string NodeTable::cell(Column const& column, NodeView const& view, ShownText const& shownText)
 {
     if (column.attribute)
         return column.attribute(*view.node);
     for (PropertyView const& property : view.properties)
         if (property.id == column.property)
-            return valueText(property);
+            return shownText(property);
     return "";
 }
 
-void NodeTable::write(std::vector<IC::MutableNode*> const& nodes, Secrets secrets,
-                      Output& out) const
+void NodeTable::write(std::vector<IC::MutableNode*> const& nodes, Secrets secrets, Output& out,
+                      ShownText const& shownText) const
 {
     std::vector<std::string> heading;
     for (Column const& column : columns_)
@@ -77,7 +77,7 @@ void NodeTable::write(std::vector<IC::MutableNode*> const& nodes, Secrets secret
         NodeView const view = storedView(*node, secrets);
         std::vector<std::string> cells;
         for (Column const& column : columns_)
-            cells.push_back(printable(cell(column, view)));
+            cells.push_back(printable(cell(column, view, shownText)));
         table.add(cells);
     }
     for (std::string const& line : table.lines(out.room()))

@@ -4,11 +4,15 @@
 #include "mihost/cli/output/Json.h"
 #include "mihost/cli/output/Output.h"
 
+#include <functional>
 #include <string>
 #include <vector>
 
 namespace mihost
 {
+
+/** A property's text in a table, such as valueText(). */
+using ShownText = std::function<std::string(PropertyView const& property)>;
 
 /** Nodes of one kind, a row each, as far as they are stored. */
 class NodeTable
@@ -20,7 +24,8 @@ public:
      */
     NodeTable(NodeKind const& kind, std::vector<std::string> const& columns);
 
-    void write(std::vector<IC::MutableNode*> const& nodes, Secrets secrets, Output& out) const;
+    void write(std::vector<IC::MutableNode*> const& nodes, Secrets secrets, Output& out,
+               ShownText const& shownText = valueText) const;
 
     /** As in the tree, with the chosen properties only where some were chosen. */
     Json json(std::vector<IC::MutableNode*> const& nodes, Secrets secrets) const;
@@ -33,7 +38,7 @@ private:
     };
 
     static Column columnOf(NodeKind const& kind, std::string const& name);
-    static std::string cell(Column const& column, NodeView const& view);
+    static std::string cell(Column const& column, NodeView const& view, ShownText const& shownText);
 
     std::vector<Column> columns_;
     bool chosen_;

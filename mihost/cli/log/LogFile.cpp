@@ -1,0 +1,103 @@
+#include "mihost/cli/log/LogFile.h"
+
+#include <algorithm>
+#include <array>
+#include <cerrno>
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <system_error>
+#include <unistd.h>
+#include <utility>
+
+namespace mihost
+{
+
+namespace
+{
+
+constexpr off_t newestBytes = 1 << 18;       // hold the newest lines unless they are long
+constexpr std::size_t longestKept = 1 << 16; // bytes of a line; nobody shows more
+
+Descriptor openLog(std::string const& path)
+{
+    return Descriptor(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK));
+}
+
+bool isSameFile(struct stat const& one, struct stat const& other)
+{
+    return one.st_dev == other.st_dev && one.st_ino == other.st_ino;
+}
+
+} // namespace
+
+LogFile::LogFile(std::string const& path) : path_(path), file_(openLog(path))
+{
+    if (!file_)
+        throw std::system_error(errno, std::generic_category(), path);
+}
+
+std::vector<std::string> LogFile::newestLines(std::size_t count)
+{
+    off_t const size = lseek(file_.get(), 0, SEEK_END);
+    position_ = std::max<off_t>(size - newestBytes, 0);
+    bool const startsWithin = position_ > 0;
+    unfinished_.clear();
+    std::vector<std::string> lines;
+    readTo(lines);
+    if (startsWithin && !lines.empty())
+        lines.erase(lines.begin()); // the end of one
+    if (lines.size() > count)
+        lines.erase(lines.begin(), lines.end() - static_cast<std::ptrdiff_t>(count));
+    return lines;
+}
+
+std::vector<std::string> LogFile::newLines()
+{
+    struct stat status {
+    };
+    if (fstat(file_.get(), &status) == 0 && status.st_size < position_) {
+        position_ = 0;
+        unfinished_.clear();
+    }
+    std::vector<std::string> lines;
+    readTo(lines);
+    if (takeNewFile())
+        readTo(lines);
+    return lines;
+}
+
+void LogFile::readTo(std::vector<std::string>& lines)
+{
+    std::array<char, 1 << 14> block{};
+    ssize_t length = 0;
+    while ((length = pread(file_.get(), block.data(), block.size(), position_)) > 0) {
+        position_ += length;
+        for (ssize_t at = 0; at < length; ++at) {
+            char const byte = block[static_cast<std::size_t>(at)];
+            if (byte == '\n')
+                lines.push_back(std::exchange(unfinished_, ""));
+            else if (unfinished_.size() < longestKept)
+                unfinished_ += byte;
+        }
+    }
+}
+
+/** What is in the old file was read; whoever writes the log may still have it open until then. */
+bool LogFile::takeNewFile()
+{
+    struct stat now {
+    };
+    struct stat before {
+    };
+    bool const isReplaced = stat(path_.c_str(), &now) == 0 && now.st_size > 0 &&
+                            fstat(file_.get(), &before) == 0 && !isSameFile(now, before);
+    Descriptor next = isReplaced ? openLog(path_) : Descriptor();
+    if (!next)
+        return false;
+    file_ = std::move(next);
+    position_ = 0;
+    unfinished_.clear();
+    return true;
+}
+
+} // namespace mihost

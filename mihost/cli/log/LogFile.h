@@ -1,0 +1,44 @@
+#ifndef MIHOST_CLI_LOG_LOGFILE_H
+#define MIHOST_CLI_LOG_LOGFILE_H
+
+#include "mihost/sandbox/Descriptor.h"
+
+#include <string>
+#include <sys/types.h>
+#include <vector>
+
+namespace mihost
+{
+
+/** A log that other programs append to, empty and replace. Only lines that have ended are read. */
+class LogFile
+{
+public:
+    /** @throws std::system_error if the file cannot be opened */
+    explicit LogFile(std::string const& path);
+
+    /**
+     * The newest lines, the newest last; newLines() goes on after them. Lines that are longer than
+     * some KiB may be fewer than asked for.
+     */
+    std::vector<std::string> newestLines(std::size_t count);
+
+    /**
+     * The lines that came since the last call. If another file has the path by now and something
+     * is in it, the rest of the old one comes first. An emptied file is read from its beginning.
+     */
+    std::vector<std::string> newLines();
+
+private:
+    void readTo(std::vector<std::string>& lines);
+    bool takeNewFile();
+
+    std::string path_;
+    Descriptor file_;
+    off_t position_ = 0;     // of what is read next
+    std::string unfinished_; // the start of a line that has not ended
+};
+
+} // namespace mihost
+
+#endif

@@ -51,6 +51,7 @@ std::string groupText(NamedGroup const& group)
 std::string groupsText(std::vector<NamedGroup> const& groups)
 {
     std::vector<std::string> texts;
+    texts.reserve(groups.size());
     for (NamedGroup const& group : groups)
         texts.push_back(groupText(group));
     return fmt::format("{}", fmt::join(texts, ", "));

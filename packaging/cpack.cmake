@@ -25,7 +25,7 @@ set(CPACK_DEBIAN_PACKAGE_SECTION admin)
 set(CPACK_DEBIAN_PACKAGE_RELEASE 1)
 # The tools that the plug-in runs; and what the other half of the package is of use with.
 set(CPACK_DEBIAN_PACKAGE_RECOMMENDS "kmod, passwd")
-set(CPACK_DEBIAN_PACKAGE_SUGGESTS "g++, pkg-config, rsyslog")
+set(CPACK_DEBIAN_PACKAGE_SUGGESTS "g++, openssh-client, pkg-config, rsyslog")
 set(CPACK_DEBIAN_PACKAGE_CONTROL_STRICT_PERMISSION ON)
 set(CPACK_DEBIAN_COMPRESSION_TYPE xz)
 

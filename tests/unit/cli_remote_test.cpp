@@ -71,7 +71,7 @@ TEST(RemoteCommand, GivesSshOneLineForTheShellThere)
     EXPECT_EQ(remoteCommand("root@box", {"set", "os", "74", "a b"}, RemoteTerminal::None),
               (Words{"ssh", "-T", "--", "root@box", "exec mihost set os 74 'a b'"}));
     EXPECT_EQ(remoteCommand("box", {}, RemoteTerminal::Use),
-              (Words{"ssh", "-t", "--", "box", "exec mihost"}));
+              (Words{"ssh", "-t", "-o", "LogLevel=ERROR", "--", "box", "exec mihost"}));
     EXPECT_EQ(remoteCommand("box", {"tree"}, RemoteTerminal::Ignore),
               (Words{"ssh", "-T", "-n", "--", "box", "exec mihost tree"}));
 }

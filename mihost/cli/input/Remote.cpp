@@ -62,7 +62,8 @@ std::vector<std::string> remoteCommand(std::string const& host,
     std::vector<std::string> command = {"ssh"};
     switch (terminal) {
     case RemoteTerminal::Use:
-        command.emplace_back("-t");
+        // Or ssh would add "Connection to HOST closed." to what the command prints.
+        command.insert(command.end(), {"-t", "-o", "LogLevel=ERROR"});
         break;
     case RemoteTerminal::None:
         command.emplace_back("-T");

@@ -29,6 +29,13 @@ std::set<std::string> matches(std::string const& text, char const* pattern)
     return found;
 }
 
+/** The commands that a help text lists. */
+std::set<std::string> commandsOf(std::string const& help)
+{
+    std::string const list = help.substr(help.find("\nCommands:"));
+    return matches(list.substr(0, list.find("\nExamples:")), "\n  ([a-z-]+) ");
+}
+
 class ManualPage : public testing::TestWithParam<char const*>
 {
 };
@@ -61,7 +68,11 @@ TEST(ManualPageOfMihost, TellsOfEveryOption)
 {
     char const* const option = "(--[a-z][a-z-]*)";
     auto const told = matches(rendered(MIHOST_PAGE), option);
-    auto const options = matches(mihostRun({"--help-all"}).out, option);
+    std::string help = mihostRun({"--help-all"}).out;
+    for (char const* const group : {"user", "group"})
+        for (std::string const& task : commandsOf(mihostRun({"help", group}).out))
+            help += mihostRun({"help", group, task}).out;
+    auto const options = matches(help, option);
     EXPECT_FALSE(options.empty());
     for (std::string const& name : options)
         EXPECT_EQ(told.count(name), 1U) << name;
@@ -71,8 +82,12 @@ TEST(ManualPageOfMihost, TellsOfEveryCommand)
 {
     std::string const help = mihostRun({"--help"}).out;
     std::string const page = rendered(MIHOST_PAGE);
-    auto const commands = matches(help.substr(help.find("\nCommands:")), "\n  ([a-z-]+) ");
+    auto commands = commandsOf(help);
     EXPECT_FALSE(commands.empty());
+    for (char const* const group : {"user", "group"})
+        for (std::string const& task : commandsOf(mihostRun({"help", group}).out))
+            commands.insert(group + (" " + task));
+    EXPECT_EQ(commands.count("user set-shell"), 1U);
     for (std::string const& command : commands)
         EXPECT_TRUE(std::regex_search(page, std::regex("\n {5,7}" + command + "[ \n]"))) << command;
 }

@@ -381,7 +381,7 @@ TEST(MihostDangers, NeedYesWhereThereIsNoTerminalToAsk)
           Lines{"set", "os", "74", "UserDel,UserName:CMPI_string:root"}}) {
         Outcome const outcome = mihostRun(arguments, "y\n");
         EXPECT_EQ(outcome.code, 2) << arguments[0];
-        EXPECT_NE(outcome.err.find("needs --yes"), std::string::npos) << outcome.err;
+        EXPECT_NE(outcome.err.find("add --yes to"), std::string::npos) << outcome.err;
     }
     EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
     EXPECT_FALSE(machine::read("/var/log/messages").empty());

@@ -61,11 +61,13 @@ std::vector<std::pair<Lines, std::string>> allHelp(Lines const& command)
  */
 void makeMachine()
 {
-    machine::lay("users-and-groups");
+    machine::lay("plain");
+    machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
     machine::write("/etc/release", "Example Linux\nVERSION = 1\nPATCHLEVEL = 0\n");
+    machine::write("/root/secret", "Secret-1\n", 0600);
     machine::write("/etc/shells", "/bin/sh\n/bin/bash\n");
     machine::write("/var/log/messages", "Jan  2 03:04:05 host line\n");
-    for (char const* line : {"groupadd staff", "groupadd crew", "useradd -m -G crew jdoe"})
+    for (char const* line : {"groupadd staff", "groupadd crew", "useradd -m -U -G crew jdoe"})
         ASSERT_EQ(runToEnd({"/bin/sh", "-c", line}).code, 0) << line;
     std::filesystem::path const directory = std::filesystem::path(MIHOST_FILE).parent_path();
     setenv("PATH", (directory.string() + ":" + getenv("PATH")).c_str(), 1);

@@ -56,8 +56,8 @@ TEST_F(MihostHarm, DeletesNoOtherAccountThatIsNamedLikeTheUid)
     EXPECT_EQ(outcome.out, "");
     EXPECT_EQ(outcome.err,
               "mihost: nothing is run for user:jdoe: userdel would be given the UID 1500, which is "
-              "the name of another account: '1500' would be deleted (use 'mihost call UserDel "
-              "UserName=jdoe', which keeps the home directory)\n");
+              "the name of another account: '1500' would be deleted (use 'mihost user delete "
+              "jdoe', which keeps the home directory)\n");
     EXPECT_FALSE(ran("userdel"));
     EXPECT_FALSE(machine::entry("/etc/passwd", "1500").empty());
     EXPECT_FALSE(machine::entry("/etc/passwd", "jdoe").empty());
@@ -69,7 +69,7 @@ TEST_F(MihostHarm, RunsNoUserdelThatWouldFindNobody)
     addAccount("-M -u 1500 jdoe");
     Outcome const outcome = mihostRun({"set", "user:jdoe", "delete", "true"}); // asks for nothing
     EXPECT_EQ(outcome.code, 2);
-    EXPECT_TRUE(stands(outcome.err, "takes names only (use 'mihost call UserDel UserName=jdoe'"))
+    EXPECT_TRUE(stands(outcome.err, "takes names only (use 'mihost user delete jdoe'"))
         << outcome.err;
     EXPECT_FALSE(ran("userdel"));
     EXPECT_EQ(mihostRun({"call", "UserDel", "UserName=jdoe"}).code, 0);

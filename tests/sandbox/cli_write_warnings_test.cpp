@@ -92,8 +92,7 @@ TEST_F(WriteWarnings, DatesOfUserNodesSayWhatTheyReadAndWrite)
     EXPECT_EQ(
         expiration.err,
         "mihost: password-expiration reads the account's expiry date, but writing it sets the "
-        "password's maximum age (for the date, use 'mihost call UserSetAttrib UserName=jdoe "
-        "passwordExpirationDate=YYYY-MM-DD')\n");
+        "password's maximum age (for the date, use 'mihost user expire jdoe YYYY-MM-DD')\n");
     Outcome const inactivity = mihostRun({"set", "user:jdoe", "inactive-time", "2020-02-05"});
     EXPECT_EQ(inactivity.code, 0);
     EXPECT_EQ(
@@ -111,13 +110,13 @@ TEST_F(WriteWarnings, PropertiesThatOnlyChangeTheTreeNameTheCommand)
     };
     std::string const before = machine::read("/etc/passwd") + machine::read("/etc/shadow");
     for (Row const& row :
-         {Row{"login-shell", "/bin/zsh", "mihost call UserSetScriptPath"},
-          Row{"home-directory", "/home/j2", "mihost call UserSetHomeDir"},
-          Row{"full-name", "J. Doe", "mihost call UserSetFullName"},
-          Row{"password-max-days", "30", "mihost call UserSetAttrib"},
-          Row{"password-min-days", "3", "mihost call UserSetAttrib"},
-          Row{"password-warn-days", "5", "mihost call UserSetAttrib"},
-          Row{"password-expiry-days", "9", "mihost call UserSetAttrib"},
+         {Row{"login-shell", "/bin/zsh", "mihost user set-shell"},
+          Row{"home-directory", "/home/j2", "mihost user set-home"},
+          Row{"full-name", "J. Doe", "mihost user set-name"},
+          Row{"password-max-days", "30", "mihost user age"},
+          Row{"password-min-days", "3", "mihost user age"},
+          Row{"password-warn-days", "5", "mihost user age"},
+          Row{"password-expiry-days", "9", "mihost user age"},
           Row{"last-password-change", "2020-01-01", "chage -d"},
           Row{"user-name", "joe", "usermod -l"}, Row{"user-id", "1500", "usermod -u"},
           Row{"group-id", "1500", "usermod -g"}}) {

@@ -67,13 +67,6 @@ TEST(Completion, OffersEachOptionOnce)
     EXPECT_EQ(after({"list", "--help"}), (Words{"--help", "--help-all"}));
 }
 
-TEST(Completion, OffersTheAccountsOfUserAndGroup)
-{
-    EXPECT_EQ(after({"user", ""}), (Words{"root", "jdoe"}));
-    EXPECT_EQ(after({"user", "j"}), Words{"jdoe"});
-    EXPECT_EQ(after({"group", ""}), Words{"staff"});
-}
-
 TEST(Completion, KnowsThatAHostFollows)
 {
     for (char const* option : {"--host", "-H"}) {
@@ -187,6 +180,31 @@ TEST(Completion, OffersTheCommandsThatHelpExplains)
     EXPECT_EQ(after({"help", "po"}), Words{"power"});
     EXPECT_EQ(after({"help", "power", ""}), Words());
     EXPECT_EQ(after({"help", "nonsense", ""}), Words());
+}
+
+TEST(Completion, OffersTheTasksAndTheAccountsThatACommandShows)
+{
+    EXPECT_EQ(after({"user", "d"}), Words{"delete"});
+    EXPECT_EQ(after({"user", "j"}), Words{"jdoe"});
+    EXPECT_EQ(after({"group", ""}),
+              (Words{"staff", "add", "delete", "add-member", "remove-member"}));
+    EXPECT_EQ(after({"group", "s"}), Words{"staff"});
+    EXPECT_EQ(after({"user", "--", "d"}), Words());
+    EXPECT_EQ(after({"help", "user", "del"}), Words{"delete"});
+}
+
+TEST(Completion, OffersTheValuesOfTasks)
+{
+    EXPECT_EQ(after({"user", "delete", ""}), (Words{"root", "jdoe"}));
+    EXPECT_EQ(after({"user", "add", ""}), Words());
+    EXPECT_EQ(after({"group", "add-member", "staff", "j"}), Words{"jdoe"});
+    EXPECT_EQ(after({"user", "age", "--max"}), Words{"--max-days"});
+    EXPECT_EQ(after({"user", "add", "--js"}), Words{"--json"});
+    EXPECT_EQ(after({"user", "delete", "jdoe", ""}), Words());
+    EXPECT_EQ(complete({"user", "add", "--shell", ""}, namesOf, mihost::commandTable()).what,
+              Completion::What::Files);
+    EXPECT_EQ(complete({"user", "set-home", "jdoe", ""}, namesOf, mihost::commandTable()).what,
+              Completion::What::Folders);
 }
 
 TEST(Completion, KnowsTheValueOfAShortOption)

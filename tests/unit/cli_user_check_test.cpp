@@ -29,15 +29,15 @@ TEST(UserDelete, IsRefusedIfTheUidIsTheNameOfAnotherAccount)
 {
     EXPECT_EQ(objectionToDelete({"jdoe", "1500"}),
               "userdel would be given the UID 1500, which is the name of another account: '1500' "
-              "would be deleted (use 'mihost call UserDel UserName=jdoe', which keeps the home "
+              "would be deleted (use 'mihost user delete jdoe', which keeps the home "
               "directory)");
 }
 
 TEST(UserDelete, IsRefusedIfTheUidIsNobodysName)
 {
     EXPECT_EQ(objectionToDelete({"ann", "1001"}),
-              "userdel would be given the UID 1001, but takes names only (use 'mihost call UserDel "
-              "UserName=ann', which keeps the home directory)");
+              "userdel would be given the UID 1001, but takes names only (use 'mihost user delete "
+              "ann', which keeps the home directory)");
 }
 
 TEST(UserDelete, IsDoneIfTheAccountIsNamedLikeItsOwnUid)

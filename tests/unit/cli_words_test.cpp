@@ -65,14 +65,16 @@ TEST(ALineForTheHistory, HoldsAPasswordWhereACallOrAWriteHasOne)
           "call UserAdd Pass'word=x' UserName=j", "--json call UserSetPassword Password=x",
           "set os 74 UserSetPassword,UserName:CMPI_string:j,Password:CMPI_string:x",
           "set os create-user 'UserAdd,Password:CMPI_string:x'", "set user:jdoe password $6$a$b",
-          "set user:jdoe 117 '$6$a$b", "sett user:jdoe password x", "cal UserAdd Password=x"})
+          "set user:jdoe 117 '$6$a$b", "sett user:jdoe password x", "cal UserAdd Password=x",
+          "user set-password jdoe x", "user add j --password x", "user add j --password=x"})
         EXPECT_TRUE(holdsPassword(line)) << line;
 }
 
 TEST(ALineForTheHistory, HoldsNoneElsewhere)
 {
-    for (char const* line : {"", "get user:jdoe", "get user:jdoe password", "list users",
-                             "set user:jdoe full-name x", "call UserDel UserName=jdoe"})
+    for (char const* line :
+         {"", "get user:jdoe", "get user:jdoe password", "list users", "set user:jdoe full-name x",
+          "call UserDel UserName=jdoe", "user set-password jdoe", "user add jdoe --password"})
         EXPECT_FALSE(holdsPassword(line)) << line;
 }
 

@@ -246,6 +246,14 @@ Expectation deletedAccount(std::string const& user)
             [user] { return recordOf(accountFile, user).empty() ? absent : present; }};
 }
 
+Expectation noAccountExpiry(std::string const& user)
+{
+    return {subjectOf("account expiry", user), never, [user] {
+                Record const record = recordOf(shadowFile, user);
+                return record.empty() ? unknown : dayOfField(record[shadowField::Expiry]);
+            }};
+}
+
 Expectation passwordExpiryDay(std::string const& user, std::string const& day)
 {
     return {subjectOf("password expiry", user), day, [user] {

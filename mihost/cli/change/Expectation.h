@@ -27,6 +27,9 @@ Expectation passwordHash(std::string const& user, std::string const& hash);
 /** That the account is gone. */
 Expectation deletedAccount(std::string const& user);
 
+/** That the account never expires. */
+Expectation noAccountExpiry(std::string const& user);
+
 /** That the account's password expires on this day, YYYY-MM-DD. */
 Expectation passwordExpiryDay(std::string const& user, std::string const& day);
 

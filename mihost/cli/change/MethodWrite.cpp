@@ -41,11 +41,16 @@ std::string expiryField(std::string const& user)
     return field == "-1" ? "" : field;
 }
 
-/** Contract: UserSetAttrib without an expiry date runs chage -E -1. */
-void keepExpiry(MethodCall& call, bool erase, std::vector<std::string>& warnings)
+bool mayEraseExpiry(MethodCall const& call)
 {
-    if (std::string_view(call.method->name) != "UserSetAttrib" ||
-        !valueOf(call, expiryParameter).empty())
+    return std::string_view(call.method->name) == "UserSetAttrib" &&
+           valueOf(call, expiryParameter).empty();
+}
+
+/** Contract: UserSetAttrib without an expiry date runs chage -E -1. */
+void treatExpiry(MethodCall& call, Expiry expiry, std::vector<std::string>& warnings)
+{
+    if (!mayEraseExpiry(call) || expiry == Expiry::Erase)
         return;
     std::string const field = expiryField(valueOf(call, "UserName"));
     if (field.empty())
@@ -53,28 +58,36 @@ void keepExpiry(MethodCall& call, bool erase, std::vector<std::string>& warnings
     auto const number = parseDecimal(field);
     auto const day = number ? dayOfNumber(static_cast<long>(*number)) : std::nullopt;
     std::string const text = day ? dayText(*day) : fmt::format("day '{}'", field);
-    if (erase) {
+    if (expiry == Expiry::EraseAloud) {
         warnings.push_back(fmt::format("UserSetAttrib erases the account's expiry {}", text));
         return;
     }
     if (!day)
-        throw Failure(BadUsage, fmt::format("UserSetAttrib erases the account's expiry, and {} "
-                                            "cannot be passed along (add --yes to erase it)",
-                                            text));
+        throw Failure(BadUsage,
+                      expiry == Expiry::Keep
+                          ? fmt::format("the account's expiry, {}, is not a day that can be kept "
+                                        "(set it with 'mihost user expire' first)",
+                                        text)
+                          : fmt::format("UserSetAttrib erases the account's expiry, and {} "
+                                        "cannot be passed along (add --yes to erase it)",
+                                        text));
     Parameter const* const parameter = findParameter(*call.method, expiryParameter);
     call.arguments.push_back({parameter, dateTimeText(*day)});
-    warnings.push_back(fmt::format("UserSetAttrib would erase the account's expiry {}, so it is "
-                                   "passed along (add --yes to erase it)",
-                                   text));
+    if (expiry == Expiry::KeepAloud)
+        warnings.push_back(fmt::format("UserSetAttrib would erase the account's expiry {}, so it "
+                                       "is passed along (add --yes to erase it)",
+                                       text));
 }
 
 } // namespace
 
-Write methodWrite(Session const& session, IC::MutableNode& os, MethodCall call)
+Write methodWrite(IC::MutableNode& os, MethodCall call, Expiry expiry)
 {
     std::vector<std::string> warnings;
-    keepExpiry(call, session.options().yes, warnings);
-    std::vector<Expectation> const expectations = expectationsOf(call);
+    treatExpiry(call, expiry, warnings);
+    std::vector<Expectation> expectations = expectationsOf(call);
+    if (mayEraseExpiry(call) && expiry == Expiry::Erase)
+        expectations.push_back(noAccountExpiry(valueOf(call, "UserName")));
     std::vector<std::string> secrets;
     makePasswordSafe(call, secrets);
     return {fmt::format("call {}", call.method->name),
@@ -86,6 +99,11 @@ Write methodWrite(Session const& session, IC::MutableNode& os, MethodCall call)
             secrets,
             warnings,
             ""};
+}
+
+Write methodWrite(Session const& session, IC::MutableNode& os, MethodCall const& call)
+{
+    return methodWrite(os, call, session.options().yes ? Expiry::EraseAloud : Expiry::KeepAloud);
 }
 
 } // namespace mihost

@@ -96,12 +96,11 @@ std::vector<Expectation> deletion(Session&, IC::MutableNode const& node, IC::Pro
 constexpr char shutdownTool[] = "/sbin/shutdown";
 constexpr char inactivityWarning[] =
     "inactive-time reads the account's expiry date, but writing it sets how long after its "
-    "password's expiry the account stays active (for the date, use 'mihost call UserSetAttrib "
-    "UserName={} passwordExpirationDate=YYYY-MM-DD')";
+    "password's expiry the account stays active (for the date, use 'mihost user expire {} "
+    "YYYY-MM-DD')";
 constexpr char expirationWarning[] =
     "password-expiration reads the account's expiry date, but writing it sets the password's "
-    "maximum age (for the date, use 'mihost call UserSetAttrib UserName={} "
-    "passwordExpirationDate=YYYY-MM-DD')";
+    "maximum age (for the date, use 'mihost user expire {} YYYY-MM-DD')";
 
 // clang-format off
 constexpr Act acts[] = {
@@ -126,17 +125,17 @@ constexpr Instead instead[] = {
     {NODES::userType, NODES::name, "usermod -l"},
     {NODES::userType, NODES::id, "usermod -u"},
     {NODES::userType, NODES::groupId, "usermod -g"},
-    {NODES::userType, NODES::fullName, "mihost call UserSetFullName"},
-    {NODES::userType, NODES::homeDir, "mihost call UserSetHomeDir"},
-    {NODES::userType, NODES::scriptPath, "mihost call UserSetScriptPath"},
-    {NODES::userType, NODES::pwdMaxDays, "mihost call UserSetAttrib"},
-    {NODES::userType, NODES::pwdWarnDays, "mihost call UserSetAttrib"},
-    {NODES::userType, NODES::pwdMinDays, "mihost call UserSetAttrib"},
-    {NODES::userType, NODES::pwdExpDays, "mihost call UserSetAttrib"},
+    {NODES::userType, NODES::fullName, "mihost user set-name"},
+    {NODES::userType, NODES::homeDir, "mihost user set-home"},
+    {NODES::userType, NODES::scriptPath, "mihost user set-shell"},
+    {NODES::userType, NODES::pwdMaxDays, "mihost user age"},
+    {NODES::userType, NODES::pwdWarnDays, "mihost user age"},
+    {NODES::userType, NODES::pwdMinDays, "mihost user age"},
+    {NODES::userType, NODES::pwdExpDays, "mihost user age"},
     {NODES::userType, NODES::lastPwdChange, "chage -d"},
     {NODES::groupType, NODES::name, "groupmod -n"},
     {NODES::groupType, NODES::id, "groupmod -g"},
-    {NODES::groupType, NODES::members, "mihost call LocalGroupAddUser"},
+    {NODES::groupType, NODES::members, "mihost group add-member"},
 };
 // clang-format on
 

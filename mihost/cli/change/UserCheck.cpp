@@ -41,8 +41,8 @@ std::optional<std::string> objectionToDelete(Account const& node,
 {
     if (node.name == node.id)
         return std::nullopt;
-    std::string const right = fmt::format(
-        "use 'mihost call UserDel UserName={}', which keeps the home directory", node.name);
+    std::string const right =
+        fmt::format("use 'mihost user delete {}', which keeps the home directory", node.name);
     // Contract: the plug-in runs userdel with property 89.
     if (find(accounts, node.id))
         return fmt::format("userdel would be given the UID {0}, which is the name of another "

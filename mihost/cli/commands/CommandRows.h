@@ -8,9 +8,9 @@
     COMMAND(tree)                                                                                  \
     COMMAND(list)                                                                                  \
     COMMAND(get)                                                                                   \
-    COMMAND(set)                                                                                   \
     COMMAND(user)                                                                                  \
     COMMAND(group)                                                                                 \
+    COMMAND(set)                                                                                   \
     COMMAND(call)                                                                                  \
     COMMAND(refresh)                                                                               \
     COMMAND(clearLog)                                                                              \

@@ -33,13 +33,6 @@ Parameter const& parameter(Method const& method, std::string_view name)
     return *found;
 }
 
-/** @param value  as a person writes it */
-void checkValue(Parameter const& parameter, std::string_view value)
-{
-    if (auto const reason = objection(parameter.form, value))
-        throw Failure(BadUsage, fmt::format("{} {}", parameter.name, *reason));
-}
-
 void checkWhole(MethodCall const& call)
 {
     for (Parameter const& parameter : call.method->parameters) {
@@ -79,7 +72,7 @@ std::vector<std::string> split(std::string const& text, char separator)
 void checkTextForm(Parameter const& parameter, std::string const& value)
 {
     if (parameter.form != Form::Day)
-        checkValue(parameter, value);
+        checkAssignment({&parameter, parameter.name, value});
     else if (!parseDateTime(value))
         throw Failure(BadUsage, fmt::format("{} is no date-time: it must be {}", parameter.name,
                                             dateTimeForm));
@@ -99,29 +92,49 @@ MethodCall::Argument argumentOf(Method const& method, std::string const& item)
     return {&known, parts[2]};
 }
 
+/** NAME=VALUE */
+Assignment parseAssignment(Method const& method, std::string const& text, AskSecret const& ask)
+{
+    std::size_t const equals = text.find('=');
+    if (equals == std::string::npos && !findParameter(method, text))
+        throw Failure(BadUsage, fmt::format("'{}' is not NAME=VALUE; {}", text,
+                                            suggestion(text, rowNames(method.parameters),
+                                                       fmt::format("{} takes", method.name))));
+    Parameter const& known = parameter(method, std::string_view(text).substr(0, equals));
+    if (equals == std::string::npos)
+        throw Failure(BadUsage, fmt::format("{0} needs a value: {0}=VALUE", known.name));
+    std::string value = text.substr(equals + 1);
+    if (known.form == Form::Password && value == toBeAsked)
+        value = ask(known.name);
+    return {&known, known.name, value};
+}
+
 } // namespace
 
 MethodCall parseCall(std::string const& name, std::vector<std::string> const& assignments,
                      AskSecret const& ask)
 {
-    MethodCall call{&method(name), {}};
-    for (std::string const& assignment : assignments) {
-        std::size_t const equals = assignment.find('=');
-        if (equals == std::string::npos && !findParameter(*call.method, assignment))
-            throw Failure(BadUsage,
-                          fmt::format("'{}' is not NAME=VALUE; {}", assignment,
-                                      suggestion(assignment, rowNames(call.method->parameters),
-                                                 name + " takes")));
-        Parameter const& known =
-            parameter(*call.method, std::string_view(assignment).substr(0, equals));
-        if (equals == std::string::npos)
-            throw Failure(BadUsage,
-                          fmt::format("{} needs a value: {}=VALUE", known.name, known.name));
-        std::string value = assignment.substr(equals + 1);
-        if (known.form == Form::Password && value == toBeAsked)
-            value = ask(known.name);
-        checkValue(known, value);
-        call.arguments.push_back({&known, toTextForm(known, value)});
+    Method const& known = method(name);
+    std::vector<Assignment> parsed;
+    parsed.reserve(assignments.size());
+    for (std::string const& assignment : assignments)
+        parsed.push_back(parseAssignment(known, assignment, ask));
+    return makeCall(known, parsed);
+}
+
+void checkAssignment(Assignment const& assignment)
+{
+    if (auto const reason = objection(assignment.parameter->form, assignment.value))
+        throw Failure(BadUsage, fmt::format("{} {}", assignment.label, *reason));
+}
+
+MethodCall makeCall(Method const& method, std::vector<Assignment> const& assignments)
+{
+    MethodCall call{&method, {}};
+    for (Assignment const& assignment : assignments) {
+        checkAssignment(assignment);
+        Parameter const& parameter = *assignment.parameter;
+        call.arguments.push_back({&parameter, toTextForm(parameter, assignment.value)});
     }
     checkWhole(call);
     return call;

@@ -35,6 +35,19 @@ using AskSecret = std::function<std::string(std::string const& name)>;
 MethodCall parseCall(std::string const& method, std::vector<std::string> const& assignments,
                      AskSecret const& ask);
 
+/** A value for a parameter, as a person writes it. */
+struct Assignment {
+    Parameter const* parameter;
+    std::string label; // what the person knows the parameter by
+    std::string value;
+};
+
+/** @throws Failure (BadUsage) naming the label */
+void checkAssignment(Assignment const& assignment);
+
+/** A call from values. @throws Failure (BadUsage) as above */
+MethodCall makeCall(Method const& method, std::vector<Assignment> const& assignments);
+
 /** Whether property 74 only stores this text, as the empty one and that of a fresh tree. */
 bool callsNothing(std::string const& text);
 

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <fmt/format.h>
+#include <iterator>
 #include <string_view>
 #include <utility>
 
@@ -92,9 +93,23 @@ private:
     bool inComment_ = false;
 };
 
-bool isPasswordProperty(std::string const& word)
+/** A word after which a password may be typed, rightly or not. */
+struct PasswordMark {
+    std::string_view word;
+    std::ptrdiff_t wordsBetween;
+};
+
+constexpr PasswordMark passwordMarks[] = {
+    {"password", 0},
+    {"117", 0},
+    {"--password", 0},
+    {"set-password", 1},
+};
+
+bool hasWordAfter(std::vector<std::string> const& words, PasswordMark const& mark)
 {
-    return word == "password" || word == "117";
+    auto const found = std::find(words.begin(), words.end(), mark.word);
+    return words.end() - found > 1 + mark.wordsBetween;
 }
 
 } // namespace
@@ -129,11 +144,13 @@ TypedLine typedLine(std::string const& line, std::string const& breaks)
 bool holdsPassword(std::string const& line)
 {
     std::vector<std::string> const words = Splitter(line).words;
-    bool const inCall = std::any_of(words.begin(), words.end(), [](std::string const& word) {
-        return word.find("Password") != std::string::npos; // whatever the form of the call
+    bool const inWord = std::any_of(words.begin(), words.end(), [](std::string const& word) {
+        return word.find("Password") != std::string::npos || // whatever the form of the call
+               word.rfind("--password=", 0) == 0;
     });
-    auto const property = std::find_if(words.begin(), words.end(), isPasswordProperty);
-    return inCall || words.end() - property > 1;
+    return inWord ||
+           std::any_of(std::begin(passwordMarks), std::end(passwordMarks),
+                       [&words](PasswordMark const& mark) { return hasWordAfter(words, mark); });
 }
 
 std::string quotedForShell(std::string const& word)

@@ -144,8 +144,7 @@ void Session::confirm(std::string const& what) const
     if (options_.yes)
         return;
     if (!terminal::canAsk())
-        throw Failure(BadUsage,
-                      fmt::format("to {} needs --yes, since there is no terminal to ask", what));
+        throw Failure(BadUsage, fmt::format("not a terminal: add --yes to {}", what));
     if (!terminal::confirm(printable(fmt::format("Really {}?", what))))
         throw Failure(BadUsage, fmt::format("not confirmed: did not {}", what));
 }

@@ -59,6 +59,11 @@ public:
         scripted_ = true;
     }
 
+    bool isScripted() const
+    {
+        return scripted_;
+    }
+
     /** @throws Failure where there is nobody to ask and nothing to read */
     std::string askSecret(std::string const& name) const;
     Output& out()

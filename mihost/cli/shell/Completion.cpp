@@ -140,6 +140,16 @@ Candidates nodes(Typed const&, std::string const& word, NodeNames const& nodeNam
     return all;
 }
 
+Candidates users(Typed const&, std::string const&, NodeNames const& nodeNames)
+{
+    return names(*kindAt("user:"), "", nodeNames);
+}
+
+Candidates groups(Typed const&, std::string const&, NodeNames const& nodeNames)
+{
+    return names(*kindAt("group:"), "", nodeNames);
+}
+
 Candidates properties(Typed const& typed, std::string const&, NodeNames const&)
 {
     return propertiesOf(kindAt(typed.arguments.at(0)));
@@ -154,13 +164,6 @@ Candidates values(Typed const& typed, std::string const&, NodeNames const&)
     if (property && property->kind == IC::PropertyValue::BooleanKind)
         return {{"true", ""}, {"false", ""}};
     return {};
-}
-
-/** Of "user" and "group", which are called like the kind of node. */
-Candidates accounts(Typed const& typed, std::string const&, NodeNames const& nodeNames)
-{
-    NodeKind const* const kind = kindAt(typed.command->get_name() + ':');
-    return kind ? names(*kind, "", nodeNames) : Candidates();
 }
 
 Candidates methodNames(Typed const&, std::string const&, NodeNames const&)
@@ -261,7 +264,8 @@ constexpr Place places[] = {
     {"PARAMETER", parameters},
     {"--columns", columns},
     {"COMMAND", commandsOfHelp},
-    {"NAME", accounts},
+    {"USER", users},
+    {"GROUP", groups},
 };
 
 /** The words of an option that takes one of a few. */

@@ -1,0 +1,76 @@
+#include "mihost/cli/commands/CommandRows.h"
+#include "mihost/cli/commands/GroupView.h"
+#include "mihost/cli/commands/TaskCommand.h"
+
+namespace mihost
+{
+
+namespace
+{
+
+constexpr TaskValue localGroup = {"GROUP", "LocalGroupName", "", "the group's name"};
+constexpr TaskValue member = {"USER", "DomainAndMember", "", "login name of the member"};
+
+std::vector<Task> const tasks = {
+    {
+        "add",
+        "add a group",
+        "LocalGroupAdd",
+        {{"NAME", "GroupName", "", "name of the new group"}},
+        {
+            {"mihost group add builders", "add a group"},
+            {"mihost --json group add builders", "print what changed as JSON"},
+        },
+    },
+    Task{
+        "delete",
+        "delete a group",
+        "LocalGroupDel",
+        {{"GROUP", "GroupName", "", "the group's name"}},
+        {
+            {"mihost group delete staff", "delete after a prompt"},
+            {"mihost --sandbox group delete staff -y", "try it in a copy of this machine"},
+        },
+    }
+        .asking("delete the group {}"),
+    {
+        "add-member",
+        "add a user to a group",
+        "LocalGroupAddUser",
+        {localGroup, member},
+        {
+            {"mihost group add-member staff jdoe", "make jdoe a member of staff"},
+            {"mihost --sandbox group add-member staff jdoe", "try it in a copy of this machine"},
+        },
+    },
+    {
+        "remove-member",
+        "remove a user from a group",
+        "LocalGroupDelUser",
+        {localGroup, member},
+        {
+            {"mihost group remove-member crew jdoe", "end jdoe's membership of crew"},
+            {"mihost --json group remove-member crew jdoe", "print what changed as JSON"},
+        },
+    },
+};
+
+class Group : public TaskCommand
+{
+public:
+    Group() : TaskCommand({"group", "GROUP", "the group to show", tasks, showGroup}) {}
+};
+
+} // namespace
+
+CommandRow const commandRows::group{
+    "group",
+    "show or change a group",
+    newCommand<Group>,
+    {
+        {"mihost group crew", "its id and members"},
+        {"mihost group add-member staff jdoe", "change it"},
+    },
+};
+
+} // namespace mihost

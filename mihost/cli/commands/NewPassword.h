@@ -1,0 +1,25 @@
+#ifndef MIHOST_CLI_COMMANDS_NEWPASSWORD_H
+#define MIHOST_CLI_COMMANDS_NEWPASSWORD_H
+
+#include "mihost/cli/plugin/Session.h"
+
+#include <string>
+
+namespace mihost
+{
+
+/**
+ * Reads a password that is to be set: from a file, or else from standard input, which at a terminal
+ * is asked twice.
+ *
+ * @param file  empty or "-" for standard input
+ * @throws Failure (BadUsage) if there is none, or if the two differ
+ */
+std::string readNewPassword(Session const& session, std::string const& file);
+
+/** The password in a file's text: its only line. @throws Failure (BadUsage) naming the file */
+std::string passwordIn(std::string const& text, std::string const& file);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,138 @@
+#include "mihost/cli/commands/CommandRows.h"
+#include "mihost/cli/commands/TaskCommand.h"
+#include "mihost/cli/commands/UserView.h"
+
+namespace mihost
+{
+
+namespace
+{
+
+constexpr TaskValue user = {"USER", "UserName", "", "login name"};
+constexpr TaskValue minDays = {"--min-days", "daysMustKeepPassword", "N",
+                               "keep a new password for at least N days"};
+constexpr TaskValue maxDays = {"--max-days", "daysMustChangePasswordAfter", "N",
+                               "let a password expire after N days"};
+constexpr TaskValue warnDays = {"--warn-days", "daysWarnBeforePasswordExpire", "N",
+                                "warn N days before it expires"};
+constexpr TaskValue inactiveDays = {"--inactive-days", "daysExpireAfter", "N",
+                                    "disable the account N days after its password expired"};
+
+std::vector<Task> const tasks = {
+    {
+        "add",
+        "add an account",
+        "UserAdd",
+        {
+            {"NAME", "UserName", "", "login name of the new account"},
+            {"--full-name", "Comment", "TEXT", "set the full name"},
+            {"--home", "HomeDir", "DIR", "set the home directory"},
+            {"--shell", "ScriptPath", "FILE", "set the login shell"},
+            {"--password", "Password", "",
+             "set a password, read from a prompt or standard input; without one nobody can log in"},
+            minDays,
+            maxDays,
+            warnDays,
+            inactiveDays,
+            {"--expires", "passwordExpirationDate", "DAY",
+             "let the account expire on DAY, YYYY-MM-DD or never"},
+        },
+        {
+            {"mihost user add asmith --full-name 'A. Smith' --shell /bin/bash",
+             "an account without a password"},
+            {"mihost user add asmith --password --max-days 90", "ask for a password"},
+        },
+    },
+    Task{
+        "delete",
+        "delete an account; its home directory and mail stay",
+        "UserDel",
+        {user},
+        {
+            {"mihost user delete jdoe", "delete after a prompt"},
+            {"mihost --sandbox user delete jdoe -y", "try it in a copy of this machine"},
+        },
+    }
+        .asking("delete the account {}"),
+    {
+        "set-shell",
+        "set an account's login shell",
+        "UserSetScriptPath",
+        {user, {"SHELL", "ScriptPath", "FILE", "absolute path of the shell"}},
+        {
+            {"mihost user set-shell jdoe /bin/bash", "set the shell"},
+            {"mihost user set-shell jdoe /usr/sbin/nologin", "refuse logins"},
+        },
+    },
+    {
+        "set-home",
+        "move an account's home directory",
+        "UserSetHomeDir",
+        {user, {"HOME", "HomeDir", "DIR", "absolute path; the files are moved there"}},
+        {
+            {"mihost user set-home jdoe /srv/jdoe", "move the directory"},
+            {"mihost --sandbox user set-home jdoe /srv/jdoe", "show which files would move"},
+        },
+    },
+    {
+        "set-name",
+        "set an account's full name",
+        "UserSetFullName",
+        {user, {"FULL-NAME", "FullName", "", "full name"}},
+        {
+            {"mihost user set-name jdoe 'Jane Doe'", "set the full name"},
+            {"mihost --json user set-name jdoe 'Jane Doe'", "print what changed as JSON"},
+        },
+    },
+    {
+        "set-password",
+        "set an account's password, read from a prompt or standard input",
+        "UserSetPassword",
+        {user, {"--password", "Password", "", ""}},
+        {
+            {"mihost user set-password jdoe", "ask for the password twice"},
+            {"mihost user set-password jdoe --password-file /root/secret", "read it from a file"},
+        },
+    },
+    {
+        "expire",
+        "set the day on which an account expires",
+        "UserSetAttrib",
+        {user, {"DAY", "passwordExpirationDate", "", "YYYY-MM-DD or never"}},
+        {
+            {"mihost user expire jdoe 2030-12-31", "let the account expire on that day"},
+            {"mihost user expire jdoe never", "let it never expire"},
+        },
+    },
+    Task{
+        "age",
+        "set an account's password ageing",
+        "UserSetAttrib",
+        {user, minDays, maxDays, warnDays, inactiveDays},
+        {
+            {"mihost user age jdoe --max-days 90 --warn-days 14", "change the password quarterly"},
+            {"mihost user age jdoe --max-days 99999", "let the password never expire"},
+        },
+    }
+        .needingAnOption(),
+};
+
+class User : public TaskCommand
+{
+public:
+    User() : TaskCommand({"user", "USER", "the account to show", tasks, showUser}) {}
+};
+
+} // namespace
+
+CommandRow const commandRows::user{
+    "user",
+    "show or change an account",
+    newCommand<User>,
+    {
+        {"mihost user jdoe", "ids, groups, state and password ageing"},
+        {"mihost user set-shell jdoe /bin/sh", "change it"},
+    },
+};
+
+} // namespace mihost

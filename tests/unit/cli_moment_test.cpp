@@ -36,6 +36,7 @@ TEST(Moment, IsSomeTimeAgo)
     EXPECT_EQ(moment("0 hours ago"), "2026-06-10 12:00:00");
     EXPECT_EQ(moment("2 days ago"), "2026-06-08 12:00:00");
     EXPECT_EQ(moment("1 week ago"), "2026-06-03 12:00:00");
+    EXPECT_EQ(parseMoment("1000000 weeks ago", 1), 0); // and not before 1970
 }
 
 TEST(Moment, IsNothingElse)

@@ -41,7 +41,7 @@ LogLine lineOf(IC::MutableNode const& entry)
     auto const stored = entry.getProperties();
     LogLine line;
     if (auto const time = stored.find(NODES::creationTime); time != stored.end())
-        line.time = time->second.getNumber();
+        line.time = static_cast<long>(time->second.getNumber());
     if (auto const message = stored.find(NODES::message); message != stored.end())
         line.message = withoutAsterisks(static_cast<std::string>(message->second));
     return line;

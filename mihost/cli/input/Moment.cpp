@@ -2,6 +2,7 @@
 
 #include "mihost/cli/input/Day.h"
 
+#include <algorithm>
 #include <ctime>
 #include <sstream>
 
@@ -37,9 +38,9 @@ long midnight(long now, int daysBefore)
 /** "5 minutes ago" */
 std::optional<long> parseAgo(std::string const& text, long now)
 {
-    constexpr long most = 1'000'000;
+    constexpr long long most = 1'000'000;
     std::istringstream words(text);
-    long count = 0;
+    long long count = 0;
     std::string unit;
     std::string ago;
     std::string more;
@@ -48,7 +49,7 @@ std::optional<long> parseAgo(std::string const& text, long now)
         return std::nullopt;
     for (Unit const& each : units)
         if (unit == each.name || unit == std::string(each.name) + 's')
-            return now - count * each.seconds;
+            return static_cast<long>(std::max(now - count * each.seconds, 0LL));
     return std::nullopt;
 }
 

@@ -15,7 +15,7 @@ namespace mihost
 namespace
 {
 
-constexpr off_t newestBytes = 1 << 18;       // hold the newest lines unless they are long
+constexpr long long newestBytes = 1 << 18;   // hold the newest lines unless they are long
 constexpr std::size_t longestKept = 1 << 16; // bytes of a line; nobody shows more
 
 Descriptor openLog(std::string const& path)
@@ -38,8 +38,8 @@ LogFile::LogFile(std::string const& path) : path_(path), file_(openLog(path))
 
 std::vector<std::string> LogFile::newestLines(std::size_t count)
 {
-    off_t const size = lseek(file_.get(), 0, SEEK_END);
-    position_ = std::max<off_t>(size - newestBytes, 0);
+    long long const size = lseek(file_.get(), 0, SEEK_END);
+    position_ = std::max(size - newestBytes, 0LL);
     bool const startsWithin = position_ > 0;
     unfinished_.clear();
     std::vector<std::string> lines;

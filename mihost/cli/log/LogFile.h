@@ -4,7 +4,6 @@
 #include "mihost/sandbox/Descriptor.h"
 
 #include <string>
-#include <sys/types.h>
 #include <vector>
 
 namespace mihost
@@ -35,7 +34,7 @@ private:
 
     std::string path_;
     Descriptor file_;
-    off_t position_ = 0;     // of what is read next
+    long long position_ = 0; // of what is read next, also in a log of more than 2 GiB
     std::string unfinished_; // the start of a line that has not ended
 };
 

@@ -22,7 +22,7 @@ options:
     default: tree
   facts:
     description:
-      - Whether to return the result as the fact C(mi) of the host, too.
+      - Whether the result becomes the fact C(mi) of the host.
     type: bool
     default: false
 extends_documentation_fragment:
@@ -65,14 +65,14 @@ mi:
       have one for each name; C(log) is a list of entries, the newest first.
     - The keys are the names of the properties with underscores, see C(mihost properties). Dates are
       seconds since 1970, and what could not be read is null.
-  returned: success
+  returned: if I(facts=false)
   type: dict
   sample:
     os: {os_name: Linux, physical_memory_size: 24684472, last_boot_time: 1763740800}
     users:
       root: {user_name: root, user_id: "0", login_shell: /bin/bash}
 ansible_facts:
-  description: C(mi) once more, as a fact.
+  description: C(mi) as a fact.
   returned: if I(facts=true)
   type: dict
   sample: {mi: {os: {os_name: Linux}}}
@@ -106,7 +106,7 @@ def main():
         nodes = mihost.read('list', kind)
     result = dict(mi=native(nodes))
     if module.params['facts']:
-        result['ansible_facts'] = dict(mi=result['mi'])
+        result = dict(ansible_facts=result)
     module.exit_json(changed=False, **result)
 
 

@@ -1,0 +1,23 @@
+"""What both benchmarks of this directory share: rounds that alternate, and tables."""
+
+import statistics
+
+
+def alternating(subjects, rounds):
+    """The results of each subject: round by round, so that what slows the machine slows all."""
+    results = {name: [] for name in subjects}
+    for _ in range(rounds):
+        for name, run in subjects.items():
+            results[name].append(run())
+    return results
+
+
+def cell(values, digits=2):
+    """The median and, in brackets, the two quartiles."""
+    low, middle, high = statistics.quantiles(values, n=4, method='inclusive')
+    return f'{middle:.{digits}f} ({low:.{digits}f}-{high:.{digits}f})'
+
+
+def table(heading, rows):
+    lines = [heading, ['---'] * len(heading), *rows]
+    return '\n'.join('| ' + ' | '.join(str(field) for field in line) + ' |' for line in lines)

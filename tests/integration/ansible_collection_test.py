@@ -81,7 +81,7 @@ class Collection(unittest.TestCase):
 
     def test_documentation_fits_the_arguments(self):
         done = subprocess.run(
-            [PYTHON, os.path.join(VALIDATOR, 'validate.py'), '--format', 'json', '--arg-spec',
+            [PYTHON, os.path.join(VALIDATOR, 'validate.py'), '--format', 'json', '--arg',
              '--collection', 'ansible_collections/mi/host',
              *(f'plugins/modules/{name}.py' for name in MODULES)],
             cwd=self.installed, env={**self.controller.environment, 'PYTHONPATH': VALIDATOR},

@@ -8,7 +8,7 @@
 #include "bench/support/Samples.h"
 #include "bench/support/Table.h"
 #include "bench/support/Timed.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/Plugin.h"
 
 #include <fstream>
@@ -55,10 +55,10 @@ void measureRefreshes(int many)
     madeUp::accounts(1000);
     Plugin plugin;
     plugin.initialize();
-    IC::MutableNode& os = plugin.node(NODES::operatingSystemType);
+    IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
     Table table({"Refreshes", "Heap, bytes", "Resident, bytes"});
     for (int done = 1; done <= many; ++done) {
-        os.setProperty(NODES::refresh, IC::PropertyValue(IC::Number(0U), true));
+        os.setProperty(IC::property::refresh, IC::PropertyValue(IC::Number(0U), true));
         if (done != few && done != many)
             continue;
         Memory const now = memoryNow();

@@ -9,7 +9,7 @@
 #include "bench/support/Samples.h"
 #include "bench/support/Table.h"
 #include "bench/support/Timed.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/Plugin.h"
 
 #include <benchmark/benchmark.h>
@@ -53,10 +53,10 @@ void addRead(std::string const& what, IC::MutableNode const& node, unsigned int 
 void addRejectedCall(IC::MutableNode& os)
 {
     IC::PropertyValue const call("UserAdd,UserName:CMPI_string:jdoe,Comment:CMPI_real:Test", true);
-    if (os.setProperty(NODES::createUser, call).getStatus() != 1)
+    if (os.setProperty(IC::property::createUser, call).getStatus() != 1)
         throw std::runtime_error("the method call was not rejected");
     add("method call that the parser rejects",
-        [&os, call] { benchmark::DoNotOptimize(os.setProperty(NODES::createUser, call)); });
+        [&os, call] { benchmark::DoNotOptimize(os.setProperty(IC::property::createUser, call)); });
 }
 
 /** Keeps what each repetition took, in the order in which they were added. */
@@ -111,19 +111,19 @@ int main(int argc, char* argv[])
         madeUp::accounts(users);
         Plugin plugin;
         plugin.initialize();
-        IC::MutableNode& os = plugin.node(NODES::operatingSystemType);
+        IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
         if (users == 10) {
-            addRead("stored text (operating system's name)", os, NODES::name);
-            addRead("stored list (of three numbers)", os, NODES::fixedNumbers);
-            addRead("live memory (free)", os, NODES::physicalMemoryFree);
-            addRead("live count of processes", os, NODES::processCount);
+            addRead("stored text (operating system's name)", os, IC::property::name);
+            addRead("stored list (of three numbers)", os, IC::property::fixedNumbers);
+            addRead("live memory (free)", os, IC::property::physicalMemoryFree);
+            addRead("live count of processes", os, IC::property::processCount);
             addRejectedCall(os);
         }
         std::string const among = " among " + number(users);
-        addRead("live count of users" + among, *plugin.nodes(NODES::userType).front(),
-                NODES::elementCount);
-        addRead("live count of groups" + among, *plugin.nodes(NODES::groupType).front(),
-                NODES::elementCount);
+        addRead("live count of users" + among, *plugin.nodes(IC::nodeType::user).front(),
+                IC::property::elementCount);
+        addRead("live count of groups" + among, *plugin.nodes(IC::nodeType::group).front(),
+                IC::property::elementCount);
         benchmark::RunSpecifiedBenchmarks(&keeper);
         benchmark::ClearRegisteredBenchmarks();
     }

@@ -9,7 +9,7 @@
 // After the runs each one's growth from 1,000 to 10,000 users is printed; it shall be at most 12.
 
 #include "frame/OsSwMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/FakeFiles.h"
 
 #include <benchmark/benchmark.h>

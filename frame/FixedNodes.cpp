@@ -1,6 +1,6 @@
 #include "frame/ComputerInfo.h"
 #include "frame/OsSwMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "nodes/values.h"
 
 namespace IC
@@ -9,7 +9,7 @@ namespace IC
 void OsSwMI::createOsSwNodes()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
-    osSwNode_ = adopt(std::make_unique<MutableNode>(miId_, 0, miIds_, NODES::osSwType, 0));
+    osSwNode_ = adopt(std::make_unique<MutableNode>(miId_, 0, miIds_, nodeType::osSw, 0));
     nodeIds_->push_back(miId_);
     setUp("OsSw Management Interface");
 }
@@ -18,7 +18,7 @@ void OsSwMI::createRootNode()
 {
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
-    rootNode_ = adopt(std::make_unique<MutableNode>(nodeId, miId_, miIds_, NODES::rootType, 0));
+    rootNode_ = adopt(std::make_unique<MutableNode>(nodeId, miId_, miIds_, nodeType::root, 0));
     nodeIds_->push_back(miId_); // kept: the interface's own id stands in the list twice
     setUp("ROOT Node");
 }
@@ -28,11 +28,11 @@ void OsSwMI::createComputerNodes()
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     computerNode_ = adopt(std::make_unique<MutableNode>(nodeId, rootNode_->getNodeId(), miIds_,
-                                                        NODES::computerType, 0));
+                                                        nodeType::computer, 0));
     setUp("Computer");
     std::string name;
     if (NQ::ComputerInfo::getComputerName(name))
-        computerNode_->setProperty(NODES::name, NODES::text(name));
+        computerNode_->setProperty(property::name, values::text(name));
 }
 
 } // namespace IC

@@ -1,6 +1,6 @@
 #include "frame/OsSwMI.h"
 
-#include "nodes/ids.h"
+#include "host/Properties.h"
 
 namespace IC
 {
@@ -67,7 +67,7 @@ MutableNode* OsSwMI::adopt(std::unique_ptr<MutableNode> node, std::vector<Node*>
 
 void OsSwMI::setUp(std::string const& description)
 {
-    currentNode_->setStatus(NODES::statusOk);
+    currentNode_->setStatus(statusOk);
     currentNode_->setDescription(description);
 }
 

@@ -6,6 +6,16 @@
 namespace VXLog
 {
 
+/** The levels of messages. */
+namespace level
+{
+
+constexpr int progress = 3000; // entries and exits of functions, and what goes on
+constexpr int power = 4000;    // the machine is about to halt or to restart
+constexpr int error = 6000;
+
+} // namespace level
+
 /**
  * The host's log. Both operations take the same arguments and may be called from any thread; a
  * management interface calls first the one and then the other for each of its messages.
@@ -14,7 +24,7 @@ namespace VXLog
  * @param file      its source unit, such as "OsSwMI"
  * @param line      its source line
  * @param category  the unit's dotted category
- * @param level     3000 progress, 4000 power actions, 6000 errors
+ * @param level     one of those above
  * @param extra     null
  * @param first     0
  * @param second    0

@@ -1,5 +1,5 @@
 #include "frame/OsSwMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "nodes/values.h"
 #include "sysdata/driverInfo_linux.h"
 
@@ -15,12 +15,13 @@ void OsSwMI::createDriverNodes()
     for (NQ::driverInfo const& driver : drivers) {
         unsigned int const nodeId = takeNodeId();
         MutableNode* const node = adopt(std::make_unique<MutableNode>(
-            nodeId, osNode_->getNodeId(), miIds_, NODES::driverType, ++index));
+            nodeId, osNode_->getNodeId(), miIds_, nodeType::driver, ++index));
         setUp(driver.getDescription());
-        NODES::setProperties(*node, {{NODES::version, NODES::text(driver.getVersion())},
-                                     {NODES::name, NODES::text(driver.getName())},
-                                     {NODES::buildNumber, NODES::text(driver.getBuildNumber())},
-                                     {NODES::manufacturer, NODES::text(driver.getManufacturer())}});
+        values::setProperties(*node,
+                              {{property::version, values::text(driver.getVersion())},
+                               {property::name, values::text(driver.getName())},
+                               {property::buildNumber, values::text(driver.getBuildNumber())},
+                               {property::manufacturer, values::text(driver.getManufacturer())}});
     }
 }
 

@@ -1,7 +1,7 @@
 #include "nodes/GroupNode.h"
 
 #include "frame/OsSwMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "nodes/values.h"
 #include "sysdata/groupInfo_linux.h"
 #include "util/MutexLock.h"
@@ -26,11 +26,11 @@ GroupNode::~GroupNode()
 Error GroupNode::getProperty(unsigned int id, PropertyValue& value) const
 {
     NQ::LOG::Scope const scope(OSSWMI::unit, {"GroupNode::getProperty"});
-    if (id != NODES::elementCount)
+    if (id != property::elementCount)
         return MutableNode::getProperty(id, value);
     std::vector<groupInfo> groups;
     NQ::getGroupInfo(groups);
-    value = NODES::number(static_cast<unsigned int>(groups.size()));
+    value = values::number(static_cast<unsigned int>(groups.size()));
     return {0, Number(0U), ""};
 }
 
@@ -48,18 +48,18 @@ void OsSwMI::createGroupNodes(bool refresh)
     for (groupInfo& group : groups) {
         unsigned int const nodeId = takeNodeId(!refresh);
         MutableNode* const node =
-            adopt(std::make_unique<GroupNode>(nodeId, osNode_->getNodeId(), miIds_,
-                                              NODES::groupType, ++position),
+            adopt(std::make_unique<GroupNode>(nodeId, osNode_->getNodeId(), miIds_, nodeType::group,
+                                              ++position),
                   &groupNodes_);
         setUp("Group");
         std::string const name = group.getGroupName();
         unsigned int const id = group.getGroupId();
         NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("Name = ", name));
         NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("Id = ", id));
-        NODES::setProperties(*node, {{NODES::name, NODES::text(name)},
-                                     {NODES::id, NODES::number(id)},
-                                     {NODES::members, NODES::texts(group.getGroupMembers())},
-                                     {NODES::elementCount, NODES::number(count)}});
+        values::setProperties(*node, {{property::name, values::text(name)},
+                                      {property::id, values::number(id)},
+                                      {property::members, values::texts(group.getGroupMembers())},
+                                      {property::elementCount, values::number(count)}});
         if (refresh)
             publishNode(node);
     }

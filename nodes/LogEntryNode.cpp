@@ -1,7 +1,7 @@
 #include "nodes/LogEntryNode.h"
 
 #include "frame/OsSwMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "nodes/values.h"
 #include "sysdata/logInfo_linux.h"
 
@@ -39,19 +39,19 @@ Error LogEntryNode::getProperty(unsigned int id, PropertyValue& value) const
     std::string text;
     long time = 0;
     switch (id) {
-    case NODES::message:
+    case property::message:
         if (!log.getData(text, index))
-            return NODES::failure();
-        value = NODES::text(text);
-        return NODES::success();
-    case NODES::id:
-        value = NODES::number(index);
-        return NODES::success();
-    case NODES::creationTime:
+            return values::failure();
+        value = values::text(text);
+        return values::success();
+    case property::id:
+        value = values::number(index);
+        return values::success();
+    case property::creationTime:
         if (!log.getCreationTime(time, index))
-            return NODES::failure();
-        value = NODES::date(time);
-        return NODES::success();
+            return values::failure();
+        value = values::date(time);
+        return values::success();
     default:
         return MutableNode::getProperty(id, value);
     }
@@ -77,12 +77,12 @@ void OsSwMI::createLogEntryNodes(bool refresh)
         unsigned int const nodeId = takeNodeId();
         MutableNode* const node =
             adopt(std::make_unique<LogEntryNode>(nodeId, logNode_->getNodeId(), miIds_,
-                                                 NODES::logEntryType, index),
+                                                 nodeType::logEntry, index),
                   &logEntryNodes_);
         setUp("OS LogEntry");
-        node->setProperty(NODES::id, NODES::number(index));
-        PropertyValue value = NODES::emptyValue();
-        for (unsigned int const id : {NODES::message, NODES::creationTime})
+        node->setProperty(property::id, values::number(index));
+        PropertyValue value = values::emptyValue();
+        for (unsigned int const id : {property::message, property::creationTime})
             if (node->getProperty(id, value).getStatus() == 0)
                 node->setProperty(id, value);
         if (refresh)

@@ -1,5 +1,5 @@
 #include "frame/OsSwMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "nodes/values.h"
 
 namespace IC
@@ -10,14 +10,14 @@ void OsSwMI::createLogNodes()
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     logNode_ = adopt(
-        std::make_unique<MutableNode>(nodeId, osNode_->getNodeId(), miIds_, NODES::logType, 0));
+        std::make_unique<MutableNode>(nodeId, osNode_->getNodeId(), miIds_, nodeType::log, 0));
     setUp("OS Log");
-    NODES::setProperties(*logNode_, {{NODES::requestedState, NODES::enumeration(1)},
-                                     {NODES::fixedNumbers, NODES::fixedNumberList()},
-                                     {NODES::logNumber, NODES::number(0)},
-                                     {NODES::name, NODES::text("OS Log")},
-                                     {NODES::logState, NODES::enumeration(2)},
-                                     {NODES::dataType, NODES::text("*string LogData*")}});
+    values::setProperties(*logNode_, {{property::requestedState, values::enumeration(1)},
+                                      {property::fixedNumbers, values::fixedNumberList()},
+                                      {property::logNumber, values::number(0)},
+                                      {property::name, values::text("OS Log")},
+                                      {property::logState, values::enumeration(2)},
+                                      {property::dataType, values::text("*string LogData*")}});
 }
 
 } // namespace IC

@@ -1,7 +1,7 @@
 #include "nodes/OsNode.h"
 
 #include "frame/OsSwMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "nodes/values.h"
 #include "sysdata/osInfo_linux.h"
 
@@ -28,32 +28,32 @@ template <auto getter, class Value> bool ask(OsInfo& info, Value& out)
 }
 
 constexpr TextFact namingFacts[] = {
-    {NODES::name, ask<&OsInfo::getOSName>},
-    {NODES::version, ask<&OsInfo::getOSVersion>},
+    {property::name, ask<&OsInfo::getOSName>},
+    {property::version, ask<&OsInfo::getOSVersion>},
 };
 
 constexpr NumberFact storedFigures[] = {
-    {NODES::processMaxNumber, ask<&OsInfo::getProcessMaxNumber>},
-    {NODES::processMaxMemory, ask<&OsInfo::getProcessMaxMemory>},
-    {NODES::userCount, ask<&OsInfo::getUserCount>},
-    {NODES::licensedUserCount, ask<&OsInfo::getLicensedUserCount>},
-    {NODES::virtualMemorySize, ask<&OsInfo::getVirtualMemorySize>},
-    {NODES::virtualMemoryFree, ask<&OsInfo::getVirtualMemoryFree>},
+    {property::processMaxNumber, ask<&OsInfo::getProcessMaxNumber>},
+    {property::processMaxMemory, ask<&OsInfo::getProcessMaxMemory>},
+    {property::userCount, ask<&OsInfo::getUserCount>},
+    {property::licensedUserCount, ask<&OsInfo::getLicensedUserCount>},
+    {property::virtualMemorySize, ask<&OsInfo::getVirtualMemorySize>},
+    {property::virtualMemoryFree, ask<&OsInfo::getVirtualMemoryFree>},
 };
 
 constexpr TextFact localeFacts[] = {
-    {NODES::languageEdition, ask<&OsInfo::getLanguageEdition>},
-    {NODES::codeSet, ask<&OsInfo::getCodeSet>},
+    {property::languageEdition, ask<&OsInfo::getLanguageEdition>},
+    {property::codeSet, ask<&OsInfo::getCodeSet>},
 };
 
 // In the order in which they are seeded.
 constexpr NumberFact liveFigures[] = {
-    {NODES::processCount, ask<&OsInfo::getProcessCount>},
-    {NODES::physicalMemoryFree, ask<&OsInfo::getPhysicalMemoryFree>},
-    {NODES::physicalMemorySize, ask<&OsInfo::getPhysicalMemorySize>},
-    {NODES::swapFileSize, ask<&OsInfo::getSwapFileSize>},
-    {NODES::swapFileFree, ask<&OsInfo::getSwapFileFree>},
-    {NODES::swapFileSizeStored, ask<&OsInfo::getSwapFileSizeStored>},
+    {property::processCount, ask<&OsInfo::getProcessCount>},
+    {property::physicalMemoryFree, ask<&OsInfo::getPhysicalMemoryFree>},
+    {property::physicalMemorySize, ask<&OsInfo::getPhysicalMemorySize>},
+    {property::swapFileSize, ask<&OsInfo::getSwapFileSize>},
+    {property::swapFileFree, ask<&OsInfo::getSwapFileFree>},
+    {property::swapFileSizeStored, ask<&OsInfo::getSwapFileSizeStored>},
 };
 
 template <std::size_t count>
@@ -62,7 +62,7 @@ void store(OsInfo& info, TextFact const (&facts)[count], MutableNode& node)
     for (TextFact const& fact : facts) {
         std::string text;
         if (fact.get(info, text))
-            node.setProperty(fact.id, NODES::text(text));
+            node.setProperty(fact.id, values::text(text));
     }
 }
 
@@ -72,7 +72,7 @@ void store(OsInfo& info, NumberFact const (&facts)[count], MutableNode& node)
     for (NumberFact const& fact : facts) {
         unsigned int number = 0;
         if (fact.get(info, number))
-            node.setProperty(fact.id, NODES::number(number));
+            node.setProperty(fact.id, values::number(number));
     }
 }
 
@@ -107,12 +107,12 @@ Error OsNode::getProperty(unsigned int id, PropertyValue& value) const
             continue;
         unsigned int number = 0;
         if (figure.get(info, number))
-            value = NODES::number(number);
-        return NODES::success();
+            value = values::number(number);
+        return values::success();
     }
-    if (id == NODES::clearLog) {
-        value = NODES::number(0);
-        return NODES::success();
+    if (id == property::clearLog) {
+        value = values::number(0);
+        return values::success();
     }
     return MutableNode::getProperty(id, value);
 }
@@ -122,25 +122,25 @@ void OsSwMI::createOsNodes()
     NQ::LOG::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     osNode_ = adopt(std::make_unique<OsNode>(nodeId, computerNode_->getNodeId(), miIds_,
-                                             NODES::operatingSystemType, 0));
+                                             nodeType::operatingSystem, 0));
     setUp("Operating System");
-    NODES::setProperties(
-        *osNode_, {{NODES::fixedEnumeration, {EnumValue(static_cast<unsigned short>(35)), true}},
-                   {NODES::requestedState, {EnumValue(1U), false}}, // the only false flag
-                   {NODES::fixedNumbers, NODES::fixedNumberList()}});
+    values::setProperties(
+        *osNode_, {{property::fixedEnumeration, {EnumValue(static_cast<unsigned short>(35)), true}},
+                   {property::requestedState, {EnumValue(1U), false}}, // the only false flag
+                   {property::fixedNumbers, values::fixedNumberList()}});
 
     OsInfo info;
     store(info, namingFacts, *osNode_);
-    NODES::setProperties(
-        *osNode_, {{NODES::createUser, {"dummy", true}}, {NODES::refresh, NODES::number(1)}});
+    values::setProperties(*osNode_, {{property::createUser, {"dummy", true}},
+                                     {property::refresh, values::number(1)}});
     bool distributed = false;
     if (info.getDistributed(distributed))
-        osNode_->setProperty(NODES::distributed, NODES::truth(distributed));
+        osNode_->setProperty(property::distributed, values::truth(distributed));
     store(info, storedFigures, *osNode_);
     store(info, localeFacts, *osNode_);
 
     // Kept: one value serves all, so a figure that cannot be had stores the one before it.
-    PropertyValue value = NODES::emptyValue();
+    PropertyValue value = values::emptyValue();
     for (NumberFact const& figure : liveFigures) {
         osNode_->getProperty(figure.id, value);
         osNode_->setProperty(figure.id, value);
@@ -148,11 +148,11 @@ void OsSwMI::createOsNodes()
 
     long time = 0;
     if (info.getLastBootTime(time)) {
-        osNode_->setProperty(NODES::lastBootTime, NODES::date(time));
+        osNode_->setProperty(property::lastBootTime, values::date(time));
         logTime("LastBootTime = ", time, __func__);
     }
     if (info.getInstallDate(time)) {
-        osNode_->setProperty(NODES::installDate, NODES::date(time));
+        osNode_->setProperty(property::installDate, values::date(time));
         logTime("InstallDate = ", time, __func__);
     }
 }

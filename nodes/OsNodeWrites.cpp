@@ -1,9 +1,9 @@
 // What the operating-system node does when a host writes to it.
 
 #include "frame/OsSwMI.h"
+#include "host/Properties.h"
 #include "host/make_string.h"
 #include "nodes/OsNode.h"
-#include "nodes/ids.h"
 #include "nodes/values.h"
 #include "sysdata/logInfo_linux.h"
 #include "sysdata/osInfo_linux.h"
@@ -14,14 +14,9 @@ namespace IC
 namespace
 {
 
-// What a host writes to command properties.
-constexpr unsigned int reset = 9; // the machine or, as clear log, the log
-constexpr unsigned int takeOffline = 12;
-constexpr unsigned int rebuild = 0;
-
-bool asksFor(PropertyValue const& value, unsigned int command)
+bool asksFor(PropertyValue const& value, unsigned int number)
 {
-    return static_cast<unsigned int>(value) == command;
+    return static_cast<unsigned int>(value) == number;
 }
 
 void rebuildAccounts()
@@ -54,24 +49,24 @@ Error OsNode::setProperty(unsigned int const& id, PropertyValue const& value)
     NQ::OsInfo info;
     NQ::logInfo log;
     switch (id) {
-    case NODES::requestedState:
-        if (asksFor(value, reset))
+    case property::requestedState:
+        if (asksFor(value, command::restart))
             info.statusReset();
-        else if (asksFor(value, takeOffline))
+        else if (asksFor(value, command::halt))
             info.statusOffline();
         break;
-    case NODES::clearLog:
-        if (asksFor(value, reset) && log.clearLog())
+    case property::clearLog:
+        if (asksFor(value, command::emptyLog) && log.clearLog())
             pOsSwMI->createLogEntryNodes(true);
         break;
-    case NODES::refresh:
-        if (asksFor(value, rebuild))
+    case property::refresh:
+        if (asksFor(value, command::rebuild))
             rebuildAccounts();
         break;
-    case NODES::createUser:
+    case property::createUser:
         if (!administer(info, value, __func__)) {
             MutableNode::setProperty(id, PropertyValue("", true));
-            return NODES::failure();
+            return values::failure();
         }
         break;
     default:

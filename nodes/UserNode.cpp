@@ -1,8 +1,8 @@
 #include "nodes/UserNode.h"
 
 #include "frame/OsSwMI.h"
+#include "host/Properties.h"
 #include "host/make_string.h"
-#include "nodes/ids.h"
 #include "nodes/values.h"
 #include "sysdata/userInfo_linux.h"
 #include "util/MutexLock.h"
@@ -36,12 +36,12 @@ public:
 
 PropertyValue number(unsigned long value)
 {
-    return NODES::number(static_cast<unsigned int>(value));
+    return values::number(static_cast<unsigned int>(value));
 }
 
 PropertyValue date(unsigned long seconds)
 {
-    return NODES::date(static_cast<long>(seconds));
+    return values::date(static_cast<long>(seconds));
 }
 
 void setUserProperties(MutableNode& node, userInfo& user, std::size_t userCount)
@@ -50,33 +50,33 @@ void setUserProperties(MutableNode& node, userInfo& user, std::size_t userCount)
     std::string const id = user.getUserId();
     std::string const password = user.getUserPassword();
     PropertyValue const inactiveTime = date(user.getPwdInactDays());
-    NODES::setProperties(
-        node,
-        {{NODES::requestedState, NODES::enumeration(1)},
-         {NODES::fixedNumbers, NODES::fixedNumberList()},
-         {NODES::name, NODES::text(name)},
-         {NODES::nameLength, number(name.length())},
-         {NODES::id, NODES::text(id)},
-         {NODES::idLength, number(id.length())},
-         {NODES::groupId, NODES::text(user.getGroupId())},
-         {NODES::fullName, NODES::text(user.getUserFullName())},
-         {NODES::homeDir, NODES::text(user.getUserHomeDir())},
-         {NODES::scriptPath, NODES::text(user.getUserScriptPath())},
-         {NODES::password, NODES::text(password)},
-         {NODES::passwordLength, number(password.length())},
-         {NODES::pwdMaxDays, number(user.getPwdMaxDays())},
-         {NODES::pwdWarnDays, number(user.getPwdWarnDays())},
-         {NODES::pwdMinDays, number(user.getPwdMinDays())},
-         {NODES::pwdExpDays, number(user.getPwdExpDays())},
-         {NODES::inactiveTime, inactiveTime},
-         {NODES::passwordHistoryDepth,
-          number(static_cast<unsigned long>(user.getPasswordHistoryDepth()))},
-         {NODES::reservedText, {"", true}},
-         {NODES::passwordExpiration, inactiveTime}, // kept: a write gives it its meaning
-         {NODES::lastPwdChange, date(user.getLstPwdChg())},
-         {NODES::maxLoginFailures, number(static_cast<unsigned long>(user.getMaxLoginFailures()))},
-         {NODES::deleteUser, NODES::truth(user.IsDelete())},
-         {NODES::elementCount, number(userCount)}});
+    values::setProperties(
+        node, {{property::requestedState, values::enumeration(1)},
+               {property::fixedNumbers, values::fixedNumberList()},
+               {property::name, values::text(name)},
+               {property::nameLength, number(name.length())},
+               {property::id, values::text(id)},
+               {property::idLength, number(id.length())},
+               {property::groupId, values::text(user.getGroupId())},
+               {property::fullName, values::text(user.getUserFullName())},
+               {property::homeDir, values::text(user.getUserHomeDir())},
+               {property::scriptPath, values::text(user.getUserScriptPath())},
+               {property::password, values::text(password)},
+               {property::passwordLength, number(password.length())},
+               {property::pwdMaxDays, number(user.getPwdMaxDays())},
+               {property::pwdWarnDays, number(user.getPwdWarnDays())},
+               {property::pwdMinDays, number(user.getPwdMinDays())},
+               {property::pwdExpDays, number(user.getPwdExpDays())},
+               {property::inactiveTime, inactiveTime},
+               {property::passwordHistoryDepth,
+                number(static_cast<unsigned long>(user.getPasswordHistoryDepth()))},
+               {property::reservedText, {"", true}},
+               {property::passwordExpiration, inactiveTime}, // kept: a write gives it its meaning
+               {property::lastPwdChange, date(user.getLstPwdChg())},
+               {property::maxLoginFailures,
+                number(static_cast<unsigned long>(user.getMaxLoginFailures()))},
+               {property::deleteUser, values::truth(user.IsDelete())},
+               {property::elementCount, number(userCount)}});
 }
 
 /** Through wide text and back, which is how the host's texts are read. */
@@ -87,7 +87,7 @@ std::string textOf(PropertyValue const& value)
 
 std::string textOf(MutableNode const& node, unsigned int id)
 {
-    PropertyValue value = NODES::emptyValue();
+    PropertyValue value = values::emptyValue();
     node.getProperty(id, value);
     return textOf(value);
 }
@@ -108,18 +108,18 @@ void setPassword(std::string const& user, std::string const& password, char cons
 void act(MutableNode const& node, unsigned int id, PropertyValue const& value, char const* function)
 {
     switch (id) {
-    case NODES::password:
-        setPassword(textOf(node, NODES::name), textOf(value), function);
+    case property::password:
+        setPassword(textOf(node, property::name), textOf(value), function);
         break;
-    case NODES::inactiveTime:
-        userInfo().setInactivityTimeout(textOf(value), textOf(node, NODES::name));
+    case property::inactiveTime:
+        userInfo().setInactivityTimeout(textOf(value), textOf(node, property::name));
         break;
-    case NODES::passwordExpiration:
-        userInfo().setPasswordExpiration(textOf(value), textOf(node, NODES::name));
+    case property::passwordExpiration:
+        userInfo().setPasswordExpiration(textOf(value), textOf(node, property::name));
         break;
-    case NODES::deleteUser:
+    case property::deleteUser:
         if (static_cast<unsigned int>(value) == 1)
-            userInfo().setDelete(textOf(node, NODES::id)); // Contract: by id, not by name
+            userInfo().setDelete(textOf(node, property::id)); // Contract: by id, not by name
         break;
     default:
         break;
@@ -144,7 +144,7 @@ Error UserNode::getProperty(unsigned int id, PropertyValue& value) const
 {
     // Contract: the messages name the class twice, which log filters of hosts expect.
     NQ::LOG::Scope const scope(OSSWMI::unit, {"UserNode::UserNode"});
-    if (id != NODES::elementCount)
+    if (id != property::elementCount)
         return MutableNode::getProperty(id, value);
     std::vector<userInfo> users;
     NQ::getUserInfo(users);
@@ -171,8 +171,8 @@ void OsSwMI::createUserNodes(bool refresh)
     unsigned int position = 0;
     for (userInfo& user : users) {
         unsigned int const nodeId = takeNodeId(!refresh);
-        auto node = std::make_unique<UserNode>(nodeId, osNode_->getNodeId(), miIds_,
-                                               NODES::userType, ++position);
+        auto node = std::make_unique<UserNode>(nodeId, osNode_->getNodeId(), miIds_, nodeType::user,
+                                               ++position);
         {
             BuilderWrites const ours;
             adopt(std::move(node), &userNodes_);

@@ -1,11 +1,7 @@
 #include "nodes/values.h"
 
-namespace NODES
+namespace IC::values
 {
-
-using IC::Error;
-using IC::Number;
-using IC::PropertyValue;
 
 PropertyValue text(std::string const& value)
 {
@@ -29,7 +25,7 @@ PropertyValue truth(bool value)
 
 PropertyValue enumeration(unsigned int value)
 {
-    return {IC::EnumValue(value), true};
+    return {EnumValue(value), true};
 }
 
 PropertyValue date(long seconds)
@@ -57,10 +53,10 @@ Error failure()
     return {1, Number(Number::EmptyKind), ""};
 }
 
-void setProperties(IC::MutableNode& node, std::initializer_list<Property> properties)
+void setProperties(MutableNode& node, std::initializer_list<Property> properties)
 {
     for (Property const& property : properties)
         node.setProperty(property.id, property.value);
 }
 
-} // namespace NODES
+} // namespace IC::values

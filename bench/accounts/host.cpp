@@ -3,7 +3,7 @@
 
 #include "bench/support/Timed.h"
 #include "frame/OsSwMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/Plugin.h"
 
 #include <cstdio>
@@ -49,10 +49,10 @@ int main(int argc, char* argv[])
         return EXIT_FAILURE;
     plugin().initialize();
     std::printf("%.4f\n", spent);
-    IC::MutableNode& os = plugin().node(NODES::operatingSystemType);
+    IC::MutableNode& os = plugin().node(IC::nodeType::operatingSystem);
     for (int left = std::atoi(argv[1]); left > 0; --left) {
         double const before = millisecondsNow();
-        os.setProperty(NODES::refresh, IC::PropertyValue(IC::Number(0U), true));
+        os.setProperty(IC::property::refresh, IC::PropertyValue(IC::Number(0U), true));
         std::printf("%.4f\n", millisecondsNow() - before);
     }
     return EXIT_SUCCESS;

@@ -10,8 +10,8 @@
 // the way; flat figures mean that nothing is lost. SHARE, a percentage, shortens all three. Exits 1
 // when descriptors or children grew, or memory by more than 2 percent between 50 and 100.
 
+#include "host/Properties.h"
 #include "mihost/sandbox/Sandbox.h"
-#include "nodes/ids.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 
@@ -101,8 +101,9 @@ public:
 
     void operator()(int number) const
     {
-        static constexpr unsigned int ids[] = {NODES::name, NODES::physicalMemoryFree,
-                                               NODES::fixedNumbers, NODES::processCount};
+        static constexpr unsigned int ids[] = {IC::property::name, IC::property::physicalMemoryFree,
+                                               IC::property::fixedNumbers,
+                                               IC::property::processCount};
         IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
         auto const at = static_cast<std::size_t>(number);
         nodes_[at % nodes_.size()]->getProperty(ids[at % std::size(ids)], value);
@@ -134,10 +135,11 @@ int main(int argc, char** argv)
         Plugin plugin;
         plugin.initialize();
         flat = report("property reads", 10000 * share, Reads(plugin)) && flat;
-        IC::MutableNode& os = plugin.node(NODES::operatingSystemType);
+        IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
         flat = report("refreshes", 10 * share,
                       [&os](int) {
-                          os.setProperty(NODES::refresh, IC::PropertyValue(IC::Number(0U), true));
+                          os.setProperty(IC::property::refresh,
+                                         IC::PropertyValue(IC::Number(0U), true));
                       }) &&
                flat;
     }

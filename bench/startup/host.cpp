@@ -5,7 +5,7 @@
 
 #include "host/MutableNode.h"
 #include "host/OpenMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 
 #include "own_time.h"
 
@@ -26,7 +26,7 @@ IC::MutableNode const* newestEntry(IC::ManagementInterface& interface)
     interface.getMap(nodes);
     for (IC::Node* node : nodes)
         if (auto const* entry = dynamic_cast<IC::MutableNode*>(node);
-            entry && entry->getNodeType() == NODES::logEntryType)
+            entry && entry->getNodeType() == IC::nodeType::logEntry)
             return entry;
     return nullptr;
 }
@@ -37,7 +37,7 @@ double readTime(IC::MutableNode const& entry, int reads)
     auto const before = std::chrono::steady_clock::now();
     IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
     for (int i = 0; i < reads; ++i)
-        entry.getProperty(NODES::message, value);
+        entry.getProperty(IC::property::message, value);
     std::chrono::duration<double, std::micro> const time =
         std::chrono::steady_clock::now() - before;
     return time.count() / reads;

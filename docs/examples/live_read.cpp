@@ -4,18 +4,16 @@
 
 #include <iostream>
 
-constexpr unsigned int physicalMemoryFree = 149;
-
 int main(int argc, char** argv)
 {
     LoadedPlugin plugin(argc > 1 ? argv[1] : "libzorvvxicosswmi.so.1");
     plugin.start();
-    IC::MutableNode const& os = *plugin.nodes(operatingSystemType).front();
+    IC::MutableNode const& os = *plugin.nodes(IC::nodeType::operatingSystem).front();
 
     IC::PropertyValue live(IC::PropertyValue::EmptyKind, true);
-    if (os.getProperty(physicalMemoryFree, live).getStatus() != 0)
+    if (os.getProperty(IC::property::physicalMemoryFree, live).getStatus() != 0)
         return 1;
-    IC::PropertyValue const stored = os.getProperties().at(physicalMemoryFree);
+    IC::PropertyValue const stored = os.getProperties().at(IC::property::physicalMemoryFree);
     std::cout << "free now: " << static_cast<std::string>(live) << " KiB\n"
               << "free at the start: " << static_cast<std::string>(stored) << " KiB\n";
 

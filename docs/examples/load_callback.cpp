@@ -4,8 +4,6 @@
 
 #include <iostream>
 
-constexpr unsigned int refresh = 75;
-
 IC::Error count(IC::Node* const&, void const* context)
 {
     ++*static_cast<unsigned int*>(const_cast<void*>(context));
@@ -21,8 +19,9 @@ int main(int argc, char** argv)
     std::cout << "calls at the start: " << calls << '\n';
 
     // The operating-system node stays; user and group nodes are replaced.
-    IC::MutableNode& os = *plugin.nodes(operatingSystemType).front();
-    os.setProperty(refresh, IC::PropertyValue(IC::Number(0U), true));
+    IC::MutableNode& os = *plugin.nodes(IC::nodeType::operatingSystem).front();
+    os.setProperty(IC::property::refresh,
+                   IC::PropertyValue(IC::Number(IC::command::rebuild), true));
     std::cout << "calls of the rebuild: " << calls << '\n'
-              << "users now: " << plugin.nodes(userType).size() << '\n';
+              << "users now: " << plugin.nodes(IC::nodeType::user).size() << '\n';
 }

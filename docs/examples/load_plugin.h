@@ -5,6 +5,7 @@
 
 #include "host/MutableNode.h"
 #include "host/OpenMI.h"
+#include "host/Properties.h"
 
 #include <dlfcn.h>
 
@@ -60,8 +61,5 @@ private:
     void* library_;
     IC::ManagementInterface* interface_ = nullptr;
 };
-
-constexpr unsigned int operatingSystemType = 17;
-constexpr unsigned int userType = 46;
 
 #endif

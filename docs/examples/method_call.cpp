@@ -1,13 +1,11 @@
 // Carries out a method call, such as "LocalGroupAdd,GroupName:CMPI_string:builders", as root.
 // A refused call carries no reason, so this host collects it from the log.
 
+#include "host/VXLogger.h"
 #include "load_plugin.h"
 #include "mihost/runtime/Runtime.h"
 
 #include <iostream>
-
-constexpr unsigned int methodCall = 74;
-constexpr int errorLevel = 6000;
 
 class Reasons : public mihost::LogSink
 {
@@ -16,7 +14,7 @@ public:
     {
         bool const output = message.text.rfind("outputBuffer: ", 0) == 0;
         bool const once = message.operation == mihost::LogMessage::Operation::Log;
-        if (once && (output || message.level == errorLevel))
+        if (once && (output || message.level == VXLog::level::error))
             lines.push_back(message.text);
     }
 
@@ -31,11 +29,12 @@ int main(int argc, char** argv)
     }
     LoadedPlugin plugin(argv[1]);
     plugin.start();
-    IC::MutableNode& os = *plugin.nodes(operatingSystemType).front();
+    IC::MutableNode& os = *plugin.nodes(IC::nodeType::operatingSystem).front();
 
     Reasons reasons;
     mihost::setLogSink(&reasons);
-    IC::Error const error = os.setProperty(methodCall, IC::PropertyValue(argv[2], true));
+    IC::Error const error =
+        os.setProperty(IC::property::createUser, IC::PropertyValue(argv[2], true));
     mihost::setLogSink(nullptr);
     if (error.getStatus() == 0)
         return 0;

@@ -6,8 +6,6 @@
 #include <iostream>
 #include <thread>
 
-constexpr unsigned int name = 108;
-
 int main(int argc, char** argv)
 {
     LoadedPlugin plugin(argc > 1 ? argv[1] : "libzorvvxicosswmi.so.1");
@@ -15,10 +13,10 @@ int main(int argc, char** argv)
 
     std::atomic<unsigned int> named{0};
     std::vector<std::thread> readers;
-    for (IC::MutableNode const* node : plugin.nodes(userType))
+    for (IC::MutableNode const* node : plugin.nodes(IC::nodeType::user))
         readers.emplace_back([node, &named] {
             IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
-            if (node->getProperty(name, value).getStatus() == 0)
+            if (node->getProperty(IC::property::name, value).getStatus() == 0)
                 ++named;
         });
     // No write until all readers are done: it would delete the nodes that they read.

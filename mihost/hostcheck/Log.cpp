@@ -95,7 +95,7 @@ template <LogOperation Log> void say(std::string const& message, int level)
 
 template <LogOperation Log> std::string takesEveryLevel()
 {
-    for (int const level : {3000, 4000, 6000})
+    for (int const level : {VXLog::level::progress, VXLog::level::power, VXLog::level::error})
         say<Log>("hostcheck: a message of level " + std::to_string(level), level);
     return "";
 }
@@ -103,7 +103,7 @@ template <LogOperation Log> std::string takesEveryLevel()
 template <LogOperation Log> std::string takesOddTexts()
 {
     for (std::string const& text : oddTexts())
-        say<Log>(text, 3000);
+        say<Log>(text, VXLog::level::progress);
     return "";
 }
 
@@ -111,7 +111,7 @@ template <LogOperation Log> std::string takesTwoThreads()
 {
     auto const talk = [] {
         for (int round = 0; round < 100; ++round)
-            say<Log>("hostcheck: round " + std::to_string(round), 3000);
+            say<Log>("hostcheck: round " + std::to_string(round), VXLog::level::progress);
     };
     std::thread other(talk);
     talk();

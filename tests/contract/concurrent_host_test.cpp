@@ -3,7 +3,7 @@
 // with the thread sanitizer.
 
 #include "TestPaths.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/ErrorCount.h"
 #include "tests/support/Libc.h"
 #include "tests/support/LiveNodes.h"
@@ -91,7 +91,7 @@ protected:
 
 TEST_F(ConcurrentHost, ReadsEveryNodeWhileOneThreadRefreshesAndAnotherAddsGroups)
 {
-    IC::MutableNode& os = plugin.node(NODES::operatingSystemType);
+    IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
     std::size_t const nodeCount = plugin.nodes().size();
     ErrorCount const log;
     LiveNodes live(plugin.nodes());
@@ -117,8 +117,8 @@ TEST_F(ConcurrentHost, ReadsEveryNodeWhileOneThreadRefreshesAndAnotherAddsGroups
         }
     };
     std::vector<std::thread> threads;
-    threads.emplace_back(write, NODES::refresh, IC::PropertyValue(IC::Number(0U), true));
-    threads.emplace_back(write, NODES::createUser,
+    threads.emplace_back(write, IC::property::refresh, IC::PropertyValue(IC::Number(0U), true));
+    threads.emplace_back(write, IC::property::createUser,
                          IC::PropertyValue("LocalGroupAdd,GroupName:CMPI_string:staff", true));
     for (unsigned int i = 0; i < readers; ++i)
         threads.emplace_back([&] {

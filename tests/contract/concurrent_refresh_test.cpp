@@ -2,7 +2,7 @@
 // with the thread sanitizer.
 
 #include "TestPaths.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/ErrorCount.h"
 #include "tests/support/Libc.h"
 #include "tests/support/LiveNodes.h"
@@ -44,7 +44,7 @@ protected:
 
 TEST_F(ConcurrentRefresh, LeavesOneWholeSetOfNodesAndEveryCountRight)
 {
-    IC::MutableNode& os = plugin.node(NODES::operatingSystemType);
+    IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
     unsigned int const lastId = plugin.nodes().back()->getNodeId();
     ErrorCount const log;
     LiveNodes live(plugin.nodes());
@@ -55,20 +55,20 @@ TEST_F(ConcurrentRefresh, LeavesOneWholeSetOfNodesAndEveryCountRight)
     auto const refresh = [&] {
         IC::PropertyValue const now(IC::Number(0U), true);
         for (unsigned int i = 0; i < refreshesEach; ++i)
-            wrong += os.setProperty(NODES::refresh, now).getStatus();
+            wrong += os.setProperty(IC::property::refresh, now).getStatus();
         --refreshing;
     };
     auto const readCount = [&](unsigned int type, char const* expected) {
         live.use(type, [&](IC::MutableNode const& node) {
-            wrong += text(node, NODES::elementCount) == expected ? 0 : 1;
-            wrong += text(node, NODES::name).empty() ? 1 : 0;
+            wrong += text(node, IC::property::elementCount) == expected ? 0 : 1;
+            wrong += text(node, IC::property::name).empty() ? 1 : 0;
             ++reads;
         });
     };
     auto const read = [&] {
         while (refreshing > 0 || reads < 100) {
-            readCount(NODES::userType, "4");
-            readCount(NODES::groupType, "4");
+            readCount(IC::nodeType::user, "4");
+            readCount(IC::nodeType::group, "4");
         }
     };
     std::vector<std::thread> threads;
@@ -83,9 +83,9 @@ TEST_F(ConcurrentRefresh, LeavesOneWholeSetOfNodesAndEveryCountRight)
     EXPECT_EQ(log.errors, 0U);
     EXPECT_GE(reads, 100U);
     std::set<unsigned int> ids;
-    for (unsigned int const type : {NODES::userType, NODES::groupType}) {
+    for (unsigned int const type : {IC::nodeType::user, IC::nodeType::group}) {
         std::vector<IC::MutableNode*> const nodes = plugin.nodes(type);
-        EXPECT_EQ(nodes.size(), type == NODES::userType ? userCount : groupCount);
+        EXPECT_EQ(nodes.size(), type == IC::nodeType::user ? userCount : groupCount);
         std::vector<IC::MutableNode const*> alive = live.ofType(type);
         EXPECT_TRUE(std::is_permutation(nodes.begin(), nodes.end(), alive.begin(), alive.end()));
         unsigned int index = 0;

@@ -5,7 +5,7 @@
 #include "TestPaths.h"
 #include "frame/OsSwMI.h"
 #include "host/OpenMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/faults/Faults.h"
 #include "tests/support/Libc.h"
 #include "tests/support/ScratchFolder.h"
@@ -103,9 +103,9 @@ IC::Node* find(unsigned int type)
     for (IC::Node* entry : nodes) {
         auto const* node = dynamic_cast<IC::MutableNode*>(entry);
         IC::PropertyValue name(IC::PropertyValue::EmptyKind, true);
-        node->IC::MutableNode::getProperty(NODES::name, name);
+        node->IC::MutableNode::getProperty(IC::property::name, name);
         if (node->getNodeType() == type &&
-            (type != NODES::userType || static_cast<std::string>(name) == "anna"))
+            (type != IC::nodeType::user || static_cast<std::string>(name) == "anna"))
             return entry;
     }
     return nullptr;
@@ -118,8 +118,8 @@ void start()
 
 bool variesByItself(unsigned int property)
 {
-    return property == NODES::lastBootTime ||
-           (property >= NODES::processCount && property <= NODES::swapFileFree);
+    return property == IC::property::lastBootTime ||
+           (property >= IC::property::processCount && property <= IC::property::swapFileFree);
 }
 
 /** What the tree says, to be compared with that of another start. */
@@ -178,34 +178,41 @@ void PrintTo(Scenario const& scenario, std::ostream* out)
 
 Scenario const scenarios[] = {
     {"Start", true, start},
-    {"Refresh", false, [] { set(NODES::operatingSystemType, NODES::refresh, number(0)); }},
-    {"ClearLog", false, [] { set(NODES::operatingSystemType, NODES::clearLog, number(9)); }},
-    {"Restart", false, [] { set(NODES::operatingSystemType, NODES::requestedState, number(9)); }},
+    {"Refresh", false,
+     [] { set(IC::nodeType::operatingSystem, IC::property::refresh, number(0)); }},
+    {"ClearLog", false,
+     [] { set(IC::nodeType::operatingSystem, IC::property::clearLog, number(9)); }},
+    {"Restart", false,
+     [] { set(IC::nodeType::operatingSystem, IC::property::requestedState, number(9)); }},
     {"UserAdd", false,
      [] {
-         set(NODES::operatingSystemType, NODES::createUser,
+         set(IC::nodeType::operatingSystem, IC::property::createUser,
              text("UserAdd,UserName:CMPI_string:carl,Comment:CMPI_string:Carl C,"
                   "daysMustKeepPassword:CMPI_uint32:3,Password:CMPI_string:secret"));
      }},
     {"GroupMember", false,
      [] {
-         set(NODES::operatingSystemType, NODES::createUser,
+         set(IC::nodeType::operatingSystem, IC::property::createUser,
              text("LocalGroupAddUser,LocalGroupName:CMPI_string:ben,"
                   "DomainAndMember:CMPI_string:anna"));
      }},
-    {"Password", false, [] { set(NODES::userType, NODES::password, text("$6$new$hash")); }},
+    {"Password", false,
+     [] { set(IC::nodeType::user, IC::property::password, text("$6$new$hash")); }},
     {"Inactivity", false,
-     [] { set(NODES::userType, NODES::inactiveTime, text("2030-01-01 00:00:00")); }},
+     [] { set(IC::nodeType::user, IC::property::inactiveTime, text("2030-01-01 00:00:00")); }},
     {"Expiration", false,
-     [] { set(NODES::userType, NODES::passwordExpiration, text("2030-01-01 00:00:00")); }},
-    {"Delete", false, [] { set(NODES::userType, NODES::deleteUser, number(1)); }},
+     [] {
+         set(IC::nodeType::user, IC::property::passwordExpiration, text("2030-01-01 00:00:00"));
+     }},
+    {"Delete", false, [] { set(IC::nodeType::user, IC::property::deleteUser, number(1)); }},
     {"LiveReads", false,
      [] {
-         readLive(NODES::operatingSystemType,
-                  {NODES::processCount, NODES::physicalMemoryFree, NODES::swapFileSizeStored});
-         readLive(NODES::userType, {NODES::elementCount});
-         readLive(NODES::groupType, {NODES::elementCount});
-         readLive(NODES::logEntryType, {NODES::message, NODES::creationTime});
+         readLive(IC::nodeType::operatingSystem,
+                  {IC::property::processCount, IC::property::physicalMemoryFree,
+                   IC::property::swapFileSizeStored});
+         readLive(IC::nodeType::user, {IC::property::elementCount});
+         readLive(IC::nodeType::group, {IC::property::elementCount});
+         readLive(IC::nodeType::logEntry, {IC::property::message, IC::property::creationTime});
      }},
 };
 

@@ -1,4 +1,4 @@
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
@@ -24,7 +24,7 @@ Words shown(Plugin& plugin, unsigned int type, std::string const& before)
 {
     Words words;
     for (IC::MutableNode* const node : plugin.nodes(type))
-        words.push_back(before + text(*node, NODES::name));
+        words.push_back(before + text(*node, IC::property::name));
     return words;
 }
 
@@ -37,8 +37,8 @@ TEST_P(CompletionOn, OffersTheUsersAndGroupsOfTheTree)
     machine::lay(GetParam());
     Plugin plugin;
     plugin.initialize();
-    EXPECT_EQ(offered("user:"), shown(plugin, NODES::userType, "user:"));
-    EXPECT_EQ(offered("group:"), shown(plugin, NODES::groupType, "group:"));
+    EXPECT_EQ(offered("user:"), shown(plugin, IC::nodeType::user, "user:"));
+    EXPECT_EQ(offered("group:"), shown(plugin, IC::nodeType::group, "group:"));
 }
 
 INSTANTIATE_TEST_SUITE_P(Machines, CompletionOn,
@@ -55,7 +55,7 @@ TEST(Completion, OffersTheModulesOfTheTree)
 {
     Plugin plugin;
     plugin.initialize();
-    EXPECT_EQ(offered("driver:"), shown(plugin, NODES::driverType, "driver:"));
+    EXPECT_EQ(offered("driver:"), shown(plugin, IC::nodeType::driver, "driver:"));
 }
 
 } // namespace

@@ -1,7 +1,7 @@
 // Kernel modules as lsmod and modinfo really tell of them.
 
 #include "TestPaths.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/Libc.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
@@ -48,9 +48,9 @@ protected:
     {
         plugin.initialize();
         std::vector<Driver> drivers;
-        for (IC::MutableNode const* node : plugin.nodes(NODES::driverType))
-            drivers.push_back(
-                {text(*node, NODES::name), text(*node, NODES::version), node->getDescription()});
+        for (IC::MutableNode const* node : plugin.nodes(IC::nodeType::driver))
+            drivers.push_back({text(*node, IC::property::name), text(*node, IC::property::version),
+                               node->getDescription()});
         return drivers;
     }
 
@@ -107,7 +107,7 @@ TEST_F(Drivers, AreFourHundredWhereTheKernelHasThatMany)
     ASSERT_EQ(drivers.size(), 400U);
     EXPECT_EQ(drivers.front(), (Driver{"module1", "of module1", "Driver"}));
     EXPECT_EQ(drivers.back(), (Driver{"module400", "of module400", "Driver"}));
-    EXPECT_EQ(plugin.nodes(NODES::driverType).back()->getIndex(), 400U);
+    EXPECT_EQ(plugin.nodes(IC::nodeType::driver).back()->getIndex(), 400U);
 }
 
 TEST_F(Drivers, AreThoseOfTheKernel)

@@ -1,7 +1,7 @@
 // The helpers that the other tests of this tier stand on.
 
+#include "host/Properties.h"
 #include "mihost/sandbox/Sandbox.h"
-#include "nodes/ids.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 
@@ -82,9 +82,9 @@ TEST(Plugin, ShowsItsTreeWhenLoadedAsAHostDoes)
 {
     Plugin plugin;
     EXPECT_EQ(plugin.initialize(7).getStatus(), 0);
-    EXPECT_EQ(plugin.node(NODES::osSwType).getNodeId(), 7U);
-    EXPECT_EQ(plugin.node(NODES::rootType).getLinkedId(), 7U);
-    EXPECT_EQ(text(plugin.node(NODES::operatingSystemType), NODES::clearLog), "0");
+    EXPECT_EQ(plugin.node(IC::nodeType::osSw).getNodeId(), 7U);
+    EXPECT_EQ(plugin.node(IC::nodeType::root).getLinkedId(), 7U);
+    EXPECT_EQ(text(plugin.node(IC::nodeType::operatingSystem), IC::property::clearLog), "0");
 }
 
 } // namespace

@@ -1,7 +1,7 @@
 // A machine at its limits: no descriptors, processes or disk space left, and tools that print
 // without measure or die halfway. What must hold: the plug-in lives and leaves nothing behind.
 
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -117,19 +117,19 @@ protected:
     void live()
     {
         plugin.initialize();
-        EXPECT_EQ(plugin.nodes(NODES::operatingSystemType).size(), 1U);
+        EXPECT_EQ(plugin.nodes(IC::nodeType::operatingSystem).size(), 1U);
         for (IC::MutableNode const* node : plugin.nodes())
             for (auto const& entry : node->getProperties())
                 property(*node, entry.first);
         IC::PropertyValue const zero(IC::Number(0U), true);
         IC::PropertyValue const nine(IC::Number(9U), true);
-        write(NODES::operatingSystemType, NODES::refresh, zero);
-        write(NODES::operatingSystemType, NODES::createUser,
+        write(IC::nodeType::operatingSystem, IC::property::refresh, zero);
+        write(IC::nodeType::operatingSystem, IC::property::createUser,
               {"LocalGroupAdd,GroupName:CMPI_string:root", true});
-        write(NODES::operatingSystemType, NODES::createUser,
+        write(IC::nodeType::operatingSystem, IC::property::createUser,
               {"LocalGroupAddUser,GroupName:CMPI_string:none,UserName:CMPI_string:none", true});
-        write(NODES::operatingSystemType, NODES::clearLog, nine);
-        write(NODES::userType, NODES::inactiveTime, {"2030-01-01 00:00:00", true});
+        write(IC::nodeType::operatingSystem, IC::property::clearLog, nine);
+        write(IC::nodeType::user, IC::property::inactiveTime, {"2030-01-01 00:00:00", true});
         plugin.unload();
         endpwent(); // kept: counting users leaves libc's own cursor open, once in a process
     }
@@ -146,8 +146,8 @@ protected:
     void expectAWholeStart()
     {
         plugin.initialize();
-        EXPECT_EQ(plugin.nodes(NODES::driverType).size(), 1U);
-        EXPECT_FALSE(plugin.nodes(NODES::userType).empty());
+        EXPECT_EQ(plugin.nodes(IC::nodeType::driver).size(), 1U);
+        EXPECT_FALSE(plugin.nodes(IC::nodeType::user).empty());
         plugin.unload();
     }
 
@@ -191,8 +191,8 @@ TEST_F(DescriptorLimits, AreReportedAsCommandsThatCannotBeStarted)
     }
     EXPECT_TRUE(recording.has("Cannot open process: lsmod", 3000));
     EXPECT_TRUE(recording.has("Cannot open process: wc -l /var/log/messages", 6000));
-    EXPECT_TRUE(plugin.nodes(NODES::driverType).empty());
-    EXPECT_TRUE(plugin.nodes(NODES::logEntryType).empty());
+    EXPECT_TRUE(plugin.nodes(IC::nodeType::driver).empty());
+    EXPECT_TRUE(plugin.nodes(IC::nodeType::logEntry).empty());
 }
 
 TEST_F(Limits, OfProcessesAreReachedAnywhereAndNoneIsLeft)
@@ -225,8 +225,8 @@ TEST_F(Limits, OfTheDiskLeaveThePasswordAsItWas)
     ASSERT_EQ(std::system("useradd -p first full"), 0);
     plugin.initialize();
     machine::recordShell();
-    IC::Error const status =
-        plugin.node(NODES::userType, user).setProperty(NODES::password, {"$6$salt$newhash", true});
+    IC::Error const status = plugin.node(IC::nodeType::user, user)
+                                 .setProperty(IC::property::password, {"$6$salt$newhash", true});
     EXPECT_EQ(status.getStatus(), 0U);
     EXPECT_EQ(machine::ran(),
               std::vector<std::string>{"chpasswd -e < usrandpwd ; rm -f usrandpwd"});
@@ -278,7 +278,7 @@ TEST_P(Tools, PrintAndNoLogEntriesAreMadeOfIt)
 {
     Recording const recording;
     plugin.initialize();
-    EXPECT_TRUE(plugin.nodes(NODES::logEntryType).empty());
+    EXPECT_TRUE(plugin.nodes(IC::nodeType::logEntry).empty());
     EXPECT_FALSE(recording.texts(6000).empty());
 }
 
@@ -286,10 +286,10 @@ TEST_P(Tools, PrintAndNoLogEntriesAreMadeOfIt)
 TEST_P(Tools, PrintAndTheMethodFails)
 {
     plugin.initialize();
-    IC::MutableNode& os = plugin.node(NODES::operatingSystemType);
+    IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
     for (char const* call :
          {"LocalGroupDel,GroupName:CMPI_string:none", "UserAdd,UserName:CMPI_string:new"})
-        EXPECT_EQ(os.setProperty(NODES::createUser, {call, true}).getStatus(), 1U) << call;
+        EXPECT_EQ(os.setProperty(IC::property::createUser, {call, true}).getStatus(), 1U) << call;
 }
 
 TEST_F(Limits, AreNoneForModulesInOneEndlessLineOfBlanks)
@@ -304,9 +304,9 @@ TEST_F(Limits, LeaveTheModulesThatWereListedBeforeLsmodDied)
     machine::fake("/usr/sbin/lsmod",
                   "echo Module Size Used by; echo loop 1 0; printf 'xf'; kill -9 $$\n");
     plugin.initialize();
-    EXPECT_EQ(plugin.nodes(NODES::driverType).size(), 2U);
-    EXPECT_NE(plugin.find(NODES::driverType, "loop"), nullptr);
-    EXPECT_NE(plugin.find(NODES::driverType, "xf"), nullptr);
+    EXPECT_EQ(plugin.nodes(IC::nodeType::driver).size(), 2U);
+    EXPECT_NE(plugin.find(IC::nodeType::driver, "loop"), nullptr);
+    EXPECT_NE(plugin.find(IC::nodeType::driver, "xf"), nullptr);
 }
 
 INSTANTIATE_TEST_SUITE_P(Without, Tools, testing::ValuesIn(outputs),

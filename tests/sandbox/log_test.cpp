@@ -1,7 +1,7 @@
 // The system log as the real wc, sed and date tell of it.
 
+#include "host/Properties.h"
 #include "mihost/runtime/Runtime.h"
-#include "nodes/ids.h"
 #include "tests/support/Libc.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
@@ -69,7 +69,7 @@ protected:
 
     std::vector<IC::MutableNode*> entries() const
     {
-        return plugin.nodes(NODES::logEntryType);
+        return plugin.nodes(IC::nodeType::logEntry);
     }
 
     /** The messages stored in the entry nodes, in their order. */
@@ -77,7 +77,7 @@ protected:
     {
         Texts found;
         for (IC::MutableNode const* entry : entries())
-            found.push_back(stored(*entry, NODES::message));
+            found.push_back(stored(*entry, IC::property::message));
         return found;
     }
 
@@ -104,7 +104,7 @@ TEST_F(Log, OfNoLinesHasNoEntries)
 {
     startOn("");
     EXPECT_TRUE(entries().empty());
-    EXPECT_EQ(plugin.nodes(NODES::logType).size(), 1U);
+    EXPECT_EQ(plugin.nodes(IC::nodeType::log).size(), 1U);
 }
 
 class LogOfLines : public Log, public testing::WithParamInterface<int>
@@ -117,7 +117,7 @@ TEST_P(LogOfLines, ShowsTheNewestFiftyAtMost)
     EXPECT_EQ(messages(), newest(GetParam(), std::min(GetParam(), 50)));
     for (std::size_t i = 0; i < entries().size(); ++i) {
         EXPECT_EQ(entries()[i]->getIndex(), i + 1);
-        EXPECT_EQ(text(*entries()[i], NODES::message), messages()[i]);
+        EXPECT_EQ(text(*entries()[i], IC::property::message), messages()[i]);
     }
 }
 
@@ -127,13 +127,13 @@ TEST_F(Log, IsReadByTheCommandsOfEachReadInOrder)
 {
     startOn(lines(3));
     machine::recordShell();
-    text(*entries()[1], NODES::message);
+    text(*entries()[1], IC::property::message);
     EXPECT_EQ(machine::ran(), (Texts{wc, wc, wc, sed(2)}));
     machine::forget();
-    text(*entries()[1], NODES::creationTime);
+    text(*entries()[1], IC::property::creationTime);
     EXPECT_EQ(machine::ran(), (Texts{wc, wc, wc, sed(2), "date"}));
     machine::forget();
-    text(*entries()[1], NODES::id);
+    text(*entries()[1], IC::property::id);
     EXPECT_EQ(machine::ran(), Texts{});
 }
 
@@ -157,9 +157,9 @@ TEST_F(Log, ShowsTheTimeOfEachEntry)
     startOn("Nov  2 01:02:03 host one\nJan 31 23:59:59 host two\nFeb 29 12:00:00 host three\n");
     ASSERT_EQ(entries().size(), 3U);
     // February has 28 days in 2026; the day after is meant.
-    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "2026-03-01 12:00:00");
-    EXPECT_EQ(text(*entries()[1], NODES::creationTime), "2026-01-31 23:59:59");
-    EXPECT_EQ(text(*entries()[2], NODES::creationTime), "2026-11-02 01:02:03");
+    EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "2026-03-01 12:00:00");
+    EXPECT_EQ(text(*entries()[1], IC::property::creationTime), "2026-01-31 23:59:59");
+    EXPECT_EQ(text(*entries()[2], IC::property::creationTime), "2026-11-02 01:02:03");
 }
 
 TEST_F(Log, DatesDecemberReadInJanuaryBackAndNothingElse)
@@ -167,19 +167,19 @@ TEST_F(Log, DatesDecemberReadInJanuaryBackAndNothingElse)
     say("Fri Jan  2 03:15:30 UTC 2026");
     startOn("Nov 30 10:11:12 a\nDec 31 23:59:59 b\nJan  1 00:00:01 c\n");
     ASSERT_EQ(entries().size(), 3U);
-    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "2026-01-01 00:00:01");
-    EXPECT_EQ(text(*entries()[1], NODES::creationTime), "2025-12-31 23:59:59");
-    EXPECT_EQ(text(*entries()[2], NODES::creationTime), "2026-11-30 10:11:12");
+    EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "2026-01-01 00:00:01");
+    EXPECT_EQ(text(*entries()[1], IC::property::creationTime), "2025-12-31 23:59:59");
+    EXPECT_EQ(text(*entries()[2], IC::property::creationTime), "2026-11-30 10:11:12");
     say("Thu Dec 31 03:15:30 UTC 2026");
-    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "2026-01-01 00:00:01");
-    EXPECT_EQ(text(*entries()[1], NODES::creationTime), "2026-12-31 23:59:59");
+    EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "2026-01-01 00:00:01");
+    EXPECT_EQ(text(*entries()[1], IC::property::creationTime), "2026-12-31 23:59:59");
 }
 
 TEST_F(Log, UnderstandsTheRealDate)
 {
     std::filesystem::rename("/usr/bin/date.real", "/usr/bin/date");
     startOn(lines(1));
-    EXPECT_EQ(stored(*entries().at(0), NODES::creationTime).substr(4), "-11-20 10:11:01");
+    EXPECT_EQ(stored(*entries().at(0), IC::property::creationTime).substr(4), "-11-20 10:11:01");
 }
 
 TEST_F(Log, ShowsShortLinesAsEmptyMessages)
@@ -187,11 +187,11 @@ TEST_F(Log, ShowsShortLinesAsEmptyMessages)
     startOn("\nshort\nNov 20 10:11:12\nNov 20 10:11:13 \nNov 20 10:11:14 x\n");
     EXPECT_EQ(messages(), (Texts{"*x*", "**", "**", "**", "**"}));
     ASSERT_EQ(entries().size(), 5U);
-    EXPECT_EQ(stored(*entries()[1], NODES::creationTime), "2026-11-20 10:11:13");
-    EXPECT_EQ(stored(*entries()[2], NODES::creationTime), "2026-11-20 10:11:12");
-    EXPECT_EQ(stored(*entries()[3], NODES::creationTime), "(unset)");
-    EXPECT_EQ(stored(*entries()[4], NODES::creationTime), "(unset)");
-    EXPECT_EQ(text(*entries()[4], NODES::creationTime), "(status 1)");
+    EXPECT_EQ(stored(*entries()[1], IC::property::creationTime), "2026-11-20 10:11:13");
+    EXPECT_EQ(stored(*entries()[2], IC::property::creationTime), "2026-11-20 10:11:12");
+    EXPECT_EQ(stored(*entries()[3], IC::property::creationTime), "(unset)");
+    EXPECT_EQ(stored(*entries()[4], IC::property::creationTime), "(unset)");
+    EXPECT_EQ(text(*entries()[4], IC::property::creationTime), "(status 1)");
 }
 
 TEST_F(Log, ShowsLinesWithAnotherStampWithoutATime)
@@ -199,8 +199,8 @@ TEST_F(Log, ShowsLinesWithAnotherStampWithoutATime)
     startOn("2026-11-20T10:11:12.123456+00:00 host sshd[1]: session opened\n");
     ASSERT_EQ(entries().size(), 1U);
     EXPECT_EQ(messages(), Texts{"*:12.123456+00:00 host sshd[1]: session opened*"});
-    EXPECT_EQ(stored(*entries()[0], NODES::creationTime), "(unset)");
-    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "(status 1)");
+    EXPECT_EQ(stored(*entries()[0], IC::property::creationTime), "(unset)");
+    EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "(status 1)");
 }
 
 TEST_F(Log, LeavesOutALastLineThatHasNoEndYet)
@@ -232,9 +232,9 @@ TEST_F(Log, MovesUnderItsEntriesAsItGrows)
     startOn(lines(3));
     append("Nov 20 10:11:30 news\n");
     ASSERT_EQ(entries().size(), 3U);
-    EXPECT_EQ(text(*entries()[0], NODES::message), "*news*");
-    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "2026-11-20 10:11:30");
-    EXPECT_EQ(text(*entries()[2], NODES::message), "*message 2*");
+    EXPECT_EQ(text(*entries()[0], IC::property::message), "*news*");
+    EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "2026-11-20 10:11:30");
+    EXPECT_EQ(text(*entries()[2], IC::property::message), "*message 2*");
     EXPECT_EQ(messages(), newest(3, 3));
 }
 
@@ -244,10 +244,10 @@ TEST_F(Log, FailsTheReadsOfEntriesThatItHasLost)
     machine::write(path, lines(1));
     ASSERT_EQ(entries().size(), 3U);
     Recording const recording;
-    EXPECT_EQ(text(*entries()[0], NODES::message), "*message 1*");
-    EXPECT_EQ(text(*entries()[1], NODES::message), "**");
-    EXPECT_EQ(text(*entries()[2], NODES::message), "(status 1)");
-    EXPECT_EQ(text(*entries()[2], NODES::creationTime), "(status 1)");
+    EXPECT_EQ(text(*entries()[0], IC::property::message), "*message 1*");
+    EXPECT_EQ(text(*entries()[1], IC::property::message), "**");
+    EXPECT_EQ(text(*entries()[2], IC::property::message), "(status 1)");
+    EXPECT_EQ(text(*entries()[2], IC::property::creationTime), "(status 1)");
     EXPECT_EQ(recording.texts(6000), (Texts{"Invalid index: getMaxLine()=1, Index=3",
                                             "Invalid index: getMaxLine()=1, logIndex=3"}));
 }
@@ -266,9 +266,9 @@ TEST_F(Log, FailsTheReadsOfEntriesOnceItIsMissing)
     startOn(lines(2));
     machine::remove(path);
     ASSERT_EQ(entries().size(), 2U);
-    EXPECT_EQ(text(*entries()[0], NODES::message), "**");
-    EXPECT_EQ(text(*entries()[0], NODES::creationTime), "(status 1)");
-    EXPECT_EQ(text(*entries()[1], NODES::message), "(status 1)");
+    EXPECT_EQ(text(*entries()[0], IC::property::message), "**");
+    EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "(status 1)");
+    EXPECT_EQ(text(*entries()[1], IC::property::message), "(status 1)");
 }
 
 TEST_F(Log, HasNoEntriesForWhoMayNotReadIt)
@@ -298,7 +298,7 @@ TEST_F(Log, HasAnEmptyEntryWhereSedCannotBeStarted)
     Recording const recording;
     startOn(lines(3));
     EXPECT_EQ(messages(), (Texts{"*message 3*", "**", "*message 1*"}));
-    EXPECT_EQ(stored(*entries().at(1), NODES::creationTime), "(unset)");
+    EXPECT_EQ(stored(*entries().at(1), IC::property::creationTime), "(unset)");
     EXPECT_TRUE(recording.has("sed -n '%dp' /var/log/messages", 6000));
 }
 
@@ -307,7 +307,7 @@ TEST_F(Log, IsOfTheYear1970WhereDateCannotBeStarted)
     libc::refuse("date");
     Recording const recording;
     startOn(lines(1));
-    EXPECT_EQ(stored(*entries().at(0), NODES::creationTime), "1970-01-01 00:00:00");
+    EXPECT_EQ(stored(*entries().at(0), IC::property::creationTime), "1970-01-01 00:00:00");
     EXPECT_TRUE(recording.has("Cannot opne process: date", 6000));
 }
 
@@ -316,7 +316,7 @@ TEST_F(Log, IsWithoutTimesWhereDateSpeaksAnotherForm)
     say("2026-11-21");
     Recording const recording;
     startOn(lines(1));
-    EXPECT_EQ(stored(*entries().at(0), NODES::creationTime), "(unset)");
+    EXPECT_EQ(stored(*entries().at(0), IC::property::creationTime), "(unset)");
     EXPECT_EQ(messages(), newest(1, 1));
     EXPECT_TRUE(recording.has("Invalid format: buffer = 2026-11-21\n", 6000));
 }
@@ -351,13 +351,14 @@ TEST_F(Log, LosesItsEntriesThroughTheHostWhenItIsCleared)
 {
     machine::write(path, lines(3), 0640);
     plugin.initialize();
-    IC::MutableNode const* const log = &plugin.node(NODES::logType);
+    IC::MutableNode const* const log = &plugin.node(IC::nodeType::log);
     Told const told;
-    plugin.node(NODES::operatingSystemType).setProperty(NODES::clearLog, {IC::Number(9U), true});
+    plugin.node(IC::nodeType::operatingSystem)
+        .setProperty(IC::property::clearLog, {IC::Number(9U), true});
     EXPECT_EQ(told.deleted, 3);
     EXPECT_EQ(told.added, 0);
     EXPECT_TRUE(entries().empty());
-    EXPECT_EQ(&plugin.node(NODES::logType), log);
+    EXPECT_EQ(&plugin.node(IC::nodeType::log), log);
     EXPECT_EQ(machine::read(path), "");
     EXPECT_EQ(std::filesystem::status(path).permissions(), std::filesystem::perms(0640));
 }
@@ -372,7 +373,8 @@ TEST_F(Log, GetsNewEntriesForLinesThatCameDuringTheClearing)
                    "exec /usr/bin/wc \"$@\"\n",
                    0755);
     Told const told;
-    plugin.node(NODES::operatingSystemType).setProperty(NODES::clearLog, {IC::Number(9U), true});
+    plugin.node(IC::nodeType::operatingSystem)
+        .setProperty(IC::property::clearLog, {IC::Number(9U), true});
     EXPECT_EQ(told.deleted, 2);
     EXPECT_EQ(told.added, 1);
     EXPECT_EQ(messages(), Texts{"*news*"});
@@ -385,7 +387,8 @@ TEST_F(Log, KeepsLinesAndEntriesWhereItMayNotBeCleared)
     ASSERT_EQ(setresgid(65534, 65534, 65534), 0);
     ASSERT_EQ(setresuid(65534, 65534, 65534), 0);
     Told const told;
-    plugin.node(NODES::operatingSystemType).setProperty(NODES::clearLog, {IC::Number(9U), true});
+    plugin.node(IC::nodeType::operatingSystem)
+        .setProperty(IC::property::clearLog, {IC::Number(9U), true});
     EXPECT_EQ(machine::read(path), lines(2));
     EXPECT_EQ(messages(), newest(2, 2));
     EXPECT_EQ(told.deleted + told.added, 0);
@@ -394,10 +397,10 @@ TEST_F(Log, KeepsLinesAndEntriesWhereItMayNotBeCleared)
 TEST_F(Log, StaysAsItIsWhenAnEntryIsWritten)
 {
     startOn(lines(1));
-    entries().at(0)->setProperty(NODES::message, IC::PropertyValue("mine", true));
+    entries().at(0)->setProperty(IC::property::message, IC::PropertyValue("mine", true));
     EXPECT_EQ(machine::read(path), lines(1));
-    EXPECT_EQ(stored(*entries().at(0), NODES::message), "mine");
-    EXPECT_EQ(text(*entries().at(0), NODES::message), "*message 1*");
+    EXPECT_EQ(stored(*entries().at(0), IC::property::message), "mine");
+    EXPECT_EQ(text(*entries().at(0), IC::property::message), "*message 1*");
 }
 
 TEST_F(Log, KeepsItsOwnerWhenItIsCleared)
@@ -405,7 +408,8 @@ TEST_F(Log, KeepsItsOwnerWhenItIsCleared)
     machine::write(path, lines(1), 0640);
     ASSERT_EQ(chown(path, 12345, 23456), 0);
     plugin.initialize();
-    plugin.node(NODES::operatingSystemType).setProperty(NODES::clearLog, {IC::Number(9U), true});
+    plugin.node(IC::nodeType::operatingSystem)
+        .setProperty(IC::property::clearLog, {IC::Number(9U), true});
     struct stat now {
     };
     ASSERT_EQ(stat(path, &now), 0);

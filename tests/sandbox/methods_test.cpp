@@ -1,8 +1,8 @@
 // Administration from the host's write to the account files and to the nodes that the host is
 // handed, with the real tools.
 
+#include "host/Properties.h"
 #include "mihost/sandbox/Sandbox.h"
-#include "nodes/ids.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -36,7 +36,7 @@ public:
     /** Writes a method-call text as the host does. */
     IC::Error call(std::string const& text)
     {
-        return write(NODES::createUser, IC::PropertyValue(text, true));
+        return write(IC::property::createUser, IC::PropertyValue(text, true));
     }
 
     IC::Error write(unsigned int id, IC::PropertyValue const& value)
@@ -48,7 +48,7 @@ public:
 
     IC::MutableNode& os() const
     {
-        return plugin_.node(NODES::operatingSystemType);
+        return plugin_.node(IC::nodeType::operatingSystem);
     }
 
     /** The command lines since the last write, without those that only list the accounts. */
@@ -81,7 +81,7 @@ private:
         auto const& added = dynamic_cast<IC::MutableNode const&>(*node);
         auto* const self = static_cast<HostedMachine*>(const_cast<void*>(context));
         self->handed.push_back(std::to_string(added.getNodeType()) + " " +
-                               text(added, NODES::name));
+                               text(added, IC::property::name));
         return {0, IC::Number(0U), ""};
     }
 
@@ -134,15 +134,15 @@ INSTANTIATE_TEST_SUITE_P(On, Methods,
 
 TEST_P(Methods, UserDelRemovesTheAccountAndItsNode)
 {
-    ASSERT_NE(host_.plugin().find(NODES::userType, account_.user), nullptr);
+    ASSERT_NE(host_.plugin().find(IC::nodeType::user, account_.user), nullptr);
     EXPECT_EQ(host_.call("UserDel," + userName()).getStatus(), 0);
     EXPECT_EQ(host_.ran(), Lines{"/usr/sbin/userdel " + account_.user + " 2>&1"});
     EXPECT_EQ(passwd(), Lines());
     EXPECT_EQ(shadow(), Lines());
-    EXPECT_EQ(host_.plugin().find(NODES::userType, account_.user), nullptr);
-    EXPECT_FALSE(host_.wasHanded(NODES::userType, account_.user));
-    EXPECT_TRUE(host_.wasHanded(NODES::userType, "root"));
-    EXPECT_EQ(text(host_.os(), NODES::createUser), "UserDel," + userName());
+    EXPECT_EQ(host_.plugin().find(IC::nodeType::user, account_.user), nullptr);
+    EXPECT_FALSE(host_.wasHanded(IC::nodeType::user, account_.user));
+    EXPECT_TRUE(host_.wasHanded(IC::nodeType::user, "root"));
+    EXPECT_EQ(text(host_.os(), IC::property::createUser), "UserDel," + userName());
 }
 
 TEST_P(Methods, UserDelOfNobodyFailsAndHandsOutNothing)
@@ -150,7 +150,7 @@ TEST_P(Methods, UserDelOfNobodyFailsAndHandsOutNothing)
     EXPECT_EQ(host_.call("UserDel,UserName:CMPI_string:nosuch").getStatus(), 1);
     EXPECT_EQ(host_.ran(), Lines{"/usr/sbin/userdel nosuch 2>&1"});
     EXPECT_EQ(host_.handed, Lines());
-    EXPECT_EQ(text(host_.os(), NODES::createUser), "");
+    EXPECT_EQ(text(host_.os(), IC::property::createUser), "");
 }
 
 TEST_P(Methods, UserSetAttribSetsTheAgeing)
@@ -168,10 +168,10 @@ TEST_P(Methods, UserSetAttribSetsTheAgeing)
                                  " -m 3 -M 30 -W 5 -I 6 -E 2030-12-31 2>&1"});
     Lines const fields = shadow();
     EXPECT_EQ(Lines(fields.begin() + 3, fields.end()), (Lines{"3", "30", "5", "6", "22279", ""}));
-    IC::MutableNode const& node = host_.plugin().node(NODES::userType, account_.user);
-    EXPECT_EQ(text(node, NODES::pwdMinDays), "3");
-    EXPECT_EQ(text(node, NODES::pwdMaxDays), "30");
-    EXPECT_EQ(text(node, NODES::pwdWarnDays), "5");
+    IC::MutableNode const& node = host_.plugin().node(IC::nodeType::user, account_.user);
+    EXPECT_EQ(text(node, IC::property::pwdMinDays), "3");
+    EXPECT_EQ(text(node, IC::property::pwdMaxDays), "30");
+    EXPECT_EQ(text(node, IC::property::pwdWarnDays), "5");
 }
 
 TEST_P(Methods, UserSetAttribRemovesAnExpiryThatIsNotAskedFor)
@@ -194,7 +194,7 @@ TEST_P(Methods, UserSetFullNameKeepsBlanksTogether)
     EXPECT_EQ(host_.ran(),
               Lines{"/usr/sbin/usermod -c John\\ \\ Smith " + account_.user + " 2>&1"});
     EXPECT_EQ(passwd().at(4), "John  Smith");
-    EXPECT_EQ(text(host_.plugin().node(NODES::userType, account_.user), NODES::fullName),
+    EXPECT_EQ(text(host_.plugin().node(IC::nodeType::user, account_.user), IC::property::fullName),
               "John  Smith");
 }
 
@@ -205,8 +205,9 @@ TEST_P(Methods, UserSetScriptPathSetsTheLoginShell)
               0);
     EXPECT_EQ(host_.ran(), Lines{"/usr/sbin/usermod -s /bin/false " + account_.user + " 2>&1"});
     EXPECT_EQ(passwd().at(6), "/bin/false");
-    EXPECT_EQ(text(host_.plugin().node(NODES::userType, account_.user), NODES::scriptPath),
-              "/bin/false");
+    EXPECT_EQ(
+        text(host_.plugin().node(IC::nodeType::user, account_.user), IC::property::scriptPath),
+        "/bin/false");
 }
 
 TEST_P(Methods, UserSetHomeDirMovesTheFolder)
@@ -229,7 +230,7 @@ TEST_P(Methods, UserSetHomeDirFailsWhereThereIsNoFolderToMove)
         1);
     // usermod warns about the folder after it has changed the account.
     EXPECT_EQ(passwd().at(5), "/home/j2");
-    EXPECT_EQ(text(host_.os(), NODES::createUser), "");
+    EXPECT_EQ(text(host_.os(), IC::property::createUser), "");
     EXPECT_EQ(host_.handed, Lines());
 }
 
@@ -264,12 +265,12 @@ TEST_P(Methods, LocalGroupAddAndDelMakeAndRemoveAGroupAndItsNode)
     EXPECT_EQ(host_.call("LocalGroupAdd,GroupName:CMPI_string:crew").getStatus(), 0);
     EXPECT_EQ(host_.ran(), Lines{"/usr/sbin/groupadd crew 2>&1"});
     EXPECT_EQ(machine::entry("/etc/group", "crew").size(), 4U);
-    EXPECT_TRUE(host_.wasHanded(NODES::groupType, "crew"));
+    EXPECT_TRUE(host_.wasHanded(IC::nodeType::group, "crew"));
 
     EXPECT_EQ(host_.call("LocalGroupDel,GroupName:CMPI_string:crew").getStatus(), 0);
     EXPECT_EQ(host_.ran(), Lines{"/usr/sbin/groupdel crew 2>&1"});
     EXPECT_EQ(machine::entry("/etc/group", "crew"), Lines());
-    EXPECT_EQ(host_.plugin().find(NODES::groupType, "crew"), nullptr);
+    EXPECT_EQ(host_.plugin().find(IC::nodeType::group, "crew"), nullptr);
 }
 
 TEST_P(Methods, LocalGroupAddUserAndDelUserChangeOneMembershipAndKeepTheOthers)
@@ -283,13 +284,14 @@ TEST_P(Methods, LocalGroupAddUserAndDelUserChangeOneMembershipAndKeepTheOthers)
     EXPECT_EQ(host_.ran(), (Lines{id, "/usr/sbin/usermod -G " + account_.groups + ",\"crew\" \"" +
                                           account_.user + "\" 2>&1"}));
     EXPECT_EQ(machine::entry("/etc/group", "crew").at(3), account_.user);
-    EXPECT_EQ(text(host_.plugin().node(NODES::groupType, "crew"), NODES::members), account_.user);
+    EXPECT_EQ(text(host_.plugin().node(IC::nodeType::group, "crew"), IC::property::members),
+              account_.user);
 
     EXPECT_EQ(host_.call("LocalGroupDelUser" + rest).getStatus(), 0);
     EXPECT_EQ(host_.ran(), (Lines{id, "/usr/sbin/usermod -G " + account_.groups + " \"" +
                                           account_.user + "\" 2>&1"}));
     EXPECT_EQ(machine::entry("/etc/group", "crew").at(3), "");
-    EXPECT_EQ(text(host_.plugin().node(NODES::groupType, "crew"), NODES::members), "");
+    EXPECT_EQ(text(host_.plugin().node(IC::nodeType::group, "crew"), IC::property::members), "");
 }
 
 TEST_P(Methods, LocalGroupAddUserOfNobodyFails)
@@ -306,7 +308,7 @@ TEST_P(Methods, GetShadowingRunsNothingAndSucceeds)
 {
     EXPECT_EQ(host_.call("GetShadowing").getStatus(), 0);
     EXPECT_EQ(host_.ran(), Lines());
-    EXPECT_TRUE(host_.wasHanded(NODES::userType, "root"));
+    EXPECT_TRUE(host_.wasHanded(IC::nodeType::user, "root"));
 }
 
 TEST_P(Methods, TakeValuesForShellText)
@@ -339,10 +341,11 @@ protected:
         Lines const ageing = machine::entry("/etc/shadow", "jdoe");
         EXPECT_EQ(ageing.at(3), "2");
         EXPECT_EQ(ageing.at(7), "");
-        EXPECT_TRUE(host.wasHanded(NODES::userType, "jdoe"));
-        EXPECT_TRUE(host.wasHanded(NODES::groupType, "root"));
-        EXPECT_EQ(text(host.plugin().node(NODES::userType, "jdoe"), NODES::pwdMinDays), "2");
-        EXPECT_EQ(text(host.os(), NODES::createUser), call_);
+        EXPECT_TRUE(host.wasHanded(IC::nodeType::user, "jdoe"));
+        EXPECT_TRUE(host.wasHanded(IC::nodeType::group, "root"));
+        EXPECT_EQ(text(host.plugin().node(IC::nodeType::user, "jdoe"), IC::property::pwdMinDays),
+                  "2");
+        EXPECT_EQ(text(host.os(), IC::property::createUser), call_);
     }
 };
 
@@ -364,7 +367,7 @@ TEST_F(UserAdd, HandsOutUsersBeforeGroups)
 {
     HostedMachine host("plain");
     EXPECT_EQ(host.call(call_).getStatus(), 0);
-    std::string const group = std::to_string(NODES::groupType);
+    std::string const group = std::to_string(IC::nodeType::group);
     auto const firstGroup =
         std::find_if(host.handed.begin(), host.handed.end(),
                      [&](std::string const& node) { return node.rfind(group, 0) == 0; });
@@ -391,7 +394,7 @@ TEST_F(UserAdd, OfAnAccountThatIsThereFailsAndKeepsIt)
     EXPECT_EQ(host.ran(), Lines{"/usr/sbin/useradd gerda 2>&1;echo rc=$? 2>&1"});
     EXPECT_EQ(machine::entry("/etc/passwd", "gerda").at(4), "Gerda Example,,,");
     EXPECT_EQ(host.handed, Lines());
-    EXPECT_EQ(text(host.os(), NODES::createUser), "");
+    EXPECT_EQ(text(host.os(), IC::property::createUser), "");
 }
 
 TEST_F(UserAdd, WithAnExpiryThatChageCannotReadFailsAndLeavesTheAccount)
@@ -440,36 +443,36 @@ protected:
 
 TEST_F(Commands, RestartTheMachine)
 {
-    EXPECT_EQ(write(NODES::requestedState, 9).getStatus(), 0);
+    EXPECT_EQ(write(IC::property::requestedState, 9).getStatus(), 0);
     EXPECT_EQ(host_.ran(), Lines{"/sbin/shutdown -r now"});
     EXPECT_EQ(mihost::refusedPowerCommands(), Lines{"/sbin/shutdown -r now"});
-    EXPECT_EQ(text(host_.os(), NODES::requestedState), "9");
+    EXPECT_EQ(text(host_.os(), IC::property::requestedState), "9");
 }
 
 TEST_F(Commands, HaltTheMachine)
 {
-    EXPECT_EQ(write(NODES::requestedState, 12).getStatus(), 0);
+    EXPECT_EQ(write(IC::property::requestedState, 12).getStatus(), 0);
     EXPECT_EQ(host_.ran(), Lines{"/sbin/shutdown -h now"});
     EXPECT_EQ(mihost::refusedPowerCommands(), Lines{"/sbin/shutdown -h now"});
-    EXPECT_EQ(text(host_.os(), NODES::requestedState), "12");
+    EXPECT_EQ(text(host_.os(), IC::property::requestedState), "12");
 }
 
 TEST_F(Commands, ClearTheLogAndTakeItsEntriesAway)
 {
-    ASSERT_FALSE(host_.plugin().nodes(NODES::logEntryType).empty());
-    EXPECT_EQ(write(NODES::clearLog, 9).getStatus(), 0);
+    ASSERT_FALSE(host_.plugin().nodes(IC::nodeType::logEntry).empty());
+    EXPECT_EQ(write(IC::property::clearLog, 9).getStatus(), 0);
     EXPECT_EQ(machine::read("/var/log/messages"), "");
-    EXPECT_TRUE(host_.plugin().nodes(NODES::logEntryType).empty());
+    EXPECT_TRUE(host_.plugin().nodes(IC::nodeType::logEntry).empty());
 }
 
 TEST_F(Commands, RefreshUsersAndGroupsThatCameOtherwise)
 {
     ASSERT_TRUE(succeeds("/usr/sbin/useradd jdoe && /usr/sbin/groupadd crew"));
-    EXPECT_EQ(host_.plugin().find(NODES::userType, "jdoe"), nullptr);
-    EXPECT_EQ(write(NODES::refresh, 0).getStatus(), 0);
-    EXPECT_TRUE(host_.wasHanded(NODES::userType, "jdoe"));
-    EXPECT_TRUE(host_.wasHanded(NODES::groupType, "crew"));
-    EXPECT_EQ(text(host_.os(), NODES::refresh), "0");
+    EXPECT_EQ(host_.plugin().find(IC::nodeType::user, "jdoe"), nullptr);
+    EXPECT_EQ(write(IC::property::refresh, 0).getStatus(), 0);
+    EXPECT_TRUE(host_.wasHanded(IC::nodeType::user, "jdoe"));
+    EXPECT_TRUE(host_.wasHanded(IC::nodeType::group, "crew"));
+    EXPECT_EQ(text(host_.os(), IC::property::refresh), "0");
 }
 
 } // namespace

@@ -1,6 +1,6 @@
 // What the operating-system node says of each kind of machine.
 
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 
@@ -43,7 +43,7 @@ protected:
 
     IC::MutableNode& os() const
     {
-        return plugin_.node(NODES::operatingSystemType);
+        return plugin_.node(IC::nodeType::operatingSystem);
     }
 
     std::optional<IC::PropertyValue> fact(unsigned int id) const
@@ -57,12 +57,12 @@ private:
 
 TEST_P(OsFacts, NameIsTheFirstLineOfTheReleaseFile)
 {
-    EXPECT_EQ(text(os(), NODES::name), GetParam().osName);
+    EXPECT_EQ(text(os(), IC::property::name), GetParam().osName);
 }
 
 TEST_P(OsFacts, VersionComesFromTheReleaseFile)
 {
-    auto const version = fact(NODES::version);
+    auto const version = fact(IC::property::version);
     ASSERT_EQ(version.has_value(), GetParam().version.has_value());
     if (version) {
         EXPECT_EQ(static_cast<std::string>(*version), *GetParam().version);
@@ -71,8 +71,8 @@ TEST_P(OsFacts, VersionComesFromTheReleaseFile)
 
 TEST_P(OsFacts, UserCountHoldsTheOrdinaryAccountsAndTheSuperusers)
 {
-    ASSERT_TRUE(fact(NODES::userCount));
-    EXPECT_EQ(fact(NODES::userCount)->getNumber(), GetParam().users);
+    ASSERT_TRUE(fact(IC::property::userCount));
+    EXPECT_EQ(fact(IC::property::userCount)->getNumber(), GetParam().users);
 }
 
 TEST_P(OsFacts, InstallDateIsWhenTheReleaseFileLastChanged)
@@ -84,9 +84,9 @@ TEST_P(OsFacts, InstallDateIsWhenTheReleaseFileLastChanged)
         ASSERT_EQ(stat(GetParam().datedFile, &status), 0);
         expected = status.st_ctime;
     }
-    ASSERT_TRUE(fact(NODES::installDate));
-    EXPECT_EQ(fact(NODES::installDate)->getKind(), IC::PropertyValue::DateKind);
-    EXPECT_EQ(fact(NODES::installDate)->getNumber(), expected);
+    ASSERT_TRUE(fact(IC::property::installDate));
+    EXPECT_EQ(fact(IC::property::installDate)->getKind(), IC::PropertyValue::DateKind);
+    EXPECT_EQ(fact(IC::property::installDate)->getNumber(), expected);
 }
 
 INSTANTIATE_TEST_SUITE_P(

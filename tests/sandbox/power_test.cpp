@@ -1,7 +1,7 @@
 // Halting and restarting, against a command that only notes it.
 
+#include "host/Properties.h"
 #include "mihost/sandbox/Sandbox.h"
-#include "nodes/ids.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -67,12 +67,12 @@ protected:
 
     IC::MutableNode& os()
     {
-        return plugin.node(NODES::operatingSystemType);
+        return plugin.node(IC::nodeType::operatingSystem);
     }
 
     unsigned char request(IC::PropertyValue const& value)
     {
-        return os().setProperty(NODES::requestedState, value).getStatus();
+        return os().setProperty(IC::property::requestedState, value).getStatus();
     }
 };
 
@@ -80,7 +80,7 @@ TEST_F(PowerRequest, OfTwelveHaltsTheMachineAndIsStored)
 {
     EXPECT_EQ(request({IC::EnumValue(12U), true}), 0);
     expectRan("/sbin/shutdown -h now");
-    EXPECT_EQ(text(os(), NODES::requestedState), "12");
+    EXPECT_EQ(text(os(), IC::property::requestedState), "12");
     EXPECT_EQ(recording.texts(4000), Lines{"Halt after shutdown."});
 }
 
@@ -88,7 +88,7 @@ TEST_F(PowerRequest, OfNineRestartsTheMachineAndIsStored)
 {
     EXPECT_EQ(request({IC::EnumValue(9U), true}), 0);
     expectRan("/sbin/shutdown -r now");
-    EXPECT_EQ(text(os(), NODES::requestedState), "9");
+    EXPECT_EQ(text(os(), IC::property::requestedState), "9");
     EXPECT_EQ(recording.texts(4000), Lines{"Reboot after shutdown."});
 }
 
@@ -103,7 +103,7 @@ TEST_F(PowerRequest, OfAnyOtherNumberIsStoredOnly)
 {
     for (unsigned int const number : {0U, 1U, 5U, 8U, 10U, 11U, 13U, 4294967295U}) {
         EXPECT_EQ(request({IC::EnumValue(number), true}), 0);
-        EXPECT_EQ(text(os(), NODES::requestedState), std::to_string(number));
+        EXPECT_EQ(text(os(), IC::property::requestedState), std::to_string(number));
     }
     EXPECT_EQ(machine::ran(), Lines());
     EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
@@ -115,7 +115,7 @@ TEST_F(PowerRequest, IsStoredAlsoWhereThereIsNoShutdownCommand)
     machine::remove("/sbin/shutdown");
     EXPECT_EQ(request({IC::EnumValue(12U), true}), 0);
     EXPECT_EQ(machine::ran(), Lines{"/sbin/shutdown -h now"});
-    EXPECT_EQ(text(os(), NODES::requestedState), "12");
+    EXPECT_EQ(text(os(), IC::property::requestedState), "12");
 }
 
 } // namespace

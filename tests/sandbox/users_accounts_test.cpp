@@ -1,6 +1,6 @@
 // Users and groups as the real account tools make them, and what writes to user nodes really do.
 
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
@@ -81,7 +81,7 @@ protected:
 
     IC::MutableNode& jdoe() const
     {
-        return plugin.node(NODES::userType, "jdoe");
+        return plugin.node(IC::nodeType::user, "jdoe");
     }
 
     /** One line of what chage lists for jdoe, without the blanks between label and colon. */
@@ -100,19 +100,19 @@ TEST_F(RealAccounts, StandInTheTreeAsUseraddAndChageMadeThem)
 {
     load();
     IC::MutableNode const& node = jdoe();
-    EXPECT_EQ(stored(node, NODES::id), std::to_string(jdoeId));
-    EXPECT_EQ(stored(node, NODES::groupId), std::to_string(jdoeId));
-    EXPECT_EQ(stored(node, NODES::fullName), "John Doe");
-    EXPECT_EQ(stored(node, NODES::homeDir), "/home/jdoe");
-    EXPECT_EQ(stored(node, NODES::scriptPath), "/bin/sh");
-    EXPECT_EQ(stored(node, NODES::password), "first");
-    EXPECT_EQ(stored(node, NODES::pwdMinDays), "1");
-    EXPECT_EQ(stored(node, NODES::pwdMaxDays), "90");
-    EXPECT_EQ(stored(node, NODES::pwdWarnDays), "14");
-    EXPECT_EQ(stored(node, NODES::pwdExpDays), "20");
-    EXPECT_EQ(stored(node, NODES::lastPwdChange), "2020-01-15 00:00:00");
-    EXPECT_EQ(stored(node, NODES::inactiveTime), "2030-06-01 00:00:00");
-    EXPECT_EQ(stored(node, NODES::passwordExpiration), "2030-06-01 00:00:00");
+    EXPECT_EQ(stored(node, IC::property::id), std::to_string(jdoeId));
+    EXPECT_EQ(stored(node, IC::property::groupId), std::to_string(jdoeId));
+    EXPECT_EQ(stored(node, IC::property::fullName), "John Doe");
+    EXPECT_EQ(stored(node, IC::property::homeDir), "/home/jdoe");
+    EXPECT_EQ(stored(node, IC::property::scriptPath), "/bin/sh");
+    EXPECT_EQ(stored(node, IC::property::password), "first");
+    EXPECT_EQ(stored(node, IC::property::pwdMinDays), "1");
+    EXPECT_EQ(stored(node, IC::property::pwdMaxDays), "90");
+    EXPECT_EQ(stored(node, IC::property::pwdWarnDays), "14");
+    EXPECT_EQ(stored(node, IC::property::pwdExpDays), "20");
+    EXPECT_EQ(stored(node, IC::property::lastPwdChange), "2020-01-15 00:00:00");
+    EXPECT_EQ(stored(node, IC::property::inactiveTime), "2030-06-01 00:00:00");
+    EXPECT_EQ(stored(node, IC::property::passwordExpiration), "2030-06-01 00:00:00");
     EXPECT_EQ(machine::ran(), Texts{});
 }
 
@@ -122,7 +122,7 @@ TEST_F(RealAccounts, HaveTheirDatesAtLocalMidnightWestAndEastOfGreenwich)
         useZone(zone);
         Plugin other;
         other.initialize();
-        EXPECT_EQ(stored(other.node(NODES::userType, "jdoe"), NODES::lastPwdChange),
+        EXPECT_EQ(stored(other.node(IC::nodeType::user, "jdoe"), IC::property::lastPwdChange),
                   "2020-01-15 00:00:00")
             << zone;
     }
@@ -132,10 +132,10 @@ TEST_F(RealAccounts, CountLiveWithoutARefresh)
 {
     load();
     IC::MutableNode const& node = jdoe();
-    unsigned int const before = *property(node, NODES::elementCount);
+    unsigned int const before = *property(node, IC::property::elementCount);
     run("useradd newcomer");
-    EXPECT_EQ(static_cast<unsigned int>(*property(node, NODES::elementCount)), before + 1);
-    EXPECT_EQ(plugin.find(NODES::userType, "newcomer"), nullptr);
+    EXPECT_EQ(static_cast<unsigned int>(*property(node, IC::property::elementCount)), before + 1);
+    EXPECT_EQ(plugin.find(IC::nodeType::user, "newcomer"), nullptr);
 }
 
 TEST_F(RealAccounts, HaveNoShadowFactsForAProcessThatMayNotReadThem)
@@ -143,17 +143,17 @@ TEST_F(RealAccounts, HaveNoShadowFactsForAProcessThatMayNotReadThem)
     ASSERT_EQ(seteuid(65534), 0);
     plugin.initialize();
     ASSERT_EQ(seteuid(0), 0);
-    EXPECT_EQ(stored(jdoe(), NODES::fullName), "John Doe");
-    EXPECT_EQ(stored(jdoe(), NODES::password), "");
-    EXPECT_EQ(stored(jdoe(), NODES::pwdMaxDays), "0");
-    EXPECT_EQ(stored(jdoe(), NODES::pwdExpDays), "0");
-    EXPECT_EQ(stored(jdoe(), NODES::inactiveTime), "1970-01-01 00:00:00");
+    EXPECT_EQ(stored(jdoe(), IC::property::fullName), "John Doe");
+    EXPECT_EQ(stored(jdoe(), IC::property::password), "");
+    EXPECT_EQ(stored(jdoe(), IC::property::pwdMaxDays), "0");
+    EXPECT_EQ(stored(jdoe(), IC::property::pwdExpDays), "0");
+    EXPECT_EQ(stored(jdoe(), IC::property::inactiveTime), "1970-01-01 00:00:00");
 }
 
 TEST_F(RealAccounts, GetANewPasswordThatIsWritten)
 {
     load();
-    write(NODES::password, written("$6$salt$newhash"));
+    write(IC::property::password, written("$6$salt$newhash"));
     EXPECT_EQ(machine::ran(), Texts{"chpasswd -e < usrandpwd ; rm -f usrandpwd"});
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), "$6$salt$newhash");
     EXPECT_FALSE(std::filesystem::exists("usrandpwd"));
@@ -163,16 +163,16 @@ TEST_F(RealAccounts, KeepTheirPasswordWhereChpasswdFails)
 {
     machine::fake("/usr/sbin/chpasswd", "exit 1\n");
     load();
-    write(NODES::password, written("$6$salt$newhash"));
+    write(IC::property::password, written("$6$salt$newhash"));
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), "first");
     EXPECT_FALSE(std::filesystem::exists("usrandpwd"));
-    EXPECT_EQ(stored(jdoe(), NODES::password), "$6$salt$newhash");
+    EXPECT_EQ(stored(jdoe(), IC::property::password), "$6$salt$newhash");
 }
 
 TEST_F(RealAccounts, BecomeInactiveOnADateThatIsWrittenAsText)
 {
     load();
-    write(NODES::inactiveTime, written("2020-05-14 00:00:00"));
+    write(IC::property::inactiveTime, written("2020-05-14 00:00:00"));
     EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -I 30 jdoe"}));
     EXPECT_EQ(listed("Password expires"), "Apr 14, 2020");
     EXPECT_EQ(listed("Password inactive"), "May 14, 2020");
@@ -185,7 +185,7 @@ TEST_F(RealAccounts, BecomeInactiveOnADateThatIsWrittenAsADate)
         useZone(zone);
         run("chage -I 20 jdoe");
         machine::forget();
-        write(NODES::inactiveTime, midnight(2020, 5, 15));
+        write(IC::property::inactiveTime, midnight(2020, 5, 15));
         EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -I 31 jdoe"})) << zone;
         EXPECT_EQ(listed("Password inactive"), "May 15, 2020") << zone;
     }
@@ -194,7 +194,7 @@ TEST_F(RealAccounts, BecomeInactiveOnADateThatIsWrittenAsADate)
 TEST_F(RealAccounts, GetAnInactivityOf99999DaysWhereTheDateLiesBeforeTheExpiry)
 {
     load();
-    write(NODES::inactiveTime, written("2020-04-13 00:00:00"));
+    write(IC::property::inactiveTime, written("2020-04-13 00:00:00"));
     EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -I 99999 jdoe"}));
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(6), "99999");
 }
@@ -202,7 +202,7 @@ TEST_F(RealAccounts, GetAnInactivityOf99999DaysWhereTheDateLiesBeforeTheExpiry)
 TEST_F(RealAccounts, HaveTheirPasswordExpireOnADateThatIsWrittenAsText)
 {
     load();
-    write(NODES::passwordExpiration, written("2020-02-14 00:00:00"));
+    write(IC::property::passwordExpiration, written("2020-02-14 00:00:00"));
     EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -M 30 jdoe"}));
     EXPECT_EQ(listed("Password expires"), "Feb 14, 2020");
 }
@@ -210,7 +210,7 @@ TEST_F(RealAccounts, HaveTheirPasswordExpireOnADateThatIsWrittenAsText)
 TEST_F(RealAccounts, HaveTheirPasswordExpireOnADateThatIsWrittenAsADate)
 {
     load();
-    write(NODES::passwordExpiration, midnight(2020, 2, 15));
+    write(IC::property::passwordExpiration, midnight(2020, 2, 15));
     EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -M 31 jdoe"}));
     EXPECT_EQ(listed("Password expires"), "Feb 15, 2020");
 }
@@ -219,14 +219,14 @@ TEST_F(RealAccounts, CountFrom1970WhereThePasswordNeverExpires)
 {
     run("chage -M -1 jdoe");
     load();
-    write(NODES::inactiveTime, written("2020-05-14 00:00:00"));
+    write(IC::property::inactiveTime, written("2020-05-14 00:00:00"));
     EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -I 18396 jdoe"}));
 }
 
 TEST_F(RealAccounts, AreNotDeletedSinceUserdelIsGivenTheirUid)
 {
     load();
-    write(NODES::deleteUser, {IC::Number(1U), true});
+    write(IC::property::deleteUser, {IC::Number(1U), true});
     EXPECT_EQ(machine::ran(), Texts{"userdel -r 4711"});
     EXPECT_FALSE(machine::entry("/etc/passwd", "jdoe").empty());
     EXPECT_TRUE(std::filesystem::exists("/home/jdoe"));
@@ -237,7 +237,9 @@ TEST_F(RealAccounts, AreDeletedWithTheirHomeWhereTheUidIsTheName)
     run("useradd --badname -u 4712 -m 4712");
     load();
     IC::PropertyValue const yes(IC::Number(1U), true);
-    EXPECT_EQ(plugin.node(NODES::userType, "4712").setProperty(NODES::deleteUser, yes).getStatus(),
+    EXPECT_EQ(plugin.node(IC::nodeType::user, "4712")
+                  .setProperty(IC::property::deleteUser, yes)
+                  .getStatus(),
               0);
     EXPECT_EQ(machine::ran(), Texts{"userdel -r 4712"});
     EXPECT_TRUE(machine::entry("/etc/passwd", "4712").empty());
@@ -250,21 +252,21 @@ TEST_F(RealAccounts, StandInTheirGroupsAsGroupaddAndUsermodMadeThem)
     run("groupadd -g 4713 team");
     run("usermod -a -G team jdoe");
     load();
-    EXPECT_EQ(stored(plugin.node(NODES::groupType, "jdoe"), NODES::id), "4711");
-    EXPECT_EQ(stored(plugin.node(NODES::groupType, "jdoe"), NODES::members), "jdoe,anna");
-    EXPECT_EQ(stored(plugin.node(NODES::groupType, "team"), NODES::id), "4713");
-    EXPECT_EQ(stored(plugin.node(NODES::groupType, "team"), NODES::members), "jdoe");
+    EXPECT_EQ(stored(plugin.node(IC::nodeType::group, "jdoe"), IC::property::id), "4711");
+    EXPECT_EQ(stored(plugin.node(IC::nodeType::group, "jdoe"), IC::property::members), "jdoe,anna");
+    EXPECT_EQ(stored(plugin.node(IC::nodeType::group, "team"), IC::property::id), "4713");
+    EXPECT_EQ(stored(plugin.node(IC::nodeType::group, "team"), IC::property::members), "jdoe");
     EXPECT_EQ(machine::ran(), Texts{});
 }
 
 TEST_F(RealAccounts, HaveTheirGroupsCountedLiveWithoutARefresh)
 {
     load();
-    IC::MutableNode const& group = plugin.node(NODES::groupType, "jdoe");
-    unsigned int const before = *property(group, NODES::elementCount);
+    IC::MutableNode const& group = plugin.node(IC::nodeType::group, "jdoe");
+    unsigned int const before = *property(group, IC::property::elementCount);
     run("groupadd team");
-    EXPECT_EQ(static_cast<unsigned int>(*property(group, NODES::elementCount)), before + 1);
-    EXPECT_EQ(plugin.find(NODES::groupType, "team"), nullptr);
+    EXPECT_EQ(static_cast<unsigned int>(*property(group, IC::property::elementCount)), before + 1);
+    EXPECT_EQ(plugin.find(IC::nodeType::group, "team"), nullptr);
 }
 
 /** What stands in one property of all nodes of a type, in their order. */
@@ -281,10 +283,13 @@ TEST(LaidMachine, ShowsItsUsersAndGroupsInTheOrderOfItsFiles)
     machine::lay("users-and-groups");
     Plugin plugin;
     plugin.initialize();
-    EXPECT_EQ(all(plugin, NODES::userType, NODES::name), (Texts{"root", "anna", "ben", "carl"}));
-    EXPECT_EQ(all(plugin, NODES::userType, NODES::maxLoginFailures), (Texts{"3", "3", "3", "3"}));
-    EXPECT_EQ(all(plugin, NODES::groupType, NODES::name), (Texts{"root", "anna", "ben", "team"}));
-    EXPECT_EQ(all(plugin, NODES::groupType, NODES::members),
+    EXPECT_EQ(all(plugin, IC::nodeType::user, IC::property::name),
+              (Texts{"root", "anna", "ben", "carl"}));
+    EXPECT_EQ(all(plugin, IC::nodeType::user, IC::property::maxLoginFailures),
+              (Texts{"3", "3", "3", "3"}));
+    EXPECT_EQ(all(plugin, IC::nodeType::group, IC::property::name),
+              (Texts{"root", "anna", "ben", "team"}));
+    EXPECT_EQ(all(plugin, IC::nodeType::group, IC::property::members),
               (Texts{"root", "anna", "ben", "anna,ben,carl"}));
 }
 
@@ -297,7 +302,8 @@ TEST(LaidMachine, ShowsAGroupOfTenThousandMembersWhole)
     machine::write("/etc/group", "root:x:0:\nlarge:x:5000:" + members + "\nlast:x:5001:\n");
     Plugin plugin;
     plugin.initialize();
-    EXPECT_EQ(all(plugin, NODES::groupType, NODES::members), (Texts{"root", members, ""}));
+    EXPECT_EQ(all(plugin, IC::nodeType::group, IC::property::members),
+              (Texts{"root", members, ""}));
 }
 
 } // namespace

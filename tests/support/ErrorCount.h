@@ -1,6 +1,7 @@
 #ifndef TESTS_SUPPORT_ERRORCOUNT_H
 #define TESTS_SUPPORT_ERRORCOUNT_H
 
+#include "host/VXLogger.h"
 #include "mihost/runtime/Runtime.h"
 
 #include <atomic>
@@ -20,7 +21,7 @@ public:
 
     void write(mihost::LogMessage const& message) override
     {
-        if (message.level >= 6000)
+        if (message.level >= VXLog::level::error)
             ++errors;
     }
 

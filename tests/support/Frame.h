@@ -2,7 +2,7 @@
 #define TESTS_SUPPORT_FRAME_H
 
 #include "frame/OsSwMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/support/NodeCalls.h"
 
 #include <string>
@@ -23,7 +23,8 @@ public:
         miIds_ = {7};
         nextNodeId_ = 8;
         nodeIds_ = new std::vector<unsigned int>;
-        osNode_ = new IC::MutableNode(nextNodeId_++, miId_, miIds_, NODES::operatingSystemType, 0);
+        osNode_ =
+            new IC::MutableNode(nextNodeId_++, miId_, miIds_, IC::nodeType::operatingSystem, 0);
         nodes_.push_back(osNode_);
         IC::pOsSwMI = this;
     }
@@ -78,7 +79,7 @@ public:
 class Counter : public IC::MutableNode
 {
 public:
-    Counter() : MutableNode(100, 0, {7}, NODES::operatingSystemType, 0) {}
+    Counter() : MutableNode(100, 0, {7}, IC::nodeType::operatingSystem, 0) {}
 
     unsigned int getNodeId() const override
     {

@@ -3,7 +3,7 @@
 #include "TestPaths.h"
 
 #include "host/OpenMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 
 #include <algorithm>
 #include <dlfcn.h>
@@ -85,7 +85,7 @@ IC::MutableNode& Plugin::node(unsigned int type) const
 IC::MutableNode* Plugin::find(unsigned int type, std::string const& name) const
 {
     for (IC::MutableNode* node : nodes(type))
-        if (stored(*node, NODES::name) == name)
+        if (stored(*node, IC::property::name) == name)
             return node;
     return nullptr;
 }

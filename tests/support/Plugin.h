@@ -40,7 +40,7 @@ public:
     /** All nodes in the order of the framework's list. */
     std::vector<IC::MutableNode*> nodes() const;
 
-    /** Those of one node type, see nodes/ids.h. */
+    /** Those of one node type, see host/Properties.h. */
     std::vector<IC::MutableNode*> nodes(unsigned int type) const;
 
     /** @throws std::runtime_error where there is not exactly one of this type */

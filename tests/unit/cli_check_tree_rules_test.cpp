@@ -1,7 +1,7 @@
 #include "mihost/cli/check/PropertyRules.h"
 #include "mihost/cli/check/TreeRules.h"
 
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "nodes/values.h"
 
 #include <gtest/gtest.h>
@@ -20,30 +20,33 @@ class CheckOfTheTree : public testing::Test
 protected:
     CheckOfTheTree()
     {
-        add(NODES::osSwType, 0, 0, "OsSw Management Interface");
-        add(NODES::rootType, 50, 0, "ROOT Node");
-        add(NODES::computerType, 51, 0, "Computer");
-        add(NODES::operatingSystemType, 52, 0, "Operating System");
-        NODES::setProperties(at(NODES::operatingSystemType),
-                             {{NODES::fixedEnumeration, NODES::enumeration(35)},
-                              {NODES::requestedState, IC::PropertyValue(IC::EnumValue(1U), false)},
-                              {NODES::fixedNumbers, NODES::fixedNumberList()},
-                              {NODES::createUser, NODES::text("dummy")},
-                              {NODES::refresh, NODES::number(1)}});
+        add(IC::nodeType::osSw, 0, 0, "OsSw Management Interface");
+        add(IC::nodeType::root, 50, 0, "ROOT Node");
+        add(IC::nodeType::computer, 51, 0, "Computer");
+        add(IC::nodeType::operatingSystem, 52, 0, "Operating System");
+        IC::values::setProperties(
+            at(IC::nodeType::operatingSystem),
+            {{IC::property::fixedEnumeration, IC::values::enumeration(35)},
+             {IC::property::requestedState, IC::PropertyValue(IC::EnumValue(1U), false)},
+             {IC::property::fixedNumbers, IC::values::fixedNumberList()},
+             {IC::property::createUser, IC::values::text("dummy")},
+             {IC::property::refresh, IC::values::number(1)}});
         for (unsigned int index : {1U, 2U}) {
-            add(NODES::groupType, 53, index, "Group");
-            NODES::setProperties(*nodes_.back(), {{NODES::name, NODES::text("staff")},
-                                                  {NODES::id, NODES::number(index)},
-                                                  {NODES::members, NODES::texts({})},
-                                                  {NODES::elementCount, NODES::number(2)}});
+            add(IC::nodeType::group, 53, index, "Group");
+            IC::values::setProperties(*nodes_.back(),
+                                      {{IC::property::name, IC::values::text("staff")},
+                                       {IC::property::id, IC::values::number(index)},
+                                       {IC::property::members, IC::values::texts({})},
+                                       {IC::property::elementCount, IC::values::number(2)}});
         }
-        add(NODES::logType, 53, 0, "OS Log");
-        NODES::setProperties(*nodes_.back(), {{NODES::requestedState, NODES::enumeration(1)},
-                                              {NODES::fixedNumbers, NODES::fixedNumberList()},
-                                              {NODES::logNumber, NODES::number(0)},
-                                              {NODES::name, NODES::text("OS Log")},
-                                              {NODES::logState, NODES::enumeration(2)},
-                                              {NODES::dataType, NODES::text("*string LogData*")}});
+        add(IC::nodeType::log, 53, 0, "OS Log");
+        IC::values::setProperties(*nodes_.back(),
+                                  {{IC::property::requestedState, IC::values::enumeration(1)},
+                                   {IC::property::fixedNumbers, IC::values::fixedNumberList()},
+                                   {IC::property::logNumber, IC::values::number(0)},
+                                   {IC::property::name, IC::values::text("OS Log")},
+                                   {IC::property::logState, IC::values::enumeration(2)},
+                                   {IC::property::dataType, IC::values::text("*string LogData*")}});
     }
 
     void add(unsigned int type, unsigned int parent, unsigned int index,
@@ -90,8 +93,8 @@ TEST_F(CheckOfTheTree, MissesSingleNodesAndNamesUnknownOnes)
     add(99, 0, 0, "Other");
     EXPECT_EQ(wrongTypes(nodes_), (Findings{"node #57: unknown node type 99",
                                             "0 nodes of the kind log rather than 1"}));
-    add(NODES::logType, 53, 0, "OS Log");
-    add(NODES::logType, 53, 0, "OS Log");
+    add(IC::nodeType::log, 53, 0, "OS Log");
+    add(IC::nodeType::log, 53, 0, "OS Log");
     EXPECT_EQ(wrongTypes(nodes_).back(), "2 nodes of the kind log rather than 1");
 }
 
@@ -107,17 +110,17 @@ TEST_F(CheckOfTheTree, NamesWrongNumbers)
 {
     EXPECT_EQ(wrongIds(nodes_, ownId - 1).front(), "mi #50: node id 50 rather than 49");
     EXPECT_EQ(wrongMiIds(nodes_, 1).size(), nodes_.size());
-    at(NODES::logType).setStatus(2);
+    at(IC::nodeType::log).setStatus(2);
     EXPECT_EQ(wrongStatuses(nodes_), Findings{"log #56: status 2 rather than 1"});
-    add(NODES::logEntryType, 53, 2, "OS LogEntry");
+    add(IC::nodeType::logEntry, 53, 2, "OS LogEntry");
     EXPECT_EQ(wrongParents(nodes_), Findings{"log-entry #57: parent id 53 rather than 56"});
     EXPECT_EQ(wrongIndexes(nodes_), Findings{"log-entry #57: index 2 rather than 1"});
 }
 
 TEST_F(CheckOfTheTree, NamesWrongDescriptions)
 {
-    at(NODES::rootType).setDescription("root");
-    add(NODES::driverType, 53, 1, "anything");
+    at(IC::nodeType::root).setDescription("root");
+    add(IC::nodeType::driver, 53, 1, "anything");
     EXPECT_EQ(wrongDescriptions(nodes_),
               Findings{"root #51: description 'root' rather than 'ROOT Node'"});
     nodes_.back()->setDescription("");
@@ -126,8 +129,8 @@ TEST_F(CheckOfTheTree, NamesWrongDescriptions)
 
 TEST_F(CheckOfTheTree, MissesPropertiesAndNamesUnknownOnes)
 {
-    at(NODES::rootType).setProperty(7, NODES::number(1));
-    add(NODES::driverType, 53, 1, "one");
+    at(IC::nodeType::root).setProperty(7, IC::values::number(1));
+    add(IC::nodeType::driver, 53, 1, "one");
     EXPECT_EQ(wrongPropertyIds(nodes_),
               (Findings{"root #51: unknown property 7", "driver #57: driver-version (134): not set",
                         "driver #57: driver-name (108): not set",
@@ -137,9 +140,9 @@ TEST_F(CheckOfTheTree, MissesPropertiesAndNamesUnknownOnes)
 
 TEST_F(CheckOfTheTree, NamesWrongKindsAndFlags)
 {
-    IC::MutableNode& os = at(NODES::operatingSystemType);
-    os.setProperty(NODES::refresh, IC::PropertyValue("1", false));
-    os.setProperty(NODES::requestedState, NODES::enumeration(1));
+    IC::MutableNode& os = at(IC::nodeType::operatingSystem);
+    os.setProperty(IC::property::refresh, IC::PropertyValue("1", false));
+    os.setProperty(IC::property::requestedState, IC::values::enumeration(1));
     EXPECT_EQ(wrongKinds(nodes_), Findings{"os #53: refresh (75): text rather than number"});
     EXPECT_EQ(wrongFlags(nodes_),
               (Findings{"os #53: refresh (75): flag false rather than true",
@@ -148,17 +151,17 @@ TEST_F(CheckOfTheTree, NamesWrongKindsAndFlags)
 
 TEST_F(CheckOfTheTree, LetsAFigureThatCouldNotBeReadStayEmpty)
 {
-    IC::MutableNode& os = at(NODES::operatingSystemType);
-    os.setProperty(NODES::processCount, NODES::emptyValue());
+    IC::MutableNode& os = at(IC::nodeType::operatingSystem);
+    os.setProperty(IC::property::processCount, IC::values::emptyValue());
     EXPECT_EQ(wrongKinds(nodes_), Findings());
-    os.setProperty(NODES::userCount, NODES::emptyValue());
+    os.setProperty(IC::property::userCount, IC::values::emptyValue());
     EXPECT_EQ(wrongKinds(nodes_), Findings{"os #53: user-count (145): empty rather than number"});
 }
 
 TEST_F(CheckOfTheTree, NamesWrongValuesLengthsAndCounts)
 {
-    at(NODES::logType).setProperty(NODES::logNumber, NODES::number(1));
-    at(NODES::groupType).setProperty(NODES::elementCount, NODES::number(3));
+    at(IC::nodeType::log).setProperty(IC::property::logNumber, IC::values::number(1));
+    at(IC::nodeType::group).setProperty(IC::property::elementCount, IC::values::number(3));
     EXPECT_EQ(wrongValues(nodes_), (Findings{"group #54: group-count (51): '3' rather than '2'",
                                              "log #56: log-number (37): '1' rather than '0'"}));
 }
@@ -172,23 +175,23 @@ public:
     IC::Error getProperty(unsigned int, IC::PropertyValue& value) const override
     {
         value = IC::PropertyValue("all", true);
-        return NODES::success();
+        return IC::values::success();
     }
 };
 
 TEST(CheckOfReads, NamesUnknownPropertiesThatAreAnsweredAndWrongKinds)
 {
-    AnswersAll node(9, 0, {}, NODES::computerType, 0);
+    AnswersAll node(9, 0, {}, IC::nodeType::computer, 0);
     EXPECT_EQ(wrongReads({&node}),
               Findings{"computer #9: answers the unknown property 4294967295"});
-    AnswersAll group(9, 0, {}, NODES::groupType, 1);
+    AnswersAll group(9, 0, {}, IC::nodeType::group, 1);
     EXPECT_EQ(wrongReads({&group}).front(),
               "group #9: group-id (89): reads as text rather than number");
 }
 
 TEST(CheckOfReads, NamesStoredPropertiesThatAreNotAnswered)
 {
-    IC::MutableNode os(9, 0, {}, NODES::operatingSystemType, 0);
+    IC::MutableNode os(9, 0, {}, IC::nodeType::operatingSystem, 0);
     EXPECT_EQ(wrongReads({&os}), Findings{"os #9: clear-log (191): cannot be read"});
 }
 

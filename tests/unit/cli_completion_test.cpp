@@ -1,7 +1,7 @@
 #include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/shell/Completion.h"
 
-#include "nodes/ids.h"
+#include "host/Properties.h"
 
 #include <gtest/gtest.h>
 
@@ -14,9 +14,9 @@ using Words = std::vector<std::string>;
 Words namesOf(NodeKind const& kind)
 {
     switch (kind.type) {
-    case NODES::userType:
+    case IC::nodeType::user:
         return {"root", "jdoe"};
-    case NODES::groupType:
+    case IC::nodeType::group:
         return {"staff"};
     default:
         return {};

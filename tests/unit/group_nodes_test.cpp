@@ -144,7 +144,7 @@ TEST_F(GroupNodes, ArePublishedEachAsSoonAsItIsComplete)
             auto& to = *static_cast<Publications*>(const_cast<void*>(context));
             to.seen.push_back("node " + std::to_string(to.frame.ofType(51).size()) + " with " +
                               std::to_string(node->getProperties().size()) + " properties");
-            return NODES::success();
+            return IC::values::success();
         },
         &publications, nullptr);
     frame.createGroupNodes(true);
@@ -273,7 +273,7 @@ TEST_F(GroupNodes, AnswerTheirCountLive)
 {
     frame.createGroupNodes(false);
     files.write("/etc/group", "root:x:0:\nteam:x:500:\nnew:x:501:\n");
-    IC::PropertyValue value = NODES::emptyValue();
+    IC::PropertyValue value = IC::values::emptyValue();
     EXPECT_EQ(static_cast<std::string>(groups()[0]->getProperty(51, value)), "status 0");
     EXPECT_EQ(shown(value), "number 3 true");
     EXPECT_EQ(storedValue(*groups()[0], 51), "number 2 true");
@@ -287,7 +287,7 @@ TEST_F(GroupNodes, AnswerTheirCountWithoutTheLockThatTheyShareWithUsers)
     mutexes.onLock = [&locked](NQ::Mutex const& mutex, unsigned long) {
         locked.emplace_back(&mutex == &IC::OSSWMI::myuserlock ? "shared" : "the listing's");
     };
-    IC::PropertyValue value = NODES::emptyValue();
+    IC::PropertyValue value = IC::values::emptyValue();
     groups()[0]->getProperty(51, value);
     EXPECT_EQ(locked, Texts{"the listing's"});
 }
@@ -296,10 +296,10 @@ TEST_F(GroupNodes, AnswerAllElseFromWhatIsStored)
 {
     frame.createGroupNodes(false);
     files.write("/etc/group", "");
-    IC::PropertyValue value = NODES::emptyValue();
+    IC::PropertyValue value = IC::values::emptyValue();
     EXPECT_EQ(groups()[1]->getProperty(108, value).getStatus(), 0);
     EXPECT_EQ(shown(value), "text team true");
-    IC::PropertyValue untouched = NODES::text("untouched");
+    IC::PropertyValue untouched = IC::values::text("untouched");
     EXPECT_EQ(groups()[1]->getProperty(4711, untouched).getStatus(), 1);
     EXPECT_EQ(shown(untouched), "text untouched true");
 }
@@ -309,7 +309,7 @@ TEST_F(GroupNodes, OnlyStoreWhatIsWrittenToThem)
     frame.createGroupNodes(false);
     libc::FakeCommands const commands;
     Recording const log;
-    EXPECT_EQ(groups()[1]->setProperty(138, NODES::number(1)).getStatus(), 0);
+    EXPECT_EQ(groups()[1]->setProperty(138, IC::values::number(1)).getStatus(), 0);
     EXPECT_EQ(storedValue(*groups()[1], 138), "number 1 true");
     EXPECT_TRUE(commands.ran.empty());
     EXPECT_TRUE(log.records().empty()); // the framework's own store
@@ -321,7 +321,7 @@ TEST_F(GroupNodes, SpeakOfAReadOfTheirBirthAndOfTheirDeath)
     auto* const node = new IC::GroupNode(1, 2, {}, 51, 3);
     EXPECT_EQ(log.texts(), Texts{"GroupNode::GroupNode: entry"});
     log.clear();
-    IC::PropertyValue value = NODES::emptyValue();
+    IC::PropertyValue value = IC::values::emptyValue();
     node->getProperty(108, value);
     EXPECT_EQ(log.texts(),
               (Texts{"GroupNode::getProperty: entry", "GroupNode::getProperty: exit"}));
@@ -335,7 +335,7 @@ TEST_F(GroupNodes, SpeakOfEveryReadForTheFrame)
     frame.createGroupNodes(false);
     for (unsigned int const id : {51U, 108U}) {
         Recording const log;
-        IC::PropertyValue value = NODES::emptyValue();
+        IC::PropertyValue value = IC::values::emptyValue();
         groups()[0]->getProperty(id, value);
         Texts const texts = log.texts(3000);
         ASSERT_GE(texts.size(), 2U);

@@ -341,7 +341,7 @@ TEST_F(MethodLog, BeginsWithTheWrittenTextUnlessThatHoldsPassword)
     for (auto const& [call, logged] :
          {std::pair{"Unknown,A:CMPI_string:b", true}, {"Unknown,A:CMPI_string:Passwords", false}}) {
         Recording const log;
-        node.setProperty(NODES::createUser, IC::PropertyValue(call, true));
+        node.setProperty(IC::property::createUser, IC::PropertyValue(call, true));
         Lines const lines = linesIn(log);
         std::string const line =
             std::string("3000 setProperty | CreateUser: inMethodAndParams = ") + call;

@@ -200,7 +200,7 @@ TEST_F(UserNodes, ArePublishedEachAsSoonAsItIsComplete)
             auto& to = *static_cast<Publications*>(const_cast<void*>(context));
             to.seen.push_back("node " + std::to_string(to.frame.ofType(46).size()) + " with " +
                               std::to_string(node->getProperties().size()) + " properties");
-            return NODES::success();
+            return IC::values::success();
         },
         &publications, nullptr);
     frame.createUserNodes(true);
@@ -357,7 +357,7 @@ TEST_F(UserNodes, AnswerTheirCountLive)
     frame.createUserNodes(false);
     files.write("/etc/passwd", account("root", 0) + account("anna", 1000) + account("ben", 1001) +
                                    account("new", 1002));
-    IC::PropertyValue value = NODES::emptyValue();
+    IC::PropertyValue value = IC::values::emptyValue();
     IC::Error const error = users()[0]->getProperty(51, value);
     EXPECT_EQ(static_cast<std::string>(error), "status 0");
     EXPECT_EQ(shown(value), "number 4 true");
@@ -370,7 +370,7 @@ TEST_F(UserNodes, AnswerTheirCountWithoutALock)
     int locks = 0;
     MutexCalls mutexes;
     mutexes.onLock = [&locks](NQ::Mutex const&, unsigned long) { ++locks; };
-    IC::PropertyValue value = NODES::emptyValue();
+    IC::PropertyValue value = IC::values::emptyValue();
     users()[0]->getProperty(51, value);
     EXPECT_EQ(locks, 0);
 }
@@ -378,8 +378,8 @@ TEST_F(UserNodes, AnswerTheirCountWithoutALock)
 TEST_F(UserNodes, AnswerTheirCountWhateverIsStoredUnderIt)
 {
     frame.createUserNodes(false);
-    users()[0]->setProperty(51, NODES::number(99));
-    IC::PropertyValue value = NODES::emptyValue();
+    users()[0]->setProperty(51, IC::values::number(99));
+    IC::PropertyValue value = IC::values::emptyValue();
     EXPECT_EQ(users()[0]->getProperty(51, value).getStatus(), 0);
     EXPECT_EQ(shown(value), "number 3 true");
 }
@@ -388,10 +388,10 @@ TEST_F(UserNodes, AnswerAllElseFromWhatIsStored)
 {
     frame.createUserNodes(false);
     files.write("/etc/passwd", "");
-    IC::PropertyValue value = NODES::emptyValue();
+    IC::PropertyValue value = IC::values::emptyValue();
     EXPECT_EQ(users()[1]->getProperty(108, value).getStatus(), 0);
     EXPECT_EQ(shown(value), "text anna true");
-    IC::PropertyValue untouched = NODES::text("untouched");
+    IC::PropertyValue untouched = IC::values::text("untouched");
     EXPECT_EQ(users()[1]->getProperty(4711, untouched).getStatus(), 1);
     EXPECT_EQ(shown(untouched), "text untouched true");
 }
@@ -399,7 +399,7 @@ TEST_F(UserNodes, AnswerAllElseFromWhatIsStored)
 TEST_F(UserNodes, SpeakOfAReadUnderTheNameOfTheClass)
 {
     frame.createUserNodes(false);
-    IC::PropertyValue value = NODES::emptyValue();
+    IC::PropertyValue value = IC::values::emptyValue();
     Recording log;
     users()[0]->getProperty(108, value);
     EXPECT_EQ(log.texts(3000), (Texts{"UserNode::UserNode: entry", "UserNode::UserNode: exit"}));
@@ -434,7 +434,7 @@ TEST_F(UserNodes, SpeakOfAReadForTheFrame)
 {
     frame.createUserNodes(false);
     Recording const log;
-    IC::PropertyValue value = NODES::emptyValue();
+    IC::PropertyValue value = IC::values::emptyValue();
     users()[0]->getProperty(108, value);
     ASSERT_EQ(log.records().size(), 4U);
     for (LogRecord const& record : log.records()) {

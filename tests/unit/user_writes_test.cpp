@@ -95,7 +95,7 @@ protected:
 TEST_F(PasswordWrite, HandsNameAndEncryptedPasswordToChpasswdInAFile)
 {
     commands.answers[setPasswords] = "";
-    write(117, NODES::text("$6$salt$hash"));
+    write(117, IC::values::text("$6$salt$hash"));
     EXPECT_EQ(commands.ran, Texts{setPasswords});
     EXPECT_EQ(commands.modes, Texts{"r"});
     EXPECT_EQ(handedOver, Texts{"anna:$6$salt$hash\n"});
@@ -107,20 +107,20 @@ TEST_F(PasswordWrite, HandsNameAndEncryptedPasswordToChpasswdInAFile)
 TEST_F(PasswordWrite, EmptiesAFileThatIsThereAlready)
 {
     std::ofstream("usrandpwd") << "root:x\nanna:an older and much longer password\n";
-    write(117, NODES::text("new"));
+    write(117, IC::values::text("new"));
     EXPECT_EQ(handedOver, Texts{"anna:new\n"});
 }
 
 TEST_F(PasswordWrite, TakesTheNameThatTheNodeHoldsNow)
 {
-    write(108, NODES::text("renamed"));
-    write(117, NODES::text("new"));
+    write(108, IC::values::text("renamed"));
+    write(117, IC::values::text("new"));
     EXPECT_EQ(handedOver, Texts{"renamed:new\n"});
 }
 
 TEST_F(PasswordWrite, IsStoredAlsoWhenChpasswdCannotBeStarted)
 {
-    write(117, NODES::text("new"));
+    write(117, IC::values::text("new"));
     EXPECT_EQ(log.texts(6000),
               Texts{"Cannot open process: chpasswd -e < usrandpwd ; rm -f usrandpwd"});
     EXPECT_EQ(storedValue(anna(), 117), "text new true");
@@ -136,7 +136,7 @@ TEST_F(PasswordWrite, StartsChpasswdAlsoWhenTheFileCannotBeCreated)
 {
     std::filesystem::create_directory("usrandpwd");
     commands.answers[setPasswords] = "";
-    write(117, NODES::text("new"));
+    write(117, IC::values::text("new"));
     EXPECT_EQ(commands.ran, Texts{setPasswords});
     EXPECT_TRUE(std::filesystem::is_directory("usrandpwd"));
     EXPECT_EQ(storedValue(anna(), 117), "text new true");
@@ -145,7 +145,7 @@ TEST_F(PasswordWrite, StartsChpasswdAlsoWhenTheFileCannotBeCreated)
 TEST_F(PasswordWrite, OfTheBuilderWritesNoFileAndRunsNothing)
 {
     IC::OSSWMI::MI_call = true;
-    write(117, NODES::text("new"));
+    write(117, IC::values::text("new"));
     IC::OSSWMI::MI_call = false;
     EXPECT_EQ(commands.ran, Texts{});
     EXPECT_FALSE(std::filesystem::exists("usrandpwd"));
@@ -155,7 +155,7 @@ TEST_F(PasswordWrite, OfTheBuilderWritesNoFileAndRunsNothing)
 TEST_F(PasswordWrite, IsNeverLogged)
 {
     commands.answers[setPasswords] = "";
-    write(117, NODES::text("$6$salt$hash"));
+    write(117, IC::values::text("$6$salt$hash"));
     for (std::string const& text : log.texts())
         EXPECT_EQ(text.find("$6$salt$hash"), std::string::npos) << text;
 }
@@ -163,7 +163,7 @@ TEST_F(PasswordWrite, IsNeverLogged)
 TEST_F(PasswordWrite, PassesItsTextsThroughWideText)
 {
     WideTexts const texts;
-    write(117, NODES::text("new"));
+    write(117, IC::values::text("new"));
     EXPECT_EQ(sorted(texts.widened), (Texts{"anna", "new"}));
     EXPECT_EQ(texts.narrowed, texts.widened);
 }
@@ -172,7 +172,7 @@ TEST_F(UserWrite, OfAnInactiveTimeSetsTheDaysAfterThePasswordsExpiry)
 {
     commands.answers = {{"chage -l anna", "Password expires : Jan 01, 2008\n"},
                         {"chage -I 10 anna", ""}};
-    write(118, NODES::text("2008-01-11 00:00:00"));
+    write(118, IC::values::text("2008-01-11 00:00:00"));
     EXPECT_EQ(commands.ran, (Texts{"chage -l anna", "chage -I 10 anna"}));
     EXPECT_EQ(storedValue(anna(), 118), "text 2008-01-11 00:00:00 true");
 }
@@ -181,7 +181,7 @@ TEST_F(UserWrite, OfAPasswordExpirationSetsTheDaysAfterTheLastChange)
 {
     commands.answers = {{"chage -l anna", "Last password change : Jan 01, 2008\n"},
                         {"chage -M 10 anna", ""}};
-    write(91, NODES::text("2008-01-11 00:00:00"));
+    write(91, IC::values::text("2008-01-11 00:00:00"));
     EXPECT_EQ(commands.ran, (Texts{"chage -l anna", "chage -M 10 anna"}));
     EXPECT_EQ(storedValue(anna(), 91), "text 2008-01-11 00:00:00 true");
 }
@@ -190,8 +190,8 @@ TEST_F(UserWrite, OfADateTakesItsText)
 {
     commands.answers = {{"chage -l anna", "Password expires : Jan 01, 2008\n"
                                           "Last password change : Jan 02, 2008\n"}};
-    write(118, NODES::date(1200009600));
-    write(91, NODES::date(1200009600));
+    write(118, IC::values::date(1200009600));
+    write(91, IC::values::date(1200009600));
     EXPECT_EQ(commands.ran,
               (Texts{"chage -l anna", "chage -I 10 anna", "chage -l anna", "chage -M 9 anna"}));
     EXPECT_EQ(storedValue(anna(), 118), "date 1200009600 true");
@@ -202,7 +202,7 @@ TEST_F(UserWrite, OfADatePassesDateAndNameThroughWideText)
 {
     for (unsigned int const id : {118U, 91U}) {
         WideTexts const texts;
-        write(id, NODES::text("2008-01-11 00:00:00"));
+        write(id, IC::values::text("2008-01-11 00:00:00"));
         EXPECT_EQ(sorted(texts.widened), (Texts{"2008-01-11 00:00:00", "anna"}));
         EXPECT_EQ(texts.narrowed, texts.widened);
     }
@@ -210,11 +210,11 @@ TEST_F(UserWrite, OfADatePassesDateAndNameThroughWideText)
 
 TEST_F(UserWrite, IsStoredWhateverBecomesOfTheCommand)
 {
-    write(118, NODES::text("tomorrow"));
-    write(91, NODES::text("tomorrow"));
+    write(118, IC::values::text("tomorrow"));
+    write(91, IC::values::text("tomorrow"));
     EXPECT_EQ(storedValue(anna(), 118), "text tomorrow true");
     EXPECT_EQ(storedValue(anna(), 91), "text tomorrow true");
-    write(138, NODES::number(1));
+    write(138, IC::values::number(1));
     EXPECT_EQ(storedValue(anna(), 138), "number 1 true");
     EXPECT_EQ(log.texts(6000).back(), "Cannot open process: command = userdel -r 1000");
 }
@@ -228,7 +228,7 @@ TEST_F(UserWrite, IsStoredOnceItHasBeenActedOn)
             stored.push_back(storedValue(anna(), id));
             return nullptr;
         };
-        write(id, NODES::text("1"));
+        write(id, IC::values::text("1"));
         ASSERT_FALSE(stored.empty()) << id;
         EXPECT_EQ(stored, Texts(stored.size(), before)) << id;
         EXPECT_EQ(storedValue(anna(), id), "text 1 true");
@@ -238,23 +238,23 @@ TEST_F(UserWrite, IsStoredOnceItHasBeenActedOn)
 TEST_F(UserWrite, OfOneToDeleteRunsUserdelWithTheUidText)
 {
     commands.answers["userdel -r 1000"] = "";
-    write(138, NODES::number(1));
+    write(138, IC::values::number(1));
     EXPECT_EQ(commands.ran, Texts{"userdel -r 1000"});
     EXPECT_EQ(storedValue(anna(), 138), "number 1 true");
 }
 
 TEST_F(UserWrite, OfAnythingThatReadsAsOneToDeleteRunsUserdel)
 {
-    write(138, NODES::text("1"));
-    write(138, NODES::enumeration(1));
-    write(138, NODES::truth(true));
+    write(138, IC::values::text("1"));
+    write(138, IC::values::enumeration(1));
+    write(138, IC::values::truth(true));
     EXPECT_EQ(commands.ran, Texts(3, "userdel -r 1000"));
 }
 
 TEST_F(UserWrite, OfAnyOtherValueToDeleteDoesNothing)
 {
-    for (IC::PropertyValue const& value :
-         {NODES::number(0), NODES::number(2), NODES::truth(false), NODES::text("yes")})
+    for (IC::PropertyValue const& value : {IC::values::number(0), IC::values::number(2),
+                                           IC::values::truth(false), IC::values::text("yes")})
         write(138, value);
     EXPECT_EQ(commands.ran, Texts{});
     EXPECT_EQ(storedValue(anna(), 138), "text yes true");
@@ -263,7 +263,7 @@ TEST_F(UserWrite, OfAnyOtherValueToDeleteDoesNothing)
 TEST_F(UserWrite, OfADeletionPassesTheUidThroughWideText)
 {
     WideTexts const texts;
-    write(138, NODES::number(1));
+    write(138, IC::values::number(1));
     EXPECT_EQ(texts.widened, Texts{"1000"});
     EXPECT_EQ(texts.narrowed, Texts{"1000"});
 }
@@ -273,7 +273,7 @@ TEST_F(UserWrite, OfAnyOtherPropertyIsOnlyStored)
     for (unsigned int const id :
          {123U, 125U, 108U, 109U, 89U,  90U,  311U, 312U, 158U, 159U, 120U,
           163U, 162U, 161U, 44U,  119U, 113U, 160U, 106U, 51U,  74U,  4711U})
-        write(id, NODES::text("1"));
+        write(id, IC::values::text("1"));
     EXPECT_EQ(commands.ran, Texts{});
     EXPECT_FALSE(std::filesystem::exists("usrandpwd"));
     EXPECT_EQ(storedValue(anna(), 312), "text 1 true");
@@ -283,9 +283,9 @@ TEST_F(UserWrite, OfAnyOtherPropertyIsOnlyStored)
 TEST_F(UserWrite, OfTheBuilderIsOnlyStored)
 {
     IC::OSSWMI::MI_call = true;
-    write(118, NODES::text("2008-01-11 00:00:00"));
-    write(91, NODES::text("2008-01-11 00:00:00"));
-    write(138, NODES::number(1));
+    write(118, IC::values::text("2008-01-11 00:00:00"));
+    write(91, IC::values::text("2008-01-11 00:00:00"));
+    write(138, IC::values::number(1));
     IC::OSSWMI::MI_call = false;
     EXPECT_EQ(commands.ran, Texts{});
     EXPECT_EQ(storedValue(anna(), 138), "number 1 true");
@@ -294,7 +294,7 @@ TEST_F(UserWrite, OfTheBuilderIsOnlyStored)
 TEST_F(UserWrite, SpeaksOfItself)
 {
     log.clear();
-    write(312, NODES::text("x"));
+    write(312, IC::values::text("x"));
     EXPECT_EQ(log.texts(3000),
               (Texts{"UserNode::setProperty: entry", "UserNode::setProperty: exit"}));
 }
@@ -302,7 +302,7 @@ TEST_F(UserWrite, SpeaksOfItself)
 TEST_F(UserWrite, LeavesTheOtherNodesAsTheyAre)
 {
     commands.answers["userdel -r 1000"] = "";
-    write(138, NODES::number(1));
+    write(138, IC::values::number(1));
     EXPECT_TRUE(frame.deleted.empty());
     EXPECT_TRUE(frame.published.empty());
 }

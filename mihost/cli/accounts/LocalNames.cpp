@@ -1,9 +1,10 @@
 #include "mihost/cli/accounts/LocalNames.h"
 
+#include "host/Methods.h"
+#include "host/Properties.h"
 #include "mihost/cli/accounts/AccountFiles.h"
 #include "mihost/cli/accounts/LoginDefs.h"
 #include "mihost/cli/system/TextFile.h"
-#include "nodes/ids.h"
 
 namespace mihost
 {
@@ -37,11 +38,11 @@ std::vector<std::string> modules()
 std::vector<std::string> localNames(NodeKind const& kind)
 {
     switch (kind.type) {
-    case NODES::userType:
+    case IC::nodeType::user:
         return accounts(accountFile, readLoginDefs().users());
-    case NODES::groupType:
+    case IC::nodeType::group:
         return accounts(groupFile, readLoginDefs().groups());
-    case NODES::driverType:
+    case IC::nodeType::driver:
         return modules();
     default:
         return {};

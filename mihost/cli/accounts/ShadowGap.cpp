@@ -1,7 +1,7 @@
 #include "mihost/cli/accounts/ShadowGap.h"
 
+#include "host/Properties.h"
 #include "mihost/cli/accounts/AccountFiles.h"
-#include "nodes/ids.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -16,14 +16,14 @@ namespace
 {
 
 constexpr unsigned int fromShadow[] = {
-    NODES::password,     NODES::passwordLength, NODES::pwdMaxDays,
-    NODES::pwdWarnDays,  NODES::pwdMinDays,     NODES::pwdExpDays,
-    NODES::inactiveTime, NODES::lastPwdChange,  NODES::passwordExpiration,
+    IC::property::password,     IC::property::passwordLength, IC::property::pwdMaxDays,
+    IC::property::pwdWarnDays,  IC::property::pwdMinDays,     IC::property::pwdExpDays,
+    IC::property::inactiveTime, IC::property::lastPwdChange,  IC::property::passwordExpiration,
 };
 
 /** Those of which an entry that was read hardly leaves all at zero. */
-constexpr unsigned int telling[] = {NODES::pwdMaxDays, NODES::pwdExpDays, NODES::inactiveTime,
-                                    NODES::lastPwdChange};
+constexpr unsigned int telling[] = {IC::property::pwdMaxDays, IC::property::pwdExpDays,
+                                    IC::property::inactiveTime, IC::property::lastPwdChange};
 
 bool isBlank(IC::PropertyValue const& value)
 {
@@ -56,7 +56,7 @@ std::string reasonOf(std::string const& user)
 
 ShadowGap::ShadowGap(IC::MutableNode const& node)
 {
-    if (node.getNodeType() != NODES::userType)
+    if (node.getNodeType() != IC::nodeType::user)
         return;
     auto const stored = node.getProperties();
     for (unsigned int const property : telling) {
@@ -64,7 +64,7 @@ ShadowGap::ShadowGap(IC::MutableNode const& node)
         if (found == stored.end() || !isBlank(found->second))
             return;
     }
-    auto const name = stored.find(NODES::name);
+    auto const name = stored.find(IC::property::name);
     if (name != stored.end())
         reason_ = reasonOf(static_cast<std::string>(name->second));
 }

@@ -1,5 +1,6 @@
 // The administration methods and their parameters.
 
+#include "host/Methods.h"
 #include "mihost/cli/catalogue/Rows.h"
 
 namespace mihost
@@ -8,25 +9,34 @@ namespace mihost
 namespace
 {
 
+namespace method = IC::method;
+namespace parameter = IC::parameter;
+
 using namespace rows;
 
-constexpr Parameter userName = required("UserName", Form::AccountName, "login name");
-constexpr Parameter newUserName = required("UserName", Form::PlainName, "login name");
-constexpr Parameter groupName = required("GroupName", Form::AccountName, "the group's name");
-constexpr Parameter newGroupName = required("GroupName", Form::PlainName, "the group's name");
-constexpr Parameter localGroup = required("LocalGroupName", Form::PlainName, "the group's name");
+constexpr Parameter userName = required(parameter::userName, Form::AccountName, "login name");
+constexpr Parameter newUserName = required(parameter::userName, Form::PlainName, "login name");
+constexpr Parameter groupName =
+    required(parameter::groupName, Form::AccountName, "the group's name");
+constexpr Parameter newGroupName =
+    required(parameter::groupName, Form::PlainName, "the group's name");
+constexpr Parameter localGroup =
+    required(parameter::localGroupName, Form::PlainName, "the group's name");
 constexpr Parameter member =
-    required("DomainAndMember", Form::AccountName, "login name of the member");
-constexpr Parameter fullName = required("FullName", Form::Words, "full name");
+    required(parameter::domainAndMember, Form::AccountName, "login name of the member");
+constexpr Parameter fullName = required(parameter::fullName, Form::Words, "full name");
 constexpr char homeMeaning[] = "home directory; made, or moved there with its files";
 
 std::vector<Parameter> const ageing = {
-    optional("daysMustKeepPassword", Form::Digits, "days before a password may be changed"),
-    optional("daysMustChangePasswordAfter", Form::Digits, "days that a password stays valid"),
-    optional("daysWarnBeforePasswordExpire", Form::Digits, "days of warning before it expires"),
-    optional("daysExpireAfter", Form::Digits,
+    optional(parameter::daysMustKeepPassword, Form::Digits,
+             "days before a password may be changed"),
+    optional(parameter::daysMustChangePasswordAfter, Form::Digits,
+             "days that a password stays valid"),
+    optional(parameter::daysWarnBeforePasswordExpire, Form::Digits,
+             "days of warning before it expires"),
+    optional(parameter::daysExpireAfter, Form::Digits,
              "days from a password's expiry until the account goes inactive"),
-    optional("passwordExpirationDate", Form::Day,
+    optional(parameter::passwordExpirationDate, Form::Day,
              "day on which the account expires; never if not given"),
 };
 
@@ -38,31 +48,33 @@ std::vector<Parameter> withAgeing(std::vector<Parameter> parameters)
 }
 
 std::vector<Method> const allMethods = {
-    {"UserAdd", "makes a user account and sets its password ageing",
+    {method::userAdd, "makes a user account and sets its password ageing",
      withAgeing({
          newUserName,
-         optional("Comment", Form::Words, "the account's comment field"),
-         optional("HomeDir", Form::Path, homeMeaning),
-         optional("ScriptPath", Form::Path, "login shell"),
-         optional("Password", Form::Password, "plain password"),
+         optional(parameter::comment, Form::Words, "the account's comment field"),
+         optional(parameter::homeDir, Form::Path, homeMeaning),
+         optional(parameter::scriptPath, Form::Path, "login shell"),
+         optional(parameter::password, Form::Password, "plain password"),
      })},
-    {"UserDel", "deletes a user account; home directory and mail stay", {userName}},
-    {"UserSetAttrib", "sets an account's password ageing", withAgeing({userName})},
-    {"UserSetFullName", "sets an account's comment field", {userName, fullName}},
-    {"UserSetScriptPath",
+    {method::userDel, "deletes a user account; home directory and mail stay", {userName}},
+    {method::userSetAttrib, "sets an account's password ageing", withAgeing({userName})},
+    {method::userSetFullName, "sets an account's comment field", {userName, fullName}},
+    {method::userSetScriptPath,
      "sets an account's login shell",
-     {userName, required("ScriptPath", Form::Path, "login shell")}},
-    {"UserSetHomeDir",
+     {userName, required(parameter::scriptPath, Form::Path, "login shell")}},
+    {method::userSetHomeDir,
      "moves an account's home directory",
-     {userName, required("HomeDir", Form::Path, homeMeaning)}},
-    {"UserSetPassword",
+     {userName, required(parameter::homeDir, Form::Path, homeMeaning)}},
+    {method::userSetPassword,
      "sets an account's password",
-     {userName, required("Password", Form::Password, "plain password")}},
-    {"LocalGroupAdd", "makes a group", {newGroupName}},
-    {"LocalGroupDel", "deletes a group", {groupName}},
-    {"LocalGroupAddUser", "adds a user to a group", {localGroup, member}},
-    {"LocalGroupDelUser", "removes a user from a group", {localGroup, member}},
-    {"GetShadowing", "checks whether the shadow file can be read; the answer is not reported", {}},
+     {userName, required(parameter::password, Form::Password, "plain password")}},
+    {method::localGroupAdd, "makes a group", {newGroupName}},
+    {method::localGroupDel, "deletes a group", {groupName}},
+    {method::localGroupAddUser, "adds a user to a group", {localGroup, member}},
+    {method::localGroupDelUser, "removes a user from a group", {localGroup, member}},
+    {method::getShadowing,
+     "checks whether the shadow file can be read; the answer is not reported",
+     {}},
 };
 
 } // namespace

@@ -1,7 +1,7 @@
 // The kinds of nodes and their properties.
 
+#include "host/Properties.h"
 #include "mihost/cli/catalogue/Rows.h"
-#include "nodes/ids.h"
 
 namespace mihost
 {
@@ -9,123 +9,133 @@ namespace mihost
 namespace
 {
 
+namespace property = IC::property;
+namespace nodeType = IC::nodeType;
+
 using namespace rows;
 
 PropertyRow const requestedState =
-    enumeration(NODES::requestedState, "requested-state", "fixed: 1");
-PropertyRow const fixedNumbers = numbers(NODES::fixedNumbers, "fixed-numbers", "fixed: 0, 1, 24");
+    enumeration(property::requestedState, "requested-state", "fixed: 1");
+PropertyRow const fixedNumbers =
+    numbers(property::fixedNumbers, "fixed-numbers", "fixed: 0, 1, 24");
 
 std::vector<Property> const computerProperties = {
-    text(NODES::name, "computer-name", "the machine's network node name"),
+    text(property::name, "computer-name", "the machine's network node name"),
 };
 
 std::vector<Property> const osProperties = {
-    enumeration(NODES::fixedEnumeration, "fixed-enumeration", "fixed: 35"),
-    enumeration(NODES::requestedState, "requested-state",
+    enumeration(property::fixedEnumeration, "fixed-enumeration", "fixed: 35"),
+    enumeration(property::requestedState, "requested-state",
                 "starts as 1; writing 9 restarts the machine, 12 halts it")
         .acts(),
     fixedNumbers,
-    text(NODES::name, "os-name", "first line of the distribution's release file, else Linux"),
-    text(NODES::version, "os-version",
+    text(property::name, "os-name", "first line of the distribution's release file, else Linux"),
+    text(property::version, "os-version",
          "the distribution's version; unset where no release file is known"),
-    text(NODES::createUser, "create-user",
+    text(property::createUser, "create-user",
          "writing a method-call text carries out an administration method; empty after a failure")
         .acts()
         .mayBeSecret()
         .takes(Form::MethodCall),
-    number(NODES::refresh, "refresh", "writing 0 builds the user and group nodes again").acts(),
-    boolean(NODES::distributed, "distributed", "fixed: false"),
-    number(NODES::processMaxNumber, "process-max-number", "fixed: 32000").in("processes"),
-    number(NODES::processMaxMemory, "process-max-memory", "fixed: 0"),
-    number(NODES::userCount, "user-count", "ordinary accounts and those with UID 0, at the start")
+    number(property::refresh, "refresh", "writing 0 builds the user and group nodes again").acts(),
+    boolean(property::distributed, "distributed", "fixed: false"),
+    number(property::processMaxNumber, "process-max-number", "fixed: 32000").in("processes"),
+    number(property::processMaxMemory, "process-max-memory", "fixed: 0"),
+    number(property::userCount, "user-count",
+           "ordinary accounts and those with UID 0, at the start")
         .in("accounts"),
-    number(NODES::licensedUserCount, "licensed-user-count", "fixed: 0").in("accounts"),
-    number(NODES::virtualMemorySize, "virtual-memory-size", "fixed: 0"),
-    number(NODES::virtualMemoryFree, "virtual-memory-free", "fixed: 0"),
-    text(NODES::languageEdition, "language-edition", "language tag of the locale, such as en-US"),
-    text(NODES::codeSet, "code-set", "code set of the locale, such as UTF-8"),
-    number(NODES::processCount, "process-count", "processes at this moment").in("processes").live(),
-    number(NODES::physicalMemoryFree, "physical-memory-free", "free RAM").in("KiB").live(),
-    number(NODES::physicalMemorySize, "physical-memory-size", "RAM").in("KiB").live(),
-    number(NODES::swapFileSize, "swap-size", "swap space, not scaled; cut to 32 bits")
+    number(property::licensedUserCount, "licensed-user-count", "fixed: 0").in("accounts"),
+    number(property::virtualMemorySize, "virtual-memory-size", "fixed: 0"),
+    number(property::virtualMemoryFree, "virtual-memory-free", "fixed: 0"),
+    text(property::languageEdition, "language-edition",
+         "language tag of the locale, such as en-US"),
+    text(property::codeSet, "code-set", "code set of the locale, such as UTF-8"),
+    number(property::processCount, "process-count", "processes at this moment")
+        .in("processes")
+        .live(),
+    number(property::physicalMemoryFree, "physical-memory-free", "free RAM").in("KiB").live(),
+    number(property::physicalMemorySize, "physical-memory-size", "RAM").in("KiB").live(),
+    number(property::swapFileSize, "swap-size", "swap space, not scaled; cut to 32 bits")
         .in("kernel memory units")
         .live(),
-    number(NODES::swapFileFree, "swap-free", "free swap space, not scaled; cut to 32 bits")
+    number(property::swapFileFree, "swap-free", "free swap space, not scaled; cut to 32 bits")
         .in("kernel memory units")
         .live(),
-    number(NODES::swapFileSizeStored, "swap-used", "swap space in use, not scaled; cut to 32 bits")
+    number(property::swapFileSizeStored, "swap-used",
+           "swap space in use, not scaled; cut to 32 bits")
         .in("kernel memory units")
         .live(),
-    date(NODES::lastBootTime, "last-boot-time", "when the machine was started"),
-    date(NODES::installDate, "install-date",
+    date(property::lastBootTime, "last-boot-time", "when the machine was started"),
+    date(property::installDate, "install-date",
          "last status change of the release file; the epoch where there is none"),
-    number(NODES::clearLog, "clear-log", "always reads 0; writing 9 empties the system log")
+    number(property::clearLog, "clear-log", "always reads 0; writing 9 empties the system log")
         .live()
         .unstored()
         .acts(),
 };
 
 std::vector<Property> const driverProperties = {
-    text(NODES::version, "driver-version", "the module's version; empty where it states none"),
-    text(NODES::name, "driver-name", "the module's name"),
-    text(NODES::buildNumber, "build-number", "always empty"),
-    text(NODES::manufacturer, "manufacturer", "always empty"),
+    text(property::version, "driver-version", "the module's version; empty where it states none"),
+    text(property::name, "driver-name", "the module's name"),
+    text(property::buildNumber, "build-number", "always empty"),
+    text(property::manufacturer, "manufacturer", "always empty"),
 };
 
 std::vector<Property> const userProperties = {
     requestedState,
     fixedNumbers,
-    text(NODES::name, "user-name", "login name; account commands take it from here")
+    text(property::name, "user-name", "login name; account commands take it from here")
         .takes(Form::AccountName),
-    number(NODES::nameLength, "user-name-length", "length of the login name").in("bytes"),
-    text(NODES::id, "user-id", "UID in decimal; a delete takes it from here").takes(Form::Digits),
-    number(NODES::idLength, "user-id-length", "length of the UID's text").in("bytes"),
-    text(NODES::groupId, "group-id", "GID of the primary group in decimal").takes(Form::Digits),
-    text(NODES::fullName, "full-name", "the account's comment field"),
-    text(NODES::homeDir, "home-directory", "home directory"),
-    text(NODES::scriptPath, "login-shell", "login shell"),
-    text(NODES::password, "password", "password hash; writing a hash sets it")
+    number(property::nameLength, "user-name-length", "length of the login name").in("bytes"),
+    text(property::id, "user-id", "UID in decimal; a delete takes it from here")
+        .takes(Form::Digits),
+    number(property::idLength, "user-id-length", "length of the UID's text").in("bytes"),
+    text(property::groupId, "group-id", "GID of the primary group in decimal").takes(Form::Digits),
+    text(property::fullName, "full-name", "the account's comment field"),
+    text(property::homeDir, "home-directory", "home directory"),
+    text(property::scriptPath, "login-shell", "login shell"),
+    text(property::password, "password", "password hash; writing a hash sets it")
         .acts()
         .secret()
         .takes(Form::Hash),
-    number(NODES::passwordLength, "password-length", "length of the password hash").in("bytes"),
-    number(NODES::pwdMaxDays, "password-max-days",
+    number(property::passwordLength, "password-length", "length of the password hash").in("bytes"),
+    number(property::pwdMaxDays, "password-max-days",
            "how long a password stays valid; 99999 means for ever")
         .in("days"),
-    number(NODES::pwdWarnDays, "password-warn-days", "warning before a password expires")
+    number(property::pwdWarnDays, "password-warn-days", "warning before a password expires")
         .in("days"),
-    number(NODES::pwdMinDays, "password-min-days", "wait before a password may be changed")
+    number(property::pwdMinDays, "password-min-days", "wait before a password may be changed")
         .in("days"),
-    number(NODES::pwdExpDays, "password-expiry-days",
+    number(property::pwdExpDays, "password-expiry-days",
            "from a password's expiry until the account goes inactive; 99999 means never")
         .in("days"),
-    date(NODES::inactiveTime, "inactive-time",
+    date(property::inactiveTime, "inactive-time",
          "account expiry, 2038-01-19 for never; writing a day makes the account inactive from then "
          "on")
         .acts(),
-    number(NODES::passwordHistoryDepth, "password-history-depth", "fixed: 0"),
-    text(NODES::reservedText, "reserved-text", "fixed: empty"),
-    date(NODES::passwordExpiration, "password-expiration",
+    number(property::passwordHistoryDepth, "password-history-depth", "fixed: 0"),
+    text(property::reservedText, "reserved-text", "fixed: empty"),
+    date(property::passwordExpiration, "password-expiration",
          "account expiry, as inactive-time; writing a day lets the password expire then")
         .acts(),
-    date(NODES::lastPwdChange, "last-password-change", "when the password was last changed"),
-    number(NODES::maxLoginFailures, "max-login-failures",
+    date(property::lastPwdChange, "last-password-change", "when the password was last changed"),
+    number(property::maxLoginFailures, "max-login-failures",
            "the deny= of /etc/pam.d/login, 0 for none"),
-    boolean(NODES::deleteUser, "delete",
+    boolean(property::deleteUser, "delete",
             "reads false; writing true deletes the account that is named like this UID, home "
             "directory included")
         .acts(),
-    number(NODES::elementCount, "user-count", "reported accounts at this moment")
+    number(property::elementCount, "user-count", "reported accounts at this moment")
         .in("accounts")
         .live(),
 };
 
 std::vector<Property> const groupProperties = {
-    text(NODES::name, "group-name", "the group's name"),
-    number(NODES::id, "group-id", "GID"),
-    texts(NODES::members, "members",
+    text(property::name, "group-name", "the group's name"),
+    number(property::id, "group-id", "GID"),
+    texts(property::members, "members",
           "login names: those whose primary group it is, then those it lists"),
-    number(NODES::elementCount, "group-count", "reported groups at this moment")
+    number(property::elementCount, "group-count", "reported groups at this moment")
         .in("groups")
         .live(),
 };
@@ -133,46 +143,46 @@ std::vector<Property> const groupProperties = {
 std::vector<Property> const logProperties = {
     requestedState,
     fixedNumbers,
-    number(NODES::logNumber, "log-number", "fixed: 0"),
-    text(NODES::name, "log-name", "fixed: OS Log"),
-    enumeration(NODES::logState, "log-state", "fixed: 2"),
-    text(NODES::dataType, "data-type", "fixed: *string LogData*"),
+    number(property::logNumber, "log-number", "fixed: 0"),
+    text(property::name, "log-name", "fixed: OS Log"),
+    enumeration(property::logState, "log-state", "fixed: 2"),
+    text(property::dataType, "data-type", "fixed: *string LogData*"),
 };
 
 std::vector<Property> const logEntryProperties = {
-    number(NODES::id, "index", "position counted from the newest line, which is 1").live(),
-    text(NODES::message, "message", "the line without its time stamp, between asterisks").live(),
-    date(NODES::creationTime, "time", "the line's time stamp, read as local time").live(),
+    number(property::id, "index", "position counted from the newest line, which is 1").live(),
+    text(property::message, "message", "the line without its time stamp, between asterisks").live(),
+    date(property::creationTime, "time", "the line's time stamp, read as local time").live(),
 };
 
 std::vector<NodeKind> const kinds = {
-    one(NODES::osSwType, "mi", "the management interface itself"),
-    one(NODES::rootType, "root", "root of the machine's tree"),
-    one(NODES::computerType, "computer", "the machine")
-        .showing(NODES::name)
+    one(nodeType::osSw, "mi", "the management interface itself"),
+    one(nodeType::root, "root", "root of the machine's tree"),
+    one(nodeType::computer, "computer", "the machine")
+        .showing(property::name)
         .having(computerProperties),
-    one(NODES::operatingSystemType, "os", "the operating system: facts, commands and methods")
-        .showing(NODES::name)
+    one(nodeType::operatingSystem, "os", "the operating system: facts, commands and methods")
+        .showing(property::name)
         .having(osProperties),
-    several(NODES::driverType, "driver", NODES::name, "a loaded kernel module")
-        .showing(NODES::version)
+    several(nodeType::driver, "driver", property::name, "a loaded kernel module")
+        .showing(property::version)
         .listedAs("drivers", {"driver-name", "driver-version", "description"})
         .having(driverProperties),
-    several(NODES::userType, "user", NODES::name,
+    several(nodeType::user, "user", property::name,
             "a local user account: ordinary ones and those with UID 0")
-        .showing(NODES::fullName)
+        .showing(property::fullName)
         .listedAs("users", {"user-name", "user-id", "group-id", "full-name", "home-directory",
                             "login-shell"})
         .having(userProperties),
-    several(NODES::groupType, "group", NODES::name, "a local group: ordinary ones and GID 0")
-        .showing(NODES::members)
+    several(nodeType::group, "group", property::name, "a local group: ordinary ones and GID 0")
+        .showing(property::members)
         .listedAs("groups", {"group-name", "group-id", "members"})
         .having(groupProperties),
-    one(NODES::logType, "log", "the system log, /var/log/messages").having(logProperties),
-    several(NODES::logEntryType, "log-entry", NODES::id,
+    one(nodeType::log, "log", "the system log, /var/log/messages").having(logProperties),
+    several(nodeType::logEntry, "log-entry", property::id,
             "one of the 50 newest lines of the system log")
         .addressedAs("log")
-        .showing(NODES::message)
+        .showing(property::message)
         .listedAs("log", {"index", "time", "message"})
         .having(logEntryProperties),
 };

@@ -1,6 +1,7 @@
 #ifndef MIHOST_CLI_CATALOGUE_ROWS_H
 #define MIHOST_CLI_CATALOGUE_ROWS_H
 
+#include "host/Methods.h"
 #include "mihost/cli/catalogue/Catalogue.h"
 
 #include <utility>
@@ -139,11 +140,11 @@ constexpr char const* typeOf(Form form)
 {
     switch (form) {
     case Form::Digits:
-        return "CMPI_uint32";
+        return IC::parameterType::number;
     case Form::Day:
-        return "CMPI_dateTime";
+        return IC::parameterType::date;
     default:
-        return "CMPI_string";
+        return IC::parameterType::text;
     }
 }
 

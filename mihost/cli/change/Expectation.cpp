@@ -1,5 +1,6 @@
 #include "mihost/cli/change/Expectation.h"
 
+#include "host/Methods.h"
 #include "mihost/cli/accounts/AccountFiles.h"
 #include "mihost/cli/change/PasswordHash.h"
 #include "mihost/cli/input/Day.h"
@@ -34,10 +35,10 @@ struct RecordEffect {
 };
 
 constexpr RecordEffect recordEffects[] = {
-    {"UserAdd", "UserName", accountFile, "account", present},
-    {"UserDel", "UserName", accountFile, "account", absent},
-    {"LocalGroupAdd", "GroupName", groupFile, "group", present},
-    {"LocalGroupDel", "GroupName", groupFile, "group", absent},
+    {IC::method::userAdd, IC::parameter::userName, accountFile, "account", present},
+    {IC::method::userDel, IC::parameter::userName, accountFile, "account", absent},
+    {IC::method::localGroupAdd, IC::parameter::groupName, groupFile, "group", present},
+    {IC::method::localGroupDel, IC::parameter::groupName, groupFile, "group", absent},
 };
 
 /** A membership that a method makes or ends. */
@@ -47,8 +48,8 @@ struct MembershipEffect {
 };
 
 constexpr MembershipEffect membershipEffects[] = {
-    {"LocalGroupAddUser", present},
-    {"LocalGroupDelUser", absent},
+    {IC::method::localGroupAddUser, present},
+    {IC::method::localGroupDelUser, absent},
 };
 
 /** The field that a parameter sets, in whatever method. */
@@ -60,16 +61,18 @@ struct FieldEffect {
 };
 
 constexpr FieldEffect fieldEffects[] = {
-    {"Comment", accountFile, accountField::Comment, "full name"},
-    {"FullName", accountFile, accountField::Comment, "full name"},
-    {"HomeDir", accountFile, accountField::Home, "home directory"},
-    {"ScriptPath", accountFile, accountField::Shell, "login shell"},
-    {"Password", shadowFile, shadowField::Password, "password"},
-    {"daysMustKeepPassword", shadowFile, shadowField::MinDays, "minimum password age"},
-    {"daysMustChangePasswordAfter", shadowFile, shadowField::MaxDays, "maximum password age"},
-    {"daysWarnBeforePasswordExpire", shadowFile, shadowField::WarnDays, "password warning"},
-    {"daysExpireAfter", shadowFile, shadowField::Inactive, "inactivity time"},
-    {"passwordExpirationDate", shadowFile, shadowField::Expiry, "account expiry"},
+    {IC::parameter::comment, accountFile, accountField::Comment, "full name"},
+    {IC::parameter::fullName, accountFile, accountField::Comment, "full name"},
+    {IC::parameter::homeDir, accountFile, accountField::Home, "home directory"},
+    {IC::parameter::scriptPath, accountFile, accountField::Shell, "login shell"},
+    {IC::parameter::password, shadowFile, shadowField::Password, "password"},
+    {IC::parameter::daysMustKeepPassword, shadowFile, shadowField::MinDays, "minimum password age"},
+    {IC::parameter::daysMustChangePasswordAfter, shadowFile, shadowField::MaxDays,
+     "maximum password age"},
+    {IC::parameter::daysWarnBeforePasswordExpire, shadowFile, shadowField::WarnDays,
+     "password warning"},
+    {IC::parameter::daysExpireAfter, shadowFile, shadowField::Inactive, "inactivity time"},
+    {IC::parameter::passwordExpirationDate, shadowFile, shadowField::Expiry, "account expiry"},
 };
 
 std::string subjectOf(char const* noun, std::string const& name)
@@ -217,15 +220,15 @@ std::vector<Expectation> expectationsOf(MethodCall const& call)
             all.push_back(recordExpectation(effect, valueOf(call, effect.nameParameter)));
     for (MembershipEffect const& effect : membershipEffects)
         if (method == effect.method) {
-            std::string const user = valueOf(call, "DomainAndMember");
-            std::string const group = valueOf(call, "LocalGroupName");
+            std::string const user = valueOf(call, IC::parameter::domainAndMember);
+            std::string const group = valueOf(call, IC::parameter::localGroupName);
             all.push_back({fmt::format("membership of {} in {}", user, group), effect.wanted,
                            [user, group] { return membership(user, group); }});
         }
     for (MethodCall::Argument const& argument : call.arguments)
         for (FieldEffect const& effect : fieldEffects)
             if (std::string_view(argument.parameter->name) == effect.parameter)
-                all.push_back(fieldExpectation(effect, valueOf(call, "UserName"),
+                all.push_back(fieldExpectation(effect, valueOf(call, IC::parameter::userName),
                                                argument.parameter->form, argument.value));
     return all;
 }

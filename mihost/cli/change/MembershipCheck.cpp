@@ -1,5 +1,6 @@
 #include "mihost/cli/change/MembershipCheck.h"
 
+#include "host/Methods.h"
 #include "mihost/cli/input/Decimal.h"
 #include "mihost/cli/input/InputValidation.h"
 #include "mihost/cli/plugin/CommandTap.h"
@@ -106,7 +107,7 @@ std::optional<unsigned int> groupOfMachine(std::string const& name)
 bool isMembershipChange(MethodCall const& call)
 {
     std::string_view const name = call.method->name;
-    return name == "LocalGroupAddUser" || name == "LocalGroupDelUser";
+    return name == IC::method::localGroupAddUser || name == IC::method::localGroupDelUser;
 }
 
 } // namespace
@@ -154,7 +155,7 @@ void checkMembership(MethodCall const& call)
 {
     if (!isMembershipChange(call))
         return;
-    std::string const member = valueOf(call, "DomainAndMember");
+    std::string const member = valueOf(call, IC::parameter::domainAndMember);
     std::string const said =
         commandTap::outputOf(fmt::format("LC_ALL=C /usr/bin/id \"{}\" 2>&1", member));
     // The plug-in goes no further then.

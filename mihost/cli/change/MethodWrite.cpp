@@ -1,11 +1,12 @@
 #include "mihost/cli/change/MethodWrite.h"
 
+#include "host/Methods.h"
+#include "host/Properties.h"
 #include "mihost/cli/accounts/AccountFiles.h"
 #include "mihost/cli/change/PasswordHash.h"
 #include "mihost/cli/input/Day.h"
 #include "mihost/cli/input/Decimal.h"
 #include "mihost/cli/system/Failure.h"
-#include "nodes/ids.h"
 
 #include <fmt/format.h>
 
@@ -14,8 +15,6 @@ namespace mihost
 
 namespace
 {
-
-constexpr char expiryParameter[] = "passwordExpirationDate";
 
 /** @param secrets  gets every form that the password takes */
 void makePasswordSafe(MethodCall& call, std::vector<std::string>& secrets)
@@ -43,8 +42,8 @@ std::string expiryField(std::string const& user)
 
 bool mayEraseExpiry(MethodCall const& call)
 {
-    return std::string_view(call.method->name) == "UserSetAttrib" &&
-           valueOf(call, expiryParameter).empty();
+    return std::string_view(call.method->name) == IC::method::userSetAttrib &&
+           valueOf(call, IC::parameter::passwordExpirationDate).empty();
 }
 
 /** Contract: UserSetAttrib without an expiry date runs chage -E -1. */
@@ -52,7 +51,7 @@ void treatExpiry(MethodCall& call, Expiry expiry, std::vector<std::string>& warn
 {
     if (!mayEraseExpiry(call) || expiry == Expiry::Erase)
         return;
-    std::string const field = expiryField(valueOf(call, "UserName"));
+    std::string const field = expiryField(valueOf(call, IC::parameter::userName));
     if (field.empty())
         return;
     auto const number = parseDecimal(field);
@@ -71,7 +70,8 @@ void treatExpiry(MethodCall& call, Expiry expiry, std::vector<std::string>& warn
                           : fmt::format("UserSetAttrib erases the account's expiry, and {} "
                                         "cannot be passed along (add --yes to erase it)",
                                         text));
-    Parameter const* const parameter = findParameter(*call.method, expiryParameter);
+    Parameter const* const parameter =
+        findParameter(*call.method, IC::parameter::passwordExpirationDate);
     call.arguments.push_back({parameter, dateTimeText(*day)});
     if (expiry == Expiry::KeepAloud)
         warnings.push_back(fmt::format("UserSetAttrib would erase the account's expiry {}, so it "
@@ -87,12 +87,12 @@ Write methodWrite(IC::MutableNode& os, MethodCall call, Expiry expiry)
     treatExpiry(call, expiry, warnings);
     std::vector<Expectation> expectations = expectationsOf(call);
     if (mayEraseExpiry(call) && expiry == Expiry::Erase)
-        expectations.push_back(noAccountExpiry(valueOf(call, "UserName")));
+        expectations.push_back(noAccountExpiry(valueOf(call, IC::parameter::userName)));
     std::vector<std::string> secrets;
     makePasswordSafe(call, secrets);
     return {fmt::format("call {}", call.method->name),
             os,
-            NODES::createUser,
+            IC::property::createUser,
             IC::PropertyValue(textOf(call), true),
             true,
             expectations,

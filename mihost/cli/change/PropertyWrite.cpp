@@ -1,8 +1,8 @@
 #include "mihost/cli/change/PropertyWrite.h"
 
+#include "host/Properties.h"
 #include "mihost/cli/accounts/LocalNames.h"
 #include "mihost/cli/input/Address.h"
-#include "nodes/ids.h"
 
 #include <fmt/format.h>
 #include <optional>
@@ -28,7 +28,7 @@ struct Act {
 
 std::string userOf(IC::MutableNode const& node)
 {
-    return storedText(node, NODES::name);
+    return storedText(node, IC::property::name);
 }
 
 /** The plug-in reads the day of a date and drops the time. */
@@ -62,8 +62,8 @@ std::vector<Expectation> noExpectations(Session&, IC::MutableNode const&, IC::Pr
 std::vector<Expectation> completeLists(Session& session, IC::MutableNode const&,
                                        IC::PropertyValue const&)
 {
-    return {completeList(session, *findKind(NODES::userType)),
-            completeList(session, *findKind(NODES::groupType))};
+    return {completeList(session, *findKind(IC::nodeType::user)),
+            completeList(session, *findKind(IC::nodeType::group))};
 }
 
 std::vector<Expectation> emptyLog(Session&, IC::MutableNode const&, IC::PropertyValue const&)
@@ -104,14 +104,14 @@ constexpr char expirationWarning[] =
 
 // clang-format off
 constexpr Act acts[] = {
-    {NODES::operatingSystemType, NODES::requestedState, 9, true, shutdownTool, noExpectations, ""},
-    {NODES::operatingSystemType, NODES::requestedState, 12, true, shutdownTool, noExpectations, ""},
-    {NODES::operatingSystemType, NODES::refresh, 0, false, "", completeLists, ""},
-    {NODES::operatingSystemType, NODES::clearLog, 9, true, "", emptyLog, ""},
-    {NODES::userType, NODES::password, std::nullopt, true, "", hash, ""},
-    {NODES::userType, NODES::inactiveTime, std::nullopt, true, "", inactivity, inactivityWarning},
-    {NODES::userType, NODES::passwordExpiration, std::nullopt, true, "", expiry, expirationWarning},
-    {NODES::userType, NODES::deleteUser, 1, true, "", deletion, ""},
+    {IC::nodeType::operatingSystem, IC::property::requestedState, IC::command::restart, true, shutdownTool, noExpectations, ""},
+    {IC::nodeType::operatingSystem, IC::property::requestedState, IC::command::halt, true, shutdownTool, noExpectations, ""},
+    {IC::nodeType::operatingSystem, IC::property::refresh, IC::command::rebuild, false, "", completeLists, ""},
+    {IC::nodeType::operatingSystem, IC::property::clearLog, IC::command::emptyLog, true, "", emptyLog, ""},
+    {IC::nodeType::user, IC::property::password, std::nullopt, true, "", hash, ""},
+    {IC::nodeType::user, IC::property::inactiveTime, std::nullopt, true, "", inactivity, inactivityWarning},
+    {IC::nodeType::user, IC::property::passwordExpiration, std::nullopt, true, "", expiry, expirationWarning},
+    {IC::nodeType::user, IC::property::deleteUser, IC::command::deleteAccount, true, "", deletion, ""},
 };
 
 /** What to use in place of a write that stays in the tree. */
@@ -122,20 +122,20 @@ struct Instead {
 };
 
 constexpr Instead instead[] = {
-    {NODES::userType, NODES::name, "usermod -l"},
-    {NODES::userType, NODES::id, "usermod -u"},
-    {NODES::userType, NODES::groupId, "usermod -g"},
-    {NODES::userType, NODES::fullName, "mihost user set-name"},
-    {NODES::userType, NODES::homeDir, "mihost user set-home"},
-    {NODES::userType, NODES::scriptPath, "mihost user set-shell"},
-    {NODES::userType, NODES::pwdMaxDays, "mihost user age"},
-    {NODES::userType, NODES::pwdWarnDays, "mihost user age"},
-    {NODES::userType, NODES::pwdMinDays, "mihost user age"},
-    {NODES::userType, NODES::pwdExpDays, "mihost user age"},
-    {NODES::userType, NODES::lastPwdChange, "chage -d"},
-    {NODES::groupType, NODES::name, "groupmod -n"},
-    {NODES::groupType, NODES::id, "groupmod -g"},
-    {NODES::groupType, NODES::members, "mihost group add-member"},
+    {IC::nodeType::user, IC::property::name, "usermod -l"},
+    {IC::nodeType::user, IC::property::id, "usermod -u"},
+    {IC::nodeType::user, IC::property::groupId, "usermod -g"},
+    {IC::nodeType::user, IC::property::fullName, "mihost user set-name"},
+    {IC::nodeType::user, IC::property::homeDir, "mihost user set-home"},
+    {IC::nodeType::user, IC::property::scriptPath, "mihost user set-shell"},
+    {IC::nodeType::user, IC::property::pwdMaxDays, "mihost user age"},
+    {IC::nodeType::user, IC::property::pwdWarnDays, "mihost user age"},
+    {IC::nodeType::user, IC::property::pwdMinDays, "mihost user age"},
+    {IC::nodeType::user, IC::property::pwdExpDays, "mihost user age"},
+    {IC::nodeType::user, IC::property::lastPwdChange, "chage -d"},
+    {IC::nodeType::group, IC::property::name, "groupmod -n"},
+    {IC::nodeType::group, IC::property::id, "groupmod -g"},
+    {IC::nodeType::group, IC::property::members, "mihost group add-member"},
 };
 // clang-format on
 
@@ -197,7 +197,7 @@ Write propertyWrite(Session& session, IC::MutableNode& node, Property const& pro
 Write osWrite(Session& session, IC::MutableNode& os, std::string const& what, unsigned int property,
               IC::PropertyValue const& value)
 {
-    Property const& row = *findProperty(*findKind(NODES::operatingSystemType), property);
+    Property const& row = *findProperty(*findKind(IC::nodeType::operatingSystem), property);
     Write write = propertyWrite(session, os, row, value);
     write.what = what;
     return write;

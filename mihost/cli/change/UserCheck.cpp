@@ -1,10 +1,10 @@
 #include "mihost/cli/change/UserCheck.h"
 
+#include "host/Properties.h"
 #include "mihost/cli/input/Address.h"
 #include "mihost/cli/input/InputValidation.h"
 #include "mihost/cli/system/Failure.h"
 #include "mihost/runtime/Text.h"
-#include "nodes/ids.h"
 
 #include <algorithm>
 #include <cstdio>
@@ -86,7 +86,7 @@ std::optional<std::string> objectionToUserWrite(Account const& node, UserWrite w
 
 void checkUserWrite(IC::MutableNode const& node, UserWrite write)
 {
-    Account const account{storedText(node, NODES::name), storedText(node, NODES::id)};
+    Account const account{storedText(node, IC::property::name), storedText(node, IC::property::id)};
     if (auto const reason = objectionToUserWrite(account, write, accountsOfMachine()))
         throw Failure(BadUsage, fmt::format("nothing is run for user:{}: {}",
                                             printable(account.name), *reason));

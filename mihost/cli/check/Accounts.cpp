@@ -1,6 +1,6 @@
 #include "mihost/cli/check/Accounts.h"
 
-#include "nodes/ids.h"
+#include "host/Properties.h"
 
 #include <algorithm>
 #include <iterator>
@@ -10,7 +10,7 @@ namespace mihost::checks
 
 bool isAccount(unsigned int nodeType)
 {
-    return nodeType == NODES::userType || nodeType == NODES::groupType;
+    return nodeType == IC::nodeType::user || nodeType == IC::nodeType::group;
 }
 
 Nodes accountsOf(Nodes const& nodes)
@@ -23,7 +23,7 @@ Nodes accountsOf(Nodes const& nodes)
 
 IC::Error refresh(Subject& subject)
 {
-    return subject.os().setProperty(NODES::refresh, IC::PropertyValue(IC::Number(0U), true));
+    return subject.os().setProperty(IC::property::refresh, IC::PropertyValue(IC::Number(0U), true));
 }
 
 } // namespace mihost::checks

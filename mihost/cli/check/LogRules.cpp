@@ -1,5 +1,6 @@
 #include "mihost/cli/check/LogRules.h"
 
+#include "host/VXLogger.h"
 #include "mihost/cli/check/Subject.h"
 
 #include <algorithm>
@@ -14,7 +15,7 @@ namespace mihost::checks
 namespace
 {
 
-constexpr int levels[] = {3000, 4000, 6000};
+constexpr int levels[] = {VXLog::level::progress, VXLog::level::power, VXLog::level::error};
 
 constexpr std::string_view categories[] = {
     "Veltrix.IC.MI.OsSwMI",           "Veltrix.IC.MI.OsSwMI.MyProcess",

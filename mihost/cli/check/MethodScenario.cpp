@@ -1,10 +1,10 @@
+#include "host/Properties.h"
 #include "mihost/cli/accounts/LoginDefs.h"
 #include "mihost/cli/check/Accounts.h"
 #include "mihost/cli/check/LogRules.h"
 #include "mihost/cli/check/Scenarios.h"
 #include "mihost/cli/check/Subject.h"
 #include "mihost/cli/plugin/CommandTap.h"
-#include "nodes/ids.h"
 
 #include <fmt/format.h>
 #include <grp.h>
@@ -21,13 +21,13 @@ constexpr char groupTool[] = "/usr/sbin/groupadd";
 
 IC::Error call(Subject& subject, std::string const& text)
 {
-    return subject.os().setProperty(NODES::createUser, IC::PropertyValue(text, true));
+    return subject.os().setProperty(IC::property::createUser, IC::PropertyValue(text, true));
 }
 
 std::string methodText(Subject& subject)
 {
     IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
-    subject.os().getProperty(NODES::createUser, value);
+    subject.os().getProperty(IC::property::createUser, value);
     return value.getKind() == IC::PropertyValue::TextKind ? static_cast<std::string>(value)
                                                           : std::string("(not a text)");
 }
@@ -96,8 +96,8 @@ bool isShown(Subject& subject)
 {
     for (IC::MutableNode const* node : subject.nodes()) {
         IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
-        if (node->getNodeType() == NODES::groupType &&
-            node->getProperty(NODES::name, value).getStatus() == 0 &&
+        if (node->getNodeType() == IC::nodeType::group &&
+            node->getProperty(IC::property::name, value).getStatus() == 0 &&
             static_cast<std::string>(value) == groupName)
             return true;
     }

@@ -1,7 +1,7 @@
 #include "mihost/cli/check/PropertyRules.h"
 
+#include "host/Properties.h"
 #include "mihost/cli/catalogue/Catalogue.h"
-#include "nodes/ids.h"
 
 #include <algorithm>
 #include <fmt/format.h>
@@ -30,14 +30,14 @@ struct Place {
 
 // Unset if the system does not say. So are most of the operating system's; see neverMissing.
 constexpr Place mayBeMissing[] = {
-    {NODES::computerType, NODES::name},
-    {NODES::logEntryType, NODES::message},
-    {NODES::logEntryType, NODES::creationTime},
+    {IC::nodeType::computer, IC::property::name},
+    {IC::nodeType::logEntry, IC::property::message},
+    {IC::nodeType::logEntry, IC::property::creationTime},
 };
 
 constexpr unsigned int neverMissing[] = {
-    NODES::fixedEnumeration, NODES::requestedState, NODES::fixedNumbers,
-    NODES::createUser,       NODES::refresh,
+    IC::property::fixedEnumeration, IC::property::requestedState, IC::property::fixedNumbers,
+    IC::property::createUser,       IC::property::refresh,
 };
 
 struct FixedValue {
@@ -48,23 +48,23 @@ struct FixedValue {
 constexpr char fixedNumbers[] = "0,1,24";
 
 constexpr FixedValue fixedValues[] = {
-    {{NODES::operatingSystemType, NODES::fixedEnumeration}, "35"},
-    {{NODES::operatingSystemType, NODES::requestedState}, "1"},
-    {{NODES::operatingSystemType, NODES::fixedNumbers}, fixedNumbers},
-    {{NODES::operatingSystemType, NODES::createUser}, "dummy"},
-    {{NODES::operatingSystemType, NODES::refresh}, "1"},
-    {{NODES::driverType, NODES::buildNumber}, ""},
-    {{NODES::driverType, NODES::manufacturer}, ""},
-    {{NODES::userType, NODES::requestedState}, "1"},
-    {{NODES::userType, NODES::fixedNumbers}, fixedNumbers},
-    {{NODES::userType, NODES::reservedText}, ""},
-    {{NODES::userType, NODES::deleteUser}, "false"},
-    {{NODES::logType, NODES::requestedState}, "1"},
-    {{NODES::logType, NODES::fixedNumbers}, fixedNumbers},
-    {{NODES::logType, NODES::logNumber}, "0"},
-    {{NODES::logType, NODES::name}, "OS Log"},
-    {{NODES::logType, NODES::logState}, "2"},
-    {{NODES::logType, NODES::dataType}, "*string LogData*"},
+    {{IC::nodeType::operatingSystem, IC::property::fixedEnumeration}, "35"},
+    {{IC::nodeType::operatingSystem, IC::property::requestedState}, "1"},
+    {{IC::nodeType::operatingSystem, IC::property::fixedNumbers}, fixedNumbers},
+    {{IC::nodeType::operatingSystem, IC::property::createUser}, "dummy"},
+    {{IC::nodeType::operatingSystem, IC::property::refresh}, "1"},
+    {{IC::nodeType::driver, IC::property::buildNumber}, ""},
+    {{IC::nodeType::driver, IC::property::manufacturer}, ""},
+    {{IC::nodeType::user, IC::property::requestedState}, "1"},
+    {{IC::nodeType::user, IC::property::fixedNumbers}, fixedNumbers},
+    {{IC::nodeType::user, IC::property::reservedText}, ""},
+    {{IC::nodeType::user, IC::property::deleteUser}, "false"},
+    {{IC::nodeType::log, IC::property::requestedState}, "1"},
+    {{IC::nodeType::log, IC::property::fixedNumbers}, fixedNumbers},
+    {{IC::nodeType::log, IC::property::logNumber}, "0"},
+    {{IC::nodeType::log, IC::property::name}, "OS Log"},
+    {{IC::nodeType::log, IC::property::logState}, "2"},
+    {{IC::nodeType::log, IC::property::dataType}, "*string LogData*"},
 };
 
 struct LengthRule {
@@ -73,16 +73,16 @@ struct LengthRule {
 };
 
 constexpr LengthRule userLengths[] = {
-    {NODES::nameLength, NODES::name},
-    {NODES::idLength, NODES::id},
-    {NODES::passwordLength, NODES::password},
+    {IC::property::nameLength, IC::property::name},
+    {IC::property::idLength, IC::property::id},
+    {IC::property::passwordLength, IC::property::password},
 };
 
 bool isRequired(NodeKind const& kind, Property const& property)
 {
     if (property.has(Property::Unstored))
         return false;
-    if (kind.type == NODES::operatingSystemType)
+    if (kind.type == IC::nodeType::operatingSystem)
         return std::find(std::begin(neverMissing), std::end(neverMissing), property.id) !=
                std::end(neverMissing);
     return std::find(std::begin(mayBeMissing), std::end(mayBeMissing),
@@ -182,7 +182,7 @@ Findings wrongKinds(Nodes const& nodes)
 Findings wrongFlags(Nodes const& nodes)
 {
     // Contract: the one value with a false flag.
-    constexpr Place withoutFlag{NODES::operatingSystemType, NODES::requestedState};
+    constexpr Place withoutFlag{IC::nodeType::operatingSystem, IC::property::requestedState};
     Findings findings;
     forEachValue(nodes, [&](IC::MutableNode const& node, Property const& property,
                             IC::PropertyValue const& value) {
@@ -206,14 +206,14 @@ Findings wrongValues(Nodes const& nodes)
             if (fixed.place.type == type)
                 expectText(findings, *node, fixed.place.property, fixed.text);
         Values const values = node->getProperties();
-        if (type == NODES::userType)
+        if (type == IC::nodeType::user)
             for (LengthRule const& rule : userLengths)
                 expectText(findings, *node, rule.length,
                            std::to_string(textOf(values, rule.of).size()));
-        if (type == NODES::userType || type == NODES::groupType)
-            expectText(findings, *node, NODES::elementCount, std::to_string(counts[type]));
-        if (type == NODES::logEntryType)
-            expectText(findings, *node, NODES::id, std::to_string(node->getIndex()));
+        if (type == IC::nodeType::user || type == IC::nodeType::group)
+            expectText(findings, *node, IC::property::elementCount, std::to_string(counts[type]));
+        if (type == IC::nodeType::logEntry)
+            expectText(findings, *node, IC::property::id, std::to_string(node->getIndex()));
     }
     return findings;
 }

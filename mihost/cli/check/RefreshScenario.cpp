@@ -1,9 +1,9 @@
+#include "host/Properties.h"
 #include "mihost/cli/check/Accounts.h"
 #include "mihost/cli/check/LogRules.h"
 #include "mihost/cli/check/PropertyRules.h"
 #include "mihost/cli/check/Scenarios.h"
 #include "mihost/cli/check/Subject.h"
-#include "nodes/ids.h"
 
 #include <algorithm>
 #include <fmt/format.h>
@@ -49,7 +49,7 @@ Verdict answer(Subject& subject)
         findings.push_back(
             fmt::format("the write was answered: {}", static_cast<std::string>(error)));
     IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
-    subject.os().getProperty(NODES::refresh, value);
+    subject.os().getProperty(IC::property::refresh, value);
     if (static_cast<std::string>(value) != "0")
         findings.push_back(fmt::format("the property then reads '{}' rather than '0'",
                                        static_cast<std::string>(value)));

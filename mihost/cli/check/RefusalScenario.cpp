@@ -1,3 +1,4 @@
+#include "host/VXLogger.h"
 #include "mihost/cli/check/Accounts.h"
 #include "mihost/cli/check/Scenarios.h"
 #include "mihost/cli/check/Subject.h"
@@ -10,12 +11,11 @@ namespace mihost::checks
 namespace
 {
 
-constexpr int errorLevel = 6000;
 constexpr char announcement[] = "addNewNode error = ";
 
 bool isRefusalMessage(LoggedCall const& call)
 {
-    return call.level == errorLevel && call.operation == LogMessage::Operation::Log &&
+    return call.level == VXLog::level::error && call.operation == LogMessage::Operation::Log &&
            call.text.rfind(announcement, 0) == 0;
 }
 
@@ -48,7 +48,7 @@ Verdict messages(Subject& subject)
     std::size_t const refused = subject.events().published().size();
     if (count != refused)
         return {{fmt::format("{} messages at level {} begin with '{}', for {} refused nodes", count,
-                             errorLevel, announcement, refused)}};
+                             VXLog::level::error, announcement, refused)}};
     return {};
 }
 

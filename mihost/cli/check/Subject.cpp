@@ -1,7 +1,7 @@
 #include "mihost/cli/check/Subject.h"
 
+#include "host/Properties.h"
 #include "mihost/cli/input/Address.h"
-#include "nodes/ids.h"
 
 #include <stdexcept>
 #include <utility>
@@ -42,7 +42,7 @@ Nodes Subject::nodes()
 IC::MutableNode& Subject::os()
 {
     for (IC::MutableNode* node : nodes())
-        if (node->getNodeType() == NODES::operatingSystemType)
+        if (node->getNodeType() == IC::nodeType::operatingSystem)
             return *node;
     throw std::runtime_error("there is no operating-system node");
 }

@@ -1,7 +1,7 @@
 #include "mihost/cli/check/TreeRules.h"
 
+#include "host/Properties.h"
 #include "mihost/cli/catalogue/Catalogue.h"
-#include "nodes/ids.h"
 
 #include <fmt/format.h>
 #include <iterator>
@@ -21,15 +21,15 @@ struct KindRule {
 
 // In the order in which the kinds are built.
 constexpr KindRule kindRules[] = {
-    {NODES::osSwType, 0, "OsSw Management Interface"},
-    {NODES::rootType, NODES::osSwType, "ROOT Node"},
-    {NODES::computerType, NODES::rootType, "Computer"},
-    {NODES::operatingSystemType, NODES::computerType, "Operating System"},
-    {NODES::driverType, NODES::operatingSystemType, nullptr},
-    {NODES::userType, NODES::operatingSystemType, "User Account"},
-    {NODES::groupType, NODES::operatingSystemType, "Group"},
-    {NODES::logType, NODES::operatingSystemType, "OS Log"},
-    {NODES::logEntryType, NODES::logType, "OS LogEntry"},
+    {IC::nodeType::osSw, 0, "OsSw Management Interface"},
+    {IC::nodeType::root, IC::nodeType::osSw, "ROOT Node"},
+    {IC::nodeType::computer, IC::nodeType::root, "Computer"},
+    {IC::nodeType::operatingSystem, IC::nodeType::computer, "Operating System"},
+    {IC::nodeType::driver, IC::nodeType::operatingSystem, nullptr},
+    {IC::nodeType::user, IC::nodeType::operatingSystem, "User Account"},
+    {IC::nodeType::group, IC::nodeType::operatingSystem, "Group"},
+    {IC::nodeType::log, IC::nodeType::operatingSystem, "OS Log"},
+    {IC::nodeType::logEntry, IC::nodeType::log, "OS LogEntry"},
 };
 
 KindRule const* ruleFor(IC::MutableNode const& node)
@@ -134,7 +134,7 @@ Findings wrongStatuses(Nodes const& nodes)
 {
     return wrongNumbers(
         nodes, "status", [](IC::MutableNode const& node) { return node.getStatus(); },
-        [](IC::MutableNode const&) { return NODES::statusOk; });
+        [](IC::MutableNode const&) { return IC::statusOk; });
 }
 
 Findings wrongDescriptions(Nodes const& nodes)

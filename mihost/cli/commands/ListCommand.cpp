@@ -1,9 +1,9 @@
+#include "host/Properties.h"
 #include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/commands/LogOptions.h"
 #include "mihost/cli/output/NodeTable.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/Stderr.h"
-#include "nodes/ids.h"
 
 #include <algorithm>
 #include <fmt/format.h>
@@ -39,7 +39,7 @@ public:
     void run(Session& session) override
     {
         NodeKind const& kind = *findList(kind_);
-        bool const isLog = kind.type == NODES::logEntryType;
+        bool const isLog = kind.type == IC::nodeType::logEntry;
         if (std::string const option = logOptions_.firstGiven(); !isLog && !option.empty())
             throw Failure(BadUsage, fmt::format("list {}: {} is an option of 'mihost list log'",
                                                 kind_, option));

@@ -1,12 +1,12 @@
 #include "mihost/cli/commands/LogOptions.h"
 
+#include "host/Properties.h"
 #include "mihost/cli/commands/Repetition.h"
 #include "mihost/cli/input/Day.h"
 #include "mihost/cli/input/Moment.h"
 #include "mihost/cli/log/LogFile.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/runtime/Text.h"
-#include "nodes/ids.h"
 
 #include <algorithm>
 #include <ctime>
@@ -40,9 +40,9 @@ LogLine lineOf(IC::MutableNode const& entry)
 {
     auto const stored = entry.getProperties();
     LogLine line;
-    if (auto const time = stored.find(NODES::creationTime); time != stored.end())
+    if (auto const time = stored.find(IC::property::creationTime); time != stored.end())
         line.time = static_cast<long>(time->second.getNumber());
-    if (auto const message = stored.find(NODES::message); message != stored.end())
+    if (auto const message = stored.find(IC::property::message); message != stored.end())
         line.message = withoutAsterisks(static_cast<std::string>(message->second));
     return line;
 }
@@ -118,7 +118,7 @@ std::vector<IC::MutableNode*> LogOptions::chosen(std::vector<IC::MutableNode*> c
 std::string LogOptions::shownText(PropertyView const& property) const
 {
     std::string const text = valueText(property);
-    return property.id == NODES::message ? shownMessage(text) : text;
+    return property.id == IC::property::message ? shownMessage(text) : text;
 }
 
 std::string LogOptions::shownMessage(std::string const& message) const

@@ -1,9 +1,9 @@
 // The operating-system node's command properties, under names of their own.
 
+#include "host/Properties.h"
 #include "mihost/cli/change/Clearance.h"
 #include "mihost/cli/change/PropertyWrite.h"
 #include "mihost/cli/commands/CommandRows.h"
-#include "nodes/ids.h"
 
 #include <fmt/format.h>
 
@@ -39,14 +39,14 @@ public:
 
     void run(Session& session) override
     {
-        carryOut(session,
-                 osWrite(session, session.node("os"), "refresh", NODES::refresh, number(0)));
+        carryOut(session, osWrite(session, session.node("os"), "refresh", IC::property::refresh,
+                                  number(IC::command::rebuild)));
         if (session.options().json)
             return;
         auto const nodes = session.nodes();
         session.out().line(
-            fmt::format("{}, {}", counted(countOf(nodes, NODES::userType), "user", "users"),
-                        counted(countOf(nodes, NODES::groupType), "group", "groups")));
+            fmt::format("{}, {}", counted(countOf(nodes, IC::nodeType::user), "user", "users"),
+                        counted(countOf(nodes, IC::nodeType::group), "group", "groups")));
     }
 };
 
@@ -59,11 +59,12 @@ public:
     {
         IC::MutableNode& os = session.node("os");
         ChangeLock const lock = clearChange(session, "empty the system log");
-        carryOut(session, osWrite(session, os, "clear-log", NODES::clearLog, number(9)));
+        carryOut(session, osWrite(session, os, "clear-log", IC::property::clearLog,
+                                  number(IC::command::emptyLog)));
         if (session.options().json)
             return;
         session.out().line(
-            counted(countOf(session.nodes(), NODES::logEntryType), "log entry", "log entries"));
+            counted(countOf(session.nodes(), IC::nodeType::logEntry), "log entry", "log entries"));
     }
 };
 
@@ -82,10 +83,10 @@ public:
 
     void run(Session& session) override
     {
-        unsigned int const state = action_ == restart ? 9 : 12;
+        unsigned int const state = action_ == restart ? IC::command::restart : IC::command::halt;
         IC::MutableNode& os = session.node("os");
         ChangeLock const lock = clearChange(session, action_ + " the machine");
-        carryOut(session, osWrite(session, os, "power " + action_, NODES::requestedState,
+        carryOut(session, osWrite(session, os, "power " + action_, IC::property::requestedState,
                                   IC::PropertyValue(IC::EnumValue(state), true)));
     }
 

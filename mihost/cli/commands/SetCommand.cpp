@@ -1,3 +1,4 @@
+#include "host/Properties.h"
 #include "mihost/cli/change/Clearance.h"
 #include "mihost/cli/change/MembershipCheck.h"
 #include "mihost/cli/change/MethodWrite.h"
@@ -6,7 +7,6 @@
 #include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/input/ValueText.h"
 #include "mihost/cli/system/Failure.h"
-#include "nodes/ids.h"
 
 #include <fmt/format.h>
 
@@ -25,10 +25,14 @@ struct Danger {
 };
 
 constexpr Danger dangers[] = {
-    {NODES::operatingSystemType, NODES::requestedState, 9, "restart the machine"},
-    {NODES::operatingSystemType, NODES::requestedState, 12, "halt the machine"},
-    {NODES::operatingSystemType, NODES::clearLog, 9, "empty the system log"},
-    {NODES::userType, NODES::deleteUser, 1, "delete the account {} and its home directory"},
+    {IC::nodeType::operatingSystem, IC::property::requestedState, IC::command::restart,
+     "restart the machine"},
+    {IC::nodeType::operatingSystem, IC::property::requestedState, IC::command::halt,
+     "halt the machine"},
+    {IC::nodeType::operatingSystem, IC::property::clearLog, IC::command::emptyLog,
+     "empty the system log"},
+    {IC::nodeType::user, IC::property::deleteUser, IC::command::deleteAccount,
+     "delete the account {} and its home directory"},
 };
 
 /** The call in a value, if it is one that the plug-in carries out rather than only stores. */
@@ -48,14 +52,14 @@ std::string dangerOf(IC::MutableNode const& node, Property const& property,
     for (Danger const& danger : dangers)
         if (danger.nodeType == node.getNodeType() && danger.property == property.id &&
             danger.value == static_cast<unsigned int>(value))
-            return fmt::format(danger.what, storedText(node, NODES::name));
+            return fmt::format(danger.what, storedText(node, IC::property::name));
     return "";
 }
 
 /** Rebuilding nodes reads the machine only. */
 bool changesMachine(Property const& property)
 {
-    return property.has(Property::Acts) && property.id != NODES::refresh;
+    return property.has(Property::Acts) && property.id != IC::property::refresh;
 }
 
 void checkMachine(IC::MutableNode const& node, Property const& property,
@@ -63,8 +67,8 @@ void checkMachine(IC::MutableNode const& node, Property const& property,
 {
     if (auto const call = callIn(property, value))
         checkMembership(*call);
-    bool const deletes = property.id == NODES::deleteUser;
-    if (node.getNodeType() == NODES::userType &&
+    bool const deletes = property.id == IC::property::deleteUser;
+    if (node.getNodeType() == IC::nodeType::user &&
         (!deletes || static_cast<unsigned int>(value) == 1))
         checkUserWrite(node, deletes ? UserWrite::Delete : UserWrite::Change);
 }

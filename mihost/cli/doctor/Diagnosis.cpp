@@ -1,5 +1,6 @@
 #include "mihost/cli/doctor/Diagnosis.h"
 
+#include "host/Properties.h"
 #include "mihost/cli/accounts/AccountFiles.h"
 #include "mihost/cli/accounts/LocalNames.h"
 #include "mihost/cli/accounts/LoginDefs.h"
@@ -10,7 +11,6 @@
 #include "mihost/cli/plugin/CommandTap.h"
 #include "mihost/cli/system/Privilege.h"
 #include "mihost/cli/system/TextFile.h"
-#include "nodes/ids.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -237,7 +237,7 @@ std::vector<Need> accounts()
     if (isThere(accountFile) && isThere(shadowFile))
         needs.push_back(
             {"order of /etc/shadow",
-             problemOfShadow(localNames(*findKind(NODES::userType)), contentOf(shadowFile)),
+             problemOfShadow(localNames(*findKind(IC::nodeType::user)), contentOf(shadowFile)),
              "passwords and ageing of that user and of all after it", "pwconv; pwck -s",
              "pwconv; pwck -s", ""});
     return needs;

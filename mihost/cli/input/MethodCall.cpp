@@ -1,5 +1,6 @@
 #include "mihost/cli/input/MethodCall.h"
 
+#include "host/Methods.h"
 #include "mihost/cli/input/Day.h"
 #include "mihost/cli/input/InputValidation.h"
 #include "mihost/cli/input/Suggestion.h"
@@ -174,8 +175,9 @@ std::string valueOf(MethodCall const& call, std::string_view name)
 
 std::string dangerOf(MethodCall const& call)
 {
-    bool const deletes = std::string_view(call.method->name) == "UserDel";
-    return deletes && valueOf(call, "UserName") == "root" ? "delete the account root" : "";
+    bool const deletes = std::string_view(call.method->name) == IC::method::userDel;
+    return deletes && valueOf(call, IC::parameter::userName) == "root" ? "delete the account root"
+                                                                       : "";
 }
 
 } // namespace mihost

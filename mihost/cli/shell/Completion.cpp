@@ -1,5 +1,6 @@
 #include "mihost/cli/shell/Completion.h"
 
+#include "host/Methods.h"
 #include "mihost/cli/input/Address.h"
 #include "mihost/cli/input/Help.h"
 #include "mihost/cli/input/MethodCall.h"
@@ -180,10 +181,10 @@ struct NamingParameter {
 };
 
 constexpr NamingParameter namingParameters[] = {
-    {"UserName", "user:"},
-    {"DomainAndMember", "user:"},
-    {"GroupName", "group:"},
-    {"LocalGroupName", "group:"},
+    {IC::parameter::userName, "user:"},
+    {IC::parameter::domainAndMember, "user:"},
+    {IC::parameter::groupName, "group:"},
+    {IC::parameter::localGroupName, "group:"},
 };
 
 /** The kind of node that a parameter's value names; null where it names none, or one to come. */

@@ -1,6 +1,6 @@
 // The three nodes at the top of the tree, and what is common to all nodes.
 
-#include "nodes/ids.h"
+#include "host/Properties.h"
 #include "tests/contract/host/Loaded.h"
 
 #include <algorithm>
@@ -75,10 +75,10 @@ TEST_F(FixedNodes, TheComputerStaysWithoutANameWhereUnameFails)
     EXPECT_EQ(eventsOf("createComputerNodes"),
               (Lines{"MutableNode(7, 6, [5], 40, 0)", "setStatus(1)", "setDescription(Computer)",
                      "log: getComputerName: entry", "log: getComputerName: exit"}));
-    IC::MutableNode const& computer = plugin.node(NODES::computerType);
+    IC::MutableNode const& computer = plugin.node(IC::nodeType::computer);
     EXPECT_EQ(computer.getStatus(), 1U);
     EXPECT_EQ(computer.getDescription(), "Computer");
-    EXPECT_FALSE(property(computer, NODES::name));
+    EXPECT_FALSE(property(computer, IC::property::name));
 }
 
 TEST_F(FixedNodes, TheComputersNameIsReadOnceOnly)
@@ -88,24 +88,25 @@ TEST_F(FixedNodes, TheComputersNameIsReadOnceOnly)
         std::string("renamed").copy(system->nodename, sizeof system->nodename - 1);
         return 0;
     };
-    EXPECT_EQ(text(plugin.node(NODES::computerType), NODES::name), "harbour");
+    EXPECT_EQ(text(plugin.node(IC::nodeType::computer), IC::property::name), "harbour");
 }
 
 TEST_F(FixedNodes, NeitherTheInterfacesNodeNorTheRootHasProperties)
 {
     plugin.initialize();
-    EXPECT_TRUE(plugin.node(NODES::osSwType).getProperties().empty());
-    EXPECT_TRUE(plugin.node(NODES::rootType).getProperties().empty());
+    EXPECT_TRUE(plugin.node(IC::nodeType::osSw).getProperties().empty());
+    EXPECT_TRUE(plugin.node(IC::nodeType::root).getProperties().empty());
 }
 
 TEST_F(FixedNodes, ThreeArePlainNodesAndTheFourthIsOfAClassOfItsOwn)
 {
     plugin.initialize();
-    for (unsigned int const type : {NODES::osSwType, NODES::rootType, NODES::computerType}) {
+    for (unsigned int const type :
+         {IC::nodeType::osSw, IC::nodeType::root, IC::nodeType::computer}) {
         IC::MutableNode const& node = plugin.node(type);
         EXPECT_EQ(typeid(node), typeid(IC::MutableNode));
     }
-    IC::MutableNode const& os = plugin.node(NODES::operatingSystemType);
+    IC::MutableNode const& os = plugin.node(IC::nodeType::operatingSystem);
     EXPECT_STREQ(typeid(os).name(), "N2IC6OsNodeE");
 }
 
@@ -140,7 +141,7 @@ TEST_F(FixedNodes, IdsAreCountedInTheOrderInWhichTheKindsAreBuilt)
     for (IC::MutableNode const* node : plugin.nodes()) {
         if (types.empty() || types.back() != node->getNodeType())
             types.push_back(node->getNodeType());
-        if (node->getNodeType() != NODES::osSwType) {
+        if (node->getNodeType() != IC::nodeType::osSw) {
             EXPECT_EQ(node->getNodeId(), next++);
         }
     }
@@ -152,7 +153,7 @@ TEST_F(FixedNodes, TheInterfacesNodeLeavesTheCounterAlone)
 {
     unsigned int counter = 0;
     host.onSetStatus = [this, &counter](IC::MutableNode& node) {
-        if (node.getNodeType() == NODES::osSwType)
+        if (node.getNodeType() == IC::nodeType::osSw)
             counter = Insides::nextNodeId(mi());
     };
     plugin.initialize(5);
@@ -182,13 +183,13 @@ TEST_F(FixedNodes, LikeAllNodesAreCurrentAndListedBeforeTheirStatusIsSet)
         EXPECT_EQ(Insides::currentNode(mi()), &node);
         EXPECT_EQ(Insides::nodes(mi()).back(), &node);
         switch (node.getNodeType()) {
-        case NODES::userType:
+        case IC::nodeType::user:
             EXPECT_EQ(Insides::userNodes(mi()).back(), &node);
             break;
-        case NODES::groupType:
+        case IC::nodeType::group:
             EXPECT_EQ(Insides::groupNodes(mi()).back(), &node);
             break;
-        case NODES::logEntryType:
+        case IC::nodeType::logEntry:
             EXPECT_EQ(Insides::logEntryNodes(mi()).back(), &node);
             break;
         default:
@@ -202,10 +203,10 @@ TEST_F(FixedNodes, LikeAllNodesAreCurrentAndListedBeforeTheirStatusIsSet)
 TEST_F(FixedNodes, AreParentsByTheIdThatTheyAnswerWith)
 {
     plugin.initialize(5);
-    EXPECT_EQ(plugin.node(NODES::osSwType).getLinkedId(), 0U);
-    EXPECT_EQ(plugin.node(NODES::rootType).getLinkedId(), 5U);
-    EXPECT_EQ(plugin.node(NODES::computerType).getLinkedId(), 6U);
-    EXPECT_EQ(plugin.node(NODES::operatingSystemType).getLinkedId(), 7U);
+    EXPECT_EQ(plugin.node(IC::nodeType::osSw).getLinkedId(), 0U);
+    EXPECT_EQ(plugin.node(IC::nodeType::root).getLinkedId(), 5U);
+    EXPECT_EQ(plugin.node(IC::nodeType::computer).getLinkedId(), 6U);
+    EXPECT_EQ(plugin.node(IC::nodeType::operatingSystem).getLinkedId(), 7U);
 }
 
 TEST_F(FixedNodes, CarryTheInterfaceIdsOfTheMomentAtWhichTheyWereMade)
@@ -215,7 +216,7 @@ TEST_F(FixedNodes, CarryTheInterfaceIdsOfTheMomentAtWhichTheyWereMade)
                         {"modinfo exnet", ""},
                         {"wc -l /var/log/messages", "2 /var/log/messages\n"}};
     plugin.initialize(5);
-    ASSERT_EQ(plugin.nodes(NODES::logEntryType).size(), 2U);
+    ASSERT_EQ(plugin.nodes(IC::nodeType::logEntry).size(), 2U);
     Insides::miIds(mi()).push_back(10);
     for (IC::MutableNode const* node : plugin.nodes())
         EXPECT_EQ(node->getMIIds(), (Ids{5, 9})) << node->getDescription();
@@ -224,12 +225,12 @@ TEST_F(FixedNodes, CarryTheInterfaceIdsOfTheMomentAtWhichTheyWereMade)
 TEST_F(FixedNodes, ALaterInterfaceIdShowsInTheNodesMadeAfterIt)
 {
     host.onSetStatus = [this](IC::MutableNode& node) {
-        if (node.getNodeType() == NODES::rootType)
+        if (node.getNodeType() == IC::nodeType::root)
             Insides::miIds(mi()).push_back(9);
     };
     plugin.initialize(5);
-    EXPECT_EQ(plugin.node(NODES::rootType).getMIIds(), Ids{5});
-    EXPECT_EQ(plugin.node(NODES::computerType).getMIIds(), (Ids{5, 9}));
+    EXPECT_EQ(plugin.node(IC::nodeType::root).getMIIds(), Ids{5});
+    EXPECT_EQ(plugin.node(IC::nodeType::computer).getMIIds(), (Ids{5, 9}));
 }
 
 TEST_F(FixedNodes, StandInTheMemberOfTheirKindBeforeTheirStatusIsSet)
@@ -260,14 +261,14 @@ TEST_F(FixedNodes, NoteTheInterfacesOwnIdOnceTheyAreMade)
 TEST_F(FixedNodes, TakeTheCountersValueOfTheMoment)
 {
     host.onSetStatus = [this](IC::MutableNode& node) {
-        if (node.getNodeType() == NODES::osSwType)
+        if (node.getNodeType() == IC::nodeType::osSw)
             Insides::nextNodeId(mi()) = 40;
     };
     plugin.initialize(5);
-    EXPECT_EQ(plugin.node(NODES::rootType).getNodeId(), 40U);
-    EXPECT_EQ(plugin.node(NODES::rootType).getLinkedId(), 5U);
-    EXPECT_EQ(plugin.node(NODES::computerType).getNodeId(), 41U);
-    EXPECT_EQ(plugin.node(NODES::computerType).getLinkedId(), 40U);
+    EXPECT_EQ(plugin.node(IC::nodeType::root).getNodeId(), 40U);
+    EXPECT_EQ(plugin.node(IC::nodeType::root).getLinkedId(), 5U);
+    EXPECT_EQ(plugin.node(IC::nodeType::computer).getNodeId(), 41U);
+    EXPECT_EQ(plugin.node(IC::nodeType::computer).getLinkedId(), 40U);
     EXPECT_EQ(firstIds(4), (Ids{5, 40, 5, 41}));
 }
 

@@ -4,7 +4,7 @@
 #include "tests/contract/host/Loaded.h"
 
 #include "host/OpenMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 
 #include <algorithm>
 #include <ctime>
@@ -75,9 +75,9 @@ TEST_F(Library, DeletesNoNodeWhenItIsClosed)
     RecordingHost& host = freshHost();
     auto plugin = std::make_unique<Plugin>();
     auto& mi = static_cast<IC::OsSwMI&>(plugin->interface());
-    IC::MutableNode user(1, 0, {1}, NODES::userType, 1);
-    IC::MutableNode group(2, 0, {1}, NODES::groupType, 1);
-    IC::MutableNode entry(3, 0, {1}, NODES::logEntryType, 1);
+    IC::MutableNode user(1, 0, {1}, IC::nodeType::user, 1);
+    IC::MutableNode group(2, 0, {1}, IC::nodeType::group, 1);
+    IC::MutableNode entry(3, 0, {1}, IC::nodeType::logEntry, 1);
     Insides::userNodes(mi) = {&user};
     Insides::groupNodes(mi) = {&group};
     Insides::logEntryNodes(mi) = {&entry};
@@ -258,7 +258,7 @@ TEST_F(Lifecycle, TheTreeStandsWhateverTheSettersAnswer)
                         {"modinfo exfs", ""},
                         {"wc -l /var/log/messages", "3 /var/log/messages\n"}};
     plugin.initialize();
-    ASSERT_EQ(plugin.nodes(NODES::driverType).size(), 2U);
+    ASSERT_EQ(plugin.nodes(IC::nodeType::driver).size(), 2U);
     Ids const whole = nodeTypes();
     Lines const said = host.messages();
     plugin.unload();
@@ -313,7 +313,8 @@ TEST_F(Lifecycle, NodesOfTheStartAreNotPublishedOneByOne)
 {
     commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
     plugin.initialize();
-    for (unsigned int const type : {NODES::userType, NODES::groupType, NODES::logEntryType})
+    for (unsigned int const type :
+         {IC::nodeType::user, IC::nodeType::group, IC::nodeType::logEntry})
         EXPECT_FALSE(plugin.nodes(type).empty());
     for (std::string const& event : host.events)
         EXPECT_EQ(event.find("addNewNode"), std::string::npos) << event;
@@ -417,10 +418,10 @@ INSTANTIATE_TEST_SUITE_P(All, LockedBuild, testing::Values("createUserNodes", "c
 
 INSTANTIATE_TEST_SUITE_P(
     All, Rebuilding,
-    testing::Values(Rebuild{"Users", "_ZN2IC6OsSwMI15createUserNodesEb", NODES::userType},
-                    Rebuild{"Groups", "_ZN2IC6OsSwMI16createGroupNodesEb", NODES::groupType},
+    testing::Values(Rebuild{"Users", "_ZN2IC6OsSwMI15createUserNodesEb", IC::nodeType::user},
+                    Rebuild{"Groups", "_ZN2IC6OsSwMI16createGroupNodesEb", IC::nodeType::group},
                     Rebuild{"LogEntries", "_ZN2IC6OsSwMI19createLogEntryNodesEb",
-                            NODES::logEntryType}),
+                            IC::nodeType::logEntry}),
     [](auto const& rebuild) { return std::string(rebuild.param.name); });
 
 TEST_F(Lifecycle, UnloadLetsTheFrameworkGoFirstAndThenFreesTheIdList)
@@ -548,10 +549,10 @@ TEST_F(Lifecycle, TheFlagIsUpWhileAUserNodeIsSetUpAndDownWhileAnyNodeIsMade)
     bool const& flag = object<bool>("_ZN2IC6OSSWMI7MI_callE");
     host.onNode = [&flag] { EXPECT_FALSE(flag); };
     host.onSetStatus = [&flag](IC::MutableNode const& node) {
-        EXPECT_EQ(flag, node.getNodeType() == NODES::userType) << node.getNodeType();
+        EXPECT_EQ(flag, node.getNodeType() == IC::nodeType::user) << node.getNodeType();
     };
     plugin.initialize();
-    EXPECT_GE(plugin.nodes(NODES::userType).size(), 2U);
+    EXPECT_GE(plugin.nodes(IC::nodeType::user).size(), 2U);
 }
 
 TEST_F(Lifecycle, ARebuildHoldsTheLockFromItsBeginningToItsEnd)
@@ -596,14 +597,14 @@ TEST_F(Lifecycle, LeavesTheDriversAloneWhenOtherNodesAreMadeAnew)
                         {"modinfo exnet", ""},
                         {"wc -l /var/log/messages", "1 /var/log/messages\n"}};
     plugin.initialize();
-    auto const drivers = plugin.nodes(NODES::driverType);
+    auto const drivers = plugin.nodes(IC::nodeType::driver);
     ASSERT_EQ(drivers.size(), 1U);
     unsigned int const id = drivers[0]->getNodeId();
     commands.ran.clear();
     host.events.clear();
-    plugin.node(NODES::operatingSystemType).setProperty(75, {IC::Number(0U), true});
+    plugin.node(IC::nodeType::operatingSystem).setProperty(75, {IC::Number(0U), true});
     rebuild("_ZN2IC6OsSwMI19createLogEntryNodesEb");
-    EXPECT_EQ(plugin.nodes(NODES::driverType), drivers);
+    EXPECT_EQ(plugin.nodes(IC::nodeType::driver), drivers);
     EXPECT_EQ(drivers[0]->getNodeId(), id);
     for (std::string const& event : host.events) // an address may be used again
         EXPECT_EQ(event.find(", 44, "), std::string::npos) << event;
@@ -615,7 +616,7 @@ TEST_F(Publishing, OfLogEntriesTakesNoLock)
 {
     commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
     rebuild("_ZN2IC6OsSwMI19createLogEntryNodesEb");
-    EXPECT_EQ(plugin.nodes(NODES::logEntryType).size(), 3U);
+    EXPECT_EQ(plugin.nodes(IC::nodeType::logEntry).size(), 3U);
     for (std::string const& event : host.events)
         EXPECT_EQ(event.find("lock("), std::string::npos) << event;
 }

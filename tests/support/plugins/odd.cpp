@@ -3,7 +3,7 @@
 
 #include "host/MutableNode.h"
 #include "host/OpenMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 
 #include <cstdlib>
 #include <string>
@@ -47,9 +47,9 @@ private:
         ++rebuilt_;
         if (isOddIn("vanish") && rebuilt_ % 2 == 0)
             return;
-        crew_ = new IC::MutableNode(nextNodeId_++, 0, miIds_, NODES::groupType, 1);
-        crew_->setProperty(NODES::name, IC::PropertyValue("crew", true));
-        crew_->setProperty(NODES::id, IC::PropertyValue(IC::Number(rebuilt_), true));
+        crew_ = new IC::MutableNode(nextNodeId_++, 0, miIds_, IC::nodeType::group, 1);
+        crew_->setProperty(IC::property::name, IC::PropertyValue("crew", true));
+        crew_->setProperty(IC::property::id, IC::PropertyValue(IC::Number(rebuilt_), true));
         IC::Node* node = crew_;
         addNewNode(node);
     }

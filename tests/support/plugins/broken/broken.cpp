@@ -4,7 +4,7 @@
 
 #include "frame/OsSwMI.h"
 #include "host/OpenMI.h"
-#include "nodes/ids.h"
+#include "host/Properties.h"
 
 #include <csignal>
 #include <cstdio>
@@ -155,28 +155,30 @@ void wrappedEnumeration(IC::PropertyValue*, IC::EnumValue const&, bool const&)
 void wrappedNode(IC::MutableNode* self, unsigned int id, unsigned int parent,
                  std::vector<unsigned int> miIds, unsigned int type, unsigned int index)
 {
-    if (isBroken("index") && type == NODES::groupType)
+    if (isBroken("index") && type == IC::nodeType::group)
         --index;
-    if (isBroken("parent") && type == NODES::groupType)
+    if (isBroken("parent") && type == IC::nodeType::group)
         --parent;
     realNode(self, id, parent, miIds, type, index);
 }
 
 IC::Error wrappedDescription(IC::MutableNode* self, std::string const& description)
 {
-    bool const other = isBroken("description") && self->getNodeType() == NODES::operatingSystemType;
+    bool const other =
+        isBroken("description") && self->getNodeType() == IC::nodeType::operatingSystem;
     return realDescription(self, other ? "A System" : description);
 }
 
 IC::Error wrappedProperty(IC::MutableNode* self, unsigned int const& id,
                           IC::PropertyValue const& value)
 {
-    bool const ofGroup = self->getNodeType() == NODES::groupType;
-    if (isBroken("kind") && ofGroup && id == NODES::id)
+    bool const ofGroup = self->getNodeType() == IC::nodeType::group;
+    if (isBroken("kind") && ofGroup && id == IC::property::id)
         return realProperty(self, id, IC::PropertyValue(static_cast<std::string>(value), true));
-    if (isBroken("missing-property") && ofGroup && id == NODES::members)
+    if (isBroken("missing-property") && ofGroup && id == IC::property::members)
         return {0, IC::Number(0U), ""};
-    if (isBroken("length") && self->getNodeType() == NODES::userType && id == NODES::nameLength)
+    if (isBroken("length") && self->getNodeType() == IC::nodeType::user &&
+        id == IC::property::nameLength)
         return realProperty(self, id, IC::PropertyValue(IC::Number(99U), true));
     return realProperty(self, id, value);
 }

@@ -1,26 +1,37 @@
-#ifndef NODES_IDS_H
-#define NODES_IDS_H
+#ifndef HOST_PROPERTIES_H
+#define HOST_PROPERTIES_H
 
-/** The numbers that nodes and properties go by. Hosts know them; none may change. */
-namespace NODES
+/*
+ * The numbers that node types, properties and commands go by. Both sides know them; none may
+ * change.
+ *
+ * Constants rather than enumerations: the contract takes ids by reference to unsigned int.
+ */
+namespace IC
 {
 
-enum NodeType : unsigned int {
-    operatingSystemType = 17,
-    logType = 35,
-    osSwType = 39,
-    computerType = 40,
-    driverType = 44,
-    userType = 46,
-    logEntryType = 47,
-    groupType = 51,
-    rootType = 59
-};
+/** What MutableNode::getNodeType returns. */
+namespace nodeType
+{
+
+constexpr unsigned int operatingSystem = 17;
+constexpr unsigned int log = 35;
+constexpr unsigned int osSw = 39;
+constexpr unsigned int computer = 40;
+constexpr unsigned int driver = 44;
+constexpr unsigned int user = 46;
+constexpr unsigned int logEntry = 47;
+constexpr unsigned int group = 51;
+constexpr unsigned int root = 59;
+
+} // namespace nodeType
 
 /** The status that every node has. */
 constexpr unsigned int statusOk = 1;
 
-// Constants rather than an enumeration: the contract takes ids by reference to unsigned int.
+/** The ids that getProperty and setProperty take. */
+namespace property
+{
 
 // On several kinds of node.
 constexpr unsigned int elementCount = 51; // users or groups, on their nodes
@@ -88,6 +99,20 @@ constexpr unsigned int message = 81;
 constexpr unsigned int dataType = 84;
 constexpr unsigned int logState = 114;
 
-} // namespace NODES
+} // namespace property
+
+/** What a write of a number to a command property asks for; other numbers are only stored. */
+namespace command
+{
+
+constexpr unsigned int restart = 9;       // to requestedState
+constexpr unsigned int halt = 12;         // to requestedState
+constexpr unsigned int emptyLog = 9;      // to clearLog
+constexpr unsigned int rebuild = 0;       // to refresh
+constexpr unsigned int deleteAccount = 1; // to deleteUser
+
+} // namespace command
+
+} // namespace IC
 
 #endif

@@ -10,7 +10,7 @@ namespace NQ
 
 bool ComputerInfo::getComputerName(std::string& name)
 {
-    LOG::Scope const scope(IC::OSSWMI::unit);
+    log::Scope const scope(IC::OSSWMI::unit);
     utsname system{};
     if (uname(&system) != 0)
         return false;

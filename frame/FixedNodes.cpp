@@ -8,7 +8,7 @@ namespace IC
 
 void OsSwMI::createOsSwNodes()
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     osSwNode_ = adopt(std::make_unique<MutableNode>(miId_, 0, miIds_, nodeType::osSw, 0));
     nodeIds_->push_back(miId_);
     setUp("OsSw Management Interface");
@@ -16,7 +16,7 @@ void OsSwMI::createOsSwNodes()
 
 void OsSwMI::createRootNode()
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     rootNode_ = adopt(std::make_unique<MutableNode>(nodeId, miId_, miIds_, nodeType::root, 0));
     nodeIds_->push_back(miId_); // kept: the interface's own id stands in the list twice
@@ -25,7 +25,7 @@ void OsSwMI::createRootNode()
 
 void OsSwMI::createComputerNodes()
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     computerNode_ = adopt(std::make_unique<MutableNode>(nodeId, rootNode_->getNodeId(), miIds_,
                                                         nodeType::computer, 0));

@@ -17,7 +17,7 @@ Error myerr(0, Number(0U), "");
 NQ::Mutex myuserlock;
 bool MI_call;
 
-NQ::LOG::Unit const unit{loggerOsSwMI, "OsSwMI"};
+NQ::log::Unit const unit{loggerOsSwMI, "OsSwMI"};
 
 } // namespace OSSWMI
 

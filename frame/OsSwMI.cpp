@@ -11,7 +11,7 @@ OsSwMI::~OsSwMI() = default;
 
 Error OsSwMI::initialize(unsigned int first, Number const& second, Number const& third)
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     pOsSwMI = this;
     nodeIds_ = new std::vector<unsigned int>;
     OSSWMI::myerr = ManagementInterface::initialize(first, second, third);
@@ -31,7 +31,7 @@ Error OsSwMI::initialize(unsigned int first, Number const& second, Number const&
 
 void OsSwMI::unload()
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     ManagementInterface::unload(); // deletes the nodes: a later life must not take others for them
     for (std::vector<Node*>* kind : {&logEntryNodes_, &groupNodes_, &userNodes_})
         kind->clear();
@@ -41,11 +41,11 @@ void OsSwMI::unload()
 
 void OsSwMI::publishNode(Node* node)
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     Error const error = addNewNode(node);
     if (error.getStatus() != 0)
-        NQ::LOG::write(OSSWMI::unit, NQ::LOG::error,
-                       NQ::LOG::message("addNewNode error = ", static_cast<std::string>(error)));
+        NQ::log::write(OSSWMI::unit, NQ::log::error,
+                       NQ::log::message("addNewNode error = ", static_cast<std::string>(error)));
 }
 
 unsigned int OsSwMI::takeNodeId(bool note)
@@ -79,8 +79,8 @@ void OsSwMI::dropNodes(std::vector<Node*>& nodes, bool refresh, char const* anno
     if (!refresh)
         return;
     for (Node* node : dropped) {
-        NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress,
-                       NQ::LOG::message(announcement, node->getDescription()), function);
+        NQ::log::write(OSSWMI::unit, NQ::log::progress,
+                       NQ::log::message(announcement, node->getDescription()), function);
         deleteNode(node);
     }
 }

@@ -106,7 +106,7 @@ extern NQ::Mutex myuserlock;
 extern bool MI_call;
 
 /** Where the frame's and the nodes' messages come from. */
-extern NQ::LOG::Unit const unit MI_INTERNAL;
+extern NQ::log::Unit const unit MI_INTERNAL;
 
 } // namespace OSSWMI
 

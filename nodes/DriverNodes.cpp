@@ -8,7 +8,7 @@ namespace IC
 
 void OsSwMI::createDriverNodes()
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     std::vector<NQ::driverInfo> drivers;
     NQ::getDriverInfo(drivers);
     unsigned int index = 0;

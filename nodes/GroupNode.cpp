@@ -15,17 +15,17 @@ GroupNode::GroupNode(unsigned int nodeId, unsigned int parentId, std::vector<uns
                      unsigned int nodeType, unsigned int index)
     : MutableNode(nodeId, parentId, miIds, nodeType, index)
 {
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "GroupNode::GroupNode: entry");
+    NQ::log::write(OSSWMI::unit, NQ::log::progress, "GroupNode::GroupNode: entry");
 }
 
 GroupNode::~GroupNode()
 {
-    NQ::LOG::writeLast(OSSWMI::unit, "GroupNode::~GroupNode", ": entry");
+    NQ::log::writeLast(OSSWMI::unit, "GroupNode::~GroupNode", ": entry");
 }
 
 Error GroupNode::getProperty(unsigned int id, PropertyValue& value) const
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit, {"GroupNode::getProperty"});
+    NQ::log::Scope const scope(OSSWMI::unit, {"GroupNode::getProperty"});
     if (id != property::elementCount)
         return MutableNode::getProperty(id, value);
     std::vector<groupInfo> groups;
@@ -36,13 +36,13 @@ Error GroupNode::getProperty(unsigned int id, PropertyValue& value) const
 
 void OsSwMI::createGroupNodes(bool refresh)
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     NQ::MutexLock const lock(OSSWMI::myuserlock);
     dropNodes(groupNodes_, refresh, "Delete a group entry: ", __func__);
     std::vector<groupInfo> groups;
     NQ::getGroupInfo(groups);
     auto const count = static_cast<unsigned int>(groups.size());
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("groups.size() = ", count));
+    NQ::log::write(OSSWMI::unit, NQ::log::progress, NQ::log::message("groups.size() = ", count));
     groupNodes_.reserve(count);
     unsigned int position = 0;
     for (groupInfo& group : groups) {
@@ -54,8 +54,8 @@ void OsSwMI::createGroupNodes(bool refresh)
         setUp("Group");
         std::string const name = group.getGroupName();
         unsigned int const id = group.getGroupId();
-        NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("Name = ", name));
-        NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message("Id = ", id));
+        NQ::log::write(OSSWMI::unit, NQ::log::progress, NQ::log::message("Name = ", name));
+        NQ::log::write(OSSWMI::unit, NQ::log::progress, NQ::log::message("Id = ", id));
         values::setProperties(*node, {{property::name, values::text(name)},
                                       {property::id, values::number(id)},
                                       {property::members, values::texts(group.getGroupMembers())},

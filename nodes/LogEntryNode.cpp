@@ -23,17 +23,17 @@ LogEntryNode::LogEntryNode(unsigned int nodeId, unsigned int parentId,
                            unsigned int index)
     : MutableNode(nodeId, parentId, miIds, nodeType, index)
 {
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "LogEntryNode::LogEntryNode: entry");
+    NQ::log::write(OSSWMI::unit, NQ::log::progress, "LogEntryNode::LogEntryNode: entry");
 }
 
 LogEntryNode::~LogEntryNode()
 {
-    NQ::LOG::writeLast(OSSWMI::unit, "LogEntryNode::~LogEntryNode", ": entry");
+    NQ::log::writeLast(OSSWMI::unit, "LogEntryNode::~LogEntryNode", ": entry");
 }
 
 Error LogEntryNode::getProperty(unsigned int id, PropertyValue& value) const
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit, {"LogEntryNode::getProperty"});
+    NQ::log::Scope const scope(OSSWMI::unit, {"LogEntryNode::getProperty"});
     unsigned int const index = getIndex();
     NQ::logInfo log;
     std::string text;
@@ -59,13 +59,13 @@ Error LogEntryNode::getProperty(unsigned int id, PropertyValue& value) const
 
 Error LogEntryNode::setProperty(unsigned int const& id, PropertyValue const& value)
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit, {"LogEntryNode::setProperty"});
+    NQ::log::Scope const scope(OSSWMI::unit, {"LogEntryNode::setProperty"});
     return MutableNode::setProperty(id, value);
 }
 
 void OsSwMI::createLogEntryNodes(bool refresh)
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     if (refresh) {
         for (Node* node : logEntryNodes_)
             deleteNode(node);

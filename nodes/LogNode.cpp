@@ -7,7 +7,7 @@ namespace IC
 
 void OsSwMI::createLogNodes()
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     logNode_ = adopt(
         std::make_unique<MutableNode>(nodeId, osNode_->getNodeId(), miIds_, nodeType::log, 0));

@@ -81,7 +81,7 @@ void logTime(char const* what, long seconds, char const* function)
     time_t const time = seconds;
     char text[32] = "";
     ctime_r(&time, text);
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, NQ::LOG::message(what, text), function);
+    NQ::log::write(OSSWMI::unit, NQ::log::progress, NQ::log::message(what, text), function);
 }
 
 } // namespace
@@ -90,17 +90,17 @@ OsNode::OsNode(unsigned int nodeId, unsigned int parentId, std::vector<unsigned 
                unsigned int nodeType, unsigned int index)
     : MutableNode(nodeId, parentId, miIds, nodeType, index)
 {
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "OsNode::OsNode: entry");
+    NQ::log::write(OSSWMI::unit, NQ::log::progress, "OsNode::OsNode: entry");
 }
 
 OsNode::~OsNode()
 {
-    NQ::LOG::writeLast(OSSWMI::unit, "OsNode::~OsNode", ": entry");
+    NQ::log::writeLast(OSSWMI::unit, "OsNode::~OsNode", ": entry");
 }
 
 Error OsNode::getProperty(unsigned int id, PropertyValue& value) const
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit, {"OsNode::getProperty"});
+    NQ::log::Scope const scope(OSSWMI::unit, {"OsNode::getProperty"});
     OsInfo info;
     for (NumberFact const& figure : liveFigures) {
         if (figure.id != id)
@@ -119,7 +119,7 @@ Error OsNode::getProperty(unsigned int id, PropertyValue& value) const
 
 void OsSwMI::createOsNodes()
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     osNode_ = adopt(std::make_unique<OsNode>(nodeId, computerNode_->getNodeId(), miIds_,
                                              nodeType::operatingSystem, 0));

@@ -28,13 +28,13 @@ void rebuildAccounts()
 /** Carries out the method that the value calls for, if any. @return false where it failed */
 bool administer(NQ::OsInfo& info, PropertyValue const& value, char const* function)
 {
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "PropertyType::CreateUser: entry", function);
+    NQ::log::write(OSSWMI::unit, NQ::log::progress, "PropertyType::CreateUser: entry", function);
     std::string const call = NQ::make_string(NQ::make_wstring(static_cast<std::string>(value)));
     if (call.empty() || call == "dummy")
         return true;
     if (call.find("Password") == std::string::npos)
-        NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress,
-                       NQ::LOG::message("CreateUser: inMethodAndParams = ", call), function);
+        NQ::log::write(OSSWMI::unit, NQ::log::progress,
+                       NQ::log::message("CreateUser: inMethodAndParams = ", call), function);
     if (!info.setCreateUser(call))
         return false;
     rebuildAccounts();
@@ -45,7 +45,7 @@ bool administer(NQ::OsInfo& info, PropertyValue const& value, char const* functi
 
 Error OsNode::setProperty(unsigned int const& id, PropertyValue const& value)
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit, {"OsNode::setProperty"});
+    NQ::log::Scope const scope(OSSWMI::unit, {"OsNode::setProperty"});
     NQ::OsInfo info;
     NQ::logInfo log;
     switch (id) {

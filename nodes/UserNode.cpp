@@ -100,8 +100,8 @@ void setPassword(std::string const& user, std::string const& password, char cons
     constexpr char const* command = "chpasswd -e < usrandpwd ; rm -f usrandpwd";
     NQ::MyProcess process;
     if (!process.mypopen(command, "r"))
-        NQ::LOG::write(OSSWMI::unit, NQ::LOG::error,
-                       NQ::LOG::message("Cannot open process: ", command), function);
+        NQ::log::write(OSSWMI::unit, NQ::log::error,
+                       NQ::log::message("Cannot open process: ", command), function);
 }
 
 /** Does to the system what a write asks for; nothing, for most properties. */
@@ -132,18 +132,18 @@ UserNode::UserNode(unsigned int nodeId, unsigned int parentId, std::vector<unsig
                    unsigned int nodeType, unsigned int index)
     : MutableNode(nodeId, parentId, miIds, nodeType, index)
 {
-    NQ::LOG::write(OSSWMI::unit, NQ::LOG::progress, "UserNode::UserNode: entry");
+    NQ::log::write(OSSWMI::unit, NQ::log::progress, "UserNode::UserNode: entry");
 }
 
 UserNode::~UserNode()
 {
-    NQ::LOG::writeLast(OSSWMI::unit, "UserNode::~UserNode", ": entry");
+    NQ::log::writeLast(OSSWMI::unit, "UserNode::~UserNode", ": entry");
 }
 
 Error UserNode::getProperty(unsigned int id, PropertyValue& value) const
 {
     // Contract: the messages name the class twice, which log filters of hosts expect.
-    NQ::LOG::Scope const scope(OSSWMI::unit, {"UserNode::UserNode"});
+    NQ::log::Scope const scope(OSSWMI::unit, {"UserNode::UserNode"});
     if (id != property::elementCount)
         return MutableNode::getProperty(id, value);
     std::vector<userInfo> users;
@@ -154,7 +154,7 @@ Error UserNode::getProperty(unsigned int id, PropertyValue& value) const
 
 Error UserNode::setProperty(unsigned int const& id, PropertyValue const& value)
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit, {"UserNode::setProperty"});
+    NQ::log::Scope const scope(OSSWMI::unit, {"UserNode::setProperty"});
     if (!OSSWMI::MI_call)
         act(*this, id, value, __func__);
     return MutableNode::setProperty(id, value);
@@ -162,7 +162,7 @@ Error UserNode::setProperty(unsigned int const& id, PropertyValue const& value)
 
 void OsSwMI::createUserNodes(bool refresh)
 {
-    NQ::LOG::Scope const scope(OSSWMI::unit);
+    NQ::log::Scope const scope(OSSWMI::unit);
     NQ::MutexLock const lock(OSSWMI::myuserlock);
     dropNodes(userNodes_, refresh, "Delete a user entry: ", __func__);
     std::vector<userInfo> users;

@@ -14,7 +14,7 @@ namespace IC
 {
 
 /** Short forms for the values that the builders and the live reads make. */
-namespace values MI_INTERNAL
+namespace MI_INTERNAL values
 {
 
 // Every value carries the flag true.
@@ -44,7 +44,7 @@ struct Property {
 /** Sets the properties through the node's own setProperty, in the order given. */
 void setProperties(MutableNode& node, std::initializer_list<Property> properties);
 
-} // namespace MI_INTERNAL
+} // namespace values
 
 } // namespace IC
 

@@ -16,35 +16,35 @@ std::string loggerDriverInfo = "Veltrix.IC.MI.OsSwMI.DriverInfo";
 namespace
 {
 
-using DRIVERINFO::lineSize;
+using driverLines::lineSize;
 
-LOG::Unit const unit{loggerDriverInfo, "driverInfo_linux"};
+log::Unit const unit{loggerDriverInfo, "driverInfo_linux"};
 
 void readFacts(FILE* modinfo, char const* module, driverInfo& driver, char const* function)
 {
-    DRIVERINFO::Seen seen;
+    driverLines::Seen seen;
     char line[lineSize];
     while (std::fgets(line, sizeof line, modinfo)) {
-        LOG::write(unit, LOG::progress, LOG::message("buffer2 = ", line), function);
-        if (!DRIVERINFO::takeFact(line, driver, seen))
-            LOG::write(unit, LOG::error, LOG::message("Invalid format: buffer2 = ", line),
+        log::write(unit, log::progress, log::message("buffer2 = ", line), function);
+        if (!driverLines::takeFact(line, driver, seen))
+            log::write(unit, log::error, log::message("Invalid format: buffer2 = ", line),
                        function);
     }
-    DRIVERINFO::complete(driver, seen, module);
+    driverLines::complete(driver, seen, module);
 }
 
 void addDriver(char const* module, std::vector<driverInfo>& drivers, char const* function)
 {
     char command[lineSize];
-    if (!TEXT::print(command, sizeof command, "modinfo %s", module)) {
-        LOG::write(unit, LOG::error, LOG::message("Command too long: modinfo ", module), function);
+    if (!text::print(command, sizeof command, "modinfo %s", module)) {
+        log::write(unit, log::error, log::message("Command too long: modinfo ", module), function);
         return;
     }
     driverInfo driver;
     MyProcess process;
     FILE* const modinfo = process.mypopen(command, "r");
     if (!modinfo) {
-        LOG::write(unit, LOG::progress, "Cannot open process: modinfo", function);
+        log::write(unit, log::progress, "Cannot open process: modinfo", function);
         return;
     }
     readFacts(modinfo, module, driver, function);
@@ -57,86 +57,86 @@ driverInfo::driverInfo() = default;
 
 std::string driverInfo::getName() const
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return name_;
 }
 
 std::string driverInfo::getVersion() const
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return version_;
 }
 
 std::string driverInfo::getDescription() const
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return description_;
 }
 
 std::string driverInfo::getBuildNumber() const
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return buildNumber_;
 }
 
 std::string driverInfo::getManufacturer() const
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return manufacturer_;
 }
 
 int driverInfo::setName(std::string name)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     name_ = std::move(name);
     return 1;
 }
 
 int driverInfo::setVersion(std::string version)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     version_ = std::move(version);
     return 1;
 }
 
 int driverInfo::setDescription(std::string description)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     description_ = std::move(description);
     return 1;
 }
 
 int driverInfo::setBuildNumber(std::string buildNumber)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     buildNumber_ = std::move(buildNumber);
     return 1;
 }
 
 int driverInfo::setManufacturer(std::string manufacturer)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     manufacturer_ = std::move(manufacturer);
     return 1;
 }
 
 void getDriverInfo(std::vector<driverInfo>& drivers)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     drivers.clear();
     MyProcess process;
     FILE* const lsmod = process.mypopen("lsmod", "r");
     if (!lsmod) {
-        LOG::write(unit, LOG::progress, "Cannot open process: lsmod");
+        log::write(unit, log::progress, "Cannot open process: lsmod");
         return;
     }
     char line[lineSize];
     while (std::fgets(line, sizeof line, lsmod)) {
-        LOG::write(unit, LOG::progress, LOG::message("buffer = ", line));
+        log::write(unit, log::progress, log::message("buffer = ", line));
         char module[lineSize];
-        if (!DRIVERINFO::findModule(line, module))
-            LOG::write(unit, LOG::error, LOG::message("Invalid format: buffer1 = ", line));
-        else if (!DRIVERINFO::isHeader(module))
+        if (!driverLines::findModule(line, module))
+            log::write(unit, log::error, log::message("Invalid format: buffer1 = ", line));
+        else if (!driverLines::isHeader(module))
             addDriver(module, drivers, __func__);
     }
 }

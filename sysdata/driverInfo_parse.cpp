@@ -6,7 +6,7 @@
 #include <cstdio>
 #include <cstring>
 
-namespace NQ::DRIVERINFO
+namespace NQ::driverLines
 {
 
 namespace
@@ -61,4 +61,4 @@ void complete(driverInfo& driver, Seen const& seen, char const* module)
     driver.setManufacturer("");
 }
 
-} // namespace NQ::DRIVERINFO
+} // namespace NQ::driverLines

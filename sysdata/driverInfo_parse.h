@@ -11,7 +11,7 @@ namespace NQ
 class driverInfo;
 
 /** What the lines that lsmod and modinfo print mean. Not part of the plug-in's interface. */
-namespace DRIVERINFO MI_INTERNAL
+namespace MI_INTERNAL driverLines
 {
 
 /** Room for one line and its NUL. A longer line comes in pieces, each a line of its own. */
@@ -44,7 +44,7 @@ bool takeFact(char* line, driverInfo& driver, Seen& seen);
 /** Completes a record once all lines of modinfo are taken in. */
 void complete(driverInfo& driver, Seen const& seen, char const* module);
 
-} // namespace MI_INTERNAL
+} // namespace driverLines
 
 } // namespace NQ
 

@@ -19,7 +19,7 @@ std::string loggerGroupInfo = "Veltrix.IC.MI.OsSwMI.GroupInfo";
 namespace
 {
 
-LOG::Unit const unit{loggerGroupInfo, "groupInfo_linux"};
+log::Unit const unit{loggerGroupInfo, "groupInfo_linux"};
 
 /** The group database, read from its start; closed when the object goes. */
 class GroupDatabase
@@ -86,31 +86,31 @@ groupInfo::groupInfo(std::string name) : name_(std::move(name)) {}
 
 std::string groupInfo::getGroupName()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return name_;
 }
 
 unsigned int groupInfo::getGroupId()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return groupId_;
 }
 
 void groupInfo::setGroupId(unsigned int groupId)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     groupId_ = groupId;
 }
 
 void groupInfo::setGroupMembers(char** members)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     members_ = GROUP_INFO::withMembers(SharedPrimaryMembers::of(groupId_), members);
 }
 
 std::vector<std::string> groupInfo::getGroupMembers()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     std::vector<std::string> members;
     Tokenize(members_, members, ",");
     return members;
@@ -119,17 +119,17 @@ std::vector<std::string> groupInfo::getGroupMembers()
 void groupInfo::Tokenize(std::string const& text, std::vector<std::string>& tokens,
                          std::string const& delimiters)
 {
-    LOG::Scope const scope(unit);
-    for (std::string& token : TEXT::split(text, delimiters)) {
+    log::Scope const scope(unit);
+    for (std::string& token : text::split(text, delimiters)) {
         tokens.push_back(std::move(token));
-        LOG::write(unit, LOG::progress,
-                   LOG::message("str.substr(lastPos, pos - lastPos) = ", tokens.back()));
+        log::write(unit, log::progress,
+                   log::message("str.substr(lastPos, pos - lastPos) = ", tokens.back()));
     }
 }
 
 int getGroupInfo(std::vector<groupInfo>& groups)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     static Mutex mutex;
     groups.clear();
     MutexLock lock(mutex);

@@ -48,7 +48,7 @@ private:
 
 PrimaryMembers::PrimaryMembers()
 {
-    FILES::File const file("/etc/passwd", "ro");
+    files::File const file("/etc/passwd", "ro");
     if (!file.stream())
         return;
     while (passwd const* account = fgetpwent(file.stream()))

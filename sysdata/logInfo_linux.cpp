@@ -17,10 +17,10 @@ std::string loggerLogInfo = "Veltrix.IC.MI.OsSwMI.LogInfo";
 namespace
 {
 
-using LOGINFO::lineSize;
-using LOGINFO::stampLength;
+using logLines::lineSize;
+using logLines::stampLength;
 
-LOG::Unit const unit{loggerLogInfo, "logInfo_linux"};
+log::Unit const unit{loggerLogInfo, "logInfo_linux"};
 
 constexpr char countCommand[] = "wc -l /var/log/messages";
 constexpr char fetchCommand[] = "sed -n '%dp' /var/log/messages";
@@ -46,15 +46,15 @@ bool isReadable(logInfo& log, unsigned int index, char const* label, char const*
     unsigned int const count = log.getMaxLine();
     if (count + 1 >= index)
         return true;
-    LOG::write(unit, LOG::error,
-               LOG::message("Invalid index: getMaxLine()=", countForMessage, label, index),
+    log::write(unit, log::error,
+               log::message("Invalid index: getMaxLine()=", countForMessage, label, index),
                function);
     return false;
 }
 
 void logInvalid(char const* text, char const* function)
 {
-    LOG::write(unit, LOG::error, LOG::message("Invalid format: buffer = ", text), function);
+    log::write(unit, log::error, log::message("Invalid format: buffer = ", text), function);
 }
 
 } // namespace
@@ -65,43 +65,43 @@ logInfo::~logInfo() = default;
 
 unsigned int logInfo::getMaxLine()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     MyProcess process;
     FILE* const output = process.mypopen(countCommand, "r");
     if (!output) {
-        LOG::write(unit, LOG::error, LOG::message("Cannot open process: ", countCommand));
+        log::write(unit, log::error, log::message("Cannot open process: ", countCommand));
         return 0;
     }
     char line[lineSize];
     readLine(output, line);
-    LOG::write(unit, LOG::progress, LOG::message("buffer = ", line));
+    log::write(unit, log::progress, log::message("buffer = ", line));
     unsigned int count = 0;
-    if (!LOGINFO::findCount(line, count))
+    if (!logLines::findCount(line, count))
         logInvalid(line, __func__);
     return count;
 }
 
 void logInfo::getLog(unsigned int line, char* buffer, int length)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     char command[lineSize];
     std::snprintf(command, sizeof command, fetchCommand, static_cast<int>(line));
     MyProcess process;
     FILE* const output = process.mypopen(command, "r");
     if (!output) {
-        LOG::write(unit, LOG::error, fetchCommand); // kept: without the number
+        log::write(unit, log::error, fetchCommand); // kept: without the number
         buffer[0] = '\0';
         return;
     }
     char text[lineSize];
     readLine(output, text);
-    LOG::write(unit, LOG::progress, LOG::message("buffer = ", text));
+    log::write(unit, log::progress, log::message("buffer = ", text));
     std::strncpy(buffer, strget(text, ' '), static_cast<std::size_t>(length));
 }
 
 bool logInfo::getData(std::string& text, unsigned int index)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     if (!isReadable(*this, index, ", Index=", __func__))
         return false;
     char entry[lineSize] = "";
@@ -113,47 +113,47 @@ bool logInfo::getData(std::string& text, unsigned int index)
 
 bool logInfo::getCreationTime(long& time, unsigned int index)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     if (!isReadable(*this, index, ", logIndex=", __func__))
         return false;
     char entry[lineSize] = "";
     readEntry(*this, index, entry);
     char stampText[stampLength + 1] = "";
     std::memcpy(stampText, entry, stampLength);
-    LOGINFO::Stamp stamp;
-    if (!LOGINFO::findStamp(stampText, stamp)) {
+    logLines::Stamp stamp;
+    if (!logLines::findStamp(stampText, stamp)) {
         logInvalid(stampText, __func__);
         return false;
     }
 
-    LOGINFO::Today today;
+    logLines::Today today;
     MyProcess process;
     if (FILE* const output = process.mypopen("date", "r")) {
         char line[lineSize];
         readLine(output, line);
-        if (!LOGINFO::findToday(line, today)) {
+        if (!logLines::findToday(line, today)) {
             logInvalid(line, __func__);
             return false;
         }
     } else {
-        LOG::write(unit, LOG::error, "Cannot opne process: date"); // kept: spelled so
+        log::write(unit, log::error, "Cannot opne process: date"); // kept: spelled so
     }
-    time = to_time_t(LOGINFO::yearOf(stamp, today), stamp.month, stamp.day, 0, stamp.hour,
+    time = to_time_t(logLines::yearOf(stamp, today), stamp.month, stamp.day, 0, stamp.hour,
                      stamp.minute, stamp.second, -1);
     return true;
 }
 
 bool logInfo::clearLog()
 {
-    LOG::Scope const scope(unit);
-    FILES::File const log("/var/log/messages", "w");
+    log::Scope const scope(unit);
+    files::File const log("/var/log/messages", "w");
     return log.stream() != nullptr;
 }
 
 void logInfo::strreplace(char* str, char from, char to)
 {
-    LOG::Scope const scope(unit);
-    TEXT::replaceAfterFirst(str, from, to);
+    log::Scope const scope(unit);
+    text::replaceAfterFirst(str, from, to);
 }
 
 } // namespace NQ

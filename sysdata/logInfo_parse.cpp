@@ -4,7 +4,7 @@
 #include <cstdio>
 #include <cstring>
 
-namespace NQ::LOGINFO
+namespace NQ::logLines
 {
 
 bool findCount(char const* line, unsigned int& count)
@@ -38,4 +38,4 @@ int yearOf(Stamp const& stamp, Today const& today)
     return hasYearBefore && fromLastYear ? today.year - 1 : today.year;
 }
 
-} // namespace NQ::LOGINFO
+} // namespace NQ::logLines

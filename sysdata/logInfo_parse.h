@@ -9,7 +9,7 @@ namespace NQ
 {
 
 /** What the log's lines and the commands' output mean. Not part of the plug-in's interface. */
-namespace LOGINFO MI_INTERNAL
+namespace MI_INTERNAL logLines
 {
 
 /** Room for one line and its NUL; what does not fit is left unread. */
@@ -45,7 +45,7 @@ bool findToday(char const* line, Today& today);
 /** The current year; the one before for an entry of December that is read in January. */
 int yearOf(Stamp const& stamp, Today const& today);
 
-} // namespace MI_INTERNAL
+} // namespace logLines
 
 } // namespace NQ
 

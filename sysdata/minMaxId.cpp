@@ -20,7 +20,7 @@ constexpr std::size_t keyLength = 7;
 /** The whole file, followed by the end mark and a NUL; empty where it cannot be read. */
 std::vector<char> readAll(char const* path)
 {
-    FILES::File const file(path, "r");
+    files::File const file(path, "r");
     if (!file.stream() || std::fseek(file.stream(), 0, SEEK_END) != 0)
         return {};
     long const length = std::ftell(file.stream());

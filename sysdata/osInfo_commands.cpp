@@ -5,7 +5,7 @@
 #include <algorithm>
 #include <iterator>
 
-namespace NQ::OSINFO
+namespace NQ::os
 {
 
 namespace
@@ -232,4 +232,4 @@ bool isBenign(std::string const& output)
     return isAgingNotice(output) || beginsWithAny(output, harmlessNotices);
 }
 
-} // namespace NQ::OSINFO
+} // namespace NQ::os

@@ -13,7 +13,7 @@
 namespace NQ
 {
 
-namespace OSINFO MI_INTERNAL
+namespace MI_INTERNAL os
 {
 
 enum class ParamType { text, number, date, unknown };
@@ -91,7 +91,7 @@ bool isAgingNotice(std::string const& output);
 std::string supplementaryGroups(std::string const& identity, std::string const& quotedGroup,
                                 bool adding);
 
-} // namespace MI_INTERNAL
+} // namespace os
 
 } // namespace NQ
 

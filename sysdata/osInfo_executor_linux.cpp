@@ -12,17 +12,17 @@ namespace NQ
 namespace
 {
 
-using OSINFO::Commands;
-using OSINFO::Method;
-using OSINFO::MethodKind;
-using OSINFO::methods;
-using OSINFO::Ran;
+using os::Commands;
+using os::Method;
+using os::MethodKind;
+using os::methods;
+using os::Ran;
 
 std::string programOf(Method const& method)
 {
     // There useradd makes a group for each user unless told not to.
     bool const needsOption =
-        method.kind == MethodKind::userAdd && FILES::canOpen("/etc/redhat-release");
+        method.kind == MethodKind::userAdd && files::canOpen("/etc/redhat-release");
     return needsOption ? std::string(method.program) + " -n" : method.program;
 }
 
@@ -31,29 +31,29 @@ int runTools(OsInfo& info, Method const& method, std::vector<ParamInfo> const& p
 {
     Commands commands;
     std::string complaint;
-    if (!OSINFO::makeCommands(method, programOf(method), params, commands, complaint)) {
+    if (!os::makeCommands(method, programOf(method), params, commands, complaint)) {
         if (!complaint.empty())
-            LOG::write(methods, LOG::error, complaint, function);
+            log::write(methods, log::error, complaint, function);
         return 1;
     }
     bool const adding = method.kind == MethodKind::userAdd;
-    Ran const main = OSINFO::runLogged(info, commands.main, params, function);
+    Ran const main = os::runLogged(info, commands.main, params, function);
     bool const added = adding && main.output.find("rc=0") != std::string::npos;
-    if (main.status != 0 && !OSINFO::isBenign(main.output) && !added)
+    if (main.status != 0 && !os::isBenign(main.output) && !added)
         return main.status;
     if (commands.password)
         info.executePasswordEncryption(commands.password->data(), commands.user.data());
     if (!adding)
         return 0;
-    Ran const aging = OSINFO::runLogged(info, commands.aging, params, function);
-    return OSINFO::isAgingNotice(aging.output) ? 0 : aging.status;
+    Ran const aging = os::runLogged(info, commands.aging, params, function);
+    return os::isAgingNotice(aging.output) ? 0 : aging.status;
 }
 
 } // namespace
 
 bool OsInfo::setCreateUser(std::string methodAndParams)
 {
-    LOG::Scope const scope(methods, {"OsNode::setCreateUser"});
+    log::Scope const scope(methods, {"OsNode::setCreateUser"});
     std::string method;
     std::vector<ParamInfo> params;
     if (parseMethodAndParams(methodAndParams, method, params) != 0)
@@ -64,15 +64,15 @@ bool OsInfo::setCreateUser(std::string methodAndParams)
 
 int OsInfo::executeMethod(std::string method, std::vector<ParamInfo> params, bool& shadowing)
 {
-    LOG::Scope const scope(methods, {"OsNode::executeMethod"});
-    Method const* known = OSINFO::findMethod(method);
+    log::Scope const scope(methods, {"OsNode::executeMethod"});
+    Method const* known = os::findMethod(method);
     if (!known) {
-        LOG::write(methods, LOG::error, LOG::message("Unknown method: ", method));
+        log::write(methods, log::error, log::message("Unknown method: ", method));
         return 1;
     }
     switch (known->kind) {
     case MethodKind::getShadowing:
-        shadowing = FILES::canOpen("/etc/shadow");
+        shadowing = files::canOpen("/etc/shadow");
         return 0;
     case MethodKind::groupMembership:
         return groupMemberChanges(method, params) ? 1 : 0;
@@ -83,13 +83,13 @@ int OsInfo::executeMethod(std::string method, std::vector<ParamInfo> params, boo
 
 void OsInfo::executePasswordEncryption(char* password, char* user)
 {
-    LOG::Scope const scope(methods);
+    log::Scope const scope(methods);
     if (*user == '\0') {
         // Without a name passwd would take the password for the caller's own account.
-        LOG::write(methods, LOG::error, "No user name for the password");
+        log::write(methods, log::error, "No user name for the password");
         return;
     }
-    OSINFO::run(*this, {"echo", password, "|", "/usr/bin/passwd", user, "--stdin"});
+    os::run(*this, {"echo", password, "|", "/usr/bin/passwd", user, "--stdin"});
 }
 
 } // namespace NQ

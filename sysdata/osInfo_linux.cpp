@@ -20,18 +20,18 @@ namespace NQ
 
 std::string loggerOsInfo = "Veltrix.IC.MI.OsSwMI.OsInfo";
 
-namespace OSINFO
+namespace os
 {
 
-LOG::Unit const facts{loggerOsInfo, "OsSwMI"};
-LOG::Unit const methods{loggerOsInfo, "osInfo_linux"};
+log::Unit const facts{loggerOsInfo, "OsSwMI"};
+log::Unit const methods{loggerOsInfo, "osInfo_linux"};
 
-} // namespace OSINFO
+} // namespace os
 
 namespace
 {
 
-using OSINFO::facts;
+using os::facts;
 using Figures = struct sysinfo;
 
 void setRam(unsigned long amount, unsigned int memoryUnit, unsigned int& out)
@@ -49,7 +49,7 @@ void getRam(unsigned long Figures::*amount, char const* failure, unsigned int& o
     if (sysinfo(&figures) == 0) {
         setRam(figures.*amount, figures.mem_unit, out);
     } else {
-        LOG::write(facts, LOG::progress, failure, function);
+        log::write(facts, log::progress, failure, function);
         out = 0;
     }
 }
@@ -79,7 +79,7 @@ std::string withoutBlanks(std::string text)
 
 void powerDown(char const* announcement, char const* command, char const* function)
 {
-    LOG::write(facts, LOG::power, announcement, function);
+    log::write(facts, log::power, announcement, function);
     MyProcess process;
     process.mypopen(command, "r");
 }
@@ -92,84 +92,84 @@ OsInfo::~OsInfo() = default;
 
 bool OsInfo::getDistributed(bool& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = false;
     return true;
 }
 
 bool OsInfo::getProcessMaxNumber(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = 32000;
     return true;
 }
 
 bool OsInfo::getProcessMaxMemory(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = 0;
     return true;
 }
 
 bool OsInfo::getLicensedUserCount(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = 0;
     return true;
 }
 
 bool OsInfo::getVirtualMemorySize(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = 0;
     return true;
 }
 
 bool OsInfo::getVirtualMemoryFree(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = 0;
     return true;
 }
 
 bool OsInfo::getOSCreateUser(std::string& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out.clear();
     return true;
 }
 
 bool OsInfo::getPhysicalMemorySize(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     getRam(&Figures::totalram, "physicalMemorySize failed", out, __func__);
     return true;
 }
 
 bool OsInfo::getPhysicalMemoryFree(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     getRam(&Figures::freeram, "physicalMemoryFree failed", out, __func__);
     return true;
 }
 
 bool OsInfo::getSwapFileSize(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = static_cast<unsigned int>(figuresOrZero().totalswap);
     return true;
 }
 
 bool OsInfo::getSwapFileFree(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = static_cast<unsigned int>(figuresOrZero().freeswap);
     return true;
 }
 
 bool OsInfo::getSwapFileSizeStored(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     Figures const figures = figuresOrZero();
     out = static_cast<unsigned int>(figures.totalswap - figures.freeswap);
     return true;
@@ -177,14 +177,14 @@ bool OsInfo::getSwapFileSizeStored(unsigned int& out)
 
 bool OsInfo::getProcessCount(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = figuresOrZero().procs;
     return true;
 }
 
 bool OsInfo::getLastBootTime(long& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     Figures figures{};
     if (sysinfo(&figures) != 0)
         return false;
@@ -194,12 +194,12 @@ bool OsInfo::getLastBootTime(long& out)
 
 bool OsInfo::getUserCount(unsigned int& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     lckpwdf();
     setpwent();
     minMaxId::Instance(); // read before the accounts, and also where there are none
     unsigned int count = 0;
-    if (FILES::File const file("/etc/passwd", "ro"); file.stream()) {
+    if (files::File const file("/etc/passwd", "ro"); file.stream()) {
         passwd entry{};
         passwd* found = nullptr;
         char line[4096];
@@ -214,7 +214,7 @@ bool OsInfo::getUserCount(unsigned int& out)
 
 bool OsInfo::getLanguageEdition(std::string& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     std::string language = environment("LANG");
     if (language.empty())
         language = environment("LC_CTYPE");
@@ -231,7 +231,7 @@ bool OsInfo::getLanguageEdition(std::string& out)
 
 bool OsInfo::getCodeSet(std::string& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     std::string codeSet = withoutBlanks(environment("LANG"));
     if (codeSet == "POSIX") {
         out = "UTF-8";
@@ -246,7 +246,7 @@ bool OsInfo::getCodeSet(std::string& out)
 
 void OsInfo::trimString(std::string& text)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     std::string::size_type const first = text.find_first_not_of(' ');
     if (first == std::string::npos) {
         if (!text.empty())
@@ -258,20 +258,20 @@ void OsInfo::trimString(std::string& text)
 
 void OsInfo::strreplace(char* s, char from, char to)
 {
-    LOG::Scope const scope(facts);
-    TEXT::replaceAfterFirst(s, from, to);
+    log::Scope const scope(facts);
+    text::replaceAfterFirst(s, from, to);
 }
 
 bool OsInfo::statusOffline()
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     powerDown("Halt after shutdown.", "/sbin/shutdown -h now", __func__);
     return true;
 }
 
 bool OsInfo::statusReset()
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     powerDown("Reboot after shutdown.", "/sbin/shutdown -r now", __func__);
     return true;
 }

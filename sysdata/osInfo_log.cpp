@@ -4,7 +4,7 @@
 
 #include <algorithm>
 
-namespace NQ::OSINFO
+namespace NQ::os
 {
 
 std::string withoutPasswords(std::string const& output, std::vector<ParamInfo> const& params)
@@ -35,12 +35,12 @@ std::string withoutPasswords(std::string const& output, std::vector<ParamInfo> c
 
 std::string unknownType(std::string const& type)
 {
-    return LOG::message("Unknown parameter type: ", type);
+    return log::message("Unknown parameter type: ", type);
 }
 
 std::string tooLong(std::string const& program)
 {
-    return LOG::message("Command line too long: ", program);
+    return log::message("Command line too long: ", program);
 }
 
-} // namespace NQ::OSINFO
+} // namespace NQ::os

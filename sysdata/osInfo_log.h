@@ -10,14 +10,14 @@
 namespace NQ
 {
 
-namespace OSINFO MI_INTERNAL
+namespace MI_INTERNAL os
 {
 
 /** Contract: the facts speak under the frame's source name, which hosts filter on. */
-extern LOG::Unit const facts;
+extern log::Unit const facts;
 
 /** The administration methods speak under their own source name. */
-extern LOG::Unit const methods;
+extern log::Unit const methods;
 
 /**
  * What a tool printed, for the log. Tools and shells may quote the line that they could not read,
@@ -30,7 +30,7 @@ std::string withoutPasswords(std::string const& output, std::vector<ParamInfo> c
 std::string unknownType(std::string const& type);
 std::string tooLong(std::string const& program);
 
-} // namespace MI_INTERNAL
+} // namespace os
 
 } // namespace NQ
 

@@ -13,8 +13,8 @@ namespace NQ
 namespace
 {
 
-using OSINFO::ParamType;
-using OSINFO::Ran;
+using os::ParamType;
+using os::Ran;
 
 std::string quoted(std::string const& text)
 {
@@ -25,7 +25,7 @@ std::string textOf(std::vector<ParamInfo> const& params, char const* name)
 {
     std::string value;
     for (ParamInfo const& param : params)
-        if (OSINFO::typeOf(param.type) == ParamType::text && param.name == name)
+        if (os::typeOf(param.type) == ParamType::text && param.name == name)
             value = param.value;
     return value;
 }
@@ -71,8 +71,8 @@ std::string::size_type listStart(std::string const& identity, std::string::size_
 
 } // namespace
 
-std::string OSINFO::supplementaryGroups(std::string const& identity, std::string const& quotedGroup,
-                                        bool adding)
+std::string os::supplementaryGroups(std::string const& identity, std::string const& quotedGroup,
+                                    bool adding)
 {
     std::string::size_type primaryAt = identity.find("gid");
     std::string::size_type listAt = listStart(identity, primaryAt);
@@ -98,22 +98,22 @@ std::string OSINFO::supplementaryGroups(std::string const& identity, std::string
 
 bool OsInfo::groupMemberChanges(std::string method, std::vector<ParamInfo> params)
 {
-    LOG::Scope const scope(OSINFO::methods);
+    log::Scope const scope(os::methods);
     std::string const group = quoted(textOf(params, "LocalGroupName"));
     std::string const member = quoted(textOf(params, "DomainAndMember"));
     std::string const identity =
-        OSINFO::runLogged(*this, {"/usr/bin/id", member}, params, __func__).output;
-    if (identity.size() == OSINFO::bufferSize - 1) {
+        os::runLogged(*this, {"/usr/bin/id", member}, params, __func__).output;
+    if (identity.size() == os::bufferSize - 1) {
         // Perhaps cut: usermod would take the member out of the groups that are missing.
-        LOG::write(OSINFO::methods, LOG::error, "Output too long: /usr/bin/id");
+        log::write(os::methods, log::error, "Output too long: /usr/bin/id");
         return true;
     }
     if (holds(identity, "No such user") || !holds(identity, "gid"))
         return true;
     bool const adding = method == "LocalGroupAddUser";
-    OSINFO::Arguments const change{"/usr/sbin/usermod", "-G",
-                                   OSINFO::supplementaryGroups(identity, group, adding), member};
-    Ran const changed = OSINFO::runLogged(*this, change, params, __func__);
+    os::Arguments const change{"/usr/sbin/usermod", "-G",
+                               os::supplementaryGroups(identity, group, adding), member};
+    Ran const changed = os::runLogged(*this, change, params, __func__);
     return changed.status != 0 && !holds(changed.output, "is primary group name");
 }
 

@@ -15,20 +15,20 @@ namespace NQ
 namespace
 {
 
-using OSINFO::methods;
-using OSINFO::ParamType;
+using os::methods;
+using os::ParamType;
 
 enum class Outcome { next, stop, reject };
 
 bool isPassword(std::string const& item)
 {
-    std::vector<std::string> const parts = TEXT::split(item, ":");
-    return !parts.empty() && parts.front() == OSINFO::passwordName;
+    std::vector<std::string> const parts = text::split(item, ":");
+    return !parts.empty() && parts.front() == os::passwordName;
 }
 
 void note(char const* what, std::string const& text, char const* function)
 {
-    LOG::write(methods, LOG::progress, LOG::message(what, text), function);
+    log::write(methods, log::progress, log::message(what, text), function);
 }
 
 /** Year, month and day of a date-time text; its time of day, fraction and offset are dropped. */
@@ -48,7 +48,7 @@ bool readDate(std::string const& text, std::string& date)
 
 Outcome stopAtBlank(char const* function)
 {
-    LOG::write(methods, LOG::progress, "This parameter is blank ---exiting ", function);
+    log::write(methods, log::progress, "This parameter is blank ---exiting ", function);
     return Outcome::stop;
 }
 
@@ -65,7 +65,7 @@ std::vector<std::string> partsOf(std::string const& item, bool secret)
         return parts;
     }
     // Tokenize does not log a text that holds this word.
-    Tokenize(item + ":" + OSINFO::passwordName, parts, ":");
+    Tokenize(item + ":" + os::passwordName, parts, ":");
     parts.pop_back();
     return parts;
 }
@@ -81,9 +81,9 @@ Outcome parseItem(std::string const& item, bool secret, std::vector<ParamInfo>& 
     ParamInfo param{parts[0], parts[1], ""};
     note("paramInfo.name=", param.name, function);
     note("paramInfo.type=", param.type, function);
-    ParamType const type = OSINFO::typeOf(param.type);
+    ParamType const type = os::typeOf(param.type);
     if (type == ParamType::unknown) {
-        LOG::write(methods, LOG::error, OSINFO::unknownType(param.type), function);
+        log::write(methods, log::error, os::unknownType(param.type), function);
         return Outcome::reject;
     }
 
@@ -96,7 +96,7 @@ Outcome parseItem(std::string const& item, bool secret, std::vector<ParamInfo>& 
             param.value = parts[2];
         else if (!readDate(parts[2], param.value))
             return Outcome::reject;
-        if (date || param.name != OSINFO::passwordName)
+        if (date || param.name != os::passwordName)
             note("paramInfo.value=", param.value, function);
     }
     params.push_back(param);
@@ -108,7 +108,7 @@ Outcome parseItem(std::string const& item, bool secret, std::vector<ParamInfo>& 
 int OsInfo::parseMethodAndParams(std::string methodAndParams, std::string& method,
                                  std::vector<ParamInfo>& params)
 {
-    LOG::Scope const scope(methods, {"OsNode::parseMethodAndParams"});
+    log::Scope const scope(methods, {"OsNode::parseMethodAndParams"});
     std::vector<std::string> items;
     Tokenize(methodAndParams, items, ",");
     if (items.empty())

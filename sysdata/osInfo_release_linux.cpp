@@ -15,8 +15,8 @@ namespace NQ
 namespace
 {
 
-using FILES::canOpen;
-using OSINFO::facts;
+using files::canOpen;
+using os::facts;
 
 #if defined(__GNUC__) && !defined(__clang__)
 #pragma GCC diagnostic push
@@ -73,13 +73,13 @@ long changeTime(OsInfo& info, char* line)
 
 bool OsInfo::getInstallDate(long& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = 0;
     for (ReleaseFile const& candidate : installDateFiles) {
         MyProcess process;
         FILE* output = nullptr;
         {
-            FILES::File const probe(candidate.path, "r");
+            files::File const probe(candidate.path, "r");
             if (!probe.stream())
                 continue;
             output = process.mypopen(candidate.command, "r");
@@ -94,7 +94,7 @@ bool OsInfo::getInstallDate(long& out)
 
 bool OsInfo::getOSName(std::string& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     out = "Linux";
     for (char const* path : nameFiles)
         if (getOSReleaseName(path, out))
@@ -104,7 +104,7 @@ bool OsInfo::getOSName(std::string& out)
 
 bool OsInfo::getOSReleaseName(std::string path, std::string& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     std::ifstream file(path);
     std::string line;
     if (!std::getline(file, line))
@@ -115,7 +115,7 @@ bool OsInfo::getOSReleaseName(std::string path, std::string& out)
 
 bool OsInfo::getKestoVersion(std::string path, std::string& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     std::ifstream file(path);
     std::string line;
     if (!std::getline(file, line))
@@ -135,10 +135,10 @@ bool OsInfo::getKestoVersion(std::string path, std::string& out)
 
 bool OsInfo::getOSVersion(std::string& out)
 {
-    LOG::Scope const scope(facts);
+    log::Scope const scope(facts);
     if (getKestoVersion("/etc/release", out))
         return true;
-    if (FILES::File const file("/etc/UnitedLinux-release", "r"); file.stream()) {
+    if (files::File const file("/etc/UnitedLinux-release", "r"); file.stream()) {
         utsname system{};
         if (uname(&system) != 0)
             return false;

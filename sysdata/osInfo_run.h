@@ -9,7 +9,7 @@
 namespace NQ
 {
 
-namespace OSINFO MI_INTERNAL
+namespace MI_INTERNAL os
 {
 
 struct Ran {
@@ -28,7 +28,7 @@ Ran run(OsInfo& info, Arguments arguments);
 Ran runLogged(OsInfo& info, Arguments const& arguments, std::vector<ParamInfo> const& params,
               char const* function);
 
-} // namespace MI_INTERNAL
+} // namespace os
 
 } // namespace NQ
 

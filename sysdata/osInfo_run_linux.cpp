@@ -11,12 +11,12 @@ namespace NQ
 namespace
 {
 
-using OSINFO::bufferSize;
-using OSINFO::methods;
+using os::bufferSize;
+using os::methods;
 
 } // namespace
 
-OSINFO::Ran OSINFO::run(OsInfo& info, Arguments arguments)
+os::Ran os::run(OsInfo& info, Arguments arguments)
 {
     std::vector<char*> entries;
     for (std::string& argument : arguments)
@@ -28,34 +28,34 @@ OSINFO::Ran OSINFO::run(OsInfo& info, Arguments arguments)
     return {status, output};
 }
 
-OSINFO::Ran OSINFO::runLogged(OsInfo& info, Arguments const& arguments,
-                              std::vector<ParamInfo> const& params, char const* function)
+os::Ran os::runLogged(OsInfo& info, Arguments const& arguments,
+                      std::vector<ParamInfo> const& params, char const* function)
 {
     Ran ran = run(info, arguments);
-    LOG::write(methods, LOG::progress,
-               LOG::message("outputBuffer: ", withoutPasswords(ran.output, params)), function);
+    log::write(methods, log::progress,
+               log::message("outputBuffer: ", withoutPasswords(ran.output, params)), function);
     return ran;
 }
 
 int OsInfo::executeCommand(char* program, char** arguments, char* output)
 {
-    LOG::Scope const scope(methods);
+    log::Scope const scope(methods);
     output[0] = '\0';
-    OSINFO::Arguments list{program};
+    os::Arguments list{program};
     for (char** argument = arguments + 1; **argument != '\0'; ++argument)
         list.emplace_back(*argument);
-    std::string const line = OSINFO::commandLine(list);
+    std::string const line = os::commandLine(list);
     if (line.size() >= bufferSize) {
-        LOG::write(methods, LOG::error, OSINFO::tooLong(program));
+        log::write(methods, log::error, os::tooLong(program));
         return 1;
     }
     FILE* pipe = popen(line.c_str(), "r");
     if (!pipe) {
         // The line itself may hold a password.
-        LOG::write(methods, LOG::error, LOG::message("Cannot open process: ", program));
+        log::write(methods, log::error, log::message("Cannot open process: ", program));
         return 1;
     }
-    bool const any = FILES::readToEnd(pipe, output, bufferSize);
+    bool const any = files::readToEnd(pipe, output, bufferSize);
     pclose(pipe);
     return any ? 1 : 0;
 }

@@ -30,7 +30,7 @@ char passwdProgram[] = "/usr/bin/passwd";
 
 void logMisfit(std::string const& command, char const* function)
 {
-    LOG::write(unit, LOG::error, LOG::message("Command does not fit: ", command), function);
+    log::write(unit, log::error, log::message("Command does not fit: ", command), function);
 }
 
 /** Starts a command and sees it end; a failed start is logged as the given text. */
@@ -39,7 +39,7 @@ bool run(char const* command, std::string const& failure, char const* function)
     MyProcess process;
     if (process.mypopen(command, "r"))
         return true;
-    LOG::write(unit, LOG::error, failure, function);
+    log::write(unit, log::error, failure, function);
     return false;
 }
 
@@ -55,13 +55,13 @@ bool makeAgeCommand(userInfo& info, std::string const& date, std::string const& 
 {
     USER_INFO::CalendarDay const day = USER_INFO::scanDay(date.c_str());
     long const requested = ito_time_t(day.year, day.month, day.day, 0, 0, 0, 0, -1);
-    if (!TEXT::print(command, sizeof command, "chage -l %s", user.c_str())) {
+    if (!text::print(command, sizeof command, "chage -l %s", user.c_str())) {
         logMisfit("chage -l", function);
         return false;
     }
     int const days = static_cast<int>(info.getDays(command, label, requested));
-    if (!TEXT::print(command, sizeof command, "chage %s %d %s", option, days, user.c_str())) {
-        logMisfit(LOG::message("chage ", option), function);
+    if (!text::print(command, sizeof command, "chage %s %d %s", option, days, user.c_str())) {
+        logMisfit(log::message("chage ", option), function);
         return false;
     }
     return true;
@@ -71,10 +71,10 @@ bool makeAgeCommand(userInfo& info, std::string const& date, std::string const& 
 
 int userInfo::setDelete(std::string user)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     char command[commandSize];
-    if (TEXT::print(command, sizeof command, "userdel -r %s", user.c_str()))
-        run(command, LOG::message("Cannot open process: command = ", command), __func__);
+    if (text::print(command, sizeof command, "userdel -r %s", user.c_str()))
+        run(command, log::message("Cannot open process: command = ", command), __func__);
     else
         logMisfit("userdel -r", __func__);
     return 1;
@@ -82,49 +82,49 @@ int userInfo::setDelete(std::string user)
 
 bool userInfo::setInactivityTimeout(std::string date, std::string user)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     char label[] = "Password expires";
     char command[commandSize];
     return makeAgeCommand(*this, date, user, label, "-I", command, __func__) &&
-           run(command, LOG::message("Cannot open process: command = ", command), __func__);
+           run(command, log::message("Cannot open process: command = ", command), __func__);
 }
 
 bool userInfo::setPasswordExpiration(std::string date, std::string user)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     char label[] = "Last password change";
     char command[commandSize];
     return makeAgeCommand(*this, date, user, label, "-M", command, __func__) &&
-           run(command, LOG::message("Cannot open process: chage -M"), __func__);
+           run(command, log::message("Cannot open process: chage -M"), __func__);
 }
 
 long userInfo::getDays(char* command, char* label, long reference)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     MyProcess process;
     FILE* const output = process.mypopen(command, "r");
     if (!output) {
-        LOG::write(unit, LOG::error, LOG::message("Cannot open process: command = ", command));
+        log::write(unit, log::error, log::message("Cannot open process: command = ", command));
         return noLimit;
     }
     USER_INFO::LabelledDate date;
     char line[lineSize];
     while (std::fgets(line, sizeof line, output))
         if (USER_INFO::scanLabelledDate(line, label, date) == USER_INFO::Scan::invalid)
-            LOG::write(unit, LOG::error, LOG::message("Invalid format: buffer = ", line));
+            log::write(unit, log::error, log::message("Invalid format: buffer = ", line));
 
     long const found = to_time_t(date.year, date.month.data(), date.day, 0, 0, 0, 0, -1);
     if (found <= reference)
         return (reference - found) / secondsPerDay;
-    LOG::write(unit, LOG::error, "new_day < last_day");
+    log::write(unit, log::error, "new_day < last_day");
     return noLimit;
 }
 
 bool userInfo::findIsAcctDisabled(char* user)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     bool const suseStyle =
-        FILES::canOpen("/etc/SuSE-release") || FILES::canOpen("/etc/UnitedLinux-release");
+        files::canOpen("/etc/SuSE-release") || files::canOpen("/etc/UnitedLinux-release");
     char const* const args[] = {passwdProgram, "-S", user, ""};
     char output[runnerSize] = "";
     if (!executeLinCommand(passwdProgram, args, output))
@@ -137,7 +137,7 @@ bool userInfo::findIsAcctDisabled(char* user)
 
 bool userInfo::executeLinCommand(char* command, char const* const* args, char* output)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     output[0] = '\0';
     std::string line = command;
     for (char const* const* arg = args + 1; **arg != '\0'; ++arg)
@@ -150,12 +150,12 @@ bool userInfo::executeLinCommand(char* command, char const* const* args, char* o
     FILE* const pipe = popen(line.c_str(), "r");
     if (!pipe) {
         // The line itself may hold what is not for the log.
-        LOG::write(unit, LOG::error, LOG::message("Cannot open process: ", command));
+        log::write(unit, log::error, log::message("Cannot open process: ", command));
         return false;
     }
     // Contract: no bound is passed, so other callers' buffers count as large enough.
     std::size_t const size = command == passwdProgram ? runnerSize : SIZE_MAX;
-    bool const any = FILES::readToEnd(pipe, output, size);
+    bool const any = files::readToEnd(pipe, output, size);
     pclose(pipe);
     return any;
 }

@@ -15,7 +15,7 @@ namespace USER_INFO
 
 std::string loggerUserInfo = "Veltrix.IC.MI.OsSwMI.UserInfo";
 unsigned long const never = 0xFFFFFFFFUL;
-LOG::Unit const unit{loggerUserInfo, "userInfo_linux"};
+log::Unit const unit{loggerUserInfo, "userInfo_linux"};
 
 } // namespace USER_INFO
 
@@ -47,157 +47,157 @@ userInfo::userInfo(std::string name) : userName_(std::move(name)) {}
 
 std::string userInfo::getUserName()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return userName_;
 }
 
 std::string userInfo::getUserFullName()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return fullName_;
 }
 
 void userInfo::setUserFullName(std::string fullName)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     fullName_ = std::move(fullName);
 }
 
 std::string userInfo::getUserHomeDir()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return homeDir_;
 }
 
 void userInfo::setUserHomeDir(std::string homeDir)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     homeDir_ = std::move(homeDir);
 }
 
 std::string userInfo::getUserScriptPath()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return scriptPath_;
 }
 
 void userInfo::setUserScriptPath(std::string scriptPath)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     scriptPath_ = std::move(scriptPath);
 }
 
 std::string userInfo::getUserPassword()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return password_;
 }
 
 void userInfo::setUserPassword(std::string password)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     password_ = std::move(password);
 }
 
 std::string userInfo::getUserId()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return userId_;
 }
 
 void userInfo::setUserId(std::string userId)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     userId_ = std::move(userId);
 }
 
 std::string userInfo::getGroupId()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return groupId_;
 }
 
 void userInfo::setGroupId(std::string groupId)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     groupId_ = std::move(groupId);
 }
 
 bool userInfo::IsUserAcctDisabled()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return acctDisabled_;
 }
 
 void userInfo::setUserAcctDisabled(bool disabled)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     acctDisabled_ = disabled;
 }
 
 bool userInfo::IsDelete()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return delete_;
 }
 
 unsigned long userInfo::getPwdMinDays()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return pwdMinDays_;
 }
 
 void userInfo::setPwdMinDays(unsigned long days)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     pwdMinDays_ = unlessNever(days, 0);
 }
 
 unsigned long userInfo::getPwdMaxDays()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return pwdMaxDays_;
 }
 
 void userInfo::setPwdMaxDays(unsigned long days)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     pwdMaxDays_ = unlessNever(days, noLimit);
 }
 
 unsigned long userInfo::getPwdWarnDays()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return pwdWarnDays_;
 }
 
 void userInfo::setPwdWarnDays(unsigned long days)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     pwdWarnDays_ = unlessNever(days, 7);
 }
 
 unsigned long userInfo::getPwdExpDays()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return pwdExpDays_;
 }
 
 void userInfo::setPwdExpDays(unsigned long days)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     pwdExpDays_ = unlessNever(days, noLimit);
 }
 
 unsigned long userInfo::getPwdInactDays()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return pwdInactDays_;
 }
 
 void userInfo::setPwdInactDays(unsigned long days)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     char january[] = "Jan";
     if (unlessNever(days, noLimit) == noLimit)
         pwdInactDays_ = static_cast<unsigned long>(to_time_t(2038, january, 19, 0, 0, 0, 0, -1));
@@ -208,38 +208,38 @@ void userInfo::setPwdInactDays(unsigned long days)
 
 unsigned long userInfo::getLstPwdChg()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return lstPwdChg_;
 }
 
 void userInfo::setLstPwdChg(unsigned long days)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     lstPwdChg_ = static_cast<unsigned long>(ito_time_t(1970, 1, 1, 0, 0, 0, 0, -1)) +
                  narrowed(days) * secondsPerDay;
 }
 
 long userInfo::getPasswordHistoryDepth()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return passwordHistoryDepth_;
 }
 
 void userInfo::setPasswordHistoryDepth(long depth)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     passwordHistoryDepth_ = depth;
 }
 
 long userInfo::getMaxLoginFailures()
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     return maxLoginFailures_;
 }
 
 void userInfo::setMaxLoginFailures(long failures)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     maxLoginFailures_ = failures;
 }
 

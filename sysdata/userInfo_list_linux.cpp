@@ -101,9 +101,9 @@ void setAgeing(userInfo& user, spwd const& entry)
 }
 
 /** The number that the login service's rules allow; the last one in the file, 0 without one. */
-long readMaxLoginFailures(FILES::WholeText& text, char const* function)
+long readMaxLoginFailures(files::WholeText& text, char const* function)
 {
-    FILES::File const file("/etc/pam.d/login", "r");
+    files::File const file("/etc/pam.d/login", "r");
     if (!file.stream())
         return 0;
     long failures = 0;
@@ -111,7 +111,7 @@ long readMaxLoginFailures(FILES::WholeText& text, char const* function)
     for (std::string line = USER_INFO::takeDenyLine(rules); !line.empty();
          line = USER_INFO::takeDenyLine(rules))
         if (USER_INFO::scanDeny(line, failures) == USER_INFO::Scan::invalid)
-            LOG::write(unit, LOG::error, LOG::message("Invalid format: line = ", line), function);
+            log::write(unit, log::error, log::message("Invalid format: line = ", line), function);
     return failures;
 }
 
@@ -119,10 +119,10 @@ long readMaxLoginFailures(FILES::WholeText& text, char const* function)
 
 void getUserInfo(std::vector<userInfo>& users)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     users.clear();
     AccountFiles files;
-    FILES::WholeText rules;
+    files::WholeText rules;
     while (passwd const* account = files.nextAccount()) {
         if (!isReportedUser(account->pw_uid))
             continue;

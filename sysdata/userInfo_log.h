@@ -10,7 +10,7 @@ namespace USER_INFO
 {
 
 /** Where the messages of users' records, listings and operations come from. */
-extern LOG::Unit const unit MI_INTERNAL;
+extern log::Unit const unit MI_INTERNAL;
 
 } // namespace USER_INFO
 

@@ -13,7 +13,7 @@ std::string loggerMyProcess = "Veltrix.IC.MI.OsSwMI.MyProcess";
 namespace
 {
 
-LOG::Unit const unit{loggerMyProcess, "MyProcess"};
+log::Unit const unit{loggerMyProcess, "MyProcess"};
 
 // By month number; 0 holds a name that matches no month.
 char const* const monthNames[] = {"   ", "Jan", "Feb", "Mar", "Apr", "May", "Jun",
@@ -46,7 +46,7 @@ FILE* MyProcess::mypopen(char const* command, char const* mode)
 
 char* strget(char* str, char c)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     char* start = str;
     while (*start != '\0' && *start == c)
         ++start;
@@ -59,12 +59,12 @@ char* strget(char* str, char c)
 void Tokenize(std::string const& text, std::vector<std::string>& tokens,
               std::string const& delimiters)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     bool const secret = text.find("Password") != std::string::npos;
-    for (std::string const& token : TEXT::split(text, delimiters)) {
+    for (std::string const& token : text::split(text, delimiters)) {
         if (!secret)
-            LOG::write(unit, LOG::progress,
-                       LOG::message("str.substr(lastPos, pos - lastPos) = ", token));
+            log::write(unit, log::progress,
+                       log::message("str.substr(lastPos, pos - lastPos) = ", token));
         tokens.push_back(token);
     }
 }
@@ -72,9 +72,9 @@ void Tokenize(std::string const& text, std::vector<std::string>& tokens,
 time_t to_time_t(int year, char* month, int day, int weekday, int hour, int minute, int second,
                  int isdst)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     if (year <= 1900) {
-        LOG::write(unit, LOG::error, LOG::message("Invalid YY: YY = ", year));
+        log::write(unit, log::error, log::message("Invalid YY: YY = ", year));
         return 0;
     }
     std::tm fields{};
@@ -93,7 +93,7 @@ time_t to_time_t(int year, char* month, int day, int weekday, int hour, int minu
 time_t ito_time_t(int year, int month, int day, int weekday, int hour, int minute, int second,
                   int isdst)
 {
-    LOG::Scope const scope(unit);
+    log::Scope const scope(unit);
     char name[4];
     std::strcpy(name, monthNames[month >= 1 && month <= lastMonth ? month : 0]);
     return to_time_t(year, name, day, weekday, hour, minute, second, isdst);

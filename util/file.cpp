@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-namespace NQ::FILES
+namespace NQ::files
 {
 
 File::File(char const* path, char const* mode) : stream_(std::fopen(path, mode)) {}
@@ -50,4 +50,4 @@ std::string_view WholeText::read(FILE* stream)
     }
 }
 
-} // namespace NQ::FILES
+} // namespace NQ::files

@@ -12,7 +12,7 @@
 namespace NQ
 {
 
-namespace FILES MI_INTERNAL
+namespace MI_INTERNAL files
 {
 
 /** A stream opened with fopen, closed when the object goes. */
@@ -57,7 +57,7 @@ private:
     std::vector<char> buffer_;
 };
 
-} // namespace MI_INTERNAL
+} // namespace files
 
 } // namespace NQ
 

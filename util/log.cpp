@@ -4,7 +4,7 @@
 
 #include <new>
 
-namespace NQ::LOG
+namespace NQ::log
 {
 
 void write(Unit const& unit, Level level, std::string const& message, char const* function,
@@ -43,4 +43,4 @@ Scope::~Scope()
     writeLast(unit_, name_, ": exit", function_, line_);
 }
 
-} // namespace NQ::LOG
+} // namespace NQ::log

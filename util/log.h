@@ -11,7 +11,7 @@
 namespace NQ
 {
 
-namespace LOG MI_INTERNAL
+namespace MI_INTERNAL log
 {
 
 enum Level { progress = 3000, power = 4000, error = 6000 };
@@ -73,7 +73,7 @@ private:
     int line_;
 };
 
-} // namespace MI_INTERNAL
+} // namespace log
 
 } // namespace NQ
 

@@ -3,7 +3,7 @@
 #include <cstdarg>
 #include <cstdio>
 
-namespace NQ::TEXT
+namespace NQ::text
 {
 
 void replaceAfterFirst(char* s, char from, char to)
@@ -40,4 +40,4 @@ std::vector<std::string> split(std::string const& text, std::string const& delim
     return tokens;
 }
 
-} // namespace NQ::TEXT
+} // namespace NQ::text

@@ -11,7 +11,7 @@
 namespace NQ
 {
 
-namespace TEXT MI_INTERNAL
+namespace MI_INTERNAL text
 {
 
 /**
@@ -33,7 +33,7 @@ bool print(char* buffer, std::size_t size, char const* format, ...)
 /** Every maximal run of characters of the text that holds no delimiter, in order. */
 std::vector<std::string> split(std::string const& text, std::string const& delimiters);
 
-} // namespace MI_INTERNAL
+} // namespace text
 
 } // namespace NQ
 

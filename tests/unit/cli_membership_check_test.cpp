@@ -73,7 +73,7 @@ TEST(MembershipChange, KeepsTheGroupsThatThePluginReads)
     std::string list = identity->primary.name + ",";
     for (Group const& group : identity->groups)
         list += '"' + group.name + "\",";
-    EXPECT_EQ(NQ::OSINFO::supplementaryGroups(plain, "\"new\"", true), list + "\"new\"");
+    EXPECT_EQ(NQ::os::supplementaryGroups(plain, "\"new\"", true), list + "\"new\"");
     EXPECT_EQ(objectionTo(plain), "none");
 }
 

@@ -8,7 +8,7 @@
 namespace
 {
 
-using namespace NQ::DRIVERINFO;
+using namespace NQ::driverLines;
 
 struct Word {
     bool found;

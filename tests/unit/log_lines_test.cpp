@@ -8,7 +8,7 @@
 namespace
 {
 
-using namespace NQ::LOGINFO;
+using namespace NQ::logLines;
 
 Today todayOf(int year, char const* month)
 {

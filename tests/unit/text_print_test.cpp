@@ -9,21 +9,21 @@ namespace
 TEST(PrintIntoABuffer, FillsItToTheLastByteButOne)
 {
     char buffer[6];
-    EXPECT_TRUE(NQ::TEXT::print(buffer, sizeof buffer, "%s-%d", "abc", 7));
+    EXPECT_TRUE(NQ::text::print(buffer, sizeof buffer, "%s-%d", "abc", 7));
     EXPECT_EQ(std::string(buffer), "abc-7");
 }
 
 TEST(PrintIntoABuffer, RefusesATextOneByteTooLong)
 {
     char buffer[6];
-    EXPECT_FALSE(NQ::TEXT::print(buffer, sizeof buffer, "%s-%d", "abcd", 7));
+    EXPECT_FALSE(NQ::text::print(buffer, sizeof buffer, "%s-%d", "abcd", 7));
     EXPECT_EQ(std::string(buffer), "abcd-");
 }
 
 TEST(PrintIntoABuffer, TakesAnEmptyText)
 {
     char buffer[] = "abc";
-    EXPECT_TRUE(NQ::TEXT::print(buffer, sizeof buffer, "%s", ""));
+    EXPECT_TRUE(NQ::text::print(buffer, sizeof buffer, "%s", ""));
     EXPECT_STREQ(buffer, "");
 }
 

@@ -32,7 +32,8 @@ Error OsSwMI::initialize(unsigned int first, Number const& second, Number const&
 void OsSwMI::unload()
 {
     NQ::log::Scope const scope(OSSWMI::unit);
-    ManagementInterface::unload(); // deletes the nodes: a later life must not take others for them
+    ManagementInterface::unload(); // deletes the nodes: a later life must not mistake others for
+                                   // them
     for (std::vector<Node*>* kind : {&logEntryNodes_, &groupNodes_, &userNodes_})
         kind->clear();
     delete nodeIds_;
@@ -44,14 +45,17 @@ void OsSwMI::publishNode(Node* node)
     NQ::log::Scope const scope(OSSWMI::unit);
     Error const error = addNewNode(node);
     if (error.getStatus() != 0)
-        NQ::log::write(OSSWMI::unit, NQ::log::error,
-                       NQ::log::message("addNewNode error = ", static_cast<std::string>(error)));
+        scope.error("addNewNode error = ", static_cast<std::string>(error));
 }
 
-unsigned int OsSwMI::takeNodeId(bool note)
+unsigned int OsSwMI::takeNodeId()
 {
-    if (note)
-        nodeIds_->push_back(nextNodeId_);
+    nodeIds_->push_back(nextNodeId_);
+    return takeUnnotedNodeId();
+}
+
+unsigned int OsSwMI::takeUnnotedNodeId()
+{
     return nextNodeId_++;
 }
 
@@ -71,16 +75,13 @@ void OsSwMI::setUp(std::string const& description)
     currentNode_->setDescription(description);
 }
 
-void OsSwMI::dropNodes(std::vector<Node*>& nodes, bool refresh, char const* announcement,
-                       char const* function)
+void OsSwMI::deleteNodes(std::vector<Node*>& nodes, char const* announcement,
+                         NQ::log::Scope const& scope)
 {
-    std::vector<Node*> dropped;
-    dropped.swap(nodes);
-    if (!refresh)
-        return;
-    for (Node* node : dropped) {
-        NQ::log::write(OSSWMI::unit, NQ::log::progress,
-                       NQ::log::message(announcement, node->getDescription()), function);
+    std::vector<Node*> deleted;
+    deleted.swap(nodes);
+    for (Node* node : deleted) {
+        scope.progress(announcement, node->getDescription());
         deleteNode(node);
     }
 }

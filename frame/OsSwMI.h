@@ -65,8 +65,11 @@ protected:
     std::vector<Node*> logEntryNodes_;
 
 private:
-    /** Takes the next node id; at start-up it is also noted in the node-id list. */
-    MI_INTERNAL unsigned int takeNodeId(bool note = true);
+    /** Takes the next node id and notes it in the node-id list. */
+    MI_INTERNAL unsigned int takeNodeId();
+
+    /** Takes the next node id for a node of a rebuild, whose id is not noted. */
+    MI_INTERNAL unsigned int takeUnnotedNodeId();
 
     /**
      * Makes a freshly made node the current one and hands it to the framework.
@@ -80,12 +83,9 @@ private:
     /** Gives the current node its status and its description. */
     MI_INTERNAL void setUp(std::string const& description);
 
-    /**
-     * Empties a list of user or group nodes; on a refresh each node is announced in the log and
-     * deleted. At start-up they stay with the framework.
-     */
-    MI_INTERNAL void dropNodes(std::vector<Node*>& nodes, bool refresh, char const* announcement,
-                               char const* function);
+    /** Empties a list of user or group nodes: announces each in the log and deletes it. */
+    MI_INTERNAL void deleteNodes(std::vector<Node*>& nodes, char const* announcement,
+                                 NQ::log::Scope const& scope);
 };
 
 /** The interface object that initialize ran on; node classes rebuild nodes through it. */

@@ -15,12 +15,12 @@ GroupNode::GroupNode(unsigned int nodeId, unsigned int parentId, std::vector<uns
                      unsigned int nodeType, unsigned int index)
     : MutableNode(nodeId, parentId, miIds, nodeType, index)
 {
-    NQ::log::write(OSSWMI::unit, NQ::log::progress, "GroupNode::GroupNode: entry");
+    NQ::log::entry(OSSWMI::unit, "GroupNode::GroupNode");
 }
 
 GroupNode::~GroupNode()
 {
-    NQ::log::writeLast(OSSWMI::unit, "GroupNode::~GroupNode", ": entry");
+    NQ::log::lastEntry(OSSWMI::unit, "GroupNode::~GroupNode");
 }
 
 Error GroupNode::getProperty(unsigned int id, PropertyValue& value) const
@@ -38,15 +38,18 @@ void OsSwMI::createGroupNodes(bool refresh)
 {
     NQ::log::Scope const scope(OSSWMI::unit);
     NQ::MutexLock const lock(OSSWMI::myuserlock);
-    dropNodes(groupNodes_, refresh, "Delete a group entry: ", __func__);
+    if (refresh)
+        deleteNodes(groupNodes_, "Delete a group entry: ", scope);
+    else
+        groupNodes_.clear(); // the framework's own from now on
     std::vector<groupInfo> groups;
     NQ::getGroupInfo(groups);
     auto const count = static_cast<unsigned int>(groups.size());
-    NQ::log::write(OSSWMI::unit, NQ::log::progress, NQ::log::message("groups.size() = ", count));
+    scope.progress("groups.size() = ", count);
     groupNodes_.reserve(count);
     unsigned int position = 0;
     for (groupInfo& group : groups) {
-        unsigned int const nodeId = takeNodeId(!refresh);
+        unsigned int const nodeId = refresh ? takeUnnotedNodeId() : takeNodeId();
         MutableNode* const node =
             adopt(std::make_unique<GroupNode>(nodeId, osNode_->getNodeId(), miIds_, nodeType::group,
                                               ++position),
@@ -54,8 +57,8 @@ void OsSwMI::createGroupNodes(bool refresh)
         setUp("Group");
         std::string const name = group.getGroupName();
         unsigned int const id = group.getGroupId();
-        NQ::log::write(OSSWMI::unit, NQ::log::progress, NQ::log::message("Name = ", name));
-        NQ::log::write(OSSWMI::unit, NQ::log::progress, NQ::log::message("Id = ", id));
+        scope.progress("Name = ", name);
+        scope.progress("Id = ", id);
         values::setProperties(*node, {{property::name, values::text(name)},
                                       {property::id, values::number(id)},
                                       {property::members, values::texts(group.getGroupMembers())},

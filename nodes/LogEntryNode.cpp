@@ -23,12 +23,12 @@ LogEntryNode::LogEntryNode(unsigned int nodeId, unsigned int parentId,
                            unsigned int index)
     : MutableNode(nodeId, parentId, miIds, nodeType, index)
 {
-    NQ::log::write(OSSWMI::unit, NQ::log::progress, "LogEntryNode::LogEntryNode: entry");
+    NQ::log::entry(OSSWMI::unit, "LogEntryNode::LogEntryNode");
 }
 
 LogEntryNode::~LogEntryNode()
 {
-    NQ::log::writeLast(OSSWMI::unit, "LogEntryNode::~LogEntryNode", ": entry");
+    NQ::log::lastEntry(OSSWMI::unit, "LogEntryNode::~LogEntryNode");
 }
 
 Error LogEntryNode::getProperty(unsigned int id, PropertyValue& value) const

@@ -76,12 +76,12 @@ void store(OsInfo& info, NumberFact const (&facts)[count], MutableNode& node)
     }
 }
 
-void logTime(char const* what, long seconds, char const* function)
+void logTime(NQ::log::Scope const& scope, char const* what, long seconds)
 {
     time_t const time = seconds;
     char text[32] = "";
     ctime_r(&time, text);
-    NQ::log::write(OSSWMI::unit, NQ::log::progress, NQ::log::message(what, text), function);
+    scope.progress(what, text);
 }
 
 } // namespace
@@ -90,12 +90,12 @@ OsNode::OsNode(unsigned int nodeId, unsigned int parentId, std::vector<unsigned 
                unsigned int nodeType, unsigned int index)
     : MutableNode(nodeId, parentId, miIds, nodeType, index)
 {
-    NQ::log::write(OSSWMI::unit, NQ::log::progress, "OsNode::OsNode: entry");
+    NQ::log::entry(OSSWMI::unit, "OsNode::OsNode");
 }
 
 OsNode::~OsNode()
 {
-    NQ::log::writeLast(OSSWMI::unit, "OsNode::~OsNode", ": entry");
+    NQ::log::lastEntry(OSSWMI::unit, "OsNode::~OsNode");
 }
 
 Error OsNode::getProperty(unsigned int id, PropertyValue& value) const
@@ -149,11 +149,11 @@ void OsSwMI::createOsNodes()
     long time = 0;
     if (info.getLastBootTime(time)) {
         osNode_->setProperty(property::lastBootTime, values::date(time));
-        logTime("LastBootTime = ", time, __func__);
+        logTime(scope, "LastBootTime = ", time);
     }
     if (info.getInstallDate(time)) {
         osNode_->setProperty(property::installDate, values::date(time));
-        logTime("InstallDate = ", time, __func__);
+        logTime(scope, "InstallDate = ", time);
     }
 }
 

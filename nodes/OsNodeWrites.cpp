@@ -1,6 +1,7 @@
 // What the operating-system node does when a host writes to it.
 
 #include "frame/OsSwMI.h"
+#include "host/Methods.h"
 #include "host/Properties.h"
 #include "host/make_string.h"
 #include "nodes/OsNode.h"
@@ -26,15 +27,14 @@ void rebuildAccounts()
 }
 
 /** Carries out the method that the value calls for, if any. @return false where it failed */
-bool administer(NQ::OsInfo& info, PropertyValue const& value, char const* function)
+bool administer(NQ::OsInfo& info, PropertyValue const& value, NQ::log::Scope const& scope)
 {
-    NQ::log::write(OSSWMI::unit, NQ::log::progress, "PropertyType::CreateUser: entry", function);
+    scope.progress("PropertyType::CreateUser: entry");
     std::string const call = NQ::make_string(NQ::make_wstring(static_cast<std::string>(value)));
     if (call.empty() || call == "dummy")
         return true;
-    if (call.find("Password") == std::string::npos)
-        NQ::log::write(OSSWMI::unit, NQ::log::progress,
-                       NQ::log::message("CreateUser: inMethodAndParams = ", call), function);
+    if (call.find(parameter::password) == std::string::npos)
+        scope.progress("CreateUser: inMethodAndParams = ", call);
     if (!info.setCreateUser(call))
         return false;
     rebuildAccounts();
@@ -64,7 +64,7 @@ Error OsNode::setProperty(unsigned int const& id, PropertyValue const& value)
             rebuildAccounts();
         break;
     case property::createUser:
-        if (!administer(info, value, __func__)) {
+        if (!administer(info, value, scope)) {
             MutableNode::setProperty(id, PropertyValue("", true));
             return values::failure();
         }

@@ -93,23 +93,23 @@ std::string textOf(MutableNode const& node, unsigned int id)
 }
 
 /** Gives an account a new encrypted password by way of a file that chpasswd reads. */
-void setPassword(std::string const& user, std::string const& password, char const* function)
+void setPassword(std::string const& user, std::string const& password, NQ::log::Scope const& scope)
 {
     std::ofstream file("usrandpwd");
     file << user << ':' << password << std::endl;
-    constexpr char const* command = "chpasswd -e < usrandpwd ; rm -f usrandpwd";
+    constexpr char const* line = "chpasswd -e < usrandpwd ; rm -f usrandpwd";
     NQ::MyProcess process;
-    if (!process.mypopen(command, "r"))
-        NQ::log::write(OSSWMI::unit, NQ::log::error,
-                       NQ::log::message("Cannot open process: ", command), function);
+    if (!process.mypopen(line, "r"))
+        scope.error("Cannot open process: ", line);
 }
 
 /** Does to the system what a write asks for; nothing, for most properties. */
-void act(MutableNode const& node, unsigned int id, PropertyValue const& value, char const* function)
+void act(MutableNode const& node, unsigned int id, PropertyValue const& value,
+         NQ::log::Scope const& scope)
 {
     switch (id) {
     case property::password:
-        setPassword(textOf(node, property::name), textOf(value), function);
+        setPassword(textOf(node, property::name), textOf(value), scope);
         break;
     case property::inactiveTime:
         userInfo().setInactivityTimeout(textOf(value), textOf(node, property::name));
@@ -118,7 +118,7 @@ void act(MutableNode const& node, unsigned int id, PropertyValue const& value, c
         userInfo().setPasswordExpiration(textOf(value), textOf(node, property::name));
         break;
     case property::deleteUser:
-        if (static_cast<unsigned int>(value) == 1)
+        if (static_cast<unsigned int>(value) == command::deleteAccount)
             userInfo().setDelete(textOf(node, property::id)); // Contract: by id, not by name
         break;
     default:
@@ -132,12 +132,12 @@ UserNode::UserNode(unsigned int nodeId, unsigned int parentId, std::vector<unsig
                    unsigned int nodeType, unsigned int index)
     : MutableNode(nodeId, parentId, miIds, nodeType, index)
 {
-    NQ::log::write(OSSWMI::unit, NQ::log::progress, "UserNode::UserNode: entry");
+    NQ::log::entry(OSSWMI::unit, "UserNode::UserNode");
 }
 
 UserNode::~UserNode()
 {
-    NQ::log::writeLast(OSSWMI::unit, "UserNode::~UserNode", ": entry");
+    NQ::log::lastEntry(OSSWMI::unit, "UserNode::~UserNode");
 }
 
 Error UserNode::getProperty(unsigned int id, PropertyValue& value) const
@@ -156,7 +156,7 @@ Error UserNode::setProperty(unsigned int const& id, PropertyValue const& value)
 {
     NQ::log::Scope const scope(OSSWMI::unit, {"UserNode::setProperty"});
     if (!OSSWMI::MI_call)
-        act(*this, id, value, __func__);
+        act(*this, id, value, scope);
     return MutableNode::setProperty(id, value);
 }
 
@@ -164,13 +164,16 @@ void OsSwMI::createUserNodes(bool refresh)
 {
     NQ::log::Scope const scope(OSSWMI::unit);
     NQ::MutexLock const lock(OSSWMI::myuserlock);
-    dropNodes(userNodes_, refresh, "Delete a user entry: ", __func__);
+    if (refresh)
+        deleteNodes(userNodes_, "Delete a user entry: ", scope);
+    else
+        userNodes_.clear(); // the framework's own from now on
     std::vector<userInfo> users;
     NQ::getUserInfo(users);
     userNodes_.reserve(users.size());
     unsigned int position = 0;
     for (userInfo& user : users) {
-        unsigned int const nodeId = takeNodeId(!refresh);
+        unsigned int const nodeId = refresh ? takeUnnotedNodeId() : takeNodeId();
         auto node = std::make_unique<UserNode>(nodeId, osNode_->getNodeId(), miIds_, nodeType::user,
                                                ++position);
         {

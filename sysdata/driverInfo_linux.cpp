@@ -20,34 +20,33 @@ using driverLines::lineSize;
 
 log::Unit const unit{loggerDriverInfo, "driverInfo_linux"};
 
-void readFacts(FILE* modinfo, char const* module, driverInfo& driver, char const* function)
+void readFacts(FILE* modinfo, char const* module, driverInfo& driver, log::Scope const& scope)
 {
     driverLines::Seen seen;
     char line[lineSize];
     while (std::fgets(line, sizeof line, modinfo)) {
-        log::write(unit, log::progress, log::message("buffer2 = ", line), function);
+        scope.progress("buffer2 = ", line);
         if (!driverLines::takeFact(line, driver, seen))
-            log::write(unit, log::error, log::message("Invalid format: buffer2 = ", line),
-                       function);
+            scope.error("Invalid format: buffer2 = ", line);
     }
     driverLines::complete(driver, seen, module);
 }
 
-void addDriver(char const* module, std::vector<driverInfo>& drivers, char const* function)
+void addDriver(char const* module, std::vector<driverInfo>& drivers, log::Scope const& scope)
 {
     char command[lineSize];
     if (!text::print(command, sizeof command, "modinfo %s", module)) {
-        log::write(unit, log::error, log::message("Command too long: modinfo ", module), function);
+        scope.error("Command too long: modinfo ", module);
         return;
     }
     driverInfo driver;
     MyProcess process;
     FILE* const modinfo = process.mypopen(command, "r");
     if (!modinfo) {
-        log::write(unit, log::progress, "Cannot open process: modinfo", function);
+        scope.progress("Cannot open process: modinfo");
         return;
     }
-    readFacts(modinfo, module, driver, function);
+    readFacts(modinfo, module, driver, scope);
     drivers.push_back(driver);
 }
 
@@ -127,17 +126,17 @@ void getDriverInfo(std::vector<driverInfo>& drivers)
     MyProcess process;
     FILE* const lsmod = process.mypopen("lsmod", "r");
     if (!lsmod) {
-        log::write(unit, log::progress, "Cannot open process: lsmod");
+        scope.progress("Cannot open process: lsmod");
         return;
     }
     char line[lineSize];
     while (std::fgets(line, sizeof line, lsmod)) {
-        log::write(unit, log::progress, log::message("buffer = ", line));
+        scope.progress("buffer = ", line);
         char module[lineSize];
         if (!driverLines::findModule(line, module))
-            log::write(unit, log::error, log::message("Invalid format: buffer1 = ", line));
+            scope.error("Invalid format: buffer1 = ", line);
         else if (!driverLines::isHeader(module))
-            addDriver(module, drivers, __func__);
+            addDriver(module, drivers, scope);
     }
 }
 

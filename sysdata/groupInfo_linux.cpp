@@ -122,8 +122,7 @@ void groupInfo::Tokenize(std::string const& text, std::vector<std::string>& toke
     log::Scope const scope(unit);
     for (std::string& token : text::split(text, delimiters)) {
         tokens.push_back(std::move(token));
-        log::write(unit, log::progress,
-                   log::message("str.substr(lastPos, pos - lastPos) = ", tokens.back()));
+        scope.progress("str.substr(lastPos, pos - lastPos) = ", tokens.back());
     }
 }
 

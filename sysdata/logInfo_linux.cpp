@@ -39,22 +39,20 @@ void readEntry(logInfo& log, unsigned int index, char (&entry)[lineSize])
 }
 
 /** Whether the index is one that can be read; if not, says so. */
-bool isReadable(logInfo& log, unsigned int index, char const* label, char const* function)
+bool isReadable(logInfo& log, unsigned int index, char const* label, log::Scope const& scope)
 {
     // Kept: counted once for the message, also when there will be none, and anew to compare.
     unsigned int const countForMessage = log.getMaxLine();
     unsigned int const count = log.getMaxLine();
     if (count + 1 >= index)
         return true;
-    log::write(unit, log::error,
-               log::message("Invalid index: getMaxLine()=", countForMessage, label, index),
-               function);
+    scope.error("Invalid index: getMaxLine()=", countForMessage, label, index);
     return false;
 }
 
-void logInvalid(char const* text, char const* function)
+void logInvalid(log::Scope const& scope, char const* text)
 {
-    log::write(unit, log::error, log::message("Invalid format: buffer = ", text), function);
+    scope.error("Invalid format: buffer = ", text);
 }
 
 } // namespace
@@ -69,15 +67,15 @@ unsigned int logInfo::getMaxLine()
     MyProcess process;
     FILE* const output = process.mypopen(countCommand, "r");
     if (!output) {
-        log::write(unit, log::error, log::message("Cannot open process: ", countCommand));
+        scope.error("Cannot open process: ", countCommand);
         return 0;
     }
     char line[lineSize];
     readLine(output, line);
-    log::write(unit, log::progress, log::message("buffer = ", line));
+    scope.progress("buffer = ", line);
     unsigned int count = 0;
     if (!logLines::findCount(line, count))
-        logInvalid(line, __func__);
+        logInvalid(scope, line);
     return count;
 }
 
@@ -89,20 +87,20 @@ void logInfo::getLog(unsigned int line, char* buffer, int length)
     MyProcess process;
     FILE* const output = process.mypopen(command, "r");
     if (!output) {
-        log::write(unit, log::error, fetchCommand); // kept: without the number
+        scope.error(fetchCommand); // kept: without the number
         buffer[0] = '\0';
         return;
     }
     char text[lineSize];
     readLine(output, text);
-    log::write(unit, log::progress, log::message("buffer = ", text));
+    scope.progress("buffer = ", text);
     std::strncpy(buffer, strget(text, ' '), static_cast<std::size_t>(length));
 }
 
 bool logInfo::getData(std::string& text, unsigned int index)
 {
     log::Scope const scope(unit);
-    if (!isReadable(*this, index, ", Index=", __func__))
+    if (!isReadable(*this, index, ", Index=", scope))
         return false;
     char entry[lineSize] = "";
     readEntry(*this, index, entry);
@@ -114,7 +112,7 @@ bool logInfo::getData(std::string& text, unsigned int index)
 bool logInfo::getCreationTime(long& time, unsigned int index)
 {
     log::Scope const scope(unit);
-    if (!isReadable(*this, index, ", logIndex=", __func__))
+    if (!isReadable(*this, index, ", logIndex=", scope))
         return false;
     char entry[lineSize] = "";
     readEntry(*this, index, entry);
@@ -122,7 +120,7 @@ bool logInfo::getCreationTime(long& time, unsigned int index)
     std::memcpy(stampText, entry, stampLength);
     logLines::Stamp stamp;
     if (!logLines::findStamp(stampText, stamp)) {
-        logInvalid(stampText, __func__);
+        logInvalid(scope, stampText);
         return false;
     }
 
@@ -132,11 +130,11 @@ bool logInfo::getCreationTime(long& time, unsigned int index)
         char line[lineSize];
         readLine(output, line);
         if (!logLines::findToday(line, today)) {
-            logInvalid(line, __func__);
+            logInvalid(scope, line);
             return false;
         }
     } else {
-        log::write(unit, log::error, "Cannot opne process: date"); // kept: spelled so
+        scope.error("Cannot opne process: date"); // kept: spelled so
     }
     time = to_time_t(logLines::yearOf(stamp, today), stamp.month, stamp.day, 0, stamp.hour,
                      stamp.minute, stamp.second, -1);

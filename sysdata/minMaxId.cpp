@@ -2,11 +2,10 @@
 
 #include "util/file.h"
 
-#include <climits>
 #include <cstdio>
 #include <cstring>
 #include <iterator>
-#include <vector>
+#include <string>
 
 namespace NQ
 {
@@ -16,24 +15,6 @@ namespace
 
 constexpr char endMark = '\xFF';
 constexpr std::size_t keyLength = 7;
-
-/** The whole file, followed by the end mark and a NUL; empty where it cannot be read. */
-std::vector<char> readAll(char const* path)
-{
-    files::File const file(path, "r");
-    if (!file.stream() || std::fseek(file.stream(), 0, SEEK_END) != 0)
-        return {};
-    long const length = std::ftell(file.stream());
-    // A directory can be opened, too, and claims the largest length there is.
-    if (length < 0 || length == LONG_MAX || std::fseek(file.stream(), 0, SEEK_SET) != 0)
-        return {};
-    std::vector<char> text(static_cast<std::size_t>(length) + 2);
-    std::size_t const read =
-        std::fread(text.data(), 1, static_cast<std::size_t>(length), file.stream());
-    text[read] = endMark;
-    text[read + 1] = '\0';
-    return text;
-}
 
 } // namespace
 
@@ -48,9 +29,10 @@ minMaxId* minMaxId::Instance()
 
 minMaxId::minMaxId()
 {
-    std::vector<char> const text = readAll("/etc/login.defs");
-    if (!text.empty())
-        parse(text.data());
+    files::WholeText file;
+    std::string text(file.read("/etc/login.defs"));
+    text += endMark;
+    parse(text.c_str());
 }
 
 void minMaxId::parse(char const* text)

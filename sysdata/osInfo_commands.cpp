@@ -1,5 +1,6 @@
 #include "sysdata/osInfo_commands.h"
 
+#include "host/Methods.h"
 #include "sysdata/osInfo_log.h"
 
 #include <algorithm>
@@ -11,6 +12,10 @@ namespace NQ::os
 namespace
 {
 
+namespace method = IC::method;
+namespace parameter = IC::parameter;
+namespace parameterType = IC::parameterType;
+
 constexpr std::size_t argumentLimit = 39;
 constexpr std::size_t lengthLimit = 254;
 
@@ -20,24 +25,24 @@ struct TypeName {
 };
 
 constexpr TypeName typeNames[] = {
-    {"CMPI_string", ParamType::text},
-    {"CMPI_uint32", ParamType::number},
-    {"CMPI_dateTime", ParamType::date},
+    {parameterType::text, ParamType::text},
+    {parameterType::number, ParamType::number},
+    {parameterType::date, ParamType::date},
 };
 
 constexpr Method methodTable[] = {
-    {"UserAdd", MethodKind::userAdd, "/usr/sbin/useradd", true},
-    {"UserDel", MethodKind::userDel, "/usr/sbin/userdel", true},
-    {"UserSetAttrib", MethodKind::userSetAttrib, "/usr/bin/chage", true},
-    {"LocalGroupAdd", MethodKind::plain, "/usr/sbin/groupadd"},
-    {"LocalGroupDel", MethodKind::plain, "/usr/sbin/groupdel"},
-    {"GetShadowing", MethodKind::getShadowing},
-    {"LocalGroupAddUser", MethodKind::groupMembership},
-    {"LocalGroupDelUser", MethodKind::groupMembership},
-    {"UserSetFullName", MethodKind::userSetFullName, "/usr/sbin/usermod", true, true},
-    {"UserSetScriptPath", MethodKind::plain, "/usr/sbin/usermod", true, true},
-    {"UserSetHomeDir", MethodKind::plain, "/usr/sbin/usermod", true, true},
-    {"UserSetPassword", MethodKind::plain, "/usr/sbin/usermod", true, true},
+    {method::userAdd, MethodKind::userAdd, "/usr/sbin/useradd", AccountName::amongOthers},
+    {method::userDel, MethodKind::userDel, "/usr/sbin/userdel", AccountName::amongOthers},
+    {method::userSetAttrib, MethodKind::userSetAttrib, "/usr/bin/chage", AccountName::amongOthers},
+    {method::localGroupAdd, MethodKind::plain, "/usr/sbin/groupadd"},
+    {method::localGroupDel, MethodKind::plain, "/usr/sbin/groupdel"},
+    {method::getShadowing, MethodKind::getShadowing},
+    {method::localGroupAddUser, MethodKind::groupMembership},
+    {method::localGroupDelUser, MethodKind::groupMembership},
+    {method::userSetFullName, MethodKind::userSetFullName, "/usr/sbin/usermod", AccountName::last},
+    {method::userSetScriptPath, MethodKind::plain, "/usr/sbin/usermod", AccountName::last},
+    {method::userSetHomeDir, MethodKind::plain, "/usr/sbin/usermod", AccountName::last},
+    {method::userSetPassword, MethodKind::plain, "/usr/sbin/usermod", AccountName::last},
 };
 
 enum class Item { plain, fullName, scriptPath, homeDir, password, userName, expiry };
@@ -50,18 +55,18 @@ struct Option {
 };
 
 constexpr Option options[] = {
-    {ParamType::text, "FullName", Item::fullName, "-c"},
-    {ParamType::text, "Comment", Item::plain, "-c"},
-    {ParamType::text, "ScriptPath", Item::scriptPath, "-s"},
-    {ParamType::text, "HomeDir", Item::homeDir, "-d"},
-    {ParamType::text, passwordName, Item::password, "-p"},
-    {ParamType::text, "UserName", Item::userName, nullptr},
-    {ParamType::text, "GroupName", Item::plain, nullptr},
-    {ParamType::number, "daysMustKeepPassword", Item::plain, "-m"},
-    {ParamType::number, "daysMustChangePasswordAfter", Item::plain, "-M"},
-    {ParamType::number, "daysWarnBeforePasswordExpire", Item::plain, "-W"},
-    {ParamType::number, "daysExpireAfter", Item::plain, "-I"},
-    {ParamType::date, "passwordExpirationDate", Item::expiry, "-E"},
+    {ParamType::text, parameter::fullName, Item::fullName, "-c"},
+    {ParamType::text, parameter::comment, Item::plain, "-c"},
+    {ParamType::text, parameter::scriptPath, Item::scriptPath, "-s"},
+    {ParamType::text, parameter::homeDir, Item::homeDir, "-d"},
+    {ParamType::text, parameter::password, Item::password, "-p"},
+    {ParamType::text, parameter::userName, Item::userName, nullptr},
+    {ParamType::text, parameter::groupName, Item::plain, nullptr},
+    {ParamType::number, parameter::daysMustKeepPassword, Item::plain, "-m"},
+    {ParamType::number, parameter::daysMustChangePasswordAfter, Item::plain, "-M"},
+    {ParamType::number, parameter::daysWarnBeforePasswordExpire, Item::plain, "-W"},
+    {ParamType::number, parameter::daysExpireAfter, Item::plain, "-I"},
+    {ParamType::date, parameter::passwordExpirationDate, Item::expiry, "-E"},
 };
 
 Option const* findOption(ParamType type, std::string const& name)
@@ -82,7 +87,7 @@ void addText(Method const& method, Option const& option, std::string const& valu
         commands.password = value;
     if (option.item == Item::userName) {
         commands.user = value;
-        if (method.usermod)
+        if (method.accountName == AccountName::last)
             return;
     }
     bool const path = option.item == Item::scriptPath || option.item == Item::homeDir;
@@ -97,14 +102,14 @@ void addText(Method const& method, Option const& option, std::string const& valu
 
 /** @return false for a parameter of an unknown type, which the complaint then names */
 bool addParams(Method const& method, std::vector<ParamInfo> const& params, Commands& commands,
-               std::string& complaint)
+               Complaint& complaint)
 {
     bool const adding = method.kind == MethodKind::userAdd;
     Arguments& aged = adding ? commands.aging : commands.main;
     for (ParamInfo const& param : params) {
         ParamType const type = typeOf(param.type);
         if (type == ParamType::unknown) {
-            complaint = unknownType(param.type);
+            complaint = {unknownType, param.type};
             return false;
         }
         Option const* option = findOption(type, param.name);
@@ -131,12 +136,12 @@ bool closeLists(Method const& method, Commands& commands)
 {
     if (method.kind == MethodKind::userAdd && !commands.expires)
         removeExpiry(commands.aging);
-    if (method.userTool) {
+    if (method.accountName != AccountName::nowhere) {
         // Kept: the quotes differ, so this never holds and root can be deleted.
         if (method.kind == MethodKind::userDel && "'" + commands.user + "'" == "\"root\"")
             return false;
         commands.aging.push_back(commands.user);
-        if (method.usermod)
+        if (method.accountName == AccountName::last)
             commands.main.push_back(commands.user);
     }
     if (method.kind == MethodKind::userSetAttrib && !commands.expires)
@@ -207,7 +212,7 @@ std::string commandLine(Arguments const& arguments)
 }
 
 bool makeCommands(Method const& method, std::string const& program,
-                  std::vector<ParamInfo> const& params, Commands& commands, std::string& complaint)
+                  std::vector<ParamInfo> const& params, Commands& commands, Complaint& complaint)
 {
     commands.main = {program};
     commands.aging = {"/usr/bin/chage"};
@@ -216,7 +221,7 @@ bool makeCommands(Method const& method, std::string const& program,
     for (Arguments const* list : {&commands.main, &commands.aging}) {
         if (fits(*list))
             continue;
-        complaint = tooLong(list->front());
+        complaint = {tooLong, list->front()};
         return false;
     }
     return true;

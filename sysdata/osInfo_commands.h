@@ -20,9 +20,6 @@ enum class ParamType { text, number, date, unknown };
 
 ParamType typeOf(std::string const& name);
 
-/** The parameter whose value is kept out of the log. */
-constexpr char passwordName[] = "Password";
-
 /** The value as it is on a command line, each blank after a backslash. */
 std::string withEscapedBlanks(std::string const& value);
 
@@ -37,12 +34,14 @@ enum class MethodKind {
     plain
 };
 
+/** Where a method's program takes the account name. */
+enum class AccountName { nowhere, amongOthers, last };
+
 struct Method {
     char const* name;
     MethodKind kind;
     char const* program = "";
-    bool userTool = false; // takes an account name
-    bool usermod = false;  // takes it last
+    AccountName accountName = AccountName::nowhere;
 };
 
 /** Null for an unknown method. */
@@ -66,21 +65,30 @@ struct Commands {
     bool expires = false; // an expiry date was given
 };
 
+/** Why a call was refused. */
+struct Complaint {
+    char const* text = nullptr; // null: nothing is logged
+    std::string about;          // ends the message
+};
+
 /**
  * Builds the commands of one call. A list holds at most 39 arguments of 254 characters, and its
  * line must fit the buffer.
  *
  * @param program    what to run; the method's own program, possibly with options
- * @param complaint  on failure what to log, if anything
+ * @param complaint  set on failure
  */
 bool makeCommands(Method const& method, std::string const& program,
-                  std::vector<ParamInfo> const& params, Commands& commands, std::string& complaint);
+                  std::vector<ParamInfo> const& params, Commands& commands, Complaint& complaint);
 
 /** Whether the output begins with a text by which an account tool reports no error. */
 bool isBenign(std::string const& output);
 
 /** Whether the output begins with one of chage's own notices. */
 bool isAgingNotice(std::string const& output);
+
+/** What happens to a member. */
+enum class Membership { add, remove };
 
 /**
  * The supplementary groups that a member shall have, comma-separated.
@@ -89,7 +97,7 @@ bool isAgingNotice(std::string const& output);
  * @param quotedGroup  the group to add or to leave out, in double quotes
  */
 std::string supplementaryGroups(std::string const& identity, std::string const& quotedGroup,
-                                bool adding);
+                                Membership change);
 
 } // namespace os
 

@@ -43,13 +43,13 @@ void setRam(unsigned long amount, unsigned int memoryUnit, unsigned int& out)
 }
 
 void getRam(unsigned long Figures::*amount, char const* failure, unsigned int& out,
-            char const* function)
+            log::Scope const& scope)
 {
     Figures figures{};
     if (sysinfo(&figures) == 0) {
         setRam(figures.*amount, figures.mem_unit, out);
     } else {
-        log::write(facts, log::progress, failure, function);
+        scope.progress(failure);
         out = 0;
     }
 }
@@ -77,9 +77,9 @@ std::string withoutBlanks(std::string text)
     return text;
 }
 
-void powerDown(char const* announcement, char const* command, char const* function)
+void powerDown(log::Scope const& scope, char const* announcement, char const* command)
 {
-    log::write(facts, log::power, announcement, function);
+    scope.power(announcement);
     MyProcess process;
     process.mypopen(command, "r");
 }
@@ -142,14 +142,14 @@ bool OsInfo::getOSCreateUser(std::string& out)
 bool OsInfo::getPhysicalMemorySize(unsigned int& out)
 {
     log::Scope const scope(facts);
-    getRam(&Figures::totalram, "physicalMemorySize failed", out, __func__);
+    getRam(&Figures::totalram, "physicalMemorySize failed", out, scope);
     return true;
 }
 
 bool OsInfo::getPhysicalMemoryFree(unsigned int& out)
 {
     log::Scope const scope(facts);
-    getRam(&Figures::freeram, "physicalMemoryFree failed", out, __func__);
+    getRam(&Figures::freeram, "physicalMemoryFree failed", out, scope);
     return true;
 }
 
@@ -265,14 +265,14 @@ void OsInfo::strreplace(char* s, char from, char to)
 bool OsInfo::statusOffline()
 {
     log::Scope const scope(facts);
-    powerDown("Halt after shutdown.", "/sbin/shutdown -h now", __func__);
+    powerDown(scope, "Halt after shutdown.", "/sbin/shutdown -h now");
     return true;
 }
 
 bool OsInfo::statusReset()
 {
     log::Scope const scope(facts);
-    powerDown("Reboot after shutdown.", "/sbin/shutdown -r now", __func__);
+    powerDown(scope, "Reboot after shutdown.", "/sbin/shutdown -r now");
     return true;
 }
 

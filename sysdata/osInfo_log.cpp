@@ -1,5 +1,6 @@
 #include "sysdata/osInfo_log.h"
 
+#include "host/Methods.h"
 #include "sysdata/osInfo_commands.h"
 
 #include <algorithm>
@@ -11,7 +12,7 @@ std::string withoutPasswords(std::string const& output, std::vector<ParamInfo> c
 {
     std::vector<std::string> hidden;
     for (ParamInfo const& param : params)
-        if (param.name == passwordName && !param.value.empty())
+        if (param.name == IC::parameter::password && !param.value.empty())
             hidden.insert(hidden.end(), {param.value, withEscapedBlanks(param.value)});
     // The longest first, or a password that another one begins with would leave the rest of that.
     std::sort(hidden.begin(), hidden.end(), [](std::string const& one, std::string const& other) {
@@ -31,16 +32,6 @@ std::string withoutPasswords(std::string const& output, std::vector<ParamInfo> c
         }
     }
     return shown;
-}
-
-std::string unknownType(std::string const& type)
-{
-    return log::message("Unknown parameter type: ", type);
-}
-
-std::string tooLong(std::string const& program)
-{
-    return log::message("Command line too long: ", program);
 }
 
 } // namespace NQ::os

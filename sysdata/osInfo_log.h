@@ -26,9 +26,9 @@ extern log::Unit const methods;
  */
 std::string withoutPasswords(std::string const& output, std::vector<ParamInfo> const& params);
 
-// Error messages.
-std::string unknownType(std::string const& type);
-std::string tooLong(std::string const& program);
+// What error messages begin with; the type or the program follows.
+constexpr char unknownType[] = "Unknown parameter type: ";
+constexpr char tooLong[] = "Command line too long: ";
 
 } // namespace os
 

@@ -3,6 +3,7 @@
 
 #include "sysdata/osInfo_commands.h"
 #include "sysdata/osInfo_linux.h"
+#include "util/log.h"
 
 #include <string>
 
@@ -21,12 +22,12 @@ struct Ran {
 Ran run(OsInfo& info, Arguments arguments);
 
 /**
- * As run, and logs the output for the function.
+ * As run, and logs the output for the function whose scope it is.
  *
  * @param params  those of the call, whose passwords are hidden
  */
 Ran runLogged(OsInfo& info, Arguments const& arguments, std::vector<ParamInfo> const& params,
-              char const* function);
+              log::Scope const& scope);
 
 } // namespace os
 

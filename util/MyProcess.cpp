@@ -63,8 +63,7 @@ void Tokenize(std::string const& text, std::vector<std::string>& tokens,
     bool const secret = text.find("Password") != std::string::npos;
     for (std::string const& token : text::split(text, delimiters)) {
         if (!secret)
-            log::write(unit, log::progress,
-                       log::message("str.substr(lastPos, pos - lastPos) = ", token));
+            scope.progress("str.substr(lastPos, pos - lastPos) = ", token);
         tokens.push_back(token);
     }
 }
@@ -74,7 +73,7 @@ time_t to_time_t(int year, char* month, int day, int weekday, int hour, int minu
 {
     log::Scope const scope(unit);
     if (year <= 1900) {
-        log::write(unit, log::error, log::message("Invalid YY: YY = ", year));
+        scope.error("Invalid YY: YY = ", year);
         return 0;
     }
     std::tm fields{};

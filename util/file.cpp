@@ -36,14 +36,17 @@ bool readToEnd(FILE* stream, char* buffer, std::size_t size)
     return any;
 }
 
-std::string_view WholeText::read(FILE* stream)
+std::string_view WholeText::read(char const* path)
 {
+    File const file(path, "r");
+    if (!file.stream())
+        return {};
     constexpr std::size_t firstSize = 8192;
     buffer_.resize(std::max(buffer_.size(), firstSize));
-    std::setvbuf(stream, nullptr, _IONBF, 0); // straight into the buffer here
+    std::setvbuf(file.stream(), nullptr, _IONBF, 0); // straight into the buffer here
     std::size_t length = 0;
     while (true) {
-        length += std::fread(buffer_.data() + length, 1, buffer_.size() - length, stream);
+        length += std::fread(buffer_.data() + length, 1, buffer_.size() - length, file.stream());
         if (length < buffer_.size())
             return {buffer_.data(), length};
         buffer_.resize(2 * buffer_.size());

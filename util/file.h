@@ -42,16 +42,12 @@ bool canOpen(char const* path);
  */
 bool readToEnd(FILE* stream, char* buffer, std::size_t size);
 
-/** Reads streams as a whole; one reading uses the memory of the one before it. */
+/** Reads files as a whole; one reading uses the memory of the one before it. */
 class WholeText
 {
 public:
-    /**
-     * Reads a freshly opened stream to its end.
-     *
-     * @return what was read, good until the next reading
-     */
-    std::string_view read(FILE* stream);
+    /** @return what could be read of the file, good until the next reading */
+    std::string_view read(char const* path);
 
 private:
     std::vector<char> buffer_;

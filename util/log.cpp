@@ -1,14 +1,15 @@
 #include "util/log.h"
 
-#include "host/VXLogger.h"
-
 #include <new>
 
 namespace NQ::log
 {
 
-void write(Unit const& unit, Level level, std::string const& message, char const* function,
-           int line)
+namespace
+{
+
+/** Hands one message to the host, once through each of the logger's two operations. */
+void hand(Unit const& unit, int level, std::string const& message, char const* function, int line)
 {
     using VXLog::VXLogger;
     VXLogger::logLevelMessage(function, unit.file, line, unit.category, level, nullptr, 0, 0,
@@ -17,30 +18,42 @@ void write(Unit const& unit, Level level, std::string const& message, char const
                                 message);
 }
 
-void write(Unit const& unit, Level level, char const* text, char const* function, int line)
-{
-    write(unit, level, message(text), function, line);
-}
-
-void writeLast(Unit const& unit, char const* text, char const* end, char const* function,
-               int line) noexcept
+void handLast(Unit const& unit, char const* name, char const* end, char const* function,
+              int line) noexcept
 {
     try {
-        write(unit, progress, message(text, end), function, line);
+        hand(unit, VXLog::level::progress, assembled(name, end), function, line);
     } catch (std::bad_alloc const&) {
         return;
     }
 }
 
+} // namespace
+
 Scope::Scope(Unit const& unit, Named named, char const* function, int line)
     : unit_(unit), name_(named.name ? named.name : function), function_(function), line_(line)
 {
-    write(unit_, progress, message(name_, ": entry"), function_, line_);
+    entry(unit_, name_, function_, line_);
 }
 
 Scope::~Scope()
 {
-    writeLast(unit_, name_, ": exit", function_, line_);
+    handLast(unit_, name_, ": exit", function_, line_);
+}
+
+void Scope::write(int level, std::string const& message, int line) const
+{
+    hand(unit_, level, message, function_, line);
+}
+
+void entry(Unit const& unit, char const* name, char const* function, int line)
+{
+    hand(unit, VXLog::level::progress, assembled(name, ": entry"), function, line);
+}
+
+void lastEntry(Unit const& unit, char const* name, char const* function, int line) noexcept
+{
+    handLast(unit, name, ": entry", function, line);
 }
 
 } // namespace NQ::log

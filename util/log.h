@@ -1,6 +1,7 @@
 #ifndef UTIL_LOG_H
 #define UTIL_LOG_H
 
+#include "host/VXLogger.h"
 #include "host/VXMessageBuffer.h"
 #include "util/internal.h"
 
@@ -14,40 +15,27 @@ namespace NQ
 namespace MI_INTERNAL log
 {
 
-enum Level { progress = 3000, power = 4000, error = 6000 };
-
 /** Where a source unit's messages come from: its logger category and its name. */
 struct Unit {
     std::string const& category;
     char const* file;
 };
 
-/**
- * Hands one message to the host, once through each of the logger's two operations.
- *
- * The function name and line are those of the caller.
- */
-void write(Unit const& unit, Level level, std::string const& message,
-           char const* function = __builtin_FUNCTION(), int line = __builtin_LINE());
+/** What a message begins with, and the source line that writes it. */
+struct Beginning {
+    Beginning(char const* words, int sourceLine = __builtin_LINE()) : text(words), line(sourceLine)
+    {
+    }
 
-/** As above, for a fixed text. It takes a buffer of its own like every message. */
-void write(Unit const& unit, Level level, char const* text,
-           char const* function = __builtin_FUNCTION(), int line = __builtin_LINE());
+    char const* text;
+    int line;
+};
 
-/**
- * For destructors: as write, but a message for which there is no memory is lost.
- *
- * @param text  what the message begins with, such as "getOSName"
- * @param end   what it ends with, such as ": exit"
- */
-void writeLast(Unit const& unit, char const* text, char const* end,
-               char const* function = __builtin_FUNCTION(), int line = __builtin_LINE()) noexcept;
-
-/** Assembles a message from texts and numbers in a buffer of its own. */
-template <class... Parts> std::string message(Parts const&... parts)
+/** A message put together from texts and numbers, in a buffer of its own. */
+template <class... Pieces> std::string assembled(Pieces const&... pieces)
 {
     VXLog::VXMessageBuffer buffer;
-    return buffer.str((buffer << ... << parts));
+    return buffer.str((buffer << ... << pieces));
 }
 
 /** Logs a function's entry now and its exit on whatever path the function is left. */
@@ -61,17 +49,46 @@ public:
 
     explicit Scope(Unit const& unit, Named named = {nullptr},
                    char const* function = __builtin_FUNCTION(), int line = __builtin_LINE());
+
+    /** The exit is lost when there is no memory for it. */
     ~Scope();
 
     Scope(Scope const&) = delete;
     Scope& operator=(Scope const&) = delete;
 
+    // One message of the function, at the level of that name, assembled from the pieces.
+
+    template <class... Rest> void progress(Beginning first, Rest const&... rest) const
+    {
+        write(VXLog::level::progress, assembled(first.text, rest...), first.line);
+    }
+
+    template <class... Rest> void power(Beginning first, Rest const&... rest) const
+    {
+        write(VXLog::level::power, assembled(first.text, rest...), first.line);
+    }
+
+    template <class... Rest> void error(Beginning first, Rest const&... rest) const
+    {
+        write(VXLog::level::error, assembled(first.text, rest...), first.line);
+    }
+
 private:
+    void write(int level, std::string const& message, int line) const;
+
     Unit const& unit_;
     char const* name_;
     char const* function_;
     int line_;
 };
+
+/** Logs the entry of a constructor, for which there is no exit. */
+void entry(Unit const& unit, char const* name, char const* function = __builtin_FUNCTION(),
+           int line = __builtin_LINE());
+
+/** As entry, for a destructor: it is lost when there is no memory for it. */
+void lastEntry(Unit const& unit, char const* name, char const* function = __builtin_FUNCTION(),
+               int line = __builtin_LINE()) noexcept;
 
 } // namespace log
 

@@ -6,11 +6,12 @@ extern "C" int LLVMFuzzerTestOneInput(std::uint8_t const* data, std::size_t size
 {
     std::string const identity = fuzz::text(data, size);
     std::string const group = "\"staff\"";
-    std::string const added = NQ::os::supplementaryGroups(identity, group, true);
+    std::string const added = NQ::os::supplementaryGroups(identity, group, NQ::os::Membership::add);
     fuzz::require(added.size() >= group.size() &&
                   added.compare(added.size() - group.size(), group.size(), group) == 0);
 
-    std::string const left = NQ::os::supplementaryGroups(identity, group, false);
+    std::string const left =
+        NQ::os::supplementaryGroups(identity, group, NQ::os::Membership::remove);
     fuzz::require(left.empty() || identity.find('(') != std::string::npos);
     // A name with a quote of its own may look like another one.
     fuzz::require(identity.find('"') != std::string::npos ||

@@ -73,7 +73,8 @@ TEST(MembershipChange, KeepsTheGroupsThatThePluginReads)
     std::string list = identity->primary.name + ",";
     for (Group const& group : identity->groups)
         list += '"' + group.name + "\",";
-    EXPECT_EQ(NQ::os::supplementaryGroups(plain, "\"new\"", true), list + "\"new\"");
+    EXPECT_EQ(NQ::os::supplementaryGroups(plain, "\"new\"", NQ::os::Membership::add),
+              list + "\"new\"");
     EXPECT_EQ(objectionTo(plain), "none");
 }
 

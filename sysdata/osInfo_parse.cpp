@@ -1,5 +1,6 @@
 // Method-call texts: taken apart here, carried out by the executor.
 
+#include "host/Methods.h"
 #include "sysdata/osInfo_commands.h"
 #include "sysdata/osInfo_linux.h"
 #include "sysdata/osInfo_log.h"
@@ -23,12 +24,7 @@ enum class Outcome { next, stop, reject };
 bool isPassword(std::string const& item)
 {
     std::vector<std::string> const parts = text::split(item, ":");
-    return !parts.empty() && parts.front() == os::passwordName;
-}
-
-void note(char const* what, std::string const& text, char const* function)
-{
-    log::write(methods, log::progress, log::message(what, text), function);
+    return !parts.empty() && parts.front() == IC::parameter::password;
 }
 
 /** Year, month and day of a date-time text; its time of day, fraction and offset are dropped. */
@@ -46,9 +42,9 @@ bool readDate(std::string const& text, std::string& date)
     return true;
 }
 
-Outcome stopAtBlank(char const* function)
+Outcome stopAtBlank(log::Scope const& scope)
 {
-    log::write(methods, log::progress, "This parameter is blank ---exiting ", function);
+    scope.progress("This parameter is blank ---exiting ");
     return Outcome::stop;
 }
 
@@ -65,39 +61,39 @@ std::vector<std::string> partsOf(std::string const& item, bool secret)
         return parts;
     }
     // Tokenize does not log a text that holds this word.
-    Tokenize(item + ":" + os::passwordName, parts, ":");
+    Tokenize(item + ":" + IC::parameter::password, parts, ":");
     parts.pop_back();
     return parts;
 }
 
 /** Takes one item and appends the parameter that it makes. */
 Outcome parseItem(std::string const& item, bool secret, std::vector<ParamInfo>& params,
-                  char const* function)
+                  log::Scope const& scope)
 {
     std::vector<std::string> const parts = partsOf(item, secret);
     if (parts.size() < 2)
-        return stopAtBlank(function);
+        return stopAtBlank(scope);
 
     ParamInfo param{parts[0], parts[1], ""};
-    note("paramInfo.name=", param.name, function);
-    note("paramInfo.type=", param.type, function);
+    scope.progress("paramInfo.name=", param.name);
+    scope.progress("paramInfo.type=", param.type);
     ParamType const type = os::typeOf(param.type);
     if (type == ParamType::unknown) {
-        log::write(methods, log::error, os::unknownType(param.type), function);
+        scope.error(os::unknownType, param.type);
         return Outcome::reject;
     }
 
     bool const hasValue = parts.size() > 2;
     bool const date = type == ParamType::date;
     if (!hasValue && !date)
-        return stopAtBlank(function);
+        return stopAtBlank(scope);
     if (hasValue) {
         if (!date)
             param.value = parts[2];
         else if (!readDate(parts[2], param.value))
             return Outcome::reject;
-        if (date || param.name != os::passwordName)
-            note("paramInfo.value=", param.value, function);
+        if (date || param.name != IC::parameter::password)
+            scope.progress("paramInfo.value=", param.value);
     }
     params.push_back(param);
     return Outcome::next;
@@ -114,10 +110,10 @@ int OsInfo::parseMethodAndParams(std::string methodAndParams, std::string& metho
     if (items.empty())
         return 0;
     method = items.front();
-    note("method=", method, __func__);
+    scope.progress("method=", method);
     bool const secret = std::any_of(items.begin() + 1, items.end(), isPassword);
     for (auto item = items.begin() + 1; item != items.end(); ++item) {
-        Outcome const outcome = parseItem(*item, secret, params, __func__);
+        Outcome const outcome = parseItem(*item, secret, params, scope);
         if (outcome != Outcome::next)
             return outcome == Outcome::reject ? 1 : 0;
     }

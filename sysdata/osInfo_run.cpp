@@ -29,11 +29,10 @@ os::Ran os::run(OsInfo& info, Arguments arguments)
 }
 
 os::Ran os::runLogged(OsInfo& info, Arguments const& arguments,
-                      std::vector<ParamInfo> const& params, char const* function)
+                      std::vector<ParamInfo> const& params, log::Scope const& scope)
 {
     Ran ran = run(info, arguments);
-    log::write(methods, log::progress,
-               log::message("outputBuffer: ", withoutPasswords(ran.output, params)), function);
+    scope.progress("outputBuffer: ", withoutPasswords(ran.output, params));
     return ran;
 }
 
@@ -46,13 +45,13 @@ int OsInfo::executeCommand(char* program, char** arguments, char* output)
         list.emplace_back(*argument);
     std::string const line = os::commandLine(list);
     if (line.size() >= bufferSize) {
-        log::write(methods, log::error, os::tooLong(program));
+        scope.error(os::tooLong, program);
         return 1;
     }
     FILE* pipe = popen(line.c_str(), "r");
     if (!pipe) {
         // The line itself may hold a password.
-        log::write(methods, log::error, log::message("Cannot open process: ", program));
+        scope.error("Cannot open process: ", program);
         return 1;
     }
     bool const any = files::readToEnd(pipe, output, bufferSize);

@@ -9,6 +9,7 @@
 
 #include <cstdio>
 #include <cstring>
+#include <optional>
 #include <pwd.h>
 #include <shadow.h>
 #include <string>
@@ -28,22 +29,18 @@ constexpr std::size_t lineSize = 4096;
 class AccountFiles
 {
 public:
-    AccountFiles() : passwd_(std::fopen("/etc/passwd", "ro"))
+    AccountFiles() : passwd_("/etc/passwd", "ro")
     {
-        if (!passwd_)
+        if (!passwd_.stream())
             return;
-        shadow_ = std::fopen("/etc/shadow", "ro");
+        shadow_.emplace("/etc/shadow", "ro");
         lckpwdf();
     }
 
     ~AccountFiles()
     {
-        if (!passwd_)
-            return;
-        ulckpwdf();
-        std::fclose(passwd_);
-        if (shadow_)
-            std::fclose(shadow_);
+        if (passwd_.stream())
+            ulckpwdf();
     }
 
     AccountFiles(AccountFiles const&) = delete;
@@ -53,8 +50,8 @@ public:
     passwd const* nextAccount()
     {
         passwd* found = nullptr;
-        if (!passwd_ ||
-            fgetpwent_r(passwd_, &account_, accountLine_, sizeof accountLine_, &found) != 0)
+        if (!passwd_.stream() || fgetpwent_r(passwd_.stream(), &account_, accountLine_,
+                                             sizeof accountLine_, &found) != 0)
             return nullptr;
         return &account_;
     }
@@ -66,16 +63,17 @@ public:
     spwd const* findShadow(char const* name)
     {
         spwd* found = nullptr;
-        while (shadow_ &&
-               fgetspent_r(shadow_, &ageing_, ageingLine_, sizeof ageingLine_, &found) == 0)
+        FILE* const stream = shadow_ ? shadow_->stream() : nullptr;
+        while (stream &&
+               fgetspent_r(stream, &ageing_, ageingLine_, sizeof ageingLine_, &found) == 0)
             if (std::strcmp(ageing_.sp_namp, name) == 0)
                 return &ageing_;
         return nullptr;
     }
 
 private:
-    FILE* passwd_;
-    FILE* shadow_ = nullptr;
+    std::optional<files::File> shadow_; // opened only once the accounts are
+    files::File passwd_;
     passwd account_{};
     spwd ageing_{};
     char accountLine_[lineSize] = "";
@@ -101,17 +99,14 @@ void setAgeing(userInfo& user, spwd const& entry)
 }
 
 /** The number that the login service's rules allow; the last one in the file, 0 without one. */
-long readMaxLoginFailures(files::WholeText& text, char const* function)
+long readMaxLoginFailures(files::WholeText& text, log::Scope const& scope)
 {
-    files::File const file("/etc/pam.d/login", "r");
-    if (!file.stream())
-        return 0;
     long failures = 0;
-    std::string_view rules = text.read(file.stream());
+    std::string_view rules = text.read("/etc/pam.d/login");
     for (std::string line = USER_INFO::takeDenyLine(rules); !line.empty();
          line = USER_INFO::takeDenyLine(rules))
         if (USER_INFO::scanDeny(line, failures) == USER_INFO::Scan::invalid)
-            log::write(unit, log::error, log::message("Invalid format: line = ", line), function);
+            scope.error("Invalid format: line = ", line);
     return failures;
 }
 
@@ -136,7 +131,7 @@ void getUserInfo(std::vector<userInfo>& users)
         user.setUserAcctDisabled(false);
         if (spwd const* ageing = files.findShadow(account->pw_name))
             setAgeing(user, *ageing);
-        user.setMaxLoginFailures(readMaxLoginFailures(rules, __func__));
+        user.setMaxLoginFailures(readMaxLoginFailures(rules, scope));
         users.push_back(std::move(user));
     }
 }

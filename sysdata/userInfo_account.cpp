@@ -28,19 +28,15 @@ constexpr std::size_t runnerSize = 5000;
 // The address is what matters: it tells executeLinCommand that the output's buffer is ours.
 char passwdProgram[] = "/usr/bin/passwd";
 
-void logMisfit(std::string const& command, char const* function)
-{
-    log::write(unit, log::error, log::message("Command does not fit: ", command), function);
-}
+// What error messages begin with; the command follows.
+constexpr char misfit[] = "Command does not fit: ";
+constexpr char noStart[] = "Cannot open process: command = ";
 
-/** Starts a command and sees it end; a failed start is logged as the given text. */
-bool run(char const* command, std::string const& failure, char const* function)
+/** Starts a command and sees it end. @return false when it could not be started */
+bool run(char const* command)
 {
     MyProcess process;
-    if (process.mypopen(command, "r"))
-        return true;
-    log::write(unit, log::error, failure, function);
-    return false;
+    return process.mypopen(command, "r") != nullptr;
 }
 
 /**
@@ -51,17 +47,17 @@ bool run(char const* command, std::string const& failure, char const* function)
  * @return false where a command line did not fit, which has been logged
  */
 bool makeAgeCommand(userInfo& info, std::string const& date, std::string const& user, char* label,
-                    char const* option, char (&command)[commandSize], char const* function)
+                    char const* option, char (&command)[commandSize], log::Scope const& scope)
 {
     USER_INFO::CalendarDay const day = USER_INFO::scanDay(date.c_str());
     long const requested = ito_time_t(day.year, day.month, day.day, 0, 0, 0, 0, -1);
     if (!text::print(command, sizeof command, "chage -l %s", user.c_str())) {
-        logMisfit("chage -l", function);
+        scope.error(misfit, "chage -l");
         return false;
     }
     int const days = static_cast<int>(info.getDays(command, label, requested));
     if (!text::print(command, sizeof command, "chage %s %d %s", option, days, user.c_str())) {
-        logMisfit(log::message("chage ", option), function);
+        scope.error(misfit, "chage ", option);
         return false;
     }
     return true;
@@ -73,10 +69,10 @@ int userInfo::setDelete(std::string user)
 {
     log::Scope const scope(unit);
     char command[commandSize];
-    if (text::print(command, sizeof command, "userdel -r %s", user.c_str()))
-        run(command, log::message("Cannot open process: command = ", command), __func__);
-    else
-        logMisfit("userdel -r", __func__);
+    if (!text::print(command, sizeof command, "userdel -r %s", user.c_str()))
+        scope.error(misfit, "userdel -r");
+    else if (!run(command))
+        scope.error(noStart, command);
     return 1;
 }
 
@@ -85,8 +81,12 @@ bool userInfo::setInactivityTimeout(std::string date, std::string user)
     log::Scope const scope(unit);
     char label[] = "Password expires";
     char command[commandSize];
-    return makeAgeCommand(*this, date, user, label, "-I", command, __func__) &&
-           run(command, log::message("Cannot open process: command = ", command), __func__);
+    if (!makeAgeCommand(*this, date, user, label, "-I", command, scope))
+        return false;
+    bool const started = run(command);
+    if (!started)
+        scope.error(noStart, command);
+    return started;
 }
 
 bool userInfo::setPasswordExpiration(std::string date, std::string user)
@@ -94,8 +94,12 @@ bool userInfo::setPasswordExpiration(std::string date, std::string user)
     log::Scope const scope(unit);
     char label[] = "Last password change";
     char command[commandSize];
-    return makeAgeCommand(*this, date, user, label, "-M", command, __func__) &&
-           run(command, log::message("Cannot open process: chage -M"), __func__);
+    if (!makeAgeCommand(*this, date, user, label, "-M", command, scope))
+        return false;
+    bool const started = run(command);
+    if (!started)
+        scope.error("Cannot open process: chage -M");
+    return started;
 }
 
 long userInfo::getDays(char* command, char* label, long reference)
@@ -104,19 +108,19 @@ long userInfo::getDays(char* command, char* label, long reference)
     MyProcess process;
     FILE* const output = process.mypopen(command, "r");
     if (!output) {
-        log::write(unit, log::error, log::message("Cannot open process: command = ", command));
+        scope.error(noStart, command);
         return noLimit;
     }
     USER_INFO::LabelledDate date;
     char line[lineSize];
     while (std::fgets(line, sizeof line, output))
         if (USER_INFO::scanLabelledDate(line, label, date) == USER_INFO::Scan::invalid)
-            log::write(unit, log::error, log::message("Invalid format: buffer = ", line));
+            scope.error("Invalid format: buffer = ", line);
 
     long const found = to_time_t(date.year, date.month.data(), date.day, 0, 0, 0, 0, -1);
     if (found <= reference)
         return (reference - found) / secondsPerDay;
-    log::write(unit, log::error, "new_day < last_day");
+    scope.error("new_day < last_day");
     return noLimit;
 }
 
@@ -144,13 +148,13 @@ bool userInfo::executeLinCommand(char* command, char const* const* args, char* o
         line.append(" ").append(*arg);
     line += " 2>&1";
     if (line.size() >= runnerSize) {
-        logMisfit(command, __func__);
+        scope.error(misfit, command);
         return false;
     }
     FILE* const pipe = popen(line.c_str(), "r");
     if (!pipe) {
         // The line itself may hold what is not for the log.
-        log::write(unit, log::error, log::message("Cannot open process: ", command));
+        scope.error("Cannot open process: ", command);
         return false;
     }
     // Contract: no bound is passed, so other callers' buffers count as large enough.

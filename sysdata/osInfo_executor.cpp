@@ -27,17 +27,17 @@ std::string programOf(Method const& method)
 }
 
 int runTools(OsInfo& info, Method const& method, std::vector<ParamInfo> const& params,
-             char const* function)
+             log::Scope const& scope)
 {
     Commands commands;
-    std::string complaint;
+    os::Complaint complaint;
     if (!os::makeCommands(method, programOf(method), params, commands, complaint)) {
-        if (!complaint.empty())
-            log::write(methods, log::error, complaint, function);
+        if (complaint.text)
+            scope.error(complaint.text, complaint.about);
         return 1;
     }
     bool const adding = method.kind == MethodKind::userAdd;
-    Ran const main = os::runLogged(info, commands.main, params, function);
+    Ran const main = os::runLogged(info, commands.main, params, scope);
     bool const added = adding && main.output.find("rc=0") != std::string::npos;
     if (main.status != 0 && !os::isBenign(main.output) && !added)
         return main.status;
@@ -45,7 +45,7 @@ int runTools(OsInfo& info, Method const& method, std::vector<ParamInfo> const& p
         info.executePasswordEncryption(commands.password->data(), commands.user.data());
     if (!adding)
         return 0;
-    Ran const aging = os::runLogged(info, commands.aging, params, function);
+    Ran const aging = os::runLogged(info, commands.aging, params, scope);
     return os::isAgingNotice(aging.output) ? 0 : aging.status;
 }
 
@@ -67,7 +67,7 @@ int OsInfo::executeMethod(std::string method, std::vector<ParamInfo> params, boo
     log::Scope const scope(methods, {"OsNode::executeMethod"});
     Method const* known = os::findMethod(method);
     if (!known) {
-        log::write(methods, log::error, log::message("Unknown method: ", method));
+        scope.error("Unknown method: ", method);
         return 1;
     }
     switch (known->kind) {
@@ -77,7 +77,7 @@ int OsInfo::executeMethod(std::string method, std::vector<ParamInfo> params, boo
     case MethodKind::groupMembership:
         return groupMemberChanges(method, params) ? 1 : 0;
     default:
-        return runTools(*this, *known, params, __func__);
+        return runTools(*this, *known, params, scope);
     }
 }
 
@@ -86,7 +86,7 @@ void OsInfo::executePasswordEncryption(char* password, char* user)
     log::Scope const scope(methods);
     if (*user == '\0') {
         // Without a name passwd would take the password for the caller's own account.
-        log::write(methods, log::error, "No user name for the password");
+        scope.error("No user name for the password");
         return;
     }
     os::run(*this, {"echo", password, "|", "/usr/bin/passwd", user, "--stdin"});

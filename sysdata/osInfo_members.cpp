@@ -1,5 +1,6 @@
 // Group membership: usermod takes the whole list of a user's groups, so id is asked for it first.
 
+#include "host/Methods.h"
 #include "sysdata/osInfo_commands.h"
 #include "sysdata/osInfo_linux.h"
 #include "sysdata/osInfo_log.h"
@@ -72,8 +73,9 @@ std::string::size_type listStart(std::string const& identity, std::string::size_
 } // namespace
 
 std::string os::supplementaryGroups(std::string const& identity, std::string const& quotedGroup,
-                                    bool adding)
+                                    Membership change)
 {
+    bool const adding = change == Membership::add;
     std::string::size_type primaryAt = identity.find("gid");
     std::string::size_type listAt = listStart(identity, primaryAt);
     std::string list;
@@ -99,21 +101,22 @@ std::string os::supplementaryGroups(std::string const& identity, std::string con
 bool OsInfo::groupMemberChanges(std::string method, std::vector<ParamInfo> params)
 {
     log::Scope const scope(os::methods);
-    std::string const group = quoted(textOf(params, "LocalGroupName"));
-    std::string const member = quoted(textOf(params, "DomainAndMember"));
+    std::string const group = quoted(textOf(params, IC::parameter::localGroupName));
+    std::string const member = quoted(textOf(params, IC::parameter::domainAndMember));
     std::string const identity =
-        os::runLogged(*this, {"/usr/bin/id", member}, params, __func__).output;
+        os::runLogged(*this, {"/usr/bin/id", member}, params, scope).output;
     if (identity.size() == os::bufferSize - 1) {
         // Perhaps cut: usermod would take the member out of the groups that are missing.
-        log::write(os::methods, log::error, "Output too long: /usr/bin/id");
+        scope.error("Output too long: /usr/bin/id");
         return true;
     }
     if (holds(identity, "No such user") || !holds(identity, "gid"))
         return true;
-    bool const adding = method == "LocalGroupAddUser";
-    os::Arguments const change{"/usr/sbin/usermod", "-G",
-                               os::supplementaryGroups(identity, group, adding), member};
-    Ran const changed = os::runLogged(*this, change, params, __func__);
+    os::Membership const change =
+        method == IC::method::localGroupAddUser ? os::Membership::add : os::Membership::remove;
+    os::Arguments const command{"/usr/sbin/usermod", "-G",
+                                os::supplementaryGroups(identity, group, change), member};
+    Ran const changed = os::runLogged(*this, command, params, scope);
     return changed.status != 0 && !holds(changed.output, "is primary group name");
 }
 

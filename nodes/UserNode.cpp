@@ -71,7 +71,7 @@ void setUserProperties(MutableNode& node, userInfo& user, std::size_t userCount)
                {property::passwordHistoryDepth,
                 number(static_cast<unsigned long>(user.getPasswordHistoryDepth()))},
                {property::reservedText, {"", true}},
-               {property::passwordExpiration, inactiveTime}, // kept: a write gives it its meaning
+               {property::passwordExpiration, inactiveTime}, // Contract: a write gives it its meaning
                {property::lastPwdChange, date(user.getLstPwdChg())},
                {property::maxLoginFailures,
                 number(static_cast<unsigned long>(user.getMaxLoginFailures()))},

@@ -24,7 +24,7 @@ constexpr std::size_t lineSize = 512;
  */
 bool findModule(char const* line, char (&module)[lineSize]);
 
-/** Kept: takes every module whose name begins with "Module" for the header as well. */
+/** Contract: takes every module whose name begins with "Module" for the header as well. */
 bool isHeader(char const* module);
 
 /** How often modinfo gave a fact of one module. */

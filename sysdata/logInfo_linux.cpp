@@ -41,7 +41,7 @@ void readEntry(logInfo& log, unsigned int index, char (&entry)[lineSize])
 /** Whether the index is one that can be read; if not, says so. */
 bool isReadable(logInfo& log, unsigned int index, char const* label, log::Scope const& scope)
 {
-    // Kept: counted once for the message, also when there will be none, and anew to compare.
+    // Contract: counted once for the message, also when there will be none, and anew to compare.
     unsigned int const countForMessage = log.getMaxLine();
     unsigned int const count = log.getMaxLine();
     if (count + 1 >= index)
@@ -87,7 +87,7 @@ void logInfo::getLog(unsigned int line, char* buffer, int length)
     MyProcess process;
     FILE* const output = process.mypopen(command, "r");
     if (!output) {
-        scope.error(fetchCommand); // kept: without the number
+        scope.error(fetchCommand); // Contract: without the number
         buffer[0] = '\0';
         return;
     }
@@ -134,7 +134,7 @@ bool logInfo::getCreationTime(long& time, unsigned int index)
             return false;
         }
     } else {
-        scope.error("Cannot opne process: date"); // kept: spelled so
+        scope.error("Cannot opne process: date"); // Contract: spelled so
     }
     time = to_time_t(logLines::yearOf(stamp, today), stamp.month, stamp.day, 0, stamp.hour,
                      stamp.minute, stamp.second, -1);

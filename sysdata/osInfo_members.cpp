@@ -83,7 +83,7 @@ std::string os::supplementaryGroups(std::string const& identity, std::string con
     std::optional<std::string> primary;
     if (identity.find('(', primaryAt) < listAt)
         primary = nextName(identity, primaryAt);
-    // Kept: the names differ in their quotes already, so hardly any is ever left out.
+    // Contract: the names differ in their quotes already, so hardly any is ever left out.
     if (primary && (adding || difference(primary->c_str(), quotedGroup.c_str()) != 1))
         list = *primary + ",";
     while (std::optional<std::string> const name = nextName(identity, listAt)) {

@@ -22,7 +22,7 @@ using os::facts;
 #pragma GCC diagnostic push
 #pragma GCC diagnostic ignored "-Wmismatched-dealloc"
 #endif
-// Kept: fclose on a command's stream, so that the shell's exit status is never asked for.
+// Contract: fclose on a command's stream, so that the shell's exit status is never asked for.
 void closeAsFile(FILE* pipe)
 {
     std::fclose(pipe);
@@ -42,7 +42,7 @@ constexpr ReleaseFile installDateFiles[] = {
     {"/etc/redhat-release", "stat /etc/redhat-release | grep Change"},
 };
 
-// Differs from the order for the name and for the install date. Kept.
+// Contract: another order than for the name and for the install date.
 constexpr ReleaseFile versionFiles[] = {
     {"/etc/vmware-release", " cat /etc/vmware-release  | tr -d '[:alpha:][:space:][()]'"},
     {"/etc/redhat-release", "cat /etc/redhat-release  | tr -d '[:alpha:][:space:][()]'"},
@@ -50,6 +50,10 @@ constexpr ReleaseFile versionFiles[] = {
                           "$(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 12)"
                           " | tr -d [:space:]"},
 };
+
+// Contract: they differ.
+constexpr std::size_t shortestMajorLine = 10;
+constexpr std::size_t shortestMinorLine = 13;
 
 constexpr char const* nameFiles[] = {"/etc/release", "/etc/vmware-release", "/etc/redhat-release",
                                      "/etc/SuSE-release", "/etc/UnitedLinux-release"};
@@ -120,12 +124,11 @@ bool OsInfo::getKestoVersion(std::string path, std::string& out)
     std::string line;
     if (!std::getline(file, line))
         return false;
-    // The two shortest lengths differ. Kept.
-    if (!std::getline(file, line) || line.size() <= 9)
+    if (!std::getline(file, line) || line.size() < shortestMajorLine)
         return false;
     std::string major = line.substr(line.rfind('=') + 1);
     trimString(major);
-    if (!std::getline(file, line) || line.size() < 13)
+    if (!std::getline(file, line) || line.size() < shortestMinorLine)
         return false;
     std::string minor = line.substr(line.rfind('=') + 1);
     trimString(minor);
@@ -151,7 +154,7 @@ bool OsInfo::getOSVersion(std::string& out)
         FILE* pipe = popen(candidate.command, "r");
         char version[10];
         if (!pipe || !std::fgets(version, sizeof version, pipe))
-            return false; // kept: the stream stays open
+            return false; // Contract: the stream stays open
         out = version;
         closeAsFile(pipe);
         return true;

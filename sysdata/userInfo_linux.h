@@ -95,7 +95,7 @@ public:
 
     unsigned long getLstPwdChg();
 
-    /** @param days  kept: never is counted as a number of days like any other */
+    /** @param days  Contract: never is counted as a number of days like any other */
     void setLstPwdChg(unsigned long days);
 
     long getPasswordHistoryDepth();

@@ -57,7 +57,7 @@ public:
     }
 
     /**
-     * The shadow entry of an account, looked for from where the last search stopped. Kept: an
+     * The shadow entry of an account, looked for from where the last search stopped. Contract: an
      * account that is missing uses the file up, and no later one is found.
      */
     spwd const* findShadow(char const* name)

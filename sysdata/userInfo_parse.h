@@ -39,8 +39,8 @@ struct MI_INTERNAL LabelledDate {
 /**
  * Reads a date of the form "LABEL : Mon DD, YYYY".
  *
- * Kept: what could be read of an invalid date replaces what stood in its place, and "never" counts
- * as a date in 2038 only where a day and a year follow it.
+ * Contract: what could be read of an invalid date replaces what stood in its place, and "never"
+ * counts as a date in 2038 only where a day and a year follow it.
  *
  * @param line   NUL-terminated
  * @param label  may stand anywhere in a line that is not absent, and at its start in a valid one

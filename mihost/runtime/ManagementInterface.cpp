@@ -1,11 +1,14 @@
 #include "host/ManagementInterface.h"
 
 #include "host/MutableNode.h"
+#include "mihost/runtime/NodeIndex.h"
 #include "mihost/runtime/Runtime.h"
 
 #include <algorithm>
+#include <charconv>
+#include <iterator>
 #include <mutex>
-#include <unordered_map>
+#include <optional>
 
 namespace IC
 {
@@ -29,37 +32,33 @@ struct ManagementInterface::Own {
     // Guards the node list, for one look or one change at a time, since different threads may
     // rebuild nodes of different kinds at once. Nobody outside is called while it is held.
     std::mutex listLock;
-    // Where each node is in the list, up to that position. Deleted nodes leave null pointers until
-    // the next look: closing each gap at once would cost a rebuild the square of the nodes.
-    std::unordered_map<Node const*, std::size_t> positions;
-    std::size_t indexed = 0;
+    mihost::NodeIndex index;
     AlertCallBack alertCallBack = nullptr;
     void const* alertContext = nullptr;
-
-    bool unlist(std::vector<Node*>& nodes, Node const* node);
-    void closeGaps(std::vector<Node*>& nodes);
 };
 
-bool ManagementInterface::Own::unlist(std::vector<Node*>& nodes, Node const* node)
+namespace
 {
-    for (; indexed < nodes.size(); ++indexed)
-        positions[nodes[indexed]] = indexed;
-    auto const found = positions.find(node);
-    if (!node || found == positions.end())
-        return false;
-    nodes[found->second] = nullptr;
-    positions.erase(found);
-    return true;
+
+/** The nodes of a list, without the gaps that removed ones left. */
+std::vector<Node*> withoutGaps(std::vector<Node*> const& list)
+{
+    std::vector<Node*> nodes;
+    nodes.reserve(list.size());
+    std::copy_if(list.begin(), list.end(), std::back_inserter(nodes),
+                 [](Node const* node) { return node != nullptr; });
+    return nodes;
 }
 
-void ManagementInterface::Own::closeGaps(std::vector<Node*>& nodes)
+/** The number that a text is the plain decimal form of. */
+std::optional<unsigned int> numberIn(std::string const& text)
 {
-    if (indexed == 0) // nothing was deleted since
-        return;
-    nodes.erase(std::remove(nodes.begin(), nodes.end(), nullptr), nodes.end());
-    positions.clear();
-    indexed = 0;
+    unsigned int number = 0;
+    std::from_chars(text.data(), text.data() + text.size(), number);
+    return std::to_string(number) == text ? std::optional(number) : std::nullopt;
 }
+
+} // namespace
 
 ManagementInterface::ManagementInterface()
     : nextNodeId_(0), miId_(0), loadCallBack_(nullptr), loadCallBackContext_(nullptr),
@@ -72,8 +71,7 @@ ManagementInterface::~ManagementInterface() = default;
 Error ManagementInterface::getMap(std::vector<Node*>& nodes)
 {
     std::lock_guard const held(own_->listLock);
-    own_->closeGaps(nodes_);
-    nodes = nodes_;
+    nodes = withoutGaps(nodes_);
     return success();
 }
 
@@ -103,8 +101,9 @@ void ManagementInterface::unload()
     std::vector<Node*> nodes;
     {
         std::lock_guard const held(own_->listLock);
-        own_->closeGaps(nodes_);
-        nodes.swap(nodes_);
+        nodes = withoutGaps(nodes_);
+        nodes_.clear();
+        own_->index.reset();
     }
     for (Node* node : nodes)
         delete node;
@@ -121,9 +120,7 @@ Error ManagementInterface::addNewNode(Node*& node)
         return failure("no node given");
     {
         std::lock_guard const held(own_->listLock);
-        own_->closeGaps(nodes_);
-        // A node just built stands at the end of the list, so the search starts there.
-        if (std::find(nodes_.rbegin(), nodes_.rend(), node) == nodes_.rend())
+        if (!own_->index.holds(nodes_, node))
             nodes_.push_back(node);
     }
     if (mihost::NodeObserver* observer = mihost::nodeObserver())
@@ -135,7 +132,7 @@ Error ManagementInterface::deleteNode(Node* node)
 {
     {
         std::lock_guard const held(own_->listLock);
-        if (!own_->unlist(nodes_, node))
+        if (!own_->index.remove(nodes_, node))
             return failure("no such node");
     }
     if (mihost::NodeObserver* observer = mihost::nodeObserver())
@@ -146,10 +143,11 @@ Error ManagementInterface::deleteNode(Node* node)
 
 Error ManagementInterface::getNode(std::string const& id, Node*& node)
 {
+    std::optional<unsigned int> const number = numberIn(id);
     std::lock_guard const held(own_->listLock);
-    auto const found = std::find_if(nodes_.begin(), nodes_.end(), [&id](Node* candidate) {
+    auto const found = std::find_if(nodes_.begin(), nodes_.end(), [number](Node* candidate) {
         auto const* mutableNode = dynamic_cast<MutableNode const*>(candidate);
-        return mutableNode && std::to_string(mutableNode->getNodeId()) == id;
+        return mutableNode && mutableNode->getNodeId() == number;
     });
     if (found == nodes_.end())
         return failure("no node has the id " + id);

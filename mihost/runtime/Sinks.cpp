@@ -46,9 +46,9 @@ JsonLines::JsonLines(LineWriter& out, KindName kindName) : out_(out), kindName_(
 
 void JsonLines::write(LogMessage const& message)
 {
-    constexpr std::size_t mostLines = 255; // fit
+    constexpr std::size_t usualLength = 255;
     std::string line;
-    line.reserve(mostLines);
+    line.reserve(usualLength);
     line +=
         message.operation == LogMessage::Operation::Trace ? "{\"op\":\"trace\"" : "{\"op\":\"log\"";
     line += ",\"function\":";

@@ -48,8 +48,8 @@ struct VXMessageBuffer::Stream {
 
 VXMessageBuffer::VXMessageBuffer()
 {
-    constexpr std::size_t mostMessages = 63; // fit, so that one piece of memory serves each
-    text_.reserve(mostMessages);
+    constexpr std::size_t usualLength = 63;
+    text_.reserve(usualLength); // one allocation for most messages
 }
 
 VXMessageBuffer::~VXMessageBuffer() = default;

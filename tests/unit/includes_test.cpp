@@ -1,5 +1,6 @@
 // Who includes whom among the plug-in's folders.
 
+#include "TestPaths.h"
 #include "tests/support/Lines.h"
 
 #include <algorithm>

@@ -1,0 +1,46 @@
+#ifndef MIHOST_RUNTIME_NODEINDEX_H
+#define MIHOST_RUNTIME_NODEINDEX_H
+
+#include <cstddef>
+#include <unordered_map>
+#include <vector>
+
+namespace IC
+{
+class Node;
+}
+
+namespace mihost
+{
+
+/**
+ * Where each node is in the node list of an interface, which appends to the list on its own.
+ *
+ * A removed node leaves a null pointer in the list. These gaps are closed once they outnumber the
+ * nodes, so that a removal takes the same time however long the list is.
+ */
+class NodeIndex
+{
+public:
+    using List = std::vector<IC::Node*>;
+
+    bool holds(List const& list, IC::Node const* node);
+
+    /** Takes a node out of the list. @return false if the list does not hold it */
+    bool remove(List& list, IC::Node const* node);
+
+    /** Forgets all positions: the list was emptied. */
+    void reset();
+
+private:
+    /** Notes the positions of what the interface appended since the last call. */
+    void catchUp(List const& list);
+    void closeGaps(List& list);
+
+    std::unordered_map<IC::Node const*, std::size_t> positions_;
+    std::size_t indexed_ = 0; // entries of the list whose positions are known, gaps included
+};
+
+} // namespace mihost
+
+#endif

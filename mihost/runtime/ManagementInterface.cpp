@@ -28,7 +28,8 @@ Error failure(std::string const& reason)
 
 } // namespace
 
-struct ManagementInterface::Own {
+struct [[gnu::visibility("hidden")]] ManagementInterface::Own
+{
     // Guards the node list, for one look or one change at a time, since different threads may
     // rebuild nodes of different kinds at once. Nobody outside is called while it is held.
     std::mutex listLock;

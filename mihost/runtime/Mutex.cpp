@@ -11,7 +11,8 @@ namespace
 constexpr unsigned long withoutLimit = 0xFFFFFFFFUL;
 }
 
-struct Mutex::Handle {
+struct [[gnu::visibility("hidden")]] Mutex::Handle
+{
     std::timed_mutex mutex;
 };
 

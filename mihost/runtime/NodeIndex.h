@@ -19,7 +19,7 @@ namespace mihost
  * A removed node leaves a null pointer in the list. These gaps are closed once they outnumber the
  * nodes, so that a removal takes the same time however long the list is.
  */
-class NodeIndex
+class [[gnu::visibility("hidden")]] NodeIndex
 {
 public:
     using List = std::vector<IC::Node*>;
@@ -27,7 +27,7 @@ public:
     bool holds(List const& list, IC::Node const* node);
 
     /** Takes a node out of the list. @return false if the list does not hold it */
-    bool remove(List& list, IC::Node const* node);
+    bool remove(List & list, IC::Node const* node);
 
     /** Forgets all positions: the list was emptied. */
     void reset();
@@ -35,7 +35,7 @@ public:
 private:
     /** Notes the positions of what the interface appended since the last call. */
     void catchUp(List const& list);
-    void closeGaps(List& list);
+    void closeGaps(List & list);
 
     std::unordered_map<IC::Node const*, std::size_t> positions_;
     std::size_t indexed_ = 0; // entries of the list whose positions are known, gaps included

@@ -19,7 +19,8 @@ Error success()
 } // namespace
 
 // The lock is held for one lookup or one store only, and nothing is called while it is held.
-struct Node::Store {
+struct [[gnu::visibility("hidden")]] Node::Store
+{
     mutable std::mutex lock;
     unsigned int status = 0;
     std::string description;
@@ -70,7 +71,8 @@ Node::operator std::string() const
     return getDescription();
 }
 
-struct MutableNode::Identity {
+struct [[gnu::visibility("hidden")]] MutableNode::Identity
+{
     unsigned int nodeId;
     unsigned int parentId;
     std::vector<unsigned int> miIds;

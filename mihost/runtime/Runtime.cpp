@@ -11,6 +11,10 @@ std::atomic<NodeObserver*> observerInUse{nullptr};
 std::atomic<IC::Error const*> initializeAnswerInUse{nullptr};
 } // namespace
 
+LogSink::~LogSink() = default;
+
+NodeObserver::~NodeObserver() = default;
+
 void setNodeObserver(NodeObserver* observer)
 {
     observerInUse.store(observer, std::memory_order_release);

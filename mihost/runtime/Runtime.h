@@ -32,15 +32,15 @@ struct LogMessage {
 class LogSink
 {
 public:
-    virtual ~LogSink() = default;
+    virtual ~LogSink();
     virtual void write(LogMessage const& message) = 0;
 };
 
-/** Told of nodes that come and go after the start; the node is alive during the call. */
+/** Informed of nodes that come and go after the start; the node is alive during the call. */
 class NodeObserver
 {
 public:
-    virtual ~NodeObserver() = default;
+    virtual ~NodeObserver();
     virtual void nodeAdded(IC::Node const& node) = 0;
     virtual void nodeDeleted(IC::Node const& node) = 0;
 };
@@ -51,7 +51,7 @@ public:
  */
 void setLogSink(LogSink* sink);
 
-/** Sets who is told of nodes, null for nobody. Ownership and timing as for the sink. */
+/** Sets who is informed of nodes, null for nobody. Ownership and timing as for the sink. */
 void setNodeObserver(NodeObserver* observer);
 
 NodeObserver* nodeObserver();

@@ -36,8 +36,9 @@ private:
 
 } // namespace
 
-struct VXMessageBuffer::Stream {
-    explicit Stream(std::string& text) : buffer(text), out(&buffer)
+struct [[gnu::visibility("hidden")]] VXMessageBuffer::Stream
+{
+    explicit Stream(std::string & text) : buffer(text), out(&buffer)
     {
         out.imbue(std::locale::classic()); // plain digits, whatever the host's own locale groups
     }

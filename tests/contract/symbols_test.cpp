@@ -1,6 +1,6 @@
-// What the library wants of its host and what it gives, against the lists beside this file.
+// What the libraries want of others and what they give, against the lists beside this file.
 //
-// To write the lists anew, on purpose only: script/symbols --update
+// To write the lists again, on purpose only: script/symbols --update
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -15,12 +15,19 @@ namespace
 
 using Names = std::vector<std::string>;
 
-class Symbols : public testing::TestWithParam<char const*>
+struct List {
+    char const* name;
+    char const* kind;
+    char const* library;
+};
+
+class Symbols : public testing::TestWithParam<List>
 {
 protected:
     static Names inTheLibrary()
     {
-        Outcome const outcome = runToEnd({TESTS_DIR "/../script/symbols", GetParam(), PLUGIN_FILE});
+        Outcome const outcome =
+            runToEnd({TESTS_DIR "/../script/symbols", GetParam().kind, GetParam().library});
         EXPECT_EQ(outcome.code, 0) << outcome.err;
         return linesOf(outcome.out);
     }
@@ -28,7 +35,7 @@ protected:
     static Names listed()
     {
         return linesOf(
-            contentOf(std::string(TESTS_DIR "/contract/") + GetParam() + "_symbols.txt"));
+            contentOf(std::string(TESTS_DIR "/contract/") + GetParam().name + "_symbols.txt"));
     }
 
     /** Those of the one list that the other lacks; both are sorted. */
@@ -52,8 +59,20 @@ TEST_P(Symbols, ThatAreListedAreAllInTheLibrary)
     EXPECT_EQ(missing(listed(), inTheLibrary()), Names());
 }
 
-INSTANTIATE_TEST_SUITE_P(Lists, Symbols, testing::Values("undefined", "exported"),
-                         [](auto const& list) { return std::string(list.param); });
+INSTANTIATE_TEST_SUITE_P(Lists, Symbols,
+                         testing::Values(List{"undefined", "undefined", PLUGIN_FILE},
+                                         List{"exported", "exported", PLUGIN_FILE},
+                                         List{"runtime", "exported", RUNTIME_FILE}),
+                         [](auto const& list) { return std::string(list.param.name); });
+
+TEST(Runtime, ExportsNothingOfTheStandardLibrary)
+{
+    Outcome const outcome = runToEnd({"/usr/bin/nm", "--dynamic", "--defined-only", RUNTIME_FILE});
+    ASSERT_NE(outcome.out.find(" _ZN2IC4Node"), std::string::npos) << outcome.err;
+    for (std::string const& line : linesOf(outcome.out))
+        for (char const* beginning : {" _ZNSt", " _ZNKSt", " _ZSt"})
+            EXPECT_EQ(line.find(beginning), std::string::npos) << line;
+}
 
 /** What the library wants of anybody, the C and C++ runtimes included, in the linker's words. */
 std::string wanted()

@@ -74,7 +74,9 @@ constexpr char topOfTheTree[] = "1 OsSw Management Interface\n"
 TEST_F(InstalledTree, StandsInTheUsualDirectories)
 {
     for (char const* file :
-         {"bin/mihost", "include/mihost/host/OpenMI.h", "include/mihost/mihost/runtime/Runtime.h"})
+         {"include/mihost/host/OpenMI.h", "include/mihost/host/Properties.h",
+          "include/mihost/host/Methods.h", "include/mihost/mihost/runtime/Runtime.h",
+          "share/man/man7/libzorvvxicosswmi.7", "share/man/man7/libmihostcheck.7"})
         EXPECT_TRUE(fs::is_regular_file(prefix() / file)) << file;
     for (char const* file :
          {"libzorvvxicosswmi.so.1", "libmihost.so", "libmihost.so.0", "libmihostcheck.so",
@@ -82,12 +84,23 @@ TEST_F(InstalledTree, StandsInTheUsualDirectories)
         EXPECT_TRUE(fs::is_regular_file(libraries() / file)) << file;
 }
 
+#ifdef HAS_MIHOST
 TEST_F(InstalledTree, RunsMihostWithThePluginBesideIt)
 {
+    for (char const* file : {"bin/mihost", "share/man/man1/mihost.1"})
+        EXPECT_TRUE(fs::is_regular_file(prefix() / file)) << file;
     Outcome const outcome = runToEnd({prefix() / "bin/mihost", "get", "os", "os-name"});
     EXPECT_EQ(outcome.code, 0) << outcome.err;
     EXPECT_NE(outcome.out, "");
 }
+#else
+TEST_F(InstalledTree, HasNothingOfTheProgramWithoutIt)
+{
+    for (char const* file :
+         {"bin", "share/man/man1", "share/bash-completion", "share/zsh", "share/fish"})
+        EXPECT_FALSE(fs::exists(prefix() / file)) << file;
+}
+#endif
 
 #ifdef ACCEL_FILE
 TEST_F(InstalledTree, RunsMihostWithTheAcceleratorBesideIt)

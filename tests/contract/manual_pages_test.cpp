@@ -92,6 +92,14 @@ TEST(ManualPageOfMihost, TellsOfEveryCommand)
         EXPECT_TRUE(std::regex_search(page, std::regex("\n {5,7}" + command + "[ \n]"))) << command;
 }
 
+// Otherwise: cmake --build --preset dev --target manual_pages
+TEST(ManualPageOfThePlugin, IsWhatItsTemplateAndTheCatalogueMake)
+{
+    Outcome const filled = runToEnd({FILL_PAGE_FILE, PLUGIN_PAGE ".in"});
+    EXPECT_EQ(filled.code, 0) << filled.err;
+    EXPECT_EQ(filled.out, contentOf(PLUGIN_PAGE));
+}
+
 TEST(ManualPageOfThePlugin, HasTheListsOfTheCatalogue)
 {
     std::string const page = rendered(PLUGIN_PAGE);

@@ -370,7 +370,7 @@ TEST_F(InjectionInto, AnyModuleNameReachesNoShell)
     EXPECT_EQ(linesOf(outcome.err).size(), refused);
     EXPECT_EQ(linesOf(outcome.err).back(),
               "mihost: a command was not run: modinfo: the name of the module '-x' begins with "
-              "'-', which a command would take for an option");
+              "'-', so a command would read it as an option");
     Lines ran = machine::ran();
     ran.erase(std::remove_if(ran.begin(), ran.end(),
                              [](std::string const& line) { return line.rfind("modinfo", 0) != 0; }),

@@ -59,7 +59,8 @@ TEST_F(MihostScript, EndsAtTheFirstLineThatFailsAndNamesIt)
              {"--sandbox get os", 2, "mihost: line 2: "},
              {"--plugin x.so get os", 2, "mihost: line 2: "},
              {"shell", 2, "mihost: line 2: "},
-             {"call UserDel UserName=a;b", 2, "mihost: line 2: UserName holds ';'"},
+             {"call UserDel UserName=a;b", 2,
+              "mihost: line 2: UserName contains the shell metacharacter ';'"},
              {"call UserDel UserName=nobody-here", 1, "mihost: line 2: call UserDel: the plug-in"},
              {"power halt", 2, "mihost: line 2: not a terminal: add --yes to halt the machine"}}) {
         Outcome const outcome =

@@ -160,16 +160,16 @@ TEST_F(Tasks, RefuseWrongValuesByTheNameOfTheOption)
 {
     machine::recordShell();
     expectUnchanged(mihostRun({"user", "add", "asmith", "--shell", "bash"}), 2,
-                    "user add: --shell is no absolute path: it must begin with '/'");
+                    "user add: --shell is not an absolute path: it must begin with '/'");
     expectUnchanged(mihostRun({"user", "age", "jdoe", "--max-days", "-1"}), 2,
-                    "user age: --max-days is no number: it must be 1 to 9 decimal digits");
+                    "user age: --max-days is not a number: it must be 1 to 9 decimal digits");
     expectUnchanged(mihostRun({"user", "age", "jdoe"}), 2,
                     "user age: nothing to change (use --min-days, --max-days, --warn-days, "
                     "--inactive-days)");
     expectUnchanged(mihostRun({"user", "expire", "jdoe", "tomorrow"}), 2,
-                    "user expire: DAY is no day: it must be YYYY-MM-DD, such as 2030-12-31");
+                    "user expire: DAY is not a day: it must be YYYY-MM-DD, such as 2030-12-31");
     expectUnchanged(mihostRun({"user", "add", "a;b"}), 2,
-                    "user add: NAME holds ';', which a shell would act on");
+                    "user add: NAME contains the shell metacharacter ';'");
     expectUnchanged(mihostRun({"group", "add", "1000"}), 2,
                     "group add: NAME consists of digits only, so tools would read it as an id");
 }

@@ -71,7 +71,7 @@ TEST(MihostCall, RefusesWhatAShellWouldActOnBeforeThePluginSeesIt)
                              "UserName=a\nreboot", "UserName=a,b", "UserName=a:b"}) {
         Outcome const outcome = mihostRun({"call", "UserDel", word});
         EXPECT_EQ(outcome.code, 2) << word;
-        EXPECT_TRUE(stands(outcome.err, "UserName holds ")) << outcome.err;
+        EXPECT_TRUE(stands(outcome.err, "UserName contains ")) << outcome.err;
     }
     EXPECT_EQ(machine::ran(), Lines());
 }

@@ -86,17 +86,17 @@ TEST(CommandGuard, RefusesWhatLooksLikeTwoOfThePluginsCommands)
 TEST(CommandGuard, RefusesModuleNamesThatModinfoWouldTakeForOptions)
 {
     EXPECT_EQ(objectionToCommand("modinfo -x"),
-              "the name of the module '-x' begins with '-', which a command would take for an "
+              "the name of the module '-x' begins with '-', so a command would read it as an "
               "option");
     EXPECT_EQ(objectionToCommand("modinfo x;reboot"),
-              "the name of the module 'x;reboot' holds ';', which a shell would act on");
+              "the name of the module 'x;reboot' contains the shell metacharacter ';'");
 }
 
 TEST(CommandGuard, NamesNoPartOfALineThatMayHoldAPassword)
 {
     std::string const reason =
         objectionToCommand("echo sec;ret | /usr/bin/passwd a --stdin").value();
-    EXPECT_EQ(reason, "it holds ';', which a shell would act on");
+    EXPECT_EQ(reason, "it contains the shell metacharacter ';'");
 }
 
 } // namespace

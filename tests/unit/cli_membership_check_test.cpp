@@ -82,7 +82,7 @@ TEST(MembershipChange, IsRefusedForAGroupNameThatAShellWouldActOn)
 {
     EXPECT_EQ(objectionTo("uid=1000(jdoe) gid=1000(jdoe) "
                           "groups=1000(jdoe),1500(x`touch${IFS}/root/PWNED`)\n"),
-              "its group 'x`touch${IFS}/root/PWNED`' holds '`', which a shell would act on");
+              "its group 'x`touch${IFS}/root/PWNED`' contains the shell metacharacter '`'");
 }
 
 TEST(MembershipChange, IsRefusedForEveryByteInAGroupNameThatIsUnsafe)

@@ -94,14 +94,14 @@ TEST(MethodCallValues, MayHoldBlanksWhereTheyAreEscaped)
 {
     EXPECT_EQ(objection(Form::Words, "John Smith"), std::nullopt);
     EXPECT_EQ(objection(Form::Path, "/home/john smith"), std::nullopt);
-    EXPECT_EQ(objection(Form::AccountName, "john smith"), "holds a blank");
-    EXPECT_EQ(objection(Form::Password, "john smith"), "holds a blank");
+    EXPECT_EQ(objection(Form::AccountName, "john smith"), "contains a blank");
+    EXPECT_EQ(objection(Form::Password, "john smith"), "contains a blank");
 }
 
 TEST(MethodCallValues, AreRefusedWhereACommandWouldTakeThemForAnOption)
 {
     EXPECT_EQ(objection(Form::AccountName, "-r"),
-              "begins with '-', which a command would take for an option");
+              "begins with '-', so a command would read it as an option");
     EXPECT_NE(objection(Form::Password, "-n"), std::nullopt);
     EXPECT_EQ(objection(Form::Words, "-r"), std::nullopt); // always stands behind its option
 }
@@ -165,22 +165,22 @@ TEST(MethodCallValues, OfDaysAreDaysOfTheCalendar)
     for (char const* wrong : {"2030-13-01", "2030-00-10", "2030-02-30", "2029-02-29", "2030-1-1",
                               "31.12.2030", "20301231", "1900-12-31", "2030-12-31 00"})
         EXPECT_EQ(objection(Form::Day, wrong),
-                  "is no day: it must be YYYY-MM-DD, such as 2030-12-31")
+                  "is not a day: it must be YYYY-MM-DD, such as 2030-12-31")
             << wrong;
 }
 
 TEST(MethodCallValues, OfPathsAreAbsolute)
 {
-    EXPECT_EQ(objection(Form::Path, "home"), "is no absolute path: it must begin with '/'");
+    EXPECT_EQ(objection(Form::Path, "home"), "is not an absolute path: it must begin with '/'");
 }
 
 TEST(Objections, NameTheCharacterButNeverOneOfAPassword)
 {
-    EXPECT_EQ(objection(Form::Words, "a;b"), "holds ';', which a shell would act on");
-    EXPECT_EQ(objection(Form::Words, "a,b"), "holds ',', which separates values");
-    EXPECT_EQ(objection(Form::Words, "a\nb"), "holds the control character \\n");
-    EXPECT_EQ(objection(Form::Words, "a\xC2\x85"), "holds the control character \\u0085");
-    EXPECT_EQ(objection(Form::Words, "a\xFF"), "holds the byte \\xff, which is no UTF-8");
+    EXPECT_EQ(objection(Form::Words, "a;b"), "contains the shell metacharacter ';'");
+    EXPECT_EQ(objection(Form::Words, "a,b"), "contains the separator ','");
+    EXPECT_EQ(objection(Form::Words, "a\nb"), "contains the control character \\n");
+    EXPECT_EQ(objection(Form::Words, "a\xC2\x85"), "contains the control character \\u0085");
+    EXPECT_EQ(objection(Form::Words, "a\xFF"), "contains the byte \\xff, which is not UTF-8");
     std::string const reason = objection(Form::Password, "geheim;").value();
     EXPECT_EQ(reason.find("geheim"), std::string::npos);
     EXPECT_EQ(reason.find(';', 0), reason.find("; letters"));

@@ -88,7 +88,7 @@ TEST(ValueText, OfATruthValueIsAFewWords)
 
 TEST(ValueText, OfAnAccountsNameIsRefusedWhereAShellWouldActOnIt)
 {
-    EXPECT_EQ(refusal(user, 108, "a;reboot"), "user-name: holds ';', which a shell would act on");
+    EXPECT_EQ(refusal(user, 108, "a;reboot"), "user-name: contains the shell metacharacter ';'");
     EXPECT_NE(refusal(user, 89, "0 -f"), "accepted");
     EXPECT_EQ(refusal(user, 108, "jdoe"), "accepted");
 }
@@ -104,7 +104,7 @@ TEST(ValueText, OfAMethodCallIsTakenApart)
 {
     EXPECT_EQ(refusal(os, 74, "UserDel,UserName:CMPI_string:jdoe"), "accepted");
     EXPECT_EQ(refusal(os, 74, "UserDel,UserName:CMPI_string:a;b"),
-              "UserName holds ';', which a shell would act on");
+              "UserName contains the shell metacharacter ';'");
 }
 
 TEST(ValueText, OfAMethodCallMayBeWhatDoesNothing)

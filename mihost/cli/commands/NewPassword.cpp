@@ -18,7 +18,7 @@ namespace
 
 std::string askTwice()
 {
-    std::string const password = terminal::readSecret("New password");
+    std::string password = terminal::readSecret("New password");
     if (terminal::readSecret("Repeat the new password") != password)
         throw Failure(BadUsage, "the passwords differ, so nothing was changed");
     return password;

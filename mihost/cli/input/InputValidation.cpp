@@ -27,14 +27,14 @@ std::optional<std::string> objectionToCharacters(std::string_view text)
         Utf8Piece const piece = firstPiece(text);
         std::string_view const shown = text.substr(0, piece.length);
         if (!piece.valid)
-            return fmt::format("holds the byte {}, which is no UTF-8",
+            return fmt::format("contains the byte {}, which is not UTF-8",
                                hexByte(static_cast<unsigned char>(text[0])));
         if (isControl(piece.character))
-            return fmt::format("holds the control character {}", printable(shown));
+            return fmt::format("contains the control character {}", printable(shown));
         if (shellMetacharacters.find(shown) != std::string_view::npos)
-            return fmt::format("holds '{}', which a shell would act on", shown);
+            return fmt::format("contains the shell metacharacter '{}'", shown);
         if (separators.find(shown) != std::string_view::npos)
-            return fmt::format("holds '{}', which separates values", shown);
+            return fmt::format("contains the separator '{}'", shown);
         text.remove_prefix(piece.length);
     }
     return std::nullopt;
@@ -43,9 +43,9 @@ std::optional<std::string> objectionToCharacters(std::string_view text)
 std::optional<std::string> objectionToWord(std::string_view text)
 {
     if (text.find(' ') != std::string_view::npos)
-        return "holds a blank";
+        return "contains a blank";
     if (text[0] == '-')
-        return "begins with '-', which a command would take for an option";
+        return "begins with '-', so a command would read it as an option";
     return std::nullopt;
 }
 
@@ -86,15 +86,15 @@ std::optional<std::string> objectionToForm(Form form, std::string_view text)
         return objectionToWord(text);
     case Form::Path:
         if (text[0] != '/')
-            return "is no absolute path: it must begin with '/'";
+            return "is not an absolute path: it must begin with '/'";
         return std::nullopt;
     case Form::Digits:
         if (!isDecimal(text) || text.size() > mostDigits)
-            return fmt::format("is no number: it must be 1 to {} decimal digits", mostDigits);
+            return fmt::format("is not a number: it must be 1 to {} decimal digits", mostDigits);
         return std::nullopt;
     case Form::Day:
         if (!parseDay(text))
-            return fmt::format("is no day: it must be {}", dayForm);
+            return fmt::format("is not a day: it must be {}", dayForm);
         return std::nullopt;
     case Form::Free:
     case Form::Words:
@@ -118,8 +118,8 @@ std::optional<std::string> objection(Form form, std::string_view text)
         return "is empty";
     if (auto reason = objectionToCharacters(text))
         return form == Form::Password
-                   ? "holds a character that may not stand in it; letters, digits "
-                     "and @ + - . / _ may"
+                   ? "contains a character that is not allowed (use letters, digits and "
+                     "@ + - . / _)"
                    : reason;
     if (auto reason = objectionToForm(form, text))
         return reason;

@@ -75,7 +75,7 @@ void checkTextForm(Parameter const& parameter, std::string const& value)
     if (parameter.form != Form::Day)
         checkAssignment({&parameter, parameter.name, value});
     else if (!parseDateTime(value))
-        throw Failure(BadUsage, fmt::format("{} is no date-time: it must be {}", parameter.name,
+        throw Failure(BadUsage, fmt::format("{} is not a date-time: it must be {}", parameter.name,
                                             dateTimeForm));
 }
 

@@ -61,14 +61,14 @@ std::optional<std::string> objectionToWords(std::string_view text)
     for (std::size_t at = 0; at < text.size(); ++at) {
         char const byte = text[at];
         if (isControl(byte))
-            return "it holds a control character";
+            return "it contains a control character";
         bool const escapes = byte == '\\' && at + 1 < text.size() && !isControl(text[at + 1]);
         if (escapes)
             ++at;
         else if (byte == '"')
             inQuotes = !inQuotes;
         else if (shellMetacharacters.find(byte) != std::string_view::npos)
-            return fmt::format("it holds '{}', which a shell would act on", byte);
+            return fmt::format("it contains the shell metacharacter '{}'", byte);
     }
     return inQuotes ? std::optional("its quotes do not end") : std::nullopt;
 }

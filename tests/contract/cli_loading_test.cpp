@@ -72,8 +72,8 @@ TEST(LoadingThePlugin, ShowsANodeOfAnUnknownKindButWritesNothingToIt)
               "2 #2\n        7 7  seven\n");
     Outcome const outcome = mihostRun({"--plugin", PLUGIN_THAT_IS_ODD, "set", "2", "7", "eight"});
     EXPECT_EQ(outcome.code, 4);
-    EXPECT_EQ(outcome.err, "mihost: nothing is known of property '7' of node '2', so it is not "
-                           "written\n");
+    EXPECT_EQ(outcome.err,
+              "mihost: set: property '7' of node '2' is unknown, so it is not written\n");
 }
 
 TEST(LoadingThePlugin, NeedsAFolderForItsPrivateOne)

@@ -341,6 +341,8 @@ TEST(MihostUsage, TellsWhatWasMeantOrWhereToReadOn)
         {{"tree", "os", "extra"}, "tree: unexpected argument 'extra' (see 'mihost tree --help')"},
         {{"power", "hatl"}, "power: ACTION: unknown value 'hatl' (did you mean halt?)"},
         {{"power", "sleep"}, "power: ACTION: unknown value 'sleep' (use restart, halt)"},
+        {{"watch", "os", "108", "--interval", "nan"},
+         "watch: --interval: 'nan' is not a number from 0 to 86400 (see 'mihost watch --help')"},
         {{"get"}, "get: NODE is required (see 'mihost get --help')"},
         {{"help", "gett"}, "help: no command 'gett' (did you mean get?)"},
         {{"help", "get", "os"}, "help: unexpected argument 'os'"}};

@@ -1,10 +1,10 @@
 #include "mihost/cli/check/Isolated.h"
 #include "mihost/cli/check/Report.h"
 #include "mihost/cli/commands/CommandRows.h"
+#include "mihost/cli/input/Range.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/sandbox/Sandbox.h"
 
-#include <CLI/Validators.hpp>
 #include <algorithm>
 #include <cstdlib>
 #include <stdexcept>
@@ -32,11 +32,11 @@ public:
                       {text, tap, junit})
             ->capture_default_str();
         app.add_option("--rounds", rounds_, "start and stop so often when looking for leaks")
-            ->check(CLI::Range(1U, 1000U))
+            ->check(between(1, 1000))
             ->capture_default_str();
         app.add_option("--time-limit", timeLimit_, "end each group of checks after so many seconds")
             ->type_name("SECONDS")
-            ->check(CLI::Range(1U, 86400U))
+            ->check(between(1, 86400))
             ->capture_default_str();
     }
 

@@ -2,13 +2,12 @@
 #include "mihost/cli/commands/Repetition.h"
 #include "mihost/cli/input/Address.h"
 #include "mihost/cli/input/Day.h"
+#include "mihost/cli/input/Range.h"
 #include "mihost/cli/output/PropertyText.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/Stderr.h"
 #include "mihost/runtime/Text.h"
 
-#include <cmath>
-#include <cstdlib>
 #include <ctime>
 #include <fmt/format.h>
 #include <map>
@@ -20,12 +19,6 @@ namespace mihost
 namespace
 {
 
-/** A range alone accepts what is not a number. */
-std::string objectionToNan(std::string const& text)
-{
-    return std::isnan(std::strtod(text.c_str(), nullptr)) ? text + " is not a number" : "";
-}
-
 class Watch : public Command
 {
 public:
@@ -35,11 +28,11 @@ public:
             ->required();
         app.add_option("PROPERTY", names_, "ids or names, see 'mihost properties'")->required();
         app.add_option("--interval", interval_, "wait S seconds between readings")
-            ->check(CLI::Range(0.0, 86400.0))
-            ->check(objectionToNan)
+            ->check(between(0, 86400))
             ->type_name("S")
             ->capture_default_str();
         app.add_option("-n,--count", count_, "stop after N readings; 0 means never")
+            ->check(between(0, 1000000000))
             ->type_name("N")
             ->capture_default_str();
     }

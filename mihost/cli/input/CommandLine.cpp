@@ -1,6 +1,7 @@
 #include "mihost/cli/input/CommandLine.h"
 
 #include "mihost/cli/input/Help.h"
+#include "mihost/cli/input/Range.h"
 #include "mihost/cli/input/Remote.h"
 #include "mihost/cli/input/Suggestion.h"
 #include "mihost/cli/system/Failure.h"
@@ -137,7 +138,7 @@ void CommandLine::declare(CLI::App& app)
     app.add_flag("-y,--yes", options_.yes, "answer yes to all prompts");
     app.add_option("--lock-timeout", options_.lockTimeout,
                    "give up after S seconds if another mihost is changing this machine")
-        ->check(CLI::Range(0U, 86400U))
+        ->check(between(0, 86400))
         ->type_name("S")
         ->capture_default_str();
     app.require_subcommand(0, 1);

@@ -29,6 +29,7 @@ Rules const ownRules = {
     {"mihost/hostcheck", {"host"}},
     {"mihost/sandbox", {}},
     {"mihost/accel", {"mihost/sandbox/Descriptor.h"}},
+    {"integrations/prometheus/exporter", {"mihost/sandbox/Descriptor.h"}},
 };
 
 /** What every folder of the program may include beside those that it uses. */

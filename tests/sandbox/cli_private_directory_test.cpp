@@ -136,11 +136,12 @@ TEST_F(MihostPrivateDirectory, IsRemovedWhereAFileGrowsTooLong)
     GTEST_SKIP() << "this sanitizer makes files of its own before the program starts";
 #endif
     for (char const* command : {"tree", "set user:jdoe password -", "--trace /tmp/trace tree"}) {
-        Outcome const outcome = bash("ulimit -f 0; $mihost " + std::string(command) + " >/tmp/out");
+        Outcome const outcome =
+            bash("ulimit -f 0; $mihost " + std::string(command) + " >/root/printed");
         EXPECT_LT(outcome.code, 128) << command;
         EXPECT_EQ(found().size(), 0U) << command;
     }
-    Outcome const outcome = bash("(ulimit -f 0; exec $mihost tree 2>&1 >/tmp/out) | cat");
+    Outcome const outcome = bash("(ulimit -f 0; exec $mihost tree 2>&1 >/root/printed) | cat");
     EXPECT_EQ(outcome.out, "mihost: cannot write the output: File too large\n");
 }
 

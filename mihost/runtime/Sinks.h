@@ -46,7 +46,10 @@ private:
     LineWriter& out_;
 };
 
-/** Every logger call, and every node that comes or goes, as a JSON object on a line of its own. */
+/**
+ * Every logger call, and every node that comes or goes, as a JSON object on a line of its own.
+ * Written by hand, since this library needs nothing but the standard one.
+ */
 class JsonLines : public LogSink, public NodeObserver
 {
 public:

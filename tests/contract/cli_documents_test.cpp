@@ -29,7 +29,7 @@ TEST(CatalogueCommands, DescribeOneKindOrMethod)
     EXPECT_EQ(group.find("user-name"), std::string::npos);
     std::string const method = mihostRun({"methods", "LocalGroupAdd"}).out;
     EXPECT_EQ(method, "LocalGroupAdd: makes a group\n"
-                      "  parameter  value            meaning\n"
+                      "  parameter  value  required  meaning\n"
                       "  GroupName  name   required  the group's name\n");
     EXPECT_EQ(mihostRun({"properties", "things"}).code, 2);
     EXPECT_EQ(mihostRun({"methods", "useradd"}).code, 2);
@@ -39,6 +39,7 @@ TEST(CatalogueCommands, TellAMethodsParametersInItsHelp)
 {
     std::string const help = mihostRun({"call", "LocalGroupAdd", "--help"}).out;
     EXPECT_NE(help.find("GroupName  name   required  the group's name"), std::string::npos) << help;
+    EXPECT_EQ(help.find("\xE2\x81"), std::string::npos); // no marks of styles
     EXPECT_NE(mihostRun({"call", "--help"}).out.find("UserSetHomeDir"), std::string::npos);
 }
 

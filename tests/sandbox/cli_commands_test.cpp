@@ -2,6 +2,7 @@
 
 #include "TestPaths.h"
 #include "mihost/cli/input/Day.h"
+#include "mihost/cli/output/DisplayWidth.h"
 #include "mihost/sandbox/Sandbox.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
@@ -52,23 +53,37 @@ TEST(MihostTree, HasALineForEachNodeBelowItsParent)
     makeMachine();
     Lines const lines = linesOf(mihostRun({"tree"}).out);
     ASSERT_GE(lines.size(), 6U);
-    EXPECT_EQ(lines[0], "mi #1  OsSw Management Interface");
-    EXPECT_EQ(lines[1], "└─ root #2  ROOT Node");
-    EXPECT_EQ(lines[2].rfind("   └─ computer #3  Computer: ", 0), 0U) << lines[2];
-    EXPECT_EQ(lines[3], "      └─ os #4  Operating System: Linux");
-    EXPECT_EQ(lines[4], "         ├─ driver:ext4 #5  Driver of ext4: 1.0");
-    EXPECT_EQ(lines.back(), "            └─ log:2 #" + std::to_string(lines.size()) +
-                                "  OS LogEntry: *first line*");
+    std::string const last = "        └─log:2 #" + std::to_string(lines.size());
+    struct Row {
+        std::size_t line;
+        std::string name;
+        std::string text;
+    };
+    std::size_t const textsBegin = lines[0].find("OsSw");
+    for (Row const& row :
+         std::initializer_list<Row>{{0, "mi #1  ", "  OsSw Management Interface"},
+                                    {1, "└─root #2  ", "  ROOT Node"},
+                                    {3, "    └─os #4  ", "  Operating System: Linux"},
+                                    {4, "      ├─driver:ext4 #5  ", "  Driver of ext4: 1.0"},
+                                    {lines.size() - 1, last, "  OS LogEntry: *first line*"}}) {
+        std::string const& line = lines[row.line];
+        EXPECT_EQ(line.rfind(row.name, 0), 0U) << line;
+        ASSERT_GE(line.size(), row.text.size());
+        std::size_t const text = line.size() - row.text.size();
+        EXPECT_EQ(line.substr(text), row.text) << line;
+        EXPECT_EQ(mihost::displayWidth(line.substr(0, text + 2)), textsBegin) << line;
+    }
 }
 
 TEST(MihostTree, CanBeginAtAnyNodeAndShowProperties)
 {
     makeMachine();
-    EXPECT_EQ(mihostRun({"tree", "--all", "driver:xfs"}).out, "driver:xfs #6  Driver of xfs: 1.0\n"
-                                                              "       36 manufacturer\n"
-                                                              "       70 build-number\n"
-                                                              "      108 driver-name     xfs\n"
-                                                              "      134 driver-version  1.0\n");
+    EXPECT_EQ(mihostRun({"tree", "--all", "driver:xfs"}).out,
+              "driver:xfs #6  Driver of xfs: 1.0\n"
+              "                36 manufacturer    -\n"
+              "                70 build-number    -\n"
+              "               108 driver-name     xfs\n"
+              "               134 driver-version  1.0\n");
 }
 
 TEST(MihostTree, AsJsonIsAnArrayInTheOrderOfTheNodeList)
@@ -91,17 +106,17 @@ TEST(MihostTree, AsJsonHoldsWhatAnswersOnlyLive)
 {
     makeMachine();
     Json const os = mihostJson({"tree"})[3];
-    EXPECT_EQ(os["properties"]["191"].dump(),
-              R"({"name":"clear-log","kind":"number","flag":true,"value":0})");
-    EXPECT_EQ(os["properties"]["123"]["flag"], false);
+    EXPECT_EQ(os["properties"]["clear-log"].dump(),
+              R"({"id":191,"kind":"number","flag":true,"value":0})");
+    EXPECT_EQ(os["properties"]["requested-state"]["flag"], false);
 }
 
 TEST(MihostTree, NamesEveryPropertyThatThePluginHas)
 {
     makeMachine();
     for (Json const& node : mihostJson({"tree"}))
-        for (auto const& [id, property] : node["properties"].items())
-            EXPECT_TRUE(property["name"].is_string()) << node["kind"] << " " << id;
+        for (auto const& [name, property] : node["properties"].items())
+            EXPECT_NE(name, std::to_string(property["id"].get<int>())) << node["kind"];
 }
 
 TEST(MihostTree, HasValuesOfTheKindsThatTheCatalogueNames)
@@ -109,13 +124,14 @@ TEST(MihostTree, HasValuesOfTheKindsThatTheCatalogueNames)
     makeMachine();
     Json const catalogue = mihostJson({"properties"});
     for (Json const& node : mihostJson({"tree"}))
-        for (auto const& [id, property] : node["properties"].items()) {
+        for (auto const& [name, property] : node["properties"].items()) {
             std::string expected;
             for (Json const& kind : catalogue)
                 for (Json const& row : kind["properties"])
-                    if (kind["kind"] == node["kind"] && std::to_string(row["id"].get<int>()) == id)
+                    if (kind["kind"] == node["kind"] && row["id"] == property["id"] &&
+                        row["name"] == name)
                         expected = row["kind"];
-            EXPECT_EQ(property["kind"], expected) << node["kind"] << " " << id;
+            EXPECT_EQ(property["kind"], expected) << node["kind"] << " " << name;
         }
 }
 
@@ -133,8 +149,8 @@ TEST(MihostGet, PrintsOneObjectAsJson)
     EXPECT_EQ(entry["kind"], "log-entry");
     EXPECT_EQ(entry["index"], 2);
     EXPECT_EQ(entry["properties"].dump(),
-              R"({"89":{"name":"index","kind":"number","flag":true,"value":2},)"
-              R"("81":{"name":"message","kind":"text","flag":true,"value":"*first line*"}})");
+              R"({"index":{"id":89,"kind":"number","flag":true,"value":2},)"
+              R"("message":{"id":81,"kind":"text","flag":true,"value":"*first line*"}})");
 }
 
 TEST(MihostGet, ExitsWith4ForAnUnknownNodeOrProperty)
@@ -185,7 +201,7 @@ TEST(MihostList, ShowsTheColumnsAskedFor)
     Json const list = mihostJson({"list", "log", "--columns", "message"});
     ASSERT_EQ(list.size(), 2U);
     EXPECT_EQ(list[0]["properties"].size(), 1U);
-    EXPECT_EQ(list[0]["properties"]["81"]["value"], "*second*");
+    EXPECT_EQ(list[0]["properties"]["message"]["value"], "*second*");
 }
 
 TEST(MihostList, PointsToTheDoctorWhereThereIsNothingOfTheKind)
@@ -211,7 +227,8 @@ TEST(MihostOutput, NeverHandsControlCharactersOfTheSystemToTheTerminal)
     EXPECT_EQ(mihostRun({"get", "log:1", "81"}).out, " 81 message  *a\\x1b[31mb\\xff*\n");
     for (Lines const& arguments : {Lines{"tree"}, Lines{"tree", "--all"}, Lines{"list", "log"}})
         EXPECT_EQ(mihostRun(arguments).out.find_first_of("\x1b\xFF"), std::string::npos);
-    EXPECT_EQ(mihostJson({"get", "log:1", "81"})["properties"]["81"]["value"], "*a\x1b[31mb\\xff*");
+    EXPECT_EQ(mihostJson({"get", "log:1", "81"})["properties"]["message"]["value"],
+              "*a\x1b[31mb\\xff*");
 }
 
 TEST(MihostTrace, IsJsonLinesInCallOrderWithBothLoggerOperations)
@@ -301,7 +318,7 @@ TEST(MihostWatch, PrintsTheFirstReadingAndThenOnlyWhatChanged)
     Json const second = Json::parse(lines[1])["properties"];
     EXPECT_EQ(first.size(), 2U);
     EXPECT_EQ(second.size(), 1U);
-    EXPECT_NE(first["81"]["value"], second["81"]["value"]);
+    EXPECT_NE(first["message"]["value"], second["message"]["value"]);
 }
 
 TEST(MihostVersion, NamesProgramContractAndPluginFile)

@@ -107,7 +107,7 @@ TEST_F(MihostLog, PrintsTheChosenNodesAsJsonAsThePluginHasThem)
 {
     Json const nodes = Json::parse(mihostRun({"--json", "list", "log", "--grep", "third"}).out);
     ASSERT_EQ(nodes.size(), 1U);
-    EXPECT_EQ(nodes[0]["properties"]["81"]["value"], "*box sshd[8]: third*");
+    EXPECT_EQ(nodes[0]["properties"]["message"]["value"], "*box sshd[8]: third*");
 }
 
 TEST_F(MihostLog, RefusesWrongValuesAndItsOptionsForOtherLists)

@@ -52,11 +52,11 @@ protected:
     {
         Lines names;
         Json const node = Json::parse(mihostRun({"--json", "get", user}).out);
-        for (Json const& property : node["properties"])
+        for (auto const& [name, property] : node["properties"].items())
             if (property.contains("unknown")) {
                 EXPECT_EQ(property["unknown"], reason);
                 EXPECT_EQ(property["value"], nullptr);
-                names.push_back(property["name"]);
+                names.push_back(name);
             }
         return names;
     }

@@ -103,9 +103,10 @@ TEST(MihostSecrets, AreHiddenWhereverTheyCouldShowAndShownWhenTold)
         told.emplace_back("--show-secrets");
         EXPECT_TRUE(stands(mihostRun(told).out, hash)) << arguments[0];
     }
-    EXPECT_EQ(Json::parse(mihostRun({"--json", "get", "user:jdoe", "117"}).out)["properties"]["117"]
-                  .dump(),
-              R"({"name":"password","kind":"text","flag":true,"value":null,"hidden":true})");
+    EXPECT_EQ(
+        Json::parse(mihostRun({"--json", "get", "user:jdoe", "117"}).out)["properties"]["password"]
+            .dump(),
+        R"({"id":117,"kind":"text","flag":true,"value":null,"hidden":true})");
     // The node keeps the text of the last call.
     Outcome const kept = mihostRun({"shell"}, script + "get os 74\n--show-secrets get os 74\n");
     Lines const lines = linesOf(kept.out);

@@ -10,7 +10,7 @@
 
 /**
  * mihost, or another program, run at a terminal as a person sees it. What it writes and shows comes
- * as one stream.
+ * as one stream, and nothing is paged unless MIHOST_PAGER is set.
  */
 class TerminalRun
 {

@@ -83,7 +83,7 @@ TEST(CheckReport, WritesJunitXml)
 
 TEST(CheckReport, IsAListAsJson)
 {
-    Json const list = toJson(results);
+    Json const list = toJson(tableOf(results));
     ASSERT_EQ(list.size(), 4U);
     EXPECT_EQ(list[1].dump(),
               R"({"check":"load.names","outcome":"passed","meaning":"it has names",)"

@@ -56,10 +56,10 @@ TEST(Completion, KnowsNothingAfterAnUnknownCommandOrOption)
 
 TEST(Completion, OffersTheOptionsOfTheCommandAndThoseOfAll)
 {
-    EXPECT_EQ(after({"list", "--c"}), Words{"--columns"});
+    EXPECT_EQ(after({"list", "--colu"}), Words{"--columns"});
     EXPECT_EQ(after({"list", "--js"}), Words{"--json"});
     EXPECT_EQ(after({"--js"}), Words{"--json"});
-    EXPECT_EQ(after({"--col"}), Words());
+    EXPECT_EQ(after({"--colu"}), Words());
 }
 
 TEST(Completion, OffersEachOptionOnce)
@@ -213,7 +213,20 @@ TEST(Completion, KnowsTheValueOfAShortOption)
     EXPECT_EQ(after({"watch", "-n", "5", "lo"}), (Words{"log", "log:"}));
     EXPECT_EQ(after({"watch", "-n5", "lo"}), (Words{"log", "log:"}));
     EXPECT_EQ(after({"-y", "power", "h"}), Words{"halt"});
-    EXPECT_EQ(after({"-q5", "power", "h"}), Words());
+    EXPECT_EQ(after({"-x5", "power", "h"}), Words());
+}
+
+TEST(Completion, OffersTheFormatsOfResults)
+{
+    EXPECT_EQ(after({"tree", "-o", "js"}), (Words{"json", "jsonl"}));
+    EXPECT_EQ(after({"--color=ne"}), Words{"--color=never"});
+}
+
+TEST(Completion, OffersColumnsToOrderAndChooseBy)
+{
+    EXPECT_EQ(after({"list", "groups", "--sort", "-group-n"}), Words{"-group-name"});
+    EXPECT_EQ(after({"list", "groups", "--where", "group-n"}), Words{"group-name="});
+    EXPECT_EQ(after({"list", "groups", "--where", "group-name=g"}), Words());
 }
 
 TEST(Completion, OffersColumnsOneAfterTheOther)

@@ -1,4 +1,4 @@
-#include "mihost/cli/output/Json.h"
+#include "mihost/cli/output/NodeJson.h"
 
 #include <gtest/gtest.h>
 
@@ -14,7 +14,7 @@ std::string dumped(IC::MutableNode const& node, Secrets secrets = Secrets::Hide)
     return toJson(mihost::storedView(node, secrets)).dump();
 }
 
-TEST(NodeAsJson, HasItsKeysInOrderAndItsPropertiesById)
+TEST(NodeAsJson, HasItsKeysInOrderAndItsPropertiesByName)
 {
     IC::MutableNode node(4, 3, {1}, 17, 0);
     node.setStatus(1);
@@ -24,8 +24,8 @@ TEST(NodeAsJson, HasItsKeysInOrderAndItsPropertiesById)
     std::string const start = R"({"id":4,"parent":3,"type":17,"kind":"os","index":0,"status":1,)"
                               R"("description":"Operating System","mi_ids":[1],"properties":{)";
     EXPECT_EQ(json.dump().substr(0, start.size()), start);
-    EXPECT_EQ(json["properties"]["108"].dump(),
-              R"({"name":"os-name","kind":"text","flag":true,"value":"Linux"})");
+    EXPECT_EQ(json["properties"]["os-name"].dump(),
+              R"({"id":108,"kind":"text","flag":true,"value":"Linux"})");
 }
 
 TEST(NodeAsJson, NamesEachKind)
@@ -55,14 +55,14 @@ TEST(NodeAsJson, WritesEachKindOfValueAsItsOwnJsonType)
           PropertyValue(PropertyValue::EmptyKind, true)})
         node.setProperty(++id, value);
     EXPECT_EQ(toJson(mihost::storedView(node, Secrets::Hide))["properties"].dump(),
-              R"({"1":{"name":null,"kind":"text","flag":true,"value":"a"},)"
-              R"("2":{"name":null,"kind":"number","flag":true,"value":4294967295},)"
-              R"("3":{"name":null,"kind":"boolean","flag":true,"value":true},)"
-              R"("4":{"name":null,"kind":"date","flag":true,"value":-5},)"
-              R"("5":{"name":null,"kind":"enumeration","flag":false,"value":7},)"
-              R"("6":{"name":null,"kind":"numbers","flag":true,"value":[0,24]},)"
-              R"("7":{"name":null,"kind":"texts","flag":true,"value":["x","y"]},)"
-              R"("8":{"name":null,"kind":"empty","flag":true,"value":null}})");
+              R"({"1":{"id":1,"kind":"text","flag":true,"value":"a"},)"
+              R"("2":{"id":2,"kind":"number","flag":true,"value":4294967295},)"
+              R"("3":{"id":3,"kind":"boolean","flag":true,"value":true},)"
+              R"("4":{"id":4,"kind":"date","flag":true,"value":-5},)"
+              R"("5":{"id":5,"kind":"enumeration","flag":false,"value":7},)"
+              R"("6":{"id":6,"kind":"numbers","flag":true,"value":[0,24]},)"
+              R"("7":{"id":7,"kind":"texts","flag":true,"value":["x","y"]},)"
+              R"("8":{"id":8,"kind":"empty","flag":true,"value":null}})");
 }
 
 TEST(NodeAsJson, WritesBytesThatAreNoUtf8InHex)
@@ -80,11 +80,11 @@ TEST(NodeAsJson, HidesPasswordHashesUntilTheyAreAskedFor)
     IC::MutableNode node(5, 4, {1}, 46, 1);
     node.setProperty(117, PropertyValue("$6$hash", true));
     auto const hidden = toJson(mihost::storedView(node, Secrets::Hide));
-    EXPECT_EQ(hidden["properties"]["117"].dump(),
-              R"({"name":"password","kind":"text","flag":true,"value":null,"hidden":true})");
+    EXPECT_EQ(hidden["properties"]["password"].dump(),
+              R"({"id":117,"kind":"text","flag":true,"value":null,"hidden":true})");
     auto const shown = toJson(mihost::storedView(node, Secrets::Show));
-    EXPECT_EQ(shown["properties"]["117"].dump(),
-              R"({"name":"password","kind":"text","flag":true,"value":"$6$hash"})");
+    EXPECT_EQ(shown["properties"]["password"].dump(),
+              R"({"id":117,"kind":"text","flag":true,"value":"$6$hash"})");
 }
 
 TEST(NodeAsJson, NeverShowsAMethodCallThatHoldsAPassword)
@@ -92,9 +92,10 @@ TEST(NodeAsJson, NeverShowsAMethodCallThatHoldsAPassword)
     IC::MutableNode node(4, 3, {1}, 17, 0);
     node.setProperty(74, PropertyValue("UserAdd,Password:CMPI_string:pw", true));
     for (Secrets const secrets : {Secrets::Hide, Secrets::Show})
-        EXPECT_TRUE(toJson(mihost::storedView(node, secrets))["properties"]["74"]["hidden"]);
+        EXPECT_TRUE(
+            toJson(mihost::storedView(node, secrets))["properties"]["create-user"]["hidden"]);
     node.setProperty(74, PropertyValue("UserDel,UserName:CMPI_string:jdoe", true));
-    EXPECT_EQ(toJson(mihost::storedView(node, Secrets::Hide))["properties"]["74"]["value"],
+    EXPECT_EQ(toJson(mihost::storedView(node, Secrets::Hide))["properties"]["create-user"]["value"],
               "UserDel,UserName:CMPI_string:jdoe");
 }
 

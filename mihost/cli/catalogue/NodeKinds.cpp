@@ -171,8 +171,8 @@ std::vector<NodeKind> const kinds = {
     several(nodeType::user, "user", property::name,
             "a local user account: ordinary ones and those with UID 0")
         .showing(property::fullName)
-        .listedAs("users", {"user-name", "user-id", "group-id", "full-name", "home-directory",
-                            "login-shell"})
+        .listedAs("users", {"user-name", "user-id", "group-id", "home-directory", "login-shell",
+                            "full-name"})
         .having(userProperties),
     several(nodeType::group, "group", property::name, "a local group: ordinary ones and GID 0")
         .showing(property::members)

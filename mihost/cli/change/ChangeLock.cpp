@@ -61,7 +61,7 @@ ChangeLock::ChangeLock(std::string const& file, Patience patience)
                                       "'fuser {}' shows the process)",
                                       file));
         if (!isSaid && now - start >= patience.silent) {
-            writeStderr("mihost: waiting for another mihost to finish its change\n");
+            warn("waiting for another mihost to finish its change");
             isSaid = true;
         }
         std::this_thread::sleep_for(std::min<steady_clock::duration>(pollInterval, limit - now));

@@ -223,13 +223,7 @@ void tellUnchanged(Write const& write)
     facts.reserve(write.expectations.size());
     for (Expectation const& expectation : write.expectations)
         facts.push_back(fmt::format("{} is already {}", expectation.subject, expectation.wanted));
-    writeStderr(fmt::format("mihost: nothing changed: {}\n",
-                            printable(fmt::format("{}", fmt::join(facts, ", ")))));
-}
-
-void warn(std::string const& text)
-{
-    writeStderr(fmt::format("mihost: {}\n", printable(text)));
+    warn(fmt::format("nothing changed: {}", fmt::join(facts, ", ")));
 }
 
 } // namespace

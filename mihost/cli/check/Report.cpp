@@ -1,9 +1,11 @@
 #include "mihost/cli/check/Report.h"
 
+#include "mihost/cli/output/Style.h"
 #include "mihost/runtime/Text.h"
 
 #include <algorithm>
 #include <fmt/format.h>
+#include <fmt/ranges.h>
 #include <map>
 
 namespace mihost::checks
@@ -34,6 +36,13 @@ char const* outcomeOf(Result const& result)
     return result.passed() ? "passed" : "skipped";
 }
 
+Style styleOf(Result const& result)
+{
+    if (result.failed())
+        return Style::Red;
+    return result.passed() ? Style::Green : Style::Yellow;
+}
+
 /** As text between XML tags or in an attribute's quotes; control characters have no place there. */
 std::string xml(std::string const& text)
 {
@@ -48,6 +57,14 @@ std::string xml(std::string const& text)
             escaped += entity->second;
     }
     return escaped;
+}
+
+Cell listCell(std::vector<std::string> const& texts)
+{
+    Json list = Json::array();
+    for (std::string const& text : texts)
+        list.push_back(mihost::toJson(text));
+    return {list, fmt::format("{}", fmt::join(texts, "; "))};
 }
 
 std::string scenarioOf(Result const& result)
@@ -102,8 +119,8 @@ void writeText(Results const& results, Output& out)
         width = std::max(width, result.name.size());
     for (Result const& result : results) {
         std::string const outcome = fmt::format("{:<9}", outcomeOf(result));
-        out.line(fmt::format("{}  {:<{}}  {}", result.failed() ? out.bold(outcome) : outcome,
-                             result.name, width, result.meaning));
+        out.line(fmt::format("{}  {:<{}}  {}", styled(styleOf(result), outcome), result.name, width,
+                             result.meaning));
         for (std::string const& finding : result.verdict.findings)
             out.line(below + printable(finding));
         if (result.verdict.skipped)
@@ -127,7 +144,8 @@ std::string tapText(Results const& results)
         if (result.failed()) {
             text += "  ---\n  findings:\n";
             for (std::string const& finding : result.verdict.findings)
-                text += fmt::format("    - {}\n", jsonString(finding)); // YAML reads JSON
+                text +=
+                    fmt::format("    - {}\n", mihost::toJson(finding).dump()); // YAML reads JSON
             text += "  ...\n";
         }
         for (std::string const& note : result.verdict.notes)
@@ -152,18 +170,14 @@ std::string junitText(Results const& results)
     return text + "</testsuites>\n";
 }
 
-Json toJson(Results const& results)
+Table tableOf(Results const& results)
 {
-    Json list = Json::array();
+    Table table({{"check"}, {"outcome"}, {"meaning"}, {"findings"}, {"notes"}, {"skipped"}});
     for (Result const& result : results)
-        list.push_back(
-            {{"check", result.name},
-             {"outcome", outcomeOf(result)},
-             {"meaning", result.meaning},
-             {"findings", result.verdict.findings},
-             {"notes", result.verdict.notes},
-             {"skipped", result.verdict.skipped ? Json(*result.verdict.skipped) : Json(nullptr)}});
-    return list;
+        table.add({result.name, outcomeOf(result), result.meaning,
+                   listCell(result.verdict.findings), listCell(result.verdict.notes),
+                   result.verdict.skipped ? Cell(*result.verdict.skipped) : Cell(nullptr, "")});
+    return table;
 }
 
 } // namespace mihost::checks

@@ -2,7 +2,6 @@
 #define MIHOST_CLI_CHECK_REPORT_H
 
 #include "mihost/cli/check/Check.h"
-#include "mihost/cli/output/Json.h"
 #include "mihost/cli/output/Output.h"
 
 /** The results of all checks in the forms that people and programs read. */
@@ -20,7 +19,8 @@ std::string tapText(Results const& results);
 /** An XML document as JUnit writes it, a test suite for each scenario. */
 std::string junitText(Results const& results);
 
-Json toJson(Results const& results);
+/** For every other format. */
+Table tableOf(Results const& results);
 
 } // namespace mihost::checks
 

@@ -3,6 +3,7 @@
 #include "mihost/cli/change/MethodWrite.h"
 #include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/output/CatalogueText.h"
+#include "mihost/cli/output/Style.h"
 
 #include <fmt/ranges.h>
 
@@ -28,9 +29,8 @@ public:
         app.footer([this] {
             Method const* const known =
                 method_->empty() ? nullptr : findMethod(method_->results().front());
-            return fmt::format(
-                "{}",
-                fmt::join(known ? methodLines(*known, Room()) : methodListLines(Room()), "\n"));
+            auto const lines = known ? methodLines(*known, Room()) : layOut(methodsTable(), Room());
+            return withoutStyles(fmt::format("{}", fmt::join(lines, "\n")));
         });
     }
 

@@ -10,12 +10,6 @@ namespace mihost
 namespace
 {
 
-void writeLines(std::vector<std::string> const& lines, Output& out)
-{
-    for (std::string const& line : lines)
-        out.line(line);
-}
-
 /** The rows of that name, or all where none is given. */
 template <class Rows> auto chosen(Rows const& rows, std::string const& name)
 {
@@ -24,6 +18,14 @@ template <class Rows> auto chosen(Rows const& rows, std::string const& name)
         if (name.empty() || row.name == name)
             result.push_back(&row);
     return result;
+}
+
+template <class Rows> Json documentOf(Rows const& rows)
+{
+    Json document = Json::array();
+    for (auto const* row : rows)
+        document.push_back(toJson(*row));
+    return document;
 }
 
 class Properties : public Command
@@ -36,21 +38,29 @@ public:
         app.add_flag("--markdown", markdown_, "as docs/properties.md");
     }
 
+    bool hasRows() const override
+    {
+        return true;
+    }
+
     void run(Session& session) override
     {
         if (markdown_) {
             session.out().write(propertiesDocument());
             return;
         }
-        Json document = Json::array();
-        for (NodeKind const* kind : chosen(nodeKinds(), kind_)) {
-            if (session.options().json)
-                document.push_back(toJson(*kind));
-            else
-                writeLines(kindLines(*kind, session.out().room()), session.out());
+        Output& out = session.out();
+        auto const kinds = chosen(nodeKinds(), kind_);
+        if (out.takesDocuments()) {
+            out.json(documentOf(kinds));
+        } else if (out.takesRows()) {
+            out.table(propertiesTable(kinds));
+        } else {
+            out.paged([&] {
+                for (NodeKind const* kind : kinds)
+                    out.lines(kindLines(*kind, out.room()));
+            });
         }
-        if (session.options().json)
-            session.out().json(document);
     }
 
 private:
@@ -69,20 +79,24 @@ public:
         app.add_flag("--markdown", markdown_, "as docs/methods.md");
     }
 
+    bool hasRows() const override
+    {
+        return true;
+    }
+
     void run(Session& session) override
     {
         Output& out = session.out();
         if (markdown_) {
             out.write(methodsDocument());
-        } else if (session.options().json) {
-            Json document = Json::array();
-            for (Method const* method : chosen(methods(), method_))
-                document.push_back(toJson(*method));
-            out.json(document);
+        } else if (out.takesDocuments()) {
+            out.json(documentOf(chosen(methods(), method_)));
         } else if (method_.empty()) {
-            writeLines(methodListLines(out.room()), out);
+            out.table(methodsTable());
+        } else if (out.takesRows()) {
+            out.table(parametersTable(*findMethod(method_)));
         } else {
-            writeLines(methodLines(*findMethod(method_), out.room()), out);
+            out.lines(methodLines(*findMethod(method_), out.room()));
         }
     }
 

@@ -3,6 +3,7 @@
 #include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/input/Range.h"
 #include "mihost/cli/plugin/Session.h"
+#include "mihost/cli/system/CommandLocale.h"
 #include "mihost/sandbox/Sandbox.h"
 
 #include <algorithm>
@@ -40,6 +41,11 @@ public:
             ->capture_default_str();
     }
 
+    bool hasRows() const override
+    {
+        return true;
+    }
+
     void run(Session& session) override
     {
         refuseWhatDoesNotFit(session.options());
@@ -53,8 +59,8 @@ public:
 private:
     void refuseWhatDoesNotFit(Options const& options) const
     {
-        if (options.json && format_ != text)
-            throw Failure(BadUsage, "check: --json and --format exclude each other");
+        if (options.format != Format::TableText && format_ != text)
+            throw Failure(BadUsage, "check: --format and -o exclude each other");
         if (!options.trace.empty())
             throw Failure(BadUsage, "check: no trace can be written (leave out --trace)");
     }
@@ -65,7 +71,7 @@ private:
             throw std::logic_error("plug-ins are checked in a sandbox only");
         // As for a plug-in that is loaded for use; see Session::plugin.
         umask(077);
-        setenv("LC_ALL", "C", 1);
+        useCommandLocale();
         checks::Settings const settings{pluginFile(plugin_.empty() ? options.plugin : plugin_),
                                         rounds_, std::chrono::seconds(timeLimit_)};
         checks::Results all;
@@ -77,8 +83,8 @@ private:
 
     void write(checks::Results const& results, Session& session) const
     {
-        if (session.options().json)
-            session.out().json(checks::toJson(results));
+        if (session.options().format != Format::TableText)
+            session.out().table(checks::tableOf(results));
         else if (format_ == tap)
             session.out().write(checks::tapText(results));
         else if (format_ == junit)

@@ -1,5 +1,6 @@
 #include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/doctor/Diagnosis.h"
+#include "mihost/cli/output/Style.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/runtime/Text.h"
 
@@ -22,24 +23,32 @@ bool isBeyondFixing(Need const& need)
     return !isMet(need) && !need.noFix.empty();
 }
 
-Json orNull(std::string const& text)
+Cell orNull(std::string const& text)
 {
-    return text.empty() ? Json(nullptr) : toJson(text);
+    return text.empty() ? Cell(nullptr, "") : Cell(text);
 }
 
-Json documentOf(std::vector<Need> const& needs)
+Cell truth(bool value)
 {
-    Json list = Json::array();
+    return {value, value ? "true" : "false"};
+}
+
+Table tableOf(std::vector<Need> const& needs)
+{
+    Table table({{"need"},
+                 {"ok"},
+                 {"fixable"},
+                 {"problem"},
+                 {"effect"},
+                 {"debian"},
+                 {"red-hat"},
+                 {"no-fix"}});
     for (Need const& need : needs)
-        list.push_back({{"need", need.what},
-                        {"ok", isMet(need)},
-                        {"fixable", isMet(need) ? Json(nullptr) : Json(!isBeyondFixing(need))},
-                        {"problem", isMet(need) ? Json(nullptr) : toJson(*need.problem)},
-                        {"effect", need.effect},
-                        {"debian", orNull(need.debian)},
-                        {"red-hat", orNull(need.redHat)},
-                        {"no-fix", orNull(need.noFix)}});
-    return list;
+        table.add({need.what, truth(isMet(need)),
+                   isMet(need) ? Cell(nullptr, "") : truth(!isBeyondFixing(need)),
+                   isMet(need) ? Cell(nullptr, "") : Cell(*need.problem), need.effect,
+                   orNull(need.debian), orNull(need.redHat), orNull(need.noFix)});
+    return table;
 }
 
 /** How a need that is not met is written. */
@@ -50,8 +59,9 @@ void writeUnmet(Need const& need, Output& out)
         std::string text;
     };
     bool const isBeyond = isBeyondFixing(need);
-    out.line(fmt::format("{}  {}: {}", out.bold(isBeyond ? "no fix " : "missing"), need.what,
-                         printable(*need.problem)));
+    std::string const state =
+        isBeyond ? styled(Style::Yellow, "no fix ") : styled(Style::Red, "missing");
+    out.line(fmt::format("{}  {}: {}", state, need.what, printable(*need.problem)));
     for (Row const& row :
          {Row{"effect", need.effect}, Row{"no fix", isBeyond ? need.noFix : ""},
           Row{"Debian", isBeyond ? "" : need.debian}, Row{"Red Hat", isBeyond ? "" : need.redHat}})
@@ -65,7 +75,7 @@ void write(std::vector<Need> needs, Output& out)
     auto const unmet = std::stable_partition(needs.begin(), needs.end(), isMet);
     auto const fixable = std::stable_partition(unmet, needs.end(), isBeyondFixing);
     for (auto need = needs.begin(); need != unmet; ++need)
-        out.line(fmt::format("ok       {}", need->what));
+        out.line(fmt::format("{}       {}", styled(Style::Green, "ok"), need->what));
     for (auto need = unmet; need != needs.end(); ++need)
         writeUnmet(*need, out);
     out.line(fmt::format("{} of {} missing, {} cannot be fixed here", needs.end() - unmet,
@@ -77,13 +87,19 @@ class Doctor : public Command
 public:
     void declare(CLI::App&) override {}
 
+    bool hasRows() const override
+    {
+        return true;
+    }
+
     void run(Session& session) override
     {
         std::vector<Need> const needs = diagnose();
-        if (session.options().json)
-            session.out().json(documentOf(needs));
+        Output& out = session.out();
+        if (out.takesDocuments() || out.takesRows())
+            out.table(tableOf(needs));
         else
-            write(needs, session.out());
+            write(needs, out);
         bool const isFixable = std::any_of(needs.begin(), needs.end(), [](Need const& need) {
             return !isMet(need) && !isBeyondFixing(need);
         });

@@ -4,7 +4,6 @@
 #include "mihost/cli/system/Failure.h"
 #include "mihost/runtime/Text.h"
 
-#include <algorithm>
 #include <fmt/format.h>
 
 namespace mihost
@@ -12,12 +11,10 @@ namespace mihost
 
 void writeFacts(std::vector<Fact> const& facts, Output& out)
 {
-    std::size_t width = 0;
+    Grid grid{{Column(""), Column("")}, {}};
     for (Fact const& fact : facts)
-        width = std::max(width, fact.label.size());
-    for (Fact const& fact : facts)
-        out.line(fmt::format("{:<{}}  {}", fact.label, width,
-                             fact.value.empty() ? "-" : printable(fact.value)));
+        grid.rows.push_back({fact.label, fact.value.empty() ? "-" : printable(fact.value)});
+    out.lines(layOut(grid, out.room()));
 }
 
 void failForNoAccount(char const* kind, std::string const& name,

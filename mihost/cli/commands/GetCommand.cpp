@@ -1,4 +1,5 @@
 #include "mihost/cli/commands/CommandRows.h"
+#include "mihost/cli/output/NodeJson.h"
 #include "mihost/cli/output/PropertyText.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/Stderr.h"
@@ -11,6 +12,15 @@ namespace mihost
 namespace
 {
 
+/** Values alone are the values of the properties; who wants more of them takes CSV. */
+Table rowsOf(NodeView const& view, Format format)
+{
+    Selection selection;
+    if (format == Format::BareValues)
+        selection.columns = {"value"};
+    return propertyTable(view.properties).selected(selection);
+}
+
 class Get : public Command
 {
 public:
@@ -22,17 +32,25 @@ public:
         app.add_option("PROPERTY", names_, "ids or names, see 'mihost properties'; all by default");
     }
 
+    bool hasRows() const override
+    {
+        return true;
+    }
+
     void run(Session& session) override
     {
         IC::MutableNode const& node = session.node(address_);
         NodeView const view = names_.empty() ? liveView(node, session.secrets())
                                              : liveView(node, names_, session.secrets());
-        if (session.options().json)
-            session.out().json(toJson(view));
+        Output& out = session.out();
+        if (out.takesDocuments())
+            out.json(toJson(view));
+        else if (out.takesRows())
+            out.table(rowsOf(view, session.options().format));
         else if (view.properties.empty())
-            writeStderr(fmt::format("mihost: node '{}' has no properties\n", address_));
+            warn(fmt::format("node '{}' has no properties", address_));
         else
-            writeProperties(view.properties, "", session.out());
+            writeProperties(view.properties, "", out);
     }
 
 private:

@@ -29,11 +29,13 @@ public:
     void declare(CLI::App& app) override
     {
         choices_.restrict(app.add_option("KIND", kind_, "what to list"), listNames())->required();
-        app.add_option("--columns", columns_,
-                       "show these properties, separated by commas; also "
-                       "id, index, status, description")
-            ->delimiter(',');
+        selection_.declare(app);
         logOptions_.declare(app);
+    }
+
+    bool hasRows() const override
+    {
+        return true;
     }
 
     void run(Session& session) override
@@ -43,12 +45,11 @@ public:
         if (std::string const option = logOptions_.firstGiven(); !isLog && !option.empty())
             throw Failure(BadUsage, fmt::format("list {}: {} is an option of 'mihost list log'",
                                                 kind_, option));
-        logOptions_.check();
+        logOptions_.check(session.options());
         if (logOptions_.follows()) {
             logOptions_.follow(session);
             return;
         }
-        NodeTable const table(kind, columns_);
         std::vector<IC::MutableNode*> nodes = session.nodes();
         nodes.erase(std::remove_if(nodes.begin(), nodes.end(),
                                    [&kind](IC::MutableNode const* node) {
@@ -58,21 +59,20 @@ public:
         bool const isEmpty = nodes.empty();
         if (isLog)
             nodes = logOptions_.chosen(nodes);
-        if (session.options().json)
-            session.out().json(table.json(nodes, session.secrets()));
-        else
-            table.write(nodes, session.secrets(), session.out(),
-                        [this, isLog](PropertyView const& property) {
-                            return isLog ? logOptions_.shownText(property) : valueText(property);
-                        });
-        if (isEmpty && !session.options().json)
-            writeStderr(
-                fmt::format("mihost: nothing to list under {}; see 'mihost doctor'\n", kind_));
+        auto const shownText = [this, isLog](PropertyView const& property) {
+            return isLog ? logOptions_.shownText(property) : valueText(property);
+        };
+        Output& out = session.out();
+        out.paged([&] {
+            writeNodes(kind, nodes, {session.secrets(), shownText}, selection_, out);
+        });
+        if (isEmpty && !out.takesDocuments())
+            warn(fmt::format("nothing to list under {}; see 'mihost doctor'", kind_));
     }
 
 private:
     std::string kind_;
-    std::vector<std::string> columns_;
+    Selection selection_;
     LogOptions logOptions_;
 };
 
@@ -84,8 +84,8 @@ CommandRow const commandRows::list{
     newCommand<List>,
     {
         {"mihost list users", "the user accounts"},
-        {"mihost list drivers --columns driver-name,driver-version",
-         "two columns of the kernel modules"},
+        {"mihost list users --where login-shell=/bin/bash --columns user-name -o value",
+         "the names of those with this shell"},
     },
 };
 

@@ -66,7 +66,6 @@ void LogOptions::declare(CLI::App& app)
         ->type_name("PATTERN");
     app.add_flag("--follow", follow_, "log: go on with new lines as they come");
     app.add_flag("--no-hostname", noHostName_, "log: leave out the name of the host");
-    app.add_flag("--full", full_, "log: show messages as the plug-in has them");
 }
 
 std::string LogOptions::firstGiven() const
@@ -75,17 +74,20 @@ std::string LogOptions::firstGiven() const
         char const* option;
         bool isGiven;
     };
-    for (Row const& row :
-         {Row{"--lines", count_.has_value()}, Row{"--since", !since_.empty()},
-          Row{"--until", !until_.empty()}, Row{"--grep", !pattern_.empty()},
-          Row{"--follow", follow_}, Row{"--no-hostname", noHostName_}, Row{"--full", full_}})
+    for (Row const& row : {Row{"--lines", count_.has_value()}, Row{"--since", !since_.empty()},
+                           Row{"--until", !until_.empty()}, Row{"--grep", !pattern_.empty()},
+                           Row{"--follow", follow_}, Row{"--no-hostname", noHostName_}})
         if (row.isGiven)
             return row.option;
     return "";
 }
 
-void LogOptions::check() const
+void LogOptions::check(Options const& options)
 {
+    isFull_ = options.full;
+    if (follow_ && isRows(options.format))
+        throw Failure(BadUsage,
+                      "list log: --follow prints no rows (use table, json, jsonl or yaml)");
     if (follow_ && !until_.empty())
         throw Failure(BadUsage, "list log: --follow and --until exclude each other");
 }
@@ -123,7 +125,7 @@ std::string LogOptions::shownText(PropertyView const& property) const
 
 std::string LogOptions::shownMessage(std::string const& message) const
 {
-    if (full_)
+    if (isFull_)
         return message;
     std::string const text = withoutAsterisks(message);
     return noHostName_ ? withoutHostName(text) : text;
@@ -136,8 +138,8 @@ void LogOptions::print(Session& session, LogLine const& line) const
         session.out().json(
             {{"time", line.time ? Json(*line.time) : Json(nullptr)}, {"message", toJson(message)}});
     else
-        session.out().line(
-            fmt::format("{:<19}  {}", line.time ? timeText(*line.time) : "-", printable(message)));
+        session.out().line(fmt::format("{:<19}  {}", line.time ? timeText(*line.time) : "-",
+                                       message.empty() ? "-" : printable(message)));
 }
 
 void LogOptions::follow(Session& session) const

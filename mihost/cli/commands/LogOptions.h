@@ -2,6 +2,7 @@
 #define MIHOST_CLI_COMMANDS_LOGOPTIONS_H
 
 #include "host/MutableNode.h"
+#include "mihost/cli/input/Options.h"
 #include "mihost/cli/log/LogFilter.h"
 #include "mihost/cli/output/NodeView.h"
 
@@ -24,8 +25,8 @@ public:
     /** The first of the options that was given, such as "--since"; empty for none. */
     std::string firstGiven() const;
 
-    /** @throws Failure (BadUsage) for options that exclude each other */
-    void check() const;
+    /** Takes those that hold for all commands. @throws Failure (BadUsage) if some do not fit */
+    void check(Options const& options);
 
     bool follows() const
     {
@@ -52,7 +53,7 @@ private:
     std::string pattern_;
     bool follow_ = false;
     bool noHostName_ = false;
-    bool full_ = false;
+    bool isFull_ = false;
 };
 
 } // namespace mihost

@@ -1,5 +1,5 @@
 #include "mihost/cli/commands/CommandRows.h"
-#include "mihost/cli/output/TreeText.h"
+#include "mihost/cli/output/NodeTree.h"
 #include "mihost/cli/plugin/Session.h"
 
 #include <unordered_set>
@@ -33,19 +33,17 @@ public:
         app.add_flag("--all", all_, "show every node's properties");
     }
 
+    bool hasRows() const override
+    {
+        return true;
+    }
+
     void run(Session& session) override
     {
         std::vector<IC::MutableNode*> nodes = session.nodes();
         if (!address_.empty())
             nodes = branchOf(nodes, findNode(nodes, address_));
-        if (session.options().json) {
-            Json document = Json::array();
-            for (IC::MutableNode const* node : nodes)
-                document.push_back(toJson(storedView(*node, session.secrets())));
-            session.out().json(document);
-            return;
-        }
-        writeTree(nodes, {all_, session.secrets()}, session.out());
+        session.out().paged([&] { writeTree(nodes, {all_, session.secrets()}, session.out()); });
     }
 
 private:

@@ -5,7 +5,6 @@
 #include "mihost/cli/input/Day.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/Stderr.h"
-#include "mihost/runtime/Text.h"
 
 #include <ctime>
 #include <fmt/format.h>
@@ -174,9 +173,10 @@ void showUser(Session& session, std::string const& name)
     else
         writeFacts(factsOf(*user), session.out());
     if (!user->unknown.empty())
-        writeStderr(fmt::format("mihost: reading passwords and ageing: {}, so some values are "
-                                "unknown (see 'mihost doctor')\n",
-                                printable(user->unknown)));
+        warn(
+            fmt::format("reading passwords and ageing: {}, so some values are unknown (see 'mihost "
+                        "doctor')",
+                        user->unknown));
 }
 
 } // namespace mihost

@@ -1,8 +1,6 @@
 #include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/plugin/Session.h"
 
-#include <fmt/format.h>
-
 namespace mihost
 {
 
@@ -14,19 +12,17 @@ class Version : public Command
 public:
     void declare(CLI::App&) override {}
 
+    bool hasRows() const override
+    {
+        return true;
+    }
+
     void run(Session& session) override
     {
         Plugin const& plugin = session.plugin();
-        if (session.options().json) {
-            session.out().json({{"mihost", MIHOST_VERSION},
-                                {"contract", MIHOST_CONTRACT},
-                                {"plugin", toJson(plugin.path())},
-                                {"soname", toJson(plugin.soname())}});
-            return;
-        }
-        session.out().line(fmt::format("mihost    {}", MIHOST_VERSION));
-        session.out().line(fmt::format("contract  {}", MIHOST_CONTRACT));
-        session.out().line(fmt::format("plug-in   {} ({})", plugin.soname(), plugin.path()));
+        Table table({{"mihost"}, {"contract"}, {"plugin"}, {"soname"}});
+        table.add({MIHOST_VERSION, MIHOST_CONTRACT, plugin.path(), plugin.soname()});
+        session.out().record(table);
     }
 };
 

@@ -3,10 +3,11 @@
 #include "mihost/cli/input/Address.h"
 #include "mihost/cli/input/Day.h"
 #include "mihost/cli/input/Range.h"
+#include "mihost/cli/output/NodeJson.h"
 #include "mihost/cli/output/PropertyText.h"
+#include "mihost/cli/output/UnknownValues.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/Stderr.h"
-#include "mihost/runtime/Text.h"
 
 #include <ctime>
 #include <fmt/format.h>
@@ -83,8 +84,7 @@ private:
         if (node)
             return liveView(*node, names_, session.secrets());
         if (wasThere)
-            writeStderr(fmt::format("mihost: watch: node '{}' is gone (waiting for it)\n",
-                                    printable(address_)));
+            warn(fmt::format("watch: node '{}' is gone (waiting for it)", address_));
         return {nullptr, {}};
     }
 

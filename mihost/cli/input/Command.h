@@ -21,6 +21,12 @@ public:
     /** Adds the command's own arguments and options, bound to its members. */
     virtual void declare(CLI::App& app) = 0;
 
+    /** Whether the results can also be printed as rows, so in every format. */
+    virtual bool hasRows() const
+    {
+        return false;
+    }
+
     /** @throws Failure */
     virtual void run(Session& session) = 0;
 

@@ -57,6 +57,23 @@ std::string wordForCommand(CLI::App const& command)
     return "";
 }
 
+Colours coloursOf(std::string const& name)
+{
+    if (name == "auto")
+        return Colours::Auto;
+    return name == "always" ? Colours::Always : Colours::Never;
+}
+
+/** @throws Failure (BadUsage) if the command's results do not come in that format */
+void checkFormat(Format format, Command const& command, std::string const& name)
+{
+    if (isRows(format) && !command.hasRows())
+        throw Failure(
+            BadUsage,
+            fmt::format("{}: -o {} needs results in rows (use table, json, jsonl or yaml)", name,
+                        formatNames()[static_cast<std::size_t>(format)]));
+}
+
 /** What is wrong with the first word that nothing takes. */
 std::string excessOf(CLI::App const& app, std::string const& help)
 {
@@ -127,13 +144,42 @@ void CommandLine::declareForProgram(CLI::App& app)
                  "show the time of each phase of the start, and what was answered in-process");
 }
 
+void CommandLine::setFormat(Format format)
+{
+    if (isFormatGiven_)
+        throw CLI::ValidationError("--json and -o exclude each other");
+    isFormatGiven_ = true;
+    options_.format = format;
+    options_.json = isDocument(format);
+}
+
+void CommandLine::declareOutput(CLI::App& app)
+{
+    choices_.restrict(app.add_option_function<std::string>(
+                          "-o,--output-format",
+                          [this](std::string const& name) { setFormat(formatOf(name)); },
+                          "print results in this format"),
+                      formatNames());
+    app.add_flag_callback(
+        "--json", [this] { setFormat(Format::JsonText); }, "as -o json");
+    app.add_flag("--no-headers", options_.noHeaders, "leave the headings of tables and CSV out");
+    app.add_flag("--full", options_.full, "wrap nothing at the width of the terminal");
+    app.add_flag("--no-pager", options_.noPager, "do not page long tables and trees");
+    choices_.restrict(app.add_option_function<std::string>(
+                          "--color",
+                          [this](std::string const& when) { options_.colours = coloursOf(when); },
+                          "when to use colours"),
+                      {"auto", "always", "never"});
+    app.add_flag("-q,--quiet", options_.quiet, "show no warnings and no progress");
+}
+
 void CommandLine::declare(CLI::App& app)
 {
     app.fallthrough();
     setHelpLabels(app);
     if (place_ == Place::Program)
         declareForProgram(app);
-    app.add_flag("--json", options_.json, "print JSON");
+    declareOutput(app);
     app.add_flag("--show-secrets", options_.showSecrets, "show password hashes");
     app.add_flag("-y,--yes", options_.yes, "answer yes to all prompts");
     app.add_option("--lock-timeout", options_.lockTimeout,
@@ -174,6 +220,7 @@ void CommandLine::choose(std::string const& name)
     for (Declared const& each : all_)
         if (each.row->name == name) {
             command_ = each.command.get();
+            checkFormat(options_.format, *command_, name);
             options_.sandbox = options_.sandbox || each.row->has(CommandRow::AlwaysSandbox);
         }
 }

@@ -53,11 +53,14 @@ private:
     void declareForProgram(CLI::App& app);
     void declareCommands(CLI::App& app);
     void choose(std::string const& name);
+    void declareOutput(CLI::App& app);
+    void setFormat(Format format);
 
     CommandTable const& table_;
     Place place_;
     Options options_;
-    ChoiceTable choices_; // of the options that hold for all commands
+    bool isFormatGiven_ = false; // on this line, rather than where the shell was started
+    ChoiceTable choices_;        // of the options that hold for all commands
     std::vector<Declared> all_;
     std::vector<std::string> helpWords_;
     Command* command_ = nullptr;

@@ -1,6 +1,9 @@
 #ifndef MIHOST_CLI_INPUT_OPTIONS_H
 #define MIHOST_CLI_INPUT_OPTIONS_H
 
+#include "mihost/cli/input/Format.h"
+#include "mihost/cli/system/Colours.h"
+
 #include <string>
 
 namespace mihost
@@ -13,7 +16,13 @@ struct Options {
     std::string trace;   // empty for none, "-" for standard error
     std::string overlay; // a folder to lay over the sandbox; empty for none
     bool sandbox = false;
-    bool json = false;
+    Format format = Format::TableText;
+    bool json = false; // the format is a document
+    Colours colours = Colours::Auto;
+    bool noHeaders = false; // of tables and CSV
+    bool full = false;      // nothing is wrapped to fit the terminal
+    bool noPager = false;
+    bool quiet = false; // no warnings and no progress
     bool showSecrets = false;
     bool yes = false; // do without asking
     bool timing = false;

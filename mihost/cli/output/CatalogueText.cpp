@@ -16,14 +16,14 @@ std::string addressForm(NodeKind const& kind)
     return kind.single ? kind.address : fmt::format("{}:NAME", kind.address);
 }
 
-std::vector<std::string> indented(TextTable const& table, Room room)
+/** The title, and the table below it, which may have no rows. */
+std::vector<std::string> titled(std::string const& title, Table const& table, Room const& room)
 {
     constexpr std::size_t indent = 2;
-    if (room.columns != Room::unlimited)
-        room.columns -= std::min(room.columns, indent);
-    std::vector<std::string> lines = table.lines(room);
-    for (std::string& line : lines)
-        line.insert(0, indent, ' ');
+    std::vector<std::string> lines = {title};
+    if (!table.rows().empty())
+        for (std::string const& line : layOut(table, room.indented(indent)))
+            lines.push_back(std::string(indent, ' ') + line);
     return lines;
 }
 
@@ -31,39 +31,46 @@ std::vector<std::string> indented(TextTable const& table, Room room)
 
 std::vector<std::string> kindLines(NodeKind const& kind, Room const& room)
 {
-    std::vector<std::string> lines = {
-        fmt::format("{} (type {}, {}): {}", kind.name, kind.type, addressForm(kind), kind.meaning)};
-    if (kind.properties.empty())
-        return lines;
-    TextTable table({"id", "name", "kind", "", "meaning"});
-    for (Property const& property : kind.properties)
-        table.add({fmt::format("{:>3}", property.id), property.name, typeText(property),
-                   traitsText(property), property.meaning});
-    for (std::string const& line : indented(table, room))
-        lines.push_back(line);
-    return lines;
+    Selection withoutKind;
+    withoutKind.columns = {"id", "name", "type", "traits", "meaning"};
+    return titled(
+        fmt::format("{} (type {}, {}): {}", kind.name, kind.type, addressForm(kind), kind.meaning),
+        propertiesTable({&kind}).selected(withoutKind), room);
 }
 
 std::vector<std::string> methodLines(Method const& method, Room const& room)
 {
-    std::vector<std::string> lines = {fmt::format("{}: {}", method.name, method.meaning)};
-    if (method.parameters.empty())
-        return lines;
-    TextTable table({"parameter", "value", "", "meaning"});
-    for (Parameter const& parameter : method.parameters)
-        table.add({parameter.name, formName(parameter.form), parameter.required ? "required" : "",
-                   parameter.meaning});
-    for (std::string const& line : indented(table, room))
-        lines.push_back(line);
-    return lines;
+    return titled(fmt::format("{}: {}", method.name, method.meaning), parametersTable(method),
+                  room);
 }
 
-std::vector<std::string> methodListLines(Room const& room)
+Table propertiesTable(std::vector<NodeKind const*> const& kinds)
 {
-    TextTable table({"method", "what it does"});
+    Table table(
+        {{"kind"}, {"id", Column::Align::Right}, {"name"}, {"type"}, {"traits"}, {"meaning"}});
+    for (NodeKind const* kind : kinds)
+        for (Property const& property : kind->properties)
+            table.add({kind->name, Cell(property.id, std::to_string(property.id)), property.name,
+                       typeText(property), traitsText(property), property.meaning});
+    return table;
+}
+
+Table methodsTable()
+{
+    Table table({{"method"}, {"meaning"}});
     for (Method const& method : methods())
         table.add({method.name, method.meaning});
-    return table.lines(room);
+    return table;
+}
+
+Table parametersTable(Method const& method)
+{
+    Table table({{"parameter"}, {"value"}, {"required"}, {"meaning"}});
+    for (Parameter const& parameter : method.parameters)
+        table.add({parameter.name, formName(parameter.form),
+                   Cell(parameter.required, parameter.required ? "required" : ""),
+                   parameter.meaning});
+    return table;
 }
 
 Json toJson(NodeKind const& kind)

@@ -2,8 +2,7 @@
 #define MIHOST_CLI_OUTPUT_CATALOGUETEXT_H
 
 #include "mihost/cli/catalogue/Catalogue.h"
-#include "mihost/cli/output/Json.h"
-#include "mihost/cli/output/TextTable.h"
+#include "mihost/cli/output/Layout.h"
 
 #include <string>
 #include <vector>
@@ -14,7 +13,11 @@ namespace mihost
 
 std::vector<std::string> kindLines(NodeKind const& kind, Room const& room);
 std::vector<std::string> methodLines(Method const& method, Room const& room);
-std::vector<std::string> methodListLines(Room const& room);
+
+/** All properties of the kinds, all methods, and the parameters of one, as rows. */
+Table propertiesTable(std::vector<NodeKind const*> const& kinds);
+Table methodsTable();
+Table parametersTable(Method const& method);
 
 Json toJson(NodeKind const& kind);
 Json toJson(Method const& method);

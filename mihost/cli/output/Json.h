@@ -1,9 +1,10 @@
 #ifndef MIHOST_CLI_OUTPUT_JSON_H
 #define MIHOST_CLI_OUTPUT_JSON_H
 
-#include "mihost/cli/output/NodeView.h"
+#include "host/PropertyValue.h"
 
 #include <nlohmann/json.hpp>
+#include <string>
 
 namespace mihost
 {
@@ -11,11 +12,11 @@ namespace mihost
 // Keys stand in the order in which they are written.
 using Json = nlohmann::ordered_json;
 
-/** Bytes that are no UTF-8 become \xNN, so that the document is always valid. */
+/** Bytes that are not UTF-8 become \xNN, so that the document is always valid. */
 Json toJson(std::string const& text);
 
-Json toJson(PropertyView const& property);
-Json toJson(NodeView const& node);
+/** A value in its own type: dates are numbers, lists are lists, an empty value is null. */
+Json valueToJson(IC::PropertyValue const& value);
 
 } // namespace mihost
 

@@ -1,12 +1,8 @@
 #include "mihost/cli/output/NodeTable.h"
 
-#include "mihost/cli/input/Suggestion.h"
-#include "mihost/cli/output/TextTable.h"
-#include "mihost/cli/system/Failure.h"
-#include "mihost/runtime/Text.h"
+#include "mihost/cli/output/NodeJson.h"
 
 #include <algorithm>
-#include <fmt/format.h>
 
 namespace mihost
 {
@@ -16,91 +12,90 @@ namespace
 
 struct Attribute {
     char const* name;
-    std::string (*of)(IC::MutableNode const& node);
+    Cell (*of)(IC::MutableNode const& node);
 };
+
+Cell number(unsigned int value)
+{
+    return {value, std::to_string(value)};
+}
 
 constexpr Attribute attributes[] = {
-    {"id", [](IC::MutableNode const& node) { return std::to_string(node.getNodeId()); }},
-    {"index", [](IC::MutableNode const& node) { return std::to_string(node.getIndex()); }},
-    {"status", [](IC::MutableNode const& node) { return std::to_string(node.getStatus()); }},
-    {"description", [](IC::MutableNode const& node) { return node.getDescription(); }},
+    {"id", [](IC::MutableNode const& node) { return number(node.getNodeId()); }},
+    {"index", [](IC::MutableNode const& node) { return number(node.getIndex()); }},
+    {"status", [](IC::MutableNode const& node) { return number(node.getStatus()); }},
+    {"description", [](IC::MutableNode const& node) { return Cell(node.getDescription()); }},
 };
 
-std::vector<std::string> namesFor(NodeKind const& kind)
+/** Properties first: an index that is read comes before the attribute of that name. */
+std::vector<Column> columnsOf(NodeKind const& kind)
 {
-    std::vector<std::string> names = rowNames(kind.properties);
+    std::vector<Column> columns;
+    for (Property const& property : kind.properties)
+        columns.push_back({property.name, Column::Align::Left, std::to_string(property.id)});
     for (Attribute const& attribute : attributes)
-        names.emplace_back(attribute.name);
-    return names;
+        columns.push_back({attribute.name, Column::Align::Left, ""});
+    return columns;
+}
+
+Cell cellOf(NodeView const& view, unsigned int id, PropertyStyle const& style)
+{
+    for (PropertyView const& property : view.properties)
+        if (property.id == id) {
+            Cell cell = cellOf(property);
+            cell.text = style.text(property);
+            return cell;
+        }
+    return {nullptr, ""};
+}
+
+Table tableOf(NodeKind const& kind, std::vector<NodeView> const& views, PropertyStyle const& style)
+{
+    Table table(columnsOf(kind), kind.columns);
+    for (NodeView const& view : views) {
+        std::vector<Cell> cells;
+        for (Property const& property : kind.properties)
+            cells.push_back(cellOf(view, property.id, style));
+        for (Attribute const& attribute : attributes)
+            cells.push_back(attribute.of(*view.node));
+        table.add(std::move(cells));
+    }
+    return table;
+}
+
+/** Leaves the properties that are columns. */
+void keepColumns(NodeView& view, std::vector<Column> const& columns)
+{
+    auto const isLeftOut = [&columns](PropertyView const& property) {
+        return std::none_of(columns.begin(), columns.end(), [&property](Column const& column) {
+            return column.name == nameOf(property);
+        });
+    };
+    view.properties.erase(std::remove_if(view.properties.begin(), view.properties.end(), isLeftOut),
+                          view.properties.end());
 }
 
 } // namespace
 
-NodeTable::NodeTable(NodeKind const& kind, std::vector<std::string> const& columns)
-    : chosen_(!columns.empty())
+void writeNodes(NodeKind const& kind, std::vector<IC::MutableNode*> const& nodes,
+                PropertyStyle const& style, Selection const& selection, Output& out)
 {
-    for (std::string const& name : chosen_ ? columns : kind.columns)
-        columns_.push_back(columnOf(kind, name));
-}
-
-NodeTable::Column NodeTable::columnOf(NodeKind const& kind, std::string const& name)
-{
-    // A property first: an index that is read comes before the attribute of that name.
-    for (Property const& property : kind.properties)
-        if (property.name == name || std::to_string(property.id) == name)
-            return {property.name, nullptr, property.id};
-    for (Attribute const& attribute : attributes)
-        if (attribute.name == name)
-            return {attribute.name, attribute.of, 0};
-    throw Failure(NotFound, fmt::format("no column '{}' for {}; {}", name, kind.listName,
-                                        suggestion(name, namesFor(kind), "there are")));
-}
-
-std::string NodeTable::cell(Column const& column, NodeView const& view, ShownText const& shownText)
-{
-    if (column.attribute)
-        return column.attribute(*view.node);
-    for (PropertyView const& property : view.properties)
-        if (property.id == column.property)
-            return shownText(property);
-    return "";
-}
-
-void NodeTable::write(std::vector<IC::MutableNode*> const& nodes, Secrets secrets, Output& out,
-                      ShownText const& shownText) const
-{
-    std::vector<std::string> heading;
-    for (Column const& column : columns_)
-        heading.push_back(column.heading);
-    TextTable table(heading);
-    for (IC::MutableNode const* node : nodes) {
-        NodeView const view = storedView(*node, secrets);
-        std::vector<std::string> cells;
-        for (Column const& column : columns_)
-            cells.push_back(printable(cell(column, view, shownText)));
-        table.add(cells);
+    std::vector<NodeView> views;
+    for (IC::MutableNode const* node : nodes)
+        views.push_back(storedView(*node, style.secrets));
+    Table const table = tableOf(kind, views, style).selected(selection);
+    if (!out.takesDocuments()) {
+        out.table(table);
+        return;
     }
-    for (std::string const& line : table.lines(out.room()))
-        out.line(line);
-}
-
-Json NodeTable::json(std::vector<IC::MutableNode*> const& nodes, Secrets secrets) const
-{
     Json list = Json::array();
-    for (IC::MutableNode const* node : nodes) {
-        NodeView view = storedView(*node, secrets);
-        auto const isLeftOut = [this](PropertyView const& property) {
-            return std::none_of(columns_.begin(), columns_.end(), [&property](auto const& column) {
-                return column.property == property.id;
-            });
-        };
-        if (chosen_)
-            view.properties.erase(
-                std::remove_if(view.properties.begin(), view.properties.end(), isLeftOut),
-                view.properties.end());
+    for (Table::Row const& row : table.rows()) {
+        NodeView& view = views[row.number];
+        if (!selection.columns.empty())
+            keepColumns(view, table.columns());
         list.push_back(toJson(view));
     }
-    return list;
+    out.json(list);
 }
 
 } // namespace mihost

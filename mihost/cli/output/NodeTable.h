@@ -1,7 +1,7 @@
 #ifndef MIHOST_CLI_OUTPUT_NODETABLE_H
 #define MIHOST_CLI_OUTPUT_NODETABLE_H
 
-#include "mihost/cli/output/Json.h"
+#include "mihost/cli/output/NodeView.h"
 #include "mihost/cli/output/Output.h"
 
 #include <functional>
@@ -11,38 +11,21 @@
 namespace mihost
 {
 
-/** A property's text in a table, such as valueText(). */
-using ShownText = std::function<std::string(PropertyView const& property)>;
-
-/** Nodes of one kind, a row each, as far as they are stored. */
-class NodeTable
-{
-public:
-    /**
-     * @param columns  property names or ids, or attributes of nodes; empty for the usual ones
-     * @throws Failure (NotFound) for a column that the kind does not have
-     */
-    NodeTable(NodeKind const& kind, std::vector<std::string> const& columns);
-
-    void write(std::vector<IC::MutableNode*> const& nodes, Secrets secrets, Output& out,
-               ShownText const& shownText = valueText) const;
-
-    /** As in the tree, with the chosen properties only where some were chosen. */
-    Json json(std::vector<IC::MutableNode*> const& nodes, Secrets secrets) const;
-
-private:
-    struct Column {
-        std::string heading;
-        std::string (*attribute)(IC::MutableNode const& node); // null for a property
-        unsigned int property;
-    };
-
-    static Column columnOf(NodeKind const& kind, std::string const& name);
-    static std::string cell(Column const& column, NodeView const& view, ShownText const& shownText);
-
-    std::vector<Column> columns_;
-    bool chosen_;
+/** How properties are shown. */
+struct PropertyStyle {
+    Secrets secrets;
+    std::function<std::string(PropertyView const& property)> text = valueText; // of a cell
 };
+
+/**
+ * Writes the nodes, all of one kind, as far as they are stored: as a table, or as documents like
+ * those of the tree, with the selected properties only if columns are selected. Columns are
+ * properties by name or id, and the attributes id, index, status and description.
+ *
+ * @throws Failure (NotFound) for a column that the kind does not have
+ */
+void writeNodes(NodeKind const& kind, std::vector<IC::MutableNode*> const& nodes,
+                PropertyStyle const& style, Selection const& selection, Output& out);
 
 } // namespace mihost
 

@@ -8,7 +8,6 @@
 
 #include <fmt/format.h>
 #include <set>
-#include <utility>
 
 namespace mihost
 {
@@ -58,13 +57,6 @@ void addLive(NodeView& to, unsigned int id, Secrets secrets, ShadowGap const& ga
     IC::PropertyValue value = emptyValue();
     if (to.node->getProperty(id, value).getStatus() == 0)
         to.properties.push_back(view(findKind(to.node->getNodeType()), id, value, secrets, gap));
-}
-
-/** Why values are unknown, for the warning that is still to be given. */
-std::string& pendingReason()
-{
-    static std::string reason;
-    return reason;
 }
 
 } // namespace
@@ -132,25 +124,17 @@ unsigned int propertyId(IC::MutableNode const& node, std::string const& name)
 
 std::string valueText(PropertyView const& property)
 {
-    noteUnknown(property);
     if (!property.unknown.empty())
         return "-";
     return property.hidden ? "(hidden)" : static_cast<std::string>(property.value);
 }
 
-void noteUnknown(PropertyView const& property)
+Cell cellOf(PropertyView const& property)
 {
-    if (pendingReason().empty())
-        pendingReason() = property.unknown;
-}
-
-std::string takeUnknownWarning()
-{
-    std::string const reason = std::exchange(pendingReason(), "");
-    return reason.empty() ? ""
-                          : fmt::format("reading passwords and ageing: {}, so some values are "
-                                        "unknown (see 'mihost doctor')",
-                                        reason);
+    bool const isShown = property.unknown.empty() && !property.hidden;
+    Cell cell(isShown ? valueToJson(property.value) : Json(nullptr), valueText(property));
+    cell.unknown = property.unknown;
+    return cell;
 }
 
 std::string nameOf(PropertyView const& property)

@@ -3,6 +3,7 @@
 
 #include "host/MutableNode.h"
 #include "mihost/cli/catalogue/Catalogue.h"
+#include "mihost/cli/output/Table.h"
 
 #include <string>
 #include <vector>
@@ -48,11 +49,8 @@ unsigned int propertyId(IC::MutableNode const& node, std::string const& name);
 /** The value as a person reads it, "-" if it is unknown; not yet safe for a terminal. */
 std::string valueText(PropertyView const& property);
 
-/** Notes that an unknown value is shown. valueText does so, too. */
-void noteUnknown(PropertyView const& property);
-
-/** The warning for all unknown values shown since the last call; empty for none. */
-std::string takeUnknownWarning();
+/** The value for a table. */
+Cell cellOf(PropertyView const& property);
 
 /** The property's catalogue name, or its id where it has none. */
 std::string nameOf(PropertyView const& property);

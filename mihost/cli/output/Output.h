@@ -1,11 +1,13 @@
 #ifndef MIHOST_CLI_OUTPUT_OUTPUT_H
 #define MIHOST_CLI_OUTPUT_OUTPUT_H
 
-#include "mihost/cli/output/Json.h"
-#include "mihost/cli/output/TextTable.h"
+#include "mihost/cli/input/Options.h"
+#include "mihost/cli/output/Layout.h"
 
 #include <cstdio>
 #include <exception>
+#include <functional>
+#include <optional>
 #include <string_view>
 
 namespace mihost
@@ -16,27 +18,54 @@ class OutputClosed : public std::exception
 {
 };
 
-/** Where a command's results go. */
+/** Where a command's results go, in the format that the user wants. */
 class Output
 {
 public:
     explicit Output(std::FILE* stream);
 
+    /** Takes format, colours, width and paging from the options. */
+    void setOptions(Options const& options)
+    {
+        options_ = options;
+    }
+
     /** @throws OutputClosed, or Failure where the text cannot be written */
     void write(std::string_view text);
 
-    /** Writes the text and a line end. */
+    /** Writes printable, perhaps styled text and a line end. */
     void line(std::string_view text);
+    void lines(std::vector<std::string> const& texts);
 
-    /** Writes the document on one line. */
+    /** Whether the user's format is one for documents, or one for rows. */
+    bool takesDocuments() const
+    {
+        return isDocument(options_.format);
+    }
+    bool takesRows() const
+    {
+        return isRows(options_.format);
+    }
+
+    /** Writes the document in the user's format, which is one for documents. */
     void json(Json const& document);
+
+    /** Writes the table in the user's format, whichever it is. */
+    void table(Table const& table);
+
+    /** Writes the table's one row in the user's format: an object, or lines of heading and value.
+     */
+    void record(Table const& table);
+
+    /**
+     * Runs the step, which writes. At a terminal that does not hold all of it, a pager shows it.
+     *
+     * @throws as write
+     */
+    void paged(std::function<void()> const& step);
 
     /** @throws as write */
     void flush();
-
-    /** The text in bold or faint where that can be shown. */
-    std::string bold(std::string const& text) const;
-    std::string faint(std::string const& text) const;
 
     /** How much was written so far. */
     std::size_t size() const
@@ -49,15 +78,18 @@ public:
         return fileno(stream_);
     }
 
-    /** What a line may take: the terminal's columns where it goes to one. */
+    /** What a line may take: the terminal's columns if it goes to one. */
     Room room() const;
 
 private:
     [[noreturn]] static void fail();
-    std::string styled(char const* start, std::string const& text) const;
+    bool mayPage() const;
+    std::string shown(std::string_view text) const;
 
     std::FILE* stream_;
+    Options options_;
     std::size_t size_ = 0;
+    std::optional<std::string> held_; // what is written, until it is known whether it is paged
 };
 
 } // namespace mihost

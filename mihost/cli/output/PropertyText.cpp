@@ -1,27 +1,61 @@
 #include "mihost/cli/output/PropertyText.h"
 
+#include "mihost/cli/output/DisplayWidth.h"
+#include "mihost/cli/output/UnknownValues.h"
 #include "mihost/runtime/Text.h"
 
-#include <algorithm>
 #include <fmt/format.h>
 
 namespace mihost
 {
 
-void writeProperties(std::vector<PropertyView> const& properties, std::string const& indent,
+namespace
+{
+
+std::string unitOf(PropertyView const& property)
+{
+    return property.row ? property.row->unit : "";
+}
+
+std::string textOf(PropertyView const& property)
+{
+    noteUnknown(property.unknown);
+    std::string const value = valueText(property);
+    if (value.empty())
+        return "-";
+    bool const hasUnit = property.unknown.empty() && !property.hidden && !unitOf(property).empty();
+    return printable(value) + (hasUnit ? " " + unitOf(property) : "");
+}
+
+} // namespace
+
+Grid propertyGrid(std::vector<PropertyView> const& properties)
+{
+    Grid grid{{Column(""), Column("")}, {}};
+    for (PropertyView const& property : properties)
+        grid.rows.push_back(
+            {fmt::format("{:>3} {}", property.id, nameOf(property)), textOf(property)});
+    return grid;
+}
+
+Table propertyTable(std::vector<PropertyView> const& properties)
+{
+    Table table({{"id"}, {"name"}, {"kind"}, {"flag"}, {"value"}, {"unit"}});
+    for (PropertyView const& property : properties) {
+        bool const flag = property.value.getFlag();
+        table.add({Cell(property.id, std::to_string(property.id)), nameOf(property),
+                   valueKindName(property.value.getKind()), Cell(flag, flag ? "true" : "false"),
+                   cellOf(property), unitOf(property)});
+    }
+    return table;
+}
+
+void writeProperties(std::vector<PropertyView> const& properties, std::string const& lead,
                      Output& out)
 {
-    std::size_t width = 0;
-    for (PropertyView const& property : properties)
-        width = std::max(width, nameOf(property).size());
-    for (PropertyView const& property : properties) {
-        bool const hasUnit = property.row && *property.row->unit && property.unknown.empty();
-        std::string line = fmt::format("{}{:>3} {:<{}}  {}{}{}", indent, property.id,
-                                       nameOf(property), width, printable(valueText(property)),
-                                       hasUnit ? " " : "", hasUnit ? property.row->unit : "");
-        line.erase(line.find_last_not_of(' ') + 1);
-        out.line(line);
-    }
+    Room const room = out.room().indented(displayWidth(lead));
+    for (std::string const& line : layOut(propertyGrid(properties), room))
+        out.line(lead + line);
 }
 
 } // namespace mihost

@@ -4,13 +4,17 @@
 #include "mihost/cli/output/NodeView.h"
 #include "mihost/cli/output/Output.h"
 
-#include <string>
-
 namespace mihost
 {
 
-/** Writes the properties in columns: id, name, value with its unit. */
-void writeProperties(std::vector<PropertyView> const& properties, std::string const& indent,
+/** The properties for people: id and name, value with its unit. */
+Grid propertyGrid(std::vector<PropertyView> const& properties);
+
+/** The properties as rows with all that is known of them. */
+Table propertyTable(std::vector<PropertyView> const& properties);
+
+/** @param lead  what each line begins with */
+void writeProperties(std::vector<PropertyView> const& properties, std::string const& lead,
                      Output& out);
 
 } // namespace mihost

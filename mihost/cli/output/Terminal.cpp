@@ -1,11 +1,12 @@
 #include "mihost/cli/output/Terminal.h"
 
+#include "mihost/cli/output/DisplayWidth.h"
 #include "mihost/cli/system/Failure.h"
 #include "mihost/cli/system/Interrupts.h"
 #include "mihost/cli/system/Stderr.h"
 
+#include <algorithm>
 #include <cerrno>
-#include <cstdlib>
 #include <fmt/format.h>
 #include <langinfo.h>
 #include <optional>
@@ -22,12 +23,6 @@ namespace
 {
 
 constexpr unsigned int usualWidth = 80;
-
-bool isSet(char const* variable)
-{
-    char const* const value = std::getenv(variable);
-    return value && *value;
-}
 
 /** Byte by byte: what follows the line belongs to whoever reads next. */
 std::optional<std::string> readLine()
@@ -86,15 +81,19 @@ unsigned int width(int descriptor)
     return usualWidth;
 }
 
-bool takesControls(int descriptor)
+bool fits(int descriptor, std::string_view text)
 {
-    char const* const type = std::getenv("TERM");
-    return isatty(descriptor) == 1 && type && *type && std::string_view(type) != "dumb";
-}
-
-bool takesColours(int descriptor)
-{
-    return takesControls(descriptor) && !isSet("NO_COLOR");
+    winsize size{};
+    if (ioctl(descriptor, TIOCGWINSZ, &size) != 0 || size.ws_row == 0 || size.ws_col == 0)
+        return true; // nobody knows
+    std::size_t rows = 1;
+    while (!text.empty() && rows <= size.ws_row) {
+        std::size_t const end = std::min(text.find('\n'), text.size());
+        std::size_t const width = displayWidth(text.substr(0, end));
+        rows += width == 0 ? 1 : (width - 1) / size.ws_col + 1;
+        text.remove_prefix(std::min(end + 1, text.size()));
+    }
+    return rows <= size.ws_row;
 }
 
 bool hasUnicode()

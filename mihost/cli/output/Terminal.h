@@ -2,6 +2,7 @@
 #define MIHOST_CLI_OUTPUT_TERMINAL_H
 
 #include <string>
+#include <string_view>
 
 /** The terminal that a person sits at, where there is one. */
 namespace mihost::terminal
@@ -10,9 +11,8 @@ namespace mihost::terminal
 /** Columns of the terminal behind a descriptor; 0 where it is none. */
 unsigned int width(int descriptor);
 
-/** Whether the cursor may be moved and colours set there: NO_COLOR and TERM=dumb forbid colours. */
-bool takesControls(int descriptor);
-bool takesColours(int descriptor);
+/** Whether the terminal shows all of the printable text above its last line. */
+bool fits(int descriptor, std::string_view text);
 
 /** Whether the user's code set has the signs that lines and cuts are drawn with. */
 bool hasUnicode();

@@ -116,8 +116,7 @@ bool mayRun(char const* line)
     if (!reason)
         return true;
     std::string_view const text = line;
-    writeStderr(fmt::format("mihost: a command was not run: {}: {}\n",
-                            printable(text.substr(0, text.find(' '))), *reason));
+    warn(fmt::format("a command was not run: {}: {}", text.substr(0, text.find(' ')), *reason));
     return false;
 }
 

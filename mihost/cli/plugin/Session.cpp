@@ -1,9 +1,12 @@
 #include "mihost/cli/plugin/Session.h"
 
+#include "mihost/cli/output/Document.h"
 #include "mihost/cli/output/Terminal.h"
+#include "mihost/cli/output/UnknownValues.h"
 #include "mihost/cli/plugin/CommandGuard.h"
 #include "mihost/cli/plugin/CommandTap.h"
 #include "mihost/cli/plugin/Progress.h"
+#include "mihost/cli/system/CommandLocale.h"
 #include "mihost/cli/system/Privilege.h"
 #include "mihost/cli/system/Stderr.h"
 #include "mihost/runtime/Text.h"
@@ -37,9 +40,9 @@ void goIntoSandbox(std::string const& overlay)
 
 } // namespace
 
-Session::Session(Options options)
-    : options_(std::move(options)), out_(stdout), pluginFile_(pluginFile(options_.plugin))
+Session::Session(Options const& options) : out_(stdout), pluginFile_(pluginFile(options.plugin))
 {
+    setOptions(options);
     if (!options_.trace.empty()) {
         trace_ = std::make_unique<Trace>(options_.trace);
         traceSink_ = std::make_unique<RedactingSink>(trace_->sink());
@@ -66,12 +69,12 @@ std::string Session::timingReport() const
     std::vector<Accelerator::Row> answers;
     if (accelerator_)
         answers = accelerator_->rows();
-    if (!options_.json)
+    if (!isDocument(options_.format))
         return timingText(timing_.rows()) + answersText(answers);
     Json report = toJson(timing_.rows());
     if (accelerator_)
         report["answers"] = toJson(answers);
-    return report.dump() + "\n";
+    return documentText(report, options_.format);
 }
 
 Plugin& Session::plugin()
@@ -80,7 +83,7 @@ Plugin& Session::plugin()
         umask(077); // for what the plug-in and its commands write
         directory_ = std::make_unique<PrivateDirectory>();
         // The plug-in scans what commands print in English. It reads LANG itself, which stays.
-        setenv("LC_ALL", "C", 1);
+        useCommandLocale();
         commandTap::setGuard(mayRun);
         timing_.begin("load");
         if (!options_.noAccel)
@@ -97,7 +100,7 @@ void Session::start()
     std::vector<PhaseListener*> listeners;
     if (options_.timing)
         listeners.push_back(&timing_);
-    if (terminal::takesControls(STDERR_FILENO)) {
+    if (!options_.quiet && takesControls(STDERR_FILENO)) {
         progress.emplace();
         listeners.push_back(&*progress);
         sinks_.add(*progress);
@@ -152,7 +155,7 @@ void Session::confirm(std::string const& what) const
 void Session::warnOfUnknown()
 {
     if (std::string const warning = takeUnknownWarning(); !warning.empty())
-        writeStderr(fmt::format("mihost: {}\n", printable(warning)));
+        warn(warning);
 }
 
 } // namespace mihost

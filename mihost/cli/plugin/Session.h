@@ -13,6 +13,7 @@
 #include "mihost/cli/plugin/Trace.h"
 #include "mihost/cli/system/Failure.h"
 #include "mihost/cli/system/PrivateDirectory.h"
+#include "mihost/cli/system/Stderr.h"
 
 #include <memory>
 
@@ -28,7 +29,7 @@ public:
      *
      * @throws Failure where one of them cannot be had
      */
-    explicit Session(Options options);
+    explicit Session(Options const& options);
     Session(Session const&) = delete;
     Session& operator=(Session const&) = delete;
 
@@ -44,6 +45,8 @@ public:
     void setOptions(Options const& options)
     {
         options_ = options;
+        out_.setOptions(options);
+        setMessageStyle(options.colours, options.quiet);
     }
 
     /** What the program exits with although nothing failed; the first one that was set. */

@@ -251,6 +251,24 @@ Candidates columns(Typed const& typed, std::string const& word, NodeNames const&
     return all;
 }
 
+/** The column of --where, as far as its sign; the value is anything. */
+Candidates conditions(Typed const& typed, std::string const& word, NodeNames const&)
+{
+    Candidates all = columns(typed, "", {});
+    for (Candidate& candidate : all)
+        candidate.word += '=';
+    return word.find_first_of("=~") == std::string::npos ? all : Candidates();
+}
+
+/** A column of --sort, with the sign for descending if that is typed. */
+Candidates sortColumns(Typed const& typed, std::string const& word, NodeNames const&)
+{
+    Candidates all = columns(typed, "", {});
+    for (Candidate& candidate : all)
+        candidate.word.insert(0, word, 0, beginsWith(word, "-") ? 1 : 0);
+    return all;
+}
+
 struct Place {
     char const* name; // of the argument or option in the help text
     Candidates (*candidates)(Typed const& typed, std::string const& word,
@@ -264,6 +282,8 @@ constexpr Place places[] = {
     {"METHOD", methodNames},
     {"PARAMETER", parameters},
     {"--columns", columns},
+    {"--where", conditions},
+    {"--sort", sortColumns},
     {"COMMAND", commandsOfHelp},
     {"USER", users},
     {"GROUP", groups},

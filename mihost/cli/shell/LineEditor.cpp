@@ -1,8 +1,8 @@
 #include "mihost/cli/shell/LineEditor.h"
 
 #include "mihost/cli/input/ShellWords.h"
+#include "mihost/cli/output/DisplayWidth.h"
 #include "mihost/cli/output/Terminal.h"
-#include "mihost/cli/output/TextTable.h"
 #include "mihost/cli/shell/HistoryFile.h"
 #include "mihost/cli/system/Failure.h"
 #include "mihost/cli/system/Interrupts.h"

@@ -1,13 +1,24 @@
 #ifndef MIHOST_CLI_SYSTEM_STDERR_H
 #define MIHOST_CLI_SYSTEM_STDERR_H
 
+#include "mihost/cli/system/Colours.h"
+
 #include <string>
 
 namespace mihost
 {
 
-/** Writes to standard error. Where nobody reads it any more, there is nobody to tell so either. */
+/** Writes to standard error. If nobody reads it any more, there is nobody to tell so either. */
 void writeStderr(std::string const& text);
+
+/** How messages are shown from now on, for the whole program. @param isQuiet  drops warnings */
+void setMessageStyle(Colours colours, bool isQuiet);
+
+/** Writes a warning on one line, after the program's name. */
+void warn(std::string const& text);
+
+/** Writes what went wrong on one line, after the program's name. */
+void writeError(std::string const& text);
 
 } // namespace mihost
 

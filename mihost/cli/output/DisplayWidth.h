@@ -1,0 +1,36 @@
+#ifndef MIHOST_CLI_OUTPUT_DISPLAYWIDTH_H
+#define MIHOST_CLI_OUTPUT_DISPLAYWIDTH_H
+
+#include <locale.h>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace mihost
+{
+
+/** While it lives, this thread's characters are those of UTF-8, whatever the user's code set. */
+class UnicodeCharacters
+{
+public:
+    UnicodeCharacters();
+    ~UnicodeCharacters();
+    UnicodeCharacters(UnicodeCharacters const&) = delete;
+    UnicodeCharacters& operator=(UnicodeCharacters const&) = delete;
+
+private:
+    locale_t before_;
+};
+
+/** Columns that a text takes on a terminal. The text is printable UTF-8. */
+std::size_t displayWidth(std::string_view text);
+
+/**
+ * The text in lines of that width, broken at blanks where there are some, and never between a
+ * letter and its accent.
+ */
+std::vector<std::string> wrapped(std::string_view text, std::size_t width);
+
+} // namespace mihost
+
+#endif

@@ -1,0 +1,60 @@
+#ifndef MIHOST_CLI_OUTPUT_LAYOUT_H
+#define MIHOST_CLI_OUTPUT_LAYOUT_H
+
+#include "mihost/cli/output/Table.h"
+
+#include <limits>
+#include <string>
+#include <vector>
+
+/** Tables and trees as lines for people. */
+namespace mihost
+{
+
+/** What lines may take, and how they are drawn. */
+struct Room {
+    static constexpr std::size_t unlimited = std::numeric_limits<std::size_t>::max();
+
+    std::size_t columns = unlimited;
+    bool hasUnicode = true; // for a tree's branches
+
+    /** What is left below an indentation. */
+    Room indented(std::size_t by) const
+    {
+        return {columns == unlimited ? unlimited : columns - (columns < by ? columns : by),
+                hasUnicode};
+    }
+};
+
+/** Texts in columns, printable and perhaps styled. */
+struct Grid {
+    std::vector<Column> columns;
+    std::vector<std::vector<std::string>> rows;
+    bool hasHeadings = false;
+};
+
+/** The lines of a grid, without line ends. Only its last left-aligned column is ever wrapped. */
+std::vector<std::string> layOut(Grid const& grid, Room const& room);
+
+/**
+ * A table as rows below headings. Where they do not fit the room with 20 columns for the text that
+ * wraps, each row becomes lines of heading and value, with an empty line between rows.
+ */
+std::vector<std::string> layOut(Table const& table, Room const& room, bool hasHeadings = true);
+
+/** Each row as lines of heading and value, whatever the room. */
+std::vector<std::string> layOutRecords(Table const& table, Room const& room);
+
+/** One node of a tree. */
+struct Branch {
+    std::size_t parent; // an index of the same list, smaller than its own; itself for none
+    std::string name;   // printable and perhaps styled, never wrapped unless the room is too small
+    std::string text;   // beside the name
+    Grid details;       // below the text
+};
+
+std::vector<std::string> layOut(std::vector<Branch> const& branches, Room const& room);
+
+} // namespace mihost
+
+#endif

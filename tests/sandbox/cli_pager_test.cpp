@@ -1,0 +1,189 @@
+// Long tables and trees at a terminal, shown by the user's pager.
+
+#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
+#include "tests/support/TerminalRun.h"
+
+#include <cstdlib>
+#include <gtest/gtest.h>
+
+namespace
+{
+
+using Lines = std::vector<std::string>;
+
+constexpr char ctrlC[] = "\x03";
+
+class MihostPager : public testing::Test
+{
+protected:
+    MihostPager()
+    {
+        setenv("LC_ALL", "C.UTF-8", 1);
+        setenv("TERM", "xterm", 1);
+        for (char const* name : {"PAGER", "LESS", "LESSSECURE", "SUDO_UID", "NO_COLOR"})
+            unsetenv(name);
+        setenv("MIHOST_PAGER", "cat >/tmp/paged", 1);
+        machine::lay("plain");
+        machine::fake("/usr/sbin/lsmod", "echo 'Module Size'\n");
+        machine::write("/etc/group", "root:x:0:\n");
+        writeAccounts(30);
+    }
+
+    static void writeAccounts(int count)
+    {
+        std::string accounts = "root:x:0:0::/:/bin/sh\n";
+        for (int id = 1000; id < 1000 + count; ++id)
+            accounts += "u" + std::to_string(id) + ":x:" + std::to_string(id) +
+                        ":100:Account:/home:/bin/sh\n";
+        machine::write("/etc/passwd", accounts);
+    }
+
+    static bool wasPaged()
+    {
+        return std::system("test -e /tmp/paged") == 0;
+    }
+};
+
+bool stands(std::string const& text, std::string const& part)
+{
+    return text.find(part) != std::string::npos;
+}
+
+TEST_F(MihostPager, ShowsWhatTheTerminalDoesNotHold)
+{
+    TerminalRun run({"list", "users"});
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(stands(machine::read("/tmp/paged"), "u1029"));
+    EXPECT_FALSE(stands(run.output(), "u1029"));
+}
+
+TEST_F(MihostPager, ShowsColoursOfTheTerminal)
+{
+    TerminalRun run({"tree"});
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(stands(machine::read("/tmp/paged"), "\x1b[32muser:u1029\x1b[0m"));
+}
+
+TEST_F(MihostPager, IsNotUsedWhereAllFitsOrNothingIsToBePaged)
+{
+    for (Lines const& arguments :
+         {Lines{"list", "users", "--no-pager"}, Lines{"list", "users", "-o", "csv"},
+          Lines{"--json", "tree"}, Lines{"list", "groups"}}) {
+        TerminalRun run(arguments);
+        EXPECT_EQ(run.end(), 0);
+        EXPECT_FALSE(wasPaged()) << arguments[0];
+    }
+    mihostRun({"list", "users"}); // which is no terminal
+    EXPECT_FALSE(wasPaged());
+    for (char const* none : {"cat", ""}) {
+        setenv("MIHOST_PAGER", none, 1);
+        TerminalRun run({"list", "users"});
+        EXPECT_EQ(run.end(), 0);
+        EXPECT_TRUE(stands(run.output(), "u1029")) << none;
+    }
+}
+
+TEST_F(MihostPager, CountsTheLinesThatTheTerminalWraps)
+{
+    writeAccounts(12); // lines wider than the terminal: two of its lines each
+    TerminalRun fits({"list", "users", "--full"}, 80);
+    EXPECT_EQ(fits.end(), 0);
+    EXPECT_FALSE(wasPaged());
+    TerminalRun wraps({"list", "users", "--full"}, 40);
+    EXPECT_EQ(wraps.end(), 0);
+    EXPECT_TRUE(wasPaged());
+}
+
+TEST_F(MihostPager, IsThatOfPagerUnlessThereIsOneForMihost)
+{
+    setenv("PAGER", "cat >/tmp/other", 1);
+    TerminalRun own({"list", "users"});
+    own.end();
+    EXPECT_TRUE(wasPaged());
+    unsetenv("MIHOST_PAGER");
+    TerminalRun other({"/bin/sh", "-c", "unset MIHOST_PAGER; exec \"$0\" list users", MIHOST_FILE},
+                      80, "/usr/bin/env");
+    other.end();
+    EXPECT_TRUE(stands(machine::read("/tmp/other"), "u1029"));
+}
+
+TEST_F(MihostPager, GetsTheUsersLocaleAndOptionsForLess)
+{
+    setenv("MIHOST_PAGER", "echo \"$LC_ALL $LESS ${LESSSECURE-none}\" >/tmp/seen; cat >/dev/null",
+           1);
+    TerminalRun run({"list", "users"});
+    run.end();
+    EXPECT_EQ(machine::read("/tmp/seen"), "C.UTF-8 FRX none\n");
+    setenv("LESS", "S", 1);
+    setenv("SUDO_UID", "1000", 1);
+    TerminalRun again({"list", "users"});
+    again.end();
+    EXPECT_EQ(machine::read("/tmp/seen"), "C.UTF-8 S 1\n");
+}
+
+TEST_F(MihostPager, MayEndBeforeItHasReadEverything)
+{
+    writeAccounts(5000);
+    setenv("MIHOST_PAGER", "head -n 1", 1);
+    TerminalRun run({"list", "users"});
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(stands(run.output(), "user-name"));
+    EXPECT_FALSE(stands(run.output(), "u1000"));
+}
+
+TEST_F(MihostPager, IsLessAndLeavesTheTerminalAsItWas)
+{
+    setenv("MIHOST_PAGER", "less", 1);
+    writeAccounts(300);
+    TerminalRun run({"list", "users"});
+    run.waitFor("u1010");
+    run.type("G");
+    run.waitFor("u1299");
+    run.type("q");
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(run.showsInput());
+}
+
+TEST_F(MihostPager, AloneGetsCtrlC)
+{
+    setenv("MIHOST_PAGER",
+           "trap '' INT; cat >/dev/null; echo ready; read word </dev/tty; echo got $word", 1);
+    TerminalRun run({"list", "users"});
+    run.waitFor("ready");
+    run.type(ctrlC);
+    run.waitFor("^C");
+    run.type("it\n");
+    run.waitFor("got it");
+    EXPECT_EQ(run.end(), 0);
+}
+
+TEST_F(MihostPager, LeavesTheTerminalAsItWasWhenItIsKilled)
+{
+    setenv("MIHOST_PAGER", "stty -echo -icanon </dev/tty; kill -9 $$", 1);
+    TerminalRun run({"list", "users"});
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(run.showsInput());
+}
+
+TEST_F(MihostPager, IsReportedIfItCannotBeRunAndNothingIsLost)
+{
+    setenv("MIHOST_PAGER", "no-such-pager", 1);
+    TerminalRun run({"list", "users"});
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(
+        stands(run.output(), "mihost: showing the output in 'no-such-pager': cannot run it"));
+    EXPECT_TRUE(stands(run.output(), "u1029"));
+}
+
+TEST_F(MihostPager, KeepsTheExitCodeOfTheCommand)
+{
+    setenv("MIHOST_PAGER", "cat >/dev/null; exit 5", 1);
+    TerminalRun run({"list", "users"});
+    EXPECT_EQ(run.end(), 0);
+    TerminalRun refused({"list", "users", "--sort", "none"});
+    EXPECT_EQ(refused.end(), 4);
+    EXPECT_TRUE(stands(refused.output(), "mihost: no column 'none'"));
+}
+
+} // namespace

@@ -81,6 +81,7 @@ void writeNodes(NodeKind const& kind, std::vector<IC::MutableNode*> const& nodes
                 PropertyStyle const& style, Selection const& selection, Output& out)
 {
     std::vector<NodeView> views;
+    views.reserve(nodes.size());
     for (IC::MutableNode const* node : nodes)
         views.push_back(storedView(*node, style.secrets));
     Table const table = tableOf(kind, views, style).selected(selection);

@@ -97,6 +97,7 @@ int start(std::string command, int input, pid_t& child)
     char* const arguments[] = {shell.data(), option.data(), command.data(), nullptr};
     std::vector<std::string> variables = pagerEnvironment();
     std::vector<char*> environment;
+    environment.reserve(variables.size() + 1);
     for (std::string& variable : variables)
         environment.push_back(variable.data());
     environment.push_back(nullptr);

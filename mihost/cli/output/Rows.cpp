@@ -29,6 +29,7 @@ std::string csvField(std::string const& text, bool isOnlyOne)
 std::string csvLine(std::vector<std::string> const& texts)
 {
     std::vector<std::string> fields;
+    fields.reserve(texts.size());
     for (std::string const& text : texts)
         fields.push_back(csvField(text, texts.size() == 1));
     return fmt::format("{}\n", fmt::join(fields, ","));

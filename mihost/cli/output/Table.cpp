@@ -122,6 +122,7 @@ Table Table::selected(Selection const& selection) const
 
     std::vector<std::string> const& names = selection.columns.empty() ? usual_ : selection.columns;
     std::vector<std::size_t> shown;
+    shown.reserve(names.size());
     for (std::string const& name : names)
         shown.push_back(columnOf(name));
     if (shown.empty())

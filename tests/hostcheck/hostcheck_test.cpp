@@ -9,6 +9,7 @@
 #include <cstdlib>
 #include <gtest/gtest.h>
 #include <iterator>
+#include <regex>
 
 namespace
 {
@@ -87,7 +88,8 @@ TEST(HostCheck, PublishesItsFindingsAsNodes)
 {
     Outcome const tree = mihostChecked({"tree"});
     EXPECT_EQ(tree.code, 0) << tree.err;
-    EXPECT_TRUE(startsWith(tree.out, "2 #2  passed: host check\n")) << tree.out;
+    std::string const first = tree.out.substr(0, tree.out.find('\n'));
+    EXPECT_TRUE(std::regex_match(first, std::regex("2 #2 +passed: host check"))) << first;
     EXPECT_GT(std::count(tree.out.begin(), tree.out.end(), '\n'), 100);
     std::string const node = mihostChecked({"get", "3"}).out;
     EXPECT_NE(node.find(" IC::Number: has the declared size\n"), std::string::npos) << node;

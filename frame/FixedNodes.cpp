@@ -19,7 +19,7 @@ void OsSwMI::createRootNode()
     NQ::log::Scope const scope(OSSWMI::unit);
     unsigned int const nodeId = takeNodeId();
     rootNode_ = adopt(std::make_unique<MutableNode>(nodeId, miId_, miIds_, nodeType::root, 0));
-    nodeIds_->push_back(miId_); // Contract: the interface's own id stands in the list twice
+    nodeIds_->push_back(miId_); // Contract: the interface's own id is in the list twice
     setUp("ROOT Node");
 }
 

@@ -26,7 +26,7 @@ public:
      * Sets the members: first those whose primary group it is, in the order of /etc/passwd, then
      * the given ones. The group id must have been set.
      *
-     * Contract: a given name is left out when a listed one ends in it, so bob is lost behind xbob.
+     * Contract: a given name is left out when a listed one ends in it, so bob is lost after xbob.
      *
      * @param members  login names, ended by a null pointer
      */

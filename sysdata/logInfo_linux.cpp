@@ -41,7 +41,7 @@ void readEntry(logInfo& log, unsigned int index, char (&entry)[lineSize])
 /** Whether the index is one that can be read; if not, says so. */
 bool isReadable(logInfo& log, unsigned int index, char const* label, log::Scope const& scope)
 {
-    // Contract: counted once for the message, also when there will be none, and anew to compare.
+    // Contract: counted once for the message, also when there will be none, and again to compare.
     unsigned int const countForMessage = log.getMaxLine();
     unsigned int const count = log.getMaxLine();
     if (count + 1 >= index)

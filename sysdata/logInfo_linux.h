@@ -29,7 +29,7 @@ public:
      * it cannot be read.
      *
      * @param line    counted from 1 at the top of the file
-     * @param buffer  takes length bytes, the rest behind the text filled with NUL. Contract: a text
+     * @param buffer  takes length bytes, the rest after the text filled with NUL. Contract: a text
      *                of that length or more is cut and gets no NUL
      * @param length  at least 1
      */
@@ -38,7 +38,7 @@ public:
     /**
      * The message of an entry, without its time stamp, between two asterisks.
      *
-     * Contract: 0 and the index behind the oldest entry are accepted and read as an empty message.
+     * Contract: 0 and the index after the oldest entry are accepted and read as an empty message.
      *
      * @param text  left as it was on failure
      * @return whether there is such an entry

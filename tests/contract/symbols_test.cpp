@@ -18,7 +18,7 @@ using Names = std::vector<std::string>;
 struct List {
     char const* name;
     char const* kind;
-    char const* library;
+    char const* file;
 };
 
 class Symbols : public testing::TestWithParam<List>
@@ -27,7 +27,7 @@ protected:
     static Names inTheLibrary()
     {
         Outcome const outcome =
-            runToEnd({TESTS_DIR "/../script/symbols", GetParam().kind, GetParam().library});
+            runToEnd({TESTS_DIR "/../script/symbols", GetParam().kind, GetParam().file});
         EXPECT_EQ(outcome.code, 0) << outcome.err;
         return linesOf(outcome.out);
     }

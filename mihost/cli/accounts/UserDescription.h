@@ -18,7 +18,7 @@ struct NamedGroup {
 enum class PasswordState {
     Unknown,
     Set,
-    Locked,   // a hash behind an exclamation mark, or nothing but the mark
+    Locked,   // a hash after an exclamation mark, or nothing but the mark
     Unusable, // no password matches what is stored
     None      // no password is needed
 };

@@ -1,7 +1,7 @@
 #include "frame/ComputerInfo.h"
 #include "frame/OsSwMI.h"
 #include "host/Properties.h"
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 
 namespace IC
 {

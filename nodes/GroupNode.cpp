@@ -2,7 +2,7 @@
 
 #include "frame/OsSwMI.h"
 #include "host/Properties.h"
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 #include "sysdata/groupInfo_linux.h"
 #include "util/MutexLock.h"
 

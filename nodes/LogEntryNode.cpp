@@ -2,7 +2,7 @@
 
 #include "frame/OsSwMI.h"
 #include "host/Properties.h"
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 #include "sysdata/logInfo_linux.h"
 
 #include <algorithm>

@@ -1,6 +1,6 @@
 #include "frame/OsSwMI.h"
 #include "host/Properties.h"
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 
 namespace IC
 {

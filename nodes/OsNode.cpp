@@ -2,7 +2,7 @@
 
 #include "frame/OsSwMI.h"
 #include "host/Properties.h"
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 #include "sysdata/osInfo_linux.h"
 
 #include <ctime>

@@ -5,7 +5,7 @@
 #include "host/Properties.h"
 #include "host/make_string.h"
 #include "nodes/OsNode.h"
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 #include "sysdata/logInfo_linux.h"
 #include "sysdata/osInfo_linux.h"
 

@@ -3,7 +3,7 @@
 #include "frame/OsSwMI.h"
 #include "host/Properties.h"
 #include "host/make_string.h"
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 #include "sysdata/userInfo_linux.h"
 #include "util/MutexLock.h"
 #include "util/MyProcess.h"

@@ -3,7 +3,7 @@
 #include "sysdata/driverInfo_parse.h"
 #include "util/MyProcess.h"
 #include "util/log.h"
-#include "util/text.h"
+#include "util/textTools.h"
 
 #include <cstdio>
 #include <utility>

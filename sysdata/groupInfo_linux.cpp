@@ -4,7 +4,7 @@
 #include "sysdata/minMaxId.h"
 #include "util/MutexLock.h"
 #include "util/log.h"
-#include "util/text.h"
+#include "util/textTools.h"
 
 #include <atomic>
 #include <grp.h>

@@ -4,7 +4,7 @@
 #include "util/MyProcess.h"
 #include "util/file.h"
 #include "util/log.h"
-#include "util/text.h"
+#include "util/textTools.h"
 
 #include <cstdio>
 #include <cstring>

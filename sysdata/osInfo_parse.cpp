@@ -5,7 +5,7 @@
 #include "sysdata/osInfo_linux.h"
 #include "sysdata/osInfo_log.h"
 #include "util/MyProcess.h"
-#include "util/text.h"
+#include "util/textTools.h"
 
 #include <algorithm>
 #include <cstdio>

@@ -5,7 +5,7 @@
 #include "sysdata/userInfo_parse.h"
 #include "util/MyProcess.h"
 #include "util/file.h"
-#include "util/text.h"
+#include "util/textTools.h"
 
 #include <cstdint>
 #include <cstdio>

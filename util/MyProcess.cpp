@@ -1,7 +1,7 @@
 #include "util/MyProcess.h"
 
 #include "util/log.h"
-#include "util/text.h"
+#include "util/textTools.h"
 
 #include <cstring>
 

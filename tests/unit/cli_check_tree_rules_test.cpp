@@ -2,7 +2,7 @@
 #include "mihost/cli/check/TreeRules.h"
 
 #include "host/Properties.h"
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 
 #include <gtest/gtest.h>
 #include <memory>

@@ -1,7 +1,7 @@
 #include "TestPaths.h"
 #include "nodes/GroupNode.h"
 
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 #include "sysdata/minMaxId.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"

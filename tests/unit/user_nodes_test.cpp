@@ -1,6 +1,6 @@
 #include "nodes/UserNode.h"
 
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 #include "sysdata/minMaxId.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"

@@ -2,7 +2,7 @@
 
 #include "nodes/UserNode.h"
 
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
 #include "tests/support/Recording.h"

@@ -1,7 +1,7 @@
 // The administration methods and their parameters.
 
 #include "host/Methods.h"
-#include "mihost/cli/catalogue/Rows.h"
+#include "mihost/cli/catalogue/CatalogueRows.h"
 
 namespace mihost
 {

@@ -1,7 +1,7 @@
 // The kinds of nodes and their properties.
 
 #include "host/Properties.h"
-#include "mihost/cli/catalogue/Rows.h"
+#include "mihost/cli/catalogue/CatalogueRows.h"
 
 namespace mihost
 {

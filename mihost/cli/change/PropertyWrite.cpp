@@ -16,14 +16,45 @@ namespace
 
 /** What a write of one property asks for. */
 struct Act {
+    using Expect = std::vector<Expectation>(Session& session, IC::MutableNode const& node,
+                                            IC::PropertyValue const& value);
+
     unsigned int nodeType;
     unsigned int property;
-    std::optional<unsigned int> value; // the only one that acts; nothing if every one does
-    bool onMachine;                    // not only on the tree
-    char const* tool;                  // as in Write
-    std::vector<Expectation> (*expectations)(Session& session, IC::MutableNode const& node,
-                                             IC::PropertyValue const& value);
-    char const* warning; // "" for none; {} is the account's name
+    std::optional<unsigned int> value{}; // the only one that acts; nothing if every one does
+    bool onMachine = true;               // not only on the tree
+    char const* tool = "";               // as in Write
+    Expect* expectations = nullptr;      // none for what cannot be checked
+    char const* warning = "";            // "" for none; {} is the account's name
+
+    Act of(unsigned int only) const
+    {
+        return with(&Act::value, only);
+    }
+    Act onTree() const
+    {
+        return with(&Act::onMachine, false);
+    }
+    Act by(char const* command) const
+    {
+        return with(&Act::tool, command);
+    }
+    Act expects(Expect* what) const
+    {
+        return with(&Act::expectations, what);
+    }
+    Act warns(char const* text) const
+    {
+        return with(&Act::warning, text);
+    }
+
+private:
+    template <class Field, class Value> Act with(Field Act::*field, Value set) const
+    {
+        Act act = *this;
+        act.*field = set;
+        return act;
+    }
 };
 
 std::string userOf(IC::MutableNode const& node)
@@ -52,11 +83,6 @@ Expectation completeList(Session& session, NodeKind const& kind)
                         return fmt::format("without '{}'", name);
                 return "complete";
             }};
-}
-
-std::vector<Expectation> noExpectations(Session&, IC::MutableNode const&, IC::PropertyValue const&)
-{
-    return {};
 }
 
 std::vector<Expectation> completeLists(Session& session, IC::MutableNode const&,
@@ -102,17 +128,32 @@ constexpr char expirationWarning[] =
     "password-expiration reads the account's expiry date, but writing it sets the password's "
     "maximum age (for the date, use 'mihost user expire {} YYYY-MM-DD')";
 
-// clang-format off
-constexpr Act acts[] = {
-    {IC::nodeType::operatingSystem, IC::property::requestedState, IC::command::restart, true, shutdownTool, noExpectations, ""},
-    {IC::nodeType::operatingSystem, IC::property::requestedState, IC::command::halt, true, shutdownTool, noExpectations, ""},
-    {IC::nodeType::operatingSystem, IC::property::refresh, IC::command::rebuild, false, "", completeLists, ""},
-    {IC::nodeType::operatingSystem, IC::property::clearLog, IC::command::emptyLog, true, "", emptyLog, ""},
-    {IC::nodeType::user, IC::property::password, std::nullopt, true, "", hash, ""},
-    {IC::nodeType::user, IC::property::inactiveTime, std::nullopt, true, "", inactivity, inactivityWarning},
-    {IC::nodeType::user, IC::property::passwordExpiration, std::nullopt, true, "", expiry, expirationWarning},
-    {IC::nodeType::user, IC::property::deleteUser, IC::command::deleteAccount, true, "", deletion, ""},
-};
+Act onOs(unsigned int property, unsigned int value)
+{
+    return Act{IC::nodeType::operatingSystem, property}.of(value);
+}
+
+Act onUser(unsigned int property)
+{
+    return Act{IC::nodeType::user, property};
+}
+
+std::vector<Act> const& acts()
+{
+    namespace command = IC::command;
+    namespace property = IC::property;
+    static std::vector<Act> const all{
+        onOs(property::requestedState, command::restart).by(shutdownTool),
+        onOs(property::requestedState, command::halt).by(shutdownTool),
+        onOs(property::refresh, command::rebuild).onTree().expects(completeLists),
+        onOs(property::clearLog, command::emptyLog).expects(emptyLog),
+        onUser(property::password).expects(hash),
+        onUser(property::inactiveTime).expects(inactivity).warns(inactivityWarning),
+        onUser(property::passwordExpiration).expects(expiry).warns(expirationWarning),
+        onUser(property::deleteUser).of(command::deleteAccount).expects(deletion),
+    };
+    return all;
+}
 
 /** What to use in place of a write that stays in the tree. */
 struct Instead {
@@ -137,12 +178,11 @@ constexpr Instead instead[] = {
     {IC::nodeType::group, IC::property::id, "groupmod -g"},
     {IC::nodeType::group, IC::property::members, "mihost group add-member"},
 };
-// clang-format on
 
 Act const* findAct(IC::MutableNode const& node, unsigned int property,
                    IC::PropertyValue const& value)
 {
-    for (Act const& act : acts)
+    for (Act const& act : acts())
         if (act.nodeType == node.getNodeType() && act.property == property &&
             (!act.value || *act.value == static_cast<unsigned int>(value)))
             return &act;
@@ -188,7 +228,8 @@ Write propertyWrite(Session& session, IC::MutableNode& node, Property const& pro
         write.warnings.push_back(memoryWarning(node, property));
         return write;
     }
-    write.expectations = act->expectations(session, node, value);
+    if (act->expectations)
+        write.expectations = act->expectations(session, node, value);
     if (*act->warning)
         write.warnings.push_back(fmt::format(act->warning, userOf(node)));
     return write;

@@ -1,7 +1,7 @@
 #ifndef MIHOST_CLI_CHECK_ISOLATED_H
 #define MIHOST_CLI_CHECK_ISOLATED_H
 
-#include "mihost/cli/check/Check.h"
+#include "mihost/cli/check/Verdict.h"
 
 #include <chrono>
 #include <string>

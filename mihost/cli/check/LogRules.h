@@ -1,8 +1,8 @@
 #ifndef MIHOST_CLI_CHECK_LOGRULES_H
 #define MIHOST_CLI_CHECK_LOGRULES_H
 
-#include "mihost/cli/check/Check.h"
 #include "mihost/cli/check/LogRecord.h"
+#include "mihost/cli/check/Verdict.h"
 
 /** What holds for every message that a plug-in logs. */
 namespace mihost::checks

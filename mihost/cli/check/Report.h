@@ -1,7 +1,7 @@
 #ifndef MIHOST_CLI_CHECK_REPORT_H
 #define MIHOST_CLI_CHECK_REPORT_H
 
-#include "mihost/cli/check/Check.h"
+#include "mihost/cli/check/Verdict.h"
 #include "mihost/cli/output/Output.h"
 
 /** The results of all checks in the forms that people and programs read. */

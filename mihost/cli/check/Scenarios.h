@@ -1,7 +1,7 @@
 #ifndef MIHOST_CLI_CHECK_SCENARIOS_H
 #define MIHOST_CLI_CHECK_SCENARIOS_H
 
-#include "mihost/cli/check/Check.h"
+#include "mihost/cli/check/Verdict.h"
 
 /** Each scenario is defined in the file of its name. */
 namespace mihost::checks

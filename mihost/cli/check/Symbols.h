@@ -1,7 +1,7 @@
 #ifndef MIHOST_CLI_CHECK_SYMBOLS_H
 #define MIHOST_CLI_CHECK_SYMBOLS_H
 
-#include "mihost/cli/check/Check.h"
+#include "mihost/cli/check/Verdict.h"
 
 #include <string>
 #include <vector>

@@ -2,7 +2,7 @@
 #define MIHOST_CLI_CHECK_TREERULES_H
 
 #include "host/MutableNode.h"
-#include "mihost/cli/check/Check.h"
+#include "mihost/cli/check/Verdict.h"
 
 #include <vector>
 

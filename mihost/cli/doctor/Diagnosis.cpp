@@ -52,7 +52,6 @@ struct CommandNeed {
     char const* redHat; // package
 };
 
-// clang-format off
 constexpr CommandNeed commandNeeds[] = {
     {"/bin/sh", "everything that is learnt or changed by a command", "dash", "bash"},
     {"lsmod", "all drivers", "kmod", "kmod"},
@@ -71,15 +70,16 @@ constexpr CommandNeed commandNeeds[] = {
     {"userdel", "writing delete of users", "passwd", "shadow-utils"},
     {"/usr/sbin/useradd", "the method UserAdd", "passwd", "shadow-utils"},
     {"/usr/sbin/userdel", "the method UserDel", "passwd", "shadow-utils"},
-    {"/usr/sbin/usermod", "the methods that change users and memberships", "passwd", "shadow-utils"},
+    {"/usr/sbin/usermod", "the methods that change users and memberships", "passwd",
+     "shadow-utils"},
     {"/usr/sbin/groupadd", "the method LocalGroupAdd", "passwd", "shadow-utils"},
     {"/usr/sbin/groupdel", "the method LocalGroupDel", "passwd", "shadow-utils"},
     {"/usr/bin/chage", "the methods UserAdd and UserSetAttrib", "passwd", "shadow-utils"},
     {"/usr/bin/passwd", "passwords in methods", "passwd", "passwd"},
-    {"/usr/bin/id", "the methods LocalGroupAddUser and LocalGroupDelUser", "coreutils", "coreutils"},
+    {"/usr/bin/id", "the methods LocalGroupAddUser and LocalGroupDelUser", "coreutils",
+     "coreutils"},
     {"/sbin/shutdown", "restart and halt", "systemd-sysv", "systemd"},
 };
-// clang-format on
 
 /** The first of the folders that the command stands in; empty for none. */
 std::string folderOf(std::string const& command, std::string const& path)

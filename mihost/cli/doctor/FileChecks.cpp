@@ -2,7 +2,7 @@
 
 #include "mihost/cli/accounts/LoginDefs.h"
 #include "mihost/cli/system/TextFile.h"
-#include "mihost/sandbox/Stream.h"
+#include "mihost/sandbox/OwnedStream.h"
 
 #include <algorithm>
 #include <array>

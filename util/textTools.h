@@ -1,5 +1,5 @@
-#ifndef UTIL_TEXT_H
-#define UTIL_TEXT_H
+#ifndef UTIL_TEXTTOOLS_H
+#define UTIL_TEXTTOOLS_H
 
 #include "util/internal.h"
 

@@ -1,5 +1,5 @@
-#ifndef MIHOST_SANDBOX_STREAM_H
-#define MIHOST_SANDBOX_STREAM_H
+#ifndef MIHOST_SANDBOX_OWNEDSTREAM_H
+#define MIHOST_SANDBOX_OWNEDSTREAM_H
 
 #include <cstdio>
 #include <memory>

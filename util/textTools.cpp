@@ -1,4 +1,4 @@
-#include "util/text.h"
+#include "util/textTools.h"
 
 #include <cstdarg>
 #include <cstdio>

@@ -1,5 +1,5 @@
-#ifndef NODES_VALUES_H
-#define NODES_VALUES_H
+#ifndef NODES_NODEVALUES_H
+#define NODES_NODEVALUES_H
 
 #include "host/Error.h"
 #include "host/MutableNode.h"

@@ -1,5 +1,5 @@
-#ifndef MIHOST_CLI_CHECK_CHECK_H
-#define MIHOST_CLI_CHECK_CHECK_H
+#ifndef MIHOST_CLI_CHECK_VERDICT_H
+#define MIHOST_CLI_CHECK_VERDICT_H
 
 #include <optional>
 #include <string>

@@ -1,5 +1,5 @@
-#ifndef MIHOST_CLI_CATALOGUE_ROWS_H
-#define MIHOST_CLI_CATALOGUE_ROWS_H
+#ifndef MIHOST_CLI_CATALOGUE_CATALOGUEROWS_H
+#define MIHOST_CLI_CATALOGUE_CATALOGUEROWS_H
 
 #include "host/Methods.h"
 #include "mihost/cli/catalogue/Catalogue.h"

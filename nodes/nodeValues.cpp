@@ -1,4 +1,4 @@
-#include "nodes/values.h"
+#include "nodes/nodeValues.h"
 
 namespace IC::values
 {

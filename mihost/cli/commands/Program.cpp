@@ -53,6 +53,7 @@ void runRemotely(std::string const& host, std::vector<std::string> const& words)
     auto const rest = withoutHost(words, host);
     auto command = remoteCommand(host, rest, remoteTerminal());
     std::vector<char*> arguments;
+    arguments.reserve(command.size() + 1);
     for (std::string& word : command)
         arguments.push_back(word.data());
     arguments.push_back(nullptr);

@@ -276,17 +276,10 @@ struct Place {
 };
 
 constexpr Place places[] = {
-    {"NODE", nodes},
-    {"PROPERTY", properties},
-    {"VALUE", values},
-    {"METHOD", methodNames},
-    {"PARAMETER", parameters},
-    {"--columns", columns},
-    {"--where", conditions},
-    {"--sort", sortColumns},
-    {"COMMAND", commandsOfHelp},
-    {"USER", users},
-    {"GROUP", groups},
+    {"NODE", nodes},         {"PROPERTY", properties},  {"VALUE", values},
+    {"METHOD", methodNames}, {"PARAMETER", parameters}, {"--columns", columns},
+    {"--where", conditions}, {"--sort", sortColumns},   {"COMMAND", commandsOfHelp},
+    {"USER", users},         {"GROUP", groups},
 };
 
 /** The words of an option that takes one of a few. */

@@ -63,7 +63,7 @@ TEST(Scrape, EndsALateProgramAndItsCommands)
     ASSERT_EQ(mkfifo(path.c_str(), 0600), 0);
     std::string written;
     // On a busy machine the program may end before it has begun.
-    for (auto limit = 500ms; written.empty() && limit < longEnough; limit *= 4) {
+    for (std::chrono::milliseconds limit(500); written.empty() && limit < longEnough; limit *= 4) {
         mihost::Descriptor const pipe(open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC));
         EXPECT_EQ(shell("exec 9>" + path + "; sleep 600 & echo begun >&9; echo early; wait", limit),
                   std::nullopt);

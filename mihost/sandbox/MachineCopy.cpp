@@ -195,7 +195,7 @@ Descriptor keepMountsPrivate()
 std::vector<std::string> readMounts()
 {
     mountAt(stage, "proc", MS_NOSUID | MS_NODEV | MS_NOEXEC, "");
-    std::vector<std::string> const mounts = mountsToCopy(stage + "/self/mountinfo");
+    std::vector<std::string> mounts = mountsToCopy(stage + "/self/mountinfo");
     check(umount2(stage.c_str(), MNT_DETACH), "cannot leave " + stage);
     return mounts;
 }

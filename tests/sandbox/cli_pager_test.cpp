@@ -74,7 +74,7 @@ TEST_F(MihostPager, IsNotUsedWhereAllFitsOrNothingIsToBePaged)
         EXPECT_EQ(run.end(), 0);
         EXPECT_FALSE(wasPaged()) << arguments[0];
     }
-    mihostRun({"list", "users"}); // which is no terminal
+    mihostRun({"list", "users"}); // standard output is not a terminal
     EXPECT_FALSE(wasPaged());
     for (char const* none : {"cat", ""}) {
         setenv("MIHOST_PAGER", none, 1);

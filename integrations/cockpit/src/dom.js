@@ -1,0 +1,36 @@
+// Elements made from plain values. Texts only ever become text nodes, so nothing from the machine is markup.
+import { visible } from "./visible.js";
+
+function fill(element, properties, children) {
+    for (const [name, value] of Object.entries(properties)) {
+        if (name === "on")
+            for (const [event, listener] of Object.entries(value))
+                element.addEventListener(event, listener);
+        else if (value === true)
+            element.setAttribute(name, "");
+        else if (value !== false && value !== null && value !== undefined)
+            element.setAttribute(name, value);
+    }
+    append(element, ...children);
+    return element;
+}
+
+/** Texts, numbers and elements; lists of them are flattened, and nothing is left out but null and false. */
+export function append(element, ...children) {
+    for (const child of children.flat(Infinity))
+        if (child !== null && child !== undefined && child !== false)
+            element.append(child instanceof Node ? child : visible(String(child)));
+}
+
+export function el(tag, properties = {}, ...children) {
+    return fill(document.createElement(tag), properties, children);
+}
+
+export function svg(tag, properties = {}, ...children) {
+    return fill(document.createElementNS("http://www.w3.org/2000/svg", tag), properties, children);
+}
+
+export function replace(element, ...children) {
+    element.replaceChildren();
+    append(element, ...children);
+}

@@ -1,0 +1,9 @@
+/** Cuts a stream of text into lines: the function takes pieces as they come and calls back with whole lines. */
+export function lineSplitter(onLine) {
+    let rest = "";
+    return piece => {
+        const lines = (rest + piece).split("\n");
+        rest = lines.pop();
+        lines.filter(line => line !== "").forEach(onLine);
+    };
+}

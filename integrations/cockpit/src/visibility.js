@@ -1,0 +1,20 @@
+// Whether anybody can see the page: not while another page of Cockpit or another tab is shown.
+import { cockpit } from "./cockpit.js";
+
+const listeners = [];
+
+export function isVisible() {
+    return !cockpit.hidden && document.visibilityState === "visible";
+}
+
+/** Calls back whenever the page comes into sight or leaves it. */
+export function onVisibility(listener) {
+    listeners.push(listener);
+}
+
+function changed() {
+    listeners.forEach(listener => listener(isVisible()));
+}
+
+cockpit.addEventListener("visibilitychange", changed);
+document.addEventListener("visibilitychange", changed);

@@ -1,0 +1,45 @@
+"""The page as those find it who log in to Cockpit: real accounts and passwords, the menu, the frame."""
+
+import shutil
+import subprocess
+
+from support import cockpit, environment
+
+PASSWORD = 'correct horse'
+
+
+class Login(cockpit.PageTest):
+    ACCOUNT = None
+
+    @classmethod
+    def prepare(cls):
+        cockpit.lay_machine()
+        cockpit.write('/etc/shadow', 'root:*:19000::::::\nanna:*:19000::::::\n', 0o600)  # for good
+        shutil.copy(environment.daemon('/etc/pam.d/cockpit'), '/etc/pam.d/cockpit')
+        subprocess.run(['chpasswd'], input=f'root:{PASSWORD}\nanna:{PASSWORD}\n', text=True, check=True)
+
+    def log_in(self, name):
+        self.browser.leave()
+        self.browser.driver.get(cockpit.ADDRESS)
+        self.browser.type('#login-user-input', name)
+        self.browser.type('#login-password-input', PASSWORD)
+        self.browser.click('#login-button')
+        self.browser.button('Management tree')
+        self.browser.enter('iframe[name="cockpit1:localhost/mihost"]')
+
+    def test_root_finds_the_page_in_the_menu(self):
+        self.log_in('root')
+        self.browser.see('#tree', 'anna')
+
+    def test_who_may_read_little_is_told_so(self):
+        self.log_in('anna')
+        self.browser.see('#tree', 'anna')
+        self.browser.see('#state', 'Limited access')
+
+
+def setUpModule():
+    cockpit.install_cockpit()
+
+
+if __name__ == '__main__':
+    cockpit.main()

@@ -1,0 +1,392 @@
+"""The page in the real Cockpit and a headless Chromium.
+
+For tests that run in a copy of this machine: an invented machine is laid over it, Cockpit becomes part
+of it, and its network is a loopback interface of its own.
+"""
+
+import atexit
+import functools
+import io
+import os
+import pwd
+import shutil
+import signal
+import socket
+import subprocess
+import tarfile
+import tempfile
+import time
+import unittest
+
+from support import environment
+
+try:
+    from selenium import webdriver
+    from selenium.common.exceptions import StaleElementReferenceException
+    from selenium.webdriver.chrome.service import Service
+    from selenium.webdriver.common.by import By
+    from selenium.webdriver.common.keys import Keys
+except ImportError:
+    webdriver = Keys = None
+
+PAGE = os.environ.get('MI_PAGE', '')
+PICTURES = os.environ.get('MI_PICTURES', '')
+AXE = os.path.join(os.path.dirname(PAGE), 'node_modules', 'axe-core', 'axe.min.js')
+MACHINE = os.path.join(environment.SOURCE, 'tests', 'machines', 'users-and-groups')
+SELENIUM = '/usr/lib/python3/dist-packages/selenium'
+WS = '/usr/lib/cockpit/cockpit-ws'
+NEEDED = ('chromium', 'chromedriver', 'cockpit-bridge', SELENIUM, environment.daemon(WS))
+
+PORT = 9090
+ADDRESS = f'http://127.0.0.1:{PORT}'
+MIHOST = '/usr/local/bin/mihost'
+CALLS = '/run/mihost-calls'
+PROCESSES = '/run/mihost-processes'
+
+# What Cockpit starts instead of the program itself, so that each call and what every process of the
+# machine was called with at that time is known afterwards.
+RECORDER = f'''#!/bin/sh
+echo "$$ $*" >>{CALLS}
+cat /proc/[0-9]*/cmdline 2>/dev/null | tr '\\0' ' ' >>{PROCESSES}
+exec {environment.MIHOST} "$@"
+'''
+
+CHROMIUM = (
+    '--headless', '--no-sandbox', '--disable-gpu', '--disable-quic', '--no-first-run',
+    '--disable-background-networking', '--disable-component-update', '--disable-sync',
+    '--disable-dev-shm-usage', '--hide-scrollbars', '--force-color-profile=srgb', '--lang=en',
+)
+
+# Notes what the page's content security policy refuses.
+WATCH_POLICY = '''
+window.refused = [];
+document.addEventListener('securitypolicyviolation', event => {
+    window.refused.push(event.violatedDirective + ' ' + event.blockedURI + ' ' + event.sample);
+});
+'''
+
+
+def write(path, text, mode=0o644):
+    with open(path, 'w') as file:
+        file.write(text)
+    os.chmod(path, mode)
+
+
+def read(path):
+    with open(path) as file:
+        return file.read()
+
+
+def install_mihost(script=RECORDER):
+    """Puts a program where the page finds mihost."""
+    write(MIHOST, script, 0o755)
+
+
+def install_cockpit():
+    """Makes Cockpit and the page part of this copy of the machine."""
+    for path in ('/usr/lib/cockpit', '/usr/share/cockpit/shell', '/usr/share/cockpit/static'):
+        unpacked = environment.daemon(path)
+        if unpacked != path:
+            shutil.copytree(unpacked, path, dirs_exist_ok=True)
+    shutil.copytree(PAGE, '/usr/share/cockpit/mihost')
+    forget_calls()
+    install_mihost()
+
+
+def lay_machine():
+    """The invented machine, with modules and a log."""
+    shutil.copytree(MACHINE, '/', dirs_exist_ok=True)
+    os.chmod('/etc/shadow', 0o600)
+    for name, script in (
+        ('lsmod', 'echo Module Size Used by; echo one 1 0; echo two 1 0'),
+        ('modinfo', 'echo "version:        1.$1"'),
+    ):
+        path = f'/usr/sbin/{name}'
+        if os.path.lexists(path):
+            os.unlink(path)
+        write(path, f'#!/bin/sh\n{script}\n', 0o755)
+    write('/var/log/messages', log_lines(['one', 'two', 'three']))
+
+
+def log_lines(messages):
+    stamp = time.strftime('%b %e %H:%M:%S')
+    return ''.join(f'{stamp} mole test: {message}\n' for message in messages)
+
+
+def accounts_file(name):
+    """The lines of an account file, by the name that they begin with."""
+    return {line.split(':')[0]: line for line in read(f'/etc/{name}').splitlines()}
+
+
+def forget_calls():
+    for file in (CALLS, PROCESSES):
+        write(file, '', 0o666)
+
+
+def calls():
+    """The arguments that mihost was called with since the page was opened."""
+    return [line.partition(' ')[2] for line in read(CALLS).splitlines()]
+
+
+def kill_mihost(arguments):
+    """Kills the mihost that was called last with such arguments."""
+    called = [line.split()[0] for line in read(CALLS).splitlines() if arguments in line]
+    os.kill(int(called[-1]), signal.SIGKILL)
+
+
+def until(condition, what, seconds=30):
+    """Waits until the condition is true. Only what never comes ends by the clock."""
+    deadline = time.monotonic() + seconds
+    while True:
+        result = condition()
+        if result:
+            return result
+        if time.monotonic() > deadline:
+            raise TimeoutError(what() if callable(what) else what)
+        time.sleep(0.05)
+
+
+def listening():
+    with socket.socket() as connection:
+        return connection.connect_ex(('127.0.0.1', PORT)) == 0
+
+
+def session_of(account):
+    """The command of a session of an account, which nobody has to log in for."""
+    if account == 'root':
+        return '/usr/bin/cockpit-bridge'
+    identity = pwd.getpwnam(account)
+    write('/run/session', f"""#!/bin/sh
+HOME=/tmp USER={account} LOGNAME={account}
+export HOME USER LOGNAME
+exec setpriv --reuid={identity.pw_uid} --regid={identity.pw_gid} --clear-groups /usr/bin/cockpit-bridge
+""", 0o755)
+    return '/run/session'
+
+
+class Cockpit:
+    """A running cockpit-ws, to log in at or with the session of an account."""
+
+    def __init__(self, account=None):
+        session = [f'--local-session={session_of(account)}'] if account else []
+        self.process = subprocess.Popen(
+            [WS, '--no-tls', '--address=127.0.0.1', f'--port={PORT}', *session],
+            stdin=subprocess.DEVNULL, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL,
+            env={'PATH': '/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin', 'LC_ALL': 'C.UTF-8', 'HOME': '/root'},
+        )
+        until(listening, 'cockpit-ws does not listen')
+
+    def stop(self):
+        self.process.kill()
+        self.process.wait()
+
+
+class Browser:
+    """A Chromium with a profile of its own, and the page in it."""
+
+    def __init__(self):
+        self.profile = tempfile.TemporaryDirectory(prefix='mi-chromium-', ignore_cleanup_errors=True)
+        options = webdriver.ChromeOptions()
+        for argument in (*CHROMIUM, f'--user-data-dir={self.profile.name}'):
+            options.add_argument(argument)
+        options.set_capability('goog:loggingPrefs', {'browser': 'ALL'})
+        service = Service('/usr/bin/chromedriver', log_path=os.devnull)
+        self.driver = webdriver.Chrome(service=service, options=options)
+        self.driver.execute_cdp_cmd('Page.addScriptToEvaluateOnNewDocument', {'source': WATCH_POLICY})
+        self.size(1280, 900)
+
+    def stop(self):
+        self.driver.quit()
+        self.profile.cleanup()
+
+    def size(self, width, height):
+        """The size of the page itself, in CSS pixels."""
+        self.driver.execute_cdp_cmd('Emulation.setDeviceMetricsOverride', {
+            'width': width, 'height': height, 'deviceScaleFactor': 1, 'mobile': False,
+        })
+
+    def scheme(self, name):
+        """Light or dark, as the desktop would have it."""
+        self.driver.execute_cdp_cmd('Emulation.setEmulatedMedia', {
+            'features': [{'name': 'prefers-color-scheme', 'value': name}],
+        })
+
+    def open(self, tab=None):
+        """The page from the start, with a tab of it chosen; earlier calls of mihost are forgotten."""
+        self.driver.get('about:blank')
+        forget_calls()
+        self.driver.get(f'{ADDRESS}/cockpit/@localhost/mihost/index.html')
+        if tab:
+            self.click(f'#tab-{tab}')
+
+    def leave(self):
+        """Forgets everything, the session included."""
+        self.driver.switch_to.default_content()
+        self.driver.delete_all_cookies()
+        self.driver.get('about:blank')
+
+    def enter(self, css):
+        """Goes on inside a frame."""
+        self.driver.switch_to.frame(self.shown(css))
+
+    def run(self, script, *arguments):
+        """What a piece of JavaScript returns."""
+        return self.driver.execute_script(script, *arguments)
+
+    def wait(self, script, *arguments, what=None):
+        """Waits until a piece of JavaScript returns something true."""
+        return until(
+            lambda: self.run(script, *arguments),
+            what or (lambda: f'{script} {arguments}: {self.body()[:2000]}'),
+        )
+
+    def body(self):
+        return self.run('return document.body.innerText')
+
+    def find(self, css):
+        return self.driver.find_elements(By.CSS_SELECTOR, css)
+
+    def shown(self, css):
+        """The first element that matches and is displayed; waits for one."""
+        def first():
+            try:
+                return next((each for each in self.find(css) if each.is_displayed()), None)
+            except StaleElementReferenceException:
+                return None
+        return until(first, lambda: f'no {css}: {self.body()[:2000]}')
+
+    def gone(self, css):
+        self.wait('return ![...document.querySelectorAll(arguments[0])].some(e => e.checkVisibility())', css)
+
+    def act(self, css, action):
+        """Does something with an element, which the page may replace at any time."""
+        def attempt():
+            try:
+                action(self.shown(css))
+                return True
+            except StaleElementReferenceException:
+                return False
+        until(attempt, f'{css} keeps changing')
+
+    def click(self, css):
+        self.act(css, lambda element: element.click())
+
+    def type(self, css, text):
+        """Replaces the text of a field as a user would."""
+        def enter(element):
+            element.send_keys(Keys.CONTROL, 'a')
+            element.send_keys(Keys.DELETE)
+            element.send_keys(text)
+        self.act(css, enter)
+
+    def press(self, *keys):
+        self.driver.switch_to.active_element.send_keys(*keys)
+
+    def tab_to(self, css):
+        """Presses the tabulator until an element has the focus, which it must reach."""
+        for _ in range(100):
+            if self.run('return document.activeElement?.matches(arguments[0])', css):
+                return
+            self.press(Keys.TAB)
+        raise AssertionError(f'no way to {css} with the keyboard')
+
+    def text(self, css):
+        """The text that is shown in an element."""
+        return self.run('return document.querySelector(arguments[0])?.innerText ?? ""', css)
+
+    def see(self, css, *texts):
+        """Waits until an element shows all of the texts."""
+        for text in texts:
+            self.wait(
+                'const e = document.querySelector(arguments[0]);'
+                'return e && e.checkVisibility() && e.innerText.includes(arguments[1])',
+                css, text, what=lambda: f'{css} lacks {text!r}: {self.text(css)[:2000]}',
+            )
+
+    def not_seen(self, css, text):
+        self.wait(
+            'return !(document.querySelector(arguments[0])?.innerText ?? "").includes(arguments[1])', css, text,
+        )
+
+    def button(self, name, within='body'):
+        """Clicks what has this name for those who cannot see it."""
+        found = self.wait(
+            'return [...document.querySelectorAll(arguments[0] + " :is(button, a, [role=button], [role=tab])")]'
+            '.find(e => e.checkVisibility() && (e.ariaLabel || e.innerText).trim() === arguments[1])',
+            within, name, what=lambda: f'no button {name!r}: {self.body()[:2000]}',
+        )
+        found.click()
+
+    def axe(self):
+        """What axe-core finds serious or worse in what is shown: rule and element."""
+        self.run(read(AXE))
+        found = self.driver.execute_async_script(
+            'const done = arguments[0]; axe.run(document, {resultTypes: ["violations"]}).then(done);'
+        )
+        return [
+            (violation['id'], node['html'], node['failureSummary'])
+            for violation in found['violations'] if violation['impact'] in ('serious', 'critical')
+            for node in violation['nodes']
+        ]
+
+    def refused(self):
+        """What the content security policy refused since the page was opened."""
+        return self.run('return window.refused')
+
+    def complaints(self):
+        """The problems that the browser's console was told of since it was asked last."""
+        return [entry['message'] for entry in self.driver.get_log('browser')
+                if entry['level'] in ('SEVERE', 'WARNING') and '/favicon.ico' not in entry['message']]
+
+    def picture(self, name):
+        """Keeps a picture of the page in the build directory."""
+        content = self.driver.get_screenshot_as_png()
+        entry = tarfile.TarInfo(name + '.png')
+        entry.size = len(content)
+        pictures().addfile(entry, io.BytesIO(content))
+
+
+class PageTest(unittest.TestCase):
+    """A test of the page; Cockpit and the browser serve all tests of the class."""
+
+    ACCOUNT = 'root'
+
+    @classmethod
+    def setUpClass(cls):
+        cls.prepare()
+        cls.cockpit = Cockpit(cls.ACCOUNT)
+        cls.addClassCleanup(cls.cockpit.stop)
+        cls.browser = Browser()
+        cls.addClassCleanup(cls.browser.stop)
+
+    @classmethod
+    def prepare(cls):
+        """The machine as the tests of the class find it."""
+        lay_machine()
+
+
+def send_pictures():
+    """Has a process outside of the copy, from where no file gets out, write the pictures."""
+    os.makedirs(PICTURES, exist_ok=True)
+    reader, writer = os.pipe()
+    subprocess.Popen(['tar', '-x', '-C', PICTURES], stdin=reader)
+    os.close(reader)
+    os.set_inheritable(writer, True)
+    os.environ['MI_PICTURES_PIPE'] = str(writer)
+
+
+@functools.cache
+def pictures():
+    pipe = os.fdopen(int(os.environ['MI_PICTURES_PIPE']), 'wb')
+    archive = tarfile.open(fileobj=pipe, mode='w|')
+    atexit.register(pipe.close)
+    atexit.register(archive.close)
+    return archive
+
+
+def main():
+    if 'MI_PICTURES_PIPE' in os.environ:
+        pictures()  # an empty archive where a test takes none
+    else:
+        send_pictures()
+    environment.main_in_sandbox(PAGE or 'npm', *NEEDED)

@@ -1,5 +1,5 @@
 // Builds the page into the directory that is given, or into dist/.
-import { copyFile, mkdir, rm, writeFile } from "node:fs/promises";
+import { copyFile, mkdir, readdir, rm, writeFile } from "node:fs/promises";
 import { dirname, join, resolve } from "node:path";
 import { fileURLToPath } from "node:url";
 import { build } from "esbuild";
@@ -7,7 +7,8 @@ import { build } from "esbuild";
 const here = dirname(fileURLToPath(import.meta.url));
 const out = resolve(process.argv[2] ?? join(here, "dist"));
 
-await rm(out, { recursive: true, force: true });
+for (const file of await readdir(out).catch(() => []))
+    await rm(join(out, file), { recursive: true });
 await mkdir(out, { recursive: true });
 await build({
     absWorkingDir: here,

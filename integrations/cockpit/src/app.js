@@ -1,20 +1,39 @@
 // The page: its state, its tabs, and the view of the tab that the address names.
-import { _, cockpit } from "./cockpit.js";
-import { append, el } from "./dom.js";
+import { watchAccess } from "./access.js";
+import { _, cockpit, format } from "./cockpit.js";
+import { append, el, replace } from "./dom.js";
 import * as mihost from "./mihost.js";
-import { State } from "./state.js";
+import { Monitor } from "./monitor.js";
+import { Preview } from "./preview.js";
+import { State, alert } from "./state.js";
 import { isRecent, oldestMihost } from "./version.js";
+import { DoctorView } from "./views/doctor.js";
+import { DriversView } from "./views/drivers.js";
+import { GroupsView } from "./views/groups.js";
+import { HostView } from "./views/host.js";
+import { LogView } from "./views/log.js";
 import { TreeView } from "./views/tree.js";
+import { UsersView } from "./views/users.js";
 
 const tabs = [
     { name: "tree", title: () => _("Tree"), View: TreeView },
+    { name: "users", title: () => _("Users"), View: UsersView },
+    { name: "groups", title: () => _("Groups"), View: GroupsView },
+    { name: "drivers", title: () => _("Drivers"), View: DriversView },
+    { name: "log", title: () => _("Log"), View: LogView },
+    { name: "host", title: () => _("Machine"), View: HostView },
+    { name: "doctor", title: () => _("Checks"), View: DoctorView },
 ];
+
+const monitorAfter = 5000; // milliseconds, for the first view to come first
 
 export class App {
     constructor(body) {
         document.title = _("Management tree");
         document.documentElement.lang = cockpit.language ?? "en";
         this.state = new State();
+        this.monitor = new Monitor();
+        this.notice = el("div", { id: "notice", "aria-live": "polite" });
         this.views = new Map();
         this.panels = new Map(tabs.map(tab => [tab.name, el("div", {
             id: `panel-${tab.name}`, class: "mi-panel", role: "tabpanel", "aria-labelledby": `tab-${tab.name}`,
@@ -34,18 +53,27 @@ export class App {
                     }, tabs.map(tab => el("div", {
                         class: "pf-v6-c-tabs__item", role: "presentation",
                     }, this.buttons.get(tab.name)))))),
-            el("main", { class: "mi-main" }, this.state.element, [...this.panels.values()]));
+            el("main", { class: "mi-main" }, this.state.element, this.notice, [...this.panels.values()]));
 
-        this.watchPrivilege();
+        watchAccess(allowed => {
+            if (allowed)
+                this.state.clear("no-privilege");
+            else
+                this.state.show("no-privilege");
+            if (this.tab) // what could not be read may be known now
+                this.show();
+        });
         mihost.watchSlow(slow => slow.size > 0
             ? this.state.show("slow", { action: { label: _("Stop waiting"), run: mihost.stopSlow } })
             : this.state.clear("slow"));
         cockpit.addEventListener("locationchanged", () => this.show());
         this.checkVersion();
         this.show();
+        setTimeout(() => this.monitor.start(), monitorAfter);
     }
 
     go(path) {
+        replace(this.notice);
         cockpit.location.go(path);
     }
 
@@ -64,7 +92,12 @@ export class App {
             this.buttons.get(name).parentElement.classList.toggle("pf-m-current", chosen);
         }
         if (!this.views.has(tab.name)) {
-            const view = new tab.View({ state: this.state, go: path => this.go(path) });
+            const view = new tab.View({
+                state: this.state,
+                monitor: this.monitor,
+                go: path => this.go(path),
+                preview: (task, options) => this.preview(task, options),
+            });
             this.views.set(tab.name, view);
             append(this.panels.get(tab.name), view.element);
         }
@@ -80,16 +113,14 @@ export class App {
         this.buttons.get(tabs[index].name).focus();
     }
 
-    watchPrivilege() {
-        const permission = cockpit.permission({ admin: true });
-        const changed = () => {
-            if (permission.allowed === false)
-                this.state.show("no-privilege");
-            else
-                this.state.clear("no-privilege");
-        };
-        permission.addEventListener("changed", changed);
-        changed();
+    /** Opens the dialog of a change. After it the view is read again, or "then" leads to another one. */
+    preview(task, { fixed, values, then = () => this.show() } = {}) {
+        new Preview(task, { fixed, values }, ({ title, answer }) => {
+            this.views.get("tree")?.forget();
+            then();
+            replace(this.notice, alert("success", answer.changed ? format(_("Done: $0"), title)
+                : format(_("Nothing changed: $0"), title), answer.warnings));
+        }).open();
     }
 
     checkVersion() {
@@ -98,7 +129,7 @@ export class App {
                 this.state.clear("too-old");
             else
                 this.state.show("too-old", {
-                    detail: cockpit.format(_("It is $0; this page needs $1 or newer."), version.trim(), oldestMihost),
+                    detail: format(_("It is $0; this page needs $1 or newer."), version.trim(), oldestMihost),
                 });
         }, () => {}); // the view's own run of mihost meets the same trouble, and shows it
     }

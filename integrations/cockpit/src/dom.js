@@ -6,6 +6,8 @@ function fill(element, properties, children) {
         if (name === "on")
             for (const [event, listener] of Object.entries(value))
                 element.addEventListener(event, listener);
+        else if (name.startsWith("aria-") && typeof value === "boolean")
+            element.setAttribute(name, String(value));
         else if (value === true)
             element.setAttribute(name, "");
         else if (value !== false && value !== null && value !== undefined)

@@ -7,9 +7,12 @@ const all = new Set();
 onVisibility(visible => all.forEach(live => live.setVisible(visible)));
 
 export class Live {
-    /** Calls back with each document; with a failure, or null, when mihost ends although it was not stopped. */
-    constructor(words, { onDocument, onEnd }) {
-        Object.assign(this, { words, onDocument, onEnd, run: null });
+    /**
+     * Calls back whenever mihost is started, with each document that it prints, and with a failure, or
+     * null, when it ends although it was not stopped.
+     */
+    constructor(words, { onBegin = () => {}, onDocument, onEnd }) {
+        Object.assign(this, { words, onBegin, onDocument, onEnd, run: null });
         all.add(this);
         this.setVisible(isVisible());
     }
@@ -22,6 +25,7 @@ export class Live {
     }
 
     begin() {
+        this.onBegin();
         const run = mihost.stream(this.words, document => run === this.run && this.onDocument(document));
         this.run = run;
         const ended = failure => {

@@ -62,7 +62,7 @@ export class Loader {
         if (failure.kind === "cancelled")
             replace(this.element, alert("info", _("Reading was stopped"), [], action));
         else if (State.knows(failure))
-            this.state.show(failure.kind, { detail: failure.message, action });
+            this.state.show(failure.kind, { detail: failure.message, owner: this, action });
         else
             replace(this.element, alert("danger", _("mihost could not read this"), [failure.message], action));
     }

@@ -45,7 +45,12 @@ const conditions = { // the most severe first
     },
 };
 
-const looks = { danger: () => _("Danger"), warning: () => _("Warning"), info: () => _("Info") };
+const looks = { // of alerts: the mark, and the word for who cannot see it
+    danger: { mark: "!", word: () => _("Danger") },
+    warning: { mark: "!", word: () => _("Warning") },
+    success: { mark: "✓", word: () => _("Success") },
+    info: { mark: "i", word: () => _("Info") },
+};
 
 export class State {
     constructor() {
@@ -54,9 +59,15 @@ export class State {
         this.draw();
     }
 
-    /** Shows a condition. A detail is a text of mihost; an action has a label and a function. */
-    show(name, { detail = "", action = null } = {}) {
-        this.holding.set(name, { detail, action });
+    /**
+     * Shows a condition. A detail is a text of mihost. An action is what helps against it; one for
+     * each owner, such as the views that have to be read again. All of them run on a click.
+     */
+    show(name, { detail = "", owner = null, action = null } = {}) {
+        const actions = this.holding.get(name)?.actions ?? new Map();
+        if (action)
+            actions.set(owner, action);
+        this.holding.set(name, { detail, actions });
         this.draw();
     }
 
@@ -78,7 +89,15 @@ export class State {
 
     alert(name) {
         const { look, title, text } = conditions[name];
-        const { detail, action } = this.holding.get(name);
+        const { detail, actions } = this.holding.get(name);
+        const [first] = actions.values();
+        const action = first && {
+            label: first.label,
+            run: () => {
+                this.clear(name);
+                actions.forEach(({ run }) => run());
+            },
+        };
         return alert(look, title(), [text?.(), detail], action, { "data-state": name });
     }
 }
@@ -86,9 +105,9 @@ export class State {
 /** PatternFly's inline alert. */
 export function alert(look, title, texts = [], action = null, properties = {}) {
     return el("div", { class: `pf-v6-c-alert pf-m-inline pf-m-${look}`, ...properties },
-        el("div", { class: "pf-v6-c-alert__icon mi-mark", "aria-hidden": "true" }, look === "info" ? "i" : "!"),
+        el("div", { class: "pf-v6-c-alert__icon mi-mark", "aria-hidden": "true" }, looks[look].mark),
         el("p", { class: "pf-v6-c-alert__title" },
-            el("span", { class: "pf-v6-screen-reader" }, `${looks[look]()}: `), title),
+            el("span", { class: "pf-v6-screen-reader" }, `${looks[look].word()}: `), title),
         el("div", { class: "pf-v6-c-alert__description" },
             texts.filter(Boolean).map(text => el("p", {}, text))),
         action && el("div", { class: "pf-v6-c-alert__action-group" },

@@ -51,9 +51,10 @@ export class TreeView {
     /** Shows the node with this address; the operating system where there is none. */
     show([address = "os"]) {
         this.address = address;
-        if (this.tree.nodes.size === 0)
+        if (this.tree.nodes.size === 0 || this.stale)
             this.reload();
-        this.select();
+        else
+            this.select();
     }
 
     hide() {
@@ -61,9 +62,15 @@ export class TreeView {
         this.detail.hide();
     }
 
+    /** The tree is read again when it is shown next. */
+    forget() {
+        this.stale = true;
+    }
+
     reload() {
         this.loader.load(() => [mihost.rows(["tree"])], rows => {
             replace(this.message);
+            this.stale = false;
             this.tree = buildTree(rows);
             if (this.expanded.size === 0)
                 for (const node of this.tree.nodes.values())
@@ -116,7 +123,7 @@ export class TreeView {
             "aria-posinset": position,
             "aria-setsize": siblings,
             "aria-selected": chosen,
-            "aria-expanded": open === null ? null : String(open),
+            "aria-expanded": open,
         },
         el("span", { class: "mi-tree__toggle", "aria-hidden": "true" }, open === null ? "" : open ? "▾" : "▸"),
         el("span", { class: "mi-tree__name" }, nameOf(node)),

@@ -1,0 +1,24 @@
+// Whether the account that is logged in has the privilege to change the machine.
+import { cockpit } from "./cockpit.js";
+
+const permission = cockpit.permission({ admin: true });
+
+/** True, too, while Cockpit does not know yet. */
+export function allowed() {
+    return permission.allowed !== false;
+}
+
+/** Calls back now and whenever that changes. Buttons that change the machine follow by themselves. */
+export function watchAccess(listener) {
+    let last = null;
+    const changed = () => {
+        if (allowed() === last)
+            return;
+        last = allowed();
+        for (const button of document.querySelectorAll("[data-changes]"))
+            button.disabled = !last;
+        listener(last);
+    };
+    permission.addEventListener("changed", changed);
+    changed();
+}

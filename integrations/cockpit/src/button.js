@@ -1,0 +1,17 @@
+import { allowed } from "./access.js";
+import { el } from "./dom.js";
+
+const looks = { primary: "pf-m-primary", secondary: "pf-m-secondary", danger: "pf-m-danger", link: "pf-m-link pf-m-inline" };
+
+/** PatternFly's button. One that changes the machine is off while the page has no privilege for that. */
+export function button(label, run, { look = "secondary", changes = false, id = null, name = null } = {}) {
+    return el("button", {
+        id,
+        type: "button",
+        class: `pf-v6-c-button ${looks[look]}`,
+        "aria-label": name,
+        "data-changes": changes,
+        disabled: changes && !allowed(),
+        on: { click: run },
+    }, label);
+}

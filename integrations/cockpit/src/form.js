@@ -1,0 +1,72 @@
+// The form of a task: its fields with what mihost says about them.
+import { _ } from "./cockpit.js";
+import { el, replace } from "./dom.js";
+
+const types = { number: "text", day: "date", password: "password" };
+const reasons = {
+    missing: () => _("This is needed."),
+    number: () => _("This has to be a number."),
+    different: () => _("The passwords differ."),
+    line: () => _("This has to be a single line."),
+};
+
+export class Form {
+    /** Fixed values are shown and cannot be changed; parameters are the meanings by parameter. */
+    constructor(task, { fixed, values, parameters, onInput }) {
+        this.fixed = fixed;
+        this.inputs = new Map();
+        this.faults = new Map();
+        this.element = el("div", { class: "pf-v6-c-form" }, task.fields.map(field => [
+            this.group(field, parameters?.get(field.parameter)?.meaning, fixed[field.name] ?? values[field.name], onInput),
+            field.kind === "password" && this.group(
+                { ...field, name: `${field.name}-again`, label: () => _("Password again") }, null, "", onInput),
+        ]));
+    }
+
+    group({ name, label, kind, required }, meaning, value, onInput) {
+        const id = `field-${name}`;
+        const fault = el("span", { class: "mi-fault", id: `${id}-fault` });
+        const input = el("input", {
+            id, name,
+            type: types[kind] ?? "text",
+            value: value ?? "",
+            inputmode: kind === "number" ? "numeric" : null,
+            autocomplete: kind === "password" ? "new-password" : "off",
+            autocapitalize: "none",
+            spellcheck: "false",
+            required: Boolean(required),
+            readonly: name in this.fixed,
+            "aria-describedby": `${id}-help ${id}-fault`,
+            on: { input: onInput },
+        });
+        this.inputs.set(name, input);
+        this.faults.set(name, fault);
+        return el("div", { class: "pf-v6-c-form__group" },
+            el("div", { class: "pf-v6-c-form__group-label" },
+                el("label", { class: "pf-v6-c-form__label", for: id },
+                    el("span", { class: "pf-v6-c-form__label-text" }, label()),
+                    required && el("span", { class: "pf-v6-c-form__label-required", "aria-hidden": "true" }, " *"))),
+            el("div", { class: "pf-v6-c-form__group-control" },
+                el("span", { class: `pf-v6-c-form-control${name in this.fixed ? " pf-m-readonly" : ""}` }, input),
+                el("div", { class: "mi-help" }, fault, el("span", { id: `${id}-help` }, meaning))));
+    }
+
+    values() {
+        return Object.fromEntries([...this.inputs].map(([name, input]) => [name, input.value]));
+    }
+
+    showFaults(faults) {
+        for (const [name, element] of this.faults) {
+            const fault = faults.find(other => other.name === name);
+            replace(element, fault ? `${reasons[fault.reason]()} ` : null);
+            this.inputs.get(name).setAttribute("aria-invalid", String(Boolean(fault)));
+        }
+        if (faults.length > 0)
+            this.inputs.get(faults[0].name).focus();
+    }
+
+    focus() {
+        const first = [...this.inputs.values()].find(input => !input.readOnly);
+        first?.focus();
+    }
+}

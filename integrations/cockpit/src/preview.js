@@ -1,0 +1,186 @@
+// The dialog of a change: its form, what would happen, and then the change itself.
+import { button } from "./button.js";
+import * as catalogue from "./catalogue.js";
+import { _ } from "./cockpit.js";
+import { commandOf, faultsOf } from "./command.js";
+import { el, replace } from "./dom.js";
+import { Form } from "./form.js";
+import { spinner } from "./load.js";
+import * as mihost from "./mihost.js";
+import { outcome } from "./outcome.js";
+import { alert } from "./state.js";
+
+export class Preview {
+    /**
+     * Opens the dialog. Fixed values belong to what the change is about, others are where the form
+     * starts; onDone is called with the task's title after a change.
+     */
+    constructor(task, { fixed = {}, values = {} } = {}, onDone) {
+        Object.assign(this, { task, fixed, values, onDone, busy: false, name: null });
+        this.form = el("form", { on: { submit: event => this.submitted(event) } });
+        this.result = el("div", { class: "mi-result", "aria-live": "polite" });
+        this.confirm = el("input", {
+            id: "confirm-name", autocomplete: "off", autocapitalize: "none", spellcheck: "false",
+            on: { input: () => this.update(), keydown: event => event.key === "Enter" && this.apply.click() },
+        });
+        this.confirmation = el("div", { class: "mi-confirm", hidden: true },
+            el("label", { for: "confirm-name" }, task.danger?.label()),
+            el("span", { class: "pf-v6-c-form-control" }, this.confirm));
+        this.run = button(_("What would happen?"), () => this.tryIt(), { id: "preview-run", look: "primary" });
+        this.apply = button(_("Apply"), () => this.doIt(), {
+            id: "preview-apply", look: task.danger ? "danger" : "primary",
+        });
+        this.cancel = button(_("Cancel"), () => this.close(), { id: "preview-cancel", look: "link" });
+        this.element = el("dialog", {
+            id: "preview", class: "mi-dialog", "aria-labelledby": "preview-title",
+            on: {
+                cancel: event => {
+                    event.preventDefault();
+                    this.close();
+                },
+            },
+        },
+        el("h2", { id: "preview-title", class: "pf-v6-c-title pf-m-xl" }, task.title()),
+        el("div", { class: "mi-dialog__body" }, this.form, this.result, this.confirmation),
+        el("footer", { class: "mi-dialog__footer" }, this.run, this.apply, this.cancel));
+        this.update();
+    }
+
+    /** The meanings of the fields and the machine's name come before the dialog is usable. */
+    async open() {
+        document.body.append(this.element);
+        this.element.showModal();
+        replace(this.result, spinner());
+        try {
+            const { task } = this;
+            const [methods, machine] = await Promise.all([
+                task.method ? catalogue.methods() : null,
+                task.danger?.name === "machine"
+                    ? mihost.text(["-o", "value", "get", "computer", "computer-name"]).answer : null,
+            ]);
+            this.machine = machine?.trim();
+            this.fields = new Form(task, {
+                fixed: this.fixed,
+                values: this.values,
+                parameters: methods?.get(task.method)?.parameters,
+                onInput: () => this.forget(),
+            });
+            replace(this.form, methods && el("p", { class: "mi-note" }, methods.get(task.method)?.meaning),
+                this.fields.element);
+            replace(this.result);
+            this.update();
+            this.fields.focus();
+        } catch (failure) {
+            this.failed(failure);
+        }
+    }
+
+    close() {
+        if (this.applying)
+            return;
+        this.current?.stop();
+        this.element.close();
+        this.element.remove();
+    }
+
+    submitted(event) {
+        event.preventDefault();
+        this.tryIt();
+    }
+
+    /** What was previewed is not what the form says any more. */
+    forget() {
+        if (!this.previewed)
+            return;
+        this.previewed = null;
+        replace(this.result);
+        this.update();
+    }
+
+    update() {
+        const wanted = this.wantedName();
+        const confirmed = !wanted || this.confirm.value === wanted;
+        this.confirmation.hidden = !(wanted && this.previewed);
+        this.run.disabled = this.busy || !this.fields;
+        this.apply.disabled = this.busy || !this.previewed || !confirmed;
+        this.cancel.disabled = Boolean(this.applying);
+        this.run.classList.toggle("pf-m-primary", !this.previewed);
+        this.run.classList.toggle("pf-m-secondary", Boolean(this.previewed));
+    }
+
+    wantedName() {
+        const { danger } = this.task;
+        if (!danger)
+            return null;
+        return danger.name === "machine" ? this.machine : danger.name(this.fixed);
+    }
+
+    async tryIt() {
+        if (this.busy || !this.fields)
+            return;
+        const values = this.fields.values();
+        const faults = faultsOf(this.task, values);
+        this.fields.showFaults(faults);
+        if (faults.length > 0)
+            return;
+        this.previewed = null;
+        const command = commandOf(this.task, values);
+        const answer = await this.change(command, true);
+        if (!answer)
+            return;
+        replace(this.result, outcome(answer, { preview: true }));
+        if (!answer.error)
+            this.previewed = command;
+        this.update();
+        this.result.scrollIntoView({ block: "nearest" });
+        if (this.previewed && this.wantedName())
+            this.confirm.focus();
+        else if (this.previewed)
+            this.apply.focus();
+    }
+
+    async doIt() {
+        if (this.apply.disabled)
+            return;
+        this.applying = true;
+        const answer = await this.change(this.previewed, false);
+        this.applying = false;
+        this.previewed = null; // whatever came of it, a further change has to be previewed again
+        this.update();
+        if (!answer)
+            return;
+        if (answer.error) {
+            replace(this.result, outcome(answer, { preview: false }));
+            return;
+        }
+        this.close();
+        this.onDone({ title: this.task.title(), answer });
+    }
+
+    async change({ words, input }, preview) {
+        this.busy = true;
+        this.update();
+        replace(this.result, spinner());
+        try {
+            this.current = mihost.change(words, { preview, input });
+            return await this.current.answer;
+        } catch (failure) {
+            this.failed(failure);
+            return null;
+        } finally {
+            this.busy = false;
+            this.update();
+        }
+    }
+
+    failed(failure) {
+        if (!failure.kind)
+            throw failure;
+        const titles = {
+            killed: _("mihost was ended before it had answered"),
+            missing: _("mihost is not installed on this machine"),
+            cancelled: _("This was stopped"),
+        };
+        replace(this.result, alert("danger", titles[failure.kind] ?? _("mihost could not do this"), [failure.message]));
+    }
+}

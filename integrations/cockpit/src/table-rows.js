@@ -1,0 +1,29 @@
+// Which rows of a table are shown, and in which order.
+
+/** The rows in which a column's text contains each word of the filter. */
+export function filterRows(rows, columns, filter) {
+    const words = filter.toLowerCase().split(/\s+/).filter(Boolean);
+    if (words.length === 0)
+        return rows;
+    return rows.filter(row => {
+        const text = columns.map(column => column.text(row)).join("\n").toLowerCase();
+        return words.every(word => text.includes(word));
+    });
+}
+
+function compare(a, b, order) {
+    if (order === "number") {
+        const [x, y] = [Number(a), Number(b)];
+        // What is no number, such as an unknown one, comes last.
+        if (Number.isNaN(x) || Number.isNaN(y))
+            return Number.isNaN(x) - Number.isNaN(y);
+        return x - y;
+    }
+    return a < b ? -1 : a > b ? 1 : 0;
+}
+
+/** The rows in the order of a column; rows that are equal there stay in their order. */
+export function sortRows(rows, { property, order }, descending) {
+    const sign = descending ? -1 : 1;
+    return [...rows].sort((a, b) => sign * compare(a[property], b[property], order));
+}

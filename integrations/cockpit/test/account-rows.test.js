@@ -1,0 +1,23 @@
+import assert from "node:assert/strict";
+import { test } from "node:test";
+import { countNames, dayText, daysText, expiryText } from "../src/account-rows.js";
+
+test("expiryText takes the last day of time for never", () => {
+    assert.equal(expiryText("2038-01-19 00:00:00", "never"), "never");
+    assert.equal(expiryText("2030-02-01 00:00:00", "never"), "2030-02-01");
+    assert.equal(expiryText("-", "never"), "-");
+});
+
+test("dayText leaves the time of day out", () => {
+    assert.equal(dayText("2030-02-01 00:00:00"), "2030-02-01");
+});
+
+test("daysText takes 99999 days for no end", () => {
+    assert.equal(daysText("99999", "for ever"), "for ever");
+    assert.equal(daysText("90", "for ever"), "90");
+    assert.equal(daysText("-", "for ever"), "-");
+});
+
+test("countNames counts members", () => {
+    assert.deepEqual(["", "-", "anna", "anna,ben"].map(countNames), [0, 0, 1, 2]);
+});

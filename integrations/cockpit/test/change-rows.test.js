@@ -1,0 +1,18 @@
+import assert from "node:assert/strict";
+import { test } from "node:test";
+import { differenceOf, sortChanges } from "../src/change-rows.js";
+
+test("sortChanges sets the account tools' backups apart", () => {
+    const files = ["/etc/passwd", "/etc/passwd-", "/home/x-", "/etc/a/b-"].map(file => ({ file }));
+    const sorted = sortChanges(files);
+    assert.deepEqual(sorted.files.map(change => change.file), ["/etc/passwd", "/home/x-", "/etc/a/b-"]);
+    assert.deepEqual(sorted.backups.map(change => change.file), ["/etc/passwd-"]);
+});
+
+test("differenceOf shows mode and owner, then lines that go and come", () => {
+    assert.deepEqual(differenceOf({
+        removed: ["a"], added: ["b", "c"],
+        mode: { before: "0644", after: "0600" }, owner: { before: null, after: "0:0" },
+    }).map(({ sign, text }) => `${sign}${text}`), [" mode: 0644 → 0600", " owner: - → 0:0", "-a", "+b", "+c"]);
+    assert.deepEqual(differenceOf({}), []);
+});

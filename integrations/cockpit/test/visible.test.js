@@ -1,0 +1,16 @@
+import assert from "node:assert/strict";
+import { test } from "node:test";
+import { visible } from "../src/visible.js";
+
+test("visible escapes control characters", () => {
+    assert.equal(visible("\u001b[31mred\u0007\u0000\u009b"), "\\x1b[31mred\\x07\\x00\\x9b");
+});
+
+test("visible escapes what reorders or hides text", () => {
+    assert.equal(visible("a\u202eb\u200bc\u2066d\ufeff"), "a\\u202eb\\u200bc\\u2066d\\ufeff");
+});
+
+test("visible leaves text, markup, tabs and line ends alone", () => {
+    const text = "<b>Zoë</b>\tpäth\nline — 日本";
+    assert.equal(visible(text), text);
+});

@@ -1,0 +1,674 @@
+// From the loading of the library to its closing.
+
+#include "TestPaths.h"
+#include "tests/contract/recording_host/Loaded.h"
+
+#include "host/OpenMI.h"
+#include "host/Properties.h"
+
+#include <algorithm>
+#include <ctime>
+#include <dlfcn.h>
+#include <memory>
+#include <new>
+#include <set>
+#include <sys/sysinfo.h>
+#include <utility>
+
+namespace
+{
+
+Lines const builders = {"createOsSwNodes",  "createRootNode",    "createComputerNodes",
+                        "createOsNodes",    "createDriverNodes", "createUserNodes",
+                        "createGroupNodes", "createLogNodes",    "createLogEntryNodes"};
+
+/** Those of the messages that say that a builder, initialize, unload or publishNode began or ended.
+ */
+Lines frameMessages(Lines const& messages)
+{
+    Lines found;
+    for (std::string const& message : messages) {
+        std::string const name = message.substr(0, message.find(':'));
+        if (name == "initialize" || name == "unload" || name == "publishNode" ||
+            std::find(builders.begin(), builders.end(), name) != builders.end())
+            found.push_back(message);
+    }
+    return found;
+}
+
+class Library : public testing::Test
+{
+protected:
+    void SetUp() override
+    {
+#ifdef __SANITIZE_ADDRESS__
+        GTEST_SKIP() << "with this sanitizer libraries stay loaded";
+#endif
+    }
+};
+
+TEST_F(Library, ConstructsItsObjectsInOrderAndDestroysThemInReverse)
+{
+    RecordingHost const& host = freshHost();
+    std::make_unique<Plugin>().reset();
+    EXPECT_EQ(host.events, (Lines{"ManagementInterface(), category Veltrix.IC.MI.OsSwMI",
+                                  "Error(0, unsigned 0, \"\")", "Mutex()", "~Mutex()", "~Error()",
+                                  "~ManagementInterface(), category Veltrix.IC.MI.OsSwMI"}));
+}
+
+TEST_F(Library, DestroysTheMutexOfTheGroupListingFirstOfAll)
+{
+    RecordingHost& host = freshHost();
+    libc::FileRoot const files{MACHINES_DIR "/redhat"};
+    libc::FakeCommands const commands;
+    auto plugin = std::make_unique<Plugin>();
+    plugin->initialize(); // which lists the groups for the first time
+    plugin->unload();
+    host.events.clear();
+    plugin.reset();
+    EXPECT_EQ(host.events, (Lines{"~Mutex()", "~Mutex()", "~Error()",
+                                  "~ManagementInterface(), category Veltrix.IC.MI.OsSwMI"}));
+}
+
+TEST_F(Library, DeletesNoNodeWhenItIsClosed)
+{
+    RecordingHost& host = freshHost();
+    auto plugin = std::make_unique<Plugin>();
+    auto& mi = static_cast<IC::OsSwMI&>(plugin->interface());
+    IC::MutableNode user(1, 0, {1}, IC::nodeType::user, 1);
+    IC::MutableNode group(2, 0, {1}, IC::nodeType::group, 1);
+    IC::MutableNode entry(3, 0, {1}, IC::nodeType::logEntry, 1);
+    Insides::userNodes(mi) = {&user};
+    Insides::groupNodes(mi) = {&group};
+    Insides::logEntryNodes(mi) = {&entry};
+    host.events.clear();
+    plugin.reset();
+    EXPECT_EQ(host.events, (Lines{"~Mutex()", "~Error()",
+                                  "~ManagementInterface(), category Veltrix.IC.MI.OsSwMI"}));
+}
+
+TEST_F(Library, IsGoneOnceItIsClosed)
+{
+    std::make_unique<Plugin>().reset();
+    EXPECT_EQ(dlopen(PLUGIN_FILE, RTLD_NOW | RTLD_NOLOAD), nullptr);
+}
+
+class Lifecycle : public Loaded
+{
+protected:
+    IC::OsSwMI*& current() const
+    {
+        return object<IC::OsSwMI*>("_ZN2IC7pOsSwMIE");
+    }
+
+    /** Deletes the nodes of a kind and makes them anew, as a write of a host does. */
+    void rebuild(char const* builder) const
+    {
+        auto* const rebuilds =
+            reinterpret_cast<void (*)(IC::OsSwMI*, bool)>(plugin.symbol(builder));
+        rebuilds(&mi(), true);
+    }
+
+    Ids nodeTypes() const
+    {
+        Ids types;
+        for (IC::MutableNode const* node : plugin.nodes())
+            types.push_back(node->getNodeType());
+        return types;
+    }
+};
+
+TEST_F(Lifecycle, StartsWithEmptyListsNoInterfaceInUseAndTheFlagDown)
+{
+    EXPECT_TRUE(Insides::userNodes(mi()).empty());
+    EXPECT_TRUE(Insides::groupNodes(mi()).empty());
+    EXPECT_TRUE(Insides::logEntryNodes(mi()).empty());
+    EXPECT_EQ(current(), nullptr);
+    EXPECT_FALSE(object<bool>("_ZN2IC6OSSWMI7MI_callE"));
+}
+
+TEST_F(Lifecycle, ReadsTheIdRangesNotBeforeTheyAreAskedFor)
+{
+    auto const& instance = object<void*>("_ZN2NQ8minMaxId9pinstanceE");
+    EXPECT_EQ(instance, nullptr);
+    plugin.initialize();
+    void const* const first = instance;
+    EXPECT_NE(first, nullptr);
+    rebuild("_ZN2IC6OsSwMI15createUserNodesEb");
+    EXPECT_EQ(instance, first);
+}
+
+TEST_F(Lifecycle, OpenMIYieldsTheSameTwoAddressesEachTime)
+{
+    auto* const open = reinterpret_cast<decltype(&OpenMI)>(plugin.symbol("OpenMI"));
+    IC::ManagementInterface* interface = nullptr;
+    IC::Error* error = nullptr;
+    for (int time = 0; time < 2; ++time) {
+        EXPECT_EQ(open(&interface, &error), 0);
+        EXPECT_EQ(interface, &plugin.interface());
+        EXPECT_EQ(error, &plugin.status());
+    }
+    EXPECT_EQ(interface, plugin.symbol("_ZN2IC6OSSWMI8myosswmiE"));
+    EXPECT_EQ(error, plugin.symbol("_ZN2IC6OSSWMI5myerrE"));
+}
+
+TEST_F(Lifecycle, OpenMIAsksNothingOfTheHostAndSaysNothing)
+{
+    host.events.clear();
+    auto* const open = reinterpret_cast<decltype(&OpenMI)>(plugin.symbol("OpenMI"));
+    IC::ManagementInterface* interface = nullptr;
+    IC::Error* error = nullptr;
+    open(&interface, &error);
+    EXPECT_EQ(host.events, Lines());
+}
+
+TEST_F(Lifecycle, SetLoadCallBackStoresItsThreeArgumentsAndCallsNothing)
+{
+    IC::ManagementInterface::LoadCallBack const load = [](IC::Node* const&,
+                                                          void const*) -> IC::Error { throw 1; };
+    IC::ManagementInterface::LookupCallBack const lookUp = [](std::string const&,
+                                                              IC::Node**) -> IC::Error { throw 1; };
+    host.events.clear();
+    mi().setLoadCallBack(load, this, lookUp);
+    EXPECT_EQ(Insides::loadCallBack(mi()), load);
+    EXPECT_EQ(Insides::loadCallBackContext(mi()), this);
+    EXPECT_EQ(Insides::lookupCallBack(mi()), lookUp);
+    EXPECT_EQ(host.events, Lines());
+    plugin.initialize();
+    rebuild("_ZN2IC6OsSwMI15createUserNodesEb");
+}
+
+TEST_F(Lifecycle, InitializePassesItsThreeArgumentsOnUnchanged)
+{
+    host.events.clear();
+    mi().initialize(5, IC::Number(77U), IC::Number(true));
+    ASSERT_GE(host.events.size(), 2U);
+    EXPECT_EQ(host.events[0], "log: initialize: entry");
+    EXPECT_EQ(host.events[1], "initialize(5, unsigned 77, boolean 1)");
+    mi().unload();
+}
+
+TEST_F(Lifecycle, InitializeHasItsInterfaceAndListReadyWhenTheFrameworkInitialises)
+{
+    bool isReady = false;
+    host.onInitialize = [this, &isReady] {
+        isReady = current() == &mi() && Insides::nodeIds(mi()) && Insides::nodeIds(mi())->empty();
+    };
+    plugin.initialize();
+    EXPECT_TRUE(isReady);
+}
+
+TEST_F(Lifecycle, InitializeForgetsTheNodeBuiltLastBeforeItBuilds)
+{
+    IC::MutableNode last(1, 0, {1}, 39, 0);
+    Insides::currentNode(mi()) = &last;
+    std::vector<IC::MutableNode*> seen;
+    host.onInitialize = [this, &seen] { seen.push_back(Insides::currentNode(mi())); };
+    host.onNode = [this, &seen] { seen.push_back(Insides::currentNode(mi())); };
+    plugin.initialize();
+    ASSERT_GE(seen.size(), 2U);
+    EXPECT_EQ(seen[0], &last);
+    EXPECT_EQ(seen[1], nullptr);
+}
+
+TEST_F(Lifecycle, InitializeRunsTheNineBuildersInOrder)
+{
+    plugin.initialize();
+    Lines expected = {"initialize: entry"};
+    for (std::string const& builder : builders) {
+        expected.push_back(builder + ": entry");
+        expected.push_back(builder + ": exit");
+    }
+    expected.emplace_back("initialize: exit");
+    EXPECT_EQ(frameMessages(host.messages()), expected);
+}
+
+TEST_F(Lifecycle, InitializeAnswersWithTheFrameworksSuccess)
+{
+    IC::Error const error = plugin.initialize();
+    EXPECT_EQ(error.getStatus(), 0);
+    EXPECT_EQ(plugin.status().getStatus(), 0);
+}
+
+TEST_F(Lifecycle, AFailingFrameworkIsWhatTheHostHearsOfAndTheTreeStandsAllTheSame)
+{
+    plugin.initialize();
+    Ids const whole = nodeTypes();
+    plugin.unload();
+
+    host.initializeStatus = 3;
+    IC::Error const error = plugin.initialize();
+    EXPECT_EQ(static_cast<std::string>(error), "status 3, not ready");
+    EXPECT_EQ(static_cast<std::string>(plugin.status()), "status 3, not ready");
+    EXPECT_EQ(nodeTypes(), whole);
+    EXPECT_EQ(Ids(whole.begin(), whole.begin() + 4), (Ids{39, 59, 40, 17}));
+}
+
+TEST_F(Lifecycle, TheTreeStandsWhateverTheSettersAnswer)
+{
+    // Told from the clock, the time of the last boot may differ by a second from start to start.
+    libc::hooks().time = [] { return std::time_t{1273659825}; };
+    libc::hooks().sysinfo = [](struct sysinfo* figures) {
+        *figures = {};
+        figures->uptime = 1000;
+        return 0;
+    };
+    commands.answers = {{"lsmod", "exnet 24576 0\nexfs 1 0\n"},
+                        {"modinfo exnet", ""},
+                        {"modinfo exfs", ""},
+                        {"wc -l /var/log/messages", "3 /var/log/messages\n"}};
+    plugin.initialize();
+    ASSERT_EQ(plugin.nodes(IC::nodeType::driver).size(), 2U);
+    Ids const whole = nodeTypes();
+    Lines const said = host.messages();
+    plugin.unload();
+
+    host.logCalls.clear();
+    host.setterStatus = 1;
+    EXPECT_EQ(plugin.initialize().getStatus(), 0);
+    EXPECT_EQ(nodeTypes(), whole);
+    EXPECT_EQ(host.messages(), said);
+    libc::hooks().time = nullptr;
+    libc::hooks().sysinfo = nullptr;
+}
+
+TEST_F(Lifecycle, PassesOnThatMemoryIsExhaustedWhateverNodeWasToBeBuilt)
+{
+    commands.answers = {{"lsmod", "exnet 24576 0\n"},
+                        {"modinfo exnet", ""},
+                        {"wc -l /var/log/messages", "1 /var/log/messages\n"}};
+    std::size_t built = 0;
+    host.onNode = [&built] { ++built; };
+    plugin.initialize();
+    std::size_t const whole = built;
+    ASSERT_GE(whole, 9U); // one of each kind at least
+    plugin.unload();
+    for (std::size_t last = 1; last <= whole; ++last) {
+        built = 0;
+        host.onNode = [&built, last] {
+            if (++built == last)
+                throw std::bad_alloc();
+        };
+        EXPECT_THROW(plugin.initialize(), std::bad_alloc) << last;
+        EXPECT_EQ(built, last);
+        plugin.unload();
+    }
+}
+
+TEST_F(Lifecycle, TheTreeStandsWhateverALockAnswers)
+{
+    plugin.initialize();
+    Ids const whole = nodeTypes();
+    plugin.unload();
+    host.events.clear();
+    host.lockStatus = 1;
+    plugin.initialize();
+    EXPECT_EQ(nodeTypes(), whole);
+    // Around the users, around the groups, and around the listing of the groups.
+    EXPECT_EQ(std::count(host.events.begin(), host.events.end(), "lock(4294967295)"), 3);
+    EXPECT_EQ(std::count(host.events.begin(), host.events.end(), "unlock()"), 3);
+}
+
+TEST_F(Lifecycle, NodesOfTheStartAreNotPublishedOneByOne)
+{
+    commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
+    plugin.initialize();
+    for (unsigned int const type :
+         {IC::nodeType::user, IC::nodeType::group, IC::nodeType::logEntry})
+        EXPECT_FALSE(plugin.nodes(type).empty());
+    for (std::string const& event : host.events)
+        EXPECT_EQ(event.find("addNewNode"), std::string::npos) << event;
+}
+
+class Publishing : public Lifecycle
+{
+protected:
+    Publishing()
+    {
+        plugin.initialize();
+        host.events.clear();
+        host.logCalls.clear();
+    }
+
+    /** A member function of IC::OsSwMI, called as such. */
+    void publish(IC::Node* node)
+    {
+        auto* const publishNode = reinterpret_cast<void (*)(IC::OsSwMI*, IC::Node*)>(
+            plugin.symbol("_ZN2IC6OsSwMI11publishNodeEPNS_4NodeE"));
+        publishNode(&mi(), node);
+    }
+};
+
+TEST_F(Publishing, HandsTheNodeToTheFramework)
+{
+    publish(Insides::rootNode(mi()));
+    EXPECT_EQ(host.events, (Lines{"log: publishNode: entry", "addNewNode(ROOT Node)",
+                                  "log: publishNode: exit"}));
+}
+
+TEST_F(Publishing, LogsARefusalOnceAsAnErrorAndLeavesTheNodeWhereItIs)
+{
+    host.addNewNodeStatus = 1;
+    std::size_t const nodes = plugin.nodes().size();
+    publish(Insides::rootNode(mi()));
+    EXPECT_EQ(host.messages(), (Lines{"publishNode: entry", "addNewNode error = status 1, refused",
+                                      "publishNode: exit"}));
+    EXPECT_EQ(host.messages(6000), Lines{"addNewNode error = status 1, refused"});
+    EXPECT_EQ(host.calls(), Lines{"addNewNode(ROOT Node)"});
+    EXPECT_EQ(plugin.nodes().size(), nodes);
+}
+
+TEST_F(Publishing, TakesAnyStatusButZeroForARefusal)
+{
+    host.addNewNodeStatus = 255;
+    publish(Insides::rootNode(mi()));
+    EXPECT_EQ(host.messages(6000), Lines{"addNewNode error = status 255, refused"});
+}
+
+struct Rebuild {
+    char const* name;
+    char const* builder; // of IC::OsSwMI, taking the refresh flag
+    unsigned int type;
+};
+
+void PrintTo(Rebuild const& rebuild, std::ostream* out)
+{
+    *out << rebuild.name;
+}
+
+class Rebuilding : public Publishing, public testing::WithParamInterface<Rebuild>
+{
+};
+
+TEST_P(Rebuilding, LogsEachRefusalOnceAndGoesOn)
+{
+    commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
+    host.addNewNodeStatus = 1;
+    rebuild(GetParam().builder);
+    std::size_t const nodes = plugin.nodes(GetParam().type).size();
+    ASSERT_GE(nodes, 3U);
+    Lines refusals;
+    for (std::string const& message : host.messages(6000))
+        if (message.rfind("addNewNode error = ", 0) == 0)
+            refusals.push_back(message);
+    EXPECT_EQ(refusals, Lines(nodes, "addNewNode error = status 1, refused"));
+    Lines const all = host.messages();
+    EXPECT_EQ(std::count(all.begin(), all.end(), "publishNode: exit"),
+              static_cast<std::ptrdiff_t>(nodes));
+}
+
+class LockedBuild : public Loaded, public testing::WithParamInterface<char const*>
+{
+};
+
+TEST_P(LockedBuild, HoldsTheLockFromItsBeginningToItsEndWaitingWithoutLimit)
+{
+    plugin.initialize();
+    std::string const builder = GetParam();
+    auto const& all = host.events;
+    auto const entry = std::find(all.begin(), all.end(), "log: " + builder + ": entry");
+    auto const exit = std::find(all.begin(), all.end(), "log: " + builder + ": exit");
+    ASSERT_GT(exit - entry, 2);
+    EXPECT_EQ(entry[1], "lock(4294967295)");
+    EXPECT_EQ(exit[-1], "unlock()");
+}
+
+INSTANTIATE_TEST_SUITE_P(All, LockedBuild, testing::Values("createUserNodes", "createGroupNodes"),
+                         [](auto const& builder) { return std::string(builder.param); });
+
+INSTANTIATE_TEST_SUITE_P(
+    All, Rebuilding,
+    testing::Values(Rebuild{"Users", "_ZN2IC6OsSwMI15createUserNodesEb", IC::nodeType::user},
+                    Rebuild{"Groups", "_ZN2IC6OsSwMI16createGroupNodesEb", IC::nodeType::group},
+                    Rebuild{"LogEntries", "_ZN2IC6OsSwMI19createLogEntryNodesEb",
+                            IC::nodeType::logEntry}),
+    [](auto const& rebuild) { return std::string(rebuild.param.name); });
+
+TEST_F(Lifecycle, UnloadLetsTheFrameworkGoFirstAndThenFreesTheIdList)
+{
+    plugin.initialize();
+    host.events.clear();
+    bool hadList = false;
+    host.onUnload = [this, &hadList] { hadList = Insides::nodeIds(mi()) != nullptr; };
+    plugin.unload();
+    EXPECT_EQ(host.events[0], "log: unload: entry");
+    EXPECT_EQ(host.events[1], "unload()");
+    EXPECT_EQ(host.events.back(), "log: unload: exit");
+    EXPECT_TRUE(hadList);
+    EXPECT_EQ(Insides::nodeIds(mi()), nullptr);
+}
+
+TEST_F(Lifecycle, UnloadDeletesNoNodeItself)
+{
+    plugin.initialize();
+    IC::MutableNode* const root = Insides::rootNode(mi());
+    auto kept = Insides::nodes(mi());
+    host.onUnload = [this] { Insides::nodes(mi()).clear(); }; // the framework keeps them
+    plugin.unload();
+    EXPECT_EQ(root->getDescription(), "ROOT Node");
+    for (IC::Node* node : kept)
+        delete node;
+}
+
+TEST_F(Lifecycle, UnloadWithoutInitializeOnlyCallsTheFrameworks)
+{
+    host.events.clear();
+    mi().unload();
+    EXPECT_EQ(host.events, (Lines{"log: unload: entry", "unload()", "log: unload: exit"}));
+}
+
+TEST_F(Lifecycle, CanBeginAgainAfterUnload)
+{
+    plugin.initialize(5);
+    plugin.unload();
+    plugin.initialize(5);
+    Ids const list = *Insides::nodeIds(mi());
+    EXPECT_EQ(Ids(list.begin(), list.begin() + 4), (Ids{5, 6, 5, 7}));
+}
+
+TEST_F(Lifecycle, EachMessageGoesToBothOfTheLoggersOperationsWithTheSameArguments)
+{
+    plugin.initialize();
+    plugin.unload();
+    auto const& calls = host.logCalls;
+    ASSERT_FALSE(calls.empty());
+    ASSERT_EQ(calls.size() % 2, 0U);
+    for (std::size_t at = 0; at < calls.size(); at += 2) {
+        LogCall const& log = calls[at];
+        LogCall const& trace = calls[at + 1];
+        EXPECT_EQ(log.operation, "log");
+        EXPECT_EQ(trace.operation, "trace");
+        EXPECT_EQ(log.function, trace.function);
+        EXPECT_EQ(log.file, trace.file);
+        EXPECT_EQ(log.line, trace.line);
+        EXPECT_GT(log.line, 0);
+        EXPECT_EQ(log.category, trace.category);
+        EXPECT_EQ(log.level, trace.level);
+        EXPECT_EQ(log.message, trace.message);
+        for (LogCall const& call : {log, trace}) {
+            EXPECT_TRUE(call.extraIsNull);
+            EXPECT_EQ(call.first, 0);
+            EXPECT_EQ(call.second, 0);
+        }
+    }
+}
+
+TEST_F(Lifecycle, TheFrameSpeaksUnderItsOwnCategoryAndFile)
+{
+    plugin.initialize();
+    plugin.unload();
+    std::size_t count = 0;
+    for (LogCall const& call : host.logCalls) {
+        if (frameMessages({call.message}).empty())
+            continue;
+        ++count;
+        EXPECT_EQ(call.function, call.message.substr(0, call.message.find(':')));
+        EXPECT_EQ(call.file, "OsSwMI");
+        EXPECT_EQ(call.category, "Veltrix.IC.MI.OsSwMI");
+        EXPECT_EQ(call.level, 3000);
+    }
+    // Entry and exit, each through both operations, of the builders, initialize and unload.
+    EXPECT_EQ(count, (builders.size() + 2) * 4);
+}
+
+TEST_F(Library, LeavesTheIdRangesOnTheHeapWhenItIsClosed)
+{
+    freshHost();
+    libc::FileRoot const files{MACHINES_DIR "/redhat"};
+    libc::FakeCommands const commands;
+    auto plugin = std::make_unique<Plugin>();
+    plugin->initialize();
+    auto const* const ranges =
+        *static_cast<unsigned int const* const*>(plugin->symbol("_ZN2NQ8minMaxId9pinstanceE"));
+    auto* const ask =
+        reinterpret_cast<void const* (*)()>(plugin->symbol("_ZN2NQ8minMaxId8InstanceEv"));
+    EXPECT_EQ(ask(), ranges);
+    Dl_info info{};
+    EXPECT_EQ(dladdr(ranges, &info), 0); // part of no loaded file
+    plugin.reset();
+    EXPECT_EQ(Ids(ranges, ranges + 4), (Ids{500, 500, 60000, 60000}));
+}
+
+TEST_F(Library, ReadsTheIdRangesAgainWhenItIsLoadedAgain)
+{
+    freshHost();
+    libc::FakeCommands const commands;
+    Ids lowest;
+    for (char const* machine : {MACHINES_DIR "/redhat", MACHINES_DIR "/suse"}) {
+        libc::FileRoot const files{machine};
+        Plugin plugin;
+        plugin.initialize();
+        lowest.push_back(
+            **static_cast<unsigned int const* const*>(plugin.symbol("_ZN2NQ8minMaxId9pinstanceE")));
+    }
+    EXPECT_EQ(lowest, (Ids{500, 1000}));
+}
+
+TEST_F(Lifecycle, TheFlagIsUpWhileAUserNodeIsSetUpAndDownWhileAnyNodeIsMade)
+{
+    bool const& flag = object<bool>("_ZN2IC6OSSWMI7MI_callE");
+    host.onNode = [&flag] { EXPECT_FALSE(flag); };
+    host.onSetStatus = [&flag](IC::MutableNode const& node) {
+        EXPECT_EQ(flag, node.getNodeType() == IC::nodeType::user) << node.getNodeType();
+    };
+    plugin.initialize();
+    EXPECT_GE(plugin.nodes(IC::nodeType::user).size(), 2U);
+}
+
+TEST_F(Lifecycle, ARebuildHoldsTheLockFromItsBeginningToItsEnd)
+{
+    plugin.initialize();
+    struct {
+        std::string name;
+        char const* symbol;
+        int unlocks; // the listing of groups has a lock of its own
+    } const rebuilds[] = {{"createUserNodes", "_ZN2IC6OsSwMI15createUserNodesEb", 1},
+                          {"createGroupNodes", "_ZN2IC6OsSwMI16createGroupNodesEb", 2}};
+    for (auto const& made : rebuilds) {
+        host.events.clear();
+        rebuild(made.symbol);
+        Lines const& all = host.events;
+        ASSERT_GT(all.size(), 4U);
+        EXPECT_EQ(all[0], "log: " + made.name + ": entry");
+        EXPECT_EQ(all[1], "lock(4294967295)");
+        EXPECT_EQ(all[all.size() - 2], "unlock()");
+        EXPECT_EQ(all.back(), "log: " + made.name + ": exit");
+        EXPECT_EQ(std::count(all.begin(), all.end(), "unlock()"), made.unlocks);
+    }
+}
+
+TEST_F(Lifecycle, HasTheCategoryOfEveryUnitBeforeAnythingIsAskedOfIt)
+{
+    std::pair<char const*, char const*> const units[] = {
+        {"_ZN2IC6OSSWMI12loggerOsSwMIB5cxx11E", ""},
+        {"_ZN2NQ15loggerMyProcessB5cxx11E", ".MyProcess"},
+        {"_ZN2NQ12loggerOsInfoB5cxx11E", ".OsInfo"},
+        {"_ZN2NQ9USER_INFO14loggerUserInfoB5cxx11E", ".UserInfo"},
+        {"_ZN2NQ15loggerGroupInfoB5cxx11E", ".GroupInfo"},
+        {"_ZN2NQ16loggerDriverInfoB5cxx11E", ".DriverInfo"},
+        {"_ZN2NQ13loggerLogInfoB5cxx11E", ".LogInfo"}};
+    for (auto const& [symbol, end] : units)
+        EXPECT_EQ(object<std::string>(symbol), std::string("Veltrix.IC.MI.OsSwMI") + end);
+}
+
+TEST_F(Lifecycle, LeavesTheDriversAloneWhenOtherNodesAreMadeAnew)
+{
+    commands.answers = {{"lsmod", "exnet 24576 0\n"},
+                        {"modinfo exnet", ""},
+                        {"wc -l /var/log/messages", "1 /var/log/messages\n"}};
+    plugin.initialize();
+    auto const drivers = plugin.nodes(IC::nodeType::driver);
+    ASSERT_EQ(drivers.size(), 1U);
+    unsigned int const id = drivers[0]->getNodeId();
+    commands.ran.clear();
+    host.events.clear();
+    plugin.node(IC::nodeType::operatingSystem).setProperty(75, {IC::Number(0U), true});
+    rebuild("_ZN2IC6OsSwMI19createLogEntryNodesEb");
+    EXPECT_EQ(plugin.nodes(IC::nodeType::driver), drivers);
+    EXPECT_EQ(drivers[0]->getNodeId(), id);
+    for (std::string const& event : host.events) // an address may be used again
+        EXPECT_EQ(event.find(", 44, "), std::string::npos) << event;
+    for (std::string const& command : commands.ran)
+        EXPECT_NE(command, "lsmod");
+}
+
+TEST_F(Publishing, OfLogEntriesTakesNoLock)
+{
+    commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
+    rebuild("_ZN2IC6OsSwMI19createLogEntryNodesEb");
+    EXPECT_EQ(plugin.nodes(IC::nodeType::logEntry).size(), 3U);
+    for (std::string const& event : host.events)
+        EXPECT_EQ(event.find("lock("), std::string::npos) << event;
+}
+
+TEST_F(Lifecycle, OpensNoFileButThoseOfTheSystemThatItIsToRead)
+{
+    std::set<std::string> opened;
+    libc::hooks().fopen = [&opened, below = libc::hooks().fopen](char const* path,
+                                                                 char const* mode) {
+        opened.insert(path);
+        return below(path, mode);
+    };
+    plugin.initialize();
+    std::set<std::string> const known = {
+        "/etc/login.defs",     "/etc/passwd",       "/etc/shadow",
+        "/etc/pam.d/login",    "/etc/release",      "/etc/vmware-release",
+        "/etc/redhat-release", "/etc/SuSE-release", "/etc/UnitedLinux-release"};
+    EXPECT_FALSE(opened.empty());
+    for (std::string const& path : opened)
+        EXPECT_EQ(known.count(path), 1U) << path;
+}
+
+TEST_F(Lifecycle, InitializeKeepsTheFrameworksAnswerFirstAndReturnsWhatIsKeptAtTheEnd)
+{
+    host.initializeStatus = 3;
+    Ids kept;
+    host.onNode = [this, &kept] {
+        kept.push_back(plugin.status().getStatus());
+        object<IC::Error>("_ZN2IC6OSSWMI5myerrE") = IC::Error(9, IC::Number(0U), "later");
+    };
+    EXPECT_EQ(plugin.initialize().getStatus(), 9);
+    ASSERT_FALSE(kept.empty());
+    EXPECT_EQ(kept.front(), 3U);
+}
+
+TEST_P(Rebuilding, SaysNothingOfADeletionThatFailsAndGoesOn)
+{
+    commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
+    rebuild(GetParam().builder);
+    Lines const errors = host.messages(6000);
+    std::size_t const nodes = plugin.nodes(GetParam().type).size();
+    ASSERT_GE(nodes, 3U);
+    host.logCalls.clear();
+    host.events.clear();
+    host.deleteNodeStatus = 1;
+    rebuild(GetParam().builder);
+    EXPECT_EQ(host.messages(6000), errors);
+    EXPECT_EQ(plugin.nodes(GetParam().type).size(), 2 * nodes); // the old ones stay
+    Lines const calls = host.calls();
+    EXPECT_EQ(std::count_if(calls.begin(), calls.end(),
+                            [](auto const& call) { return call.rfind("deleteNode(", 0) == 0; }),
+              static_cast<std::ptrdiff_t>(nodes)); // each asked for once
+}
+
+} // namespace

@@ -1,0 +1,38 @@
+#include "mihost/cli/change/PasswordHash.h"
+#include "tests/mihost/cli/Refusal.h"
+
+namespace
+{
+
+using mihost::escapedForShell;
+using mihost::fits;
+using mihost::hashOf;
+
+TEST(PasswordHash, FitsItsPasswordAndNoOther)
+{
+    std::string const hash = hashOf("geheim42");
+    EXPECT_TRUE(fits("geheim42", hash));
+    EXPECT_FALSE(fits("geheim43", hash));
+    EXPECT_FALSE(fits("geheim42", "geheim42")); // plain text is no hash
+    EXPECT_FALSE(fits("geheim42", ""));
+    EXPECT_FALSE(fits("geheim42", "!"));
+}
+
+TEST(PasswordHash, HasANewSaltEachTime)
+{
+    EXPECT_NE(hashOf("geheim42"), hashOf("geheim42"));
+}
+
+TEST(PasswordHash, IsRefusedForAPasswordThatLibcryptCannotHash)
+{
+    EXPECT_NE(refusal([] { hashOf(std::string(600, 'x')); }).find("libcrypt cannot hash this one"),
+              std::string::npos);
+}
+
+TEST(PasswordHash, IsEscapedCharacterByCharacter)
+{
+    EXPECT_EQ(escapedForShell("$y$j9T$a./B0"), "\\$y\\$j9T\\$a./B0");
+    EXPECT_EQ(escapedForShell("$6$rounds=9$*`\\;"), "\\$6\\$rounds\\=9\\$\\*\\`\\\\\\;");
+}
+
+} // namespace

@@ -1,0 +1,46 @@
+#ifndef TESTS_SYSDATA_METHODTEST_H
+#define TESTS_SYSDATA_METHODTEST_H
+
+#include "sysdata/osInfo_linux.h"
+#include "tests/support/FakeFiles.h"
+#include "tests/support/Recording.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+/** A machine with an empty /etc on which every command is only noted, and stays silent. */
+class MethodTest : public testing::Test
+{
+protected:
+    using Lines = std::vector<std::string>;
+    using Params = std::vector<NQ::ParamInfo>;
+
+    MethodTest()
+    {
+        commands_.otherwise = "";
+    }
+
+    /** Carries out a method-call text; true for success. */
+    static bool call(std::string const& text)
+    {
+        return NQ::OsInfo().setCreateUser(text);
+    }
+
+    static int execute(std::string const& method, Params const& params)
+    {
+        bool shadowing = false;
+        return NQ::OsInfo().executeMethod(method, params, shadowing);
+    }
+
+    static NQ::ParamInfo text(std::string const& name, std::string const& value)
+    {
+        return {name, "CMPI_string", value};
+    }
+
+    FakeFiles files_;
+    libc::FakeCommands commands_;
+};
+
+#endif

@@ -1,0 +1,199 @@
+// What the account tools print decides whether a method succeeded.
+
+#include "tests/sysdata/MethodTest.h"
+
+namespace
+{
+
+class Judging : public MethodTest
+{
+protected:
+    /** The status of one method whose main command prints this. */
+    int statusOf(std::string const& output)
+    {
+        commands_.answers["/usr/sbin/userdel jdoe 2>&1"] = output;
+        return execute("UserDel", {text("UserName", "jdoe")});
+    }
+
+    /** The status of UserAdd whose two commands print these. */
+    int statusOf(std::string const& useradd, std::string const& chage)
+    {
+        commands_.answers[useraddLine_] = useradd;
+        commands_.answers[chageLine_] = chage;
+        return execute("UserAdd", {text("UserName", "jdoe")});
+    }
+
+    std::string const useraddLine_ = "/usr/sbin/useradd jdoe 2>&1;echo rc=$? 2>&1";
+    std::string const chageLine_ = "/usr/bin/chage -E -1 jdoe 2>&1";
+};
+
+TEST_F(Judging, TakesSilenceForSuccess)
+{
+    EXPECT_EQ(statusOf(""), 0);
+}
+
+TEST_F(Judging, TakesAnyOutputForFailure)
+{
+    EXPECT_EQ(statusOf("userdel: user 'jdoe' does not exist\n"), 1);
+    EXPECT_EQ(statusOf("\n"), 1);
+    EXPECT_EQ(statusOf("x"), 1);
+    EXPECT_EQ(statusOf(std::string("\0", 1)), 1);
+}
+
+TEST_F(Judging, TakesFourKnownBeginningsForSuccess)
+{
+    EXPECT_EQ(statusOf("Aging information changed"), 0);
+    EXPECT_EQ(statusOf("Aging information changed.\n"), 0);
+    EXPECT_EQ(statusOf("Aging information not changed.\nand more\n"), 0);
+    EXPECT_EQ(statusOf("no crontab for jdoe\n"), 0);
+    EXPECT_EQ(statusOf("usermod: no changes\n"), 0);
+}
+
+TEST_F(Judging, KnowsThoseAtTheBeginningOnlyAndWhole)
+{
+    EXPECT_EQ(statusOf(" Aging information changed\n"), 1);
+    EXPECT_EQ(statusOf("userdel: no crontab for jdoe\n"), 1);
+    EXPECT_EQ(statusOf("Aging information change"), 1);
+    EXPECT_EQ(statusOf("no crontab fo"), 1);
+    EXPECT_EQ(statusOf("usermod: no change"), 1);
+    EXPECT_EQ(statusOf("aging information changed\n"), 1);
+}
+
+TEST_F(Judging, TakesTheEchoedCodeForNoMethodButUserAdd)
+{
+    EXPECT_EQ(statusOf("rc=0\n"), 1);
+}
+
+TEST_F(Judging, LogsTheOutput)
+{
+    Recording const log;
+    statusOf("userdel: user jdoe is currently used by process 4711\n");
+    EXPECT_TRUE(
+        log.has("outputBuffer: userdel: user jdoe is currently used by process 4711\n", 3000));
+}
+
+TEST_F(Judging, FailsWhereTheMainCommandCannotBeStarted)
+{
+    commands_.otherwise.reset();
+    Recording const log;
+    EXPECT_EQ(execute("UserDel", {text("UserName", "jdoe")}), 1);
+    EXPECT_EQ(log.texts(6000), Lines{"Cannot open process: /usr/sbin/userdel"});
+}
+
+TEST_F(Judging, TakesChageOnItsOwnForSuccessAfterUserSetAttrib)
+{
+    std::string const line = "/usr/bin/chage jdoe -m 3 -E -1 2>&1";
+    commands_.answers[line] = "Aging information changed.\n";
+    EXPECT_TRUE(call("UserSetAttrib,UserName:CMPI_string:jdoe,daysMustKeepPassword:CMPI_uint32:3"));
+    EXPECT_EQ(commands_.ran, Lines{line});
+}
+
+TEST_F(Judging, GoesOnToTheAgingOfANewUserWhereUseraddSaysThatItsCodeIs0)
+{
+    EXPECT_EQ(statusOf("rc=0\n", ""), 0);
+    EXPECT_EQ(commands_.ran, (Lines{useraddLine_, chageLine_}));
+}
+
+TEST_F(Judging, AcceptsWarningsOfUseraddAboveItsCode)
+{
+    EXPECT_EQ(statusOf("useradd: warning: the home directory already exists.\nrc=0\n", ""), 0);
+}
+
+TEST_F(Judging, StopsWhereUseraddFails)
+{
+    EXPECT_EQ(statusOf("useradd: user 'jdoe' already exists\nrc=9\n", ""), 1);
+    EXPECT_EQ(commands_.ran, Lines{useraddLine_});
+}
+
+TEST_F(Judging, TakesWhatChageSaysOfANewUserForTheResult)
+{
+    EXPECT_EQ(statusOf("rc=0\n", "chage: invalid date\n"), 1);
+    EXPECT_EQ(statusOf("rc=0\n", "Aging information changed\n"), 0);
+    EXPECT_EQ(statusOf("rc=0\n", "Aging information not changed\n"), 0);
+    EXPECT_EQ(statusOf("rc=0\n", "no crontab for jdoe\n"), 1);
+    EXPECT_EQ(statusOf("rc=0\n", "usermod: no changes\n"), 1);
+    EXPECT_EQ(statusOf("rc=0\n", "rc=0\n"), 1);
+}
+
+TEST_F(Judging, FailsWhereTheAgingOfANewUserCannotBeStarted)
+{
+    commands_.otherwise.reset();
+    commands_.answers[useraddLine_] = "Aging information changed\nrc=0\n";
+    EXPECT_EQ(execute("UserAdd", {text("UserName", "jdoe")}), 1);
+    EXPECT_EQ(commands_.ran, (Lines{useraddLine_, chageLine_}));
+}
+
+TEST_F(Judging, LogsTheOutputOfBothCommandsOfUserAdd)
+{
+    Recording const log;
+    statusOf("rc=0\n", "chage: invalid date\n");
+    EXPECT_EQ(log.remarks(),
+              (Lines{"outputBuffer: rc=0\n", "outputBuffer: chage: invalid date\n"}));
+}
+
+class SettingAPassword : public Judging
+{
+protected:
+    std::string const usermodLine_ = "/usr/sbin/usermod -p secret jdoe 2>&1";
+    std::string const passwdLine_ = "echo secret | /usr/bin/passwd jdoe --stdin 2>&1";
+
+    int setPassword()
+    {
+        return execute("UserSetPassword", {text("UserName", "jdoe"), text("Password", "secret")});
+    }
+};
+
+TEST_F(SettingAPassword, DoesNotJudgeWhatPasswdSays)
+{
+    commands_.answers[passwdLine_] = "passwd: unrecognized option '--stdin'\n";
+    EXPECT_EQ(setPassword(), 0);
+    EXPECT_EQ(commands_.ran, (Lines{usermodLine_, passwdLine_}));
+}
+
+TEST_F(SettingAPassword, StopsWhereTheMainCommandFails)
+{
+    commands_.answers[usermodLine_] = "usermod: user 'jdoe' does not exist\n";
+    EXPECT_EQ(setPassword(), 1);
+    EXPECT_EQ(commands_.ran, Lines{usermodLine_});
+}
+
+TEST_F(SettingAPassword, GoesOnWhereTheMainCommandFoundNothingToChange)
+{
+    commands_.answers[usermodLine_] = "usermod: no changes\n";
+    EXPECT_EQ(setPassword(), 0);
+    EXPECT_EQ(commands_.ran, (Lines{usermodLine_, passwdLine_}));
+}
+
+TEST_F(SettingAPassword, ComesBetweenTheTwoCommandsOfUserAdd)
+{
+    std::string const useraddLine = "/usr/sbin/useradd -p secret jdoe 2>&1;echo rc=$? 2>&1";
+    commands_.answers[useraddLine] = "rc=0\n";
+    EXPECT_EQ(execute("UserAdd", {text("Password", "secret"), text("UserName", "jdoe")}), 0);
+    EXPECT_EQ(commands_.ran, (Lines{useraddLine, passwdLine_, chageLine_}));
+}
+
+TEST_F(SettingAPassword, IsDoneForAnyMethodThatBringsOne)
+{
+    EXPECT_EQ(execute("UserSetFullName", {text("UserName", "jdoe"), text("FullName", "J"),
+                                          text("Password", "secret")}),
+              0);
+    EXPECT_EQ(commands_.ran, (Lines{"/usr/sbin/usermod -c J -p secret jdoe 2>&1", passwdLine_}));
+}
+
+TEST_F(SettingAPassword, NeverTouchesTheCallersOwnAccountForWantOfAUserName)
+{
+    Recording const log;
+    EXPECT_EQ(execute("LocalGroupAdd", {text("GroupName", "g"), text("Password", "secret")}), 0);
+    EXPECT_EQ(commands_.ran, Lines{"/usr/sbin/groupadd g -p secret 2>&1"});
+    EXPECT_EQ(log.texts(6000), Lines{"No user name for the password"});
+}
+
+TEST_F(Judging, OfANewUserTakesTheSameBeginningsAndTheCodeAnywhere)
+{
+    EXPECT_EQ(statusOf("no crontab for jdoe\nrc=9\n", ""), 0);
+    EXPECT_EQ(statusOf("usermod: no changes\nrc=9\n", ""), 0);
+    EXPECT_EQ(statusOf("useradd: src=0\nrc=9\n", ""), 0);
+    EXPECT_EQ(statusOf("rc=0\n", "chage: Aging information changed\n"), 1);
+}
+
+} // namespace

@@ -1,0 +1,273 @@
+// Adding members to groups and taking them out again.
+
+#include "tests/sysdata/MethodTest.h"
+
+namespace
+{
+
+class GroupMemberChanges : public MethodTest
+{
+protected:
+    /** Lets id print this about jdoe. */
+    void identity(std::string const& output)
+    {
+        commands_.answers[idLine_] = output;
+        commands_.ran.clear();
+    }
+
+    int add(std::string const& group)
+    {
+        return change("LocalGroupAddUser", group);
+    }
+
+    int remove(std::string const& group)
+    {
+        return change("LocalGroupDelUser", group);
+    }
+
+    /** The line that sets this list of groups, after the one that asks for the present ones. */
+    Lines linesThatSet(std::string const& groups) const
+    {
+        return {idLine_, "/usr/sbin/usermod -G " + groups + " \"jdoe\" 2>&1"};
+    }
+
+    std::string const idLine_ = "/usr/bin/id \"jdoe\" 2>&1";
+
+private:
+    static int change(char const* method, std::string const& group)
+    {
+        return execute(method, {text("LocalGroupName", group), text("DomainAndMember", "jdoe")});
+    }
+};
+
+std::string const identityOfJdoe =
+    "uid=1001(jdoe) gid=1001(jdoe) groups=1001(jdoe),27(sudo),100(users)\n";
+
+TEST_F(GroupMemberChanges, AreAddedBehindThePrimaryAndTheQuotedPresentGroups)
+{
+    identity(identityOfJdoe);
+    EXPECT_EQ(add("staff"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\""));
+}
+
+TEST_F(GroupMemberChanges, AreRemovedByLeavingTheGroupOut)
+{
+    identity(identityOfJdoe);
+    EXPECT_EQ(remove("sudo"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"users\""));
+}
+
+TEST_F(GroupMemberChanges, KeepThePrimaryGroupAloneWhereTheOnlyOtherOneGoes)
+{
+    identity("uid=1001(jdoe) gid=100(users) groups=27(sudo)\n");
+    EXPECT_EQ(remove("sudo"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("users"));
+}
+
+TEST_F(GroupMemberChanges, StayInGroupsWhoseNamesOnlyBeginAlike)
+{
+    identity("uid=1001(jdoe) gid=100(users) groups=100(users),27(sudo),28(sudoers),29(su)\n");
+    EXPECT_EQ(remove("sudo"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("users,\"users\",\"sudoers\",\"su\""));
+}
+
+TEST_F(GroupMemberChanges, KeepThePrimaryGroupEvenWhereThatIsTheOneToLeave)
+{
+    identity(identityOfJdoe);
+    EXPECT_EQ(remove("jdoe"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"sudo\",\"users\""));
+}
+
+TEST_F(GroupMemberChanges, LoseAPrimaryGroupThatComparesAsExactlyOneMore)
+{
+    // The quoted group begins with a double quote, and "#" is the character after that.
+    identity("uid=1001(jdoe) gid=1001(#jdoe) groups=27(sudo),100(users)\n");
+    EXPECT_EQ(remove("sudo"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("\"users\""));
+    identity("uid=1001(jdoe) gid=1001($jdoe) groups=27(sudo),100(users)\n");
+    EXPECT_EQ(remove("sudo"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("$jdoe,\"users\""));
+    identity("uid=1001(jdoe) gid=1001(!jdoe) groups=27(sudo),100(users)\n");
+    EXPECT_EQ(remove("sudo"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("!jdoe,\"users\""));
+    identity("uid=1001(jdoe) gid=1001(\"t) groups=27(sudo),100(users)\n");
+    EXPECT_EQ(remove("sudo"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("\"users\""));
+}
+
+TEST_F(GroupMemberChanges, KeepSuchAPrimaryGroupWhenAdded)
+{
+    identity("uid=1001(jdoe) gid=1001(#jdoe) groups=27(sudo)\n");
+    EXPECT_EQ(add("users"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("#jdoe,\"sudo\",\"users\""));
+}
+
+TEST_F(GroupMemberChanges, AreReadBehindTheNextEqualsSignWhereIdSpeaksAnotherLanguage)
+{
+    identity("uid=1001(jdoe) gid=100(users) Gruppen=100(users),27(sudo)\n");
+    EXPECT_EQ(add("staff"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("users,\"users\",\"sudo\",\"staff\""));
+}
+
+TEST_F(GroupMemberChanges, MayBeInNoGroupButThePrimaryOne)
+{
+    identity("uid=1001(jdoe) gid=100(users)\n");
+    EXPECT_EQ(add("staff"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("users,\"staff\""));
+}
+
+TEST_F(GroupMemberChanges, AreReadBehindTheWordGroupsWhereThereIsOne)
+{
+    identity("uid=1001(jdoe) gid=100(users) egid=5(tty) groups=27(sudo)\n");
+    EXPECT_EQ(add("staff"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("users,\"sudo\",\"staff\""));
+}
+
+TEST_F(GroupMemberChanges, MayHaveAPrimaryGroupWithoutAName)
+{
+    identity("uid=1001(jdoe) gid=5000\n");
+    EXPECT_EQ(add("staff"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("\"staff\""));
+    identity("uid=1001(jdoe) gid=5000 groups=5000,27(sudo),100(users)\n");
+    EXPECT_EQ(remove("sudo"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("\"users\""));
+}
+
+TEST_F(GroupMemberChanges, CannotBeRemovedFromTheirOnlyGroupWithAName)
+{
+    // The empty list ends the arguments before the member, and usermod complains.
+    identity("uid=1001(jdoe) gid=5000 groups=5000,27(sudo)\n");
+    std::string const line = "/usr/sbin/usermod -G 2>&1";
+    commands_.answers[line] = "usermod: option requires an argument -- 'G'\n";
+    EXPECT_EQ(remove("sudo"), 1);
+    EXPECT_EQ(commands_.ran, (Lines{idLine_, line}));
+}
+
+TEST_F(GroupMemberChanges, AreNotTakenFromACutOffName)
+{
+    identity("uid=1001(jdoe) gid=100(us");
+    EXPECT_EQ(add("staff"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("\"staff\""));
+}
+
+TEST_F(GroupMemberChanges, MayHaveNamesThatHoldTheWordsLookedFor)
+{
+    commands_.answers["/usr/bin/id \"groupsgid\" 2>&1"] =
+        "uid=1001(groupsgid) gid=1002(groups) groups=1002(groups),27(gid=)\n";
+    EXPECT_EQ(execute("LocalGroupAddUser",
+                      {text("LocalGroupName", "staff"), text("DomainAndMember", "groupsgid")}),
+              0);
+    EXPECT_EQ(commands_.ran.back(), "/usr/sbin/usermod -G groups,\"groups\",\"gid=\",\"staff\""
+                                    " \"groupsgid\" 2>&1");
+}
+
+TEST_F(GroupMemberChanges, AreLeftAloneWhereIdKnowsNothing)
+{
+    for (char const* output : {"", "id: jdoe: No such user\n", "uid=1(jdoe)\n",
+                               "id: gid: No such user\n", "id: 'jdoe': no such user\n"}) {
+        identity(output);
+        EXPECT_EQ(add("staff"), 1);
+        EXPECT_EQ(commands_.ran, Lines{idLine_});
+    }
+}
+
+TEST_F(GroupMemberChanges, AreLeftAloneWhereIdCannotBeStarted)
+{
+    commands_.otherwise.reset();
+    EXPECT_EQ(add("staff"), 1);
+    EXPECT_EQ(commands_.ran, Lines{idLine_});
+}
+
+TEST_F(GroupMemberChanges, FailWhereUsermodSaysAnything)
+{
+    identity(identityOfJdoe);
+    commands_.answers[linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\"").at(1)] =
+        "usermod: group 'staff' does not exist\n";
+    EXPECT_EQ(add("staff"), 1);
+}
+
+TEST_F(GroupMemberChanges, SucceedWhereItOnlySaysThatTheGroupIsThePrimaryOne)
+{
+    identity(identityOfJdoe);
+    commands_.answers[linesThatSet("jdoe,\"sudo\",\"users\"").at(1)] =
+        "usermod: `jdoe' is primary group name.\n";
+    EXPECT_EQ(remove("jdoe"), 0);
+}
+
+TEST_F(GroupMemberChanges, FailWhereUsermodCannotBeStarted)
+{
+    identity(identityOfJdoe);
+    commands_.otherwise.reset();
+    EXPECT_EQ(add("staff"), 1);
+    EXPECT_EQ(commands_.ran.size(), 2U);
+}
+
+TEST_F(GroupMemberChanges, TakeTheirNamesFromTextParametersOnly)
+{
+    identity(identityOfJdoe);
+    EXPECT_EQ(execute("LocalGroupAddUser", {text("DomainAndMember", "jdoe"),
+                                            {"LocalGroupName", "CMPI_uint32", "1"},
+                                            text("LocalGroupName", "my staff"),
+                                            {"DomainAndMember", "CMPI_dateTime", "2010-5-7"},
+                                            text("GroupName", "other")}),
+              0);
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"my staff\""));
+}
+
+TEST_F(GroupMemberChanges, AreQuotedAlsoWhereNoneIsGiven)
+{
+    EXPECT_EQ(execute("LocalGroupAddUser", {}), 1);
+    EXPECT_EQ(commands_.ran, Lines{"/usr/bin/id \"\" 2>&1"});
+}
+
+TEST_F(GroupMemberChanges, AreRemovedByAnyMethodButTheOneThatAdds)
+{
+    identity(identityOfJdoe);
+    NQ::OsInfo info;
+    EXPECT_FALSE(info.groupMemberChanges(
+        "anything", {text("LocalGroupName", "sudo"), text("DomainAndMember", "jdoe")}));
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"users\""));
+}
+
+TEST_F(GroupMemberChanges, AreChangedThroughAMethodCallToo)
+{
+    identity(identityOfJdoe);
+    EXPECT_TRUE(call("LocalGroupDelUser,LocalGroupName:CMPI_string:users,"
+                     "DomainAndMember:CMPI_string:jdoe"));
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\""));
+}
+
+TEST_F(GroupMemberChanges, LeaveALogOfWhatTheToolsSaid)
+{
+    identity(identityOfJdoe);
+    Recording const log;
+    add("staff");
+    EXPECT_EQ(
+        log.texts(),
+        (Lines{"OsNode::executeMethod: entry", "groupMemberChanges: entry", "executeCommand: entry",
+               "executeCommand: exit", "outputBuffer: " + identityOfJdoe, "executeCommand: entry",
+               "executeCommand: exit", "outputBuffer: ", "groupMemberChanges: exit",
+               "OsNode::executeMethod: exit"}));
+}
+
+TEST_F(GroupMemberChanges, AreListedTwiceWhereTheyAreAddedAgain)
+{
+    identity(identityOfJdoe);
+    EXPECT_EQ(add("sudo"), 0);
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"sudo\""));
+    identity(identityOfJdoe);
+    EXPECT_EQ(remove("staff"), 0); // not a member
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\""));
+}
+
+TEST_F(GroupMemberChanges, AreMadeWhateverTypesOtherParametersHave)
+{
+    identity(identityOfJdoe);
+    EXPECT_EQ(execute("LocalGroupAddUser", {text("LocalGroupName", "staff"),
+                                            {"Colour", "CMPI_boolean", "red"},
+                                            text("DomainAndMember", "jdoe")}),
+              0);
+    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\""));
+}
+
+} // namespace

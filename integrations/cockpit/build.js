@@ -1,8 +1,9 @@
 // Builds the page into the directory that is given, or into dist/.
-import { copyFile, mkdir, readdir, rm, writeFile } from "node:fs/promises";
+import { copyFile, mkdir, readFile, readdir, rm, writeFile } from "node:fs/promises";
 import { dirname, join, resolve } from "node:path";
 import { fileURLToPath } from "node:url";
 import { build } from "esbuild";
+import { compile } from "./translation.js";
 
 const here = dirname(fileURLToPath(import.meta.url));
 const out = resolve(process.argv[2] ?? join(here, "dist"));
@@ -24,5 +25,8 @@ await build({
 });
 await copyFile(join(here, "src/index.html"), join(out, "index.html"));
 await copyFile(join(here, "manifest.json"), join(out, "manifest.json"));
-// What a browser gets whose language there is no translation for.
+// Browsers whose language there is no translation for get an empty one.
 await writeFile(join(out, "po.js"), "");
+for (const file of await readdir(join(here, "po")))
+    if (file.endsWith(".po"))
+        await writeFile(join(out, `po.${file.slice(0, -3)}.js`), compile(await readFile(join(here, "po", file), "utf8")));

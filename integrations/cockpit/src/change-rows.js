@@ -2,7 +2,7 @@
 
 /** The files that change: those that matter first, the account tools' backups apart. */
 export function sortChanges(changes) {
-    const isBackup = change => /^\/etc\/[^/]+-$/.test(change.file);
+    const isBackup = change => /^\/etc\/[^\/]+-$/.test(change.file);
     return {
         files: changes.filter(change => !isBackup(change)),
         backups: changes.filter(isBackup),

@@ -43,7 +43,9 @@ export class TreeView {
             el("section", { class: "mi-card mi-columns__side", "aria-label": _("Tree") },
                 el("div", { class: "mi-toolbar" },
                     el("span", { class: "pf-v6-c-form-control mi-grow" }, this.search),
-                    el("span", { class: "pf-v6-c-form-control mi-select" }, this.kind)),
+                    el("span", { class: "pf-v6-c-form-control mi-select" }, this.kind,
+                        el("span", { class: "pf-v6-c-form-control__utilities", "aria-hidden": "true" },
+                            el("span", { class: "pf-v6-c-form-control__toggle-icon" }, "▾")))),
                 this.message, this.list, this.found),
             this.detail.element);
     }

@@ -1,0 +1,46 @@
+import assert from "node:assert/strict";
+import { readFileSync, readdirSync } from "node:fs";
+import { test } from "node:test";
+import gettext from "gettext-parser";
+import { compile } from "../translation.js";
+
+const folder = new URL("../", import.meta.url);
+const header = "msgid \"\"\nmsgstr \"\"\n\"Language: de\\n\"\n\"Content-Type: text/plain; charset=UTF-8\\n\"\n\n";
+
+function located(script) {
+    let texts = null;
+    new Function("cockpit", script)({ locale: given => { texts = given; } });
+    return texts;
+}
+
+test("compile makes a script that hands the texts to Cockpit", () => {
+    const texts = located(compile(`${header}msgid "Apply"\nmsgstr "Übernehmen \\"jetzt\\""\n`));
+    assert.deepEqual(texts, {
+        "": { "language": "de", "language-direction": "ltr" },
+        "Apply": [null, "Übernehmen \"jetzt\""],
+    });
+});
+
+test("compile leaves out what is not translated, or only guessed", () => {
+    const texts = located(compile(`${header}msgid "Apply"\nmsgstr ""\n\n#, fuzzy\nmsgid "Halt"\nmsgstr "Halt!"\n`));
+    assert.deepEqual(Object.keys(texts), [""]);
+});
+
+test("compile refuses a translation into no language", () => {
+    assert.throws(() => compile("msgid \"Apply\"\nmsgstr \"x\"\n"), /language/);
+});
+
+test("the template has the texts of the sources, and no others", () => {
+    const wanted = new Set();
+    for (const name of readdirSync(new URL("src/", folder), { recursive: true }).map(String))
+        if (name.endsWith(".js")) {
+            const source = readFileSync(new URL(`src/${name}`, folder), "utf8");
+            for (const [, call] of source.matchAll(/\b_\(((?:"(?:[^"\\]|\\.)*"[\s+]*)+)\)/g))
+                wanted.add(JSON.parse(call.replace(/"\s*\+\s*"/g, "")));
+            assert.equal([...source.matchAll(/\b_\(/g)].length,
+                [...source.matchAll(/\b_\((?:"(?:[^"\\]|\\.)*"[\s+]*)+\)/g)].length, `${name}: a text that is computed`);
+        }
+    const template = gettext.po.parse(readFileSync(new URL("po/mihost.pot", folder), "utf8"));
+    const texts = new Set(Object.keys(template.translations[""]).filter(Boolean));
+    assert.deepEqual([...texts].sort(), [...wanted].sort(), "run 'npm run pot'");
+});

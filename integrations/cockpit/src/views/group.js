@@ -47,22 +47,24 @@ export class GroupPage {
             group["no-node"] && el("p", { class: "mi-note" },
                 format(_("This group is not in the tree: $0"), group["no-node"])),
             el("div", { class: "mi-facts" },
-                this.names(_("Primary group of"), group["primary-group-of"]),
+                this.names(_("Primary group of"), group["primary-group-of"].map(user => ({ user, account: true }))),
                 this.names(_("Other members"), group["other-members"], remove)));
     }
 
-    names(heading, users, action = () => null) {
+    /** Members by name; a group may list some that have no account. */
+    names(heading, members, action = () => null) {
         const names = el("ul", { class: "mi-names" });
-        const add = some => append(names, some.map(user =>
-            el("li", {}, button(user, () => this.go(["users", user]), { look: "link" }), action(user))));
-        add(users.slice(0, shownAtFirst));
-        const more = users.length > shownAtFirst &&
-            button(format(_("Show all $0"), users.length), () => {
+        const add = some => append(names, some.map(({ user, account }) => el("li", {},
+            account ? button(user, () => this.go(["users", user]), { look: "link" }) : user,
+            !account && el("span", { class: "mi-note" }, _("no such account")), action(user))));
+        add(members.slice(0, shownAtFirst));
+        const more = members.length > shownAtFirst &&
+            button(format(_("Show all $0"), members.length), () => {
                 more.remove();
-                add(users.slice(shownAtFirst));
+                add(members.slice(shownAtFirst));
             }, { look: "link" });
         return el("div", {},
             el("h3", { class: "pf-v6-c-title pf-m-md" }, heading),
-            users.length === 0 ? el("p", { class: "mi-note" }, _("none")) : [names, more]);
+            members.length === 0 ? el("p", { class: "mi-note" }, _("none")) : [names, more]);
     }
 }

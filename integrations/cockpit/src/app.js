@@ -33,7 +33,7 @@ export class App {
         document.documentElement.lang = cockpit.language ?? "en";
         this.state = new State();
         this.monitor = new Monitor();
-        this.notice = el("div", { id: "notice", "aria-live": "polite" });
+        this.notice = el("div", { id: "notice", "aria-live": "polite", tabindex: "-1" });
         this.views = new Map();
         this.panels = new Map(tabs.map(tab => [tab.name, el("div", {
             id: `panel-${tab.name}`, class: "mi-panel", role: "tabpanel", "aria-labelledby": `tab-${tab.name}`,
@@ -60,8 +60,10 @@ export class App {
                 this.state.clear("no-privilege");
             else
                 this.state.show("no-privilege");
-            if (this.tab) // what could not be read may be known now
-                this.show();
+            if (!this.tab)
+                return;
+            this.views.get("tree")?.forget(); // what could not be read may be known now
+            this.show();
         });
         mihost.watchSlow(slow => slow.size > 0
             ? this.state.show("slow", { action: { label: _("Stop waiting"), run: mihost.stopSlow } })
@@ -120,6 +122,7 @@ export class App {
             then();
             replace(this.notice, alert("success", answer.changed ? format(_("Done: $0"), title)
                 : format(_("Nothing changed: $0"), title), answer.warnings));
+            this.notice.focus(); // the button that opened the dialog may be gone
         }).open();
     }
 

@@ -3,15 +3,19 @@ import { el } from "./dom.js";
 
 const looks = { primary: "pf-m-primary", secondary: "pf-m-secondary", danger: "pf-m-danger", link: "pf-m-link pf-m-inline" };
 
-/** PatternFly's button. One that changes the machine is off while the page has no privilege for that. */
-export function button(label, run, { look = "secondary", changes = false, id = null, name = null } = {}) {
+/**
+ * PatternFly's button. One that changes the machine is off while the page has no privilege for that;
+ * one that submits the form of that id runs nothing itself.
+ */
+export function button(label, run, { look = "secondary", changes = false, id = null, name = null, submits = null } = {}) {
     return el("button", {
         id,
-        type: "button",
+        type: submits ? "submit" : "button",
+        form: submits,
         class: `pf-v6-c-button ${looks[look]}`,
         "aria-label": name,
         "data-changes": changes,
         disabled: changes && !allowed(),
-        on: { click: run },
+        on: run ? { click: run } : {},
     }, label);
 }

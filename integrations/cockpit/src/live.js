@@ -9,10 +9,10 @@ onVisibility(visible => all.forEach(live => live.setVisible(visible)));
 export class Live {
     /**
      * Calls back whenever mihost is started, with each document that it prints, and with a failure, or
-     * null, when it ends although it was not stopped.
+     * null, when it ends although it was not stopped. A silent one may print nothing for long.
      */
-    constructor(words, { onBegin = () => {}, onDocument, onEnd }) {
-        Object.assign(this, { words, onBegin, onDocument, onEnd, run: null });
+    constructor(words, { silent = false, onBegin = () => {}, onDocument, onEnd }) {
+        Object.assign(this, { words, silent, onBegin, onDocument, onEnd, run: null });
         all.add(this);
         this.setVisible(isVisible());
     }
@@ -26,7 +26,8 @@ export class Live {
 
     begin() {
         this.onBegin();
-        const run = mihost.stream(this.words, document => run === this.run && this.onDocument(document));
+        const run = mihost.stream(this.words, document => run === this.run && this.onDocument(document),
+            { silent: this.silent });
         this.run = run;
         const ended = failure => {
             if (run !== this.run)

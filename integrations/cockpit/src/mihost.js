@@ -21,12 +21,13 @@ export function stopSlow() {
 
 /**
  * Starts mihost with these words. The answer is its output, messages and exit status, whatever that is;
- * it is a Failure if mihost could not be run or did not end by itself.
+ * it is a Failure if mihost could not be run or did not end by itself. A silent run may print nothing
+ * for long without being slow.
  */
-function start(words, { input = "", onOutput = null } = {}) {
+function start(words, { input = "", onOutput = null, silent = false } = {}) {
     const process = cockpit.spawn(["mihost", ...words], { superuser: "try", err: "message" });
     const run = { stop: () => process.close("cancelled") };
-    const timer = setTimeout(() => {
+    const timer = silent ? null : setTimeout(() => {
         slow.add(run);
         onSlowChanged(slow);
     }, slowAfter);
@@ -90,9 +91,23 @@ export function json(words, { accepted = [0] } = {}) {
 }
 
 /** A run that goes on; each line that mihost prints is a document. Its answer comes when it ends. */
-export function stream(words, onDocument) {
-    const run = start(["--json", ...words], { onOutput: lineSplitter(line => onDocument(JSON.parse(line))) });
-    return { stop: run.stop, answer: run.answer.then(answer => checked(answer, [0])) };
+export function stream(words, onDocument, { silent = false } = {}) {
+    let garbled = null;
+    const onLine = line => {
+        if (garbled)
+            return;
+        try {
+            onDocument(parsed(line, JSON.parse));
+        } catch (failure) {
+            garbled = failure;
+            run.stop();
+        }
+    };
+    const run = start(["--json", ...words], { onOutput: lineSplitter(onLine), silent });
+    return {
+        stop: run.stop,
+        answer: run.answer.then(answer => checked(answer, [0]), failure => Promise.reject(garbled ?? failure)),
+    };
 }
 
 /**

@@ -17,7 +17,7 @@ export class Preview {
      */
     constructor(task, { fixed = {}, values = {} } = {}, onDone) {
         Object.assign(this, { task, fixed, values, onDone, busy: false, name: null });
-        this.form = el("form", { on: { submit: event => this.submitted(event) } });
+        this.form = el("form", { id: "preview-form", novalidate: true, on: { submit: event => this.submitted(event) } });
         this.result = el("div", { class: "mi-result", "aria-live": "polite" });
         this.confirm = el("input", {
             id: "confirm-name", autocomplete: "off", autocapitalize: "none", spellcheck: "false",
@@ -26,7 +26,7 @@ export class Preview {
         this.confirmation = el("div", { class: "mi-confirm", hidden: true },
             el("label", { for: "confirm-name" }, task.danger?.label()),
             el("span", { class: "pf-v6-c-form-control" }, this.confirm));
-        this.run = button(_("What would happen?"), () => this.tryIt(), { id: "preview-run", look: "primary" });
+        this.run = button(_("What would happen?"), null, { id: "preview-run", look: "primary", submits: "preview-form" });
         this.apply = button(_("Apply"), () => this.doIt(), {
             id: "preview-apply", look: task.danger ? "danger" : "primary",
         });

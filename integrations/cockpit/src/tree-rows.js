@@ -33,11 +33,11 @@ export function visibleRows(roots, { expanded, search = "", kind = "" }) {
             .filter(({ node, below }) => below.length > 0 || matches(node));
     }
     function all(siblings) {
-        return siblings.map(node => ({ node, below: expanded.has(node.id) ? all(node.children) : [] }));
+        return siblings.map(node => ({ node, below: expanded.has(node.address) ? all(node.children) : [] }));
     }
     function flatten(branches, level) {
         branches.forEach(({ node, below }, i) => {
-            const open = filtering ? below.length > 0 : expanded.has(node.id);
+            const open = filtering ? below.length > 0 : expanded.has(node.address);
             const parent = filtering ? below.length > 0 : node.children.length > 0;
             result.push({ node, level, position: i + 1, siblings: branches.length, open: parent ? open : null });
             flatten(below, level + 1);

@@ -1,5 +1,5 @@
 import assert from "node:assert/strict";
-import { test } from "node:test";
+import { mock, test } from "node:test";
 import { last } from "./fake-cockpit.js";
 
 const mihost = await import("../src/mihost.js");
@@ -52,6 +52,15 @@ test("stream calls back with each line's document", async () => {
     await assert.rejects(answer, { kind: "killed" });
 });
 
+test("stream stops at a line that is no document", async () => {
+    const documents = [];
+    const { answer } = mihost.stream(["watch", "os", "x"], document => documents.push(document));
+    last().print("{\"a\":1}\nUsage: mihost\n{\"a\":2}\n");
+    assert.equal(last().closed, "cancelled");
+    assert.deepEqual(documents, [{ a: 1 }]);
+    await assert.rejects(answer, { kind: "garbled" });
+});
+
 test("change runs a preview in the sandbox and the change itself outside", () => {
     mihost.change(["user", "add", "--", "x"], { preview: true });
     assert.deepEqual(last().words, ["mihost", "--sandbox", "--json", "--yes", "user", "add", "--", "x"]);
@@ -79,15 +88,28 @@ test("change answers a failure with mihost's document", async () => {
     assert.deepEqual(await answer, { exit: 1, status: 1, error: "no", changes: [] });
 });
 
-test("a run that prints nothing for long is slow until it ends", async context => {
-    context.mock.timers?.enable({ apis: ["setTimeout"] });
-    if (!context.mock.timers)
-        return context.skip("this Node cannot mock timers");
+test("a run that prints nothing for long is slow until it ends", { skip: !mock.timers && "no mock timers" }, async () => {
+    mock.timers.enable({ apis: ["setTimeout"] });
     const counts = [];
     mihost.watchSlow(slow => counts.push(slow.size));
+    mihost.stream(["list", "log", "--follow"], () => {}, { silent: true });
     const { answer } = mihost.text(["tree"]);
-    context.mock.timers.tick(60000);
+    mock.timers.tick(60000);
     last().succeed("done");
     await answer;
     assert.deepEqual(counts, [1, 0]);
+    mock.timers.reset();
+});
+
+test("stopSlow stops slow runs and no others", { skip: !mock.timers && "no mock timers" }, async () => {
+    mock.timers.enable({ apis: ["setTimeout"] });
+    const slow = mihost.text(["tree"]);
+    const slowProcess = last();
+    mock.timers.tick(60000);
+    mihost.text(["--version"]);
+    mihost.stopSlow();
+    assert.equal(slowProcess.closed, "cancelled");
+    assert.equal(last().closed, null);
+    await assert.rejects(slow.answer, { kind: "cancelled" });
+    mock.timers.reset();
 });

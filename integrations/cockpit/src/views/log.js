@@ -41,12 +41,21 @@ export class LogView {
     show() {
         this.hide();
         replace(this.lines);
+        replace(this.none);
         replace(this.message);
         if (this.follow.checked)
             this.live = new Live(["list", "log", "--follow", "-n", atFirst], {
-                onBegin: () => replace(this.lines),
+                silent: true,
+                onBegin: () => {
+                    replace(this.lines);
+                    replace(this.none, _("Waiting for lines…"));
+                },
                 onDocument: line => this.add([line]),
-                onEnd: failure => failure && this.loader.failed(failure, () => this.show()),
+                onEnd: failure => {
+                    replace(this.none);
+                    if (failure)
+                        this.loader.failed(failure, () => this.show());
+                },
             });
         else
             this.loader.load(() => [mihost.json(["list", "log", "-n", atFirst])], nodes => {

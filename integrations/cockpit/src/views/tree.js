@@ -61,12 +61,13 @@ export class TreeView {
 
     hide() {
         this.loader.stop();
-        this.detail.hide();
+        this.forget();
     }
 
-    /** The tree is read again when it is shown next. */
+    /** All is read again when it is shown next. */
     forget() {
         this.stale = true;
+        this.detail.hide();
     }
 
     reload() {
@@ -77,7 +78,7 @@ export class TreeView {
             if (this.expanded.size === 0)
                 for (const node of this.tree.nodes.values())
                     if (["mi", "root", "computer", "os"].includes(node.kind))
-                        this.expanded.add(node.id);
+                        this.expanded.add(node.address);
             const kind = this.kind.value;
             replace(this.kind, el("option", { value: "" }, _("All kinds")),
                 kindsOf(this.tree.nodes).map(name => el("option", { value: name }, name)));
@@ -92,7 +93,7 @@ export class TreeView {
             expanded: this.expanded, search: this.search.value, kind: this.kind.value,
         });
         this.active = Math.max(0, this.rows.findIndex(row => row.node.address === this.address));
-        this.virtual.setCount(this.rows.length);
+        this.draw();
         const found = this.rows.length === 0 && this.tree.nodes.size > 0;
         replace(this.found, found ? _("No node matches.") : null);
     }
@@ -107,8 +108,16 @@ export class TreeView {
     activate(index) {
         this.active = Math.max(0, Math.min(index, this.rows.length - 1));
         this.virtual.scrollTo(this.active);
+        this.draw();
+    }
+
+    draw() {
         this.virtual.setCount(this.rows.length);
-        this.list.setAttribute("aria-activedescendant", `node-${this.rows[this.active]?.node.id}`);
+        const active = this.rows[this.active];
+        if (active)
+            this.list.setAttribute("aria-activedescendant", `node-${active.node.id}`);
+        else
+            this.list.removeAttribute("aria-activedescendant");
     }
 
     row(index) {
@@ -149,9 +158,9 @@ export class TreeView {
         if (!row || row.open === null)
             return;
         if (open)
-            this.expanded.add(row.node.id);
+            this.expanded.add(row.node.address);
         else
-            this.expanded.delete(row.node.id);
+            this.expanded.delete(row.node.address);
         this.filter();
         this.activate(index);
     }

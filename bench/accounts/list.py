@@ -1,5 +1,5 @@
-"""Lists what the plug-in's user and group nodes tell, with the modules pwd, spwd and grp, and prints
-how many milliseconds that took without the start of the interpreter."""
+"""Lists the data of the plug-in's user and group nodes with the modules pwd, spwd and grp, and prints
+the time in milliseconds without the start of the interpreter."""
 
 import time
 import warnings

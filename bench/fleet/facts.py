@@ -1,4 +1,4 @@
-"""facts.py [ROUNDS]: what the facts of three machines take with mi_info, and with Ansible's own modules.
+"""facts.py [ROUNDS]: the cost of the facts of three machines with mi_info, and with Ansible's own modules.
 
 The machines are copies of this one, each with an sshd on loopback and 100 accounts.
 """
@@ -23,7 +23,7 @@ done
 
 GETENT = [{'ansible.builtin.getent': {'database': name}} for name in ('passwd', 'shadow', 'group')]
 
-# What is run, on the machines of this pattern.
+# The plays, and the pattern of their machines.
 PLAYS = {
     '`ping`, to compare': ('all', [{'ansible.builtin.ping': {}}]),
     '`mi_info`': ('all', [task('mi_info', facts=True)]),

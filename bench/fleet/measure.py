@@ -1,4 +1,4 @@
-"""What both benchmarks of this directory share: rounds that alternate, and tables."""
+"""Shared by both benchmarks of this directory: alternating rounds, and tables."""
 
 import statistics
 

@@ -1,4 +1,4 @@
-"""scrapes.py [ROUNDS]: what a scrape of mihost takes in both ways, beside node_exporter's own collectors.
+"""scrapes.py [ROUNDS]: the cost of a scrape of mihost in both ways, compared with node_exporter's own collectors.
 
 Runs in a copy of this machine, which it starts.
 """

@@ -6,7 +6,7 @@ __metaclass__ = type
 
 
 def is_backup(path):
-    """The account tools keep the file before a change beside it."""
+    """The account tools keep a backup next to a changed file."""
     return path.startswith('/etc/') and path.endswith('-')
 
 

@@ -23,7 +23,7 @@ def values_of(node):
 
 
 def native(nodes):
-    """What the nodes say, without the nodes that say nothing about the machine."""
+    """The data of the nodes, without the nodes that have none."""
     result = {}
     for node in nodes:
         kind = node['kind']

@@ -1,4 +1,4 @@
-"""What a sandbox does not see: the machine's own file systems may be full or read-only."""
+"""Problems that a sandbox does not show: the machine's file systems may be full or read-only."""
 
 from __future__ import absolute_import, division, print_function
 
@@ -8,19 +8,19 @@ import os
 
 
 def nearest(path):
-    """The path, or what there is of it."""
+    """The path, or its longest existing part."""
     while not os.path.lexists(path):
         path = os.path.dirname(path)
     return path
 
 
 def room_needed(path):
-    """A tool writes a file as a new copy beside it; what is new takes a block."""
+    """A tool writes a new copy next to the file; a new file takes a block."""
     return max(os.lstat(path).st_size, 1) if os.path.isfile(path) else 1
 
 
 def obstacle(changes):
-    """Why the changes cannot be made on the machine itself; None if nothing is known."""
+    """Why the changes would fail on the machine itself; None if unknown."""
     taken = {}
     for change in changes:
         if change['change'] == 'removed':
@@ -33,7 +33,7 @@ def obstacle(changes):
         device = os.lstat(place).st_dev
         blocks = -(-room_needed(path) // system.f_frsize)
         taken[device] = taken.get(device, 0) + blocks
-        # A file system without a limit on inodes reports none at all.
+        # A file system without a limit on inodes reports 0.
         is_out_of_inodes = system.f_files > 0 and system.f_ffree == 0
         if taken[device] > system.f_bfree or is_out_of_inodes:
             return 'no space left for %s' % path

@@ -148,7 +148,7 @@ def to_make(wanted):
 
 
 def exists_elsewhere(name):
-    """Whether there is such a group although the tree does not show it."""
+    """Whether the group exists although the tree does not show it."""
     try:
         grp.getgrnam(name)
     except KeyError:

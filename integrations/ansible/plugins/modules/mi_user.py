@@ -164,7 +164,7 @@ def call(method, parameters, confirmed=False):
 
 
 def expiry_of(values):
-    """The day of the account's expiry as the option has it; None if it is unknown."""
+    """The day of the account's expiry in the form of the option; None if unknown."""
     if values['inactive_time'] is None:
         return None
     day = time.strftime('%Y-%m-%d', time.localtime(values['inactive_time']))
@@ -172,7 +172,7 @@ def expiry_of(values):
 
 
 def to_make(wanted):
-    """The commands that make an account."""
+    """The commands that create an account."""
     name = wanted['name']
     parameters = [('UserName', name)]
     parameters += [(row[2], wanted[row[0]]) for row in TEXTS + AGES if wanted[row[0]] is not None]
@@ -201,7 +201,7 @@ def to_age(wanted, values):
     ]
     if not parameters and wanted['expires'] in (None, expiry):
         return []
-    # The method erases an expiry that it is not given.
+    # Without a date the method erases the expiry.
     day = expiry if wanted['expires'] is None else wanted['expires']
     if day not in (None, NEVER):
         parameters.append(('passwordExpirationDate', day))
@@ -224,7 +224,7 @@ def to_adapt(wanted, values):
 
 
 def exists_elsewhere(name):
-    """Whether there is such an account although the tree does not show it."""
+    """Whether the account exists although the tree does not show it."""
     try:
         pwd.getpwnam(name)
     except KeyError:

@@ -11,21 +11,24 @@ const reasons = {
 };
 
 export class Form {
-    /** Fixed values are shown and cannot be changed; parameters are the meanings by parameter. */
-    constructor(task, { fixed, values, parameters, onInput }) {
+    /** Fixed values are shown and cannot be changed; others are where the fields start. */
+    constructor(task, { fixed, values, onInput }) {
+        this.task = task;
         this.fixed = fixed;
         this.inputs = new Map();
         this.faults = new Map();
+        this.meanings = new Map();
         this.element = el("div", { class: "pf-v6-c-form" }, task.fields.map(field => [
-            this.group(field, parameters?.get(field.parameter)?.meaning, fixed[field.name] ?? values[field.name], onInput),
+            this.group(field, fixed[field.name] ?? values[field.name], onInput),
             field.kind === "password" && this.group(
-                { ...field, name: `${field.name}-again`, label: () => _("Password again") }, null, "", onInput),
+                { ...field, name: `${field.name}-again`, label: () => _("Password again") }, "", onInput),
         ]));
     }
 
-    group({ name, label, kind, required }, meaning, value, onInput) {
+    group({ name, label, kind, required }, value, onInput) {
         const id = `field-${name}`;
         const fault = el("span", { class: "mi-fault", id: `${id}-fault` });
+        const meaning = el("span", { id: `${id}-help` });
         const input = el("input", {
             id, name,
             type: types[kind] ?? "text",
@@ -41,6 +44,7 @@ export class Form {
         });
         this.inputs.set(name, input);
         this.faults.set(name, fault);
+        this.meanings.set(name, meaning);
         return el("div", { class: "pf-v6-c-form__group" },
             el("div", { class: "pf-v6-c-form__group-label" },
                 el("label", { class: "pf-v6-c-form__label", for: id },
@@ -48,7 +52,13 @@ export class Form {
                     required && el("span", { class: "pf-v6-c-form__label-required", "aria-hidden": "true" }, " *"))),
             el("div", { class: "pf-v6-c-form__group-control" },
                 el("span", { class: `pf-v6-c-form-control${name in this.fixed ? " pf-m-readonly" : ""}` }, input),
-                el("div", { class: "mi-help" }, fault, el("span", { id: `${id}-help` }, meaning))));
+                el("div", { class: "mi-help" }, fault, meaning)));
+    }
+
+    /** Says of each field what mihost says of its parameter. */
+    explain(parameters) {
+        for (const { name, parameter } of this.task.fields)
+            replace(this.meanings.get(name), parameters.get(parameter)?.meaning);
     }
 
     values() {

@@ -16,8 +16,11 @@ export class Preview {
      * starts; onDone is called with the task's title after a change.
      */
     constructor(task, { fixed = {}, values = {} } = {}, onDone) {
-        Object.assign(this, { task, fixed, values, onDone, busy: false, name: null });
-        this.form = el("form", { id: "preview-form", novalidate: true, on: { submit: event => this.submitted(event) } });
+        Object.assign(this, { task, fixed, values, onDone, busy: false, machine: null, edits: 0 });
+        this.fields = new Form(task, { fixed, values, onInput: () => this.forget() });
+        this.meaning = el("p", { class: "mi-note" });
+        this.form = el("form", { id: "preview-form", novalidate: true, on: { submit: event => this.submitted(event) } },
+            this.meaning, this.fields.element);
         this.result = el("div", { class: "mi-result", "aria-live": "polite" });
         this.confirm = el("input", {
             id: "confirm-name", autocomplete: "off", autocapitalize: "none", spellcheck: "false",
@@ -46,33 +49,23 @@ export class Preview {
         this.update();
     }
 
-    /** The meanings of the fields and the machine's name come before the dialog is usable. */
-    async open() {
+    /** What the fields mean, and the machine's name, may come a moment later. */
+    open() {
         document.body.append(this.element);
         this.element.showModal();
-        replace(this.result, spinner());
-        try {
-            const { task } = this;
-            const [methods, machine] = await Promise.all([
-                task.method ? catalogue.methods() : null,
-                task.danger?.name === "machine"
-                    ? mihost.text(["-o", "value", "get", "computer", "computer-name"]).answer : null,
-            ]);
-            this.machine = machine?.trim();
-            this.fields = new Form(task, {
-                fixed: this.fixed,
-                values: this.values,
-                parameters: methods?.get(task.method)?.parameters,
-                onInput: () => this.forget(),
-            });
-            replace(this.form, methods && el("p", { class: "mi-note" }, methods.get(task.method)?.meaning),
-                this.fields.element);
-            replace(this.result);
-            this.update();
-            this.fields.focus();
-        } catch (failure) {
-            this.failed(failure);
-        }
+        this.fields.focus();
+        const { task } = this;
+        if (task.method)
+            catalogue.methods().then(methods => {
+                const { meaning, parameters } = methods.get(task.method);
+                replace(this.meaning, meaning);
+                this.fields.explain(parameters);
+            }, () => {}); // the preview meets the same trouble, and shows it
+        if (task.danger?.name === "machine")
+            mihost.text(["-o", "value", "get", "computer", "computer-name"]).answer.then(name => {
+                this.machine = name.trim();
+                this.update();
+            }, failure => this.failed(failure));
     }
 
     close() {
@@ -90,6 +83,7 @@ export class Preview {
 
     /** What was previewed is not what the form says any more. */
     forget() {
+        this.edits++;
         if (!this.previewed)
             return;
         this.previewed = null;
@@ -99,15 +93,16 @@ export class Preview {
 
     update() {
         const wanted = this.wantedName();
-        const confirmed = !wanted || this.confirm.value === wanted;
-        this.confirmation.hidden = !(wanted && this.previewed);
-        this.run.disabled = this.busy || !this.fields;
+        const confirmed = !this.task.danger || (wanted && this.confirm.value === wanted);
+        this.confirmation.hidden = !(this.task.danger && this.previewed);
+        this.run.disabled = this.busy;
         this.apply.disabled = this.busy || !this.previewed || !confirmed;
         this.cancel.disabled = Boolean(this.applying);
         this.run.classList.toggle("pf-m-primary", !this.previewed);
         this.run.classList.toggle("pf-m-secondary", Boolean(this.previewed));
     }
 
+    /** The name to type before a dangerous change; none while it is not known. */
     wantedName() {
         const { danger } = this.task;
         if (!danger)
@@ -116,7 +111,7 @@ export class Preview {
     }
 
     async tryIt() {
-        if (this.busy || !this.fields)
+        if (this.busy)
             return;
         const values = this.fields.values();
         const faults = faultsOf(this.task, values);
@@ -124,16 +119,21 @@ export class Preview {
         if (faults.length > 0)
             return;
         this.previewed = null;
+        const { edits } = this;
         const command = commandOf(this.task, values);
         const answer = await this.change(command, true);
         if (!answer)
             return;
+        if (edits !== this.edits) {
+            replace(this.result, alert("info", _("The form was changed meanwhile; ask again what would happen")));
+            return;
+        }
         replace(this.result, outcome(answer, { preview: true }));
         if (!answer.error)
             this.previewed = command;
         this.update();
         this.result.scrollIntoView({ block: "nearest" });
-        if (this.previewed && this.wantedName())
+        if (this.previewed && this.task.danger)
             this.confirm.focus();
         else if (this.previewed)
             this.apply.focus();

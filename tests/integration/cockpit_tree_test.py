@@ -22,7 +22,7 @@ class Tree(PageTest):
         self.browser.see('#tree', 'anna')
 
     def addresses(self):
-        return [each.get_attribute('data-address') for each in self.browser.find('#tree [role=treeitem]')]
+        return self.browser.attributes('#tree [role=treeitem]', 'data-address')
 
     def listed(self, *addresses):
         """Waits until exactly these nodes are listed."""

@@ -22,7 +22,7 @@ from support import environment
 
 try:
     from selenium import webdriver
-    from selenium.common.exceptions import StaleElementReferenceException
+    from selenium.common.exceptions import ElementClickInterceptedException, StaleElementReferenceException
     from selenium.webdriver.chrome.service import Service
     from selenium.webdriver.common.by import By
     from selenium.webdriver.common.keys import Keys
@@ -50,6 +50,8 @@ echo "$$ $*" >>{CALLS}
 cat /proc/[0-9]*/cmdline 2>/dev/null | tr '\\0' ' ' >>{PROCESSES}
 exec {environment.MIHOST} "$@"
 '''
+# Dies of a preview, and does the rest.
+DIES_IN_PREVIEW = RECORDER.replace('exec', '[ "$1" != --sandbox ] || kill -9 $$\nexec')
 
 CHROMIUM = (
     '--headless', '--no-sandbox', '--disable-gpu', '--disable-quic', '--no-first-run',
@@ -63,6 +65,12 @@ window.refused = [];
 document.addEventListener('securitypolicyviolation', event => {
     window.refused.push(event.violatedDirective + ' ' + event.blockedURI + ' ' + event.sample);
 });
+'''
+
+FIND_BUTTON = '''
+return [...document.querySelectorAll(arguments[0] + ' :is(button, a, [role=button], [role=tab])')]
+    .find(element => element.checkVisibility() && !element.disabled &&
+        (element.ariaLabel || element.innerText).trim() === arguments[1]);
 '''
 
 
@@ -128,10 +136,15 @@ def calls():
     return [line.partition(' ')[2] for line in read(CALLS).splitlines()]
 
 
-def kill_mihost(arguments):
-    """Kills the mihost that was called last with such arguments."""
+def running(arguments):
+    """The ids of those mihosts with such arguments that still run."""
     called = [line.split()[0] for line in read(CALLS).splitlines() if arguments in line]
-    os.kill(int(called[-1]), signal.SIGKILL)
+    return [int(process) for process in called if os.path.exists(f'/proc/{process}')]
+
+
+def kill_mihost(arguments):
+    """Kills the mihost with such arguments, once it runs."""
+    os.kill(until(lambda: running(arguments), f'no mihost {arguments}')[-1], signal.SIGKILL)
 
 
 def until(condition, what, seconds=30):
@@ -194,6 +207,7 @@ class Browser:
         self.driver = webdriver.Chrome(service=service, options=options)
         self.driver.execute_cdp_cmd('Page.addScriptToEvaluateOnNewDocument', {'source': WATCH_POLICY})
         self.size(1280, 900)
+        self.scheme('light')
 
     def stop(self):
         self.driver.quit()
@@ -206,10 +220,11 @@ class Browser:
         })
 
     def scheme(self, name):
-        """Light or dark, as the desktop would have it."""
-        self.driver.execute_cdp_cmd('Emulation.setEmulatedMedia', {
-            'features': [{'name': 'prefers-color-scheme', 'value': name}],
-        })
+        """Light or dark, as the desktop would have it; nothing moves, so that what is seen is final."""
+        self.driver.execute_cdp_cmd('Emulation.setEmulatedMedia', {'features': [
+            {'name': 'prefers-color-scheme', 'value': name},
+            {'name': 'prefers-reduced-motion', 'value': 'reduce'},
+        ]})
 
     def open(self, tab=None):
         """The page from the start, with a tab of it chosen; earlier calls of mihost are forgotten."""
@@ -259,17 +274,23 @@ class Browser:
         self.wait('return ![...document.querySelectorAll(arguments[0])].some(e => e.checkVisibility())', css)
 
     def act(self, css, action):
-        """Does something with an element, which the page may replace at any time."""
+        """Does something with an element, as soon as it is enabled and in its place."""
         def attempt():
             try:
-                action(self.shown(css))
+                element = self.shown(css)
+                if not element.is_enabled():
+                    return False
+                action(element)
                 return True
-            except StaleElementReferenceException:
+            except (StaleElementReferenceException, ElementClickInterceptedException):
                 return False
-        until(attempt, f'{css} keeps changing')
+        until(attempt, f'{css} is off, or keeps moving')
 
     def click(self, css):
-        self.act(css, lambda element: element.click())
+        def click(element):
+            self.run('arguments[0].scrollIntoView({block: "nearest", inline: "nearest", behavior: "instant"})', element)
+            element.click()
+        self.act(css, click)
 
     def type(self, css, text):
         """Replaces the text of a field as a user would."""
@@ -294,6 +315,19 @@ class Browser:
         """The text that is shown in an element."""
         return self.run('return document.querySelector(arguments[0])?.innerText ?? ""', css)
 
+    def attributes(self, css, name):
+        """An attribute of all elements that match."""
+        return self.run(
+            'return [...document.querySelectorAll(arguments[0])].map(e => e.getAttribute(arguments[1]))', css, name,
+        )
+
+    def texts(self, css):
+        """The texts of all elements that match and are displayed."""
+        return self.run(
+            'return [...document.querySelectorAll(arguments[0])]'
+            '.filter(e => e.checkVisibility()).map(e => e.innerText)', css,
+        )
+
     def see(self, css, *texts):
         """Waits until an element shows all of the texts."""
         for text in texts:
@@ -310,24 +344,15 @@ class Browser:
 
     def button(self, name, within='body'):
         """Clicks what has this name for those who cannot see it."""
-        found = self.wait(
-            'return [...document.querySelectorAll(arguments[0] + " :is(button, a, [role=button], [role=tab])")]'
-            '.find(e => e.checkVisibility() && (e.ariaLabel || e.innerText).trim() === arguments[1])',
-            within, name, what=lambda: f'no button {name!r}: {self.body()[:2000]}',
-        )
-        found.click()
-
-    def axe(self):
-        """What axe-core finds serious or worse in what is shown: rule and element."""
-        self.run(read(AXE))
-        found = self.driver.execute_async_script(
-            'const done = arguments[0]; axe.run(document, {resultTypes: ["violations"]}).then(done);'
-        )
-        return [
-            (violation['id'], node['html'], node['failureSummary'])
-            for violation in found['violations'] if violation['impact'] in ('serious', 'critical')
-            for node in violation['nodes']
-        ]
+        def attempt():
+            found = self.run(FIND_BUTTON, within, name)
+            try:
+                if found:
+                    found.click()
+                return bool(found)
+            except (StaleElementReferenceException, ElementClickInterceptedException):
+                return False
+        until(attempt, lambda: f'no button {name!r}: {self.body()[:2000]}')
 
     def refused(self):
         """What the content security policy refused since the page was opened."""

@@ -1,17 +1,18 @@
-// Builds the page into the directory that is given, or into dist/.
+// Builds the page into dist/.
 import { copyFile, mkdir, readFile, readdir, rm, writeFile } from "node:fs/promises";
-import { dirname, join, resolve } from "node:path";
+import { dirname, join } from "node:path";
 import { fileURLToPath } from "node:url";
+import { gzipSync } from "node:zlib";
 import { build } from "esbuild";
 import { compile } from "./translation.js";
 
 const here = dirname(fileURLToPath(import.meta.url));
-const out = resolve(process.argv[2] ?? join(here, "dist"));
+const out = join(here, "dist");
 
-for (const file of await readdir(out).catch(() => []))
-    await rm(join(out, file), { recursive: true });
+await rm(out, { recursive: true, force: true });
 await mkdir(out, { recursive: true });
-await build({
+const { outputFiles } = await build({
+    write: false,
     absWorkingDir: here,
     entryPoints: ["src/index.js", "src/index.css"],
     bundle: true,
@@ -23,6 +24,9 @@ await build({
     logLevel: "warning",
     outdir: out,
 });
+// Cockpit serves a file that only is there compressed as what it is compressed from.
+for (const { path, contents } of outputFiles)
+    await writeFile(`${path}.gz`, gzipSync(contents, { level: 9 }));
 await copyFile(join(here, "src/index.html"), join(out, "index.html"));
 await copyFile(join(here, "manifest.json"), join(out, "manifest.json"));
 // Browsers whose language there is no translation for get an empty one.

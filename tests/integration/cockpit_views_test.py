@@ -53,6 +53,11 @@ class Views(PageTest):
         self.browser.button('All users', '#account')
         self.listed('#users-table', 'anna', 'ben', 'carl', 'root')
 
+    def test_account_with_a_group_that_is_gone_has_its_id(self):
+        self.browser.open('users')
+        self.browser.button('carl', '#users-table')
+        self.browser.see('#account .mi-names', '100', 'primary', 'team')
+
     def test_groups_have_their_members(self):
         self.browser.open('groups')
         self.listed('#groups-table', 'anna', 'ben', 'root', 'team')

@@ -90,8 +90,8 @@ export class AccountPage {
         return el("div", {},
             el("h3", { class: "pf-v6-c-title pf-m-md" }, _("Groups")),
             el("ul", { class: "mi-names" },
-                el("li", {}, this.group(account["primary-group"].name), el("span", { class: "mi-note" }, _("primary"))),
-                account["other-groups"].map(({ name }) => el("li", {}, this.group(name),
+                el("li", {}, this.group(account["primary-group"]), el("span", { class: "mi-note" }, _("primary"))),
+                account["other-groups"].map(({ name }) => el("li", {}, this.group({ name }),
                     button(_("Remove"), () => this.preview(tasks.groupRemoveMember, { fixed: { group: name, user } }), {
                         look: "link", changes: true, name: format(_("Remove from group $0"), name),
                     })))),
@@ -100,7 +100,8 @@ export class AccountPage {
             }));
     }
 
-    group(name) {
-        return button(name, () => this.go(["groups", name]), { look: "link" });
+    /** A group that nothing names any more has no page. */
+    group({ name, gid }) {
+        return name === null ? `${gid}` : button(name, () => this.go(["groups", name]), { look: "link" });
     }
 }

@@ -3,7 +3,18 @@
 from support import cockpit
 from support.cockpit import PageTest
 
-VIEWS = ('tree', 'users', 'groups', 'drivers', 'log', 'doctor', 'host')
+# By name the path in the page's address and what is there once the view is complete.
+VIEWS = {
+    'tree': ('tree/user%3Acarl', '#detail [data-property=login-shell]'),
+    'users': ('users', '#users-table tr[data-name=carl]'),
+    'account': ('users/carl', '#account #user-shell'),
+    'groups': ('groups', '#groups-table tr[data-name=team]'),
+    'group': ('groups/team', '#group #group-delete'),
+    'drivers': ('drivers', '#drivers-table tr[data-name=two]'),
+    'log': ('log', '.mi-log__line:nth-child(3)'),
+    'doctor': ('doctor', '#doctor-findings li'),
+    'host': ('host', '.mi-chart polyline'),
+}
 
 # Controls that are cut off: outside of the page, and in nothing that scrolls sideways.
 CUT_OFF = '''
@@ -17,43 +28,73 @@ return [...document.querySelectorAll('button, input, select, a, textarea')]
 
 
 class Looks(PageTest):
-    @classmethod
-    def setUpClass(cls):
-        super().setUpClass()
-        cls.browser.open()
+    def setUp(self):
+        self.browser.open()
 
     def tearDown(self):
         self.browser.size(1280, 900)
         self.browser.scheme('light')
 
     def view(self, name):
-        self.browser.click(f'#tab-{name}')
-        self.browser.shown(f'#panel-{name}')
-        self.browser.wait('return !document.querySelector("#panel-" + arguments[0] + " [aria-busy=true]")', name)
+        path, complete = VIEWS[name]
+        self.browser.run('location.hash = "#/" + arguments[0]', path)
+        self.browser.shown(complete)
 
-    def nothing_found(self, scheme):
+    def open_dialog(self, button, **fields):
+        """What would happen if the account of the view were changed."""
+        self.view('account')
+        self.browser.click(button)
+        for name, text in fields.items():
+            self.browser.type(f'#field-{name}', text)
+        self.browser.click('#preview-run')
+        self.browser.see('#preview', 'Commands that would run')
+
+    def close_dialog(self):
+        self.browser.click('#preview-cancel')
+        self.browser.gone('#preview')
+
+    def assert_nothing_found(self, name):
+        self.browser.picture(name)
+        self.assertEqual(self.browser.axe(), [])
+
+    def nothing_serious_found(self, scheme):
         self.browser.scheme(scheme)
         for name in VIEWS:
             with self.subTest(name):
                 self.view(name)
-                self.assertEqual(self.browser.axe(), [])
-                self.browser.picture(f'{name}-{scheme}')
+                self.assert_nothing_found(f'{name}-{scheme}')
+        self.open_dialog('#user-shell', shell='/bin/bash')
+        self.assert_nothing_found(f'change-{scheme}')
+        self.close_dialog()
+        self.open_dialog('#user-delete')
+        self.assert_nothing_found(f'delete-{scheme}')
+        self.close_dialog()
 
     def test_nothing_serious_found_in_light(self):
-        self.nothing_found('light')
+        self.nothing_serious_found('light')
 
     def test_nothing_serious_found_in_dark(self):
-        self.nothing_found('dark')
+        self.nothing_serious_found('dark')
+
+    def assert_fits(self, width):
+        self.assertEqual(self.browser.run('return document.documentElement.scrollWidth'), width)
+        self.assertEqual(self.browser.run(CUT_OFF), [])
 
     def test_fits_every_width(self):
-        for width in (400, 800, 1280, 2000):
-            self.browser.size(width, 900)
-            for name in VIEWS:
+        widths = (400, 800, 2000)
+        for name in VIEWS:
+            self.view(name)
+            for width in widths:
                 with self.subTest(name, width=width):
-                    self.view(name)
-                    self.assertEqual(self.browser.run('return document.documentElement.scrollWidth'), width)
-                    self.assertEqual(self.browser.run(CUT_OFF), [])
+                    self.browser.size(width, 900)
+                    self.assert_fits(width)
                     self.browser.picture(f'{name}-{width}')
+        self.open_dialog('#user-delete')
+        for width in widths:
+            self.browser.size(width, 900)
+            self.assert_fits(width)
+            self.browser.picture(f'delete-{width}')
+        self.close_dialog()
 
     def test_keeps_to_its_policy(self):
         for name in VIEWS:

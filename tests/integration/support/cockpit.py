@@ -354,6 +354,18 @@ class Browser:
                 return False
         until(attempt, lambda: f'no button {name!r}: {self.body()[:2000]}')
 
+    def axe(self):
+        """What axe-core finds serious or worse in what is shown: rule and element."""
+        self.run(read(AXE))
+        found = self.driver.execute_async_script(
+            'const done = arguments[0]; axe.run(document, {resultTypes: ["violations"]}).then(done);'
+        )
+        return [
+            (violation['id'], node['html'], node['failureSummary'])
+            for violation in found['violations'] if violation['impact'] in ('serious', 'critical')
+            for node in violation['nodes']
+        ]
+
     def refused(self):
         """What the content security policy refused since the page was opened."""
         return self.run('return window.refused')

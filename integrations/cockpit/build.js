@@ -33,4 +33,5 @@ await copyFile(join(here, "manifest.json"), join(out, "manifest.json"));
 await writeFile(join(out, "po.js"), "");
 for (const file of await readdir(join(here, "po")))
     if (file.endsWith(".po"))
-        await writeFile(join(out, `po.${file.slice(0, -3)}.js`), compile(await readFile(join(here, "po", file), "utf8")));
+        await writeFile(join(out, `po.${file.slice(0, -3)}.js`),
+            compile(await readFile(join(here, "po", file), "utf8")));

@@ -30,7 +30,7 @@ const monitorAfter = 5000; // milliseconds, for the first view to come first
 export class App {
     constructor(body) {
         document.title = _("Management tree");
-        document.documentElement.lang = cockpit.language ?? "en";
+        document.documentElement.lang = cockpit.language?.replace("_", "-") ?? "en";
         this.state = new State();
         this.monitor = new Monitor();
         this.notice = el("div", { id: "notice", "aria-live": "polite", tabindex: "-1" });

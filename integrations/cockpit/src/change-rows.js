@@ -2,7 +2,7 @@
 
 /** The files that change: those that matter first, the account tools' backups apart. */
 export function sortChanges(changes) {
-    const isBackup = change => /^\/etc\/[^\/]+-$/.test(change.file);
+    const isBackup = change => /^\/etc\/(passwd|shadow|group|gshadow|subuid|subgid)-$/.test(change.file);
     return {
         files: changes.filter(change => !isBackup(change)),
         backups: changes.filter(isBackup),
@@ -11,10 +11,10 @@ export function sortChanges(changes) {
 
 /** The lines of a changed file as a difference: what goes, then what comes. */
 export function differenceOf({ removed = [], added = [], mode = null, owner = null }) {
-    const attribute = (name, { before, after }) => ({ sign: " ", text: `${name}: ${before ?? "-"} → ${after ?? "-"}` });
+    const attributes = Object.entries({ mode, owner }).filter(([, value]) => value !== null);
     return [
-        ...(mode ? [attribute("mode", mode)] : []),
-        ...(owner ? [attribute("owner", owner)] : []),
+        ...attributes.map(([name, { before, after }]) =>
+            ({ sign: " ", text: `${name}: ${before ?? "-"} → ${after ?? "-"}` })),
         ...removed.map(text => ({ sign: "-", text })),
         ...added.map(text => ({ sign: "+", text })),
     ];

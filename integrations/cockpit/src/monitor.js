@@ -9,7 +9,9 @@ const properties = [
 
 export class Monitor {
     constructor() {
-        Object.assign(this, { history: new History(), figures: {}, live: null, onSample: () => {}, onFailure: () => {} });
+        Object.assign(this, { history: new History(), figures: {}, live: null });
+        this.onSample = () => {};
+        this.onFailure = () => {};
     }
 
     start() {

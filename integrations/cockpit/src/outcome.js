@@ -14,19 +14,24 @@ const kinds = {
 /** What happened, or in a preview what would happen. */
 export function outcome(answer, { preview }) {
     const { files, backups } = sortChanges(answer.changes ?? []);
+    const say = (would, did) => preview ? would : did;
     return [
-        answer.error && alert("danger", preview ? _("This would fail") : _("This failed"), [answer.error]),
-        !answer.error && !answer.changed && alert("info", preview ? _("Nothing would change") : _("Nothing changed")),
+        answer.error && alert("danger", say(_("This would fail"), _("This failed")), [answer.error]),
+        !answer.error && !answer.changed && alert("info", say(_("Nothing would change"), _("Nothing changed"))),
         (answer.warnings ?? []).map(warning => alert("warning", warning)),
         (answer.commands ?? []).length > 0 && el("div", { class: "mi-commands" },
-            el("h3", { class: "pf-v6-c-title pf-m-md" }, preview ? _("Commands that would run") : _("Commands that ran")),
+            heading(say(_("Commands that would run"), _("Commands that ran"))),
             answer.commands.map(command)),
         files.length > 0 && el("div", { class: "mi-changes" },
-            el("h3", { class: "pf-v6-c-title pf-m-md" }, preview ? _("Files that would change") : _("Files that changed")),
+            heading(say(_("Files that would change"), _("Files that changed"))),
             files.map(change)),
         backups.length > 0 && el("details", {},
             el("summary", {}, format(_("Backup copies: $0"), backups.length)), backups.map(change)),
     ];
+}
+
+function heading(text) {
+    return el("h3", { class: "pf-v6-c-title pf-m-md" }, text);
 }
 
 function command({ command: line, output }) {
@@ -36,7 +41,8 @@ function command({ command: line, output }) {
 
 function change(file) {
     return el("div", {},
-        el("p", {}, el("code", {}, file.file), " ", el("span", { class: "mi-note" }, kinds[file.change]?.() ?? file.change)),
+        el("p", {}, el("code", {}, file.file), " ",
+            el("span", { class: "mi-note" }, kinds[file.change]?.() ?? file.change)),
         el("pre", { class: "mi-lines", tabindex: "0" }, differenceOf(file).map(({ sign, text }) =>
             el("span", { class: signs[sign] }, `${sign} ${text}\n`))));
 }

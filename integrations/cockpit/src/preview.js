@@ -19,8 +19,9 @@ export class Preview {
         Object.assign(this, { task, fixed, values, onDone, busy: false, machine: null, edits: 0 });
         this.fields = new Form(task, { fixed, values, onInput: () => this.forget() });
         this.meaning = el("p", { class: "mi-note" });
-        this.form = el("form", { id: "preview-form", novalidate: true, on: { submit: event => this.submitted(event) } },
-            this.meaning, this.fields.element);
+        this.form = el("form", {
+            id: "preview-form", novalidate: true, on: { submit: event => this.submitted(event) },
+        }, this.meaning, this.fields.element);
         this.result = el("div", { class: "mi-result", "aria-live": "polite" });
         this.confirm = el("input", {
             id: "confirm-name", autocomplete: "off", autocapitalize: "none", spellcheck: "false",
@@ -29,7 +30,9 @@ export class Preview {
         this.confirmation = el("div", { class: "mi-confirm", hidden: true },
             el("label", { for: "confirm-name" }, task.danger?.label()),
             el("span", { class: "pf-v6-c-form-control" }, this.confirm));
-        this.run = button(_("What would happen?"), null, { id: "preview-run", look: "primary", submits: "preview-form" });
+        this.run = button(_("What would happen?"), null, {
+            id: "preview-run", look: "primary", submits: "preview-form",
+        });
         this.apply = button(_("Apply"), () => this.doIt(), {
             id: "preview-apply", look: task.danger ? "danger" : "primary",
         });

@@ -68,7 +68,8 @@ export class Table {
 
     row(index) {
         const row = this.rows[index];
-        return el("tr", { class: "pf-v6-c-table__tr", "aria-rowindex": index + 2, "data-name": row[this.columns[0].property] },
+        const name = row[this.columns[0].property];
+        return el("tr", { class: "pf-v6-c-table__tr", "aria-rowindex": index + 2, "data-name": name },
             this.columns.map(column => {
                 const text = column.text(row);
                 const properties = { class: `pf-v6-c-table__td ${classOf(column)}`, title: text };

@@ -3,9 +3,9 @@ import { test } from "node:test";
 import { differenceOf, sortChanges } from "../src/change-rows.js";
 
 test("sortChanges sets the account tools' backups apart", () => {
-    const files = ["/etc/passwd", "/etc/passwd-", "/home/x-", "/etc/a/b-"].map(file => ({ file }));
+    const files = ["/etc/passwd", "/etc/passwd-", "/home/x-", "/etc/a-"].map(file => ({ file }));
     const sorted = sortChanges(files);
-    assert.deepEqual(sorted.files.map(change => change.file), ["/etc/passwd", "/home/x-", "/etc/a/b-"]);
+    assert.deepEqual(sorted.files.map(change => change.file), ["/etc/passwd", "/home/x-", "/etc/a-"]);
     assert.deepEqual(sorted.backups.map(change => change.file), ["/etc/passwd-"]);
 });
 

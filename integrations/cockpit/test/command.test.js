@@ -6,7 +6,8 @@ const { commandOf, faultsOf } = await import("../src/command.js");
 const { tasks } = await import("../src/tasks.js");
 
 test("commandOf gives options that are filled in, then the arguments", () => {
-    const { words } = commandOf(tasks.userAdd, { "user": "jdoe", "full-name": "-x J. Doe", "home": "", "max-days": "90" });
+    const values = { "user": "jdoe", "full-name": "-x J. Doe", "home": "", "max-days": "90" };
+    const { words } = commandOf(tasks.userAdd, values);
     assert.deepEqual(words, ["user", "add", "--full-name=-x J. Doe", "--max-days=90", "--", "jdoe"]);
 });
 
@@ -22,11 +23,13 @@ test("commandOf passes a password on standard input only", () => {
 });
 
 test("commandOf sets no password where none is given", () => {
-    assert.deepEqual(commandOf(tasks.userAdd, { user: "jdoe", password: "" }), { words: ["user", "add", "--", "jdoe"], input: "" });
+    assert.deepEqual(commandOf(tasks.userAdd, { user: "jdoe", password: "" }),
+        { words: ["user", "add", "--", "jdoe"], input: "" });
 });
 
 test("commandOf lets an account without a day never expire", () => {
-    assert.deepEqual(commandOf(tasks.userExpire, { user: "jdoe", expires: "" }).words, ["user", "expire", "--", "jdoe", "never"]);
+    assert.deepEqual(commandOf(tasks.userExpire, { user: "jdoe", expires: "" }).words,
+        ["user", "expire", "--", "jdoe", "never"]);
 });
 
 test("commandOf keeps an empty argument in its place", () => {
@@ -54,11 +57,13 @@ test("faultsOf wants what is required, numbers and equal passwords", () => {
 });
 
 test("faultsOf wants a password that is set to be there", () => {
-    assert.deepEqual(faultsOf(tasks.userSetPassword, { user: "jdoe", password: "" }), [{ name: "password", reason: "missing" }]);
+    assert.deepEqual(faultsOf(tasks.userSetPassword, { user: "jdoe", password: "" }),
+        [{ name: "password", reason: "missing" }]);
 });
 
 test("faultsOf refuses a line end", () => {
-    assert.deepEqual(faultsOf(tasks.userSetName, { "user": "jdoe", "full-name": "a\nb" }), [{ name: "full-name", reason: "line" }]);
+    assert.deepEqual(faultsOf(tasks.userSetName, { "user": "jdoe", "full-name": "a\nb" }),
+        [{ name: "full-name", reason: "line" }]);
 });
 
 test("every deletion, restart, halt and clearing of the log wants a typed name", () => {

@@ -25,6 +25,7 @@ test("pointsOf draws one sample as a level line", () => {
 });
 
 test("pointsOf stays within the picture and leaves unknown values out", () => {
-    assert.deepEqual(pointsOf([{ time: 0, n: 20 }, { time: 1 }, { time: 2, n: 5 }], "n", size), [{ x: 0, y: 0 }, { x: 100, y: 25 }]);
+    assert.deepEqual(pointsOf([{ time: 0, n: 20 }, { time: 1 }, { time: 2, n: 5 }], "n", size),
+        [{ x: 0, y: 0 }, { x: 100, y: 25 }]);
     assert.deepEqual(pointsOf([{ time: 0, n: 0 }], "n", { ...size, most: 0 }), []);
 });

@@ -3,6 +3,7 @@ import { mock, test } from "node:test";
 import { last } from "./fake-cockpit.js";
 
 const mihost = await import("../src/mihost.js");
+const needsTimers = { skip: !mock.timers && "this Node cannot mock timers" };
 
 test("mihost runs with the privilege that there is, without a shell", () => {
     mihost.text(["--version"]);
@@ -88,7 +89,7 @@ test("change answers a failure with mihost's document", async () => {
     assert.deepEqual(await answer, { exit: 1, status: 1, error: "no", changes: [] });
 });
 
-test("a run that prints nothing for long is slow until it ends", { skip: !mock.timers && "no mock timers" }, async () => {
+test("a run that prints nothing for long is slow until it ends", needsTimers, async () => {
     mock.timers.enable({ apis: ["setTimeout"] });
     const counts = [];
     mihost.watchSlow(slow => counts.push(slow.size));
@@ -101,7 +102,7 @@ test("a run that prints nothing for long is slow until it ends", { skip: !mock.t
     mock.timers.reset();
 });
 
-test("stopSlow stops slow runs and no others", { skip: !mock.timers && "no mock timers" }, async () => {
+test("stopSlow stops slow runs and no others", needsTimers, async () => {
     mock.timers.enable({ apis: ["setTimeout"] });
     const slow = mihost.text(["tree"]);
     const slowProcess = last();

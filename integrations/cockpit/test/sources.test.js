@@ -8,13 +8,19 @@ const texts = new Map(modules.map(name => [name, readFileSync(new URL(name, sour
 
 test("no module makes markup of text, or code of it", () => {
     assert.ok(texts.size > 20);
+    const traps = /innerHTML|outerHTML|insertAdjacentHTML|document\.write|DOMParser|\beval\(|new Function/;
     for (const [name, text] of texts)
-        assert.doesNotMatch(text, /innerHTML|outerHTML|insertAdjacentHTML|document\.write|DOMParser|\beval\(|new Function/, name);
+        assert.doesNotMatch(text, traps, name);
 });
 
 test("no module sets a style as text", () => {
     for (const [name, text] of texts)
         assert.doesNotMatch(text, /\bstyle: |cssText|setAttribute\("style"/, name);
+});
+
+test("no line is longer than 120 characters", () => {
+    for (const [name, text] of texts)
+        assert.deepEqual(text.split("\n").filter(line => line.length > 120), [], name);
 });
 
 test("only mihost.js starts programs, and only mihost", () => {

@@ -2,7 +2,12 @@ import assert from "node:assert/strict";
 import { test } from "node:test";
 import { filterRows, sortRows } from "../src/table-rows.js";
 
-const rows = [{ name: "carl", uid: "9" }, { name: "anna", uid: "10" }, { name: "ben", uid: "-" }, { name: "dora", uid: "9" }];
+const rows = [
+    { name: "carl", uid: "9" },
+    { name: "anna", uid: "10" },
+    { name: "ben", uid: "-" },
+    { name: "dora", uid: "9" },
+];
 const columns = [{ text: row => row.name }, { text: row => row.uid }];
 const names = list => list.map(row => row.name);
 
@@ -17,7 +22,8 @@ test("filterRows never joins two columns to a match", () => {
 });
 
 test("sortRows sorts numbers by size, unknown ones last", () => {
-    assert.deepEqual(names(sortRows(rows, { property: "uid", order: "number" }, false)), ["carl", "dora", "anna", "ben"]);
+    assert.deepEqual(names(sortRows(rows, { property: "uid", order: "number" }, false)),
+        ["carl", "dora", "anna", "ben"]);
 });
 
 test("sortRows keeps the order of equal rows when descending", () => {

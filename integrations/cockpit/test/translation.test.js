@@ -31,14 +31,15 @@ test("compile refuses a translation into no language", () => {
 });
 
 test("the template has the texts of the sources, and no others", () => {
+    const text = /\b_\(((?:"(?:[^"\\]|\\.)*"[\s+]*)+)\)/g;
     const wanted = new Set();
     for (const name of readdirSync(new URL("src/", folder), { recursive: true }).map(String))
         if (name.endsWith(".js")) {
             const source = readFileSync(new URL(`src/${name}`, folder), "utf8");
-            for (const [, call] of source.matchAll(/\b_\(((?:"(?:[^"\\]|\\.)*"[\s+]*)+)\)/g))
+            const calls = [...source.matchAll(text)];
+            assert.equal(calls.length, source.split(/\b_\(/).length - 1, `${name}: a text that is computed`);
+            for (const [, call] of calls)
                 wanted.add(JSON.parse(call.replace(/"\s*\+\s*"/g, "")));
-            assert.equal([...source.matchAll(/\b_\(/g)].length,
-                [...source.matchAll(/\b_\((?:"(?:[^"\\]|\\.)*"[\s+]*)+\)/g)].length, `${name}: a text that is computed`);
         }
     const template = gettext.po.parse(readFileSync(new URL("po/mihost.pot", folder), "utf8"));
     const texts = new Set(Object.keys(template.translations[""]).filter(Boolean));

@@ -24,16 +24,25 @@ const identity = [
     { label: () => _("Home directory"), text: account => account["home-directory"], edit: "home" },
     { label: () => _("Login shell"), text: account => account["login-shell"], edit: "shell" },
     { label: () => _("State"), text: account => account.state ?? (account.unknown ? _("unknown") : _("in use")) },
-    { label: () => _("Account expires"), text: account => known(account, "account-expires", _("never")), edit: "expiry" },
+    {
+        label: () => _("Account expires"), text: account => known(account, "account-expires", _("never")),
+        edit: "expiry",
+    },
 ];
 
 const passwordFacts = [
     { label: () => _("Password"), text: account => known(account, "password", _("set")), edit: "password" },
     { label: () => _("Set on"), text: account => known(account, "password-changed", "") },
-    { label: () => _("Must be changed at next login"), text: account => account["must-change-password"] ? _("yes") : _("no") },
+    {
+        label: () => _("Must be changed at next login"),
+        text: account => account["must-change-password"] ? _("yes") : _("no"),
+    },
     { label: () => _("May be changed from"), text: account => known(account, "change-allowed-from", _("at any time")) },
     { label: () => _("Warned from"), text: account => known(account, "warned-from", "") },
-    { label: () => _("Valid until"), text: account => known(account, "password-valid-until", _("for ever")), edit: "ageing" },
+    {
+        label: () => _("Valid until"), text: account => known(account, "password-valid-until", _("for ever")),
+        edit: "ageing",
+    },
     { label: () => _("Days left"), text: account => known(account, "password-days-left", "") },
     { label: () => _("Account active until"), text: account => known(account, "active-until", _("for ever")) },
     { label: () => _("Failed logins allowed"), text: account => account["login-failures-allowed"] ?? _("not limited") },

@@ -30,8 +30,12 @@ export class HostView {
             el("section", { class: "mi-card", "aria-label": _("Power") },
                 el("h2", { class: "pf-v6-c-title pf-m-xl" }, _("Power")),
                 el("div", { class: "mi-toolbar" },
-                    button(_("Restart"), () => preview(tasks.restart), { id: "host-restart", look: "danger", changes: true }),
-                    button(_("Halt"), () => preview(tasks.halt), { id: "host-halt", look: "danger", changes: true }))));
+                    button(_("Restart"), () => preview(tasks.restart), {
+                        id: "host-restart", look: "danger", changes: true,
+                    }),
+                    button(_("Halt"), () => preview(tasks.halt), {
+                        id: "host-halt", look: "danger", changes: true,
+                    }))));
     }
 
     show() {
@@ -62,8 +66,8 @@ export class HostView {
         const limit = most ? last[most] : Math.max(...samples.map(sample => sample[figure])) * 1.25;
         const unit = this.units?.get(most ?? figure)?.unit ?? "";
         const points = pointsOf(samples, figure, { width, height, most: limit });
-        const text = limit === 0 ? _("none") : most ? format(_("$0 of $1"), amount(last[figure], unit), amount(limit, unit))
-            : amount(last[figure], unit);
+        const now = amount(last[figure], unit);
+        const text = !most ? now : limit === 0 ? _("none") : format(_("$0 of $1"), now, amount(limit, unit));
         return el("figure", { class: "mi-chart", "data-figure": figure },
             el("figcaption", {}, el("strong", {}, title()), el("span", { class: "mi-note" }, text)),
             svg("svg", {

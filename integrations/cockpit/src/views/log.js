@@ -13,7 +13,9 @@ const atMost = 1000; // lines that the page keeps
 
 export class LogView {
     constructor({ state, preview }) {
-        this.times = new Intl.DateTimeFormat(cockpit.language?.replace("_", "-"), { dateStyle: "medium", timeStyle: "medium" });
+        this.times = new Intl.DateTimeFormat(cockpit.language?.replace("_", "-"), {
+            dateStyle: "medium", timeStyle: "medium",
+        });
         this.filter = el("input", {
             id: "log-filter", type: "search", placeholder: _("Filter"), "aria-label": _("Filter the log"),
             on: { input: () => this.applyFilter() },
@@ -34,7 +36,9 @@ export class LogView {
                 el("label", { class: "pf-v6-c-switch" }, this.follow,
                     el("span", { class: "pf-v6-c-switch__toggle" }),
                     el("span", { class: "pf-v6-c-switch__label", "aria-hidden": "true" }, _("Follow"))),
-                button(_("Clear log"), () => preview(tasks.clearLog), { id: "log-clear", look: "danger", changes: true })),
+                button(_("Clear log"), () => preview(tasks.clearLog), {
+                    id: "log-clear", look: "danger", changes: true,
+                })),
             this.message, this.none, this.lines);
     }
 

@@ -8,6 +8,7 @@ from support.cockpit import PageTest
 
 MARKUP = '<img src=x onerror="window.ran=1"><b>bold</b>'
 SCRIPT = '<script>window.ran=1</script>'
+GROUP = '<b>crew</b>'
 CONTROLS = 'bell \a escape \x1b[31m back \b\b end \u202etxt.exe'
 
 
@@ -17,6 +18,9 @@ class Hostile(PageTest):
         cockpit.lay_machine()
         passwd = cockpit.read('/etc/passwd').replace('Anna,,,', MARKUP).replace('Ben', SCRIPT)
         cockpit.write('/etc/passwd', passwd)
+        with open('/etc/group', 'a') as groups:
+            groups.write(f'{GROUP}:x:1600:carl\n')
+        cockpit.write('/usr/sbin/modinfo', f"#!/bin/sh\necho 'version:        {MARKUP}'\n", 0o755)
         cockpit.write('/var/log/messages', cockpit.log_lines([MARKUP, SCRIPT, CONTROLS]))
 
     def setUp(self):
@@ -29,17 +33,48 @@ class Hostile(PageTest):
         self.assertEqual(self.browser.refused(), [])
         self.assertEqual(self.browser.complaints(), [])
 
-    def test_markup_in_a_name_is_text(self):
-        self.browser.see('#tree', MARKUP, SCRIPT)
+    def test_tree(self):
+        self.browser.see('#tree', MARKUP, SCRIPT, GROUP)
         self.browser.click('#tree [data-address="user:anna"]')
         self.browser.see('#detail', MARKUP)
-        self.assert_only_text()
-
-    def test_script_in_the_log_is_text(self):
         self.browser.click('#tree [data-address=log] .mi-tree__toggle')
-        self.browser.see('#tree', MARKUP, SCRIPT)
         self.browser.click('#tree [data-address="log:2"]')
         self.browser.see('#detail', SCRIPT)
+        self.assert_only_text()
+
+    def test_users_and_an_account(self):
+        self.browser.click('#tab-users')
+        self.browser.see('#users-table', MARKUP, SCRIPT)
+        self.browser.button('anna', '#users-table')
+        self.browser.see('#account', MARKUP)
+        self.assert_only_text()
+
+    def test_groups(self):
+        self.browser.click('#tab-groups')
+        self.browser.button(GROUP, '#groups-table')
+        self.browser.see('#group', GROUP, '1600', 'carl')
+        self.assert_only_text()
+
+    def test_drivers(self):
+        self.browser.click('#tab-drivers')
+        self.browser.see('#drivers-table', MARKUP)
+        self.assert_only_text()
+
+    def test_log(self):
+        self.browser.click('#tab-log')
+        self.browser.see('#log-lines', MARKUP, SCRIPT, 'bell')
+        self.browser.type('#log-filter', '<script>')
+        self.browser.see('#log-lines', SCRIPT)
+        self.browser.not_seen('#log-lines', 'bell')
+        self.assert_only_text()
+
+    def test_preview_of_a_change(self):
+        self.browser.click('#tab-users')
+        self.browser.button('ben', '#users-table')
+        self.browser.click('#user-shell')
+        self.browser.type('#field-shell', '/bin/sh')
+        self.browser.click('#preview-run')
+        self.browser.see('#preview .mi-added', SCRIPT)
         self.assert_only_text()
 
     def test_control_characters_are_made_visible(self):

@@ -354,8 +354,13 @@ class Browser:
                 return False
         until(attempt, lambda: f'no button {name!r}: {self.body()[:2000]}')
 
+    def settle(self):
+        """Waits until nothing moves or fades any more."""
+        self.wait('return document.getAnimations().every(each => each.playState === "finished")')
+
     def axe(self):
         """What axe-core finds serious or worse in what is shown: rule and element."""
+        self.settle()
         self.run(read(AXE))
         found = self.driver.execute_async_script(
             'const done = arguments[0]; axe.run(document, {resultTypes: ["violations"]}).then(done);'
@@ -377,6 +382,7 @@ class Browser:
 
     def picture(self, name):
         """Keeps a picture of the page in the build directory."""
+        self.settle()
         content = self.driver.get_screenshot_as_png()
         entry = tarfile.TarInfo(name + '.png')
         entry.size = len(content)

@@ -2,9 +2,11 @@
 
 import shutil
 import subprocess
+import time
 
 from support import cockpit, environment
 
+ACCOUNTS = ('root', 'anna', 'ben', 'carl')
 PASSWORD = 'correct horse'
 
 
@@ -14,7 +16,8 @@ class Login(cockpit.PageTest):
     @classmethod
     def prepare(cls):
         cockpit.lay_machine()
-        cockpit.write('/etc/shadow', 'root:*:19000::::::\nanna:*:19000::::::\n', 0o600)  # for good
+        changed = int(time.time()) // 86400 - 20
+        cockpit.write('/etc/shadow', ''.join(f'{name}:*:{changed}:0:90:14:30::\n' for name in ACCOUNTS), 0o600)
         shutil.copy(environment.daemon('/etc/pam.d/cockpit'), '/etc/pam.d/cockpit')
         subprocess.run(['chpasswd'], input=f'root:{PASSWORD}\nanna:{PASSWORD}\n', text=True, check=True)
 
@@ -30,6 +33,17 @@ class Login(cockpit.PageTest):
     def test_root_finds_the_page_in_the_menu(self):
         self.log_in('root')
         self.browser.see('#tree', 'anna')
+
+    def test_change_is_previewed_in_the_frame(self):
+        self.log_in('root')
+        self.browser.click('#tab-users')
+        self.browser.button('carl', '#users-table')
+        self.browser.click('#user-shell')
+        self.browser.type('#field-shell', '/bin/zsh')
+        self.browser.click('#preview-run')
+        self.browser.see('#preview .mi-added', '/home/carl:/bin/zsh')
+        self.browser.shown('#preview-apply:enabled')
+        self.browser.picture('cockpit')  # see script/cockpit-picture
 
     def test_who_may_read_little_is_told_so(self):
         self.log_in('anna')

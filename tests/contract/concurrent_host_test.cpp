@@ -4,8 +4,10 @@
 
 #include "TestPaths.h"
 #include "host/Properties.h"
+#include "tests/interpose/Libc.h"
 #include "tests/support/ErrorCount.h"
-#include "tests/support/Libc.h"
+#include "tests/support/FakeCommands.h"
+#include "tests/support/FileRoot.h"
 #include "tests/support/LiveNodes.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/TimeZone.h"
@@ -85,7 +87,7 @@ protected:
     }
 
     libc::HookGuard const guard;
-    libc::FileRoot const root{MACHINES_DIR "/users-and-groups"};
+    FileRoot const root{MACHINES_DIR "/users-and-groups"};
     Plugin plugin;
 };
 

@@ -4,7 +4,8 @@
 #include "TestPaths.h"
 #include "host/Properties.h"
 #include "tests/support/ErrorCount.h"
-#include "tests/support/Libc.h"
+#include "tests/support/FakeCommands.h"
+#include "tests/support/FileRoot.h"
 #include "tests/support/LiveNodes.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/TimeZone.h"
@@ -37,8 +38,8 @@ protected:
         plugin.initialize();
     }
 
-    libc::FileRoot const root{MACHINES_DIR "/users-and-groups"};
-    libc::FakeCommands const commands;
+    FileRoot const root{MACHINES_DIR "/users-and-groups"};
+    FakeCommands const commands;
     Plugin plugin;
 };
 

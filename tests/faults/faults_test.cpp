@@ -6,9 +6,11 @@
 #include "frame/OsSwMI.h"
 #include "host/OpenMI.h"
 #include "host/Properties.h"
-#include "tests/faults/Faults.h"
-#include "tests/support/Libc.h"
+#include "tests/interpose/Allocation.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/FileRoot.h"
 #include "tests/support/ScratchFolder.h"
+#include "tests/support/Streams.h"
 
 #include <gtest/gtest.h>
 
@@ -22,7 +24,7 @@
 namespace
 {
 
-using faults::Call;
+using interpose::AnyCall;
 
 /** A machine whose files and commands all answer, and whose locks are watched. */
 class FakeMachine
@@ -46,7 +48,6 @@ public:
             --openPipes;
             return std::fclose(stream);
         };
-        faults::wrapHooks();
     }
 
     bool accountsLocked = false;
@@ -75,16 +76,8 @@ private:
         return command.find("useradd") != std::string::npos ? "rc=0\n" : "";
     }
 
-    static FILE* streamOf(std::string const& text)
-    {
-        FILE* const stream = std::tmpfile();
-        std::fwrite(text.data(), 1, text.size(), stream);
-        std::rewind(stream);
-        return stream;
-    }
-
     libc::HookGuard const guard_;
-    libc::FileRoot const root_{"machine"}; // in the test's own folder
+    FileRoot const root_{"machine"}; // in the test's own folder
 };
 
 IC::ManagementInterface& openInterface()
@@ -222,7 +215,7 @@ long openDescriptors()
     return std::distance(begin(listing), end(listing));
 }
 
-class EachCallFails : public testing::TestWithParam<std::tuple<Scenario, Call>>
+class EachCallFails : public testing::TestWithParam<std::tuple<Scenario, AnyCall*>>
 {
 protected:
     void SetUp() override
@@ -239,19 +232,19 @@ protected:
     }
 
     /** One run with the call numbered at failing. @return how many of the calls were made */
-    static unsigned long runWithFault(Scenario const& scenario, Call call, unsigned long at)
+    static unsigned long runWithFault(Scenario const& scenario, AnyCall& call, unsigned long at)
     {
         FakeMachine machine;
         long const descriptors = openDescriptors();
         if (!scenario.startsByItself)
             start();
-        faults::arm(call, at);
+        call.failAt(at);
         try {
             scenario.run();
         } catch (std::bad_alloc const&) {
-            EXPECT_EQ(call, Call::Allocation);
+            EXPECT_EQ(&call, &interpose::allocation());
         }
-        unsigned long const made = faults::disarm();
+        unsigned long const made = call.stopCounting();
 
         EXPECT_FALSE(machine.accountsLocked);
         EXPECT_EQ(machine.openPipes, 0);
@@ -280,27 +273,32 @@ TEST_P(EachCallFails, AndNothingIsLeftBehind)
 {
     auto const& [scenario, call] = GetParam();
     std::vector<std::string> const whole = treeOfAWholeStart();
-    unsigned long const calls = runWithFault(scenario, call, 0);
+    unsigned long const calls = runWithFault(scenario, *call, 0);
+    if (scenario.startsByItself) {
+        EXPECT_GT(calls, 0U) << "a start makes every call";
+    }
     for (unsigned long at = 1; at <= calls && !HasFailure(); ++at) {
-        SCOPED_TRACE(faults::nameOf(call) + " number " + std::to_string(at) + " of " +
+        SCOPED_TRACE(call->name() + std::string(" number ") + std::to_string(at) + " of " +
                      std::to_string(calls));
-        runWithFault(scenario, call, at);
+        runWithFault(scenario, *call, at);
         EXPECT_EQ(treeOfAWholeStart(), whole);
     }
 }
 
-std::vector<Call> allCalls()
+std::vector<AnyCall*> allCalls()
 {
-    std::vector<Call> calls;
-    for (int call = 0; call < static_cast<int>(Call::count); ++call)
-        calls.push_back(static_cast<Call>(call));
-    return calls;
+    libc::Hooks& hooks = libc::hooks();
+    return {&hooks.popen,       &hooks.fopen,
+            &hooks.fgets,       &hooks.sysinfo,
+            &hooks.uname,       &hooks.lckpwdf,
+            &hooks.fgetpwent_r, &hooks.fgetspent_r,
+            &hooks.getgrent,    &interpose::allocation()};
 }
 
-std::string caseName(testing::TestParamInfo<std::tuple<Scenario, Call>> const& instance)
+std::string caseName(testing::TestParamInfo<std::tuple<Scenario, AnyCall*>> const& instance)
 {
     auto const& [scenario, call] = instance.param;
-    return scenario.name + ("_" + faults::nameOf(call));
+    return scenario.name + std::string("_") + call->name();
 }
 
 INSTANTIATE_TEST_SUITE_P(Faults, EachCallFails,

@@ -1,6 +1,7 @@
 #include "frame/ComputerInfo.h"
 
-#include "tests/support/Libc.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/WideTexts.h"
 
@@ -15,7 +16,6 @@ namespace
 {
 
 using NQ::ComputerInfo;
-using Texts = std::vector<std::string>;
 
 /** A machine whose names are all different; it may not tell them. */
 class ComputerName : public testing::Test
@@ -56,7 +56,7 @@ TEST_F(ComputerName, IsMadeATextByTheHost)
     WideTexts const texts;
     std::string name;
     ComputerInfo::getComputerName(name);
-    EXPECT_EQ(texts.made, Texts{"harbour"});
+    EXPECT_EQ(texts.made, Lines{"harbour"});
 }
 
 TEST_F(ComputerName, SpeaksForTheFrameAndOfNothingButItsEntryAndExit)
@@ -66,7 +66,7 @@ TEST_F(ComputerName, SpeaksForTheFrameAndOfNothingButItsEntryAndExit)
         Recording const log;
         std::string name;
         ComputerInfo::getComputerName(name);
-        EXPECT_EQ(log.texts(3000), (Texts{"getComputerName: entry", "getComputerName: exit"}));
+        EXPECT_EQ(log.texts(3000), (Lines{"getComputerName: entry", "getComputerName: exit"}));
         EXPECT_EQ(log.texts().size(), 2U);
         for (LogRecord const& record : log.records()) {
             EXPECT_EQ(record.file, "OsSwMI");

@@ -1,7 +1,7 @@
 #include "frame/OsSwMI.h"
 
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
-#include "tests/support/Libc.h"
 
 #include <gtest/gtest.h>
 
@@ -21,7 +21,7 @@ public:
 TEST(Interface, IsTheOneInUseOnceItIsInitialised)
 {
     FakeFiles const files;
-    libc::FakeCommands const commands;
+    FakeCommands const commands;
     Another interface;
     interface.initialize(5, IC::Number(0U), IC::Number(0U));
     EXPECT_EQ(IC::pOsSwMI, &interface);

@@ -6,7 +6,7 @@
 #include "sysdata/logInfo_linux.h"
 #include "sysdata/minMaxId.h"
 #include "sysdata/osInfo_linux.h"
-#include "tests/support/Next.h"
+#include "tests/interpose/Real.h"
 
 StandIns& standIns()
 {
@@ -41,15 +41,14 @@ unsigned int note(unsigned int value, char const* function = __builtin_FUNCTION(
 
 bool realGetUserCount(unsigned int& out)
 {
-    static auto* const real =
-        next<bool(NQ::OsInfo*, unsigned int&)>("_ZN2NQ6OsInfo12getUserCountERj");
+    static auto* const real = interpose::real(&NQ::OsInfo::getUserCount);
     NQ::OsInfo info;
     return real(&info, out);
 }
 
 bool realGetInstallDate(long& out)
 {
-    static auto* const real = next<bool(NQ::OsInfo*, long&)>("_ZN2NQ6OsInfo14getInstallDateERl");
+    static auto* const real = interpose::real(&NQ::OsInfo::getInstallDate);
     NQ::OsInfo info;
     return real(&info, out);
 }
@@ -212,8 +211,8 @@ namespace IC
 
 Error OsNode::setProperty(unsigned int const& id, PropertyValue const& value)
 {
-    static auto* const real = next<Error(OsNode*, unsigned int const&, PropertyValue const&)>(
-        "_ZN2IC6OsNode11setPropertyERKjRKNS_13PropertyValueE");
+    static auto* const real =
+        interpose::real<Error(OsNode*, unsigned int const&, PropertyValue const&)>();
     standIns().calls.push_back("set " + std::to_string(id));
     return real(this, id, value);
 }

@@ -8,6 +8,7 @@
 #include "sysdata/logInfo_linux.h"
 #include "sysdata/osInfo_linux.h"
 #include "sysdata/userInfo_linux.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
 
 #include <gtest/gtest.h>
@@ -56,7 +57,7 @@ protected:
     }
 
     FakeFiles const files_;
-    libc::FakeCommands commands_; // none reaches the machine
+    FakeCommands commands_; // none reaches the machine
 };
 
 TEST_F(CommandRunner, RunsThePowerActions)

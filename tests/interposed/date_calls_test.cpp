@@ -5,9 +5,10 @@
 
 #include "sysdata/logInfo_linux.h"
 #include "sysdata/userInfo_linux.h"
+#include "tests/interpose/Real.h"
 #include "tests/interposed/StandIns.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
-#include "tests/support/Next.h"
 
 #include <gtest/gtest.h>
 
@@ -39,7 +40,7 @@ void note(std::string call, std::string const& month, std::initializer_list<int>
 time_t NQ::to_time_t(int year, char* month, int day, int weekday, int hour, int minute, int second,
                      int isdst)
 {
-    static auto* const real = next<decltype(NQ::to_time_t)>("_ZN2NQ9to_time_tEiPciiiiii");
+    static auto* const real = interpose::real(NQ::to_time_t);
     note("by name " + std::to_string(year), month, {day, weekday, hour, minute, second, isdst});
     return real(year, month, day, weekday, hour, minute, second, isdst);
 }
@@ -47,7 +48,7 @@ time_t NQ::to_time_t(int year, char* month, int day, int weekday, int hour, int 
 time_t NQ::ito_time_t(int year, int month, int day, int weekday, int hour, int minute, int second,
                       int isdst)
 {
-    static auto* const real = next<decltype(NQ::ito_time_t)>("_ZN2NQ10ito_time_tEiiiiiiii");
+    static auto* const real = interpose::real(NQ::ito_time_t);
     note("by number " + std::to_string(year), std::to_string(month),
          {day, weekday, hour, minute, second, isdst});
     return real(year, month, day, weekday, hour, minute, second, isdst);
@@ -65,7 +66,7 @@ protected:
     }
 
     FakeFiles const files_;
-    libc::FakeCommands commands_;
+    FakeCommands commands_;
 };
 
 TEST_F(DateCalls, OfANumberPassEverythingOnUnderTheMonthsName)

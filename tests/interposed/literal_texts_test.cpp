@@ -3,6 +3,7 @@
 #include "tests/interposed/StandIns.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
+#include "tests/support/Lines.h"
 
 #include <gtest/gtest.h>
 
@@ -10,8 +11,6 @@
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 class LiteralTexts : public testing::Test
 {

@@ -2,10 +2,11 @@
 
 #include "nodes/LogEntryNode.h"
 #include "sysdata/logInfo_linux.h"
+#include "tests/interpose/Real.h"
 #include "tests/interposed/StandIns.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/Frame.h"
-#include "tests/support/Libc.h"
-#include "tests/support/Next.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Shown.h"
 #include "tests/support/TimeZone.h"
 
@@ -18,12 +19,10 @@
 namespace
 {
 
-using Texts = std::vector<std::string>;
-
 struct Asked {
-    Texts reads;
+    Lines reads;
     std::vector<void const*> values;
-    Texts fetches;
+    Lines fetches;
 };
 
 Asked& asked()
@@ -36,8 +35,8 @@ Asked& asked()
 
 IC::Error IC::LogEntryNode::getProperty(unsigned int id, PropertyValue& value) const
 {
-    static auto* const real = next<Error(LogEntryNode const*, unsigned int, PropertyValue&)>(
-        "_ZNK2IC12LogEntryNode11getPropertyEjRNS_13PropertyValueE");
+    static auto* const real =
+        interpose::real<Error(LogEntryNode const*, unsigned int, PropertyValue&)>();
     asked().reads.push_back(std::to_string(id) + " " + shown(value));
     asked().values.push_back(&value);
     return real(this, id, value);
@@ -45,8 +44,7 @@ IC::Error IC::LogEntryNode::getProperty(unsigned int id, PropertyValue& value) c
 
 void NQ::logInfo::getLog(unsigned int line, char* buffer, int length)
 {
-    static auto* const real =
-        next<void(logInfo*, unsigned int, char*, int)>("_ZN2NQ7logInfo6getLogEjPci");
+    static auto* const real = interpose::real(&logInfo::getLog);
     asked().fetches.push_back(std::to_string(line) + " " + std::to_string(length));
     real(this, line, buffer, length);
 }
@@ -69,28 +67,28 @@ protected:
         frame.createLogEntryNodes(false);
     }
 
-    static Texts readers(int count)
+    static Lines readers(int count)
     {
-        Texts lives;
+        Lines lives;
         for (int i = 0; i < count; ++i)
             lives.insert(lives.end(), {"logInfo made", "logInfo gone"});
         return lives;
     }
 
-    libc::FakeCommands commands;
+    FakeCommands commands;
     Frame frame;
 };
 
 TEST_F(LogEntryBuild, ReadsMessageAndTimeIntoOneValueThatStartsEmpty)
 {
-    EXPECT_EQ(asked().reads, (Texts{"81 empty  true", "79 text *host* true"}));
+    EXPECT_EQ(asked().reads, (Lines{"81 empty  true", "79 text *host* true"}));
     ASSERT_EQ(asked().values.size(), 2U);
     EXPECT_EQ(asked().values[0], asked().values[1]);
 }
 
 TEST_F(LogEntryBuild, FetchesAtMost511Characters)
 {
-    EXPECT_EQ(asked().fetches, (Texts{"1 511", "1 511"}));
+    EXPECT_EQ(asked().fetches, (Lines{"1 511", "1 511"}));
 }
 
 TEST_F(LogEntryBuild, GivesNothingBesideTheSecondsOfItsTime)

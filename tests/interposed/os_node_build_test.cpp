@@ -29,8 +29,6 @@ public:
         createRootNode();
         createComputerNodes();
     }
-
-    using OsSwMI::computerNode_;
 };
 
 class OsNodeBuild : public testing::Test

@@ -1,6 +1,7 @@
 #include "nodes/OsNode.h"
 
 #include "tests/interposed/StandIns.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
 
@@ -30,7 +31,7 @@ TEST(OsNodeWrite, MakesOneReaderOfEachKindForItsOwnTimeWhateverTheProperty)
 TEST(OsNodeWrite, MakesNoOtherReadersForItsActions)
 {
     FakeFiles const files;
-    libc::FakeCommands commands;
+    FakeCommands commands;
     commands.otherwise = "";
     Frame const frame;
     IC::OsNode node(9, 7, {7}, 17, 0);

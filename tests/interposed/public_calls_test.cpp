@@ -5,9 +5,10 @@
 #include "sysdata/minMaxId.h"
 #include "sysdata/osInfo_linux.h"
 #include "sysdata/userInfo_linux.h"
+#include "tests/interpose/Real.h"
 #include "tests/interposed/StandIns.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
-#include "tests/support/Next.h"
 #include "util/MyProcess.h"
 
 #include <gtest/gtest.h>
@@ -30,8 +31,7 @@ Calls& seen()
 
 bool NQ::userInfo::executeLinCommand(char* command, char const* const* args, char* output)
 {
-    static auto* const real = next<bool(userInfo*, char*, char const* const*, char*)>(
-        "_ZN2NQ8userInfo17executeLinCommandEPcPKPKcS1_");
+    static auto* const real = interpose::real(&userInfo::executeLinCommand);
     std::string call = std::string("executeLinCommand ") + command;
     for (char const* const* arg = args; **arg != '\0'; ++arg)
         call += std::string(" ") + *arg;
@@ -41,8 +41,7 @@ bool NQ::userInfo::executeLinCommand(char* command, char const* const* args, cha
 
 void NQ::groupInfo::setGroupMembers(char** members)
 {
-    static auto* const real =
-        next<void(groupInfo*, char**)>("_ZN2NQ9groupInfo15setGroupMembersEPPc");
+    static auto* const real = interpose::real(&groupInfo::setGroupMembers);
     std::string call = "setGroupMembers " + std::to_string(groupId_);
     for (char** member = members; *member; ++member)
         call += std::string(" ") + *member;
@@ -53,10 +52,7 @@ void NQ::groupInfo::setGroupMembers(char** members)
 void NQ::Tokenize(std::string const& text, std::vector<std::string>& tokens,
                   std::string const& delimiters)
 {
-    using Real = void(std::string const&, std::vector<std::string>&, std::string const&);
-    static auto* const real =
-        next<Real>("_ZN2NQ8TokenizeERKNSt7__cxx1112basic_stringIcSt11char_traitsIcESaIcEEERSt6"
-                   "vectorIS5_SaIS5_EES7_");
+    static auto* const real = interpose::real(NQ::Tokenize);
     seen().push_back("Tokenize " + delimiters);
     real(text, tokens, delimiters);
 }
@@ -75,8 +71,7 @@ unsigned int NQ::minMaxId::getMaxGroupId()
 
 int NQ::OsInfo::executeCommand(char* program, char** arguments, char* output)
 {
-    static auto* const real =
-        next<int(OsInfo*, char*, char**, char*)>("_ZN2NQ6OsInfo14executeCommandEPcPS1_S1_");
+    static auto* const real = interpose::real(&OsInfo::executeCommand);
     seen().push_back(std::string("executeCommand ") + program);
     EXPECT_EQ(arguments[0], program); // the list begins with the program's own slot
     return real(this, program, arguments, output);
@@ -84,8 +79,7 @@ int NQ::OsInfo::executeCommand(char* program, char** arguments, char* output)
 
 void NQ::OsInfo::executePasswordEncryption(char* password, char* user)
 {
-    static auto* const real =
-        next<void(OsInfo*, char*, char*)>("_ZN2NQ6OsInfo25executePasswordEncryptionEPcS1_");
+    static auto* const real = interpose::real(&OsInfo::executePasswordEncryption);
     seen().push_back(std::string("executePasswordEncryption ") + password + " " + user);
     real(this, password, user);
 }
@@ -118,7 +112,7 @@ protected:
     }
 
     FakeFiles const files_;
-    libc::FakeCommands commands_;
+    FakeCommands commands_;
 };
 
 TEST_F(PublicCalls, TheLockQueryRunsItsCommandThroughTheRecordsRunner)

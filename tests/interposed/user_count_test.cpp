@@ -1,3 +1,4 @@
+#include "tests/interpose/Libc.h"
 #include "tests/interposed/StandIns.h"
 #include "tests/support/FakeFiles.h"
 
@@ -22,7 +23,8 @@ Calls callsFor(char const* passwd)
         return 0;
     };
     libc::hooks().setpwent = [] { standIns().calls.emplace_back("setpwent"); };
-    libc::hooks().fopen = [below = libc::hooks().fopen](char const* path, char const* mode) {
+    libc::hooks().fopen = [below = libc::hooks().fopen.answer()](char const* path,
+                                                                 char const* mode) {
         standIns().calls.emplace_back(path);
         return below(path, mode);
     };

@@ -1,5 +1,6 @@
+#include "tests/support/FakeCommands.h"
 #include "tests/support/Frame.h"
-#include "tests/support/Libc.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
@@ -11,7 +12,6 @@
 namespace
 {
 
-using Texts = std::vector<std::string>;
 using Ids = std::vector<unsigned int>;
 
 class DriverNodes : public testing::Test
@@ -30,7 +30,7 @@ protected:
         return frame.ofType(44);
     }
 
-    libc::FakeCommands commands;
+    FakeCommands commands;
     Frame frame;
 };
 
@@ -83,7 +83,7 @@ TEST_F(DriverNodes, AreSetUpInTheOrderThatHostsSee)
     commands.answers = {{"lsmod", "loop 1 0\n"}, {"modinfo loop", "description: Disk\n"}};
     NodeCalls const calls;
     frame.createDriverNodes();
-    EXPECT_EQ(calls.calls, (Texts{"setStatus(1)", "setDescription(Disk)", "setProperty(134)",
+    EXPECT_EQ(calls.calls, (Lines{"setStatus(1)", "setDescription(Disk)", "setProperty(134)",
                                   "setProperty(108)", "setProperty(70)", "setProperty(36)"}));
 }
 
@@ -117,7 +117,7 @@ TEST_F(DriverNodes, AreNoneWhenLsmodCannotBeStartedAndSayNoMoreThanThat)
     Recording const recording;
     frame.createDriverNodes();
     EXPECT_TRUE(drivers().empty());
-    EXPECT_EQ(recording.texts(), (Texts{"createDriverNodes: entry", "getDriverInfo: entry",
+    EXPECT_EQ(recording.texts(), (Lines{"createDriverNodes: entry", "getDriverInfo: entry",
                                         "Cannot open process: lsmod", "getDriverInfo: exit",
                                         "createDriverNodes: exit"}));
     LogRecord const first = recording.records().front();

@@ -3,6 +3,8 @@
 
 #include "nodes/nodeValues.h"
 #include "sysdata/minMaxId.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
 #include "tests/support/Lines.h"
@@ -21,7 +23,6 @@
 namespace
 {
 
-using Texts = std::vector<std::string>;
 using Ids = std::vector<unsigned int>;
 
 /** A machine with two groups, one of them empty. */
@@ -105,7 +106,7 @@ TEST_F(GroupNodes, AreSetUpInTheOrderThatHostsSee)
     files.write("/etc/group", "root:x:0:\n");
     NodeCalls const calls;
     frame.createGroupNodes(false);
-    EXPECT_EQ(calls.calls, (Texts{"setStatus(1)", "setDescription(Group)", "setProperty(108)",
+    EXPECT_EQ(calls.calls, (Lines{"setStatus(1)", "setDescription(Group)", "setProperty(108)",
                                   "setProperty(89)", "setProperty(165)", "setProperty(51)"}));
 }
 
@@ -137,7 +138,7 @@ TEST_F(GroupNodes, ArePublishedEachAsSoonAsItIsComplete)
 {
     struct Publications {
         Frame const& frame;
-        Texts seen;
+        Lines seen;
     } publications{frame, {}};
     frame.setLoadCallBack(
         [](IC::Node* const& node, void const* context) {
@@ -148,7 +149,7 @@ TEST_F(GroupNodes, ArePublishedEachAsSoonAsItIsComplete)
         },
         &publications, nullptr);
     frame.createGroupNodes(true);
-    EXPECT_EQ(publications.seen, (Texts{"node 1 with 4 properties", "node 2 with 4 properties"}));
+    EXPECT_EQ(publications.seen, (Lines{"node 1 with 4 properties", "node 2 with 4 properties"}));
 }
 
 TEST_F(GroupNodes, AreAllDeletedOnARefreshBeforeANewOneIsMade)
@@ -158,9 +159,9 @@ TEST_F(GroupNodes, AreAllDeletedOnARefreshBeforeANewOneIsMade)
     Recording const log;
     frame.createGroupNodes(true);
     EXPECT_EQ(frame.deleted, before);
-    Texts const texts = log.texts(3000);
-    EXPECT_EQ(Texts(texts.begin(), texts.begin() + 6),
-              (Texts{"createGroupNodes: entry", "Delete a group entry: Group",
+    Lines const texts = log.texts(3000);
+    EXPECT_EQ(Lines(texts.begin(), texts.begin() + 6),
+              (Lines{"createGroupNodes: entry", "Delete a group entry: Group",
                      "GroupNode::~GroupNode: entry", "Delete a group entry: Group",
                      "GroupNode::~GroupNode: entry", "getGroupInfo: entry"}));
     LogRecord const announcement = log.records().at(2);
@@ -183,14 +184,14 @@ TEST_F(GroupNodes, SayHowManyThereAreAndWhichEachOneIs)
 {
     Recording const log;
     frame.createGroupNodes(false);
-    Texts remarks;
+    Lines remarks;
     for (LogRecord const& record : log.records())
         if (!record.trace && record.file == "OsSwMI" && record.function == "createGroupNodes") {
             EXPECT_EQ(record.level, 3000);
             EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
             remarks.push_back(record.text);
         }
-    EXPECT_EQ(remarks, (Texts{"createGroupNodes: entry", "groups.size() = 2", "Name = root",
+    EXPECT_EQ(remarks, (Lines{"createGroupNodes: entry", "groups.size() = 2", "Name = root",
                               "Id = 0", "Name = team", "Id = 500", "createGroupNodes: exit"}));
 }
 
@@ -216,7 +217,7 @@ TEST_F(GroupNodes, SayTheirNameAndIdBeforeTheirPropertiesAreSet)
 
 TEST_F(GroupNodes, AreBuiltUnderTheLockThatTheyShareWithUsers)
 {
-    Texts steps;
+    Lines steps;
     MutexCalls mutexes;
     mutexes.onLock = [&steps](NQ::Mutex const& mutex, unsigned long timeout) {
         steps.push_back((&mutex == &IC::OSSWMI::myuserlock ? "lock shared " : "lock own ") +
@@ -227,7 +228,7 @@ TEST_F(GroupNodes, AreBuiltUnderTheLockThatTheyShareWithUsers)
         return 0;
     };
     frame.createGroupNodes(false);
-    EXPECT_EQ(steps, (Texts{"lock shared 4294967295", "lock own 4294967295", "unlock own",
+    EXPECT_EQ(steps, (Lines{"lock shared 4294967295", "lock own 4294967295", "unlock own",
                             "unlock shared"}));
 }
 
@@ -282,14 +283,14 @@ TEST_F(GroupNodes, AnswerTheirCountLive)
 TEST_F(GroupNodes, AnswerTheirCountWithoutTheLockThatTheyShareWithUsers)
 {
     frame.createGroupNodes(false);
-    Texts locked;
+    Lines locked;
     MutexCalls mutexes;
     mutexes.onLock = [&locked](NQ::Mutex const& mutex, unsigned long) {
         locked.emplace_back(&mutex == &IC::OSSWMI::myuserlock ? "shared" : "the listing's");
     };
     IC::PropertyValue value = IC::values::emptyValue();
     groups()[0]->getProperty(51, value);
-    EXPECT_EQ(locked, Texts{"the listing's"});
+    EXPECT_EQ(locked, Lines{"the listing's"});
 }
 
 TEST_F(GroupNodes, AnswerAllElseFromWhatIsStored)
@@ -307,7 +308,7 @@ TEST_F(GroupNodes, AnswerAllElseFromWhatIsStored)
 TEST_F(GroupNodes, OnlyStoreWhatIsWrittenToThem)
 {
     frame.createGroupNodes(false);
-    libc::FakeCommands const commands;
+    FakeCommands const commands;
     Recording const log;
     EXPECT_EQ(groups()[1]->setProperty(138, IC::values::number(1)).getStatus(), 0);
     EXPECT_EQ(storedValue(*groups()[1], 138), "number 1 true");
@@ -319,15 +320,15 @@ TEST_F(GroupNodes, SpeakOfAReadOfTheirBirthAndOfTheirDeath)
 {
     Recording log;
     auto* const node = new IC::GroupNode(1, 2, {}, 51, 3);
-    EXPECT_EQ(log.texts(), Texts{"GroupNode::GroupNode: entry"});
+    EXPECT_EQ(log.texts(), Lines{"GroupNode::GroupNode: entry"});
     log.clear();
     IC::PropertyValue value = IC::values::emptyValue();
     node->getProperty(108, value);
     EXPECT_EQ(log.texts(),
-              (Texts{"GroupNode::getProperty: entry", "GroupNode::getProperty: exit"}));
+              (Lines{"GroupNode::getProperty: entry", "GroupNode::getProperty: exit"}));
     log.clear();
     delete node;
-    EXPECT_EQ(log.texts(), Texts{"GroupNode::~GroupNode: entry"});
+    EXPECT_EQ(log.texts(), Lines{"GroupNode::~GroupNode: entry"});
 }
 
 TEST_F(GroupNodes, SpeakOfEveryReadForTheFrame)
@@ -337,7 +338,7 @@ TEST_F(GroupNodes, SpeakOfEveryReadForTheFrame)
         Recording const log;
         IC::PropertyValue value = IC::values::emptyValue();
         groups()[0]->getProperty(id, value);
-        Texts const texts = log.texts(3000);
+        Lines const texts = log.texts(3000);
         ASSERT_GE(texts.size(), 2U);
         EXPECT_EQ(texts.front(), "GroupNode::getProperty: entry");
         EXPECT_EQ(texts[1], id == 51 ? "getGroupInfo: entry" : "GroupNode::getProperty: exit");
@@ -369,7 +370,7 @@ TEST_F(GroupNodes, LeaveTheMarkOfTheUserBuilderAsItStands)
 
 TEST_F(GroupNodes, SpeakFromTheLineOnWhichEachMessageStands)
 {
-    Texts const source = linesOf(contentOf(TESTS_DIR "/../nodes/GroupNode.cpp"));
+    Lines const source = linesOf(contentOf(TESTS_DIR "/../nodes/GroupNode.cpp"));
     Recording const log;
     frame.createGroupNodes(false);
     int found = 0;

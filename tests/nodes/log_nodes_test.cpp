@@ -1,6 +1,7 @@
 #include "nodes/LogEntryNode.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/Frame.h"
-#include "tests/support/Libc.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 
@@ -14,7 +15,6 @@
 namespace
 {
 
-using Texts = std::vector<std::string>;
 using Ids = std::vector<unsigned int>;
 
 constexpr char wc[] = "wc -l /var/log/messages";
@@ -67,7 +67,7 @@ protected:
         return std::to_string(error.getStatus()) + " " + shown(value);
     }
 
-    libc::FakeCommands commands;
+    FakeCommands commands;
     Frame frame;
 };
 
@@ -107,7 +107,7 @@ TEST_F(LogNodes, SetTheLogUpInTheOrderThatHostsSee)
 {
     NodeCalls const calls;
     frame.createLogNodes();
-    EXPECT_EQ(calls.calls, (Texts{"setStatus(1)", "setDescription(OS Log)", "setProperty(123)",
+    EXPECT_EQ(calls.calls, (Lines{"setStatus(1)", "setDescription(OS Log)", "setProperty(123)",
                                   "setProperty(125)", "setProperty(37)", "setProperty(108)",
                                   "setProperty(114)", "setProperty(84)"}));
 }
@@ -116,7 +116,7 @@ TEST_F(LogNodes, LogEntryAndExitOfTheLogsBuilderAlone)
 {
     Recording const recording;
     frame.createLogNodes();
-    EXPECT_EQ(recording.texts(3000), (Texts{"createLogNodes: entry", "createLogNodes: exit"}));
+    EXPECT_EQ(recording.texts(3000), (Lines{"createLogNodes: entry", "createLogNodes: exit"}));
     EXPECT_EQ(recording.records().front().category, "Veltrix.IC.MI.OsSwMI");
     EXPECT_EQ(recording.records().front().file, "OsSwMI");
     EXPECT_TRUE(commands.ran.empty());
@@ -167,7 +167,7 @@ TEST_F(LogNodes, SetAnEntryUpInTheOrderThatHostsSee)
     frame.createLogNodes();
     NodeCalls const calls;
     frame.createLogEntryNodes(false);
-    EXPECT_EQ(calls.calls, (Texts{"setStatus(1)", "setDescription(OS LogEntry)", "setProperty(89)",
+    EXPECT_EQ(calls.calls, (Lines{"setStatus(1)", "setDescription(OS LogEntry)", "setProperty(89)",
                                   "setProperty(81)", "setProperty(79)"}));
 }
 
@@ -177,7 +177,7 @@ TEST_F(LogNodes, RunTheCommandsOfAnEntryInOrder)
     frame.createLogNodes();
     frame.createLogEntryNodes(false);
     std::string const sed = "sed -n '1p' /var/log/messages";
-    EXPECT_EQ(commands.ran, (Texts{wc, wc, wc, wc, sed, wc, wc, wc, sed, "date"}));
+    EXPECT_EQ(commands.ran, (Lines{wc, wc, wc, wc, sed, wc, wc, wc, sed, "date"}));
 }
 
 TEST_F(LogNodes, LogTheStepsOfAnEntryInOrder)
@@ -186,8 +186,8 @@ TEST_F(LogNodes, LogTheStepsOfAnEntryInOrder)
     frame.createLogNodes();
     Recording const recording;
     frame.createLogEntryNodes(false);
-    Texts nodesOnly;
-    Texts functions;
+    Lines nodesOnly;
+    Lines functions;
     for (LogRecord const& record : recording.records()) {
         if (record.trace || record.category != "Veltrix.IC.MI.OsSwMI")
             continue;
@@ -196,18 +196,18 @@ TEST_F(LogNodes, LogTheStepsOfAnEntryInOrder)
         EXPECT_EQ(record.file, "OsSwMI");
     }
     EXPECT_EQ(functions,
-              (Texts{"createLogEntryNodes", "LogEntryNode", "setProperty", "setProperty",
+              (Lines{"createLogEntryNodes", "LogEntryNode", "setProperty", "setProperty",
                      "getProperty", "getProperty", "setProperty", "setProperty", "getProperty",
                      "getProperty", "setProperty", "setProperty", "createLogEntryNodes"}));
     EXPECT_EQ(nodesOnly,
-              (Texts{"createLogEntryNodes: entry", "LogEntryNode::LogEntryNode: entry",
+              (Lines{"createLogEntryNodes: entry", "LogEntryNode::LogEntryNode: entry",
                      "LogEntryNode::setProperty: entry", "LogEntryNode::setProperty: exit",
                      "LogEntryNode::getProperty: entry", "LogEntryNode::getProperty: exit",
                      "LogEntryNode::setProperty: entry", "LogEntryNode::setProperty: exit",
                      "LogEntryNode::getProperty: entry", "LogEntryNode::getProperty: exit",
                      "LogEntryNode::setProperty: entry", "LogEntryNode::setProperty: exit",
                      "createLogEntryNodes: exit"}));
-    EXPECT_EQ(recording.texts(6000), Texts{});
+    EXPECT_EQ(recording.texts(6000), Lines{});
 }
 
 TEST_F(LogNodes, HaveAsManyEntriesAsLinesUpToFifty)
@@ -318,7 +318,7 @@ TEST_F(LogNodes, FailAReadBeyondTheLogAndLeaveTheValueAlone)
     Recording const recording;
     EXPECT_EQ(read(*entries()[2], 81), "1 text before true");
     EXPECT_EQ(read(*entries()[2], 79), "1 text before true");
-    EXPECT_EQ(recording.texts(6000), (Texts{"Invalid index: getMaxLine()=0, Index=3",
+    EXPECT_EQ(recording.texts(6000), (Lines{"Invalid index: getMaxLine()=0, Index=3",
                                             "Invalid index: getMaxLine()=0, logIndex=3"}));
 }
 
@@ -353,7 +353,7 @@ TEST_F(LogNodes, NameAnEntrysDestruction)
     ASSERT_EQ(entries().size(), 1U);
     Recording const recording;
     frame.deleteNode(entries()[0]);
-    EXPECT_EQ(recording.texts(), Texts{"LogEntryNode::~LogEntryNode: entry"});
+    EXPECT_EQ(recording.texts(), Lines{"LogEntryNode::~LogEntryNode: entry"});
 }
 
 TEST_F(LogNodes, GiveWayToNewOnesOnARefresh)
@@ -407,11 +407,11 @@ TEST_F(LogNodes, ArePublishedEachAsSoonAsItIsComplete)
     frame.createLogNodes();
     Recording const recording;
     frame.createLogEntryNodes(true);
-    Texts order;
+    Lines order;
     for (std::string const& text : recording.texts())
         if (text == "LogEntryNode::LogEntryNode: entry" || text == "publishNode: entry")
             order.push_back(text);
-    EXPECT_EQ(order, (Texts{"LogEntryNode::LogEntryNode: entry", "publishNode: entry",
+    EXPECT_EQ(order, (Lines{"LogEntryNode::LogEntryNode: entry", "publishNode: entry",
                             "LogEntryNode::LogEntryNode: entry", "publishNode: entry"}));
     ASSERT_EQ(frame.published.size(), 2U);
     EXPECT_NE(storedValue(*frame.published[0], 79), "unset");
@@ -430,7 +430,7 @@ TEST_F(LogNodes, AreAllMadeThoughTheHostRefusesThem)
     frame.createLogEntryNodes(true);
     EXPECT_EQ(entries().size(), 2U);
     EXPECT_EQ(frame.logEntryNodes_.size(), 2U);
-    EXPECT_EQ(recording.texts(6000), Texts(2, "addNewNode error = status 1: no room"));
+    EXPECT_EQ(recording.texts(6000), Lines(2, "addNewNode error = status 1: no room"));
 }
 
 TEST_F(LogNodes, OfAnEarlierLifeAreForgottenWithIt)
@@ -471,7 +471,7 @@ TEST_F(LogNodes, AreAllReplacedWhateverTheirDeletionAnswers)
     EXPECT_EQ(other.deleted, old);
     EXPECT_EQ(other.logEntryNodes_.size(), 3U);
     EXPECT_EQ(other.published.size(), 3U);
-    EXPECT_EQ(recording.texts(6000), Texts{});
+    EXPECT_EQ(recording.texts(6000), Lines{});
 }
 
 TEST_F(LogNodes, AreDeletedBeforeTheLogIsCountedAgain)
@@ -480,10 +480,10 @@ TEST_F(LogNodes, AreDeletedBeforeTheLogIsCountedAgain)
     build();
     Recording const recording;
     frame.createLogEntryNodes(true);
-    Texts const said = recording.texts();
+    Lines const said = recording.texts();
     ASSERT_GE(said.size(), 4U);
-    EXPECT_EQ(Texts(said.begin(), said.begin() + 4),
-              (Texts{"createLogEntryNodes: entry", "LogEntryNode::~LogEntryNode: entry",
+    EXPECT_EQ(Lines(said.begin(), said.begin() + 4),
+              (Lines{"createLogEntryNodes: entry", "LogEntryNode::~LogEntryNode: entry",
                      "LogEntryNode::~LogEntryNode: entry", "getMaxLine: entry"}));
 }
 
@@ -494,7 +494,7 @@ struct WatchingFrame : Frame {
                        std::to_string(node->getProperties().size()));
         return Frame::addNewNode(node);
     }
-    Texts seen;
+    Lines seen;
 };
 
 TEST_F(LogNodes, AreCompleteWhenTheyArePublished)
@@ -503,7 +503,7 @@ TEST_F(LogNodes, AreCompleteWhenTheyArePublished)
     haveLines(2);
     other.createLogNodes();
     other.createLogEntryNodes(true);
-    EXPECT_EQ(other.seen, Texts(2, "OS LogEntry 1 3"));
+    EXPECT_EQ(other.seen, Lines(2, "OS LogEntry 1 3"));
 }
 
 } // namespace

@@ -1,8 +1,11 @@
 // What a write to the operating-system node does, stores and returns.
 
 #include "nodes/OsNode.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/WideTexts.h"
 
@@ -20,7 +23,6 @@ using IC::EnumValue;
 using IC::Error;
 using IC::Number;
 using IC::PropertyValue;
-using Lines = std::vector<std::string>;
 
 std::string const useraddLine = "/usr/sbin/useradd jdoe 2>&1;echo rc=$? 2>&1";
 std::string const chageLine = "/usr/bin/chage -E -1 jdoe 2>&1";
@@ -79,7 +81,7 @@ protected:
     static constexpr char oldLog[] = "Nov 20 10:11:01 message\n";
 
     FakeFiles files_;
-    libc::FakeCommands commands_;
+    FakeCommands commands_;
     Frame frame_;
     IC::OsNode node_{9, 7, {7}, 17, 0};
 };

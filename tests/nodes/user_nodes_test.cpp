@@ -2,8 +2,11 @@
 
 #include "nodes/nodeValues.h"
 #include "sysdata/minMaxId.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/Account.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
+#include "tests/support/Lines.h"
 #include "tests/support/MutexCalls.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
@@ -21,14 +24,7 @@
 namespace
 {
 
-using Texts = std::vector<std::string>;
 using Ids = std::vector<unsigned int>;
-
-std::string account(std::string const& name, unsigned int uid)
-{
-    return name + ":x:" + std::to_string(uid) + ":100:" + name + " full:/home/" + name +
-           ":/bin/sh\n";
-}
 
 /** A machine with three users. */
 class UserNodes : public testing::Test
@@ -147,9 +143,9 @@ TEST_F(UserNodes, HoldTheSystemsValuesForEmptyAgeingFields)
     EXPECT_EQ(storedValue(anna, 91), "date 2147472000 true");
 }
 
-Texts setUp()
+Lines setUp()
 {
-    Texts calls{"setStatus(1)", "setDescription(User Account)"};
+    Lines calls{"setStatus(1)", "setDescription(User Account)"};
     for (int const id : {123, 125, 108, 109, 89,  90,  311, 312, 158, 159, 117, 120,
                          163, 162, 161, 44,  118, 119, 113, 91,  160, 106, 138, 51})
         calls.push_back("setProperty(" + std::to_string(id) + ")");
@@ -193,7 +189,7 @@ TEST_F(UserNodes, ArePublishedEachAsSoonAsItIsComplete)
 {
     struct Publications {
         Frame const& frame;
-        Texts seen;
+        Lines seen;
     } publications{frame, {}};
     frame.setLoadCallBack(
         [](IC::Node* const& node, void const* context) {
@@ -204,7 +200,7 @@ TEST_F(UserNodes, ArePublishedEachAsSoonAsItIsComplete)
         },
         &publications, nullptr);
     frame.createUserNodes(true);
-    EXPECT_EQ(publications.seen, (Texts{"node 1 with 24 properties", "node 2 with 24 properties",
+    EXPECT_EQ(publications.seen, (Lines{"node 1 with 24 properties", "node 2 with 24 properties",
                                         "node 3 with 24 properties"}));
 }
 
@@ -215,9 +211,9 @@ TEST_F(UserNodes, AreAllDeletedOnARefreshBeforeANewOneIsMade)
     Recording const log;
     frame.createUserNodes(true);
     EXPECT_EQ(frame.deleted, before);
-    Texts const texts = log.texts(3000);
-    Texts const beginning(texts.begin(), texts.begin() + 8);
-    EXPECT_EQ(beginning, (Texts{"createUserNodes: entry", "Delete a user entry: User Account",
+    Lines const texts = log.texts(3000);
+    Lines const beginning(texts.begin(), texts.begin() + 8);
+    EXPECT_EQ(beginning, (Lines{"createUserNodes: entry", "Delete a user entry: User Account",
                                 "UserNode::~UserNode: entry", "Delete a user entry: User Account",
                                 "UserNode::~UserNode: entry", "Delete a user entry: User Account",
                                 "UserNode::~UserNode: entry", "getUserInfo: entry"}));
@@ -253,7 +249,7 @@ TEST_F(UserNodes, AreBuiltUnderTheSharedLockWithoutTimeLimit)
 {
     NQ::minMaxId::Instance();
     for (bool const refresh : {false, true}) {
-        Texts steps;
+        Lines steps;
         MutexCalls mutexes;
         mutexes.onLock = [&steps](NQ::Mutex const& mutex, unsigned long timeout) {
             if (&mutex == &IC::OSSWMI::myuserlock)
@@ -265,7 +261,7 @@ TEST_F(UserNodes, AreBuiltUnderTheSharedLockWithoutTimeLimit)
             return 0;
         };
         std::size_t const deletedBefore = frame.deleted.size();
-        auto const onOpen = libc::hooks().fopen;
+        auto const onOpen = libc::hooks().fopen.answer();
         libc::hooks().fopen = [&, onOpen](char const* path, char const* mode) {
             if (std::string(path) == "/etc/passwd")
                 steps.push_back("list, deleted " +
@@ -274,7 +270,7 @@ TEST_F(UserNodes, AreBuiltUnderTheSharedLockWithoutTimeLimit)
         };
         frame.createUserNodes(refresh);
         libc::hooks().fopen = onOpen;
-        EXPECT_EQ(steps, (Texts{"lock 4294967295", refresh ? "list, deleted 3" : "list, deleted 0",
+        EXPECT_EQ(steps, (Lines{"lock 4294967295", refresh ? "list, deleted 3" : "list, deleted 0",
                                 "unlock"}));
     }
 }
@@ -402,10 +398,10 @@ TEST_F(UserNodes, SpeakOfAReadUnderTheNameOfTheClass)
     IC::PropertyValue value = IC::values::emptyValue();
     Recording log;
     users()[0]->getProperty(108, value);
-    EXPECT_EQ(log.texts(3000), (Texts{"UserNode::UserNode: entry", "UserNode::UserNode: exit"}));
+    EXPECT_EQ(log.texts(3000), (Lines{"UserNode::UserNode: entry", "UserNode::UserNode: exit"}));
     log.clear();
     users()[0]->getProperty(51, value);
-    Texts const texts = log.texts(3000);
+    Lines const texts = log.texts(3000);
     EXPECT_EQ(texts.front(), "UserNode::UserNode: entry");
     EXPECT_EQ(texts.at(1), "getUserInfo: entry");
     EXPECT_EQ(texts.back(), "UserNode::UserNode: exit");
@@ -415,10 +411,10 @@ TEST_F(UserNodes, SpeakOfTheirBirthAndOfTheirDeath)
 {
     Recording log;
     auto* const node = new IC::UserNode(1, 2, {}, 46, 3);
-    EXPECT_EQ(log.texts(), Texts{"UserNode::UserNode: entry"});
+    EXPECT_EQ(log.texts(), Lines{"UserNode::UserNode: entry"});
     log.clear();
     delete node;
-    EXPECT_EQ(log.texts(), Texts{"UserNode::~UserNode: entry"});
+    EXPECT_EQ(log.texts(), Lines{"UserNode::~UserNode: entry"});
 }
 
 TEST_F(UserNodes, AreAnnouncedByTheDescriptionThatTheyHaveWhenTheyAreDeleted)

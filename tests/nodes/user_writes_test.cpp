@@ -3,8 +3,11 @@
 #include "nodes/UserNode.h"
 
 #include "nodes/nodeValues.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 #include "tests/support/WideTexts.h"
@@ -15,26 +18,15 @@
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
-#include <sstream>
 #include <string>
 #include <vector>
 
 namespace
 {
 
-using Texts = std::vector<std::string>;
-
 constexpr char const* setPasswords = "chpasswd -e < usrandpwd ; rm -f usrandpwd";
 
-std::string contentOf(char const* path)
-{
-    std::ifstream const file(path);
-    std::ostringstream text;
-    text << file.rdbuf();
-    return file ? text.str() : "(none)";
-}
-
-Texts sorted(Texts texts)
+Lines sorted(Lines texts)
 {
     std::sort(texts.begin(), texts.end());
     return texts;
@@ -72,7 +64,7 @@ protected:
 
     FakeFiles const files;
     Frame frame;
-    libc::FakeCommands commands;
+    FakeCommands commands;
     Recording log;
 };
 
@@ -82,23 +74,23 @@ class PasswordWrite : public UserWrite
 protected:
     PasswordWrite()
     {
-        auto const start = libc::hooks().popen;
+        auto const start = libc::hooks().popen.answer();
         libc::hooks().popen = [this, start](char const* command, char const* mode) {
             handedOver.push_back(contentOf("usrandpwd"));
             return start(command, mode);
         };
     }
 
-    Texts handedOver;
+    Lines handedOver;
 };
 
 TEST_F(PasswordWrite, HandsNameAndEncryptedPasswordToChpasswdInAFile)
 {
     commands.answers[setPasswords] = "";
     write(117, IC::values::text("$6$salt$hash"));
-    EXPECT_EQ(commands.ran, Texts{setPasswords});
-    EXPECT_EQ(commands.modes, Texts{"r"});
-    EXPECT_EQ(handedOver, Texts{"anna:$6$salt$hash\n"});
+    EXPECT_EQ(commands.ran, Lines{setPasswords});
+    EXPECT_EQ(commands.modes, Lines{"r"});
+    EXPECT_EQ(handedOver, Lines{"anna:$6$salt$hash\n"});
     EXPECT_EQ(commands.open, 0);
     EXPECT_EQ(storedValue(anna(), 117), "text $6$salt$hash true");
     EXPECT_TRUE(log.texts(6000).empty());
@@ -108,21 +100,21 @@ TEST_F(PasswordWrite, EmptiesAFileThatIsThereAlready)
 {
     std::ofstream("usrandpwd") << "root:x\nanna:an older and much longer password\n";
     write(117, IC::values::text("new"));
-    EXPECT_EQ(handedOver, Texts{"anna:new\n"});
+    EXPECT_EQ(handedOver, Lines{"anna:new\n"});
 }
 
 TEST_F(PasswordWrite, TakesTheNameThatTheNodeHoldsNow)
 {
     write(108, IC::values::text("renamed"));
     write(117, IC::values::text("new"));
-    EXPECT_EQ(handedOver, Texts{"renamed:new\n"});
+    EXPECT_EQ(handedOver, Lines{"renamed:new\n"});
 }
 
 TEST_F(PasswordWrite, IsStoredAlsoWhenChpasswdCannotBeStarted)
 {
     write(117, IC::values::text("new"));
     EXPECT_EQ(log.texts(6000),
-              Texts{"Cannot open process: chpasswd -e < usrandpwd ; rm -f usrandpwd"});
+              Lines{"Cannot open process: chpasswd -e < usrandpwd ; rm -f usrandpwd"});
     EXPECT_EQ(storedValue(anna(), 117), "text new true");
     for (LogRecord const& record : log.records())
         if (record.level == 6000) {
@@ -137,7 +129,7 @@ TEST_F(PasswordWrite, StartsChpasswdAlsoWhenTheFileCannotBeCreated)
     std::filesystem::create_directory("usrandpwd");
     commands.answers[setPasswords] = "";
     write(117, IC::values::text("new"));
-    EXPECT_EQ(commands.ran, Texts{setPasswords});
+    EXPECT_EQ(commands.ran, Lines{setPasswords});
     EXPECT_TRUE(std::filesystem::is_directory("usrandpwd"));
     EXPECT_EQ(storedValue(anna(), 117), "text new true");
 }
@@ -147,7 +139,7 @@ TEST_F(PasswordWrite, OfTheBuilderWritesNoFileAndRunsNothing)
     IC::OSSWMI::MI_call = true;
     write(117, IC::values::text("new"));
     IC::OSSWMI::MI_call = false;
-    EXPECT_EQ(commands.ran, Texts{});
+    EXPECT_EQ(commands.ran, Lines{});
     EXPECT_FALSE(std::filesystem::exists("usrandpwd"));
     EXPECT_EQ(storedValue(anna(), 117), "text new true");
 }
@@ -164,7 +156,7 @@ TEST_F(PasswordWrite, PassesItsTextsThroughWideText)
 {
     WideTexts const texts;
     write(117, IC::values::text("new"));
-    EXPECT_EQ(sorted(texts.widened), (Texts{"anna", "new"}));
+    EXPECT_EQ(sorted(texts.widened), (Lines{"anna", "new"}));
     EXPECT_EQ(texts.narrowed, texts.widened);
 }
 
@@ -173,7 +165,7 @@ TEST_F(UserWrite, OfAnInactiveTimeSetsTheDaysAfterThePasswordsExpiry)
     commands.answers = {{"chage -l anna", "Password expires : Jan 01, 2008\n"},
                         {"chage -I 10 anna", ""}};
     write(118, IC::values::text("2008-01-11 00:00:00"));
-    EXPECT_EQ(commands.ran, (Texts{"chage -l anna", "chage -I 10 anna"}));
+    EXPECT_EQ(commands.ran, (Lines{"chage -l anna", "chage -I 10 anna"}));
     EXPECT_EQ(storedValue(anna(), 118), "text 2008-01-11 00:00:00 true");
 }
 
@@ -182,7 +174,7 @@ TEST_F(UserWrite, OfAPasswordExpirationSetsTheDaysAfterTheLastChange)
     commands.answers = {{"chage -l anna", "Last password change : Jan 01, 2008\n"},
                         {"chage -M 10 anna", ""}};
     write(91, IC::values::text("2008-01-11 00:00:00"));
-    EXPECT_EQ(commands.ran, (Texts{"chage -l anna", "chage -M 10 anna"}));
+    EXPECT_EQ(commands.ran, (Lines{"chage -l anna", "chage -M 10 anna"}));
     EXPECT_EQ(storedValue(anna(), 91), "text 2008-01-11 00:00:00 true");
 }
 
@@ -193,7 +185,7 @@ TEST_F(UserWrite, OfADateTakesItsText)
     write(118, IC::values::date(1200009600));
     write(91, IC::values::date(1200009600));
     EXPECT_EQ(commands.ran,
-              (Texts{"chage -l anna", "chage -I 10 anna", "chage -l anna", "chage -M 9 anna"}));
+              (Lines{"chage -l anna", "chage -I 10 anna", "chage -l anna", "chage -M 9 anna"}));
     EXPECT_EQ(storedValue(anna(), 118), "date 1200009600 true");
     EXPECT_EQ(storedValue(anna(), 91), "date 1200009600 true");
 }
@@ -203,7 +195,7 @@ TEST_F(UserWrite, OfADatePassesDateAndNameThroughWideText)
     for (unsigned int const id : {118U, 91U}) {
         WideTexts const texts;
         write(id, IC::values::text("2008-01-11 00:00:00"));
-        EXPECT_EQ(sorted(texts.widened), (Texts{"2008-01-11 00:00:00", "anna"}));
+        EXPECT_EQ(sorted(texts.widened), (Lines{"2008-01-11 00:00:00", "anna"}));
         EXPECT_EQ(texts.narrowed, texts.widened);
     }
 }
@@ -223,14 +215,14 @@ TEST_F(UserWrite, IsStoredOnceItHasBeenActedOn)
 {
     for (unsigned int const id : {117U, 118U, 91U, 138U}) {
         std::string const before = storedValue(anna(), id);
-        Texts stored;
+        Lines stored;
         libc::hooks().popen = [&](char const*, char const*) -> FILE* {
             stored.push_back(storedValue(anna(), id));
             return nullptr;
         };
         write(id, IC::values::text("1"));
         ASSERT_FALSE(stored.empty()) << id;
-        EXPECT_EQ(stored, Texts(stored.size(), before)) << id;
+        EXPECT_EQ(stored, Lines(stored.size(), before)) << id;
         EXPECT_EQ(storedValue(anna(), id), "text 1 true");
     }
 }
@@ -239,7 +231,7 @@ TEST_F(UserWrite, OfOneToDeleteRunsUserdelWithTheUidText)
 {
     commands.answers["userdel -r 1000"] = "";
     write(138, IC::values::number(1));
-    EXPECT_EQ(commands.ran, Texts{"userdel -r 1000"});
+    EXPECT_EQ(commands.ran, Lines{"userdel -r 1000"});
     EXPECT_EQ(storedValue(anna(), 138), "number 1 true");
 }
 
@@ -248,7 +240,7 @@ TEST_F(UserWrite, OfAnythingThatReadsAsOneToDeleteRunsUserdel)
     write(138, IC::values::text("1"));
     write(138, IC::values::enumeration(1));
     write(138, IC::values::truth(true));
-    EXPECT_EQ(commands.ran, Texts(3, "userdel -r 1000"));
+    EXPECT_EQ(commands.ran, Lines(3, "userdel -r 1000"));
 }
 
 TEST_F(UserWrite, OfAnyOtherValueToDeleteDoesNothing)
@@ -256,7 +248,7 @@ TEST_F(UserWrite, OfAnyOtherValueToDeleteDoesNothing)
     for (IC::PropertyValue const& value : {IC::values::number(0), IC::values::number(2),
                                            IC::values::truth(false), IC::values::text("yes")})
         write(138, value);
-    EXPECT_EQ(commands.ran, Texts{});
+    EXPECT_EQ(commands.ran, Lines{});
     EXPECT_EQ(storedValue(anna(), 138), "text yes true");
 }
 
@@ -264,8 +256,8 @@ TEST_F(UserWrite, OfADeletionPassesTheUidThroughWideText)
 {
     WideTexts const texts;
     write(138, IC::values::number(1));
-    EXPECT_EQ(texts.widened, Texts{"1000"});
-    EXPECT_EQ(texts.narrowed, Texts{"1000"});
+    EXPECT_EQ(texts.widened, Lines{"1000"});
+    EXPECT_EQ(texts.narrowed, Lines{"1000"});
 }
 
 TEST_F(UserWrite, OfAnyOtherPropertyIsOnlyStored)
@@ -274,7 +266,7 @@ TEST_F(UserWrite, OfAnyOtherPropertyIsOnlyStored)
          {123U, 125U, 108U, 109U, 89U,  90U,  311U, 312U, 158U, 159U, 120U,
           163U, 162U, 161U, 44U,  119U, 113U, 160U, 106U, 51U,  74U,  4711U})
         write(id, IC::values::text("1"));
-    EXPECT_EQ(commands.ran, Texts{});
+    EXPECT_EQ(commands.ran, Lines{});
     EXPECT_FALSE(std::filesystem::exists("usrandpwd"));
     EXPECT_EQ(storedValue(anna(), 312), "text 1 true");
     EXPECT_EQ(storedValue(anna(), 4711), "text 1 true");
@@ -287,7 +279,7 @@ TEST_F(UserWrite, OfTheBuilderIsOnlyStored)
     write(91, IC::values::text("2008-01-11 00:00:00"));
     write(138, IC::values::number(1));
     IC::OSSWMI::MI_call = false;
-    EXPECT_EQ(commands.ran, Texts{});
+    EXPECT_EQ(commands.ran, Lines{});
     EXPECT_EQ(storedValue(anna(), 138), "number 1 true");
 }
 
@@ -296,7 +288,7 @@ TEST_F(UserWrite, SpeaksOfItself)
     log.clear();
     write(312, IC::values::text("x"));
     EXPECT_EQ(log.texts(3000),
-              (Texts{"UserNode::setProperty: entry", "UserNode::setProperty: exit"}));
+              (Lines{"UserNode::setProperty: entry", "UserNode::setProperty: exit"}));
 }
 
 TEST_F(UserWrite, LeavesTheOtherNodesAsTheyAre)

@@ -2,7 +2,7 @@
 
 #include "TestPaths.h"
 #include "host/Properties.h"
-#include "tests/support/Libc.h"
+#include "tests/interpose/Libc.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
@@ -20,8 +20,6 @@
 
 namespace
 {
-
-using Texts = std::vector<std::string>;
 
 /** What a driver node shows. */
 struct Driver {
@@ -54,18 +52,18 @@ protected:
         return drivers;
     }
 
-    Texts names()
+    Lines names()
     {
-        Texts found;
+        Lines found;
         for (Driver const& driver : shown())
             found.push_back(driver.name);
         return found;
     }
 
     /** The command lines that have to do with modules. */
-    static Texts ran()
+    static Lines ran()
     {
-        Texts found;
+        Lines found;
         for (std::string const& line : machine::ran())
             if (line.rfind("lsmod", 0) == 0 || line.rfind("modinfo", 0) == 0)
                 found.push_back(line);
@@ -95,7 +93,7 @@ TEST_F(Drivers, TakeOneLsmodAndOneModinfoForEachModule)
     machine::recordShell();
     shown();
     EXPECT_EQ(ran(),
-              (Texts{"lsmod", "modinfo e1000", "modinfo ext4", "modinfo nodesc", "modinfo twice",
+              (Lines{"lsmod", "modinfo e1000", "modinfo ext4", "modinfo nodesc", "modinfo twice",
                      "modinfo blank", "modinfo tight", "modinfo ghost", "modinfo wide"}));
 }
 
@@ -112,7 +110,7 @@ TEST_F(Drivers, AreFourHundredWhereTheKernelHasThatMany)
 
 TEST_F(Drivers, AreThoseOfTheKernel)
 {
-    Texts expected;
+    Lines expected;
     for (std::string const& line : linesOf(contentOf("/proc/modules")))
         expected.push_back(line.substr(0, line.find(' ')));
     EXPECT_EQ(names(), expected);
@@ -168,7 +166,7 @@ TEST_F(Drivers, LackTheOneThatModinfoCannotBeStartedFor)
     machine::lay("odd-modules");
     libc::refuse("modinfo ext4");
     Recording const recording;
-    EXPECT_EQ(names(), (Texts{"e1000", "nodesc", "twice", "blank", "tight", "ghost", "wide"}));
+    EXPECT_EQ(names(), (Lines{"e1000", "nodesc", "twice", "blank", "tight", "ghost", "wide"}));
     EXPECT_TRUE(recording.has("Cannot open process: modinfo", 3000));
 }
 

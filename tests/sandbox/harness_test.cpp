@@ -2,6 +2,7 @@
 
 #include "host/Properties.h"
 #include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 
@@ -11,8 +12,6 @@
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 TEST(ShellRecorder, NotesCommandLinesExactlyAndRunsThem)
 {

@@ -2,7 +2,8 @@
 
 #include "host/Properties.h"
 #include "mihost/runtime/Runtime.h"
-#include "tests/support/Libc.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -23,8 +24,6 @@
 
 namespace
 {
-
-using Texts = std::vector<std::string>;
 
 constexpr char path[] = "/var/log/messages";
 constexpr char wc[] = "wc -l /var/log/messages";
@@ -73,9 +72,9 @@ protected:
     }
 
     /** The messages stored in the entry nodes, in their order. */
-    Texts messages() const
+    Lines messages() const
     {
-        Texts found;
+        Lines found;
         for (IC::MutableNode const* entry : entries())
             found.push_back(stored(*entry, IC::property::message));
         return found;
@@ -92,9 +91,9 @@ protected:
 };
 
 /** "*message NEWEST*" down to the number of entries given. */
-Texts newest(int line, int entries)
+Lines newest(int line, int entries)
 {
-    Texts found;
+    Lines found;
     for (int i = 0; i < entries; ++i)
         found.push_back("*message " + std::to_string(line - i) + "*");
     return found;
@@ -128,13 +127,13 @@ TEST_F(Log, IsReadByTheCommandsOfEachReadInOrder)
     startOn(lines(3));
     machine::recordShell();
     text(*entries()[1], IC::property::message);
-    EXPECT_EQ(machine::ran(), (Texts{wc, wc, wc, sed(2)}));
+    EXPECT_EQ(machine::ran(), (Lines{wc, wc, wc, sed(2)}));
     machine::forget();
     text(*entries()[1], IC::property::creationTime);
-    EXPECT_EQ(machine::ran(), (Texts{wc, wc, wc, sed(2), "date"}));
+    EXPECT_EQ(machine::ran(), (Lines{wc, wc, wc, sed(2), "date"}));
     machine::forget();
     text(*entries()[1], IC::property::id);
-    EXPECT_EQ(machine::ran(), Texts{});
+    EXPECT_EQ(machine::ran(), Lines{});
 }
 
 TEST_F(Log, TakesNineCommandsForEachEntryAtTheStart)
@@ -142,14 +141,14 @@ TEST_F(Log, TakesNineCommandsForEachEntryAtTheStart)
     machine::write(path, lines(2));
     machine::recordShell();
     plugin.initialize();
-    Texts expected{wc};
+    Lines expected{wc};
     for (int const line : {2, 1})
         for (std::string const& command :
-             Texts{wc, wc, wc, sed(line), wc, wc, wc, sed(line), "date"})
+             Lines{wc, wc, wc, sed(line), wc, wc, wc, sed(line), "date"})
             expected.push_back(command);
-    Texts const all = machine::ran();
+    Lines const all = machine::ran();
     ASSERT_GE(all.size(), expected.size());
-    EXPECT_EQ(Texts(all.end() - static_cast<std::ptrdiff_t>(expected.size()), all.end()), expected);
+    EXPECT_EQ(Lines(all.end() - static_cast<std::ptrdiff_t>(expected.size()), all.end()), expected);
 }
 
 TEST_F(Log, ShowsTheTimeOfEachEntry)
@@ -185,7 +184,7 @@ TEST_F(Log, UnderstandsTheRealDate)
 TEST_F(Log, ShowsShortLinesAsEmptyMessages)
 {
     startOn("\nshort\nNov 20 10:11:12\nNov 20 10:11:13 \nNov 20 10:11:14 x\n");
-    EXPECT_EQ(messages(), (Texts{"*x*", "**", "**", "**", "**"}));
+    EXPECT_EQ(messages(), (Lines{"*x*", "**", "**", "**", "**"}));
     ASSERT_EQ(entries().size(), 5U);
     EXPECT_EQ(stored(*entries()[1], IC::property::creationTime), "2026-11-20 10:11:13");
     EXPECT_EQ(stored(*entries()[2], IC::property::creationTime), "2026-11-20 10:11:12");
@@ -198,7 +197,7 @@ TEST_F(Log, ShowsLinesWithAnotherStampWithoutATime)
 {
     startOn("2026-11-20T10:11:12.123456+00:00 host sshd[1]: session opened\n");
     ASSERT_EQ(entries().size(), 1U);
-    EXPECT_EQ(messages(), Texts{"*:12.123456+00:00 host sshd[1]: session opened*"});
+    EXPECT_EQ(messages(), Lines{"*:12.123456+00:00 host sshd[1]: session opened*"});
     EXPECT_EQ(stored(*entries()[0], IC::property::creationTime), "(unset)");
     EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "(status 1)");
 }
@@ -212,7 +211,7 @@ TEST_F(Log, LeavesOutALastLineThatHasNoEndYet)
 TEST_F(Log, ShowsTheFirst495CharactersOfALongMessage)
 {
     startOn("Nov 20 10:11:12 " + std::string(3000, 'm') + "\nNov 20 10:11:13 next\n");
-    EXPECT_EQ(messages(), (Texts{"*next*", "*" + std::string(495, 'm') + "*"}));
+    EXPECT_EQ(messages(), (Lines{"*next*", "*" + std::string(495, 'm') + "*"}));
 }
 
 TEST_F(Log, SurvivesBinaryGarbage)
@@ -248,7 +247,7 @@ TEST_F(Log, FailsTheReadsOfEntriesThatItHasLost)
     EXPECT_EQ(text(*entries()[1], IC::property::message), "**");
     EXPECT_EQ(text(*entries()[2], IC::property::message), "(status 1)");
     EXPECT_EQ(text(*entries()[2], IC::property::creationTime), "(status 1)");
-    EXPECT_EQ(recording.texts(6000), (Texts{"Invalid index: getMaxLine()=1, Index=3",
+    EXPECT_EQ(recording.texts(6000), (Lines{"Invalid index: getMaxLine()=1, Index=3",
                                             "Invalid index: getMaxLine()=1, logIndex=3"}));
 }
 
@@ -297,7 +296,7 @@ TEST_F(Log, HasAnEmptyEntryWhereSedCannotBeStarted)
     libc::refuse(sed(2));
     Recording const recording;
     startOn(lines(3));
-    EXPECT_EQ(messages(), (Texts{"*message 3*", "**", "*message 1*"}));
+    EXPECT_EQ(messages(), (Lines{"*message 3*", "**", "*message 1*"}));
     EXPECT_EQ(stored(*entries().at(1), IC::property::creationTime), "(unset)");
     EXPECT_TRUE(recording.has("sed -n '%dp' /var/log/messages", 6000));
 }
@@ -377,7 +376,7 @@ TEST_F(Log, GetsNewEntriesForLinesThatCameDuringTheClearing)
         .setProperty(IC::property::clearLog, {IC::Number(9U), true});
     EXPECT_EQ(told.deleted, 2);
     EXPECT_EQ(told.added, 1);
-    EXPECT_EQ(messages(), Texts{"*news*"});
+    EXPECT_EQ(messages(), Lines{"*news*"});
 }
 
 TEST_F(Log, KeepsLinesAndEntriesWhereItMayNotBeCleared)

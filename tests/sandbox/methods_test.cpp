@@ -3,6 +3,7 @@
 
 #include "host/Properties.h"
 #include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -16,8 +17,6 @@
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 /** A machine with the plug-in on it, seen from the host. */
 class HostedMachine

@@ -2,6 +2,7 @@
 
 #include "host/Properties.h"
 #include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -10,8 +11,6 @@
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 class Power : public testing::Test
 {
@@ -41,14 +40,14 @@ protected:
 
 TEST_F(Power, StatusOfflineHaltsTheMachine)
 {
-    EXPECT_TRUE(call("_ZN2NQ6OsInfo13statusOfflineEv"));
+    EXPECT_TRUE(call("NQ::OsInfo::statusOffline()"));
     expectRan("/sbin/shutdown -h now");
     EXPECT_EQ(recording.texts(4000), Lines{"Halt after shutdown."});
 }
 
 TEST_F(Power, StatusResetRestartsTheMachine)
 {
-    EXPECT_TRUE(call("_ZN2NQ6OsInfo11statusResetEv"));
+    EXPECT_TRUE(call("NQ::OsInfo::statusReset()"));
     expectRan("/sbin/shutdown -r now");
     EXPECT_EQ(recording.texts(4000), Lines{"Reboot after shutdown."});
 }

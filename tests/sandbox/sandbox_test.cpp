@@ -1,6 +1,7 @@
 // What a copy of the machine is like from inside.
 
 #include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 
 #include <cctype>
@@ -24,8 +25,6 @@
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 std::set<std::string> namesIn(char const* folder)
 {

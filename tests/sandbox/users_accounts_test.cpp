@@ -19,8 +19,6 @@
 namespace
 {
 
-using Texts = std::vector<std::string>;
-
 constexpr unsigned int jdoeId = 4711;
 
 std::string outputOf(std::string const& command)
@@ -113,7 +111,7 @@ TEST_F(RealAccounts, StandInTheTreeAsUseraddAndChageMadeThem)
     EXPECT_EQ(stored(node, IC::property::lastPwdChange), "2020-01-15 00:00:00");
     EXPECT_EQ(stored(node, IC::property::inactiveTime), "2030-06-01 00:00:00");
     EXPECT_EQ(stored(node, IC::property::passwordExpiration), "2030-06-01 00:00:00");
-    EXPECT_EQ(machine::ran(), Texts{});
+    EXPECT_EQ(machine::ran(), Lines{});
 }
 
 TEST_F(RealAccounts, HaveTheirDatesAtLocalMidnightWestAndEastOfGreenwich)
@@ -154,7 +152,7 @@ TEST_F(RealAccounts, GetANewPasswordThatIsWritten)
 {
     load();
     write(IC::property::password, written("$6$salt$newhash"));
-    EXPECT_EQ(machine::ran(), Texts{"chpasswd -e < usrandpwd ; rm -f usrandpwd"});
+    EXPECT_EQ(machine::ran(), Lines{"chpasswd -e < usrandpwd ; rm -f usrandpwd"});
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), "$6$salt$newhash");
     EXPECT_FALSE(std::filesystem::exists("usrandpwd"));
 }
@@ -173,7 +171,7 @@ TEST_F(RealAccounts, BecomeInactiveOnADateThatIsWrittenAsText)
 {
     load();
     write(IC::property::inactiveTime, written("2020-05-14 00:00:00"));
-    EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -I 30 jdoe"}));
+    EXPECT_EQ(machine::ran(), (Lines{"chage -l jdoe", "chage -I 30 jdoe"}));
     EXPECT_EQ(listed("Password expires"), "Apr 14, 2020");
     EXPECT_EQ(listed("Password inactive"), "May 14, 2020");
 }
@@ -186,7 +184,7 @@ TEST_F(RealAccounts, BecomeInactiveOnADateThatIsWrittenAsADate)
         run("chage -I 20 jdoe");
         machine::forget();
         write(IC::property::inactiveTime, midnight(2020, 5, 15));
-        EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -I 31 jdoe"})) << zone;
+        EXPECT_EQ(machine::ran(), (Lines{"chage -l jdoe", "chage -I 31 jdoe"})) << zone;
         EXPECT_EQ(listed("Password inactive"), "May 15, 2020") << zone;
     }
 }
@@ -195,7 +193,7 @@ TEST_F(RealAccounts, GetAnInactivityOf99999DaysWhereTheDateLiesBeforeTheExpiry)
 {
     load();
     write(IC::property::inactiveTime, written("2020-04-13 00:00:00"));
-    EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -I 99999 jdoe"}));
+    EXPECT_EQ(machine::ran(), (Lines{"chage -l jdoe", "chage -I 99999 jdoe"}));
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(6), "99999");
 }
 
@@ -203,7 +201,7 @@ TEST_F(RealAccounts, HaveTheirPasswordExpireOnADateThatIsWrittenAsText)
 {
     load();
     write(IC::property::passwordExpiration, written("2020-02-14 00:00:00"));
-    EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -M 30 jdoe"}));
+    EXPECT_EQ(machine::ran(), (Lines{"chage -l jdoe", "chage -M 30 jdoe"}));
     EXPECT_EQ(listed("Password expires"), "Feb 14, 2020");
 }
 
@@ -211,7 +209,7 @@ TEST_F(RealAccounts, HaveTheirPasswordExpireOnADateThatIsWrittenAsADate)
 {
     load();
     write(IC::property::passwordExpiration, midnight(2020, 2, 15));
-    EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -M 31 jdoe"}));
+    EXPECT_EQ(machine::ran(), (Lines{"chage -l jdoe", "chage -M 31 jdoe"}));
     EXPECT_EQ(listed("Password expires"), "Feb 15, 2020");
 }
 
@@ -220,14 +218,14 @@ TEST_F(RealAccounts, CountFrom1970WhereThePasswordNeverExpires)
     run("chage -M -1 jdoe");
     load();
     write(IC::property::inactiveTime, written("2020-05-14 00:00:00"));
-    EXPECT_EQ(machine::ran(), (Texts{"chage -l jdoe", "chage -I 18396 jdoe"}));
+    EXPECT_EQ(machine::ran(), (Lines{"chage -l jdoe", "chage -I 18396 jdoe"}));
 }
 
 TEST_F(RealAccounts, AreNotDeletedSinceUserdelIsGivenTheirUid)
 {
     load();
     write(IC::property::deleteUser, {IC::Number(1U), true});
-    EXPECT_EQ(machine::ran(), Texts{"userdel -r 4711"});
+    EXPECT_EQ(machine::ran(), Lines{"userdel -r 4711"});
     EXPECT_FALSE(machine::entry("/etc/passwd", "jdoe").empty());
     EXPECT_TRUE(std::filesystem::exists("/home/jdoe"));
 }
@@ -241,7 +239,7 @@ TEST_F(RealAccounts, AreDeletedWithTheirHomeWhereTheUidIsTheName)
                   .setProperty(IC::property::deleteUser, yes)
                   .getStatus(),
               0);
-    EXPECT_EQ(machine::ran(), Texts{"userdel -r 4712"});
+    EXPECT_EQ(machine::ran(), Lines{"userdel -r 4712"});
     EXPECT_TRUE(machine::entry("/etc/passwd", "4712").empty());
     EXPECT_FALSE(std::filesystem::exists("/home/4712"));
 }
@@ -256,7 +254,7 @@ TEST_F(RealAccounts, StandInTheirGroupsAsGroupaddAndUsermodMadeThem)
     EXPECT_EQ(stored(plugin.node(IC::nodeType::group, "jdoe"), IC::property::members), "jdoe,anna");
     EXPECT_EQ(stored(plugin.node(IC::nodeType::group, "team"), IC::property::id), "4713");
     EXPECT_EQ(stored(plugin.node(IC::nodeType::group, "team"), IC::property::members), "jdoe");
-    EXPECT_EQ(machine::ran(), Texts{});
+    EXPECT_EQ(machine::ran(), Lines{});
 }
 
 TEST_F(RealAccounts, HaveTheirGroupsCountedLiveWithoutARefresh)
@@ -270,9 +268,9 @@ TEST_F(RealAccounts, HaveTheirGroupsCountedLiveWithoutARefresh)
 }
 
 /** What stands in one property of all nodes of a type, in their order. */
-Texts all(Plugin const& plugin, unsigned int type, unsigned int id)
+Lines all(Plugin const& plugin, unsigned int type, unsigned int id)
 {
-    Texts found;
+    Lines found;
     for (IC::MutableNode const* node : plugin.nodes(type))
         found.push_back(stored(*node, id));
     return found;
@@ -284,13 +282,13 @@ TEST(LaidMachine, ShowsItsUsersAndGroupsInTheOrderOfItsFiles)
     Plugin plugin;
     plugin.initialize();
     EXPECT_EQ(all(plugin, IC::nodeType::user, IC::property::name),
-              (Texts{"root", "anna", "ben", "carl"}));
+              (Lines{"root", "anna", "ben", "carl"}));
     EXPECT_EQ(all(plugin, IC::nodeType::user, IC::property::maxLoginFailures),
-              (Texts{"3", "3", "3", "3"}));
+              (Lines{"3", "3", "3", "3"}));
     EXPECT_EQ(all(plugin, IC::nodeType::group, IC::property::name),
-              (Texts{"root", "anna", "ben", "team"}));
+              (Lines{"root", "anna", "ben", "team"}));
     EXPECT_EQ(all(plugin, IC::nodeType::group, IC::property::members),
-              (Texts{"root", "anna", "ben", "anna,ben,carl"}));
+              (Lines{"root", "anna", "ben", "anna,ben,carl"}));
 }
 
 TEST(LaidMachine, ShowsAGroupOfTenThousandMembersWhole)
@@ -303,7 +301,7 @@ TEST(LaidMachine, ShowsAGroupOfTenThousandMembersWhole)
     Plugin plugin;
     plugin.initialize();
     EXPECT_EQ(all(plugin, IC::nodeType::group, IC::property::members),
-              (Texts{"root", members, ""}));
+              (Lines{"root", members, ""}));
 }
 
 } // namespace

@@ -3,7 +3,7 @@
 
 #include "mihost/accel/Accel.h"
 #include "mihost/accel/Stream.h"
-#include "tests/support/Libc.h"
+#include "tests/interpose/Libc.h"
 
 #include <array>
 #include <cstdio>
@@ -26,9 +26,9 @@ inline std::string readAll(FILE* stream)
 /** By a real shell. What it writes to standard error is added to the text. */
 inline std::string real(std::string const& command)
 {
-    FILE* const stream = libc::realPopen(("{ " + command + "; } 2>&1").c_str(), "r");
+    FILE* const stream = interpose::real(popen)(("{ " + command + "; } 2>&1").c_str(), "r");
     std::string text = readAll(stream);
-    libc::realPclose(stream);
+    interpose::real(pclose)(stream);
     return text;
 }
 

@@ -1,7 +1,7 @@
 #ifndef TESTS_SUPPORT_FAKEFILES_H
 #define TESTS_SUPPORT_FAKEFILES_H
 
-#include "tests/support/Libc.h"
+#include "tests/support/FileRoot.h"
 #include "tests/support/ScratchFolder.h"
 
 #include <string>
@@ -29,7 +29,7 @@ public:
 
 private:
     ScratchFolder folder_;
-    libc::FileRoot root_;
+    FileRoot root_;
 };
 
 #endif

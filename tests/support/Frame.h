@@ -1,20 +1,20 @@
 #ifndef TESTS_SUPPORT_FRAME_H
 #define TESTS_SUPPORT_FRAME_H
 
-#include "frame/OsSwMI.h"
 #include "host/Properties.h"
+#include "tests/support/Insides.h"
 #include "tests/support/NodeCalls.h"
 
 #include <string>
 #include <vector>
 
 /**
- * The interface object with its insides open, for tests that are linked to the plug-in's objects.
+ * The interface object for tests that are linked to the plug-in's objects.
  *
  * Its own id is 7 and the builders have not run; an operating-system node, with the id 8, stands
  * for what they would find.
  */
-class Frame : public IC::OsSwMI
+class Frame : public OpenInterface
 {
 public:
     Frame()
@@ -46,17 +46,6 @@ public:
         deleted.push_back(node);
         return OsSwMI::deleteNode(node);
     }
-
-    using OsSwMI::currentNode_;
-    using OsSwMI::groupNodes_;
-    using OsSwMI::logEntryNodes_;
-    using OsSwMI::logNode_;
-    using OsSwMI::miIds_;
-    using OsSwMI::nextNodeId_;
-    using OsSwMI::nodeIds_;
-    using OsSwMI::nodes_;
-    using OsSwMI::osNode_;
-    using OsSwMI::userNodes_;
 
     /** The nodes of one kind, in the order of the framework's list. */
     std::vector<IC::MutableNode*> ofType(unsigned int type) const

@@ -11,10 +11,10 @@ std::string contentOf(std::string const& path)
     return text.str();
 }
 
-std::vector<std::string> linesOf(std::string const& text)
+Lines linesOf(std::string const& text)
 {
     std::istringstream stream(text);
-    std::vector<std::string> lines;
+    Lines lines;
     for (std::string line; std::getline(stream, line);)
         lines.push_back(line);
     return lines;

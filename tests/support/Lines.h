@@ -4,10 +4,12 @@
 #include <string>
 #include <vector>
 
-/** The text of a file; empty where it cannot be read. */
+using Lines = std::vector<std::string>;
+
+/** The text of a file; empty if it cannot be read. */
 std::string contentOf(std::string const& path);
 
 /** The lines of a text, without their ends. */
-std::vector<std::string> linesOf(std::string const& text);
+Lines linesOf(std::string const& text);
 
 #endif

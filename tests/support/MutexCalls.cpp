@@ -1,39 +1,22 @@
 #include "tests/support/MutexCalls.h"
 
-#include "tests/support/Next.h"
-
-namespace
-{
-MutexCalls* inUse = nullptr;
-}
+#include "tests/interpose/Host.h"
 
 MutexCalls::MutexCalls()
 {
-    inUse = this;
+    host::hooks().lock.watch([this](NQ::Mutex* mutex, unsigned long timeout) {
+        if (onLock)
+            onLock(*mutex, timeout);
+    });
+    host::hooks().unlock = [this](NQ::Mutex* mutex) {
+        int const answer = onUnlock ? onUnlock(*mutex) : 0;
+        int const result = host::hooks().unlock.real()(mutex);
+        return answer != 0 ? answer : result;
+    };
 }
 
 MutexCalls::~MutexCalls()
 {
-    inUse = nullptr;
+    host::hooks().lock.reset();
+    host::hooks().unlock.reset();
 }
-
-namespace NQ
-{
-
-int Mutex::lock(unsigned long timeout)
-{
-    static auto* const real = next<int(Mutex*, unsigned long)>("_ZN2NQ5Mutex4lockEm");
-    if (inUse && inUse->onLock)
-        inUse->onLock(*this, timeout);
-    return real(this, timeout);
-}
-
-int Mutex::unlock()
-{
-    static auto* const real = next<int(Mutex*)>("_ZN2NQ5Mutex6unlockEv");
-    int const answer = inUse && inUse->onUnlock ? inUse->onUnlock(*this) : 0;
-    int const result = real(this);
-    return answer != 0 ? answer : result;
-}
-
-} // namespace NQ

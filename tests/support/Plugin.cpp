@@ -4,6 +4,7 @@
 
 #include "host/OpenMI.h"
 #include "host/Properties.h"
+#include "tests/support/Symbols.h"
 
 #include <algorithm>
 #include <dlfcn.h>
@@ -49,9 +50,10 @@ void Plugin::unload()
     interface_->unload();
 }
 
-void* Plugin::symbol(char const* name) const
+void* Plugin::symbol(std::string const& name) const
 {
-    return dlsym(library_, name);
+    void* const found = dlsym(library_, name.c_str());
+    return found ? found : findSymbol(library_, name);
 }
 
 std::vector<IC::MutableNode*> Plugin::nodes() const

@@ -34,8 +34,12 @@ public:
     IC::Error initialize(unsigned int first = 1);
     void unload();
 
-    /** The address of one of the library's own symbols, null where it has none. */
-    void* symbol(char const* name) const;
+    /**
+     * The address of one of the library's own symbols, null if it has none of this name.
+     *
+     * @param name  as C++ writes it, such as "IC::OsSwMI::createUserNodes(bool)", or as the linker
+     */
+    void* symbol(std::string const& name) const;
 
     /** All nodes in the order of the framework's list. */
     std::vector<IC::MutableNode*> nodes() const;

@@ -1,11 +1,11 @@
 // Each test begins with the state of the process that the first one began with, so that tests do
 // not depend on their order.
 
-#include "tests/support/Libc.h"
-#include "tests/support/Next.h"
+#include "tests/interpose/Call.h"
 
 #include <clocale>
 #include <ctime>
+#include <dlfcn.h>
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <sys/stat.h>
@@ -54,7 +54,7 @@ public:
         std::filesystem::current_path(folder_);
         std::setlocale(LC_ALL, locale_.c_str());
         umask(mask_);
-        libc::hooks() = {};
+        interpose::resetAll();
         forgetIdRanges();
     }
 

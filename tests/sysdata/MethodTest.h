@@ -2,7 +2,9 @@
 #define TESTS_SYSDATA_METHODTEST_H
 
 #include "sysdata/osInfo_linux.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
@@ -14,7 +16,6 @@
 class MethodTest : public testing::Test
 {
 protected:
-    using Lines = std::vector<std::string>;
     using Params = std::vector<NQ::ParamInfo>;
 
     MethodTest()
@@ -40,7 +41,7 @@ protected:
     }
 
     FakeFiles files_;
-    libc::FakeCommands commands_;
+    FakeCommands commands_;
 };
 
 #endif

@@ -1,5 +1,7 @@
 #include "sysdata/driverInfo_linux.h"
-#include "tests/support/Libc.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
@@ -11,7 +13,6 @@ namespace
 {
 
 using NQ::driverInfo;
-using Texts = std::vector<std::string>;
 
 constexpr char header[] = "Module                  Size  Used by\n";
 
@@ -26,16 +27,16 @@ protected:
     }
 
     /** What a listing logs besides entry and exit lines. */
-    Texts remarks()
+    Lines remarks()
     {
         Recording const recording;
         list();
         return recording.remarks();
     }
 
-    Texts names()
+    Lines names()
     {
-        Texts found;
+        Lines found;
         for (driverInfo const& driver : list())
             found.push_back(driver.getName());
         return found;
@@ -48,7 +49,7 @@ protected:
         return drivers.empty() ? driverInfo() : drivers.front();
     }
 
-    libc::FakeCommands commands;
+    FakeCommands commands;
 };
 
 TEST_F(DriverInventory, ListsModulesInTheOrderOfLsmod)
@@ -72,8 +73,8 @@ TEST_F(DriverInventory, ListsModulesInTheOrderOfLsmod)
         EXPECT_EQ(driver.getBuildNumber(), "");
         EXPECT_EQ(driver.getManufacturer(), "");
     }
-    EXPECT_EQ(commands.ran, (Texts{"lsmod", "modinfo xfs", "modinfo ext4", "modinfo zram"}));
-    EXPECT_EQ(commands.modes, Texts(4, "r"));
+    EXPECT_EQ(commands.ran, (Lines{"lsmod", "modinfo xfs", "modinfo ext4", "modinfo zram"}));
+    EXPECT_EQ(commands.modes, Lines(4, "r"));
     EXPECT_EQ(commands.open, 0);
 }
 
@@ -81,8 +82,8 @@ TEST_F(DriverInventory, KeepsLsmodOpenWhileEachModinfoRuns)
 {
     commands.answers = {{"lsmod", "a\nb\n"}, {"modinfo a", ""}, {"modinfo b", ""}};
     std::vector<int> openBefore;
-    libc::hooks().popen = [this, &openBefore, fake = libc::hooks().popen](char const* command,
-                                                                          char const* mode) {
+    libc::hooks().popen = [this, &openBefore, fake = libc::hooks().popen.answer()](
+                              char const* command, char const* mode) {
         openBefore.push_back(commands.open);
         return fake(command, mode);
     };
@@ -94,13 +95,13 @@ TEST_F(DriverInventory, IsEmptyWithTheHeaderAlone)
 {
     commands.answers = {{"lsmod", header}};
     EXPECT_TRUE(list().empty());
-    EXPECT_EQ(commands.ran, Texts{"lsmod"});
+    EXPECT_EQ(commands.ran, Lines{"lsmod"});
 }
 
 TEST_F(DriverInventory, IsEmptyWhenLsmodPrintsNothing)
 {
     commands.answers = {{"lsmod", ""}};
-    EXPECT_EQ(remarks(), Texts{});
+    EXPECT_EQ(remarks(), Lines{});
     EXPECT_TRUE(list().empty());
 }
 
@@ -120,18 +121,18 @@ TEST_F(DriverInventory, IsEmptiedWhenLsmodCannotBeStarted)
     NQ::getDriverInfo(drivers);
     EXPECT_TRUE(drivers.empty());
     EXPECT_EQ(recording.texts(3000),
-              (Texts{"getDriverInfo: entry", "Cannot open process: lsmod", "getDriverInfo: exit"}));
-    EXPECT_EQ(recording.texts(6000), Texts{});
-    EXPECT_EQ(commands.ran, Texts{"lsmod"});
+              (Lines{"getDriverInfo: entry", "Cannot open process: lsmod", "getDriverInfo: exit"}));
+    EXPECT_EQ(recording.texts(6000), Lines{});
+    EXPECT_EQ(commands.ran, Lines{"lsmod"});
 }
 
 TEST_F(DriverInventory, LeavesOutAModuleThatModinfoCannotBeStartedFor)
 {
     commands.answers = {{"lsmod", "a\nb\nc\n"}, {"modinfo a", ""}, {"modinfo c", ""}};
     Recording const recording;
-    EXPECT_EQ(names(), (Texts{"a", "c"}));
+    EXPECT_EQ(names(), (Lines{"a", "c"}));
     EXPECT_TRUE(recording.has("Cannot open process: modinfo", 3000));
-    EXPECT_EQ(recording.texts(6000), Texts{});
+    EXPECT_EQ(recording.texts(6000), Lines{});
     EXPECT_EQ(commands.open, 0);
 }
 
@@ -148,9 +149,9 @@ TEST_F(DriverInventory, ReportsABlankLineAndGoesOn)
 {
     commands.answers = {{"lsmod", "\n \t\nloop 1 0\n"}, {"modinfo loop", ""}};
     Recording const recording;
-    EXPECT_EQ(names(), Texts{"loop"});
+    EXPECT_EQ(names(), Lines{"loop"});
     EXPECT_EQ(recording.texts(6000),
-              (Texts{"Invalid format: buffer1 = \n", "Invalid format: buffer1 =  \t\n"}));
+              (Lines{"Invalid format: buffer1 = \n", "Invalid format: buffer1 =  \t\n"}));
 }
 
 TEST_F(DriverInventory, SkipsAModuleNamedLikeTheHeader)
@@ -158,8 +159,8 @@ TEST_F(DriverInventory, SkipsAModuleNamedLikeTheHeader)
     commands.answers = {{"lsmod", "Module_mine 1 0\nloop 1 0\n"},
                         {"modinfo Module_mine", ""},
                         {"modinfo loop", ""}};
-    EXPECT_EQ(names(), Texts{"loop"});
-    EXPECT_EQ(commands.ran, (Texts{"lsmod", "modinfo loop"}));
+    EXPECT_EQ(names(), Lines{"loop"});
+    EXPECT_EQ(commands.ran, (Lines{"lsmod", "modinfo loop"}));
 }
 
 TEST_F(DriverInventory, ReportsFactsWithoutASpaceAndKeepsTheEarlierOnes)
@@ -170,7 +171,7 @@ TEST_F(DriverInventory, ReportsFactsWithoutASpaceAndKeepsTheEarlierOnes)
     driverInfo const driver = only();
     EXPECT_EQ(driver.getVersion(), "1");
     EXPECT_EQ(driver.getDescription(), "Driver");
-    EXPECT_EQ(recording.texts(6000), (Texts{"Invalid format: buffer2 = version:2\n",
+    EXPECT_EQ(recording.texts(6000), (Lines{"Invalid format: buffer2 = version:2\n",
                                             "Invalid format: buffer2 = description:disk\n"}));
 }
 
@@ -188,13 +189,13 @@ TEST_F(DriverInventory, LogsEveryStepInOrder)
     list();
     EXPECT_EQ(
         recording.texts(3000),
-        (Texts{"getDriverInfo: entry", "buffer = Module                  Size  Used by\n",
+        (Lines{"getDriverInfo: entry", "buffer = Module                  Size  Used by\n",
                "buffer = loop 1 0\n", "buffer2 = version: 1\n", "strget: entry", "strget: exit",
                "setVersion: entry", "setVersion: exit", "buffer2 = license: GPL\n",
                "setDescription: entry", "setDescription: exit", "setName: entry", "setName: exit",
                "setBuildNumber: entry", "setBuildNumber: exit", "setManufacturer: entry",
                "setManufacturer: exit", "getDriverInfo: exit"}));
-    EXPECT_EQ(recording.texts(6000), Texts{});
+    EXPECT_EQ(recording.texts(6000), Lines{});
 }
 
 TEST_F(DriverInventory, SpeaksUnderItsOwnNameUnitAndCategory)
@@ -202,7 +203,7 @@ TEST_F(DriverInventory, SpeaksUnderItsOwnNameUnitAndCategory)
     commands.answers = {{"lsmod", "\nloop\ngone\n"}, {"modinfo loop", "version:1\n"}};
     Recording const recording;
     list();
-    Texts said;
+    Lines said;
     for (LogRecord const& record : recording.records()) {
         bool const own = record.function == "getDriverInfo";
         if (own) {
@@ -211,7 +212,7 @@ TEST_F(DriverInventory, SpeaksUnderItsOwnNameUnitAndCategory)
             EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.DriverInfo");
         }
     }
-    Texts twice;
+    Lines twice;
     for (char const* text :
          {"getDriverInfo: entry", "buffer = \n", "Invalid format: buffer1 = \n", "buffer = loop\n",
           "buffer2 = version:1\n", "Invalid format: buffer2 = version:1\n", "buffer = gone\n",
@@ -246,14 +247,14 @@ TEST_F(DriverInventory, TakesThePiecesOfALongLsmodLineForLinesOfTheirOwn)
     // 511 characters, of which the last are blanks; "tail" begins the second piece.
     std::string const line = "loop" + std::string(507, ' ') + "tail 1 0\n";
     commands.answers = {{"lsmod", line}, {"modinfo loop", ""}, {"modinfo tail", ""}};
-    EXPECT_EQ(names(), (Texts{"loop", "tail"}));
+    EXPECT_EQ(names(), (Lines{"loop", "tail"}));
 }
 
 TEST_F(DriverInventory, RunsTheLongestCommandThatFitsItsBuffer)
 {
     std::string const module(503, 'm');
     commands.answers = {{"lsmod", module + " 1\n"}, {"modinfo " + module, ""}};
-    EXPECT_EQ(names(), Texts{module});
+    EXPECT_EQ(names(), Lines{module});
 }
 
 TEST_F(DriverInventory, RunsNothingForACommandThatDoesNotFitItsBuffer)
@@ -261,9 +262,9 @@ TEST_F(DriverInventory, RunsNothingForACommandThatDoesNotFitItsBuffer)
     std::string const module(504, 'm');
     commands.answers = {{"lsmod", module + " 1\nloop\n"}, {"modinfo loop", ""}};
     Recording const recording;
-    EXPECT_EQ(names(), Texts{"loop"});
-    EXPECT_EQ(commands.ran, (Texts{"lsmod", "modinfo loop"}));
-    EXPECT_EQ(recording.texts(6000), Texts{"Command too long: modinfo " + module});
+    EXPECT_EQ(names(), Lines{"loop"});
+    EXPECT_EQ(commands.ran, (Lines{"lsmod", "modinfo loop"}));
+    EXPECT_EQ(recording.texts(6000), Lines{"Command too long: modinfo " + module});
 }
 
 TEST_F(DriverInventory, TakesALastLineWithoutAnEnd)
@@ -282,7 +283,7 @@ TEST_F(DriverInventory, EndsALineAtANulByte)
     EXPECT_EQ(driver.getVersion(), "1");
     EXPECT_EQ(driver.getDescription(), "Driver");
     EXPECT_EQ(recording.texts(6000),
-              (Texts{"Invalid format: buffer1 = ", "Invalid format: buffer2 = description:"}));
+              (Lines{"Invalid format: buffer1 = ", "Invalid format: buffer2 = description:"}));
 }
 
 TEST_F(DriverInventory, SurvivesBinaryGarbage)
@@ -291,7 +292,7 @@ TEST_F(DriverInventory, SurvivesBinaryGarbage)
     for (unsigned int i = 0; i < 5000; ++i)
         garbage.push_back(static_cast<char>((i * 7919U) >> 3));
     commands.answers = {{"lsmod", garbage + "\nloop 1 0\n"}, {"modinfo loop", garbage}};
-    Texts const found = names();
+    Lines const found = names();
     ASSERT_FALSE(found.empty());
     EXPECT_EQ(found.back(), "loop");
     EXPECT_EQ(commands.open, 0);
@@ -300,7 +301,7 @@ TEST_F(DriverInventory, SurvivesBinaryGarbage)
 TEST_F(DriverInventory, ListsFourHundredModules)
 {
     std::string lsmod = header;
-    Texts expected;
+    Lines expected;
     for (int i = 0; i < 400; ++i) {
         expected.push_back("module" + std::to_string(i));
         lsmod += expected.back() + " 16384 0\n";
@@ -321,7 +322,7 @@ TEST_F(DriverInventory, CompletesARecordStepByStep)
     commands.answers = {{"lsmod", "loop 1 0\n"}, {"modinfo loop", ""}};
     Recording const recording;
     list();
-    Texts expected{"getDriverInfo: entry", "buffer = loop 1 0\n"};
+    Lines expected{"getDriverInfo: entry", "buffer = loop 1 0\n"};
     for (std::string const setter :
          {"setVersion", "setDescription", "setName", "setBuildNumber", "setManufacturer"}) {
         expected.push_back(setter + ": entry");
@@ -335,7 +336,7 @@ TEST_F(DriverInventory, DoesNotLookAtHowItsCommandsEnded)
 {
     commands.answers = {{"lsmod", "loop 1 0\n"},
                         {"modinfo loop", "version: 1\ndescription: Disk\n"}};
-    libc::hooks().pclose = [close = libc::hooks().pclose](FILE* stream) {
+    libc::hooks().pclose = [close = libc::hooks().pclose.answer()](FILE* stream) {
         close(stream);
         return 1 << 8;
     };

@@ -5,6 +5,8 @@
 #include "sysdata/minMaxId.h"
 #include "sysdata/osInfo_linux.h"
 #include "sysdata/userInfo_linux.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
 
 #include <gtest/gtest.h>
@@ -32,7 +34,7 @@ protected:
         files_.write("/var/log/messages", "line\n");
         NQ::minMaxId::Instance(); // has read its file now
         commands_.otherwise = "";
-        auto const below = libc::hooks().fopen;
+        auto const below = libc::hooks().fopen.answer();
         libc::hooks().fopen = [this, below](char const* path, char const* mode) {
             if (noting_)
                 opened_.insert(std::string(path) + "|" + mode);
@@ -66,7 +68,7 @@ protected:
     }
 
     FakeFiles const files_;
-    libc::FakeCommands commands_;
+    FakeCommands commands_;
     bool noting_ = false;
     Opened opened_;
     NQ::OsInfo info_;

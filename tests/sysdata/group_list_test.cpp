@@ -2,7 +2,10 @@
 #include "sysdata/groupInfo_linux.h"
 
 #include "sysdata/minMaxId.h"
+#include "tests/interpose/Libc.h"
 #include "tests/support/FakeFiles.h"
+#include "tests/support/FileRoot.h"
+#include "tests/support/Lines.h"
 #include "tests/support/MutexCalls.h"
 #include "tests/support/Recording.h"
 
@@ -18,7 +21,6 @@ namespace
 {
 
 using NQ::groupInfo;
-using Lines = std::vector<std::string>;
 
 /** Name, id and members. */
 std::string shown(groupInfo& group)
@@ -41,7 +43,7 @@ Lines listed()
 
 Lines groupsOn(std::string const& machine)
 {
-    libc::FileRoot const root(MACHINES_DIR "/" + machine);
+    FileRoot const root(MACHINES_DIR "/" + machine);
     return listed();
 }
 
@@ -75,10 +77,10 @@ protected:
     {
         files_.write("/etc/login.defs", "GID_MIN 500\nGID_MAX 60000\n");
         NQ::minMaxId::Instance();
-        auto const rewind = libc::hooks().setgrent;
-        auto const next = libc::hooks().getgrent;
-        auto const close = libc::hooks().endgrent;
-        auto const open = libc::hooks().fopen;
+        auto const rewind = libc::hooks().setgrent.answer();
+        auto const next = libc::hooks().getgrent.answer();
+        auto const close = libc::hooks().endgrent.answer();
+        auto const open = libc::hooks().fopen.answer();
         libc::hooks().setgrent = [this, rewind] {
             steps_.emplace_back("setgrent");
             rewind();
@@ -209,7 +211,7 @@ TEST_F(GroupListing, UsesTheSameMutexEachTime)
 
 TEST_F(GroupListing, ClosesTheDatabaseAndUnlocksWhenAnExceptionPasses)
 {
-    auto const next = libc::hooks().getgrent;
+    auto const next = libc::hooks().getgrent.answer();
     libc::hooks().getgrent = []() -> group* { throw std::bad_alloc(); };
     std::vector<groupInfo> groups;
     EXPECT_THROW(NQ::getGroupInfo(groups), std::bad_alloc);

@@ -1,5 +1,7 @@
 #include "sysdata/groupInfo_linux.h"
 
+#include "tests/interpose/Libc.h"
+#include "tests/support/Account.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Recording.h"
 
@@ -13,11 +15,6 @@ namespace
 
 using NQ::groupInfo;
 using Names = std::vector<std::string>;
-
-std::string account(std::string const& name, unsigned int gid)
-{
-    return name + ":x:1000:" + std::to_string(gid) + "::/home/" + name + ":/bin/sh\n";
-}
 
 /** The members of a group with the given id, as the group's own list names them. */
 Names members(unsigned int gid, Names own)
@@ -68,8 +65,8 @@ TEST(GroupRecord, IsCopiedMemberByMember)
 TEST(GroupRecord, JoinsPrimaryMembersInFileOrderAndThenItsOwnWithoutRepeating)
 {
     FakeFiles const files;
-    files.write("/etc/passwd", account("root", 0) + account("anna", 500) + account("zoe", 501) +
-                                   account("ben", 500));
+    files.write("/etc/passwd", account("root", 1000, 0) + account("anna", 1000, 500) +
+                                   account("zoe", 1000, 501) + account("ben", 1000, 500));
     EXPECT_EQ(members(500, {"ben", "Xaver"}), (Names{"anna", "ben", "Xaver"}));
 }
 
@@ -90,21 +87,21 @@ TEST(GroupRecord, HasItsOwnMembersAloneWithoutAnAccountFile)
 TEST(GroupRecord, LosesAMemberWhenAListedNameEndsInIt)
 {
     FakeFiles const files;
-    files.write("/etc/passwd", account("xbob", 500));
+    files.write("/etc/passwd", account("xbob", 1000, 500));
     EXPECT_EQ(members(500, {"bob", "bobx"}), (Names{"xbob", "bobx"}));
 }
 
 TEST(GroupRecord, StartsItsMembersAfresh)
 {
     FakeFiles const files;
-    files.write("/etc/passwd", account("anna", 500));
+    files.write("/etc/passwd", account("anna", 1000, 500));
     char* none[] = {nullptr};
     groupInfo group("team");
     group.setGroupId(500);
     group.setGroupMembers(none);
     group.setGroupMembers(none);
     EXPECT_EQ(group.getGroupMembers(), Names{"anna"});
-    files.write("/etc/passwd", account("ben", 500));
+    files.write("/etc/passwd", account("ben", 1000, 500));
     group.setGroupMembers(none);
     EXPECT_EQ(group.getGroupMembers(), Names{"ben"});
 }
@@ -112,9 +109,9 @@ TEST(GroupRecord, StartsItsMembersAfresh)
 TEST(GroupRecord, ReadsTheAccountFileInItsOwnMode)
 {
     FakeFiles const files;
-    files.write("/etc/passwd", account("anna", 500));
+    files.write("/etc/passwd", account("anna", 1000, 500));
     Names opened;
-    auto const below = libc::hooks().fopen;
+    auto const below = libc::hooks().fopen.answer();
     libc::hooks().fopen = [&opened, below](char const* path, char const* mode) {
         opened.push_back(std::string(path) + ' ' + mode);
         return below(path, mode);
@@ -185,17 +182,17 @@ TEST(GroupRecord, TakesPrimaryMembersFromLinesOfAnyLength)
 {
     FakeFiles const files;
     files.write("/etc/passwd", "anna:x:1000:500:" + std::string(20000, 'x') + ":/:/bin/sh\n" +
-                                   account("ben", 500));
+                                   account("ben", 1000, 500));
     EXPECT_EQ(members(500, {}), (Names{"anna", "ben"}));
 }
 
 TEST(GroupRecord, ReadsTheAccountsBetweenItsEntryAndItsExit)
 {
     FakeFiles const files;
-    files.write("/etc/passwd", account("ben", 500));
+    files.write("/etc/passwd", account("ben", 1000, 500));
     Recording const log;
     std::vector<std::string> before;
-    auto const below = libc::hooks().fopen;
+    auto const below = libc::hooks().fopen.answer();
     libc::hooks().fopen = [&](char const* path, char const* mode) {
         before = log.texts();
         return below(path, mode);

@@ -1,6 +1,8 @@
 #include "sysdata/logInfo_linux.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
-#include "tests/support/Libc.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 
@@ -10,7 +12,6 @@
 #include <cstring>
 #include <ctime>
 #include <fcntl.h>
-#include <fstream>
 #include <iterator>
 #include <set>
 #include <string>
@@ -21,7 +22,6 @@ namespace
 {
 
 using NQ::logInfo;
-using Texts = std::vector<std::string>;
 
 constexpr char wc[] = "wc -l /var/log/messages";
 
@@ -77,7 +77,7 @@ protected:
         return time;
     }
 
-    libc::FakeCommands commands;
+    FakeCommands commands;
     logInfo log;
 };
 
@@ -100,11 +100,11 @@ TEST_F(LogReader, CountsTheLines)
 {
     Recording const recording;
     EXPECT_EQ(log.getMaxLine(), 10U);
-    EXPECT_EQ(commands.ran, Texts{wc});
-    EXPECT_EQ(commands.modes, Texts{"r"});
+    EXPECT_EQ(commands.ran, Lines{wc});
+    EXPECT_EQ(commands.modes, Lines{"r"});
     EXPECT_EQ(commands.open, 0);
     EXPECT_EQ(recording.texts(),
-              (Texts{"getMaxLine: entry", "buffer = 10 /var/log/messages\n", "getMaxLine: exit"}));
+              (Lines{"getMaxLine: entry", "buffer = 10 /var/log/messages\n", "getMaxLine: exit"}));
     EXPECT_EQ(recording.texts(3000).size(), 3U);
 }
 
@@ -113,8 +113,8 @@ TEST_F(LogReader, CountsNothingWhenWcCannotBeStarted)
     commands.answers.clear();
     Recording const recording;
     EXPECT_EQ(log.getMaxLine(), 0U);
-    EXPECT_EQ(recording.texts(6000), Texts{"Cannot open process: wc -l /var/log/messages"});
-    EXPECT_EQ(recording.texts(3000), (Texts{"getMaxLine: entry", "getMaxLine: exit"}));
+    EXPECT_EQ(recording.texts(6000), Lines{"Cannot open process: wc -l /var/log/messages"});
+    EXPECT_EQ(recording.texts(3000), (Lines{"getMaxLine: entry", "getMaxLine: exit"}));
 }
 
 TEST_F(LogReader, CountsNothingInOutputThatIsNoNumber)
@@ -122,7 +122,7 @@ TEST_F(LogReader, CountsNothingInOutputThatIsNoNumber)
     commands.answers[wc] = "what is this 10\n";
     Recording const recording;
     EXPECT_EQ(log.getMaxLine(), 0U);
-    EXPECT_EQ(recording.texts(6000), Texts{"Invalid format: buffer = what is this 10\n"});
+    EXPECT_EQ(recording.texts(6000), Lines{"Invalid format: buffer = what is this 10\n"});
     EXPECT_TRUE(recording.has("buffer = what is this 10\n", 3000));
 }
 
@@ -131,7 +131,7 @@ TEST_F(LogReader, CountsNothingWhenWcPrintsNothing)
     commands.answers[wc] = "";
     Recording const recording;
     EXPECT_EQ(log.getMaxLine(), 0U);
-    EXPECT_EQ(recording.remarks(), (Texts{"buffer = ", "Invalid format: buffer = "}));
+    EXPECT_EQ(recording.remarks(), (Lines{"buffer = ", "Invalid format: buffer = "}));
 }
 
 TEST_F(LogReader, ReadsOnlyTheFirstLineOfWc)
@@ -169,12 +169,12 @@ TEST_F(LogReader, FetchesOneLineByItsNumber)
     commands.answers[sed(3)] = "third line\n";
     Recording const recording;
     EXPECT_STREQ(fetched(3, 100).c_str(), "third line");
-    EXPECT_EQ(commands.ran, Texts{"sed -n '3p' /var/log/messages"});
-    EXPECT_EQ(commands.modes, Texts{"r"});
+    EXPECT_EQ(commands.ran, Lines{"sed -n '3p' /var/log/messages"});
+    EXPECT_EQ(commands.modes, Lines{"r"});
     EXPECT_EQ(commands.open, 0);
-    EXPECT_EQ(recording.texts(3000), (Texts{"getLog: entry", "buffer = third line\n",
+    EXPECT_EQ(recording.texts(3000), (Lines{"getLog: entry", "buffer = third line\n",
                                             "strget: entry", "strget: exit", "getLog: exit"}));
-    EXPECT_EQ(recording.texts(6000), Texts{});
+    EXPECT_EQ(recording.texts(6000), Lines{});
 }
 
 TEST_F(LogReader, StripsLeadingSpacesOfALineAndNothingElse)
@@ -202,7 +202,7 @@ TEST_F(LogReader, ReadsAMissingLineAsEmpty)
     commands.answers[sed(11)] = "";
     Recording const recording;
     EXPECT_EQ(fetched(11, 8), std::string(8, '\0'));
-    EXPECT_EQ(recording.remarks(), Texts{"buffer = "});
+    EXPECT_EQ(recording.remarks(), Lines{"buffer = "});
 }
 
 TEST_F(LogReader, ReadsALineAsEmptyWhoseReadingBreaksOff)
@@ -228,9 +228,9 @@ TEST_F(LogReader, EmptiesTheBufferWhenSedCannotBeStarted)
 {
     Recording const recording;
     EXPECT_EQ(fetched(4, 3), std::string("\0##", 3));
-    EXPECT_EQ(recording.texts(6000), Texts{"sed -n '%dp' /var/log/messages"});
-    EXPECT_EQ(recording.texts(3000), (Texts{"getLog: entry", "getLog: exit"}));
-    EXPECT_EQ(commands.ran, Texts{"sed -n '4p' /var/log/messages"});
+    EXPECT_EQ(recording.texts(6000), Lines{"sed -n '%dp' /var/log/messages"});
+    EXPECT_EQ(recording.texts(3000), (Lines{"getLog: entry", "getLog: exit"}));
+    EXPECT_EQ(commands.ran, Lines{"sed -n '4p' /var/log/messages"});
 }
 
 TEST_F(LogReader, YieldsTheNewestMessageBetweenAsterisks)
@@ -249,8 +249,8 @@ TEST_F(LogReader, CountsIndexesFromTheEndOfTheFile)
 TEST_F(LogReader, RunsThreeCountsAndOneFetchForAMessage)
 {
     data(1);
-    EXPECT_EQ(commands.ran, (Texts{wc, wc, wc, sed(10)}));
-    EXPECT_EQ(commands.modes, Texts(4, "r"));
+    EXPECT_EQ(commands.ran, (Lines{wc, wc, wc, sed(10)}));
+    EXPECT_EQ(commands.modes, Lines(4, "r"));
     EXPECT_EQ(commands.open, 0);
 }
 
@@ -258,7 +258,7 @@ TEST_F(LogReader, RunsTwoCountsForAMessageThatIsRefused)
 {
     std::string text;
     EXPECT_FALSE(log.getData(text, 12));
-    EXPECT_EQ(commands.ran, (Texts{wc, wc}));
+    EXPECT_EQ(commands.ran, (Lines{wc, wc}));
 }
 
 TEST_F(LogReader, FetchesTheLineThatTheLastCountNames)
@@ -274,14 +274,14 @@ TEST_F(LogReader, NamesTheFirstCountAndRefusesByTheSecond)
     Recording const recording;
     std::string text;
     EXPECT_FALSE(log.getData(text, 12));
-    EXPECT_EQ(recording.texts(6000), Texts{"Invalid index: getMaxLine()=12, Index=12"});
+    EXPECT_EQ(recording.texts(6000), Lines{"Invalid index: getMaxLine()=12, Index=12"});
 }
 
 TEST_F(LogReader, AcceptsTheIndexBehindTheOldestLineAsEmpty)
 {
     commands.answers[sed(0)] = "";
     EXPECT_EQ(data(11), "**");
-    EXPECT_EQ(commands.ran, (Texts{wc, wc, wc, "sed -n '0p' /var/log/messages"}));
+    EXPECT_EQ(commands.ran, (Lines{wc, wc, wc, "sed -n '0p' /var/log/messages"}));
 }
 
 TEST_F(LogReader, AcceptsTheIndexZeroAsEmpty)
@@ -297,7 +297,7 @@ TEST_F(LogReader, RefusesTheNextIndexAndLeavesTheTextAlone)
     std::string text = "before";
     EXPECT_FALSE(log.getData(text, 12));
     EXPECT_EQ(text, "before");
-    EXPECT_EQ(recording.texts(6000), Texts{"Invalid index: getMaxLine()=10, Index=12"});
+    EXPECT_EQ(recording.texts(6000), Lines{"Invalid index: getMaxLine()=10, Index=12"});
     EXPECT_EQ(recording.texts().back(), "getData: exit");
     EXPECT_EQ(recording.records()[recording.records().size() - 3].function, "getData");
 }
@@ -341,7 +341,7 @@ TEST_F(LogReader, YieldsAnEmptyMessageWhenSedCannotBeStarted)
     commands.answers.erase(sed(10));
     Recording const recording;
     EXPECT_EQ(data(1), "**");
-    EXPECT_EQ(recording.texts(6000), Texts{"sed -n '%dp' /var/log/messages"});
+    EXPECT_EQ(recording.texts(6000), Lines{"sed -n '%dp' /var/log/messages"});
 }
 
 TEST_F(LogReader, EndsAMessageAtANulByte)
@@ -364,7 +364,7 @@ TEST_F(LogReader, LogsEveryStepOfAMessageInOrder)
 {
     Recording const recording;
     data(1);
-    Texts expected{"getData: entry"};
+    Lines expected{"getData: entry"};
     for (int i = 0; i < 3; ++i)
         for (char const* text :
              {"getMaxLine: entry", "buffer = 10 /var/log/messages\n", "getMaxLine: exit"})
@@ -374,7 +374,7 @@ TEST_F(LogReader, LogsEveryStepOfAMessageInOrder)
           "strget: entry", "strget: exit", "getLog: exit", "getData: exit"})
         expected.emplace_back(text);
     EXPECT_EQ(recording.texts(3000), expected);
-    EXPECT_EQ(recording.texts(6000), Texts{});
+    EXPECT_EQ(recording.texts(6000), Lines{});
 }
 
 TEST_F(LogReader, ReadsATimeStampInTheCurrentYear)
@@ -385,8 +385,8 @@ TEST_F(LogReader, ReadsATimeStampInTheCurrentYear)
 TEST_F(LogReader, RunsThreeCountsOneFetchAndOneDateForATime)
 {
     timeOf(1);
-    EXPECT_EQ(commands.ran, (Texts{wc, wc, wc, sed(10), "date"}));
-    EXPECT_EQ(commands.modes, Texts(5, "r"));
+    EXPECT_EQ(commands.ran, (Lines{wc, wc, wc, sed(10), "date"}));
+    EXPECT_EQ(commands.modes, Lines(5, "r"));
     EXPECT_EQ(commands.open, 0);
 }
 
@@ -395,7 +395,7 @@ TEST_F(LogReader, ReadsEachCommandsLineIntoABufferOf512Bytes)
     std::vector<int> sizes;
     libc::hooks().fgets = [&sizes](char* buffer, int size, FILE* stream) {
         sizes.push_back(size);
-        return libc::realFgets(buffer, size, stream);
+        return interpose::real(fgets)(buffer, size, stream);
     };
     timeOf(1);
     libc::hooks().fgets = nullptr;
@@ -438,8 +438,8 @@ TEST_F(LogReader, RefusesATimeByAnIndexOutOfRange)
     long time = 5;
     EXPECT_FALSE(log.getCreationTime(time, 12));
     EXPECT_EQ(time, 5);
-    EXPECT_EQ(recording.texts(6000), Texts{"Invalid index: getMaxLine()=10, logIndex=12"});
-    EXPECT_EQ(commands.ran, (Texts{wc, wc}));
+    EXPECT_EQ(recording.texts(6000), Lines{"Invalid index: getMaxLine()=10, logIndex=12"});
+    EXPECT_EQ(commands.ran, (Lines{wc, wc}));
 }
 
 TEST_F(LogReader, FindsNoTimeInTheLinesThatItAcceptsBeyondTheLog)
@@ -459,8 +459,8 @@ TEST_F(LogReader, FindsNoTimeInAnotherStampAndAsksForNoDate)
     long time = 5;
     EXPECT_FALSE(log.getCreationTime(time, 1));
     EXPECT_EQ(time, 5);
-    EXPECT_EQ(recording.texts(6000), Texts{"Invalid format: buffer = 2026-11-20T10:1"});
-    EXPECT_EQ(commands.ran, (Texts{wc, wc, wc, sed(10)}));
+    EXPECT_EQ(recording.texts(6000), Lines{"Invalid format: buffer = 2026-11-20T10:1"});
+    EXPECT_EQ(commands.ran, (Lines{wc, wc, wc, sed(10)}));
 }
 
 TEST_F(LogReader, LooksForATimeInFifteenCharactersAlone)
@@ -477,7 +477,7 @@ TEST_F(LogReader, DatesAnEntryToZeroWhenDateCannotBeStarted)
     commands.answers.erase("date");
     Recording const recording;
     EXPECT_EQ(timeOf(1), 0);
-    EXPECT_EQ(recording.texts(6000), (Texts{"Cannot opne process: date", "Invalid YY: YY = 0"}));
+    EXPECT_EQ(recording.texts(6000), (Lines{"Cannot opne process: date", "Invalid YY: YY = 0"}));
 }
 
 TEST_F(LogReader, FindsNoTimeWhenDatePrintsAnotherForm)
@@ -488,7 +488,7 @@ TEST_F(LogReader, FindsNoTimeWhenDatePrintsAnotherForm)
         long time = 5;
         EXPECT_FALSE(log.getCreationTime(time, 1)) << line;
         EXPECT_EQ(time, 5) << line;
-        EXPECT_EQ(recording.texts(6000), Texts{std::string("Invalid format: buffer = ") + line});
+        EXPECT_EQ(recording.texts(6000), Lines{std::string("Invalid format: buffer = ") + line});
         EXPECT_EQ(commands.open, 0);
     }
 }
@@ -498,7 +498,7 @@ TEST_F(LogReader, DatesAnEntryToZeroWhereTheYearCannotBeConverted)
     commands.answers["date"] = "Sat Nov 21 03:15:30 UTC 1900\n";
     Recording const recording;
     EXPECT_EQ(timeOf(1), 0);
-    EXPECT_EQ(recording.texts(6000), Texts{"Invalid YY: YY = 1900"});
+    EXPECT_EQ(recording.texts(6000), Lines{"Invalid YY: YY = 1900"});
 }
 
 TEST_F(LogReader, SurvivesBinaryGarbageFromEveryCommand)
@@ -530,12 +530,11 @@ class LogClearing : public testing::Test
 protected:
     std::string contents() const
     {
-        std::ifstream file(files.realPath("/var/log/messages"));
-        return {std::istreambuf_iterator<char>(file), {}};
+        return contentOf(files.realPath("/var/log/messages"));
     }
 
     FakeFiles files;
-    libc::FakeCommands commands;
+    FakeCommands commands;
 };
 
 TEST_F(LogClearing, TruncatesTheFileWithoutAnyCommand)
@@ -545,7 +544,7 @@ TEST_F(LogClearing, TruncatesTheFileWithoutAnyCommand)
     EXPECT_TRUE(logInfo().clearLog());
     EXPECT_EQ(contents(), "");
     EXPECT_TRUE(commands.ran.empty());
-    EXPECT_EQ(recording.texts(), (Texts{"clearLog: entry", "clearLog: exit"}));
+    EXPECT_EQ(recording.texts(), (Lines{"clearLog: entry", "clearLog: exit"}));
 }
 
 TEST_F(LogClearing, KeepsTheFileAndItsPermissions)
@@ -567,7 +566,7 @@ TEST_F(LogClearing, KeepsTheFileAndItsPermissions)
 
 TEST_F(LogClearing, OpensTheLogForWritingAndClosesIt)
 {
-    Texts opened;
+    Lines opened;
     int descriptor = -1;
     libc::hooks().fopen = [&](char const* path, char const* mode) {
         opened.push_back(std::string(path) + "|" + mode);
@@ -576,7 +575,7 @@ TEST_F(LogClearing, OpensTheLogForWritingAndClosesIt)
         return stream;
     };
     EXPECT_TRUE(logInfo().clearLog());
-    EXPECT_EQ(opened, Texts{"/var/log/messages|w"});
+    EXPECT_EQ(opened, Lines{"/var/log/messages|w"});
     EXPECT_EQ(fcntl(descriptor, F_GETFD), -1);
 }
 
@@ -588,7 +587,7 @@ TEST_F(LogClearing, FailsInSilenceAndLeavesAFileThatCannotBeOpened)
     EXPECT_FALSE(logInfo().clearLog());
     libc::hooks().fopen = nullptr;
     EXPECT_EQ(contents(), "one\n");
-    EXPECT_EQ(recording.texts(), (Texts{"clearLog: entry", "clearLog: exit"}));
+    EXPECT_EQ(recording.texts(), (Lines{"clearLog: entry", "clearLog: exit"}));
 }
 
 TEST_F(LogClearing, FailsWhereThereIsNoPlaceForTheFile)
@@ -626,7 +625,7 @@ TEST(LogStrreplace, LogsEntryAndExit)
 {
     Recording const recording;
     replaced("a-b", '-', ' ');
-    EXPECT_EQ(recording.texts(3000), (Texts{"strreplace: entry", "strreplace: exit"}));
+    EXPECT_EQ(recording.texts(3000), (Lines{"strreplace: entry", "strreplace: exit"}));
 }
 
 TEST_F(LogClearing, SpeaksUnderItsUnitAndCategory)
@@ -649,7 +648,7 @@ TEST_F(LogReader, EndsEveryReadOfATimeWithItsExit)
         Recording const recording;
         long time = 0;
         log.getCreationTime(time, index);
-        Texts const said = recording.texts(3000);
+        Lines const said = recording.texts(3000);
         EXPECT_EQ(said.front(), "getCreationTime: entry");
         EXPECT_EQ(said.back(), "getCreationTime: exit");
     };
@@ -681,7 +680,7 @@ TEST_F(LogReader, NeitherReadsNorWritesItsString)
 
 TEST_F(LogReader, DoesNotLookAtHowItsCommandsEnded)
 {
-    libc::hooks().pclose = [close = libc::hooks().pclose](FILE* stream) {
+    libc::hooks().pclose = [close = libc::hooks().pclose.answer()](FILE* stream) {
         close(stream);
         return 1 << 8;
     };

@@ -1,43 +1,15 @@
 // Every message is assembled in a buffer of the host's, fixed texts included.
 
-#include "host/VXMessageBuffer.h"
 #include "sysdata/driverInfo_linux.h"
 #include "sysdata/osInfo_linux.h"
 #include "sysdata/userInfo_linux.h"
-#include "tests/support/Libc.h"
-#include "tests/support/Next.h"
+#include "tests/interpose/Host.h"
+#include "tests/interpose/Libc.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <atomic>
-
-namespace
-{
-std::atomic<std::size_t> taken{0}; // texts that were taken out of buffers
-}
-
-namespace VXLog
-{
-
-std::string VXMessageBuffer::str(VXMessageBuffer& end)
-{
-    static auto* const real = next<std::string(VXMessageBuffer*, VXMessageBuffer&)>(
-        "_ZN5VXLog15VXMessageBuffer3strB5cxx11ERS0_");
-    ++taken;
-    return real(this, end);
-}
-
-std::string VXMessageBuffer::str(std::ostream& end)
-{
-    static auto* const real = next<std::string(VXMessageBuffer*, std::ostream&)>(
-        "_ZN5VXLog15VXMessageBuffer3strB5cxx11ERSo");
-    ++taken;
-    return real(this, end);
-}
-
-} // namespace VXLog
 
 TEST(Messages, TakeABufferEach)
 {
@@ -45,7 +17,10 @@ TEST(Messages, TakeABufferEach)
     libc::hooks().popen = [](char const*, char const*) -> FILE* { return nullptr; };
     libc::hooks().sysinfo = [](struct sysinfo*) { return -1; };
     Recording const recording;
-    taken = 0;
+    std::size_t taken = 0;
+    host::hooks().textOfBuffer.watch(
+        [&taken](VXLog::VXMessageBuffer*, VXLog::VXMessageBuffer&) { ++taken; });
+    host::hooks().textOfStream.watch([&taken](VXLog::VXMessageBuffer*, std::ostream&) { ++taken; });
 
     std::vector<NQ::driverInfo> drivers;
     NQ::getDriverInfo(drivers);

@@ -1,13 +1,12 @@
 // The shell lines of each method, with each parameter in each place that matters.
 
+#include "tests/support/Lines.h"
 #include "tests/sysdata/MethodTest.h"
 
 #include <ostream>
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 struct LineCase {
     char const* name;

@@ -1,5 +1,6 @@
 #include "sysdata/osInfo_linux.h"
 
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
@@ -14,7 +15,6 @@ namespace
 {
 
 using NQ::ParamInfo;
-using Texts = std::vector<std::string>;
 
 /** The outcome of one parse; method and parameters as they were before where nothing was set. */
 struct Parsed {
@@ -28,22 +28,22 @@ struct Parsed {
 
     int status;
     std::string method = "(as it was)";
-    Texts params;
+    Lines params;
 };
 
 /** What the parser itself says about a text, entry and exit lines included. */
-Texts said(std::string const& text)
+Lines said(std::string const& text)
 {
     Recording const log;
     Parsed const parsed(text);
-    Texts found;
+    Lines found;
     for (LogRecord const& record : log.records())
         if (!record.trace && record.function == "parseMethodAndParams")
             found.push_back(record.text);
     return found;
 }
 
-Texts inside(Texts texts)
+Lines inside(Lines texts)
 {
     texts.insert(texts.begin(), "OsNode::parseMethodAndParams: entry");
     texts.emplace_back("OsNode::parseMethodAndParams: exit");
@@ -72,7 +72,7 @@ TEST(MethodParser, SplitsATextIntoTheMethodAndItsParameters)
     Parsed const parsed("UserAdd,UserName:CMPI_string:jdoe,Comment:CMPI_string:Test");
     EXPECT_EQ(parsed.status, 0);
     EXPECT_EQ(parsed.method, "UserAdd");
-    EXPECT_EQ(parsed.params, (Texts{"UserName|CMPI_string|jdoe", "Comment|CMPI_string|Test"}));
+    EXPECT_EQ(parsed.params, (Lines{"UserName|CMPI_string|jdoe", "Comment|CMPI_string|Test"}));
 }
 
 TEST(MethodParser, ConvertsDatesOnTheWay)
@@ -81,7 +81,7 @@ TEST(MethodParser, ConvertsDatesOnTheWay)
                         "CMPI_dateTime:20101231000000.000000+000");
     EXPECT_EQ(parsed.status, 0);
     EXPECT_EQ(parsed.method, "UserSetAttrib");
-    EXPECT_EQ(parsed.params, (Texts{"UserName|CMPI_string|jdoe",
+    EXPECT_EQ(parsed.params, (Lines{"UserName|CMPI_string|jdoe",
                                     "passwordExpirationDate|CMPI_dateTime|2010-12-31"}));
 }
 
@@ -91,7 +91,7 @@ TEST(MethodParser, LeavesTheMethodAsItWasWhereThereAreNoItems)
         Parsed const parsed(text);
         EXPECT_EQ(parsed.status, 0);
         EXPECT_EQ(parsed.method, "(as it was)");
-        EXPECT_EQ(parsed.params, Texts());
+        EXPECT_EQ(parsed.params, Lines());
         EXPECT_EQ(said(text), inside({}));
     }
 }
@@ -101,7 +101,7 @@ TEST(MethodParser, AcceptsAMethodWithoutParameters)
     Parsed const parsed("UserDel");
     EXPECT_EQ(parsed.status, 0);
     EXPECT_EQ(parsed.method, "UserDel");
-    EXPECT_EQ(parsed.params, Texts());
+    EXPECT_EQ(parsed.params, Lines());
     EXPECT_EQ(said("UserDel"), inside({"method=UserDel"}));
 }
 
@@ -110,7 +110,7 @@ TEST(MethodParser, DropsEmptyItemsAndEmptyParts)
     Parsed const parsed("UserAdd,,UserName:CMPI_string:jdoe,");
     EXPECT_EQ(parsed.status, 0);
     EXPECT_EQ(parsed.method, "UserAdd");
-    EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"});
+    EXPECT_EQ(parsed.params, Lines{"UserName|CMPI_string|jdoe"});
     EXPECT_EQ(Parsed(",UserAdd,:UserName::CMPI_string:::jdoe:").params, parsed.params);
 }
 
@@ -118,7 +118,7 @@ TEST(MethodParser, IgnoresPartsBeyondTheThird)
 {
     Parsed const parsed("UserAdd,Comment:CMPI_string:12:30");
     EXPECT_EQ(parsed.status, 0);
-    EXPECT_EQ(parsed.params, Texts{"Comment|CMPI_string|12"});
+    EXPECT_EQ(parsed.params, Lines{"Comment|CMPI_string|12"});
 }
 
 TEST(MethodParser, TakesEveryByteButTheSeparatorsForAPartOfAValue)
@@ -148,7 +148,7 @@ TEST(MethodParser, DoesNotCheckThatANumberIsOne)
 {
     Parsed const parsed("UserSetAttrib,daysExpireAfter:CMPI_uint32:soon");
     EXPECT_EQ(parsed.status, 0);
-    EXPECT_EQ(parsed.params, Texts{"daysExpireAfter|CMPI_uint32|soon"});
+    EXPECT_EQ(parsed.params, Lines{"daysExpireAfter|CMPI_uint32|soon"});
 }
 
 TEST(MethodParser, StopsQuietlyAtABlankText)
@@ -158,7 +158,7 @@ TEST(MethodParser, StopsQuietlyAtABlankText)
     Parsed const parsed(text);
     EXPECT_EQ(parsed.status, 0);
     EXPECT_EQ(parsed.method, "UserAdd");
-    EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"});
+    EXPECT_EQ(parsed.params, Lines{"UserName|CMPI_string|jdoe"});
     EXPECT_EQ(said(text),
               inside({"method=UserAdd", "paramInfo.name=UserName", "paramInfo.type=CMPI_string",
                       "paramInfo.value=jdoe", "paramInfo.name=Comment",
@@ -169,7 +169,7 @@ TEST(MethodParser, StopsQuietlyAtABlankNumber)
 {
     Parsed const parsed("UserSetAttrib,daysExpireAfter:CMPI_uint32,UserName:CMPI_string:jdoe");
     EXPECT_EQ(parsed.status, 0);
-    EXPECT_EQ(parsed.params, Texts());
+    EXPECT_EQ(parsed.params, Lines());
 }
 
 TEST(MethodParser, TakesAnItemThatIsNoParameterForABlankOne)
@@ -179,7 +179,7 @@ TEST(MethodParser, TakesAnItemThatIsNoParameterForABlankOne)
             std::string("UserAdd,UserName:CMPI_string:jdoe,") + item + ",HomeDir:CMPI_string:/h";
         Parsed const parsed(text);
         EXPECT_EQ(parsed.status, 0) << item;
-        EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"}) << item;
+        EXPECT_EQ(parsed.params, Lines{"UserName|CMPI_string|jdoe"}) << item;
         EXPECT_EQ(said(text),
                   inside({"method=UserAdd", "paramInfo.name=UserName", "paramInfo.type=CMPI_string",
                           "paramInfo.value=jdoe", "This parameter is blank ---exiting "}))
@@ -194,7 +194,7 @@ TEST(MethodParser, GoesOnAfterABlankDate)
     Parsed const parsed(text);
     EXPECT_EQ(parsed.status, 0);
     EXPECT_EQ(parsed.params,
-              (Texts{"passwordExpirationDate|CMPI_dateTime|", "UserName|CMPI_string|jdoe"}));
+              (Lines{"passwordExpirationDate|CMPI_dateTime|", "UserName|CMPI_string|jdoe"}));
     EXPECT_EQ(said(text), inside({"method=UserSetAttrib", "paramInfo.name=passwordExpirationDate",
                                   "paramInfo.type=CMPI_dateTime", "paramInfo.name=UserName",
                                   "paramInfo.type=CMPI_string", "paramInfo.value=jdoe"}));
@@ -237,7 +237,7 @@ TEST_P(UnreadableDate, RejectsTheTextAndKeepsWhatStoodBefore)
     Parsed const parsed(text);
     EXPECT_EQ(parsed.status, 1);
     EXPECT_EQ(parsed.method, "UserAdd");
-    EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"});
+    EXPECT_EQ(parsed.params, Lines{"UserName|CMPI_string|jdoe"});
     EXPECT_EQ(said(text),
               inside({"method=UserAdd", "paramInfo.name=UserName", "paramInfo.type=CMPI_string",
                       "paramInfo.value=jdoe", "paramInfo.name=passwordExpirationDate",
@@ -251,8 +251,8 @@ TEST(MethodParser, RejectsAnUnknownTypeAndKeepsWhatStoodBefore)
     Recording const log;
     Parsed const parsed(text);
     EXPECT_EQ(parsed.status, 1);
-    EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"});
-    EXPECT_EQ(log.texts(6000), Texts{"Unknown parameter type: CMPI_boolean"});
+    EXPECT_EQ(parsed.params, Lines{"UserName|CMPI_string|jdoe"});
+    EXPECT_EQ(log.texts(6000), Lines{"Unknown parameter type: CMPI_boolean"});
     EXPECT_EQ(log.texts().back(), "OsNode::parseMethodAndParams: exit");
 }
 
@@ -293,8 +293,8 @@ TEST(MethodParser, RejectsAnUnknownTypeAlsoWithoutAValueAndKnowsTypesExactly)
         Recording const log;
         Parsed const parsed(std::string("UserAdd,UserName:CMPI_string:jdoe,Active:") + type);
         EXPECT_EQ(parsed.status, 1) << type;
-        EXPECT_EQ(parsed.params, Texts{"UserName|CMPI_string|jdoe"}) << type;
-        EXPECT_EQ(log.texts(6000), Texts{std::string("Unknown parameter type: ") + type});
+        EXPECT_EQ(parsed.params, Lines{"UserName|CMPI_string|jdoe"}) << type;
+        EXPECT_EQ(log.texts(6000), Lines{std::string("Unknown parameter type: ") + type});
     }
 }
 
@@ -312,11 +312,11 @@ TEST(MethodParser, ReadsDatesAsTheTwoScanningFormsDo)
 TEST(MethodParser, KnowsNoQuotesAndNoEscapes)
 {
     EXPECT_EQ(Parsed("UserAdd,Comment:CMPI_string:\"a:b\"").params,
-              Texts{"Comment|CMPI_string|\"a"});
+              Lines{"Comment|CMPI_string|\"a"});
     EXPECT_EQ(Parsed("UserAdd,Comment:CMPI_string:a\\,Colour:CMPI_string:b").params,
-              (Texts{"Comment|CMPI_string|a\\", "Colour|CMPI_string|b"}));
+              (Lines{"Comment|CMPI_string|a\\", "Colour|CMPI_string|b"}));
     EXPECT_EQ(Parsed("UserAdd,Comment:CMPI_string:\"a,Colour:CMPI_string:b\"").params,
-              (Texts{"Comment|CMPI_string|\"a", "Colour|CMPI_string|b\""}));
+              (Lines{"Comment|CMPI_string|\"a", "Colour|CMPI_string|b\""}));
 }
 
 TEST(MethodParser, SaysThatANumberIsBlank)

@@ -1,5 +1,6 @@
 // executeCommand and executePasswordEncryption.
 
+#include "tests/interpose/Libc.h"
 #include "tests/sysdata/MethodTest.h"
 
 #include <algorithm>
@@ -134,7 +135,7 @@ TEST_F(ExecuteCommand, ReadsLongerOutputToItsEndAndCutsIt)
 {
     std::string const whole = std::string(bufferSize - 1, 'x') + std::string(100000, 'y');
     long read = -1;
-    auto const close = libc::hooks().pclose;
+    auto const close = libc::hooks().pclose.answer();
     libc::hooks().pclose = [&](FILE* stream) {
         read = std::ftell(stream);
         return close(stream);

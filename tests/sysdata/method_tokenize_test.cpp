@@ -1,6 +1,7 @@
 #include "util/MyProcess.h"
 
 #include "sysdata/groupInfo_linux.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
@@ -11,54 +12,52 @@
 namespace
 {
 
-using Texts = std::vector<std::string>;
-
-Texts tokens(std::string const& text, std::string const& delimiters)
+Lines tokens(std::string const& text, std::string const& delimiters)
 {
-    Texts found;
+    Lines found;
     NQ::Tokenize(text, found, delimiters);
     return found;
 }
 
 TEST(Tokenize, AppendsEveryRunThatHoldsNoDelimiterInOrder)
 {
-    EXPECT_EQ(tokens("one,two,three", ","), (Texts{"one", "two", "three"}));
+    EXPECT_EQ(tokens("one,two,three", ","), (Lines{"one", "two", "three"}));
 }
 
 TEST(Tokenize, TakesEveryCharacterOfTheSetAsDelimiter)
 {
-    EXPECT_EQ(tokens("one:two,three:,four", ",:"), (Texts{"one", "two", "three", "four"}));
+    EXPECT_EQ(tokens("one:two,three:,four", ",:"), (Lines{"one", "two", "three", "four"}));
 }
 
 TEST(Tokenize, MakesNoEmptyTokensOfRunsAndEnds)
 {
-    EXPECT_EQ(tokens(",,one,,,two,", ","), (Texts{"one", "two"}));
+    EXPECT_EQ(tokens(",,one,,,two,", ","), (Lines{"one", "two"}));
 }
 
 TEST(Tokenize, FindsNothingInAnEmptyTextOrInDelimitersAlone)
 {
-    EXPECT_EQ(tokens("", ","), Texts());
-    EXPECT_EQ(tokens(",,,", ","), Texts());
+    EXPECT_EQ(tokens("", ","), Lines());
+    EXPECT_EQ(tokens(",,,", ","), Lines());
 }
 
 TEST(Tokenize, YieldsTheWholeTextWhereNoDelimiterIsInIt)
 {
-    EXPECT_EQ(tokens("one two", ","), Texts{"one two"});
-    EXPECT_EQ(tokens("one,two", ""), Texts{"one,two"});
+    EXPECT_EQ(tokens("one two", ","), Lines{"one two"});
+    EXPECT_EQ(tokens("one,two", ""), Lines{"one,two"});
 }
 
 TEST(Tokenize, DoesNotClearTheList)
 {
-    Texts found{"before"};
+    Lines found{"before"};
     NQ::Tokenize("one,two", found, ",");
-    EXPECT_EQ(found, (Texts{"before", "one", "two"}));
+    EXPECT_EQ(found, (Lines{"before", "one", "two"}));
 }
 
 TEST(Tokenize, LogsEachTokenBetweenEntryAndExit)
 {
     Recording const log;
     tokens("one,two", ",");
-    EXPECT_EQ(log.texts(), (Texts{"Tokenize: entry", "str.substr(lastPos, pos - lastPos) = one",
+    EXPECT_EQ(log.texts(), (Lines{"Tokenize: entry", "str.substr(lastPos, pos - lastPos) = one",
                                   "str.substr(lastPos, pos - lastPos) = two", "Tokenize: exit"}));
 }
 
@@ -83,7 +82,7 @@ TEST(Tokenize, LogsNoTokenOfATextThatHoldsPasswordAnywhere)
     for (char const* text : {"one,Password", "Password,one", "one,aPasswordb,two"}) {
         Recording const log;
         tokens(text, ",");
-        EXPECT_EQ(log.texts(), (Texts{"Tokenize: entry", "Tokenize: exit"})) << text;
+        EXPECT_EQ(log.texts(), (Lines{"Tokenize: entry", "Tokenize: exit"})) << text;
     }
 }
 
@@ -92,21 +91,21 @@ TEST(Tokenize, LooksForPasswordInTheWholeTextAndNotInItsTokens)
     Recording const log;
     tokens("one,Pass,word", ",");
     EXPECT_EQ(log.remarks().size(), 3U);
-    EXPECT_EQ(tokens("one,Password", ","), (Texts{"one", "Password"}));
+    EXPECT_EQ(tokens("one,Password", ","), (Lines{"one", "Password"}));
 }
 
 TEST(Tokenize, LogsATextThatHoldsPasswordInLowerCaseOnly)
 {
     Recording const log;
     tokens("password", ",");
-    EXPECT_EQ(log.remarks(), Texts{"str.substr(lastPos, pos - lastPos) = password"});
+    EXPECT_EQ(log.remarks(), Lines{"str.substr(lastPos, pos - lastPos) = password"});
 }
 
 /** How many tokens the list holds when each of them is logged. */
 class CountAtLog : public mihost::LogSink
 {
 public:
-    explicit CountAtLog(Texts const& tokens) : tokens_(tokens)
+    explicit CountAtLog(Lines const& tokens) : tokens_(tokens)
     {
         mihost::setLogSink(this);
     }
@@ -125,12 +124,12 @@ public:
     std::vector<std::size_t> counts;
 
 private:
-    Texts const& tokens_;
+    Lines const& tokens_;
 };
 
 TEST(Tokenize, LogsEachTokenBeforeItAppendsIt)
 {
-    Texts found;
+    Lines found;
     CountAtLog const log(found);
     NQ::Tokenize("one,two", found, ",");
     EXPECT_EQ(log.counts, (std::vector<std::size_t>{0, 1}));
@@ -138,7 +137,7 @@ TEST(Tokenize, LogsEachTokenBeforeItAppendsIt)
 
 TEST(GroupTokenize, AppendsEachPieceBeforeItLogsIt)
 {
-    Texts found;
+    Lines found;
     CountAtLog const log(found);
     NQ::groupInfo().Tokenize("one,two", found, ",");
     EXPECT_EQ(log.counts, (std::vector<std::size_t>{1, 2}));

@@ -1,6 +1,6 @@
 #include "sysdata/osInfo_linux.h"
 
-#include "tests/support/Libc.h"
+#include "tests/interpose/Libc.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
@@ -237,7 +237,7 @@ TEST(OsInfoLastBootTime, IsTheClockLessTheUptime)
 {
     Kernel kernel;
     kernel.figures.uptime = 1000;
-    libc::hooks().time = [] { return time_t{1273659825}; };
+    libc::hooks().time = [](std::time_t*) { return time_t{1273659825}; };
     long out = untouched;
     EXPECT_TRUE(OsInfo().getLastBootTime(out));
     EXPECT_EQ(out, 1273658825);
@@ -291,7 +291,7 @@ TEST(OsInfoLastBootTime, AsksTheKernelAndTheClockAgainEachTime)
 {
     Kernel kernel;
     time_t now = 1273659825;
-    libc::hooks().time = [&now] { return now; };
+    libc::hooks().time = [&now](std::time_t*) { return now; };
     kernel.figures.uptime = 1000;
     long out = 0;
     EXPECT_TRUE(OsInfo().getLastBootTime(out));
@@ -317,7 +317,7 @@ TEST(OsInfoFixedValues, ConsultNeitherFilesNorCommandsNorTheClock)
         ++asked;
         return -1;
     };
-    libc::hooks().time = [&asked] {
+    libc::hooks().time = [&asked](std::time_t*) {
         ++asked;
         return time_t{0};
     };

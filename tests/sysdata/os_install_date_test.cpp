@@ -1,12 +1,14 @@
 #include "sysdata/osInfo_linux.h"
 
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
+#include "tests/support/LastOpened.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
 #include <cstdlib>
-#include <fcntl.h>
 #include <string>
 #include <vector>
 
@@ -47,7 +49,7 @@ protected:
 
     libc::HookGuard const guard_;
     FakeFiles const files_;
-    libc::FakeCommands commands_;
+    FakeCommands commands_;
 };
 
 TEST_F(InstallDate, IsZeroWithoutAReleaseFile)
@@ -173,22 +175,15 @@ TEST_F(InstallDate, ClosesTheCommandsStream)
 TEST_F(InstallDate, HoldsTheReleaseFileOpenUntilTheCommandRuns)
 {
     files_.write("/etc/redhat-release", "a line\n");
-    int probe = -1;
-    libc::hooks().fopen = [&probe, below = libc::hooks().fopen](char const* path,
-                                                                char const* mode) {
-        FILE* const stream = below(path, mode);
-        if (stream)
-            probe = fileno(stream);
-        return stream;
-    };
+    LastOpened const probe;
     bool wasOpen = false;
     libc::hooks().popen = [&](char const*, char const*) -> FILE* {
-        wasOpen = fcntl(probe, F_GETFD) != -1;
+        wasOpen = isOpen(probe.descriptor());
         return nullptr;
     };
     date();
     EXPECT_TRUE(wasOpen);
-    EXPECT_EQ(fcntl(probe, F_GETFD), -1);
+    EXPECT_FALSE(isOpen(probe.descriptor()));
 }
 
 TEST_F(InstallDate, ReadsLeadingZerosAsDecimal)
@@ -200,18 +195,11 @@ TEST_F(InstallDate, ClosesTheReleaseFileBeforeItReadsTheOutput)
 {
     files_.write("/etc/redhat-release", "a line\n");
     commands_.answers[redhatCommand] = "Change: 2010-05-12 10:23:45\n";
-    int probe = -1;
-    libc::hooks().fopen = [&probe, below = libc::hooks().fopen](char const* path,
-                                                                char const* mode) {
-        FILE* const stream = below(path, mode);
-        if (stream)
-            probe = fileno(stream);
-        return stream;
-    };
+    LastOpened const probe;
     bool openAtRead = true;
     libc::hooks().fgets = [&](char* buffer, int size, FILE* stream) {
-        openAtRead = fcntl(probe, F_GETFD) != -1;
-        return libc::realFgets(buffer, size, stream);
+        openAtRead = isOpen(probe.descriptor());
+        return interpose::real(fgets)(buffer, size, stream);
     };
     EXPECT_EQ(date(), may2010);
     EXPECT_FALSE(openAtRead);

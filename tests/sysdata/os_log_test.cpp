@@ -1,5 +1,7 @@
 #include "sysdata/osInfo_linux.h"
 
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/MutexCalls.h"
 #include "tests/support/Recording.h"
@@ -48,7 +50,7 @@ protected:
 private:
     libc::HookGuard const guard_;
     FakeFiles const noFiles_;
-    libc::FakeCommands const noCommands_;
+    FakeCommands const noCommands_;
 };
 
 std::string text = " x ";

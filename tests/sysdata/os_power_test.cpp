@@ -1,6 +1,7 @@
 #include "sysdata/osInfo_linux.h"
 
-#include "tests/support/Libc.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
@@ -31,7 +32,7 @@ struct PowerCase {
 class OsInfoPower : public testing::TestWithParam<PowerCase>
 {
 protected:
-    libc::FakeCommands commands_; // no command reaches the machine
+    FakeCommands commands_; // no command reaches the machine
 };
 
 INSTANTIATE_TEST_SUITE_P(Of, OsInfoPower,

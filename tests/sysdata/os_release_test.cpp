@@ -2,14 +2,16 @@
 
 #include "sysdata/osInfo_linux.h"
 
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
+#include "tests/support/LastOpened.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
 #include <atomic>
 #include <cstring>
-#include <fcntl.h>
 #include <string>
 #include <sys/utsname.h>
 #include <thread>
@@ -26,11 +28,6 @@ constexpr char const* redhatCommand = "cat /etc/redhat-release  | tr -d '[:alpha
 constexpr char const* suseCommand =
     "echo $(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 9)."
     "$(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 12) | tr -d [:space:]";
-
-bool isOpen(int descriptor)
-{
-    return fcntl(descriptor, F_GETFD) != -1;
-}
 
 /** A machine with release files of its own, and commands that answer as they are told. */
 class ReleaseFiles : public testing::Test
@@ -55,7 +52,7 @@ protected:
 
     libc::HookGuard const guard_;
     FakeFiles const files_;
-    libc::FakeCommands commands_;
+    FakeCommands commands_;
 };
 
 class OSReleaseName : public ReleaseFiles
@@ -241,20 +238,12 @@ TEST_F(OSVersion, IsTheKernelsReleaseOnUnitedLinux)
 TEST_F(OSVersion, ClosesTheUnitedLinuxFileWhetherTheKernelAnswersOrNot)
 {
     files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
-    int probe = -1;
-    libc::hooks().fopen = [&probe, below = libc::hooks().fopen](char const* path,
-                                                                char const* mode) {
-        FILE* const stream = below(path, mode);
-        if (stream)
-            probe = fileno(stream);
-        return stream;
-    };
     for (bool const fails : {false, true}) {
         unameFails_ = fails;
-        probe = -1;
+        LastOpened const probe;
         version();
-        EXPECT_NE(probe, -1);
-        EXPECT_FALSE(isOpen(probe));
+        EXPECT_NE(probe.descriptor(), -1);
+        EXPECT_FALSE(isOpen(probe.descriptor()));
     }
 }
 
@@ -327,8 +316,8 @@ protected:
     {
         files_.write("/etc/redhat-release", "a line\n");
         files_.write("/output", text);
-        libc::hooks().fopen = [this, below = libc::hooks().fopen](char const* path,
-                                                                  char const* mode) {
+        libc::hooks().fopen = [this, below = libc::hooks().fopen.answer()](char const* path,
+                                                                           char const* mode) {
             FILE* const stream = below(path, mode);
             if (std::string(path) == "/etc/redhat-release")
                 probe_ = fileno(stream);
@@ -337,7 +326,7 @@ protected:
         libc::hooks().popen = [this](char const*, char const* mode) {
             probeWasOpen_ = isOpen(probe_);
             mode_ = mode;
-            FILE* const stream = libc::realFopen(files_.realPath("/output").c_str(), "r");
+            FILE* const stream = interpose::real(fopen)(files_.realPath("/output").c_str(), "r");
             pipe_ = fileno(stream);
             return stream;
         };
@@ -394,7 +383,7 @@ protected:
                 command.replace(at, folder.size(), files_.realPath(folder));
                 at += files_.realPath(folder).size();
             }
-            return libc::realPopen(command.c_str(), mode);
+            return interpose::real(popen)(command.c_str(), mode);
         };
     }
 };

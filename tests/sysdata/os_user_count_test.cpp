@@ -1,6 +1,8 @@
 #include "sysdata/osInfo_linux.h"
 
 #include "sysdata/minMaxId.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/Account.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Recording.h"
 
@@ -18,11 +20,6 @@ namespace
 using NQ::OsInfo;
 
 constexpr char const* ranges = "UID_MIN 500\nUID_MAX 60000\nGID_MIN 500\nGID_MAX 60000\n";
-
-std::string account(std::string const& name, unsigned int uid)
-{
-    return name + ":x:" + std::to_string(uid) + ":100::/home/" + name + ":/bin/sh\n";
-}
 
 /** A machine with its own accounts and a lock that only takes notes. */
 class UserCount : public testing::Test
@@ -45,7 +42,7 @@ protected:
                                            std::size_t size, passwd** found) {
             steps_.emplace_back("read");
             bufferSizes_.push_back(size);
-            return libc::realFgetpwent_r(stream, entry, buffer, size, found);
+            return interpose::real(fgetpwent_r)(stream, entry, buffer, size, found);
         };
     }
 
@@ -94,7 +91,7 @@ TEST_F(UserCount, CountsNobodyWithoutAnAccountFile)
 TEST_F(UserCount, OpensTheAccountFileInItsOwnMode)
 {
     std::vector<std::string> opened;
-    auto const below = libc::hooks().fopen;
+    auto const below = libc::hooks().fopen.answer();
     libc::hooks().fopen = [&opened, below](char const* path, char const* mode) {
         opened.push_back(std::string(path) + "|" + mode);
         return below(path, mode);
@@ -140,7 +137,7 @@ TEST_F(UserCount, EndsAtAnyError)
         steps_.emplace_back("read");
         if (steps_.size() == 4)
             return EINVAL;
-        return libc::realFgetpwent_r(stream, entry, buffer, size, found);
+        return interpose::real(fgetpwent_r)(stream, entry, buffer, size, found);
     };
     EXPECT_EQ(countOf(account("root", 0) + account("a", 1000) + account("b", 1001)), 1U);
     EXPECT_EQ(steps_, (std::vector<std::string>{"lock", "setpwent", "read", "read", "unlock"}));
@@ -149,7 +146,7 @@ TEST_F(UserCount, EndsAtAnyError)
 TEST_F(UserCount, ClosesTheAccountFileBeforeItReleasesTheLock)
 {
     int descriptor = -1;
-    auto const below = libc::hooks().fopen;
+    auto const below = libc::hooks().fopen.answer();
     files_.write("/etc/passwd", account("root", 0));
     libc::hooks().fopen = [&](char const* path, char const* mode) {
         FILE* const stream = below(path, mode);

@@ -1,7 +1,9 @@
 #include "sysdata/userInfo_linux.h"
 
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
-#include "tests/support/Libc.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 
@@ -15,7 +17,6 @@ namespace
 {
 
 using NQ::userInfo;
-using Lines = std::vector<std::string>;
 
 /** Account operations, with the commands that they run only noted. */
 class AccountOperation : public testing::Test
@@ -31,7 +32,7 @@ protected:
         return log_.texts(6000);
     }
 
-    libc::FakeCommands commands_;
+    FakeCommands commands_;
     Recording log_;
 };
 
@@ -423,7 +424,7 @@ TEST_F(AccountLock, IsFoundInTheFirst4999BytesOfAnyAmountOfOutput)
 TEST_F(AccountLock, LooksForTheSecondReleaseFileOnlyWithoutTheFirst)
 {
     Lines opened;
-    auto const below = libc::hooks().fopen;
+    auto const below = libc::hooks().fopen.answer();
     libc::hooks().fopen = [&opened, below](char const* path, char const* mode) {
         opened.emplace_back(path);
         return below(path, mode);

@@ -1,6 +1,7 @@
 #include "sysdata/userInfo_linux.h"
 
-#include "tests/support/Libc.h"
+#include "tests/support/FakeCommands.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 
@@ -12,8 +13,6 @@
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 constexpr long firstOf2008 = 1199145600; // 1 January 2008, 00:00 UTC
 constexpr long day = 86400;
@@ -44,7 +43,7 @@ protected:
         return log_.texts(6000);
     }
 
-    libc::FakeCommands commands_;
+    FakeCommands commands_;
     Recording log_;
 };
 

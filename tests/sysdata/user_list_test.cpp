@@ -1,7 +1,10 @@
 #include "sysdata/userInfo_linux.h"
 
 #include "sysdata/minMaxId.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/Account.h"
 #include "tests/support/FakeFiles.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 
@@ -23,13 +26,6 @@ namespace
 {
 
 using NQ::userInfo;
-using Lines = std::vector<std::string>;
-
-std::string account(std::string const& name, unsigned int uid)
-{
-    return name + ":x:" + std::to_string(uid) + ":100:" + name + " full:/home/" + name +
-           ":/bin/sh\n";
-}
 
 /** A machine with its own accounts; every step of a listing is noted. */
 class UserListing : public testing::Test
@@ -50,7 +46,7 @@ protected:
                 openAtRelease_ += isOpen(descriptor) ? 1 : 0;
             return 0;
         };
-        auto const below = libc::hooks().fopen;
+        auto const below = libc::hooks().fopen.answer();
         libc::hooks().fopen = [this, below](char const* path, char const* mode) {
             FILE* const stream = below(path, mode);
             std::string const file = path;
@@ -181,7 +177,8 @@ TEST_F(UserListing, EndsAtAnyErrorAndReleasesTheLock)
     int reads = 0;
     libc::hooks().fgetpwent_r = [&reads](FILE* stream, passwd* entry, char* line, std::size_t size,
                                          passwd** found) {
-        return ++reads == 2 ? EINVAL : libc::realFgetpwent_r(stream, entry, line, size, found);
+        return ++reads == 2 ? EINVAL
+                            : interpose::real(fgetpwent_r)(stream, entry, line, size, found);
     };
     EXPECT_EQ(names(), Lines{"a"});
     EXPECT_EQ(reads, 2);
@@ -195,7 +192,7 @@ TEST_F(UserListing, ReadsAccountLinesIntoABufferOf4096Bytes)
     libc::hooks().fgetpwent_r = [&sizes](FILE* stream, passwd* entry, char* line, std::size_t size,
                                          passwd** found) {
         sizes.push_back(size);
-        return libc::realFgetpwent_r(stream, entry, line, size, found);
+        return interpose::real(fgetpwent_r)(stream, entry, line, size, found);
     };
     list();
     EXPECT_EQ(sizes, (std::vector<std::size_t>{4096, 4096}));
@@ -374,7 +371,7 @@ TEST_F(UserListing, StartsTheFailuresAtZeroForEachUser)
 
     // The rules change while the accounts are read: the second user has none.
     bool first = true;
-    auto const below = libc::hooks().fopen;
+    auto const below = libc::hooks().fopen.answer();
     libc::hooks().fopen = [&](char const* path, char const* mode) {
         if (path == std::string("/etc/pam.d/login"))
             files_.write(path, std::exchange(first, false) ? "deny=4\n" : "none\n");
@@ -427,7 +424,7 @@ TEST_F(UserListing, HandsTheShadowReaderABufferOf4096Bytes)
     libc::hooks().fgetspent_r = [&sizes](FILE* stream, spwd* entry, char* line, std::size_t size,
                                          spwd** found) {
         sizes.push_back(size);
-        return libc::realFgetspent_r(stream, entry, line, size, found);
+        return interpose::real(fgetspent_r)(stream, entry, line, size, found);
     };
     list();
     EXPECT_EQ(sizes, std::vector<std::size_t>{4096});

@@ -3,7 +3,8 @@
 #include "TestPaths.h"
 #include "sysdata/userInfo_linux.h"
 
-#include "tests/support/Libc.h"
+#include "tests/support/FileRoot.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 
@@ -18,11 +19,10 @@ namespace
 {
 
 using NQ::userInfo;
-using Lines = std::vector<std::string>;
 
 std::vector<userInfo> usersOf(std::string const& machine)
 {
-    libc::FileRoot const root(MACHINES_DIR "/" + machine);
+    FileRoot const root(MACHINES_DIR "/" + machine);
     std::vector<userInfo> users;
     NQ::getUserInfo(users);
     return users;

@@ -1,4 +1,5 @@
 #include "sysdata/userInfo_parse.h"
+#include "tests/support/Lines.h"
 
 #include <gtest/gtest.h>
 
@@ -69,8 +70,6 @@ TEST(LoginRule, IsAbsentWithoutDeny)
     expectDenied("deny 3", Scan::absent, untouched);
     expectDenied("DENY=3", Scan::absent, untouched);
 }
-
-using Lines = std::vector<std::string>;
 
 Lines denyLines(std::string_view rules)
 {

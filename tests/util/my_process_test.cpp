@@ -1,6 +1,6 @@
 #include "util/MyProcess.h"
 
-#include "tests/support/Libc.h"
+#include "tests/interpose/Libc.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>

@@ -4,6 +4,7 @@
 #include "host/Mutex.h"
 #include "host/VXLogger.h"
 #include "tests/support/Shown.h"
+#include "tests/support/Symbols.h"
 
 #include <algorithm>
 #include <dlfcn.h>
@@ -75,7 +76,7 @@ std::string category()
     if (!library)
         return "none";
     auto const* const text =
-        static_cast<std::string const*>(dlsym(library, "_ZN2IC6OSSWMI12loggerOsSwMIB5cxx11E"));
+        static_cast<std::string const*>(findSymbol(library, "IC::OSSWMI::loggerOsSwMI"));
     std::string found = text ? *text : "none";
     dlclose(library);
     return found;

@@ -40,7 +40,7 @@ protected:
     /** The first ids in the node-id list. */
     Ids firstIds(std::ptrdiff_t count)
     {
-        Ids const& list = *Insides::nodeIds(mi());
+        Ids const& list = *inside(&OpenInterface::nodeIds_);
         return {list.begin(), list.begin() + count};
     }
 };
@@ -127,7 +127,7 @@ TEST_F(FixedNodes, TheIdListGoesOnWithTheOperatingSystemAndAllThatFollows)
     for (IC::MutableNode const* node : plugin.nodes())
         if (node->getNodeId() > 7)
             expected.push_back(node->getNodeId());
-    EXPECT_EQ(*Insides::nodeIds(mi()), expected);
+    EXPECT_EQ(*inside(&OpenInterface::nodeIds_), expected);
 }
 
 TEST_F(FixedNodes, IdsAreCountedInTheOrderInWhichTheKindsAreBuilt)
@@ -146,7 +146,7 @@ TEST_F(FixedNodes, IdsAreCountedInTheOrderInWhichTheKindsAreBuilt)
         }
     }
     EXPECT_EQ(types, (Ids{39, 59, 40, 17, 44, 46, 51, 35, 47}));
-    EXPECT_EQ(Insides::nextNodeId(mi()), next);
+    EXPECT_EQ(inside(&OpenInterface::nextNodeId_), next);
 }
 
 TEST_F(FixedNodes, TheInterfacesNodeLeavesTheCounterAlone)
@@ -154,7 +154,7 @@ TEST_F(FixedNodes, TheInterfacesNodeLeavesTheCounterAlone)
     unsigned int counter = 0;
     host.onSetStatus = [this, &counter](IC::MutableNode& node) {
         if (node.getNodeType() == IC::nodeType::osSw)
-            counter = Insides::nextNodeId(mi());
+            counter = inside(&OpenInterface::nextNodeId_);
     };
     plugin.initialize(5);
     EXPECT_EQ(counter, 6U);
@@ -163,13 +163,12 @@ TEST_F(FixedNodes, TheInterfacesNodeLeavesTheCounterAlone)
 TEST_F(FixedNodes, StandInTheMembersOfTheirKindAndInTheListFromTheStart)
 {
     plugin.initialize();
-    IC::OsSwMI& interface = mi();
     auto const nodes = plugin.nodes();
     ASSERT_GE(nodes.size(), 4U);
-    EXPECT_EQ(Insides::osSwNode(interface), nodes[0]);
-    EXPECT_EQ(Insides::rootNode(interface), nodes[1]);
-    EXPECT_EQ(Insides::computerNode(interface), nodes[2]);
-    EXPECT_EQ(Insides::osNode(interface), nodes[3]);
+    EXPECT_EQ(inside(&OpenInterface::osSwNode_), nodes[0]);
+    EXPECT_EQ(inside(&OpenInterface::rootNode_), nodes[1]);
+    EXPECT_EQ(inside(&OpenInterface::computerNode_), nodes[2]);
+    EXPECT_EQ(inside(&OpenInterface::osNode_), nodes[3]);
 }
 
 TEST_F(FixedNodes, LikeAllNodesAreCurrentAndListedBeforeTheirStatusIsSet)
@@ -180,17 +179,17 @@ TEST_F(FixedNodes, LikeAllNodesAreCurrentAndListedBeforeTheirStatusIsSet)
     std::set<unsigned int> types;
     host.onSetStatus = [this, &types](IC::MutableNode& node) {
         types.insert(node.getNodeType());
-        EXPECT_EQ(Insides::currentNode(mi()), &node);
-        EXPECT_EQ(Insides::nodes(mi()).back(), &node);
+        EXPECT_EQ(inside(&OpenInterface::currentNode_), &node);
+        EXPECT_EQ(inside(&OpenInterface::nodes_).back(), &node);
         switch (node.getNodeType()) {
         case IC::nodeType::user:
-            EXPECT_EQ(Insides::userNodes(mi()).back(), &node);
+            EXPECT_EQ(inside(&OpenInterface::userNodes_).back(), &node);
             break;
         case IC::nodeType::group:
-            EXPECT_EQ(Insides::groupNodes(mi()).back(), &node);
+            EXPECT_EQ(inside(&OpenInterface::groupNodes_).back(), &node);
             break;
         case IC::nodeType::logEntry:
-            EXPECT_EQ(Insides::logEntryNodes(mi()).back(), &node);
+            EXPECT_EQ(inside(&OpenInterface::logEntryNodes_).back(), &node);
             break;
         default:
             break;
@@ -217,7 +216,7 @@ TEST_F(FixedNodes, CarryTheInterfaceIdsOfTheMomentAtWhichTheyWereMade)
                         {"wc -l /var/log/messages", "2 /var/log/messages\n"}};
     plugin.initialize(5);
     ASSERT_EQ(plugin.nodes(IC::nodeType::logEntry).size(), 2U);
-    Insides::miIds(mi()).push_back(10);
+    inside(&OpenInterface::miIds_).push_back(10);
     for (IC::MutableNode const* node : plugin.nodes())
         EXPECT_EQ(node->getMIIds(), (Ids{5, 9})) << node->getDescription();
 }
@@ -226,7 +225,7 @@ TEST_F(FixedNodes, ALaterInterfaceIdShowsInTheNodesMadeAfterIt)
 {
     host.onSetStatus = [this](IC::MutableNode& node) {
         if (node.getNodeType() == IC::nodeType::root)
-            Insides::miIds(mi()).push_back(9);
+            inside(&OpenInterface::miIds_).push_back(9);
     };
     plugin.initialize(5);
     EXPECT_EQ(plugin.node(IC::nodeType::root).getMIIds(), Ids{5});
@@ -238,8 +237,9 @@ TEST_F(FixedNodes, StandInTheMemberOfTheirKindBeforeTheirStatusIsSet)
     Ids seen;
     host.onSetStatus = [this, &seen](IC::MutableNode& node) {
         for (IC::MutableNode* member :
-             {Insides::osSwNode(mi()), Insides::rootNode(mi()), Insides::computerNode(mi()),
-              Insides::osNode(mi()), Insides::logNode(mi())})
+             {inside(&OpenInterface::osSwNode_), inside(&OpenInterface::rootNode_),
+              inside(&OpenInterface::computerNode_), inside(&OpenInterface::osNode_),
+              inside(&OpenInterface::logNode_)})
             if (member == &node)
                 seen.push_back(node.getNodeType());
     };
@@ -251,7 +251,7 @@ TEST_F(FixedNodes, NoteTheInterfacesOwnIdOnceTheyAreMade)
 {
     Ids noted;
     host.onNode = [this, &noted] {
-        noted.push_back(static_cast<unsigned int>(Insides::nodeIds(mi())->size()));
+        noted.push_back(static_cast<unsigned int>(inside(&OpenInterface::nodeIds_)->size()));
     };
     plugin.initialize(5);
     ASSERT_GE(noted.size(), 3U);
@@ -262,7 +262,7 @@ TEST_F(FixedNodes, TakeTheCountersValueOfTheMoment)
 {
     host.onSetStatus = [this](IC::MutableNode& node) {
         if (node.getNodeType() == IC::nodeType::osSw)
-            Insides::nextNodeId(mi()) = 40;
+            inside(&OpenInterface::nextNodeId_) = 40;
     };
     plugin.initialize(5);
     EXPECT_EQ(plugin.node(IC::nodeType::root).getNodeId(), 40U);
@@ -306,21 +306,19 @@ TEST_F(FixedNodes, LikeAllParentsAreAskedForTheirIds)
     Renumbered parent;
     auto const parentOf = [this, &parent](IC::MutableNode*& member, std::string const& builder) {
         member = &parent;
-        std::string const symbol = "_ZN2IC6OsSwMI" + builder;
-        void* const code = plugin.symbol(symbol.c_str());
-        if (builder.back() == 'b')
+        void* const code = plugin.symbol("IC::OsSwMI::" + builder);
+        if (builder.find("bool") != std::string::npos)
             reinterpret_cast<void (*)(IC::OsSwMI*, bool)>(code)(&mi(), false);
         else
             reinterpret_cast<void (*)(IC::OsSwMI*)>(code)(&mi());
         return plugin.nodes().back()->getLinkedId();
     };
-    IC::OsSwMI& all = mi();
-    EXPECT_EQ(parentOf(Insides::rootNode(all), "19createComputerNodesEv"), 77U);
-    EXPECT_EQ(parentOf(Insides::computerNode(all), "13createOsNodesEv"), 77U);
-    for (char const* builder : {"17createDriverNodesEv", "15createUserNodesEb",
-                                "16createGroupNodesEb", "14createLogNodesEv"})
-        EXPECT_EQ(parentOf(Insides::osNode(all), builder), 77U) << builder;
-    EXPECT_EQ(parentOf(Insides::logNode(all), "19createLogEntryNodesEb"), 77U);
+    EXPECT_EQ(parentOf(inside(&OpenInterface::rootNode_), "createComputerNodes()"), 77U);
+    EXPECT_EQ(parentOf(inside(&OpenInterface::computerNode_), "createOsNodes()"), 77U);
+    for (char const* builder : {"createDriverNodes()", "createUserNodes(bool)",
+                                "createGroupNodes(bool)", "createLogNodes()"})
+        EXPECT_EQ(parentOf(inside(&OpenInterface::osNode_), builder), 77U) << builder;
+    EXPECT_EQ(parentOf(inside(&OpenInterface::logNode_), "createLogEntryNodes(bool)"), 77U);
 }
 
 } // namespace

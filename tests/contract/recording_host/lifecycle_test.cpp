@@ -5,6 +5,9 @@
 
 #include "host/OpenMI.h"
 #include "host/Properties.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
+#include "tests/support/FileRoot.h"
 
 #include <algorithm>
 #include <ctime>
@@ -59,8 +62,8 @@ TEST_F(Library, ConstructsItsObjectsInOrderAndDestroysThemInReverse)
 TEST_F(Library, DestroysTheMutexOfTheGroupListingFirstOfAll)
 {
     RecordingHost& host = freshHost();
-    libc::FileRoot const files{MACHINES_DIR "/redhat"};
-    libc::FakeCommands const commands;
+    FileRoot const files{MACHINES_DIR "/redhat"};
+    FakeCommands const commands;
     auto plugin = std::make_unique<Plugin>();
     plugin->initialize(); // which lists the groups for the first time
     plugin->unload();
@@ -78,9 +81,9 @@ TEST_F(Library, DeletesNoNodeWhenItIsClosed)
     IC::MutableNode user(1, 0, {1}, IC::nodeType::user, 1);
     IC::MutableNode group(2, 0, {1}, IC::nodeType::group, 1);
     IC::MutableNode entry(3, 0, {1}, IC::nodeType::logEntry, 1);
-    Insides::userNodes(mi) = {&user};
-    Insides::groupNodes(mi) = {&group};
-    Insides::logEntryNodes(mi) = {&entry};
+    mi.*(&OpenInterface::userNodes_) = {&user};
+    mi.*(&OpenInterface::groupNodes_) = {&group};
+    mi.*(&OpenInterface::logEntryNodes_) = {&entry};
     host.events.clear();
     plugin.reset();
     EXPECT_EQ(host.events, (Lines{"~Mutex()", "~Error()",
@@ -98,7 +101,7 @@ class Lifecycle : public Loaded
 protected:
     IC::OsSwMI*& current() const
     {
-        return object<IC::OsSwMI*>("_ZN2IC7pOsSwMIE");
+        return object<IC::OsSwMI*>("IC::pOsSwMI");
     }
 
     /** Deletes the nodes of a kind and makes them anew, as a write of a host does. */
@@ -120,21 +123,21 @@ protected:
 
 TEST_F(Lifecycle, StartsWithEmptyListsNoInterfaceInUseAndTheFlagDown)
 {
-    EXPECT_TRUE(Insides::userNodes(mi()).empty());
-    EXPECT_TRUE(Insides::groupNodes(mi()).empty());
-    EXPECT_TRUE(Insides::logEntryNodes(mi()).empty());
+    EXPECT_TRUE(inside(&OpenInterface::userNodes_).empty());
+    EXPECT_TRUE(inside(&OpenInterface::groupNodes_).empty());
+    EXPECT_TRUE(inside(&OpenInterface::logEntryNodes_).empty());
     EXPECT_EQ(current(), nullptr);
-    EXPECT_FALSE(object<bool>("_ZN2IC6OSSWMI7MI_callE"));
+    EXPECT_FALSE(object<bool>("IC::OSSWMI::MI_call"));
 }
 
 TEST_F(Lifecycle, ReadsTheIdRangesNotBeforeTheyAreAskedFor)
 {
-    auto const& instance = object<void*>("_ZN2NQ8minMaxId9pinstanceE");
+    auto const& instance = object<void*>("NQ::minMaxId::pinstance");
     EXPECT_EQ(instance, nullptr);
     plugin.initialize();
     void const* const first = instance;
     EXPECT_NE(first, nullptr);
-    rebuild("_ZN2IC6OsSwMI15createUserNodesEb");
+    rebuild("IC::OsSwMI::createUserNodes(bool)");
     EXPECT_EQ(instance, first);
 }
 
@@ -148,8 +151,8 @@ TEST_F(Lifecycle, OpenMIYieldsTheSameTwoAddressesEachTime)
         EXPECT_EQ(interface, &plugin.interface());
         EXPECT_EQ(error, &plugin.status());
     }
-    EXPECT_EQ(interface, plugin.symbol("_ZN2IC6OSSWMI8myosswmiE"));
-    EXPECT_EQ(error, plugin.symbol("_ZN2IC6OSSWMI5myerrE"));
+    EXPECT_EQ(interface, plugin.symbol("IC::OSSWMI::myosswmi"));
+    EXPECT_EQ(error, plugin.symbol("IC::OSSWMI::myerr"));
 }
 
 TEST_F(Lifecycle, OpenMIAsksNothingOfTheHostAndSaysNothing)
@@ -170,12 +173,12 @@ TEST_F(Lifecycle, SetLoadCallBackStoresItsThreeArgumentsAndCallsNothing)
                                                               IC::Node**) -> IC::Error { throw 1; };
     host.events.clear();
     mi().setLoadCallBack(load, this, lookUp);
-    EXPECT_EQ(Insides::loadCallBack(mi()), load);
-    EXPECT_EQ(Insides::loadCallBackContext(mi()), this);
-    EXPECT_EQ(Insides::lookupCallBack(mi()), lookUp);
+    EXPECT_EQ(inside(&OpenInterface::loadCallBack_), load);
+    EXPECT_EQ(inside(&OpenInterface::loadCallBackContext_), this);
+    EXPECT_EQ(inside(&OpenInterface::lookupCallBack_), lookUp);
     EXPECT_EQ(host.events, Lines());
     plugin.initialize();
-    rebuild("_ZN2IC6OsSwMI15createUserNodesEb");
+    rebuild("IC::OsSwMI::createUserNodes(bool)");
 }
 
 TEST_F(Lifecycle, InitializePassesItsThreeArgumentsOnUnchanged)
@@ -192,7 +195,8 @@ TEST_F(Lifecycle, InitializeHasItsInterfaceAndListReadyWhenTheFrameworkInitialis
 {
     bool isReady = false;
     host.onInitialize = [this, &isReady] {
-        isReady = current() == &mi() && Insides::nodeIds(mi()) && Insides::nodeIds(mi())->empty();
+        isReady = current() == &mi() && inside(&OpenInterface::nodeIds_) &&
+                  inside(&OpenInterface::nodeIds_)->empty();
     };
     plugin.initialize();
     EXPECT_TRUE(isReady);
@@ -201,10 +205,10 @@ TEST_F(Lifecycle, InitializeHasItsInterfaceAndListReadyWhenTheFrameworkInitialis
 TEST_F(Lifecycle, InitializeForgetsTheNodeBuiltLastBeforeItBuilds)
 {
     IC::MutableNode last(1, 0, {1}, 39, 0);
-    Insides::currentNode(mi()) = &last;
+    inside(&OpenInterface::currentNode_) = &last;
     std::vector<IC::MutableNode*> seen;
-    host.onInitialize = [this, &seen] { seen.push_back(Insides::currentNode(mi())); };
-    host.onNode = [this, &seen] { seen.push_back(Insides::currentNode(mi())); };
+    host.onInitialize = [this, &seen] { seen.push_back(inside(&OpenInterface::currentNode_)); };
+    host.onNode = [this, &seen] { seen.push_back(inside(&OpenInterface::currentNode_)); };
     plugin.initialize();
     ASSERT_GE(seen.size(), 2U);
     EXPECT_EQ(seen[0], &last);
@@ -247,7 +251,7 @@ TEST_F(Lifecycle, AFailingFrameworkIsWhatTheHostHearsOfAndTheTreeStandsAllTheSam
 TEST_F(Lifecycle, TheTreeStandsWhateverTheSettersAnswer)
 {
     // Told from the clock, the time of the last boot may differ by a second from start to start.
-    libc::hooks().time = [] { return std::time_t{1273659825}; };
+    libc::hooks().time = [](std::time_t*) { return std::time_t{1273659825}; };
     libc::hooks().sysinfo = [](struct sysinfo* figures) {
         *figures = {};
         figures->uptime = 1000;
@@ -334,14 +338,14 @@ protected:
     void publish(IC::Node* node)
     {
         auto* const publishNode = reinterpret_cast<void (*)(IC::OsSwMI*, IC::Node*)>(
-            plugin.symbol("_ZN2IC6OsSwMI11publishNodeEPNS_4NodeE"));
+            plugin.symbol("IC::OsSwMI::publishNode(IC::Node*)"));
         publishNode(&mi(), node);
     }
 };
 
 TEST_F(Publishing, HandsTheNodeToTheFramework)
 {
-    publish(Insides::rootNode(mi()));
+    publish(inside(&OpenInterface::rootNode_));
     EXPECT_EQ(host.events, (Lines{"log: publishNode: entry", "addNewNode(ROOT Node)",
                                   "log: publishNode: exit"}));
 }
@@ -350,7 +354,7 @@ TEST_F(Publishing, LogsARefusalOnceAsAnErrorAndLeavesTheNodeWhereItIs)
 {
     host.addNewNodeStatus = 1;
     std::size_t const nodes = plugin.nodes().size();
-    publish(Insides::rootNode(mi()));
+    publish(inside(&OpenInterface::rootNode_));
     EXPECT_EQ(host.messages(), (Lines{"publishNode: entry", "addNewNode error = status 1, refused",
                                       "publishNode: exit"}));
     EXPECT_EQ(host.messages(6000), Lines{"addNewNode error = status 1, refused"});
@@ -361,7 +365,7 @@ TEST_F(Publishing, LogsARefusalOnceAsAnErrorAndLeavesTheNodeWhereItIs)
 TEST_F(Publishing, TakesAnyStatusButZeroForARefusal)
 {
     host.addNewNodeStatus = 255;
-    publish(Insides::rootNode(mi()));
+    publish(inside(&OpenInterface::rootNode_));
     EXPECT_EQ(host.messages(6000), Lines{"addNewNode error = status 255, refused"});
 }
 
@@ -418,9 +422,9 @@ INSTANTIATE_TEST_SUITE_P(All, LockedBuild, testing::Values("createUserNodes", "c
 
 INSTANTIATE_TEST_SUITE_P(
     All, Rebuilding,
-    testing::Values(Rebuild{"Users", "_ZN2IC6OsSwMI15createUserNodesEb", IC::nodeType::user},
-                    Rebuild{"Groups", "_ZN2IC6OsSwMI16createGroupNodesEb", IC::nodeType::group},
-                    Rebuild{"LogEntries", "_ZN2IC6OsSwMI19createLogEntryNodesEb",
+    testing::Values(Rebuild{"Users", "IC::OsSwMI::createUserNodes(bool)", IC::nodeType::user},
+                    Rebuild{"Groups", "IC::OsSwMI::createGroupNodes(bool)", IC::nodeType::group},
+                    Rebuild{"LogEntries", "IC::OsSwMI::createLogEntryNodes(bool)",
                             IC::nodeType::logEntry}),
     [](auto const& rebuild) { return std::string(rebuild.param.name); });
 
@@ -429,21 +433,21 @@ TEST_F(Lifecycle, UnloadLetsTheFrameworkGoFirstAndThenFreesTheIdList)
     plugin.initialize();
     host.events.clear();
     bool hadList = false;
-    host.onUnload = [this, &hadList] { hadList = Insides::nodeIds(mi()) != nullptr; };
+    host.onUnload = [this, &hadList] { hadList = inside(&OpenInterface::nodeIds_) != nullptr; };
     plugin.unload();
     EXPECT_EQ(host.events[0], "log: unload: entry");
     EXPECT_EQ(host.events[1], "unload()");
     EXPECT_EQ(host.events.back(), "log: unload: exit");
     EXPECT_TRUE(hadList);
-    EXPECT_EQ(Insides::nodeIds(mi()), nullptr);
+    EXPECT_EQ(inside(&OpenInterface::nodeIds_), nullptr);
 }
 
 TEST_F(Lifecycle, UnloadDeletesNoNodeItself)
 {
     plugin.initialize();
-    IC::MutableNode* const root = Insides::rootNode(mi());
-    auto kept = Insides::nodes(mi());
-    host.onUnload = [this] { Insides::nodes(mi()).clear(); }; // the framework keeps them
+    IC::MutableNode* const root = inside(&OpenInterface::rootNode_);
+    auto kept = inside(&OpenInterface::nodes_);
+    host.onUnload = [this] { inside(&OpenInterface::nodes_).clear(); }; // the framework keeps them
     plugin.unload();
     EXPECT_EQ(root->getDescription(), "ROOT Node");
     for (IC::Node* node : kept)
@@ -462,7 +466,7 @@ TEST_F(Lifecycle, CanBeginAgainAfterUnload)
     plugin.initialize(5);
     plugin.unload();
     plugin.initialize(5);
-    Ids const list = *Insides::nodeIds(mi());
+    Ids const list = *inside(&OpenInterface::nodeIds_);
     EXPECT_EQ(Ids(list.begin(), list.begin() + 4), (Ids{5, 6, 5, 7}));
 }
 
@@ -514,14 +518,14 @@ TEST_F(Lifecycle, TheFrameSpeaksUnderItsOwnCategoryAndFile)
 TEST_F(Library, LeavesTheIdRangesOnTheHeapWhenItIsClosed)
 {
     freshHost();
-    libc::FileRoot const files{MACHINES_DIR "/redhat"};
-    libc::FakeCommands const commands;
+    FileRoot const files{MACHINES_DIR "/redhat"};
+    FakeCommands const commands;
     auto plugin = std::make_unique<Plugin>();
     plugin->initialize();
     auto const* const ranges =
-        *static_cast<unsigned int const* const*>(plugin->symbol("_ZN2NQ8minMaxId9pinstanceE"));
+        *static_cast<unsigned int const* const*>(plugin->symbol("NQ::minMaxId::pinstance"));
     auto* const ask =
-        reinterpret_cast<void const* (*)()>(plugin->symbol("_ZN2NQ8minMaxId8InstanceEv"));
+        reinterpret_cast<void const* (*)()>(plugin->symbol("NQ::minMaxId::Instance()"));
     EXPECT_EQ(ask(), ranges);
     Dl_info info{};
     EXPECT_EQ(dladdr(ranges, &info), 0); // part of no loaded file
@@ -532,21 +536,21 @@ TEST_F(Library, LeavesTheIdRangesOnTheHeapWhenItIsClosed)
 TEST_F(Library, ReadsTheIdRangesAgainWhenItIsLoadedAgain)
 {
     freshHost();
-    libc::FakeCommands const commands;
+    FakeCommands const commands;
     Ids lowest;
     for (char const* machine : {MACHINES_DIR "/redhat", MACHINES_DIR "/suse"}) {
-        libc::FileRoot const files{machine};
+        FileRoot const files{machine};
         Plugin plugin;
         plugin.initialize();
         lowest.push_back(
-            **static_cast<unsigned int const* const*>(plugin.symbol("_ZN2NQ8minMaxId9pinstanceE")));
+            **static_cast<unsigned int const* const*>(plugin.symbol("NQ::minMaxId::pinstance")));
     }
     EXPECT_EQ(lowest, (Ids{500, 1000}));
 }
 
 TEST_F(Lifecycle, TheFlagIsUpWhileAUserNodeIsSetUpAndDownWhileAnyNodeIsMade)
 {
-    bool const& flag = object<bool>("_ZN2IC6OSSWMI7MI_callE");
+    bool const& flag = object<bool>("IC::OSSWMI::MI_call");
     host.onNode = [&flag] { EXPECT_FALSE(flag); };
     host.onSetStatus = [&flag](IC::MutableNode const& node) {
         EXPECT_EQ(flag, node.getNodeType() == IC::nodeType::user) << node.getNodeType();
@@ -562,8 +566,8 @@ TEST_F(Lifecycle, ARebuildHoldsTheLockFromItsBeginningToItsEnd)
         std::string name;
         char const* symbol;
         int unlocks; // the listing of groups has a lock of its own
-    } const rebuilds[] = {{"createUserNodes", "_ZN2IC6OsSwMI15createUserNodesEb", 1},
-                          {"createGroupNodes", "_ZN2IC6OsSwMI16createGroupNodesEb", 2}};
+    } const rebuilds[] = {{"createUserNodes", "IC::OsSwMI::createUserNodes(bool)", 1},
+                          {"createGroupNodes", "IC::OsSwMI::createGroupNodes(bool)", 2}};
     for (auto const& made : rebuilds) {
         host.events.clear();
         rebuild(made.symbol);
@@ -580,13 +584,10 @@ TEST_F(Lifecycle, ARebuildHoldsTheLockFromItsBeginningToItsEnd)
 TEST_F(Lifecycle, HasTheCategoryOfEveryUnitBeforeAnythingIsAskedOfIt)
 {
     std::pair<char const*, char const*> const units[] = {
-        {"_ZN2IC6OSSWMI12loggerOsSwMIB5cxx11E", ""},
-        {"_ZN2NQ15loggerMyProcessB5cxx11E", ".MyProcess"},
-        {"_ZN2NQ12loggerOsInfoB5cxx11E", ".OsInfo"},
-        {"_ZN2NQ9USER_INFO14loggerUserInfoB5cxx11E", ".UserInfo"},
-        {"_ZN2NQ15loggerGroupInfoB5cxx11E", ".GroupInfo"},
-        {"_ZN2NQ16loggerDriverInfoB5cxx11E", ".DriverInfo"},
-        {"_ZN2NQ13loggerLogInfoB5cxx11E", ".LogInfo"}};
+        {"IC::OSSWMI::loggerOsSwMI", ""},      {"NQ::loggerMyProcess", ".MyProcess"},
+        {"NQ::loggerOsInfo", ".OsInfo"},       {"NQ::USER_INFO::loggerUserInfo", ".UserInfo"},
+        {"NQ::loggerGroupInfo", ".GroupInfo"}, {"NQ::loggerDriverInfo", ".DriverInfo"},
+        {"NQ::loggerLogInfo", ".LogInfo"}};
     for (auto const& [symbol, end] : units)
         EXPECT_EQ(object<std::string>(symbol), std::string("Veltrix.IC.MI.OsSwMI") + end);
 }
@@ -603,7 +604,7 @@ TEST_F(Lifecycle, LeavesTheDriversAloneWhenOtherNodesAreMadeAnew)
     commands.ran.clear();
     host.events.clear();
     plugin.node(IC::nodeType::operatingSystem).setProperty(75, {IC::Number(0U), true});
-    rebuild("_ZN2IC6OsSwMI19createLogEntryNodesEb");
+    rebuild("IC::OsSwMI::createLogEntryNodes(bool)");
     EXPECT_EQ(plugin.nodes(IC::nodeType::driver), drivers);
     EXPECT_EQ(drivers[0]->getNodeId(), id);
     for (std::string const& event : host.events) // an address may be used again
@@ -615,7 +616,7 @@ TEST_F(Lifecycle, LeavesTheDriversAloneWhenOtherNodesAreMadeAnew)
 TEST_F(Publishing, OfLogEntriesTakesNoLock)
 {
     commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
-    rebuild("_ZN2IC6OsSwMI19createLogEntryNodesEb");
+    rebuild("IC::OsSwMI::createLogEntryNodes(bool)");
     EXPECT_EQ(plugin.nodes(IC::nodeType::logEntry).size(), 3U);
     for (std::string const& event : host.events)
         EXPECT_EQ(event.find("lock("), std::string::npos) << event;
@@ -624,8 +625,8 @@ TEST_F(Publishing, OfLogEntriesTakesNoLock)
 TEST_F(Lifecycle, OpensNoFileButThoseOfTheSystemThatItIsToRead)
 {
     std::set<std::string> opened;
-    libc::hooks().fopen = [&opened, below = libc::hooks().fopen](char const* path,
-                                                                 char const* mode) {
+    libc::hooks().fopen = [&opened, below = libc::hooks().fopen.answer()](char const* path,
+                                                                          char const* mode) {
         opened.insert(path);
         return below(path, mode);
     };
@@ -645,7 +646,7 @@ TEST_F(Lifecycle, InitializeKeepsTheFrameworksAnswerFirstAndReturnsWhatIsKeptAtT
     Ids kept;
     host.onNode = [this, &kept] {
         kept.push_back(plugin.status().getStatus());
-        object<IC::Error>("_ZN2IC6OSSWMI5myerrE") = IC::Error(9, IC::Number(0U), "later");
+        object<IC::Error>("IC::OSSWMI::myerr") = IC::Error(9, IC::Number(0U), "later");
     };
     EXPECT_EQ(plugin.initialize().getStatus(), 9);
     ASSERT_FALSE(kept.empty());

@@ -219,7 +219,7 @@ TEST_F(UserCommandWrites, AnswerWhatTheStoreAnswersWhateverBecomesOfTheAction)
         EXPECT_EQ(user->setProperty(id, IC::PropertyValue("1", true)).getStatus(), 7) << id;
     EXPECT_FALSE(commands.ran.empty());
     commands.ran.clear();
-    bool& flag = object<bool>("_ZN2IC6OSSWMI7MI_callE");
+    bool& flag = object<bool>("IC::OSSWMI::MI_call");
     flag = true;
     for (unsigned int const id : {117U, 118U, 91U, 138U})
         EXPECT_EQ(user->setProperty(id, IC::PropertyValue("1", true)).getStatus(), 7) << id;

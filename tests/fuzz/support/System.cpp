@@ -1,6 +1,6 @@
 #include "tests/fuzz/support/System.h"
 
-#include "tests/support/Next.h"
+#include "tests/interpose/Libc.h"
 
 #include <cstdio>
 #include <cstdlib>
@@ -14,7 +14,6 @@ namespace fuzz
 namespace
 {
 
-System* inUse = nullptr;
 std::set<FILE*> open;
 
 FILE* streamOf(std::string const& text)
@@ -25,38 +24,49 @@ FILE* streamOf(std::string const& text)
     return *open.insert(fdopen(descriptor, "r")).first;
 }
 
-/** What the fuzzer itself opens stands elsewhere. */
+/** The fuzzer itself opens files elsewhere. */
 bool isMachines(std::string const& path)
 {
     return path.rfind("/etc/", 0) == 0 || path.rfind("/var/log/", 0) == 0;
-}
-
-FILE* openFile(std::string const& path)
-{
-    auto const file = inUse->files.find(path);
-    return file == inUse->files.end() ? nullptr : streamOf(file->second);
-}
-
-FILE* start(std::string const& command)
-{
-    for (auto const& [beginning, output] : inUse->commands)
-        if (command.compare(0, beginning.size(), beginning) == 0)
-            return streamOf(output);
-    return nullptr;
 }
 
 } // namespace
 
 System::System()
 {
-    inUse = this;
+    libc::Hooks& hooks = libc::hooks();
+    hooks.popen = [this](char const* command, char const*) { return start(command); };
+    hooks.pclose = [](FILE* stream) { return fclose(stream); };
+    hooks.fclose = [](FILE* stream) {
+        open.erase(stream);
+        return libc::hooks().fclose.real()(stream);
+    };
+    hooks.fopen = [this](char const* path, char const* mode) {
+        return isMachines(path) ? openFile(path) : libc::hooks().fopen.real()(path, mode);
+    };
+    hooks.lckpwdf = [] { return 0; };
+    hooks.ulckpwdf = [] { return 0; };
 }
 
 System::~System()
 {
-    inUse = nullptr;
     while (!open.empty())
         fclose(*open.begin());
+    interpose::resetAll();
+}
+
+FILE* System::openFile(std::string const& path) const
+{
+    auto const file = files.find(path);
+    return file == files.end() ? nullptr : streamOf(file->second);
+}
+
+FILE* System::start(std::string const& command) const
+{
+    for (auto const& [beginning, output] : commands)
+        if (command.compare(0, beginning.size(), beginning) == 0)
+            return streamOf(output);
+    return nullptr;
 }
 
 std::string text(std::uint8_t const* data, std::size_t size)
@@ -85,48 +95,3 @@ void require(bool holds)
 }
 
 } // namespace fuzz
-
-using fuzz::inUse;
-
-extern "C" {
-
-FILE* popen(char const* command, char const*)
-{
-    return inUse ? fuzz::start(command) : nullptr;
-}
-
-int pclose(FILE* stream)
-{
-    return fclose(stream);
-}
-
-int fclose(FILE* stream)
-{
-    static auto* const real = next<int(FILE*)>("fclose");
-    fuzz::open.erase(stream);
-    return real(stream);
-}
-
-FILE* fopen(char const* path, char const* mode)
-{
-    static auto* const real = next<FILE*(char const*, char const*)>("fopen");
-    return inUse && fuzz::isMachines(path) ? fuzz::openFile(path) : real(path, mode);
-}
-
-// File streams open through this name.
-FILE* fopen64(char const* path, char const* mode)
-{
-    return fopen(path, mode);
-}
-
-int lckpwdf() noexcept
-{
-    return 0;
-}
-
-int ulckpwdf() noexcept
-{
-    return 0;
-}
-
-} // extern "C"

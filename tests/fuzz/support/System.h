@@ -3,6 +3,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <cstdio>
 #include <map>
 #include <string>
 #include <utility>
@@ -28,6 +29,10 @@ public:
 
     /** Output by the beginning of the command line, the first that fits; others do not start. */
     std::vector<std::pair<std::string, std::string>> commands;
+
+private:
+    FILE* openFile(std::string const& path) const;
+    FILE* start(std::string const& command) const;
 };
 
 std::string text(std::uint8_t const* data, std::size_t size);

@@ -1,6 +1,7 @@
 #include "mihost/accel/LineIndex.h"
 #include "mihost/sandbox/Descriptor.h"
-#include "tests/support/Libc.h"
+#include "tests/interpose/Libc.h"
+#include "tests/support/ReadCounter.h"
 #include "tests/support/ScratchFolder.h"
 
 #include <algorithm>
@@ -34,7 +35,7 @@ protected:
     /** How much it reads for that. */
     std::size_t bytesToUpdate()
     {
-        libc::ReadCounter const counter;
+        ReadCounter const counter;
         EXPECT_TRUE(update());
         return counter.bytes();
     }
@@ -98,7 +99,7 @@ TEST_F(AccelLineIndex, ReadsOneBlockToFindALine)
 {
     write(std::string(4'000'000, '\n'));
     ASSERT_TRUE(update());
-    libc::ReadCounter counter;
+    ReadCounter counter;
     for (std::uint64_t line = 1; line < index_.lineEnds(); line += 99991) {
         counter.reset();
         ASSERT_EQ(index_.find(file_.get(), line), line - 1);

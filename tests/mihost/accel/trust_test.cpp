@@ -1,7 +1,7 @@
 // Whenever the shell could run something else, the real popen is called.
 
+#include "tests/interpose/Libc.h"
 #include "tests/support/BothWays.h"
-#include "tests/support/Libc.h"
 #include "tests/support/ScratchFolder.h"
 
 #include <cstdlib>

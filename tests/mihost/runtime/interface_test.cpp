@@ -4,6 +4,7 @@
 #include "host/MutableNode.h"
 
 #include "mihost/runtime/Runtime.h"
+#include "tests/support/Insides.h"
 
 #include <gtest/gtest.h>
 
@@ -26,17 +27,7 @@ using IC::Number;
 using Events = std::vector<std::string>;
 using Nodes = std::vector<Node*>;
 
-class Interface : public ManagementInterface
-{
-public:
-    using ManagementInterface::loadCallBack_;
-    using ManagementInterface::loadCallBackContext_;
-    using ManagementInterface::lookupCallBack_;
-    using ManagementInterface::miId_;
-    using ManagementInterface::miIds_;
-    using ManagementInterface::nextNodeId_;
-    using ManagementInterface::nodes_;
-};
+using Interface = OpenFramework;
 
 /** A node that says when it goes. */
 class Mortal : public MutableNode

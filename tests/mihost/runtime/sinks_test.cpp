@@ -14,7 +14,6 @@
 namespace
 {
 
-using Lines = std::vector<std::string>;
 using mihost::LineWriter;
 using VXLog::VXLogger;
 

@@ -10,8 +10,6 @@
 namespace
 {
 
-using Lines = std::vector<std::string>;
-
 struct Step {
     std::string command;
     Lines output; // a line of dots stands for any lines

@@ -16,7 +16,6 @@ namespace
 {
 
 using Json = nlohmann::ordered_json;
-using Lines = std::vector<std::string>;
 
 /** Null if the file is not among the changes. */
 Json changeOf(std::string const& file, Json const& answer)

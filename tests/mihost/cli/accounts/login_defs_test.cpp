@@ -2,6 +2,7 @@
 
 #include "sysdata/minMaxId.h"
 #include "tests/support/FakeFiles.h"
+#include "tests/support/Lines.h"
 
 #include <gtest/gtest.h>
 
@@ -9,7 +10,6 @@ namespace
 {
 
 using mihost::LoginDefs;
-using Lines = std::vector<std::string>;
 
 constexpr char usual[] = "UID_MIN 1000\nUID_MAX\t60000\nGID_MIN   500\nGID_MAX 40000\n";
 

@@ -1,5 +1,6 @@
 #include "mihost/cli/accounts/GroupDescription.h"
 #include "mihost/cli/accounts/UserDescription.h"
+#include "tests/support/Lines.h"
 
 #include <gtest/gtest.h>
 
@@ -7,7 +8,6 @@ namespace
 {
 
 using namespace mihost;
-using Lines = std::vector<std::string>;
 
 constexpr long today = 20000;
 

@@ -1,4 +1,5 @@
 #include "mihost/cli/change/AccountChanges.h"
+#include "tests/support/Lines.h"
 
 #include <gtest/gtest.h>
 
@@ -8,7 +9,6 @@ namespace
 using mihost::AccountFiles;
 using mihost::changesBetween;
 using mihost::Secrets;
-using Lines = std::vector<std::string>;
 
 TEST(AccountFileChanges, AreTheLinesThatWentAndCame)
 {

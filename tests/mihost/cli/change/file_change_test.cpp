@@ -2,6 +2,7 @@
 
 #include "mihost/cli/change/FileChange.h"
 #include "mihost/cli/change/SandboxChanges.h"
+#include "tests/support/Lines.h"
 
 #include <gtest/gtest.h>
 
@@ -12,7 +13,6 @@ using mihost::FileChange;
 using mihost::FileState;
 using mihost::PathChange;
 using mihost::Secrets;
-using Lines = std::vector<std::string>;
 
 constexpr mode_t file = S_IFREG;
 

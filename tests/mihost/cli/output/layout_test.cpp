@@ -2,6 +2,7 @@
 
 #include "mihost/cli/output/DisplayWidth.h"
 #include "mihost/cli/output/Style.h"
+#include "tests/support/Lines.h"
 
 #include <gtest/gtest.h>
 
@@ -18,7 +19,6 @@ using mihost::Room;
 using mihost::Style;
 using mihost::Table;
 using mihost::wrapped;
-using Lines = std::vector<std::string>;
 
 constexpr char fox[] = "the quick brown fox jumps over the lazy dog";
 

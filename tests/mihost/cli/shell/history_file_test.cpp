@@ -1,6 +1,7 @@
 #include "mihost/cli/shell/HistoryFile.h"
 
 #include "mihost/cli/system/TextFile.h"
+#include "tests/support/Lines.h"
 #include "tests/support/ScratchFolder.h"
 
 #include <cstdlib>
@@ -15,7 +16,6 @@ namespace
 
 namespace fs = std::filesystem;
 using mihost::HistoryFile;
-using Lines = std::vector<std::string>;
 
 class HistoryFileTest : public testing::Test
 {

@@ -15,13 +15,12 @@ namespace
 {
 
 using Json = nlohmann::ordered_json;
-using Lines = std::vector<std::string>;
 
 constexpr int logLines = 120;
 constexpr int moduleCount = 30;
 
 /** Modules that the real lsmod and modinfo know, and a log. */
-void makeMachine()
+void makeMachineOfManyModules()
 {
     machine::lay("plain");
     setenv("PATH", "/usr/sbin:/usr/bin", 1);
@@ -57,7 +56,7 @@ Lines traceLines(std::string const& file)
 
 TEST(MihostAccel, ShowsAndTracesLineByLineWhatMihostDoesWithoutIt)
 {
-    makeMachine();
+    makeMachineOfManyModules();
     Outcome const plain =
         mihostRun({"--trace", "/tmp/plain", "--json", "--no-accel", "list", "drivers"});
     Outcome const fast = mihostRun({"--trace", "/tmp/fast", "--json", "list", "drivers"});
@@ -75,7 +74,7 @@ TEST(MihostAccel, ShowsAndTracesLineByLineWhatMihostDoesWithoutIt)
 
 TEST(MihostAccel, ShowsWithTimingHowEachCommandWasAnswered)
 {
-    makeMachine();
+    makeMachineOfManyModules();
     Outcome const run = mihostRun({"--json", "--timing", "get", "os", "os-name"});
     Json answers;
     for (std::string const& line : linesOf(run.err))
@@ -95,7 +94,7 @@ TEST(MihostAccel, ShowsWithTimingHowEachCommandWasAnswered)
 
 TEST(MihostAccel, RunsALsmodThatIsAScriptAndSaysSo)
 {
-    makeMachine();
+    makeMachineOfManyModules();
     machine::fake("/usr/sbin/lsmod", "echo 'Module Size Used'\necho 'module_7 1 0'\n");
     Outcome const run = mihostRun({"--timing", "list", "drivers", "--columns", "driver-name"});
     EXPECT_NE(run.out.find("module_7"), std::string::npos) << run.out;
@@ -108,7 +107,7 @@ TEST(MihostAccel, RunsALsmodThatIsAScriptAndSaysSo)
 
 TEST(MihostAccel, RunsEveryCommandWithoutTheLibraryAndSaysSo)
 {
-    makeMachine();
+    makeMachineOfManyModules();
     machine::remove(ACCEL_FILE);
     Outcome const run = mihostRun({"--timing", "get", "os", "os-name"});
     EXPECT_EQ(run.code, 0);
@@ -119,7 +118,7 @@ TEST(MihostAccel, RunsEveryCommandWithoutTheLibraryAndSaysSo)
 
 TEST(MihostAccel, IsNotMentionedWhenItIsTurnedOff)
 {
-    makeMachine();
+    makeMachineOfManyModules();
     Outcome const run = mihostRun({"--timing", "--no-accel", "get", "os", "os-name"});
     EXPECT_EQ(run.code, 0);
     EXPECT_EQ(run.err.find("answered"), std::string::npos) << run.err;

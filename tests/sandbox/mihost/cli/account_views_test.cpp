@@ -1,6 +1,7 @@
 // `mihost user NAME` and `mihost group NAME`, at a terminal and in a pipe.
 
 #include "TestPaths.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 #include "tests/support/TerminalRun.h"
@@ -13,7 +14,6 @@ namespace
 {
 
 using Json = nlohmann::ordered_json;
-using Lines = std::vector<std::string>;
 
 /** Accounts whose passwords were changed ten days ago. */
 class AccountViews : public testing::Test

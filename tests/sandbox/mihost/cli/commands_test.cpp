@@ -18,7 +18,6 @@ namespace
 {
 
 using Json = nlohmann::ordered_json;
-using Lines = std::vector<std::string>;
 
 Json jsonOf(Outcome const& outcome)
 {

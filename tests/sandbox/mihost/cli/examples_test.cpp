@@ -13,8 +13,6 @@
 namespace
 {
 
-using Lines = std::vector<std::string>;
-
 /** The lines that a help text shows as examples, without what they mean. */
 Lines examplesIn(std::string const& help)
 {
@@ -59,7 +57,7 @@ std::vector<std::pair<Lines, std::string>> allHelp(Lines const& command)
 
 /** A machine with what the examples name, and mihost and its sandbox as an administrator has them.
  */
-void makeMachine()
+void makeMachineOfTheExamples()
 {
     machine::lay("plain");
     machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
@@ -79,7 +77,7 @@ class Examples : public testing::TestWithParam<mihost::CommandRow const*>
 
 TEST_P(Examples, OfEachCommandWork)
 {
-    makeMachine();
+    makeMachineOfTheExamples();
     bool const isShell = GetParam() == &mihost::commandRows::shell;
     std::string const input = isShell ? "" : "Secret-1\n";
     for (auto const& [command, help] : allHelp({GetParam()->name})) {

@@ -14,8 +14,6 @@
 namespace
 {
 
-using Lines = std::vector<std::string>;
-
 /** A command, what it ends with and a text that it says; each sees what those before it changed. */
 struct Row {
     Lines arguments;

@@ -1,6 +1,7 @@
 // Writes that would reach another account or group than the one meant are refused before anything
 // runs.
 
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
@@ -10,8 +11,6 @@
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 constexpr char hash[] = "$6$saltsalt$hashhashhash";
 

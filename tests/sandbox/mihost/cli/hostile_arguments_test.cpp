@@ -19,7 +19,6 @@ namespace
 {
 
 using Json = nlohmann::ordered_json;
-using Lines = std::vector<std::string>;
 
 constexpr char mark[] = "/tmp/pwned";
 

@@ -16,7 +16,6 @@ namespace
 {
 
 using mihost::ChangeLock;
-using Lines = std::vector<std::string>;
 
 constexpr ChangeLock::Patience atOnce{std::chrono::milliseconds(0), std::chrono::milliseconds(0)};
 constexpr char hash[] = "$6$saltsalt$hashhashhash";

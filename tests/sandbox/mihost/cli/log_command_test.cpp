@@ -19,7 +19,6 @@ namespace
 
 namespace fs = std::filesystem;
 using Json = nlohmann::ordered_json;
-using Lines = std::vector<std::string>;
 
 constexpr char logFile[] = "/var/log/messages";
 

@@ -16,7 +16,6 @@ namespace
 {
 
 namespace fs = std::filesystem;
-using Lines = std::vector<std::string>;
 
 bool holds(std::string const& text, std::string const& part)
 {

@@ -1,5 +1,6 @@
 // Long tables and trees at a terminal, shown by the user's pager.
 
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 #include "tests/support/TerminalRun.h"
@@ -9,8 +10,6 @@
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 constexpr char ctrlC[] = "\x03";
 

@@ -1,5 +1,6 @@
 // A password that was set opens the account, whatever passwd here can do, and shows nowhere.
 
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
@@ -10,8 +11,6 @@
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 constexpr char password[] = "geheim42";
 

@@ -17,7 +17,7 @@ Outcome bash(std::string const& line)
 }
 
 /** A machine with texts of any bytes but separators. */
-void makeMachine(int users = 3)
+void makeMachineOfOddTexts(int users = 3)
 {
     machine::lay("plain");
     std::string shadow = "root:*:19000:0:99999:7:::\n";
@@ -35,7 +35,7 @@ void makeMachine(int users = 3)
 
 TEST(MihostInAPipe, EndsQuietlyWhenItsReaderGoes)
 {
-    makeMachine(1200); // more lines than fit into a pipe
+    makeMachineOfOddTexts(1200); // more lines than fit into a pipe
     for (char const* arguments :
          {"tree", "--json tree", "tree --all", "list users", "--json list users", "get os",
           "properties", "methods --markdown", "--help", "doctor || true", "metrics",
@@ -49,7 +49,7 @@ TEST(MihostInAPipe, EndsQuietlyWhenItsReaderGoes)
 
 TEST(MihostInAPipe, EndsQuietlyWhenTheReaderOfItsMessagesGoes)
 {
-    makeMachine();
+    makeMachineOfOddTexts();
     for (char const* arguments : {"--trace - tree", "--timing tree", "--trace - shell <<<tree"})
         EXPECT_EQ(
             bash("{ $mihost " + std::string(arguments) + " 2>&1 >/dev/null; } | head -c 1").code, 0)
@@ -60,7 +60,7 @@ TEST(MihostInAPipe, EndsQuietlyWhenTheReaderOfItsMessagesGoes)
 
 TEST(MihostInAPipe, TellsThatItsOutputCannotBeWritten)
 {
-    makeMachine();
+    makeMachineOfOddTexts();
     for (char const* arguments : {"tree", "--json list users", "get os 108", "--help", "--version",
                                   "doctor", "methods", "metrics", "shell <<<'get os 108'"}) {
         Outcome const outcome = bash("$mihost " + std::string(arguments) + " >/dev/full");
@@ -73,7 +73,7 @@ TEST(MihostInAPipe, TellsThatItsOutputCannotBeWritten)
 
 TEST(MihostOnAFullDisk, TellsThatTheTraceWasCutShort)
 {
-    makeMachine();
+    makeMachineOfOddTexts();
     Outcome const outcome =
         bash("mkdir /tmp/small && mount -t tmpfs -o size=16k none /tmp/small && "
              "$mihost --trace /tmp/small/trace get os 108");
@@ -86,7 +86,7 @@ TEST(MihostOnAFullDisk, TellsThatTheTraceWasCutShort)
 
 TEST(MihostJson, IsReadByJqWhateverTheSystemsTextsHold)
 {
-    makeMachine();
+    makeMachineOfOddTexts();
     struct Reading {
         char const* arguments;
         char const* filter;

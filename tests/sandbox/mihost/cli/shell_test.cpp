@@ -11,7 +11,6 @@ namespace
 {
 
 using Json = nlohmann::ordered_json;
-using Lines = std::vector<std::string>;
 
 class MihostScript : public testing::Test
 {

@@ -14,8 +14,6 @@
 namespace
 {
 
-using Lines = std::vector<std::string>;
-
 bool opens(std::string const& account, std::string const& password)
 {
     std::string const hash = machine::entry("/etc/shadow", account).at(1);

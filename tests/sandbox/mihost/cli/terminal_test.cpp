@@ -2,6 +2,7 @@
 
 #include "mihost/cli/output/DisplayWidth.h"
 #include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 #include "tests/support/TerminalRun.h"
@@ -17,8 +18,6 @@
 
 namespace
 {
-
-using Lines = std::vector<std::string>;
 
 constexpr char prompt[] = "mihost> ";
 constexpr char ctrlC[] = "\x03";

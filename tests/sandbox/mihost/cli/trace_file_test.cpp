@@ -23,7 +23,7 @@ Outcome bash(std::string const& line)
 }
 
 /** A machine without a trace of an earlier test. */
-void makeMachine()
+void layMachineWithoutTraces()
 {
     machine::lay("plain");
     for (char const* path : {file, "/etc/victim", "/var/tmp/real", "/tmp/pipe"})
@@ -63,7 +63,7 @@ void expectRefused(std::string const& reason)
 
 TEST(MihostTraceFile, IsReadByItsOwnerAlone)
 {
-    makeMachine();
+    layMachineWithoutTraces();
     EXPECT_EQ(bash("$mihost --trace /tmp/trace get os 108").code, 0);
     EXPECT_EQ(modeOf(file), 0600U);
     EXPECT_TRUE(isTrace(machine::read(file)));
@@ -71,7 +71,7 @@ TEST(MihostTraceFile, IsReadByItsOwnerAlone)
 
 TEST(MihostTraceFile, IsANewOneWhereOthersMayHaveTheOldOneOpen)
 {
-    makeMachine();
+    layMachineWithoutTraces();
     machine::write(file, "old");
     mihost::Descriptor const reader(open(file, O_RDONLY));
     EXPECT_EQ(traced().code, 0);
@@ -83,7 +83,7 @@ TEST(MihostTraceFile, IsANewOneWhereOthersMayHaveTheOldOneOpen)
 
 TEST(MihostTraceFile, IsEmptiedFirstWhereItIsTheOwnersAlone)
 {
-    makeMachine();
+    layMachineWithoutTraces();
     machine::write(file, std::string(1 << 20, 'x'), 0600);
     ino_t const before = statusOf(file).st_ino;
     EXPECT_EQ(traced().code, 0);
@@ -94,7 +94,7 @@ TEST(MihostTraceFile, IsEmptiedFirstWhereItIsTheOwnersAlone)
 
 TEST(MihostTraceFile, IsNotAnotherUsers)
 {
-    makeMachine();
+    layMachineWithoutTraces();
     machine::write(file, "theirs");
     ASSERT_EQ(chown(file, somebody, somebody), 0);
     expectRefused("it belongs to another user (name another file)");
@@ -103,7 +103,7 @@ TEST(MihostTraceFile, IsNotAnotherUsers)
 
 TEST(MihostTraceFile, IsNotWhereAnotherUsersLinkLeads)
 {
-    makeMachine();
+    layMachineWithoutTraces();
     machine::write("/etc/victim", "precious", 0600);
     ASSERT_EQ(symlink("/etc/victim", file), 0);
     ASSERT_EQ(lchown(file, somebody, somebody), 0);
@@ -113,7 +113,7 @@ TEST(MihostTraceFile, IsNotWhereAnotherUsersLinkLeads)
 
 TEST(MihostTraceFile, IsWhereTheOwnersLinkLeads)
 {
-    makeMachine();
+    layMachineWithoutTraces();
     machine::write("/var/tmp/real", "old");
     ASSERT_EQ(symlink("/var/tmp/real", file), 0);
     EXPECT_EQ(traced().code, 0);
@@ -127,7 +127,7 @@ TEST(MihostTraceFile, IsWhereTheOwnersLinkLeads)
 
 TEST(MihostTraceFile, LeavesAFileWithAnotherNameAlone)
 {
-    makeMachine();
+    layMachineWithoutTraces();
     machine::write("/etc/victim", "precious", 0600);
     ASSERT_EQ(link("/etc/victim", file), 0);
     EXPECT_EQ(traced().code, 0);
@@ -137,7 +137,7 @@ TEST(MihostTraceFile, LeavesAFileWithAnotherNameAlone)
 
 TEST(MihostTraceFile, MayBeAPipeOrAStream)
 {
-    makeMachine();
+    layMachineWithoutTraces();
     EXPECT_TRUE(isTrace(bash("$mihost --trace /dev/stderr get os 108 2>&1 >/dev/null | cat").out));
     EXPECT_TRUE(isTrace(bash("$mihost --trace /dev/stdout get os 108 | cat").out));
     EXPECT_TRUE(isTrace(bash("$mihost --trace /dev/fd/3 get os 108 3>&1 >/dev/null | cat").out));
@@ -150,7 +150,7 @@ TEST(MihostTraceFile, MayBeAPipeOrAStream)
 
 TEST(MihostTraceFile, GoesOnWhereAStandardStreamStands)
 {
-    makeMachine();
+    layMachineWithoutTraces();
     machine::write("/tmp/log", "first line\n");
     EXPECT_EQ(bash("$mihost --trace /dev/stderr get os 108 2>>/tmp/log").code, 0);
     std::string const log = machine::read("/tmp/log");

@@ -13,7 +13,6 @@ namespace
 {
 
 using Json = nlohmann::ordered_json;
-using Lines = std::vector<std::string>;
 
 class UnknownValues : public testing::Test
 {

@@ -16,7 +16,6 @@ namespace
 {
 
 using Json = nlohmann::ordered_json;
-using Lines = std::vector<std::string>;
 
 constexpr char hash[] = "$6$saltsalt$hashhashhash";
 constexpr char silent[] = "exit 0\n";

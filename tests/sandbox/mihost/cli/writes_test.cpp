@@ -14,12 +14,11 @@ namespace
 {
 
 using Json = nlohmann::ordered_json;
-using Lines = std::vector<std::string>;
 
 constexpr char hash[] = "$6$saltsalt$hashhashhash";
 
 /** A machine with the account jdoe. */
-void makeMachine()
+void makeMachineWithJdoe()
 {
     machine::lay("plain");
     ASSERT_EQ(std::system("/usr/sbin/useradd -M -s /bin/sh -c 'J. Doe' jdoe"), 0);
@@ -89,7 +88,7 @@ TEST(MihostCall, DeletesRootOnlyWhenTold)
 
 TEST(MihostSecrets, AreHiddenWhereverTheyCouldShowAndShownWhenTold)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     ASSERT_EQ(std::system(("usermod -p '" + std::string(hash) + "' jdoe").c_str()), 0);
     std::string const script = "call UserAdd UserName=new Password=geheim42\n";
     for (Lines const& arguments :
@@ -117,7 +116,7 @@ TEST(MihostSecrets, AreHiddenWhereverTheyCouldShowAndShownWhenTold)
 
 TEST(MihostSet, SetsAPasswordHashFromStandardInput)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     Outcome const outcome =
         mihostRun({"set", "user:jdoe", "password", "-"}, std::string(hash) + "\n");
     EXPECT_EQ(outcome.code, 0);
@@ -127,7 +126,7 @@ TEST(MihostSet, SetsAPasswordHashFromStandardInput)
 
 TEST(MihostSet, TakesNoPlainPasswordForAHash)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     Outcome const outcome = mihostRun({"set", "user:jdoe", "password", "-"}, "geheim42\n");
     EXPECT_EQ(outcome.code, 2);
     EXPECT_FALSE(stands(outcome.err, "geheim42"));
@@ -136,7 +135,7 @@ TEST(MihostSet, TakesNoPlainPasswordForAHash)
 
 TEST(MihostSet, WritesADayThatThePasswordExpiresOn)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     ASSERT_EQ(std::system("chage -d 2020-01-01 -M 99999 jdoe"), 0);
     EXPECT_EQ(mihostRun({"set", "user:jdoe", "password-expiration", "2020-01-31"}).code, 0);
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(4), "30");
@@ -144,7 +143,7 @@ TEST(MihostSet, WritesADayThatThePasswordExpiresOn)
 
 TEST(MihostSet, RefusesADateThatIsNoneWithTheFormThatIsRight)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     Outcome const outcome = mihostRun({"set", "user:jdoe", "password-expiration", "31.01.2020"});
     EXPECT_EQ(outcome.code, 2);
     EXPECT_TRUE(stands(outcome.err, "YYYY-MM-DD")) << outcome.err;
@@ -152,7 +151,7 @@ TEST(MihostSet, RefusesADateThatIsNoneWithTheFormThatIsRight)
 
 TEST(MihostSet, DeletesAnAccountOnlyWhenTold)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     // The only kind of account whose UID userdel takes for its name.
     machine::write("/etc/passwd", machine::read("/etc/passwd") + "1500:x:1500:1500::/:/bin/sh\n");
     machine::fake("/usr/sbin/userdel", "echo \"$@\" >/tmp/deleted\n"
@@ -170,7 +169,7 @@ TEST(MihostSet, DeletesAnAccountOnlyWhenTold)
 
 TEST(MihostSet, RunsNothingForAnAccountWhoseNameAShellWouldActOn)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     machine::write("/etc/passwd",
                    machine::read("/etc/passwd") + "a$(touch /tmp/ran):x:1500:1500::/:/bin/sh\n");
     for (Lines const& write : {Lines{"password-expiration", "2030-01-01"},
@@ -184,14 +183,14 @@ TEST(MihostSet, RunsNothingForAnAccountWhoseNameAShellWouldActOn)
 
 TEST(MihostSet, RefusesANameForANodeThatAShellWouldActOn)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     EXPECT_EQ(mihostRun({"set", "user:jdoe", "user-name", "a;reboot"}).code, 2);
     EXPECT_EQ(mihostRun({"set", "user:jdoe", "108", "other"}).code, 0);
 }
 
 TEST(MihostSet, TakesAMethodCallApart)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     Outcome const bad =
         mihostRun({"set", "os", "create-user", "UserAdd,UserName:CMPI_string:$(reboot)"});
     EXPECT_EQ(bad.code, 2);
@@ -223,7 +222,7 @@ TEST(MihostRefresh, BuildsUserAndGroupNodesAnew)
 
 TEST(MihostClearLog, EmptiesTheLogWhenTold)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     machine::write("/var/log/messages", "Jan  2 03:04:05 line\n");
     EXPECT_EQ(mihostRun({"--yes", "clear-log"}).out, "0 log entries\n");
     EXPECT_EQ(machine::read("/var/log/messages"), "");
@@ -231,7 +230,7 @@ TEST(MihostClearLog, EmptiesTheLogWhenTold)
 
 TEST(MihostPower, AsksTheMachineToRestartOrHaltWhenTold)
 {
-    makeMachine();
+    makeMachineWithJdoe();
     Json const answer = Json::parse(mihostRun({"--json", "--yes", "power", "restart"}).out);
     EXPECT_EQ(answer["status"], 0);
     EXPECT_EQ(answer["changed"], true);

@@ -91,7 +91,7 @@ protected:
     Plugin plugin;
 };
 
-TEST_F(ConcurrentHost, ReadsEveryNodeWhileOneThreadRefreshesAndAnotherAddsGroups)
+TEST_F(ConcurrentHost, ReadsNodesDuringRefreshesAndNewGroups)
 {
     IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
     std::size_t const nodeCount = plugin.nodes().size();

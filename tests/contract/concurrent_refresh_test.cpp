@@ -43,7 +43,7 @@ protected:
     Plugin plugin;
 };
 
-TEST_F(ConcurrentRefresh, LeavesOneWholeSetOfNodesAndEveryCountRight)
+TEST_F(ConcurrentRefresh, LeavesOneCompleteSetOfNodes)
 {
     IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
     unsigned int const lastId = plugin.nodes().back()->getNodeId();

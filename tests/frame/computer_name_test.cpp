@@ -43,7 +43,7 @@ TEST_F(ComputerName, IsTheMachinesNodeName)
     EXPECT_EQ(name, "harbour");
 }
 
-TEST_F(ComputerName, FailsAndLeavesTheCallersTextWhereTheKernelDoesNotAnswer)
+TEST_F(ComputerName, FailsWithoutAnAnswerOfTheKernel)
 {
     fails_ = true;
     std::string name = "before";
@@ -59,7 +59,7 @@ TEST_F(ComputerName, IsMadeATextByTheHost)
     EXPECT_EQ(texts.made, Lines{"harbour"});
 }
 
-TEST_F(ComputerName, SpeaksForTheFrameAndOfNothingButItsEntryAndExit)
+TEST_F(ComputerName, LogsItsEntryAndExitAsTheFrame)
 {
     for (bool const fails : {false, true}) {
         fails_ = fails;

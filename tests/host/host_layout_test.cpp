@@ -70,7 +70,7 @@ static_assert(std::is_same_v<decltype(OpenInterface::userNodes_), std::vector<IC
 static_assert(std::is_same_v<decltype(OpenInterface::groupNodes_), std::vector<IC::Node*>>);
 static_assert(std::is_same_v<decltype(OpenInterface::logEntryNodes_), std::vector<IC::Node*>>);
 
-TEST(HostLayout, KeepsTheInterfacesMembersInOrderFromTheVirtualTableOn)
+TEST(HostLayout, KeepsTheInterfacesMembersInOrder)
 {
     std::vector<std::ptrdiff_t> const offsets = offsetsIn(OpenInterface());
     EXPECT_EQ(offsets.front(), static_cast<std::ptrdiff_t>(sizeof(void*)));
@@ -91,7 +91,7 @@ std::string definedSymbols()
     return symbols;
 }
 
-TEST(HostLayout, LeavesTablesAndTypeInformationOfHostClassesToTheHost)
+TEST(HostLayout, LeavesTablesOfHostClassesToTheHost)
 {
     std::string const symbols = definedSymbols();
     ASSERT_NE(symbols.find(" vtable for IC::OsNode\n"), std::string::npos);

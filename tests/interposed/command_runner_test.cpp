@@ -108,7 +108,7 @@ TEST_F(CommandRunner, RunsChpasswdForAUsersNewPassword)
     EXPECT_EQ(throughTheRunner(), Commands{"chpasswd -e < usrandpwd ; rm -f usrandpwd|r"});
 }
 
-TEST_F(CommandRunner, LeavesAdministrationMethodsAndTheLockOfAnAccountToTheirOwnPipes)
+TEST_F(CommandRunner, LeavesMethodsAndAccountLocksAlone)
 {
     NQ::OsInfo info;
     info.setCreateUser("UserDel,UserName:CMPI_string:jdoe");

@@ -78,7 +78,7 @@ TEST_F(DateCalls, OfANumberPassEverythingOnUnderTheMonthsName)
                                     "by name 2009     3 4 5 6 7 1"})); // three blanks
 }
 
-TEST_F(DateCalls, OfTheInstallDateAskForItsWeekdayZeroAndLetTheSystemDecideOnSummerTime)
+TEST_F(DateCalls, OfTheInstallDateLeaveSummerTimeToTheSystem)
 {
     files_.write("/etc/redhat-release", "");
     commands_.answers["stat /etc/redhat-release | grep Change"] = "Change: 2010-05-12 10:23:45\n";
@@ -87,7 +87,7 @@ TEST_F(DateCalls, OfTheInstallDateAskForItsWeekdayZeroAndLetTheSystemDecideOnSum
     EXPECT_EQ(conversions().at(0), "by number 2010 5 12 0 10 23 45 -1");
 }
 
-TEST_F(DateCalls, OfALogEntryAskForItsWeekdayZeroAndLetTheSystemDecideOnSummerTime)
+TEST_F(DateCalls, OfALogEntryLeaveSummerTimeToTheSystem)
 {
     commands_.answers = {{"wc -l /var/log/messages", "1 /var/log/messages\n"},
                          {"sed -n '1p' /var/log/messages", "Nov 20 10:11:12 host\n"},
@@ -113,7 +113,7 @@ TEST_F(DateCalls, OfALastChangeAreByNumberAtMidnight)
               (Calls{"by number 1970 1 1 0 0 0 0 -1", "by name 1970 Jan 1 0 0 0 0 -1"}));
 }
 
-TEST_F(DateCalls, OfAnAgeingDateAreByNumberAndOfWhatChageListsByName)
+TEST_F(DateCalls, OfAnAgeingDateAreByNumberOfChageByName)
 {
     commands_.answers["chage -l jdoe"] = "Password expires : Mar 02, 2008\n"
                                          "Last password change : Feb 01, 2008\n";

@@ -79,7 +79,7 @@ protected:
     Frame frame;
 };
 
-TEST_F(LogEntryBuild, ReadsMessageAndTimeIntoOneValueThatStartsEmpty)
+TEST_F(LogEntryBuild, ReadsMessageAndTimeIntoOneValue)
 {
     EXPECT_EQ(asked().reads, (Lines{"81 empty  true", "79 text *host* true"}));
     ASSERT_EQ(asked().values.size(), 2U);

@@ -149,7 +149,7 @@ TEST_F(OsNodeBuild, AsksAndStoresInAFixedOrder)
                                                           "set 139"}));
 }
 
-TEST_F(OsNodeBuild, LeavesAPropertyUnsetWithoutAMessageWhenItsFactCannotBeHad)
+TEST_F(OsNodeBuild, LeavesThePropertyOfAnUnknownFactUnset)
 {
     struct {
         char const* getter;
@@ -178,7 +178,7 @@ TEST_F(OsNodeBuild, LeavesAPropertyUnsetWithoutAMessageWhenItsFactCannotBeHad)
     }
 }
 
-TEST_F(OsNodeBuild, StoresTheProcessCountAsFreeMemoryWhenFreeMemoryCannotBeHad)
+TEST_F(OsNodeBuild, StoresTheProcessCountForUnknownFreeMemory)
 {
     standIns().failing = {"getPhysicalMemoryFree"};
     build();
@@ -281,7 +281,7 @@ public:
     }
 };
 
-TEST_F(OsNodeBuild, AsksOneFactReaderOfItsOwnAndReleasesItBeforeItSaysItsExit)
+TEST_F(OsNodeBuild, ReleasesItsFactReaderBeforeItsExitLine)
 {
     MessagesAmongLives const noting;
     build();
@@ -348,7 +348,7 @@ TEST_F(OsNodeRead, AnswersALiveFigureWhateverWasStoredInItsPlace)
     EXPECT_EQ(stored(144), "text stored true");
 }
 
-TEST_F(OsNodeRead, SucceedsAndLeavesTheCallersValueWhenALiveFigureCannotBeHad)
+TEST_F(OsNodeRead, KeepsTheCallersValueForAnUnknownFigure)
 {
     for (Live const& live : liveProperties) {
         standIns().failing = {live.getter};
@@ -396,7 +396,7 @@ TEST_F(OsNodeRead, HandsBackTheFrameworksErrorForAnUnknownProperty)
     EXPECT_EQ(static_cast<std::string>(value), "before");
 }
 
-TEST_F(OsNodeRead, MakesOneFactReaderForItsOwnTimeWhateverTheProperty)
+TEST_F(OsNodeRead, MakesOneFactReaderForEachRead)
 {
     for (unsigned int const id : {144U, 153U, 191U, 108U, 74U, 4711U}) {
         MessagesAmongLives const noting;

@@ -14,7 +14,7 @@
 namespace
 {
 
-TEST(OsNodeWrite, MakesOneReaderOfEachKindForItsOwnTimeWhateverTheProperty)
+TEST(OsNodeWrite, MakesOneReaderOfEachKindForEachWrite)
 {
     IC::OsNode node(9, 7, {7}, 17, 0);
     for (unsigned int const id : {74U, 75U, 108U, 123U, 191U, 4711U}) {

@@ -115,7 +115,7 @@ protected:
     FakeCommands commands_;
 };
 
-TEST_F(PublicCalls, TheLockQueryRunsItsCommandThroughTheRecordsRunner)
+TEST_F(PublicCalls, TheLockQueryUsesTheRecordsRunner)
 {
     char user[] = "jdoe";
     NQ::userInfo().findIsAcctDisabled(user);
@@ -169,7 +169,7 @@ TEST_F(PublicCalls, TheParserSplitsAtBothLevelsWithTheSplitter)
     }
 }
 
-TEST_F(PublicCalls, TheExecutorRunsItsToolsThroughTheRunnerAndThePasswordSetter)
+TEST_F(PublicCalls, TheExecutorUsesRunnerAndPasswordSetter)
 {
     bool shadowing = false;
     commands_.otherwise = "rc=0";

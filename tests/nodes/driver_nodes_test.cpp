@@ -112,7 +112,7 @@ TEST_F(DriverNodes, AreNoneWithoutModules)
     EXPECT_TRUE(frame.nodeIds_->empty());
 }
 
-TEST_F(DriverNodes, AreNoneWhenLsmodCannotBeStartedAndSayNoMoreThanThat)
+TEST_F(DriverNodes, AreNotBuiltWhenLsmodCannotBeStarted)
 {
     Recording const recording;
     frame.createDriverNodes();

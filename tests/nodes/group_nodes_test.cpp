@@ -52,7 +52,7 @@ protected:
     Frame frame;
 };
 
-TEST_F(GroupNodes, StandUnderTheOperatingSystemInTheOrderOfTheDatabase)
+TEST_F(GroupNodes, HaveTheOrderOfTheDatabase)
 {
     frame.nextNodeId_ = 30;
     frame.createGroupNodes(false);
@@ -170,7 +170,7 @@ TEST_F(GroupNodes, AreAllDeletedOnARefreshBeforeANewOneIsMade)
     EXPECT_EQ(announcement.file, "OsSwMI");
 }
 
-TEST_F(GroupNodes, AreForgottenButNotDeletedWhenBuiltAgainWithoutARefresh)
+TEST_F(GroupNodes, AreNotDeletedWhenBuiltWithoutARefresh)
 {
     frame.createGroupNodes(false);
     frame.createGroupNodes(false);
@@ -280,7 +280,7 @@ TEST_F(GroupNodes, AnswerTheirCountLive)
     EXPECT_EQ(storedValue(*groups()[0], 51), "number 2 true");
 }
 
-TEST_F(GroupNodes, AnswerTheirCountWithoutTheLockThatTheyShareWithUsers)
+TEST_F(GroupNodes, AnswerTheirCountWithoutALock)
 {
     frame.createGroupNodes(false);
     Lines locked;
@@ -351,7 +351,7 @@ TEST_F(GroupNodes, SpeakOfEveryReadForTheFrame)
     }
 }
 
-TEST_F(GroupNodes, AreAnnouncedByTheDescriptionThatTheyHaveWhenTheyAreDeleted)
+TEST_F(GroupNodes, AreAnnouncedByTheirDescriptionWhenDeleted)
 {
     frame.createGroupNodes(false);
     groups()[1]->setDescription("Renamed");

@@ -261,7 +261,7 @@ TEST_F(LogNodes, LeaveTheTimeUnsetWhereALineHasNone)
     EXPECT_NE(storedValue(*entries()[1], 79), "unset");
 }
 
-TEST_F(LogNodes, LeaveMessageAndTimeUnsetWhereTheLogHasShrunkMeanwhile)
+TEST_F(LogNodes, LeaveMessageAndTimeUnsetIfTheLogShrinks)
 {
     haveLines(0);
     commands.first[wc] = {"2 f\n"};

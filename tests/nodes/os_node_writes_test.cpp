@@ -118,14 +118,14 @@ TEST_F(OsNodeWrites, TakeTextsThatAreNumbersForNumbers)
     EXPECT_EQ(stored(123), "text 12 true");
 }
 
-TEST_F(OsNodeWrites, OfThePowerStateAreStoredWhereTheCommandCannotBeStarted)
+TEST_F(OsNodeWrites, StoreThePowerStateIfTheCommandCannotStart)
 {
     commands_.answers.clear();
     EXPECT_EQ(write(123, 9).getStatus(), 0);
     EXPECT_EQ(stored(123), "number 9 true");
 }
 
-TEST_F(OsNodeWrites, OfNineToTheClearCommandClearTheLogAndRebuildItsEntries)
+TEST_F(OsNodeWrites, OfNineToTheClearCommandClearTheLog)
 {
     Recording const log;
     EXPECT_EQ(write(191, 9).getStatus(), 0);
@@ -134,7 +134,7 @@ TEST_F(OsNodeWrites, OfNineToTheClearCommandClearTheLogAndRebuildItsEntries)
     EXPECT_EQ(stored(191), "number 9 true");
 }
 
-TEST_F(OsNodeWrites, ToTheClearCommandLeaveTheEntriesWhereTheLogCannotBeCleared)
+TEST_F(OsNodeWrites, KeepTheEntriesIfTheLogCannotBeCleared)
 {
     libc::hooks().fopen = [](char const*, char const*) -> FILE* { return nullptr; };
     Recording const log;
@@ -155,7 +155,7 @@ TEST_F(OsNodeWrites, OfOtherNumbersToTheClearCommandClearNothing)
     EXPECT_EQ(rebuilt(log), Lines());
 }
 
-TEST_F(OsNodeWrites, OfZeroToTheRefreshTriggerRebuildUsersAndThenGroups)
+TEST_F(OsNodeWrites, OfZeroToRefreshRebuildUsersAndThenGroups)
 {
     Recording const log;
     EXPECT_EQ(write(75, 0).getStatus(), 0);
@@ -163,7 +163,7 @@ TEST_F(OsNodeWrites, OfZeroToTheRefreshTriggerRebuildUsersAndThenGroups)
     EXPECT_EQ(stored(75), "number 0 true");
 }
 
-TEST_F(OsNodeWrites, PublishTheNodesThatTheyRebuildAndDeleteThoseBefore)
+TEST_F(OsNodeWrites, PublishTheNodesThatTheyRebuild)
 {
     files_.write("/etc/passwd", "root:x:0:0:root:/root:/bin/sh\n");
     files_.write("/etc/group", "root:x:0:\n");
@@ -185,7 +185,7 @@ TEST_F(OsNodeWrites, PublishTheNodesThatTheyRebuildAndDeleteThoseBefore)
     }
 }
 
-TEST_F(OsNodeWrites, OfOtherNumbersToTheRefreshTriggerRebuildNothing)
+TEST_F(OsNodeWrites, OfOtherNumbersToRefreshRebuildNothing)
 {
     Recording const log;
     for (unsigned int const number : {1U, 2U, 9U}) {
@@ -202,7 +202,7 @@ TEST_F(OsNodeWrites, TakeATextThatIsNoNumberForZero)
     EXPECT_EQ(rebuilt(log), (Lines{"createUserNodes", "createGroupNodes"}));
 }
 
-TEST_F(OsNodeWrites, OfAMethodRunItRebuildUsersAndThenGroupsAndKeepTheText)
+TEST_F(OsNodeWrites, OfAMethodRebuildUsersAndThenGroups)
 {
     Recording const log;
     EXPECT_EQ(writeText(addition).getStatus(), 0);
@@ -220,7 +220,7 @@ TEST_F(OsNodeWrites, OfAMethodKeepTheValueAsItWasWritten)
     EXPECT_EQ(stored(74), "text " + addition + " false");
 }
 
-TEST_F(OsNodeWrites, OfAMethodThatFailsStoreAnEmptyTextAndReturnStatus1)
+TEST_F(OsNodeWrites, OfAMethodThatFailsReturnStatus1)
 {
     commands_.answers[useraddLine] = "useradd: user 'jdoe' already exists\nrc=9\n";
     node_.IC::MutableNode::setProperty(74, PropertyValue("before", false));

@@ -53,7 +53,7 @@ protected:
     Frame frame;
 };
 
-TEST_F(UserNodes, StandUnderTheOperatingSystemInTheOrderOfTheAccountFile)
+TEST_F(UserNodes, HaveTheOrderOfTheAccountFile)
 {
     frame.nextNodeId_ = 30;
     frame.createUserNodes(false);
@@ -235,7 +235,7 @@ TEST_F(UserNodes, ShowTheAccountsAsTheyAreAtTheRefresh)
     EXPECT_EQ(storedValue(*users()[1], 51), "number 2 true");
 }
 
-TEST_F(UserNodes, AreForgottenButNotDeletedWhenBuiltAgainWithoutARefresh)
+TEST_F(UserNodes, AreNotDeletedWhenBuiltWithoutARefresh)
 {
     frame.createUserNodes(false);
     frame.createUserNodes(false);
@@ -319,7 +319,7 @@ public:
     std::string throwAt;
 };
 
-TEST_F(UserNodes, AreMarkedAsTheBuildersWhileItStoresPropertiesAndOnlyThen)
+TEST_F(UserNodes, AreMarkedOnlyWhileTheirPropertiesAreStored)
 {
     files.write("/etc/passwd", account("root", 0));
     FlagAtMessages flag;
@@ -333,7 +333,7 @@ TEST_F(UserNodes, AreMarkedAsTheBuildersWhileItStoresPropertiesAndOnlyThen)
     EXPECT_FALSE(IC::OSSWMI::MI_call);
 }
 
-TEST_F(UserNodes, LeaveNeitherTheFlagNorTheLockBehindWhenAnExceptionPasses)
+TEST_F(UserNodes, ReleaseFlagAndLockWhenAnExceptionPasses)
 {
     FlagAtMessages flag;
     flag.throwAt = "getPwdMinDays: entry";
@@ -417,7 +417,7 @@ TEST_F(UserNodes, SpeakOfTheirBirthAndOfTheirDeath)
     EXPECT_EQ(log.texts(), Lines{"UserNode::~UserNode: entry"});
 }
 
-TEST_F(UserNodes, AreAnnouncedByTheDescriptionThatTheyHaveWhenTheyAreDeleted)
+TEST_F(UserNodes, AreAnnouncedByTheirDescriptionWhenDeleted)
 {
     frame.createUserNodes(false);
     users()[1]->setDescription("Renamed");

@@ -84,7 +84,7 @@ protected:
     Lines handedOver;
 };
 
-TEST_F(PasswordWrite, HandsNameAndEncryptedPasswordToChpasswdInAFile)
+TEST_F(PasswordWrite, PassesNameAndPasswordInAFile)
 {
     commands.answers[setPasswords] = "";
     write(117, IC::values::text("$6$salt$hash"));
@@ -160,7 +160,7 @@ TEST_F(PasswordWrite, PassesItsTextsThroughWideText)
     EXPECT_EQ(texts.narrowed, texts.widened);
 }
 
-TEST_F(UserWrite, OfAnInactiveTimeSetsTheDaysAfterThePasswordsExpiry)
+TEST_F(UserWrite, OfAnInactiveTimeCountsFromTheExpiry)
 {
     commands.answers = {{"chage -l anna", "Password expires : Jan 01, 2008\n"},
                         {"chage -I 10 anna", ""}};
@@ -169,7 +169,7 @@ TEST_F(UserWrite, OfAnInactiveTimeSetsTheDaysAfterThePasswordsExpiry)
     EXPECT_EQ(storedValue(anna(), 118), "text 2008-01-11 00:00:00 true");
 }
 
-TEST_F(UserWrite, OfAPasswordExpirationSetsTheDaysAfterTheLastChange)
+TEST_F(UserWrite, OfAPasswordExpirationCountsFromTheChange)
 {
     commands.answers = {{"chage -l anna", "Last password change : Jan 01, 2008\n"},
                         {"chage -M 10 anna", ""}};

@@ -272,7 +272,7 @@ TEST_P(Methods, LocalGroupAddAndDelMakeAndRemoveAGroupAndItsNode)
     EXPECT_EQ(host_.plugin().find(IC::nodeType::group, "crew"), nullptr);
 }
 
-TEST_P(Methods, LocalGroupAddUserAndDelUserChangeOneMembershipAndKeepTheOthers)
+TEST_P(Methods, ChangeOneMembershipAndKeepTheOthers)
 {
     ASSERT_TRUE(succeeds("/usr/sbin/groupadd crew"));
     std::string const rest =
@@ -396,7 +396,7 @@ TEST_F(UserAdd, OfAnAccountThatIsThereFailsAndKeepsIt)
     EXPECT_EQ(text(host.os(), IC::property::createUser), "");
 }
 
-TEST_F(UserAdd, WithAnExpiryThatChageCannotReadFailsAndLeavesTheAccount)
+TEST_F(UserAdd, KeepsTheAccountIfChageRefusesTheExpiry)
 {
     HostedMachine host("plain");
     EXPECT_EQ(
@@ -408,7 +408,7 @@ TEST_F(UserAdd, WithAnExpiryThatChageCannotReadFailsAndLeavesTheAccount)
     EXPECT_EQ(host.handed, Lines());
 }
 
-TEST_F(UserAdd, OnAMachineWithARedhatReleaseFileAsksForNoGroupOfTheUsersOwn)
+TEST_F(UserAdd, MakesNoGroupOfTheUsersOwnOnARedhatMachine)
 {
     HostedMachine host("redhat");
     std::filesystem::rename("/usr/sbin/useradd", "/usr/sbin/useradd.real");

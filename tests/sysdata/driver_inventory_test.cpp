@@ -126,7 +126,7 @@ TEST_F(DriverInventory, IsEmptiedWhenLsmodCannotBeStarted)
     EXPECT_EQ(commands.ran, Lines{"lsmod"});
 }
 
-TEST_F(DriverInventory, LeavesOutAModuleThatModinfoCannotBeStartedFor)
+TEST_F(DriverInventory, OmitsAModuleIfModinfoCannotBeStarted)
 {
     commands.answers = {{"lsmod", "a\nb\nc\n"}, {"modinfo a", ""}, {"modinfo c", ""}};
     Recording const recording;
@@ -163,7 +163,7 @@ TEST_F(DriverInventory, SkipsAModuleNamedLikeTheHeader)
     EXPECT_EQ(commands.ran, (Lines{"lsmod", "modinfo loop"}));
 }
 
-TEST_F(DriverInventory, ReportsFactsWithoutASpaceAndKeepsTheEarlierOnes)
+TEST_F(DriverInventory, ReportsFactsWithoutASpace)
 {
     commands.answers = {{"lsmod", "loop 1 0\n"},
                         {"modinfo loop", "version: 1\nversion:2\ndescription:disk\n"}};
@@ -221,7 +221,7 @@ TEST_F(DriverInventory, SpeaksUnderItsOwnNameUnitAndCategory)
     EXPECT_EQ(said, twice);
 }
 
-TEST_F(DriverInventory, TakesThePiecesOfALongModinfoLineForLinesOfTheirOwn)
+TEST_F(DriverInventory, ReadsALongModinfoLineAsSeveral)
 {
     std::string const first = "description: " + std::string(511 - 13, 'd');
     std::string const second = "version: 7";
@@ -234,7 +234,7 @@ TEST_F(DriverInventory, TakesThePiecesOfALongModinfoLineForLinesOfTheirOwn)
     EXPECT_TRUE(recording.has("buffer2 = version: 7\n", 3000));
 }
 
-TEST_F(DriverInventory, TakesALineOf510CharactersAndItsEndInOnePiece)
+TEST_F(DriverInventory, ReadsALineOf510CharactersWhole)
 {
     std::string const text(510 - 13, 'd');
     commands.answers = {{"lsmod", "loop 1 0\n"}, {"modinfo loop", "description: " + text + "\n"}};
@@ -242,7 +242,7 @@ TEST_F(DriverInventory, TakesALineOf510CharactersAndItsEndInOnePiece)
     EXPECT_EQ(remarks().size(), 2U);
 }
 
-TEST_F(DriverInventory, TakesThePiecesOfALongLsmodLineForLinesOfTheirOwn)
+TEST_F(DriverInventory, ReadsALongLsmodLineAsSeveral)
 {
     // 511 characters, of which the last are blanks; "tail" begins the second piece.
     std::string const line = "loop" + std::string(507, ' ') + "tail 1 0\n";
@@ -257,7 +257,7 @@ TEST_F(DriverInventory, RunsTheLongestCommandThatFitsItsBuffer)
     EXPECT_EQ(names(), Lines{module});
 }
 
-TEST_F(DriverInventory, RunsNothingForACommandThatDoesNotFitItsBuffer)
+TEST_F(DriverInventory, RunsNoCommandThatExceedsItsBuffer)
 {
     std::string const module(504, 'm');
     commands.answers = {{"lsmod", module + " 1\nloop\n"}, {"modinfo loop", ""}};

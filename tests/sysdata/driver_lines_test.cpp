@@ -139,7 +139,7 @@ TEST(DriverFacts, AreNotTakenFromKeysBehindABlank)
     EXPECT_EQ(facts.seen.descriptions, 0U);
 }
 
-TEST(DriverFacts, AreNotTakenFromKeysInOtherLettersOrWithoutTheirColon)
+TEST(DriverFacts, AreTakenFromExactKeysOnly)
 {
     Facts facts;
     EXPECT_TRUE(facts.take("Version: 1.0\n"));
@@ -164,7 +164,7 @@ TEST(DriverFacts, LetTheLastOccurrenceWin)
     EXPECT_EQ(facts.seen.descriptions, 2U);
 }
 
-TEST(DriverFacts, AreRefusedWithoutASpaceAndKeepWhatWasTakenBefore)
+TEST(DriverFacts, AreRefusedWithoutASpace)
 {
     Facts facts;
     facts.take("version: 1\n");

@@ -34,7 +34,7 @@ TEST(DriverRecord, StartsWithAllFieldsEmpty)
         EXPECT_EQ((driver.*field.get)(), "") << field.getter;
 }
 
-TEST(DriverRecord, ReturnsOneFromEverySetterAndKeepsTheFieldsApart)
+TEST(DriverRecord, ReturnsOneFromEverySetter)
 {
     driverInfo driver;
     for (Field const& field : fields)

@@ -107,7 +107,7 @@ protected:
     Lines opened_;
 };
 
-TEST_F(GroupListing, KeepsGidZeroBelowTheRangeAndLeavesSystemGroupsOut)
+TEST_F(GroupListing, KeepsGidZeroAndOmitsSystemGroups)
 {
     files_.write("/etc/group", "root:x:0:\ntty:x:5:\nteam:x:500:\n");
     EXPECT_EQ(listed(), (Lines{"root 0", "team 500"}));
@@ -150,7 +150,7 @@ TEST_F(GroupListing, ReadsTheAccountFileOnceForAllGroups)
     EXPECT_EQ(opened_, Lines{"/etc/passwd ro"});
 }
 
-TEST_F(GroupListing, GivesEachGroupTheMembersThatItWouldReadForItself)
+TEST_F(GroupListing, GivesEachGroupItsOwnMembers)
 {
     files_.write("/etc/passwd", "root:x:0:0:::\nanna:x:1000:500:::\nben:x:1001:501:::\n"
                                 "carl:x:1002:500:::\n");
@@ -173,7 +173,7 @@ TEST_F(GroupListing, GivesEachGroupTheMembersThatItWouldReadForItself)
     }
 }
 
-TEST_F(GroupListing, HoldsAMutexOfItsOwnWithoutTimeLimitWhileItUsesTheDatabase)
+TEST_F(GroupListing, HoldsItsOwnMutexWhileItUsesTheDatabase)
 {
     files_.write("/etc/group", "");
     MutexCalls mutexes;
@@ -209,7 +209,7 @@ TEST_F(GroupListing, UsesTheSameMutexEachTime)
     EXPECT_EQ(locked[0], locked[1]);
 }
 
-TEST_F(GroupListing, ClosesTheDatabaseAndUnlocksWhenAnExceptionPasses)
+TEST_F(GroupListing, ClosesAndUnlocksWhenAnExceptionPasses)
 {
     auto const next = libc::hooks().getgrent.answer();
     libc::hooks().getgrent = []() -> group* { throw std::bad_alloc(); };

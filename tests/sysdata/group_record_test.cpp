@@ -62,7 +62,7 @@ TEST(GroupRecord, IsCopiedMemberByMember)
     EXPECT_EQ(copy.getGroupId(), 5U);
 }
 
-TEST(GroupRecord, JoinsPrimaryMembersInFileOrderAndThenItsOwnWithoutRepeating)
+TEST(GroupRecord, JoinsPrimaryMembersAndThenItsOwn)
 {
     FakeFiles const files;
     files.write("/etc/passwd", account("root", 1000, 0) + account("anna", 1000, 500) +

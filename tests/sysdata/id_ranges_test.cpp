@@ -155,7 +155,7 @@ TEST(IdRanges, TakesTheLargestId)
     EXPECT_EQ(ids("UID_MAX 4294967295\n"), (Ids{0, 4294967295, 0, 0}));
 }
 
-TEST(IdRanges, LeavesEverythingAtZeroWithoutAMessageWhenThereIsNoFile)
+TEST(IdRanges, AreZeroWithoutAFile)
 {
     FakeFiles const files;
     Recording const log;
@@ -222,7 +222,7 @@ TEST(IdRanges, ReadsAFileOfAnyLengthToItsEnd)
             << length;
 }
 
-TEST(IdRanges, ReadsAValueAsAnUnsignedDecimalBehindBlanksOfAnyKind)
+TEST(IdRanges, ReadsAnUnsignedDecimalAfterAnyBlanks)
 {
     EXPECT_EQ(minUserId("UID_MIN 0100\n"), 100U);
     EXPECT_EQ(minUserId("UID_MIN 0x10\n"), 0U);

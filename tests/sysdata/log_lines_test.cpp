@@ -91,7 +91,7 @@ TEST(LogStamp, NeverOverflowsItsMonth)
     EXPECT_EQ(std::string(stamp.month), std::string(15, 'M'));
 }
 
-TEST(LogToday, IsTheWordBehindTheFirstSpaceAndTheNumberBehindTheLast)
+TEST(LogToday, IsTheSecondWordAndTheLastNumber)
 {
     Today today;
     ASSERT_TRUE(findToday("Sat Nov 21 03:15:30 UTC 2026\n", today));

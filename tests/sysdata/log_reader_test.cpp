@@ -302,7 +302,7 @@ TEST_F(LogReader, RefusesTheNextIndexAndLeavesTheTextAlone)
     EXPECT_EQ(recording.records()[recording.records().size() - 3].function, "getData");
 }
 
-TEST_F(LogReader, RefusesEveryIndexAboveOneOfALogThatCannotBeCounted)
+TEST_F(LogReader, RefusesIndexesAboveOneOfAnUncountableLog)
 {
     commands.answers[wc] = "";
     commands.answers[sed(0)] = "";

@@ -203,7 +203,7 @@ class Methods : public MethodTest
 {
 };
 
-TEST_F(Methods, AddUsersWithoutAGroupOfTheirOwnWhereThereIsARedhatReleaseFile)
+TEST_F(Methods, AddUsersWithoutAGroupOnARedhatMachine)
 {
     files_.write("/etc/redhat-release", "");
     std::string const line = "/usr/sbin/useradd -n jdoe 2>&1;echo rc=$? 2>&1";

@@ -88,7 +88,7 @@ TEST_F(Judging, TakesChageOnItsOwnForSuccessAfterUserSetAttrib)
     EXPECT_EQ(commands_.ran, Lines{line});
 }
 
-TEST_F(Judging, GoesOnToTheAgingOfANewUserWhereUseraddSaysThatItsCodeIs0)
+TEST_F(Judging, SetsTheAgeingOfANewUserIfUseraddSaysCode0)
 {
     EXPECT_EQ(statusOf("rc=0\n", ""), 0);
     EXPECT_EQ(commands_.ran, (Lines{useraddLine_, chageLine_}));
@@ -157,7 +157,7 @@ TEST_F(SettingAPassword, StopsWhereTheMainCommandFails)
     EXPECT_EQ(commands_.ran, Lines{usermodLine_});
 }
 
-TEST_F(SettingAPassword, GoesOnWhereTheMainCommandFoundNothingToChange)
+TEST_F(SettingAPassword, GoesOnIfThereWasNothingElseToChange)
 {
     commands_.answers[usermodLine_] = "usermod: no changes\n";
     EXPECT_EQ(setPassword(), 0);
@@ -180,7 +180,7 @@ TEST_F(SettingAPassword, IsDoneForAnyMethodThatBringsOne)
     EXPECT_EQ(commands_.ran, (Lines{"/usr/sbin/usermod -c J -p secret jdoe 2>&1", passwdLine_}));
 }
 
-TEST_F(SettingAPassword, NeverTouchesTheCallersOwnAccountForWantOfAUserName)
+TEST_F(SettingAPassword, RunsNothingWithoutAUserName)
 {
     Recording const log;
     EXPECT_EQ(execute("LocalGroupAdd", {text("GroupName", "g"), text("Password", "secret")}), 0);

@@ -43,7 +43,7 @@ private:
 std::string const identityOfJdoe =
     "uid=1001(jdoe) gid=1001(jdoe) groups=1001(jdoe),27(sudo),100(users)\n";
 
-TEST_F(GroupMemberChanges, AreAddedBehindThePrimaryAndTheQuotedPresentGroups)
+TEST_F(GroupMemberChanges, AreAddedAfterThePresentGroups)
 {
     identity(identityOfJdoe);
     EXPECT_EQ(add("staff"), 0);
@@ -57,7 +57,7 @@ TEST_F(GroupMemberChanges, AreRemovedByLeavingTheGroupOut)
     EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"users\""));
 }
 
-TEST_F(GroupMemberChanges, KeepThePrimaryGroupAloneWhereTheOnlyOtherOneGoes)
+TEST_F(GroupMemberChanges, KeepThePrimaryGroupAsTheOnlyOne)
 {
     identity("uid=1001(jdoe) gid=100(users) groups=27(sudo)\n");
     EXPECT_EQ(remove("sudo"), 0);
@@ -71,14 +71,14 @@ TEST_F(GroupMemberChanges, StayInGroupsWhoseNamesOnlyBeginAlike)
     EXPECT_EQ(commands_.ran, linesThatSet("users,\"users\",\"sudoers\",\"su\""));
 }
 
-TEST_F(GroupMemberChanges, KeepThePrimaryGroupEvenWhereThatIsTheOneToLeave)
+TEST_F(GroupMemberChanges, KeepThePrimaryGroupEvenIfItIsToLeave)
 {
     identity(identityOfJdoe);
     EXPECT_EQ(remove("jdoe"), 0);
     EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"sudo\",\"users\""));
 }
 
-TEST_F(GroupMemberChanges, LoseAPrimaryGroupThatComparesAsExactlyOneMore)
+TEST_F(GroupMemberChanges, LoseAPrimaryGroupThatComparesAsOneMore)
 {
     // The quoted group begins with a double quote, and "#" is the character after that.
     identity("uid=1001(jdoe) gid=1001(#jdoe) groups=27(sudo),100(users)\n");
@@ -102,7 +102,7 @@ TEST_F(GroupMemberChanges, KeepSuchAPrimaryGroupWhenAdded)
     EXPECT_EQ(commands_.ran, linesThatSet("#jdoe,\"sudo\",\"users\""));
 }
 
-TEST_F(GroupMemberChanges, AreReadBehindTheNextEqualsSignWhereIdSpeaksAnotherLanguage)
+TEST_F(GroupMemberChanges, AreReadAfterEqualsInOtherLanguages)
 {
     identity("uid=1001(jdoe) gid=100(users) Gruppen=100(users),27(sudo)\n");
     EXPECT_EQ(add("staff"), 0);
@@ -116,7 +116,7 @@ TEST_F(GroupMemberChanges, MayBeInNoGroupButThePrimaryOne)
     EXPECT_EQ(commands_.ran, linesThatSet("users,\"staff\""));
 }
 
-TEST_F(GroupMemberChanges, AreReadBehindTheWordGroupsWhereThereIsOne)
+TEST_F(GroupMemberChanges, AreReadAfterTheWordGroups)
 {
     identity("uid=1001(jdoe) gid=100(users) egid=5(tty) groups=27(sudo)\n");
     EXPECT_EQ(add("staff"), 0);
@@ -133,7 +133,7 @@ TEST_F(GroupMemberChanges, MayHaveAPrimaryGroupWithoutAName)
     EXPECT_EQ(commands_.ran, linesThatSet("\"users\""));
 }
 
-TEST_F(GroupMemberChanges, CannotBeRemovedFromTheirOnlyGroupWithAName)
+TEST_F(GroupMemberChanges, KeepAUserInItsOnlyNamedGroup)
 {
     // The empty list ends the arguments before the member, and usermod complains.
     identity("uid=1001(jdoe) gid=5000 groups=5000,27(sudo)\n");
@@ -186,7 +186,7 @@ TEST_F(GroupMemberChanges, FailWhereUsermodSaysAnything)
     EXPECT_EQ(add("staff"), 1);
 }
 
-TEST_F(GroupMemberChanges, SucceedWhereItOnlySaysThatTheGroupIsThePrimaryOne)
+TEST_F(GroupMemberChanges, SucceedForThePrimaryGroup)
 {
     identity(identityOfJdoe);
     commands_.answers[linesThatSet("jdoe,\"sudo\",\"users\"").at(1)] =

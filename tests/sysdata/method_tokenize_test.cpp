@@ -61,7 +61,7 @@ TEST(Tokenize, LogsEachTokenBetweenEntryAndExit)
                                   "str.substr(lastPos, pos - lastPos) = two", "Tokenize: exit"}));
 }
 
-TEST(Tokenize, LogsThroughBothOperationsAtLevel3000OnTheCommandRunnersLogger)
+TEST(Tokenize, LogsAtLevel3000AsTheCommandRunner)
 {
     Recording const log;
     tokens("one", ",");

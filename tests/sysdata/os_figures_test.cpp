@@ -142,7 +142,7 @@ TEST_P(OsInfoRam, DropsWhatTheUnitHasOverWholeKibibytes)
     EXPECT_EQ(of(100, 2048), 200U);
 }
 
-TEST_P(OsInfoRam, LeavesTheCallersValueWhenTheUnitIsZeroOrBetween2And1023)
+TEST_P(OsInfoRam, IsUnknownForAUnitOfZeroOrBetween2And1023)
 {
     for (unsigned int const memoryUnit : {0U, 2U, 512U, 1023U})
         EXPECT_EQ(of(123456, memoryUnit), untouched) << memoryUnit;
@@ -225,7 +225,7 @@ TEST_P(OsInfoFigure, IsWhatTheKernelReportsWhateverTheMemoryUnit)
     EXPECT_EQ(kernel_.calls, 5);
 }
 
-TEST_P(OsInfoFigure, IsZeroWithoutAMessageWhenTheKernelDoesNotAnswer)
+TEST_P(OsInfoFigure, IsZeroWithoutAnAnswerOfTheKernel)
 {
     kernel_.fails = true;
     Recording const log;
@@ -243,7 +243,7 @@ TEST(OsInfoLastBootTime, IsTheClockLessTheUptime)
     EXPECT_EQ(out, 1273658825);
 }
 
-TEST(OsInfoLastBootTime, FailsAndLeavesTheCallersValueWhenTheKernelDoesNotAnswer)
+TEST(OsInfoLastBootTime, FailsWithoutAnAnswerOfTheKernel)
 {
     Kernel kernel;
     kernel.fails = true;

@@ -60,7 +60,7 @@ TEST(LanguageEdition, IsEmptyWithoutALocale)
     EXPECT_EQ(languageEdition("", ""), "");
 }
 
-TEST(LanguageEdition, FallsBackToTheCharacterTypeWhenTheLanguageIsEmpty)
+TEST(LanguageEdition, FallsBackToTheCharacterType)
 {
     EXPECT_EQ(languageEdition(nullptr, "fr_FR.ISO-8859-1"), "fr-FR");
     EXPECT_EQ(languageEdition("", "fr_FR.ISO-8859-1"), "fr-FR");

@@ -93,7 +93,7 @@ INSTANTIATE_TEST_SUITE_P(
                     LogCase{"statusReset", [] { OsInfo().statusReset(); }}),
     [](auto const& test) { return std::string(test.param.function); });
 
-TEST_P(OsInfoLog, BeginsWithTheEntryAndEndsWithTheExitUnderTheFunctionsName)
+TEST_P(OsInfoLog, BeginsWithAnEntryAndEndsWithAnExitLine)
 {
     Recording const log;
     GetParam().call();

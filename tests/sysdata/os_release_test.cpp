@@ -235,7 +235,7 @@ TEST_F(OSVersion, IsTheKernelsReleaseOnUnitedLinux)
     EXPECT_TRUE(commands_.ran.empty());
 }
 
-TEST_F(OSVersion, ClosesTheUnitedLinuxFileWhetherTheKernelAnswersOrNot)
+TEST_F(OSVersion, ClosesTheUnitedLinuxFileInAnyCase)
 {
     files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
     for (bool const fails : {false, true}) {

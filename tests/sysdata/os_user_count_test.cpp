@@ -103,7 +103,7 @@ TEST_F(UserCount, OpensTheAccountFileInItsOwnMode)
     EXPECT_EQ(opened, std::vector<std::string>{"/etc/passwd|ro"});
 }
 
-TEST_F(UserCount, HoldsTheLockForTheWholeScanAndLeavesTheDatabaseOpen)
+TEST_F(UserCount, HoldsTheLockForTheWholeScan)
 {
     countOf(account("root", 0) + account("jdoe", 1000));
     EXPECT_EQ(steps_,

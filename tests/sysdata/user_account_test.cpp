@@ -48,7 +48,7 @@ TEST_F(UserDeletion, RunsUserdelWithTheNameAndReturnsOne)
     EXPECT_EQ(log_.texts(), (Lines{"setDelete: entry", "setDelete: exit"}));
 }
 
-TEST_F(UserDeletion, ReturnsOneAndLogsTheCommandWhenItCannotBeStarted)
+TEST_F(UserDeletion, ReturnsOneIfTheCommandCannotBeStarted)
 {
     EXPECT_EQ(userInfo().setDelete("jdoe"), 1);
     EXPECT_EQ(errors(), Lines{"Cannot open process: command = userdel -r jdoe"});
@@ -207,14 +207,14 @@ TEST_P(AgeingOperation, ReadsTwoDigitsOfMonthAndDay)
     EXPECT_EQ(commands_.ran.back(), ageLine("99999"));
 }
 
-TEST_P(AgeingOperation, RunsNothingWhereTheListingDoesNotFitItsBufferOf1024Bytes)
+TEST_P(AgeingOperation, RunsNothingIfTheListingExceeds1024Bytes)
 {
     EXPECT_FALSE(set("2008-01-11 00:00:00", std::string(1024 - 9, 'x')));
     EXPECT_EQ(commands_.ran, Lines{});
     EXPECT_EQ(errors(), Lines{"Command does not fit: chage -l"});
 }
 
-TEST_P(AgeingOperation, ChangesNothingWhereTheChangeDoesNotFitItsBufferOf1024Bytes)
+TEST_P(AgeingOperation, ChangesNothingIfTheChangeExceeds1024Bytes)
 {
     std::string const user(1023 - 9, 'x');
     answerListing("Jan 01, 2008", user);
@@ -268,7 +268,7 @@ Outcome runTool(std::vector<char const*> args, std::string command = "/usr/bin/t
 
 using CommandRunner = AccountOperation;
 
-TEST_F(CommandRunner, AppendsTheArgumentsBehindTheProgramAndMergesStandardErrorIn)
+TEST_F(CommandRunner, AppendsArgumentsAndMergesStandardError)
 {
     commands_.answers["/usr/bin/tool -a b c 2>&1"] = "said\n";
     Outcome const outcome = runTool({"ignored", "-a", "b c"});
@@ -465,7 +465,7 @@ TEST_P(AgeingOperation, SucceedsHoweverChageEnds)
     EXPECT_TRUE(set("2008-01-11 00:00:00"));
 }
 
-TEST_F(AccountLock, SpeaksLikeEveryOperationAtLevel3000UnderTheUnitsName)
+TEST_F(AccountLock, LogsAtLevel3000UnderTheUnitsName)
 {
     commands_.otherwise = "";
     char command[] = "chage -l jdoe";

@@ -83,7 +83,7 @@ TEST_F(LabelledDays, Are99999WhereTheDateLiesAfterTheReference)
     EXPECT_EQ(errors(), Lines{"new_day < last_day"});
 }
 
-TEST_F(LabelledDays, Are99999WhereTheDateIsOneSecondAfterTheReference)
+TEST_F(LabelledDays, Are99999OneSecondAfterTheReference)
 {
     EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 - 1), 99999);
     EXPECT_EQ(errors(), Lines{"new_day < last_day"});
@@ -142,7 +142,7 @@ TEST_F(LabelledDays, TakeTheWordNeverForAnInvalidDate)
                                "Invalid YY: YY = 0"}));
 }
 
-TEST_F(LabelledDays, KeepDayAndYearOfAnEarlierLineWhereAnInvalidOneFollows)
+TEST_F(LabelledDays, KeepDayAndYearWhenAnInvalidLineFollows)
 {
     // The month is then none of the twelve, which counts as January.
     EXPECT_EQ(

@@ -89,7 +89,7 @@ protected:
     int openAtRelease_ = 0;
 };
 
-TEST_F(UserListing, KeepsUidZeroBelowTheRangeAndLeavesSystemAccountsOut)
+TEST_F(UserListing, KeepsUidZeroAndOmitsSystemAccounts)
 {
     files_.write("/etc/passwd", account("root", 0) + account("daemon", 2) + account("jdoe", 1000));
     EXPECT_EQ(names(), (Lines{"root", "jdoe"}));
@@ -122,7 +122,7 @@ TEST_F(UserListing, ReplacesWhatTheListHeldBefore)
     EXPECT_EQ(users.front().getUserName(), "jdoe");
 }
 
-TEST_F(UserListing, EmptiesTheListAndTakesNoLockWithoutAnAccountFile)
+TEST_F(UserListing, EmptiesTheListWithoutAnAccountFile)
 {
     std::vector<userInfo> users(3, userInfo("old"));
     NQ::getUserInfo(users);
@@ -130,7 +130,7 @@ TEST_F(UserListing, EmptiesTheListAndTakesNoLockWithoutAnAccountFile)
     EXPECT_EQ(steps_, Lines{});
 }
 
-TEST_F(UserListing, OpensBothFilesThenLocksAndReadsTheLoginRulesAnewForEachKeptUser)
+TEST_F(UserListing, ReadsTheLoginRulesForEachKeptUser)
 {
     files_.write("/etc/passwd", account("root", 0) + account("daemon", 2) + account("jdoe", 1000));
     files_.write("/etc/shadow", "");
@@ -158,7 +158,7 @@ TEST_F(UserListing, GoesOnWithoutTheLock)
     EXPECT_EQ(steps_.back(), "unlock");
 }
 
-TEST_F(UserListing, ReleasesTheLockAndClosesTheFilesWhenAnExceptionPasses)
+TEST_F(UserListing, ReleasesLockAndFilesWhenAnExceptionPasses)
 {
     files_.write("/etc/passwd", account("root", 0) + account("jdoe", 1000));
     files_.write("/etc/shadow", "");
@@ -221,7 +221,7 @@ TEST_F(UserListing, ReadsShadowLinesIntoABufferOf4096Bytes)
     EXPECT_EQ(passwordsOf(list()), (Lines{"", ""}));
 }
 
-TEST_F(UserListing, LooksForShadowEntriesFromWhereTheLastSearchStopped)
+TEST_F(UserListing, SearchesTheShadowFileFromTheLastEntryOn)
 {
     files_.write("/etc/passwd",
                  account("a", 1000) + account("b", 1001) + account("c", 1002) + account("d", 1003));
@@ -245,7 +245,7 @@ TEST_F(UserListing, TakesNoShadowFactsForAnyUserAfterAMissingOne)
     EXPECT_EQ(users[2].getLstPwdChg(), 0U);
 }
 
-TEST_F(UserListing, DoesNotSearchTheShadowFileForAccountsThatItLeavesOut)
+TEST_F(UserListing, LooksUpNoShadowEntryOfOmittedAccounts)
 {
     files_.write("/etc/passwd", account("daemon", 2) + account("a", 1000));
     files_.write("/etc/shadow", shadow("a", "A") + shadow("daemon", "*"));
@@ -269,7 +269,7 @@ TEST_F(UserListing, TakesEachShadowFieldForItsOwnFact)
     EXPECT_EQ(user.getPasswordHistoryDepth(), 0);
 }
 
-TEST_F(UserListing, HasEmptyTextsForAnEntryThatStandsForARemoteDatabase)
+TEST_F(UserListing, HasEmptyTextsForARemoteDatabase)
 {
     files_.write("/etc/passwd", account("root", 0) + "+\n");
     std::vector<userInfo> users = list();
@@ -430,7 +430,7 @@ TEST_F(UserListing, HandsTheShadowReaderABufferOf4096Bytes)
     EXPECT_EQ(sizes, std::vector<std::size_t>{4096});
 }
 
-TEST_F(UserListing, TakesNoShadowEntryWhoseNameOnlyBeginsWithTheAccounts)
+TEST_F(UserListing, ComparesWholeNamesWithTheShadowFile)
 {
     files_.write("/etc/passwd", account("ann", 1000));
     files_.write("/etc/shadow", shadow("anna", "X") + shadow("an", "Y") + shadow("ann", "A"));

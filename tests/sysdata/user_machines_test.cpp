@@ -102,7 +102,7 @@ TEST(UserMachine, WestOfGreenwichHasItsDatesAtLocalMidnight)
               "root $6$root$hash 1199163600 0 99999 7 99999 " + inactive);
 }
 
-TEST(UserMachine, WithShadowInAnotherOrderLosesTheFactsOfAllUsersAfterTheFirstMissingOne)
+TEST(UserMachine, LosesShadowFactsAfterAnEntryOutOfOrder)
 {
     EXPECT_EQ(ageingOn("users-shadow-order"),
               (Lines{"root $6$root$hash 1199145600 0 99999 7 99999 2147472000",
@@ -110,7 +110,7 @@ TEST(UserMachine, WithShadowInAnotherOrderLosesTheFactsOfAllUsersAfterTheFirstMi
                      "carl  0 0 0 0 0 0"}));
 }
 
-TEST(UserMachine, WithoutAReadableShadowFileListsUsersWithoutShadowFacts)
+TEST(UserMachine, ListsUsersWithoutAReadableShadowFile)
 {
     EXPECT_EQ(ageingOn("users-without-shadow"), (Lines{"root  0 0 0 0 0 0", "anna  0 0 0 0 0 0"}));
 }
@@ -140,7 +140,7 @@ TEST(UserMachine, EndsItsListAtALineThatDoesNotFitTheBuffer)
     EXPECT_EQ(namesOn("users-long-line"), Lines{"root"});
 }
 
-TEST(UserMachine, LeavesOutTheMalformedLinesThatTheLibraryPassesOver)
+TEST(UserMachine, OmitsMalformedLines)
 {
     EXPECT_EQ(namesOn("users-malformed-line"), (Lines{"root", "ben"}));
 }
@@ -180,7 +180,7 @@ TEST(UserMachine, WithADenyInACommentTakesThatToo)
     EXPECT_EQ(loginFailuresOn("users-deny-commented"), (std::vector<long>{8, 8}));
 }
 
-TEST(UserMachine, WithADenyThatIsNoNumberKeepsTheOneBeforeAndLogsTheLineForEveryUser)
+TEST(UserMachine, KeepsTheLastDenyThatIsANumber)
 {
     Recording const log;
     EXPECT_EQ(loginFailuresOn("users-deny-unparsable"), (std::vector<long>{4, 4}));

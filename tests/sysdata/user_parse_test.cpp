@@ -141,7 +141,7 @@ TEST(LabelledDate, IsInvalidWhereTheLabelIsNotTheLinesStart)
     EXPECT_EQ(date.year, 2008);
 }
 
-TEST(LabelledDate, TakesNeverAsTheMonthOfAnInvalidDateAndKeepsDayAndYear)
+TEST(LabelledDate, TakesNeverAsTheMonthOfAnInvalidDate)
 {
     LabelledDate date{"Feb", 3, 2008};
     EXPECT_EQ(scanLabelledDate("Password expires : never\n", label, date), Scan::invalid);

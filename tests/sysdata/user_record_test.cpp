@@ -176,7 +176,7 @@ TEST(UserInactiveTime, Is19January2038WhereTheFieldIsEmptyOr99999)
     }
 }
 
-TEST(UserInactiveTime, IsCountedFromTheLocalMidnightOf1January1970)
+TEST(UserInactiveTime, CountsFromLocalMidnightOf1January1970)
 {
     useZone("UTC0");
     EXPECT_EQ(inactiveTime(0), 0U);

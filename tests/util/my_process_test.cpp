@@ -82,7 +82,7 @@ TEST(MyProcess, ClosesNothingWhenNeverStarted)
     EXPECT_TRUE(pipes.closed.empty());
 }
 
-TEST(MyProcess, YieldsNullAndClosesNothingWhenTheCommandCannotBeStarted)
+TEST(MyProcess, YieldsNullWhenTheCommandCannotBeStarted)
 {
     Pipes pipes;
     pipes.refuse = true;

@@ -116,7 +116,7 @@ TEST_F(FixedNodes, TheIdListHoldsTheInterfacesOwnIdTwice)
     EXPECT_EQ(firstIds(4), (Ids{5, 6, 5, 7}));
 }
 
-TEST_F(FixedNodes, TheIdListGoesOnWithTheOperatingSystemAndAllThatFollows)
+TEST_F(FixedNodes, AreFollowedByAllOthersInTheIdList)
 {
     commands.answers = {{"lsmod", "exnet 24576 0\nexfs 114688 2\n"},
                         {"modinfo exnet", ""},
@@ -160,7 +160,7 @@ TEST_F(FixedNodes, TheInterfacesNodeLeavesTheCounterAlone)
     EXPECT_EQ(counter, 6U);
 }
 
-TEST_F(FixedNodes, StandInTheMembersOfTheirKindAndInTheListFromTheStart)
+TEST_F(FixedNodes, AreInTheirMembersAndTheListFromTheStart)
 {
     plugin.initialize();
     auto const nodes = plugin.nodes();
@@ -171,7 +171,7 @@ TEST_F(FixedNodes, StandInTheMembersOfTheirKindAndInTheListFromTheStart)
     EXPECT_EQ(inside(&OpenInterface::osNode_), nodes[3]);
 }
 
-TEST_F(FixedNodes, LikeAllNodesAreCurrentAndListedBeforeTheirStatusIsSet)
+TEST_F(FixedNodes, AreListedBeforeTheirStatusIsSet)
 {
     commands.answers = {{"lsmod", "exnet 24576 0\n"},
                         {"modinfo exnet", ""},
@@ -208,7 +208,7 @@ TEST_F(FixedNodes, AreParentsByTheIdThatTheyAnswerWith)
     EXPECT_EQ(plugin.node(IC::nodeType::operatingSystem).getLinkedId(), 7U);
 }
 
-TEST_F(FixedNodes, CarryTheInterfaceIdsOfTheMomentAtWhichTheyWereMade)
+TEST_F(FixedNodes, KeepTheInterfaceIdsTheyWereMadeWith)
 {
     host.miIds = {5, 9};
     commands.answers = {{"lsmod", "exnet 24576 0\n"},
@@ -232,7 +232,7 @@ TEST_F(FixedNodes, ALaterInterfaceIdShowsInTheNodesMadeAfterIt)
     EXPECT_EQ(plugin.node(IC::nodeType::computer).getMIIds(), (Ids{5, 9}));
 }
 
-TEST_F(FixedNodes, StandInTheMemberOfTheirKindBeforeTheirStatusIsSet)
+TEST_F(FixedNodes, AreInTheirMemberBeforeTheirStatusIsSet)
 {
     Ids seen;
     host.onSetStatus = [this, &seen](IC::MutableNode& node) {
@@ -272,7 +272,7 @@ TEST_F(FixedNodes, TakeTheCountersValueOfTheMoment)
     EXPECT_EQ(firstIds(4), (Ids{5, 40, 5, 41}));
 }
 
-TEST_F(FixedNodes, TheOperatingSystemIsSetUpBeforeItsPropertiesAreSet)
+TEST_F(FixedNodes, AreSetUpBeforeTheirPropertiesAreSet)
 {
     plugin.initialize(5);
     Lines const events = eventsOf("createOsNodes");

@@ -121,7 +121,7 @@ protected:
     }
 };
 
-TEST_F(Lifecycle, StartsWithEmptyListsNoInterfaceInUseAndTheFlagDown)
+TEST_F(Lifecycle, StartsWithEmptyListsAndTheFlagDown)
 {
     EXPECT_TRUE(inside(&OpenInterface::userNodes_).empty());
     EXPECT_TRUE(inside(&OpenInterface::groupNodes_).empty());
@@ -165,7 +165,7 @@ TEST_F(Lifecycle, OpenMIAsksNothingOfTheHostAndSaysNothing)
     EXPECT_EQ(host.events, Lines());
 }
 
-TEST_F(Lifecycle, SetLoadCallBackStoresItsThreeArgumentsAndCallsNothing)
+TEST_F(Lifecycle, SetLoadCallBackStoresItsArguments)
 {
     IC::ManagementInterface::LoadCallBack const load = [](IC::Node* const&,
                                                           void const*) -> IC::Error { throw 1; };
@@ -191,7 +191,7 @@ TEST_F(Lifecycle, InitializePassesItsThreeArgumentsOnUnchanged)
     mi().unload();
 }
 
-TEST_F(Lifecycle, InitializeHasItsInterfaceAndListReadyWhenTheFrameworkInitialises)
+TEST_F(Lifecycle, InitializeIsReadyBeforeTheFramework)
 {
     bool isReady = false;
     host.onInitialize = [this, &isReady] {
@@ -234,7 +234,7 @@ TEST_F(Lifecycle, InitializeAnswersWithTheFrameworksSuccess)
     EXPECT_EQ(plugin.status().getStatus(), 0);
 }
 
-TEST_F(Lifecycle, AFailingFrameworkIsWhatTheHostHearsOfAndTheTreeStandsAllTheSame)
+TEST_F(Lifecycle, BuildsTheTreeIfTheFrameworkFails)
 {
     plugin.initialize();
     Ids const whole = nodeTypes();
@@ -276,7 +276,7 @@ TEST_F(Lifecycle, TheTreeStandsWhateverTheSettersAnswer)
     libc::hooks().sysinfo = nullptr;
 }
 
-TEST_F(Lifecycle, PassesOnThatMemoryIsExhaustedWhateverNodeWasToBeBuilt)
+TEST_F(Lifecycle, PassesOnThatMemoryIsExhausted)
 {
     commands.answers = {{"lsmod", "exnet 24576 0\n"},
                         {"modinfo exnet", ""},
@@ -350,7 +350,7 @@ TEST_F(Publishing, HandsTheNodeToTheFramework)
                                   "log: publishNode: exit"}));
 }
 
-TEST_F(Publishing, LogsARefusalOnceAsAnErrorAndLeavesTheNodeWhereItIs)
+TEST_F(Publishing, LogsARefusalAndKeepsTheNode)
 {
     host.addNewNodeStatus = 1;
     std::size_t const nodes = plugin.nodes().size();
@@ -405,7 +405,7 @@ class LockedBuild : public Loaded, public testing::WithParamInterface<char const
 {
 };
 
-TEST_P(LockedBuild, HoldsTheLockFromItsBeginningToItsEndWaitingWithoutLimit)
+TEST_P(LockedBuild, HoldsTheLockFromBeginningToEnd)
 {
     plugin.initialize();
     std::string const builder = GetParam();
@@ -428,7 +428,7 @@ INSTANTIATE_TEST_SUITE_P(
                             IC::nodeType::logEntry}),
     [](auto const& rebuild) { return std::string(rebuild.param.name); });
 
-TEST_F(Lifecycle, UnloadLetsTheFrameworkGoFirstAndThenFreesTheIdList)
+TEST_F(Lifecycle, UnloadFreesTheIdListLast)
 {
     plugin.initialize();
     host.events.clear();
@@ -470,7 +470,7 @@ TEST_F(Lifecycle, CanBeginAgainAfterUnload)
     EXPECT_EQ(Ids(list.begin(), list.begin() + 4), (Ids{5, 6, 5, 7}));
 }
 
-TEST_F(Lifecycle, EachMessageGoesToBothOfTheLoggersOperationsWithTheSameArguments)
+TEST_F(Lifecycle, EachMessageGoesToBothLoggerOperations)
 {
     plugin.initialize();
     plugin.unload();
@@ -548,7 +548,7 @@ TEST_F(Library, ReadsTheIdRangesAgainWhenItIsLoadedAgain)
     EXPECT_EQ(lowest, (Ids{500, 1000}));
 }
 
-TEST_F(Lifecycle, TheFlagIsUpWhileAUserNodeIsSetUpAndDownWhileAnyNodeIsMade)
+TEST_F(Lifecycle, RaisesTheFlagOnlyWhileAUserNodeIsSetUp)
 {
     bool const& flag = object<bool>("IC::OSSWMI::MI_call");
     host.onNode = [&flag] { EXPECT_FALSE(flag); };
@@ -581,7 +581,7 @@ TEST_F(Lifecycle, ARebuildHoldsTheLockFromItsBeginningToItsEnd)
     }
 }
 
-TEST_F(Lifecycle, HasTheCategoryOfEveryUnitBeforeAnythingIsAskedOfIt)
+TEST_F(Lifecycle, HasTheCategoryOfEveryUnitFromTheStart)
 {
     std::pair<char const*, char const*> const units[] = {
         {"IC::OSSWMI::loggerOsSwMI", ""},      {"NQ::loggerMyProcess", ".MyProcess"},
@@ -640,7 +640,7 @@ TEST_F(Lifecycle, OpensNoFileButThoseOfTheSystemThatItIsToRead)
         EXPECT_EQ(known.count(path), 1U) << path;
 }
 
-TEST_F(Lifecycle, InitializeKeepsTheFrameworksAnswerFirstAndReturnsWhatIsKeptAtTheEnd)
+TEST_F(Lifecycle, InitializeReturnsTheFrameworksAnswerAsKept)
 {
     host.initializeStatus = 3;
     Ids kept;

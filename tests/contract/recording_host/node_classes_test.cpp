@@ -167,7 +167,7 @@ protected:
     std::unique_ptr<IC::MutableNode> const os{construct("OsNode")};
 };
 
-TEST_F(CommandWrites, ThatFailMakeAStatusOfTheirOwnWhateverTheStoreAnswers)
+TEST_F(CommandWrites, ThatFailHaveTheirOwnStatus)
 {
     host.setterStatus = 7;
     host.errors.clear();
@@ -175,7 +175,7 @@ TEST_F(CommandWrites, ThatFailMakeAStatusOfTheirOwnWhateverTheStoreAnswers)
     EXPECT_EQ(host.errors, (Lines{"Error(7, empty 0, \"\")", failure}));
 }
 
-TEST_F(CommandWrites, AnswerWhatTheStoreAnswersWhetherTheActionWorkedOrNot)
+TEST_F(CommandWrites, AnswerAsTheStoreIfTheActionFails)
 {
     host.setterStatus = 7;
     for (unsigned int const id : {123U, 191U})
@@ -210,7 +210,7 @@ class UserCommandWrites : public Loaded
 {
 };
 
-TEST_F(UserCommandWrites, AnswerWhatTheStoreAnswersWhateverBecomesOfTheAction)
+TEST_F(UserCommandWrites, AnswerAsTheStoreIfTheActionFails)
 {
     std::filesystem::current_path("/proc"); // no "usrandpwd" can be made there
     std::unique_ptr<IC::MutableNode> const user(construct("UserNode"));
@@ -249,7 +249,7 @@ TEST_F(LogEntryReads, ThatSucceedMakeOneEmptySuccessAndTakeNoLock)
     }
 }
 
-TEST_F(CommandWrites, AnswerWhatTheStoreAnswersWhateverBecameOfTheRebuild)
+TEST_F(CommandWrites, AnswerAsTheStoreIfTheRebuildFails)
 {
     commands.otherwise = "";
     plugin.initialize();

@@ -104,7 +104,7 @@ TEST_F(Slots, OfAnInterfaceStandInOrder)
     EXPECT_EQ(slotsOf(&interface), interfaceSlots);
 }
 
-TEST_F(Slots, OfThePluginsInterfaceDifferByInitializeUnloadAndTheDestructor)
+TEST_F(Slots, DifferByInitializeUnloadAndTheDestructor)
 {
     EXPECT_EQ(slotsOf(&plugin.interface()), overridden(interfaceSlots, "ManagementInterface",
                                                        "OsSwMI", {"initialize", "unload"}));

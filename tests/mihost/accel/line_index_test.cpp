@@ -86,7 +86,7 @@ TEST_F(AccelLineIndex, ReadsOnlyTheEdgesOfAFileThatIsUnchanged)
     EXPECT_EQ(bytesToUpdate(), 2 * edge);
 }
 
-TEST_F(AccelLineIndex, ReadsOnlyEdgesAndWhatIsNewOfAFileThatHasGrown)
+TEST_F(AccelLineIndex, ReadsOnlyEdgesAndTheNewPartOfAGrownFile)
 {
     write(std::string(4'000'000, '\n'));
     ASSERT_TRUE(update());
@@ -107,7 +107,7 @@ TEST_F(AccelLineIndex, ReadsOneBlockToFindALine)
     }
 }
 
-TEST_F(AccelLineIndex, NoticesAnotherBeginningOrEndOfAFileThatHasGrown)
+TEST_F(AccelLineIndex, NoticesOtherEdgesOfAGrownFile)
 {
     std::string const text(100'000, 'a');
     for (std::size_t const changed :
@@ -121,7 +121,7 @@ TEST_F(AccelLineIndex, NoticesAnotherBeginningOrEndOfAFileThatHasGrown)
     }
 }
 
-TEST_F(AccelLineIndex, NoticesWritesAtItsEdgesThatLeaveTheTimesAlone)
+TEST_F(AccelLineIndex, NoticesWritesAtItsEdgesDespiteOldTimes)
 {
     std::string text(100'000, 'a');
     write(text);
@@ -186,7 +186,7 @@ TEST_F(AccelLineIndex, FailsWhenTheFileEndsBeforeItsSize)
     expectIndexOf("1\n2\n");
 }
 
-TEST_F(AccelLineIndex, FindsNothingOnceTheFileIsNoLongerTheIndexedOne)
+TEST_F(AccelLineIndex, FindsNothingInAnotherFile)
 {
     write("1\n2\n3\n");
     ASSERT_TRUE(update());

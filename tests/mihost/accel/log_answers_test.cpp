@@ -153,7 +153,7 @@ TEST_F(AccelLog, IsLeftToTheCommandsUnlessItIsARegularFileOfADisk)
     }
 }
 
-TEST_F(AccelLog, IsLeftToTheCommandsOnFileSystemsThatMayLieAboutTimes)
+TEST_F(AccelLog, DeclinesFileSystemsWithUnreliableTimes)
 {
     folder_.write("log", "1\n");
     ASSERT_TRUE(answered(wc_));

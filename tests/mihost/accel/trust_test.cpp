@@ -52,7 +52,7 @@ TEST_F(AccelTrust, StaysWhenPathFindsTheToolElsewhereLater)
     EXPECT_EQ(answered(wc_), real(wc_));
 }
 
-TEST_F(AccelTrust, EndsForACopyALinkOrAFolderOfTheToolsNameElsewhere)
+TEST_F(AccelTrust, EndsForTheToolsNameElsewhere)
 {
     std::filesystem::create_directory(folder_.path("bin"));
     std::string const wc = folder_.path("bin/wc");

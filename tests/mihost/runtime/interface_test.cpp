@@ -278,7 +278,7 @@ TEST_F(RuntimeInterface, DeletesNodesInAnyOrder)
     }
 }
 
-TEST_F(RuntimeInterface, KeepsTheOrderOfTheOthersWhenManyGoBeforeTheNextLook)
+TEST_F(RuntimeInterface, KeepsTheOrderWhenManyNodesGoAtOnce)
 {
     std::mt19937 random(18);
     for (int round = 0; round < 50; ++round) {
@@ -307,7 +307,7 @@ TEST_F(RuntimeInterface, KeepsTheOrderOfTheOthersWhenManyGoBeforeTheNextLook)
     }
 }
 
-TEST_F(RuntimeInterface, KeepsTheOrderWhileAdditionsAndDeletionsAlternate)
+TEST_F(RuntimeInterface, KeepsTheOrderThroughAdditionsAndDeletions)
 {
     std::mt19937 random(19);
     std::vector<std::pair<unsigned int, Node*>> left;
@@ -346,7 +346,7 @@ TEST_F(RuntimeInterface, ListsNewNodesAfterItWasUnloaded)
     EXPECT_EQ(listed(), Ids{4});
 }
 
-TEST_F(RuntimeInterface, FindsAndUnloadsWhatIsLeftBehindDeletedNodes)
+TEST_F(RuntimeInterface, FindsAndUnloadsNodesAfterDeletedOnes)
 {
     Node* const first = add(1);
     Node* const wanted = add(2);
@@ -402,7 +402,7 @@ TEST_F(RuntimeInterface, TakesAndDropsAListenerForAlerts)
     EXPECT_EQ(interface_.deRegisterForAlerts().getStatus(), 0U);
 }
 
-TEST_F(RuntimeInterface, LetsThreadsRebuildNodesOfDifferentKindsAtOnce)
+TEST_F(RuntimeInterface, LetsThreadsRebuildDifferentKindsAtOnce)
 {
     auto const rebuild = [this](unsigned int first) {
         Events own;

@@ -65,7 +65,7 @@ TEST_F(NodeStore, TakesAPathAndAParent)
     EXPECT_EQ(node_.setParent("os").getStatus(), 0U);
 }
 
-TEST_F(NodeStore, FailsWithStatus1AndLeavesTheCallersValueWhenAPropertyIsNotSet)
+TEST_F(NodeStore, FailsWithStatus1ForAnUnsetProperty)
 {
     PropertyValue value("before", false);
     Error const error = node_.getProperty(108, value);

@@ -46,7 +46,7 @@ TEST(ValidUtf8, LeavesControlCharactersAlone)
     EXPECT_EQ(validUtf8("a\n\x1b"), "a\n\x1b");
 }
 
-TEST(ValidUtf8, TakesNoOverlongFormsNoSurrogatesAndNothingBeyondTheLastCharacter)
+TEST(ValidUtf8, RefusesOverlongFormsSurrogatesAndBeyond)
 {
     EXPECT_EQ(validUtf8("\xC0\xAF"), "\\xc0\\xaf");
     EXPECT_EQ(validUtf8("\xE0\x80\xAF"), "\\xe0\\x80\\xaf");

@@ -47,7 +47,7 @@ TEST(MountTable, LeavesOutTheKernelsOwnFileSystemsAnywhere)
               Paths());
 }
 
-TEST(MountTable, DoesNotTakeAPathForOneBelowAnotherByItsFirstLettersOnly)
+TEST(MountTable, ComparesWholeComponentsOfAPath)
 {
     EXPECT_EQ(mountsIn("2 1 8:2 / /runtime rw - ext4 /dev/sda2 rw\n"), Paths{"/runtime"});
 }

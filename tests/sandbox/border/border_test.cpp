@@ -361,7 +361,7 @@ TEST_F(Border, OtherFileSystemsAreCopiedOnWriteToo)
     EXPECT_EQ(caller.wait(), 0);
 }
 
-TEST_F(Border, AFileSystemThatCannotBeOverlaidCanBeReadButNotWritten)
+TEST_F(Border, ShowsAnUnsuitableFileSystemReadOnly)
 {
     ScratchFolder const folder;
     std::string const disk = folder.path("disk");

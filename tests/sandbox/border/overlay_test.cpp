@@ -122,7 +122,7 @@ TEST_F(Overlay, ShadowFilesWithAModeOfTheirOwnKeepIt)
     EXPECT_EQ(laid({"/etc/shadow"}), "640 0:0 \n");
 }
 
-TEST_F(Overlay, LaysOverWhatAlsoLiesInTheMachinesTemporaryOrRunFolders)
+TEST_F(Overlay, ReplacesFilesInTemporaryAndRunFolders)
 {
     folder.write("run/oswmi", "run");
     folder.write("dev/shm/oswmi", "shm");
@@ -148,7 +148,7 @@ TEST_F(Overlay, IsRefusedWithTheReasonForAFile)
               "cannot open the folder " + folder.path("file") + ": Not a directory");
 }
 
-TEST_F(Overlay, IsRefusedWithTheReasonForWhatIsNeitherFileNorLinkNorFolder)
+TEST_F(Overlay, RefusesWhatIsNeitherFileLinkNorFolder)
 {
     folder.write("etc/file", "");
     ASSERT_EQ(mkfifo(folder.path("etc/pipe").c_str(), 0600), 0);

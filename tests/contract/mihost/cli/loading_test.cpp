@@ -66,7 +66,7 @@ TEST(LoadingThePlugin, TellsWhyAPluginDidNotStart)
     EXPECT_EQ(outcome.err, "mihost: the plug-in did not start: status 5: no reason\n");
 }
 
-TEST(LoadingThePlugin, ShowsANodeOfAnUnknownKindButWritesNothingToIt)
+TEST(LoadingThePlugin, ShowsButNeverWritesANodeOfUnknownKind)
 {
     EXPECT_EQ(mihostRun({"--plugin", PLUGIN_THAT_IS_ODD, "tree", "--all"}).out,
               "2 #2\n        7 7  seven\n");

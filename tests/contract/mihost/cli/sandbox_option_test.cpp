@@ -42,7 +42,7 @@ protected:
     std::string const plain_ = MACHINES_DIR "/plain";
 };
 
-TEST_F(MihostSandbox, ShowsTheCommandsTheirOutputAndTheLinesThatChanged)
+TEST_F(MihostSandbox, ShowsCommandsOutputAndChangedLines)
 {
     std::string const before = contentOf("/etc/passwd");
     Outcome const outcome =
@@ -126,7 +126,7 @@ TEST_F(MihostSandbox, HidesPasswordsInCommandsAndFiles)
     }
 }
 
-TEST_F(MihostSandbox, ShowsTheBeginningOfALongOutputAndHowMuchFollowed)
+TEST_F(MihostSandbox, ShowsTheBeginningOfALongOutput)
 {
     ScratchFolder const machine;
     std::string const tool =

@@ -75,7 +75,7 @@ TEST(UserDescription, SaysWhyAnAccountHasNoNode)
     EXPECT_EQ(describeUser(machineWith(""), "nobody")->noNode, "uid 65534 is above UID_MAX 60000");
 }
 
-TEST(UserDescription, IsMissingForAnUnknownNameOrARecordWithoutIds)
+TEST(UserDescription, IsMissingForAnUnknownName)
 {
     for (char const* name : {"none", "jdo", "jdoe:x", "odd", ""})
         EXPECT_FALSE(describeUser(machineWith(""), name)) << name;
@@ -119,7 +119,7 @@ TEST(UserDescription, KnowsWhatIsStoredForAPassword)
             << each.stored;
 }
 
-TEST(UserDescription, TakesAPasswordFromTheAccountFileIfItIsNotInTheShadow)
+TEST(UserDescription, TakesAPasswordFromTheAccountFile)
 {
     UserDescription const user = describeUser(machineWith(""), "nobody").value();
     EXPECT_EQ(user.password, PasswordState::Unusable);

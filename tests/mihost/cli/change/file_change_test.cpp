@@ -128,7 +128,7 @@ TEST(ShownChanges, HideHashesInAccountFilesAndTheirCopies)
     EXPECT_EQ(backup.added, Lines{"jdoe:(hidden):1::"});
 }
 
-TEST(ShownChanges, HideTheLinesOfOtherFilesThatNotEverybodyMayRead)
+TEST(ShownChanges, HideLinesOfOtherUnreadableFiles)
 {
     PathChange const change = texts("/etc/shadowy.conf", "", "key\n", 0640);
     EXPECT_EQ(shown({change}), "changed /etc/shadowy.conf\n");

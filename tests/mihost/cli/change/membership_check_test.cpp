@@ -85,7 +85,7 @@ TEST(MembershipChange, IsRefusedForAGroupNameThatAShellWouldActOn)
               "its group 'x`touch${IFS}/root/PWNED`' contains the shell metacharacter '`'");
 }
 
-TEST(MembershipChange, IsRefusedForEveryByteInAGroupNameThatIsUnsafe)
+TEST(MembershipChange, IsRefusedForEachUnsafeByteInAGroupName)
 {
     for (int byte = 1; byte < 256; ++byte) {
         std::string const name = std::string("a") + static_cast<char>(byte) + "b";
@@ -102,7 +102,7 @@ TEST(MembershipChange, IsRefusedForEveryByteInAGroupNameThatIsUnsafe)
     }
 }
 
-TEST(MembershipChange, IsRefusedForAGroupNameThatUsermodReadsAsAGid)
+TEST(MembershipChange, IsRefusedForAGroupNameThatIsAlsoAGid)
 {
     for (char const* name : {"0", "1500", "+0", "-1"}) {
         std::string const text = std::string("uid=1000(jdoe) gid=1000(jdoe) groups=1000(jdoe),"
@@ -113,7 +113,7 @@ TEST(MembershipChange, IsRefusedForAGroupNameThatUsermodReadsAsAGid)
     }
 }
 
-TEST(MembershipChange, IsRefusedIfUsermodWouldFindAnotherGroupOrNone)
+TEST(MembershipChange, IsRefusedIfUsermodFindsAnotherGroup)
 {
     EXPECT_EQ(objectionTo("uid=1000(jdoe) gid=1000(jdoe) groups=1000(jdoe),1501(root)\n"),
               "its group 'root' has GID 1501, but usermod finds GID 0");

@@ -62,7 +62,7 @@ TEST(UserWrites, AreRefusedIfTheNameIsGoneOrBelongsToAnotherUid)
               "'ann' is now an account with UID 1001, not 0 (run 'mihost refresh')");
 }
 
-TEST(UserWrites, AreRefusedForEveryByteThatAShellOrAToolWouldActOn)
+TEST(UserWrites, AreRefusedForEachUnsafeByte)
 {
     for (int byte = 1; byte < 256; ++byte) {
         bool const isNamePart =

@@ -179,7 +179,7 @@ public:
     }
 };
 
-TEST(CheckOfReads, NamesUnknownPropertiesThatAreAnsweredAndWrongKinds)
+TEST(CheckOfReads, NamesUnknownPropertiesAndWrongKinds)
 {
     AnswersAll node(9, 0, {}, IC::nodeType::computer, 0);
     EXPECT_EQ(wrongReads({&node}),

@@ -95,7 +95,7 @@ TEST_F(Addresses, ThatNoNodeHasAreNotFound)
         EXPECT_EQ(codeOf(address), mihost::NotFound) << address;
 }
 
-TEST_F(Addresses, ThatAreNoneAreNotFoundAndTheMessageSaysWhatOneLooksLike)
+TEST_F(Addresses, ThatAreInvalidAreRefusedWithAnExample)
 {
     for (char const* address : {"", "user", "os:1", "-1", "4x", "99999999999", "nonsense:x"}) {
         EXPECT_EQ(codeOf(address), mihost::NotFound) << address;

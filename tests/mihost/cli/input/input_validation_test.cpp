@@ -38,7 +38,7 @@ std::string noSecret(std::string const&)
 
 constexpr char forbidden[] = "|&;<>()$`\\\"'*?[]#~=%!{}^,:";
 
-TEST(MethodCallValues, AreRefusedInEveryParameterForEveryByteThatMayNotStandInThem)
+TEST(MethodCallValues, AreRefusedForEachForbiddenByte)
 {
     forEachParameter([](auto const& method, auto const& parameter, auto const& wordsWith) {
         std::string const right = rightValue(parameter.form);
@@ -62,7 +62,7 @@ TEST(MethodCallValues, AreRefusedInEveryParameterForEveryByteThatMayNotStandInTh
     });
 }
 
-TEST(MethodCallTexts, AreRefusedInEveryParameterForEveryByteThatMayNotStandInThem)
+TEST(MethodCallTexts, AreRefusedForEachForbiddenByte)
 {
     forEachParameter([](auto const& method, auto const& parameter, auto const& wordsWith) {
         std::string const right = rightValue(parameter.form);
@@ -84,7 +84,7 @@ TEST(MethodCallTexts, AreRefusedInEveryParameterForEveryByteThatMayNotStandInThe
     });
 }
 
-TEST(MethodCallValues, MayHoldLettersOfAnyScriptDigitsAndTheHarmlessSigns)
+TEST(MethodCallValues, MayHoldAnyLettersAndHarmlessSigns)
 {
     for (Form const form : {Form::AccountName, Form::Words, Form::Password})
         EXPECT_EQ(objection(form, "aZ09@+-./_Jürgen李"), std::nullopt);
@@ -98,7 +98,7 @@ TEST(MethodCallValues, MayHoldBlanksWhereTheyAreEscaped)
     EXPECT_EQ(objection(Form::Password, "john smith"), "contains a blank");
 }
 
-TEST(MethodCallValues, AreRefusedWhereACommandWouldTakeThemForAnOption)
+TEST(MethodCallValues, AreRefusedIfTheyLookLikeAnOption)
 {
     EXPECT_EQ(objection(Form::AccountName, "-r"),
               "begins with '-', so a command would read it as an option");
@@ -142,7 +142,7 @@ TEST(MethodCallValues, AreRefusedWhereTheyAreEmpty)
         EXPECT_EQ(objection(form, ""), "is empty");
 }
 
-TEST(MethodCallValues, AreRefusedBeyond254BytesWithBlanksCountingTwice)
+TEST(MethodCallValues, AreRefusedBeyond254BytesOfEscapedText)
 {
     EXPECT_EQ(objection(Form::Words, std::string(254, 'a')), std::nullopt);
     EXPECT_NE(objection(Form::Words, std::string(255, 'a')), std::nullopt);

@@ -20,7 +20,7 @@ std::string textFor(std::string const& method, std::vector<std::string> const& w
     return textOf(parseCall(method, words, noSecret));
 }
 
-TEST(MethodCall, BecomesTextWithNameTypeAndValueOfEachParameterInTheOrderGiven)
+TEST(MethodCall, BecomesTextWithItsParametersInOrder)
 {
     EXPECT_EQ(textFor("UserAdd", {"UserName=jdoe", "Comment=Test"}),
               "UserAdd,UserName:CMPI_string:jdoe,Comment:CMPI_string:Test");
@@ -67,7 +67,7 @@ TEST(MethodCall, IsRefusedWhereAParameterHasNoName)
               "'now' is not NAME=VALUE; GetShadowing takes none");
 }
 
-TEST(MethodCall, IsRefusedWhereAParameterIsMissingDoubleOrWithoutValue)
+TEST(MethodCall, IsRefusedForMissingOrDoubleParameters)
 {
     EXPECT_EQ(refusal([] { textFor("UserDel", {}); }),
               "UserDel needs UserName, login name; 'mihost methods UserDel' has all");
@@ -93,7 +93,7 @@ TEST(MethodCallText, IsTakenApartAndPutTogetherAgain)
         EXPECT_EQ(textOf(takeApart(text)), text);
 }
 
-TEST(MethodCallText, IsRefusedWhereThePluginWouldStopOrLeaveSomethingOut)
+TEST(MethodCallText, IsRefusedIfThePluginWouldReadLessOfIt)
 {
     // a blank value ends the plug-in's parsing quietly
     EXPECT_NE(refusal([] { takeApart("UserDel,UserName:CMPI_string:"); }), "accepted");

@@ -17,7 +17,7 @@ TEST(Suggestion, IsTheNameInAnotherCase)
     EXPECT_EQ(nearest("TREE", names), "tree");
 }
 
-TEST(Suggestion, IsTheNameWithALetterMissingAddedReplacedOrSwapped)
+TEST(Suggestion, IsTheNameThatDiffersByOneLetter)
 {
     EXPECT_EQ(nearest("tre", names), "tree");
     EXPECT_EQ(nearest("treee", names), "tree");

@@ -48,7 +48,7 @@ TEST(ValueText, ReadsBackFromTheValue)
     EXPECT_EQ(static_cast<std::string>(parsed(os, 75, "4294967295")), "4294967295");
 }
 
-TEST(ValueText, OfADayIsMidnightOfLocalTimeInTheFormThatThePluginScans)
+TEST(ValueText, OfADayIsItsLocalMidnight)
 {
     useZone("Europe/Berlin");
     EXPECT_EQ(static_cast<std::string>(parsed(user, 118, "2030-07-01")), "2030-07-01 00:00:00");

@@ -38,7 +38,7 @@ TEST(CommandGuard, PassesTheCommandLinesOfThePlugin)
         EXPECT_EQ(objectionToCommand(line), std::nullopt) << line;
 }
 
-TEST(CommandGuard, RefusesEveryByteThatAShellWouldActOnInEveryText)
+TEST(CommandGuard, RefusesEachByteThatAShellWouldActOn)
 {
     struct Line {
         std::string before;
@@ -83,7 +83,7 @@ TEST(CommandGuard, RefusesWhatLooksLikeTwoOfThePluginsCommands)
         EXPECT_NE(objectionToCommand(line), std::nullopt) << line;
 }
 
-TEST(CommandGuard, RefusesModuleNamesThatModinfoWouldTakeForOptions)
+TEST(CommandGuard, RefusesModuleNamesThatLookLikeOptions)
 {
     EXPECT_EQ(objectionToCommand("modinfo -x"),
               "the name of the module '-x' begins with '-', so a command would read it as an "

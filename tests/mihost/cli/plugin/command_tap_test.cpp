@@ -59,7 +59,7 @@ TEST_F(CommandTap, HandsOnWhatACommandWritesAndNotesIt)
     EXPECT_EQ(WEXITSTATUS(recording.commands()[0].status), 3);
 }
 
-TEST_F(CommandTap, LetsThePluginReadAllOfAnOutputThatItKeepsTheBeginningOf)
+TEST_F(CommandTap, LetsThePluginReadAllOfALongOutput)
 {
     tap::Recording const recording;
     std::FILE* const stream = tap::open(writing(many).c_str(), "r");

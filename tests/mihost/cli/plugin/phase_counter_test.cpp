@@ -64,7 +64,7 @@ TEST(PhaseCounter, ExpectsNoMoreLogEntriesThanThePluginShows)
     EXPECT_EQ(counter.text(), "log entries 1/50");
 }
 
-TEST(PhaseCounter, BeginsAgainWithEachPhaseAndCountsNothingBetween)
+TEST(PhaseCounter, BeginsAgainWithEachPhase)
 {
     PhaseCounter counter;
     counter.begin(phaseOf("createUserNodes"));

@@ -42,7 +42,7 @@ TEST(BashCompletionText, IsQuotedByBackslashesOrForTheOpenQuote)
     EXPECT_EQ(inBash("mihost get \"user\":ev"), "words\nev\\`id\\>x\\`\n");
 }
 
-TEST(BashCompletionText, HasNoNameWithControlCharactersOrBytesThatAreNoText)
+TEST(BashCompletionText, HasNoNameThatIsNotPlainText)
 {
     EXPECT_EQ(inBash("mihost get user:"), "words\nev\\`id\\>x\\`\njdoe\nJürgen\n");
 }

@@ -200,7 +200,7 @@ std::string moduleOf(std::filesystem::path const& file)
     return name.substr(0, name.find('.'));
 }
 
-TEST(AccelModinfo, AgreesWithModinfoOnTheModulesOfInstalledKernels)
+TEST(AccelModinfo, AgreesWithModinfoOnInstalledKernels)
 {
     std::filesystem::create_directories(kernelModules::folder());
     std::size_t compared = 0;
@@ -217,7 +217,7 @@ TEST(AccelModinfo, AgreesWithModinfoOnTheModulesOfInstalledKernels)
         GTEST_SKIP() << "no kernel with modules is installed";
 }
 
-TEST(AccelModinfo, AgreesWithModinfoOnNamesThatAreNotThoseOfOneModule)
+TEST(AccelModinfo, AgreesWithModinfoOnAmbiguousNames)
 {
     kernelModules::write("a.ko",
                          kernelModules::file({"alias=net-pf-1", "alias=other_name", "name=a"}));

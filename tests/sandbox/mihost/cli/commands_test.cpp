@@ -219,7 +219,7 @@ TEST(MihostList, RefusesAKindThatIsNone)
     EXPECT_EQ(mihostRun({"list", "things"}).code, 2);
 }
 
-TEST(MihostOutput, NeverHandsControlCharactersOfTheSystemToTheTerminal)
+TEST(MihostOutput, KeepsControlCharactersFromTheTerminal)
 {
     makeMachine();
     machine::write("/var/log/messages", "Jan  2 03:04:05 a\x1b[31mb\xFF\n");
@@ -276,7 +276,7 @@ TEST(MihostTrace, ThatCannotBeWrittenIsToldAndExitsWith2)
     EXPECT_EQ(missing.out, "");
 }
 
-TEST(MihostTiming, TellsEachPhaseOfTheStartAndHowManyCommandsItRan)
+TEST(MihostTiming, ShowsPhasesAndCommandsOfTheStart)
 {
     makeMachine();
     Outcome const outcome = mihostRun({"--timing", "--json", "get", "os", "108"});
@@ -414,7 +414,7 @@ TEST(MihostPluginRun, LeavesNothingBehind)
     EXPECT_TRUE(std::filesystem::is_empty("/tmp/private"));
 }
 
-TEST(MihostPluginRun, GivesCommandsAPrivateFolderNoInputAndTheirOwnLanguage)
+TEST(MihostPluginRun, GivesCommandsAPrivateFolderAndNoInput)
 {
     makeMachine();
     machine::fake("/usr/sbin/lsmod",
@@ -433,7 +433,7 @@ TEST(MihostPluginRun, GivesCommandsAPrivateFolderNoInputAndTheirOwnLanguage)
     EXPECT_EQ(said[3], "700");
 }
 
-TEST(MihostPluginRun, TakesTheCodeSetOfTheUsersLocaleWhereLangIsUnset)
+TEST(MihostPluginRun, TakesTheCodeSetOfTheLocaleWithoutLang)
 {
     makeMachine();
     unsetenv("LANG");

@@ -75,7 +75,7 @@ TEST_F(MihostHarm, RunsNoUserdelThatWouldFindNobody)
     EXPECT_TRUE(machine::entry("/etc/passwd", "jdoe").empty());
 }
 
-TEST_F(MihostHarm, WritesNothingForANodeWhoseNameOrUidIsAnotherAccounts)
+TEST_F(MihostHarm, WritesNothingForTwoAccountsOfOneNameOrUid)
 {
     addAccount("-M -u 1500 jdoe");
     addAccount("-M -u 1501 ann");

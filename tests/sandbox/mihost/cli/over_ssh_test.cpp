@@ -163,7 +163,7 @@ TEST_F(MihostRemote, ShowsNoPasswordThatIsTyped)
     EXPECT_FALSE(holds(run.output(), "geheim42"));
 }
 
-TEST_F(MihostRemote, ReadsNothingFromATerminalIfItsOutputGoesElsewhere)
+TEST_F(MihostRemote, LeavesTheTerminalsInputIfOutputIsAFile)
 {
     std::string const command = std::string(MIHOST_FILE) +
                                 " --host box call UserSetPassword UserName=jdoe Password=- | cat";

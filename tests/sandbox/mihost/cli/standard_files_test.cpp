@@ -25,7 +25,7 @@ void expectJsonLinesOnly(std::string const& path)
 
 constexpr char badOutput[] = "mihost: cannot write the output: Bad file descriptor\n";
 
-TEST(MihostStandardFiles, WithoutOutputTheTreeIsAnErrorAndNotInTheTrace)
+TEST(MihostStandardFiles, FailWithoutOutputAndSpareTheTrace)
 {
     machine::lay("plain");
     Outcome const traced = bash("$mihost --trace /tmp/trace tree >&-");
@@ -39,7 +39,7 @@ TEST(MihostStandardFiles, WithoutOutputTheTreeIsAnErrorAndNotInTheTrace)
     }
 }
 
-TEST(MihostStandardFiles, WithoutErrorOutputMessagesAreNotInTheTrace)
+TEST(MihostStandardFiles, KeepMessagesOutOfTheTrace)
 {
     machine::lay("plain");
     EXPECT_EQ(bash("$mihost --trace /tmp/trace tree 2>&-").code, 0);

@@ -151,7 +151,7 @@ TEST_F(MihostTerminal, WrapsTextAtItsWidthAndLosesNothing)
     EXPECT_TRUE(stands(mihostRun({"list", "users"}).out, "李明李明李明李明李明李明李明李明"));
 }
 
-TEST_F(MihostTerminal, DrawsWithPlainSignsWhereTheCodeSetHasNoOthers)
+TEST_F(MihostTerminal, DrawsWithPlainSignsInAPlainCodeSet)
 {
     setenv("LC_ALL", "C", 1);
     EXPECT_TRUE(stands(mihostRun({"tree"}).out, "\n`-root #2 "));
@@ -298,7 +298,7 @@ TEST_F(MihostTerminal, EndsTheShellOnCtrlD)
     EXPECT_TRUE(run.showsInput());
 }
 
-TEST_F(MihostTerminal, EndsTheShellOnCtrlDThatIsTypedWhileACommandRuns)
+TEST_F(MihostTerminal, EndsTheShellOnCtrlDDuringACommand)
 {
     machine::fake("/usr/sbin/userdel", "echo begun >/dev/tty; read go </tmp/go\n");
     ASSERT_EQ(std::system("mkfifo /tmp/go"), 0);
@@ -374,7 +374,7 @@ TEST_F(MihostTerminal, ComesBackToTheShellWhenCtrlCStopsAWatch)
     EXPECT_EQ(run.end(), 0);
 }
 
-TEST_F(MihostTerminal, IsItsOwnersWhileTheShellIsStoppedAndShowsTheLineAfterwards)
+TEST_F(MihostTerminal, RedrawsTheLineAfterTheShellWasStopped)
 {
     TerminalRun run({"shell"});
     run.waitFor(prompt);

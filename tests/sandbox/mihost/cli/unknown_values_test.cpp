@@ -109,7 +109,7 @@ TEST_F(UnknownValues, AreNullInJsonWithTheReason)
     EXPECT_EQ(properties.size(), 2U);
 }
 
-TEST_F(UnknownValues, AreThoseOfAUserWithoutAShadowEntryAndOfAllAfterIt)
+TEST_F(UnknownValues, BeginAtTheUserWithoutAShadowEntry)
 {
     writeShadow("root:*:19000:0:99999:7:::\nben:!:19002:0:99999:7:::\n");
     EXPECT_EQ(unknownOf("user:root", ""), Lines());

@@ -62,7 +62,7 @@ TEST_F(WriteWarnings, UserSetAttribTakesANewExpiryWithoutAWarning)
     EXPECT_EQ(expiry(), "21920");
 }
 
-TEST_F(WriteWarnings, UserSetAttribIsSilentForAnAccountThatNeverExpires)
+TEST_F(WriteWarnings, AreNotGivenForAnAccountThatNeverExpires)
 {
     ASSERT_EQ(std::system("chage -E -1 jdoe"), 0);
     Outcome const outcome =
@@ -72,7 +72,7 @@ TEST_F(WriteWarnings, UserSetAttribIsSilentForAnAccountThatNeverExpires)
     EXPECT_EQ(expiry(), "");
 }
 
-TEST_F(WriteWarnings, UserSetAttribIsRefusedIfTheExpiryCannotBePassedAlong)
+TEST_F(WriteWarnings, UserSetAttribIsRefusedIfTheExpiryWouldBeLost)
 {
     ASSERT_EQ(std::system("sed -i 's/:21919:/:99999999:/' /etc/shadow"), 0);
     machine::recordShell();

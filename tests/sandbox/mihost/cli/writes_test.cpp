@@ -86,7 +86,7 @@ TEST(MihostCall, DeletesRootOnlyWhenTold)
     EXPECT_EQ(machine::read("/tmp/deleted"), "root\n");
 }
 
-TEST(MihostSecrets, AreHiddenWhereverTheyCouldShowAndShownWhenTold)
+TEST(MihostSecrets, AreHiddenUnlessAskedFor)
 {
     makeMachineWithJdoe();
     ASSERT_EQ(std::system(("usermod -p '" + std::string(hash) + "' jdoe").c_str()), 0);

@@ -133,6 +133,13 @@ export class App {
             else
                 this.state.show("too-old", {
                     detail: format(_("It is $0; this page needs $1 or newer."), version.trim(), oldestMihost),
+                    action: {
+                        label: _("Try again"),
+                        run: () => {
+                            this.checkVersion();
+                            this.show();
+                        },
+                    },
                 });
         }, () => {}); // the view's own run of mihost meets the same trouble, and shows it
     }

@@ -1,6 +1,8 @@
 // Elements made from plain values. Texts only ever become text nodes, so nothing from the machine is markup.
 import { visible } from "./visible.js";
 
+const shownAttributes = ["title", "aria-label"];
+
 function fill(element, properties, children) {
     for (const [name, value] of Object.entries(properties)) {
         if (name === "on")
@@ -11,7 +13,7 @@ function fill(element, properties, children) {
         else if (value === true)
             element.setAttribute(name, "");
         else if (value !== false && value !== null && value !== undefined)
-            element.setAttribute(name, value);
+            element.setAttribute(name, shownAttributes.includes(name) ? visible(String(value)) : value);
     }
     append(element, ...children);
     return element;

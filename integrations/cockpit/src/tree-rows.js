@@ -17,6 +17,13 @@ export function nameOf(node) {
     return colon < 0 ? node.address : node.address.slice(colon + 1);
 }
 
+/** The kind of the node with this address. */
+export function kindOf(address) {
+    const colon = address.indexOf(":");
+    const kind = colon < 0 ? address : address.slice(0, colon);
+    return kind === "log" && colon >= 0 ? "log-entry" : kind;
+}
+
 /**
  * The rows to show. With a search or a kind those are the nodes that match, and the way to them;
  * else what the expanded nodes hold.

@@ -1,6 +1,6 @@
 import assert from "node:assert/strict";
 import { test } from "node:test";
-import { buildTree, kindsOf, nameOf, visibleRows } from "../src/tree-rows.js";
+import { buildTree, kindOf, kindsOf, nameOf, visibleRows } from "../src/tree-rows.js";
 
 const rows = [
     { id: "1", parent: "0", kind: "mi", address: "mi", headline: "" },
@@ -44,6 +44,10 @@ test("visibleRows says where a row is among its siblings", () => {
 test("nameOf leaves the kind out, and nothing more", () => {
     assert.equal(nameOf({ address: "user:a:b" }), "a:b");
     assert.equal(nameOf({ address: "os" }), "os");
+});
+
+test("kindOf tells the log from its entries", () => {
+    assert.deepEqual(["os", "user:a:b", "log", "log:1"].map(kindOf), ["os", "user", "log", "log-entry"]);
 });
 
 test("kindsOf has each kind once", () => {

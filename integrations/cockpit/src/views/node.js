@@ -1,4 +1,5 @@
 // One node: its properties by name, with unit and meaning; live ones are read again and again.
+import { button } from "../button.js";
 import * as catalogue from "../catalogue.js";
 import { _, format } from "../cockpit.js";
 import { el, replace } from "../dom.js";
@@ -6,6 +7,7 @@ import { Live } from "../live.js";
 import { Loader } from "../load.js";
 import * as mihost from "../mihost.js";
 import { liveText, propertyRows } from "../property-rows.js";
+import { kindOf, nameOf } from "../tree-rows.js";
 
 const interval = "2"; // seconds between live readings
 
@@ -15,8 +17,17 @@ const marks = [
     { flag: "secret", text: () => _("secret"), look: "pf-m-purple" },
 ];
 
+// Where more can be seen and changed than here.
+const places = {
+    user: { label: () => _("Open the account"), path: name => ["users", name] },
+    group: { label: () => _("Open the group"), path: name => ["groups", name] },
+    log: { label: () => _("Open the log"), path: () => ["log"] },
+    os: { label: () => _("Open the machine"), path: () => ["host"] },
+};
+
 export class NodeDetail {
-    constructor(state) {
+    constructor({ state, go }) {
+        this.go = go;
         this.body = el("div", {});
         this.element = el("section", { id: "detail", class: "mi-card", "aria-label": _("Chosen node") }, this.body);
         this.loader = new Loader(this.body, state);
@@ -44,15 +55,16 @@ export class NodeDetail {
         this.loader.load(
             () => [mihost.rows(["get", "--", address]), { answer: catalogue.properties(), stop() {} }],
             (rows, kinds) => {
-                const kind = address.split(":")[0] === "log" && address !== "log" ? "log-entry" : address.split(":")[0];
-                this.draw(address, kinds.get(kind), propertyRows(rows, kinds.get(kind)));
+                const known = kinds.get(kindOf(address));
+                this.draw(address, known, propertyRows(rows, known));
             });
     }
 
     draw(address, known, rows) {
         this.values = new Map();
         replace(this.body,
-            el("h2", { class: "pf-v6-c-title pf-m-xl" }, address),
+            el("div", { class: "mi-toolbar mi-heading" },
+                el("h2", { class: "pf-v6-c-title pf-m-xl mi-grow" }, address), this.place(address)),
             el("p", { class: "mi-note" }, known?.meaning),
             rows.length === 0
                 ? el("p", {}, _("This node has no properties."))
@@ -64,6 +76,11 @@ export class NodeDetail {
                                 el("th", { class: "pf-v6-c-table__th", scope: "col" }, title)))),
                     el("tbody", { class: "pf-v6-c-table__tbody" }, rows.map(row => this.row(row)))));
         this.follow(address, rows.filter(row => row.live));
+    }
+
+    place(address) {
+        const place = places[kindOf(address)];
+        return place && button(place.label(), () => this.go(place.path(nameOf({ address }))));
     }
 
     row(row) {

@@ -16,7 +16,7 @@ export class TreeView {
         this.expanded = new Set();
         this.rows = [];
         this.active = 0;
-        this.detail = new NodeDetail(state);
+        this.detail = new NodeDetail({ state, go });
         this.search = el("input", {
             id: "tree-search", type: "search", placeholder: _("Search"), "aria-label": _("Search the tree"),
             on: { input: () => this.filter() },

@@ -76,24 +76,20 @@ class Looks(PageTest):
     def test_nothing_serious_found_in_dark(self):
         self.nothing_serious_found('dark')
 
-    def assert_fits(self, width):
-        self.assertEqual(self.browser.run('return document.documentElement.scrollWidth'), width)
-        self.assertEqual(self.browser.run(CUT_OFF), [])
+    def assert_fits_every_width(self, name):
+        for width in (2000, 800, 400):
+            with self.subTest(name, width=width):
+                self.browser.size(width, 900)
+                self.assertEqual(self.browser.run('return document.documentElement.scrollWidth'), width)
+                self.assertEqual(self.browser.run(CUT_OFF), [])
+        self.browser.picture(f'{name}-narrow')
 
     def test_fits_every_width(self):
-        widths = (400, 800, 2000)
         for name in VIEWS:
             self.view(name)
-            for width in widths:
-                with self.subTest(name, width=width):
-                    self.browser.size(width, 900)
-                    self.assert_fits(width)
-                    self.browser.picture(f'{name}-{width}')
+            self.assert_fits_every_width(name)
         self.open_dialog('#user-delete')
-        for width in widths:
-            self.browser.size(width, 900)
-            self.assert_fits(width)
-            self.browser.picture(f'delete-{width}')
+        self.assert_fits_every_width('delete')
         self.close_dialog()
 
     def test_keeps_to_its_policy(self):

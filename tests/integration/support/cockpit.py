@@ -35,7 +35,11 @@ AXE = os.path.join(os.path.dirname(PAGE), 'node_modules', 'axe-core', 'axe.min.j
 MACHINE = os.path.join(environment.SOURCE, 'tests', 'machines', 'users-and-groups')
 SELENIUM = '/usr/lib/python3/dist-packages/selenium'
 WS = '/usr/lib/cockpit/cockpit-ws'
-NEEDED = ('chromium', 'chromedriver', 'cockpit-bridge', SELENIUM, environment.daemon(WS))
+SHELL = '/usr/share/cockpit/shell'
+NEEDED = (
+    PAGE or 'npm', 'chromium', 'chromedriver', SELENIUM,
+    'cockpit-bridge', environment.daemon(WS), environment.daemon(SHELL),
+)
 
 PORT = 9090
 ADDRESS = f'http://127.0.0.1:{PORT}'
@@ -92,7 +96,7 @@ def install_mihost(script=RECORDER):
 
 def install_cockpit():
     """Makes Cockpit and the page part of this copy of the machine."""
-    for path in ('/usr/lib/cockpit', '/usr/share/cockpit/shell', '/usr/share/cockpit/static'):
+    for path in ('/usr/lib/cockpit', SHELL, '/usr/share/cockpit/static'):
         unpacked = environment.daemon(path)
         if unpacked != path:
             shutil.copytree(unpacked, path, dirs_exist_ok=True)
@@ -147,7 +151,7 @@ def kill_mihost(arguments):
     os.kill(until(lambda: running(arguments), f'no mihost {arguments}')[-1], signal.SIGKILL)
 
 
-def until(condition, what, seconds=30):
+def until(condition, what, seconds=60):
     """Waits until the condition is true. Only what never comes ends by the clock."""
     deadline = time.monotonic() + seconds
     while True:
@@ -428,8 +432,9 @@ def pictures():
 
 
 def main():
+    environment.skip_or_fail_without(NEEDED)
     if 'MI_PICTURES_PIPE' in os.environ:
         pictures()  # an empty archive where a test takes none
     else:
         send_pictures()
-    environment.main_in_sandbox(PAGE or 'npm', *NEEDED)
+    environment.main_in_sandbox(*NEEDED)

@@ -20,3 +20,13 @@ export function daysText(days, endless) {
 export function countNames(names) {
     return names === "" || names === "-" ? 0 : names.split(",").length;
 }
+
+/** A fact of 'mihost user', with words for "yes", "no" and "unknown"; the absent text for one that is not there. */
+export function factText(account, fact, absent, words) {
+    const value = account[fact];
+    if (account.unknown && !value) // without the password's entry, "no" says nothing either
+        return words.unknown;
+    if (typeof value === "boolean")
+        return value ? words.yes : words.no;
+    return value ?? absent;
+}

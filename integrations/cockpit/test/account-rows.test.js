@@ -1,6 +1,6 @@
 import assert from "node:assert/strict";
 import { test } from "node:test";
-import { countNames, dayText, daysText, expiryText } from "../src/account-rows.js";
+import { countNames, dayText, daysText, expiryText, factText } from "../src/account-rows.js";
 
 test("expiryText takes the last day of time for never", () => {
     assert.equal(expiryText("2038-01-19 00:00:00", "never"), "never");
@@ -20,4 +20,18 @@ test("daysText takes 99999 days for no end", () => {
 
 test("countNames counts members", () => {
     assert.deepEqual(["", "-", "anna", "anna,ben"].map(countNames), [0, 0, 1, 2]);
+});
+
+const words = { yes: "yes", no: "no", unknown: "unknown" };
+
+test("factText has a word for what is not there", () => {
+    assert.equal(factText({ day: "2030-01-01" }, "day", "never", words), "2030-01-01");
+    assert.equal(factText({ day: null }, "day", "never", words), "never");
+    assert.equal(factText({ days: 0 }, "days", "none", words), 0);
+    assert.deepEqual([true, false].map(must => factText({ must }, "must", "", words)), ["yes", "no"]);
+});
+
+test("factText takes nothing for known where the password's entry is not", () => {
+    for (const value of [null, false])
+        assert.equal(factText({ value, unknown: "Permission denied" }, "value", "never", words), "unknown");
 });

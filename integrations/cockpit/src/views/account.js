@@ -1,4 +1,5 @@
 // One account: who it is, its groups, its password's dates, and what can be changed about it.
+import { factText } from "../account-rows.js";
 import { button } from "../button.js";
 import { _, format } from "../cockpit.js";
 import { el, replace } from "../dom.js";
@@ -23,7 +24,7 @@ const identity = [
     { label: () => _("UID"), text: account => account.uid },
     { label: () => _("Home directory"), text: account => account["home-directory"], edit: "home" },
     { label: () => _("Login shell"), text: account => account["login-shell"], edit: "shell" },
-    { label: () => _("State"), text: account => account.state ?? (account.unknown ? _("unknown") : _("in use")) },
+    { label: () => _("State"), text: account => known(account, "state", _("in use")) },
     {
         label: () => _("Account expires"), text: account => known(account, "account-expires", _("never")),
         edit: "expiry",
@@ -32,24 +33,24 @@ const identity = [
 
 const passwordFacts = [
     { label: () => _("Password"), text: account => known(account, "password", _("set")), edit: "password" },
-    { label: () => _("Set on"), text: account => known(account, "password-changed", "") },
+    { label: () => _("Set on"), text: account => known(account, "password-changed") },
     {
         label: () => _("Must be changed at next login"),
-        text: account => account["must-change-password"] ? _("yes") : _("no"),
+        text: account => known(account, "must-change-password"),
     },
     { label: () => _("May be changed from"), text: account => known(account, "change-allowed-from", _("at any time")) },
-    { label: () => _("Warned from"), text: account => known(account, "warned-from", "") },
+    { label: () => _("Warned from"), text: account => known(account, "warned-from") },
     {
         label: () => _("Valid until"), text: account => known(account, "password-valid-until", _("for ever")),
         edit: "ageing",
     },
-    { label: () => _("Days left"), text: account => known(account, "password-days-left", "") },
+    { label: () => _("Days left"), text: account => known(account, "password-days-left") },
     { label: () => _("Account active until"), text: account => known(account, "active-until", _("for ever")) },
     { label: () => _("Failed logins allowed"), text: account => account["login-failures-allowed"] ?? _("not limited") },
 ];
 
-function known(account, fact, absent) {
-    return account[fact] ?? (account.unknown ? _("unknown") : absent);
+function known(account, fact, absent = "") {
+    return factText(account, fact, absent, { yes: _("yes"), no: _("no"), unknown: _("unknown") });
 }
 
 export class AccountPage {

@@ -31,7 +31,7 @@ test("factText has a word for what is not there", () => {
     assert.deepEqual([true, false].map(must => factText({ must }, "must", "", words)), ["yes", "no"]);
 });
 
-test("factText takes nothing for known where the password's entry is not", () => {
+test("factText knows nothing without the password's entry", () => {
     for (const value of [null, false])
         assert.equal(factText({ value, unknown: "Permission denied" }, "value", "never", words), "unknown");
 });

@@ -9,7 +9,7 @@ test("sortChanges sets the account tools' backups apart", () => {
     assert.deepEqual(sorted.backups.map(change => change.file), ["/etc/passwd-"]);
 });
 
-test("differenceOf shows mode and owner, then lines that go and come", () => {
+test("differenceOf shows attributes, then lines that go and come", () => {
     assert.deepEqual(differenceOf({
         removed: ["a"], added: ["b", "c"],
         mode: { before: "0644", after: "0600" }, owner: { before: null, after: "0:0" },

@@ -5,7 +5,7 @@ import "./fake-cockpit.js";
 const { commandOf, faultsOf } = await import("../src/command.js");
 const { tasks } = await import("../src/tasks.js");
 
-test("commandOf gives options that are filled in, then the arguments", () => {
+test("commandOf gives filled-in options, then the arguments", () => {
     const values = { "user": "jdoe", "full-name": "-x J. Doe", "home": "", "max-days": "90" };
     const { words } = commandOf(tasks.userAdd, values);
     assert.deepEqual(words, ["user", "add", "--full-name=-x J. Doe", "--max-days=90", "--", "jdoe"]);
@@ -46,7 +46,7 @@ test("commandOf has only its words for a task without fields", () => {
     assert.deepEqual(commandOf(tasks.restart, {}), { words: ["power", "restart"], input: "" });
 });
 
-test("faultsOf wants what is required, numbers and equal passwords", () => {
+test("faultsOf wants required values and equal passwords", () => {
     const values = { "user": "", "max-days": "9o", "password": "a", "password-again": "b" };
     assert.deepEqual(faultsOf(tasks.userAdd, values), [
         { name: "user", reason: "missing" },
@@ -66,7 +66,7 @@ test("faultsOf refuses a line end", () => {
         [{ name: "full-name", reason: "line" }]);
 });
 
-test("every deletion, restart, halt and clearing of the log wants a typed name", () => {
+test("every dangerous task wants a typed name", () => {
     const dangerous = Object.values(tasks).filter(task => /delete|power|clear-log/.test(task.words.join(" ")));
     assert.equal(dangerous.length, 5);
     for (const task of dangerous) {

@@ -6,7 +6,7 @@ test("parseCsv names the fields by the first line", () => {
     assert.deepEqual(parseCsv("id,name\n1,root\n2,os\n"), [{ id: "1", name: "root" }, { id: "2", name: "os" }]);
 });
 
-test("parseCsv keeps commas, quotes and line ends of quoted fields", () => {
+test("parseCsv keeps commas, quotes and line ends in quotes", () => {
     assert.deepEqual(parseCsv("a,b\n\"x,y\",\"say \"\"hi\"\"\nthere\"\n"), [{ a: "x,y", b: "say \"hi\"\nthere" }]);
 });
 

@@ -2,7 +2,7 @@ import assert from "node:assert/strict";
 import { test } from "node:test";
 import { lineMatches, logLines } from "../src/log-lines.js";
 
-test("logLines has the oldest first, without the asterisks around messages", () => {
+test("logLines has the oldest first, without asterisks", () => {
     assert.deepEqual(logLines([
         { properties: { message: { value: "*a * b*" }, time: { value: 2 } } },
         { properties: { message: { value: "*no stamp*" } } },

@@ -5,7 +5,7 @@ import { last } from "./fake-cockpit.js";
 const mihost = await import("../src/mihost.js");
 const needsTimers = { skip: !mock.timers && "this Node cannot mock timers" };
 
-test("mihost runs with the privilege that there is, without a shell", () => {
+test("mihost runs without a shell, with superuser try", () => {
     mihost.text(["--version"]);
     assert.deepEqual(last().words, ["mihost", "--version"]);
     assert.equal(last().options.superuser, "try");
@@ -62,7 +62,7 @@ test("stream stops at a line that is no document", async () => {
     await assert.rejects(answer, { kind: "garbled" });
 });
 
-test("change runs a preview in the sandbox and the change itself outside", () => {
+test("change runs only a preview in the sandbox", () => {
     mihost.change(["user", "add", "--", "x"], { preview: true });
     assert.deepEqual(last().words, ["mihost", "--sandbox", "--json", "--yes", "user", "add", "--", "x"]);
     mihost.change(["user", "add", "--", "x"], { preview: false });
@@ -75,7 +75,7 @@ test("change passes its input to mihost's standard input", () => {
     assert.ok(!last().words.join(" ").includes("Geheim"));
 });
 
-test("change answers a refusal without a document by its message", async () => {
+test("change answers a refusal by its message", async () => {
     const { answer } = mihost.change(["user", "add", "--", "x;y"], { preview: true });
     last().fail({ exit_status: 2, message: "mihost: user add: NAME contains ';'" });
     assert.deepEqual(await answer, {

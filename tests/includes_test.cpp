@@ -10,7 +10,7 @@
 #include <regex>
 #include <sstream>
 
-namespace
+namespace includes_test
 {
 
 namespace fs = std::filesystem;
@@ -104,4 +104,4 @@ TEST(Includes, OfTheProgramPointOneWay)
         expectAllowedOnly(folder, others);
 }
 
-} // namespace
+} // namespace includes_test

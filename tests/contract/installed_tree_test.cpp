@@ -10,7 +10,7 @@
 #include <fstream>
 #include <gtest/gtest.h>
 
-namespace
+namespace installed_tree_test
 {
 
 namespace fs = std::filesystem;
@@ -192,4 +192,4 @@ TEST_F(ThroughFindPackage, AHostGetsTheAccelerator)
 }
 #endif
 
-} // namespace
+} // namespace installed_tree_test

@@ -10,7 +10,7 @@
 #include <gtest/gtest.h>
 #include <iterator>
 
-namespace
+namespace symbols_test
 {
 
 using Names = std::vector<std::string>;
@@ -105,4 +105,4 @@ TEST(Library, SignalsNobody)
         EXPECT_EQ(names.find(name), std::string::npos) << name;
 }
 
-} // namespace
+} // namespace symbols_test

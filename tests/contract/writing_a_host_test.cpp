@@ -9,7 +9,7 @@
 #include <cstdio>
 #include <filesystem>
 
-namespace
+namespace writing_a_host_test
 {
 
 namespace fs = std::filesystem;
@@ -90,4 +90,4 @@ TEST(ThreadsHost, ReadsEveryUser)
     EXPECT_GE(named, 1U); // root
 }
 
-} // namespace
+} // namespace writing_a_host_test

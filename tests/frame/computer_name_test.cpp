@@ -12,7 +12,7 @@
 #include <sys/utsname.h>
 #include <vector>
 
-namespace
+namespace computer_name_test
 {
 
 using NQ::ComputerInfo;
@@ -75,4 +75,4 @@ TEST_F(ComputerName, LogsItsEntryAndExitAsTheFrame)
     }
 }
 
-} // namespace
+} // namespace computer_name_test

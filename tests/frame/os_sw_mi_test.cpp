@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace os_sw_mi_test
 {
 
 class Another : public IC::OsSwMI
@@ -27,4 +27,4 @@ TEST(Interface, IsTheOneInUseOnceItIsInitialised)
     EXPECT_EQ(IC::pOsSwMI, &interface);
 }
 
-} // namespace
+} // namespace os_sw_mi_test

@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace contract_numbers_test
 {
 
 using Numbers = std::vector<unsigned int>;
@@ -110,4 +110,4 @@ TEST(ContractWords, NameTheParametersAndTheirTypes)
               (Words{"CMPI_string", "CMPI_uint32", "CMPI_dateTime"}));
 }
 
-} // namespace
+} // namespace contract_numbers_test

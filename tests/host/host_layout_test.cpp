@@ -22,7 +22,7 @@
 #include <utility>
 #include <vector>
 
-namespace
+namespace host_layout_test
 {
 
 TEST(HostLayout, GivesNodeClassesNoMembersOfTheirOwn)
@@ -124,4 +124,4 @@ static_assert(is<void (IC::OsSwMI::*)()>(&IC::OsSwMI::createDriverNodes));
 static_assert(is<void (IC::OsSwMI::*)()>(&IC::OsSwMI::createLogNodes));
 static_assert(is<void (IC::OsSwMI::*)(bool)>(&IC::OsSwMI::createLogEntryNodes));
 
-} // namespace
+} // namespace host_layout_test

@@ -11,7 +11,7 @@
 #include <iterator>
 #include <regex>
 
-namespace
+namespace hostcheck_test
 {
 
 using Names = std::vector<std::string>;
@@ -319,4 +319,4 @@ INSTANTIATE_TEST_SUITE_P(Symbols, IncompleteHosts,
                                          BrokenHost{"HidesItsSymbols", "_ZN2NQ"}),
                          nameOfWay);
 
-} // namespace
+} // namespace hostcheck_test

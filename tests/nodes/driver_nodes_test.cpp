@@ -9,7 +9,7 @@
 #include <typeinfo>
 #include <vector>
 
-namespace
+namespace driver_nodes_test
 {
 
 using Ids = std::vector<unsigned int>;
@@ -126,4 +126,4 @@ TEST_F(DriverNodes, AreNotBuiltWhenLsmodCannotBeStarted)
     EXPECT_EQ(first.level, 3000);
 }
 
-} // namespace
+} // namespace driver_nodes_test

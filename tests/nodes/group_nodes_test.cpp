@@ -20,7 +20,7 @@
 #include <utility>
 #include <vector>
 
-namespace
+namespace group_nodes_test
 {
 
 using Ids = std::vector<unsigned int>;
@@ -397,4 +397,4 @@ TEST_F(GroupNodes, AskTheirParentForItsIdOnceEach)
     EXPECT_EQ(groups()[1]->getLinkedId(), 102U);
 }
 
-} // namespace
+} // namespace group_nodes_test

@@ -12,7 +12,7 @@
 #include <typeinfo>
 #include <vector>
 
-namespace
+namespace log_nodes_test
 {
 
 using Ids = std::vector<unsigned int>;
@@ -506,4 +506,4 @@ TEST_F(LogNodes, AreCompleteWhenTheyArePublished)
     EXPECT_EQ(other.seen, Lines(2, "OS LogEntry 1 3"));
 }
 
-} // namespace
+} // namespace log_nodes_test

@@ -16,7 +16,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace os_node_writes_test
 {
 
 using IC::EnumValue;
@@ -385,4 +385,4 @@ TEST_F(OsNodeWrites, OfNineInAnyFormToTheClearCommandClearTheLog)
     }
 }
 
-} // namespace
+} // namespace os_node_writes_test

@@ -21,7 +21,7 @@
 #include <utility>
 #include <vector>
 
-namespace
+namespace user_nodes_test
 {
 
 using Ids = std::vector<unsigned int>;
@@ -463,4 +463,4 @@ TEST_F(UserNodes, AskTheirParentForItsIdOnceEach)
         EXPECT_EQ(users()[i]->getLinkedId(), 101 + i);
 }
 
-} // namespace
+} // namespace user_nodes_test

@@ -21,7 +21,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace user_writes_test
 {
 
 constexpr char const* setPasswords = "chpasswd -e < usrandpwd ; rm -f usrandpwd";
@@ -299,4 +299,4 @@ TEST_F(UserWrite, LeavesTheOtherNodesAsTheyAre)
     EXPECT_TRUE(frame.published.empty());
 }
 
-} // namespace
+} // namespace user_writes_test

@@ -7,7 +7,7 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 
-namespace
+namespace bootstrap_test
 {
 
 std::string const scripts = TESTS_DIR "/../script/";
@@ -98,4 +98,4 @@ TEST(Bootstrap, EndsRunAndTestBeforeTheyBuild)
     EXPECT_FALSE(std::filesystem::exists("/run/built"));
 }
 
-} // namespace
+} // namespace bootstrap_test

@@ -18,7 +18,7 @@
 #include <sys/utsname.h>
 #include <vector>
 
-namespace
+namespace drivers_test
 {
 
 /** What a driver node shows. */
@@ -182,4 +182,4 @@ TEST_F(Drivers, SurviveGarbageInPlaceOfEveryOutput)
     EXPECT_EQ(drivers[1].name, "\377\001");
 }
 
-} // namespace
+} // namespace drivers_test

@@ -7,7 +7,7 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 
-namespace
+namespace example_hosts_test
 {
 
 Outcome call(std::string const& text)
@@ -30,4 +30,4 @@ TEST(MethodCallHost, AddsAGroupAndSaysWhyItCannotAddItAgain)
         << again.err;
 }
 
-} // namespace
+} // namespace example_hosts_test

@@ -10,7 +10,7 @@
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 
-namespace
+namespace harness_test
 {
 
 TEST(ShellRecorder, NotesCommandLinesExactlyAndRunsThem)
@@ -86,4 +86,4 @@ TEST(Plugin, ShowsItsTreeWhenLoadedAsAHostDoes)
     EXPECT_EQ(text(plugin.node(IC::nodeType::operatingSystem), IC::property::clearLog), "0");
 }
 
-} // namespace
+} // namespace harness_test

@@ -21,7 +21,7 @@
 #include <unistd.h>
 #include <vector>
 
-namespace
+namespace limits_test
 {
 
 /** Nobody else on this machine has it, so only the test's own processes count for it. */
@@ -312,4 +312,4 @@ TEST_F(Limits, LeaveTheModulesThatWereListedBeforeLsmodDied)
 INSTANTIATE_TEST_SUITE_P(Without, Tools, testing::ValuesIn(outputs),
                          [](auto const& instance) { return std::string(instance.param.name); });
 
-} // namespace
+} // namespace limits_test

@@ -11,7 +11,7 @@
 #include <gtest/gtest.h>
 #include <regex>
 
-namespace
+namespace log_sequence_test
 {
 
 char const* const expectedFile = TESTS_DIR "/sandbox/expected/suse.log";
@@ -82,4 +82,4 @@ TEST(LogSequence, OfAWholeRunIsExactlyTheExpectedOne)
     EXPECT_EQ(saidByAWholeRun(), linesOf(machine::read(expectedFile)));
 }
 
-} // namespace
+} // namespace log_sequence_test

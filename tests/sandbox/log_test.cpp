@@ -22,7 +22,7 @@
 #include <unistd.h>
 #include <vector>
 
-namespace
+namespace log_test
 {
 
 constexpr char path[] = "/var/log/messages";
@@ -417,4 +417,4 @@ TEST_F(Log, KeepsItsOwnerWhenItIsCleared)
     EXPECT_EQ(now.st_gid, 23456U);
 }
 
-} // namespace
+} // namespace log_test

@@ -15,7 +15,7 @@
 #include <gtest/gtest.h>
 #include <ostream>
 
-namespace
+namespace methods_test
 {
 
 /** A machine with the plug-in on it, seen from the host. */
@@ -474,4 +474,4 @@ TEST_F(Commands, RefreshUsersAndGroupsThatCameOtherwise)
     EXPECT_EQ(text(host_.os(), IC::property::refresh), "0");
 }
 
-} // namespace
+} // namespace methods_test

@@ -9,7 +9,7 @@
 #include <sys/stat.h>
 #include <sys/utsname.h>
 
-namespace
+namespace os_facts_test
 {
 
 struct KnownMachine {
@@ -101,4 +101,4 @@ INSTANTIATE_TEST_SUITE_P(
                     KnownMachine{"plain", "Linux", std::nullopt, 2, nullptr}),
     [](auto const& machine) { return std::string(machine.param.name); });
 
-} // namespace
+} // namespace os_facts_test

@@ -9,7 +9,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace power_test
 {
 
 class Power : public testing::Test
@@ -117,4 +117,4 @@ TEST_F(PowerRequest, IsStoredAlsoWhereThereIsNoShutdownCommand)
     EXPECT_EQ(text(os(), IC::property::requestedState), "12");
 }
 
-} // namespace
+} // namespace power_test

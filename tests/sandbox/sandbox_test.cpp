@@ -23,7 +23,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-namespace
+namespace sandbox_test
 {
 
 std::set<std::string> namesIn(char const* folder)
@@ -218,4 +218,4 @@ TEST(Copy, HasRefusedNothingAtFirst)
     EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
 }
 
-} // namespace
+} // namespace sandbox_test

@@ -16,7 +16,7 @@
 #include <unistd.h>
 #include <vector>
 
-namespace
+namespace users_accounts_test
 {
 
 constexpr unsigned int jdoeId = 4711;
@@ -304,4 +304,4 @@ TEST(LaidMachine, ShowsAGroupOfTenThousandMembersWhole)
               (Lines{"root", members, ""}));
 }
 
-} // namespace
+} // namespace users_accounts_test

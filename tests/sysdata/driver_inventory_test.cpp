@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace driver_inventory_test
 {
 
 using NQ::driverInfo;
@@ -345,4 +345,4 @@ TEST_F(DriverInventory, DoesNotLookAtHowItsCommandsEnded)
     EXPECT_EQ(driver.getDescription(), "Disk");
 }
 
-} // namespace
+} // namespace driver_inventory_test

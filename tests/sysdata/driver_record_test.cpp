@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace driver_record_test
 {
 
 using NQ::driverInfo;
@@ -75,4 +75,4 @@ TEST(DriverRecord, LogsEntryAndExitOfGettersAndSettersAlone)
     }
 }
 
-} // namespace
+} // namespace driver_record_test

@@ -16,7 +16,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace file_modes_test
 {
 
 using Opened = std::set<std::string>;
@@ -121,4 +121,4 @@ TEST_F(FileModes, OfTheLogThatIsClearedIsWriting)
     EXPECT_EQ(openedBy([] { NQ::logInfo().clearLog(); }), Opened{"/var/log/messages|w"});
 }
 
-} // namespace
+} // namespace file_modes_test

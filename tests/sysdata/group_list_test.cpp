@@ -17,7 +17,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace group_list_test
 {
 
 using NQ::groupInfo;
@@ -252,4 +252,4 @@ TEST_F(GroupListing, EmptiesTheListBeforeItWaitsForItsMutex)
     EXPECT_EQ(atLock, 0U);
 }
 
-} // namespace
+} // namespace group_list_test

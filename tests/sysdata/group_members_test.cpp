@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace group_members_test
 {
 
 using NQ::GROUP_INFO::withMembers;
@@ -118,4 +118,4 @@ TEST(GroupMembers, AreThoseOfThePlainSearchForAnyNames)
         }
 }
 
-} // namespace
+} // namespace group_members_test

@@ -10,7 +10,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace group_record_test
 {
 
 using NQ::groupInfo;
@@ -206,4 +206,4 @@ TEST(GroupRecord, ReadsTheAccountsBetweenItsEntryAndItsExit)
     EXPECT_EQ(log.texts().back(), "setGroupMembers: exit");
 }
 
-} // namespace
+} // namespace group_record_test

@@ -12,7 +12,7 @@
 #include <unistd.h>
 #include <vector>
 
-namespace
+namespace id_ranges_test
 {
 
 using NQ::minMaxId;
@@ -229,4 +229,4 @@ TEST(IdRanges, ReadsAnUnsignedDecimalAfterAnyBlanks)
     EXPECT_EQ(minUserId("UID_MIN \n 1000\n"), 1000U); // a line end is skipped, too
 }
 
-} // namespace
+} // namespace id_ranges_test

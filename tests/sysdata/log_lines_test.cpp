@@ -5,7 +5,7 @@
 #include <climits>
 #include <string>
 
-namespace
+namespace log_lines_test
 {
 
 using namespace NQ::logLines;
@@ -162,4 +162,4 @@ TEST(LogYear, StaysWhereThereIsNoneBefore)
     EXPECT_EQ(yearOf(stampOf("Dec"), todayOf(1, "Jan")), 0);
 }
 
-} // namespace
+} // namespace log_lines_test

@@ -18,7 +18,7 @@
 #include <sys/stat.h>
 #include <vector>
 
-namespace
+namespace log_reader_test
 {
 
 using NQ::logInfo;
@@ -689,4 +689,4 @@ TEST_F(LogReader, DoesNotLookAtHowItsCommandsEnded)
     EXPECT_EQ(timeOf(1), at(2026, 11, 20, 10, 11, 12));
 }
 
-} // namespace
+} // namespace log_reader_test

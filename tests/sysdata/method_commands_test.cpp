@@ -5,7 +5,7 @@
 
 #include <ostream>
 
-namespace
+namespace method_commands_test
 {
 
 struct LineCase {
@@ -366,4 +366,4 @@ TEST_F(Shadowing, IsLeftAloneByEveryOtherMethod)
     }
 }
 
-} // namespace
+} // namespace method_commands_test

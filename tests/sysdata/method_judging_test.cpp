@@ -2,7 +2,7 @@
 
 #include "tests/sysdata/MethodTest.h"
 
-namespace
+namespace method_judging_test
 {
 
 class Judging : public MethodTest
@@ -196,4 +196,4 @@ TEST_F(Judging, OfANewUserTakesTheSameBeginningsAndTheCodeAnywhere)
     EXPECT_EQ(statusOf("rc=0\n", "chage: Aging information changed\n"), 1);
 }
 
-} // namespace
+} // namespace method_judging_test

@@ -2,7 +2,7 @@
 
 #include "tests/sysdata/MethodTest.h"
 
-namespace
+namespace method_limits_test
 {
 
 using Params = std::vector<NQ::ParamInfo>;
@@ -226,4 +226,4 @@ TEST_F(MemberLimits, AreTheRunnersBufferForTheMember)
                   "/usr/bin/id");
 }
 
-} // namespace
+} // namespace method_limits_test

@@ -6,7 +6,7 @@
 #include "tests/support/Frame.h"
 #include "tests/sysdata/MethodTest.h"
 
-namespace
+namespace method_log_test
 {
 
 class MethodLog : public MethodTest
@@ -350,4 +350,4 @@ TEST_F(MethodLog, BeginsWithTheWrittenTextUnlessThatHoldsPassword)
     }
 }
 
-} // namespace
+} // namespace method_log_test

@@ -2,7 +2,7 @@
 
 #include "tests/sysdata/MethodTest.h"
 
-namespace
+namespace method_members_test
 {
 
 class GroupMemberChanges : public MethodTest
@@ -270,4 +270,4 @@ TEST_F(GroupMemberChanges, AreMadeWhateverTypesOtherParametersHave)
     EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\""));
 }
 
-} // namespace
+} // namespace method_members_test

@@ -11,7 +11,7 @@
 #include <type_traits>
 #include <vector>
 
-namespace
+namespace method_parser_test
 {
 
 using NQ::ParamInfo;
@@ -334,4 +334,4 @@ TEST(MethodParser, SpeaksAtLevel3000AsLongAsItRejectsNothing)
     EXPECT_EQ(log.texts(3000), log.texts());
 }
 
-} // namespace
+} // namespace method_parser_test

@@ -6,7 +6,7 @@
 #include <algorithm>
 #include <array>
 
-namespace
+namespace method_runner_test
 {
 
 constexpr std::size_t bufferSize = 5000;
@@ -231,4 +231,4 @@ TEST_F(PasswordEncryption, EndsTheLineAtAnEmptyPassword)
     EXPECT_EQ(commands_.ran, Lines{"echo 2>&1"});
 }
 
-} // namespace
+} // namespace method_runner_test

@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace method_tokenize_test
 {
 
 Lines tokens(std::string const& text, std::string const& delimiters)
@@ -143,4 +143,4 @@ TEST(GroupTokenize, AppendsEachPieceBeforeItLogsIt)
     EXPECT_EQ(log.counts, (std::vector<std::size_t>{1, 2}));
 }
 
-} // namespace
+} // namespace method_tokenize_test

@@ -11,7 +11,7 @@
 #include <utility>
 #include <vector>
 
-namespace
+namespace os_figures_test
 {
 
 using NQ::OsInfo;
@@ -332,4 +332,4 @@ TEST(OsInfoFixedValues, ConsultNeitherFilesNorCommandsNorTheClock)
     EXPECT_EQ(asked, 0);
 }
 
-} // namespace
+} // namespace os_figures_test

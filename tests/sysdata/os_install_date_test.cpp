@@ -12,7 +12,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace os_install_date_test
 {
 
 using NQ::OsInfo;
@@ -205,4 +205,4 @@ TEST_F(InstallDate, ClosesTheReleaseFileBeforeItReadsTheOutput)
     EXPECT_FALSE(openAtRead);
 }
 
-} // namespace
+} // namespace os_install_date_test

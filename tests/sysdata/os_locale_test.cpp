@@ -6,7 +6,7 @@
 #include <cstdlib>
 #include <string>
 
-namespace
+namespace os_locale_test
 {
 
 using NQ::OsInfo;
@@ -138,4 +138,4 @@ TEST(CodeSet, DoesNotFallBackToTheCharacterType)
     EXPECT_EQ(codeSet(nullptr, "fr_FR.ISO-8859-1"), "ANSI_X3.4-1968");
 }
 
-} // namespace
+} // namespace os_locale_test

@@ -15,7 +15,7 @@
 #include <type_traits>
 #include <vector>
 
-namespace
+namespace os_log_test
 {
 
 using NQ::OsInfo;
@@ -171,4 +171,4 @@ TEST_P(OsInfoLog, TakesNoLockButThatOfTheAccountsForTheUserCount)
     EXPECT_EQ(accounts, std::string(GetParam().function) == "getUserCount" ? 1 : 0);
 }
 
-} // namespace
+} // namespace os_log_test

@@ -12,7 +12,7 @@
 #include <unistd.h>
 #include <vector>
 
-namespace
+namespace os_power_test
 {
 
 using NQ::OsInfo;
@@ -83,4 +83,4 @@ TEST_P(OsInfoPower, TakesNothingOutOfTheCommandsPipe)
     EXPECT_EQ(read, 0);
 }
 
-} // namespace
+} // namespace os_power_test

@@ -10,15 +10,13 @@
 
 #include <gtest/gtest.h>
 
-#include <atomic>
 #include <cstring>
 #include <string>
 #include <sys/utsname.h>
-#include <thread>
 #include <unistd.h>
 #include <vector>
 
-namespace
+namespace os_release_test
 {
 
 using NQ::OsInfo;
@@ -420,24 +418,4 @@ TEST_F(OSVersion, FailsWithoutAMessage)
     EXPECT_TRUE(log.remarks().empty());
 }
 
-TEST_F(OSName, AndVersionAreToldToSeveralThreadsAtOnce)
-{
-    files_.write("/etc/release", "Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2\n");
-    std::atomic<int> wrong{0};
-    std::vector<std::thread> threads;
-    for (int thread = 0; thread < 4; ++thread)
-        threads.emplace_back([&wrong] {
-            for (int round = 0; round < 50; ++round) {
-                std::string name;
-                std::string number;
-                OsInfo().getOSName(name);
-                OsInfo().getOSVersion(number);
-                wrong += name == "Kesto Linux" && number == "10.2" ? 0 : 1;
-            }
-        });
-    for (std::thread& thread : threads)
-        thread.join();
-    EXPECT_EQ(wrong, 0);
-}
-
-} // namespace
+} // namespace os_release_test

@@ -14,7 +14,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace os_user_count_test
 {
 
 using NQ::OsInfo;
@@ -170,4 +170,4 @@ TEST_F(UserCount, CountsAgainFromTheFileEachTime)
     EXPECT_EQ(countOf(account("root", 0) + account("jdoe", 1000)), 2U);
 }
 
-} // namespace
+} // namespace os_user_count_test

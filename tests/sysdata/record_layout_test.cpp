@@ -16,7 +16,7 @@
 #include <type_traits>
 #include <vector>
 
-namespace
+namespace record_layout_test
 {
 
 using NQ::driverInfo;
@@ -109,4 +109,4 @@ TEST(RecordLayout, OfADriverIsFiveTexts)
     EXPECT_EQ(sizeof(driverInfo), 5 * sizeof(std::string));
 }
 
-} // namespace
+} // namespace record_layout_test

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace strreplace_test
 {
 
 std::string replaced(std::string text, char from, char to)
@@ -39,4 +39,4 @@ TEST(Strreplace, LeavesAnEmptyTextAlone)
     EXPECT_EQ(std::string(text, 2), std::string("\0-", 2));
 }
 
-} // namespace
+} // namespace strreplace_test

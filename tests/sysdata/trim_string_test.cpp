@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace trim_string_test
 {
 
 std::string trimmed(std::string text)
@@ -41,4 +41,4 @@ TEST(TrimString, StripsNeitherTabsNorNewlines)
     EXPECT_EQ(trimmed("\n"), "\n");
 }
 
-} // namespace
+} // namespace trim_string_test

@@ -13,7 +13,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace user_account_test
 {
 
 using NQ::userInfo;
@@ -487,4 +487,4 @@ TEST_F(AccountLock, LogsAtLevel3000UnderTheUnitsName)
     }
 }
 
-} // namespace
+} // namespace user_account_test

@@ -11,7 +11,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace user_days_test
 {
 
 constexpr long firstOf2008 = 1199145600; // 1 January 2008, 00:00 UTC
@@ -192,4 +192,4 @@ TEST_F(LabelledDays, ConvertTheDateOnceAtTheEndOfTheOutput)
     EXPECT_EQ(complaint.level, 6000);
 }
 
-} // namespace
+} // namespace user_days_test

@@ -22,7 +22,7 @@
 #include <utility>
 #include <vector>
 
-namespace
+namespace user_list_test
 {
 
 using NQ::userInfo;
@@ -444,4 +444,4 @@ TEST_F(UserListing, OpensNothingElseWithoutAnAccountFile)
     EXPECT_EQ(steps_, Lines{"/etc/passwd ro"});
 }
 
-} // namespace
+} // namespace user_list_test

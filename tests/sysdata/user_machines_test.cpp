@@ -15,7 +15,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace user_machines_test
 {
 
 using NQ::userInfo;
@@ -189,4 +189,4 @@ TEST(UserMachine, KeepsTheLastDenyThatIsANumber)
     EXPECT_EQ(log.texts(6000), (Lines{complaint, complaint}));
 }
 
-} // namespace
+} // namespace user_machines_test

@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace user_parse_test
 {
 
 using NQ::USER_INFO::LabelledDate;
@@ -209,4 +209,4 @@ TEST(WrittenDate, HasZerosWhereItCannotBeRead)
     expectDay("2010/12/31", 2010, 0, 0);
 }
 
-} // namespace
+} // namespace user_parse_test

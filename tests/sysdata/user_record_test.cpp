@@ -11,7 +11,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace user_record_test
 {
 
 using NQ::userInfo;
@@ -311,4 +311,4 @@ TEST(UserRecord, IsMadeCopiedAndDestroyedInSilence)
     EXPECT_TRUE(log.records().empty());
 }
 
-} // namespace
+} // namespace user_record_test

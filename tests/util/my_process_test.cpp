@@ -9,7 +9,7 @@
 #include <type_traits>
 #include <vector>
 
-namespace
+namespace my_process_test
 {
 
 using NQ::MyProcess;
@@ -177,4 +177,4 @@ TEST(MyProcess, HoldsOneStreamAndNothingElse)
     EXPECT_EQ(sizeof(MyProcess), sizeof(FILE*));
 }
 
-} // namespace
+} // namespace my_process_test

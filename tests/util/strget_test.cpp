@@ -6,7 +6,7 @@
 
 #include <string>
 
-namespace
+namespace strget_test
 {
 
 /** The value part of a line, and the line's bytes as they stand afterwards. */
@@ -91,4 +91,4 @@ TEST(Strget, LogsItsEntryAndExitInItsUnitsCategory)
     }
 }
 
-} // namespace
+} // namespace strget_test

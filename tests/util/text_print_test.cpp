@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 #include <string>
 
-namespace
+namespace text_print_test
 {
 
 TEST(PrintIntoABuffer, FillsItToTheLastByteButOne)
@@ -27,4 +27,4 @@ TEST(PrintIntoABuffer, TakesAnEmptyText)
     EXPECT_STREQ(buffer, "");
 }
 
-} // namespace
+} // namespace text_print_test

@@ -8,7 +8,7 @@
 #include <sys/utsname.h>
 #include <typeinfo>
 
-namespace
+namespace fixed_nodes_test
 {
 
 class FixedNodes : public Loaded
@@ -321,4 +321,4 @@ TEST_F(FixedNodes, LikeAllParentsAreAskedForTheirIds)
     EXPECT_EQ(parentOf(inside(&OpenInterface::logNode_), "createLogEntryNodes(bool)"), 77U);
 }
 
-} // namespace
+} // namespace fixed_nodes_test

@@ -18,7 +18,7 @@
 #include <sys/sysinfo.h>
 #include <utility>
 
-namespace
+namespace lifecycle_test
 {
 
 Lines const builders = {"createOsSwNodes",  "createRootNode",    "createComputerNodes",
@@ -672,4 +672,4 @@ TEST_P(Rebuilding, SaysNothingOfADeletionThatFailsAndGoesOn)
               static_cast<std::ptrdiff_t>(nodes)); // each asked for once
 }
 
-} // namespace
+} // namespace lifecycle_test

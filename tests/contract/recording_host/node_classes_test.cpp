@@ -5,7 +5,7 @@
 #include <filesystem>
 #include <memory>
 
-namespace
+namespace node_classes_test
 {
 
 class NodeClasses : public Loaded, public testing::WithParamInterface<char const*>
@@ -267,4 +267,4 @@ TEST_F(CommandWrites, AnswerAsTheStoreIfTheRebuildFails)
     EXPECT_FALSE(host.messages(6000).empty()); // the refusals
 }
 
-} // namespace
+} // namespace node_classes_test

@@ -7,7 +7,7 @@
 #include <link.h>
 #include <memory>
 
-namespace
+namespace slots_test
 {
 
 struct Free {
@@ -144,4 +144,4 @@ INSTANTIATE_TEST_SUITE_P(Classes, NodeSlots,
                                          NodeClass{"LogEntryNode", {"getProperty", "setProperty"}}),
                          [](auto const& nodeClass) { return std::string(nodeClass.param.name); });
 
-} // namespace
+} // namespace slots_test

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace command_form_test
 {
 
 using miaccel::operandsOf;
@@ -51,4 +51,4 @@ TEST(AccelCommand, LeavesEverythingElseToTheShell)
             EXPECT_FALSE(operandsOf(form, line)) << line;
 }
 
-} // namespace
+} // namespace command_form_test

@@ -13,7 +13,7 @@
 #include <gtest/gtest.h>
 #include <vector>
 
-namespace
+namespace date_test
 {
 
 using bothways::answered;
@@ -189,4 +189,4 @@ TEST(AccelDate, IsRunAgainInEveryOtherHour)
     EXPECT_EQ(countOf("date").handed_on, before + 1);
 }
 
-} // namespace
+} // namespace date_test

@@ -9,7 +9,7 @@
 #include <gtest/gtest.h>
 #include <random>
 
-namespace
+namespace line_index_test
 {
 
 using miaccel::LineIndex;
@@ -194,4 +194,4 @@ TEST_F(AccelLineIndex, FindsNothingInAnotherFile)
     EXPECT_FALSE(index_.find(file_.get(), 2));
 }
 
-} // namespace
+} // namespace line_index_test

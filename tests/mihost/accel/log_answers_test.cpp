@@ -12,7 +12,7 @@
 #include <sys/vfs.h>
 #include <thread>
 
-namespace
+namespace log_answers_test
 {
 
 using bothways::answered;
@@ -201,4 +201,4 @@ TEST_F(AccelLog, IsNotLockedWhileAStreamIsWithItsReader)
     std::fclose(line);
 }
 
-} // namespace
+} // namespace log_answers_test

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 #include <vector>
 
-namespace
+namespace stream_test
 {
 
 using miaccel::openStream;
@@ -48,4 +48,4 @@ TEST(AccelStream, CannotBeRewoundOrWrittenAndHasNoDescriptor)
     std::fclose(stream); // half read
 }
 
-} // namespace
+} // namespace stream_test

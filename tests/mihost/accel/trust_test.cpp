@@ -8,7 +8,7 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 
-namespace
+namespace trust_test
 {
 
 using bothways::answered;
@@ -171,4 +171,4 @@ TEST_F(AccelTrust, IsUsedForReadingOnly)
     std::fclose(stream);
 }
 
-} // namespace
+} // namespace trust_test

@@ -11,11 +11,10 @@
 #include <algorithm>
 #include <random>
 #include <string>
-#include <thread>
 #include <utility>
 #include <vector>
 
-namespace
+namespace interface_test
 {
 
 using IC::Error;
@@ -402,32 +401,6 @@ TEST_F(RuntimeInterface, TakesAndDropsAListenerForAlerts)
     EXPECT_EQ(interface_.deRegisterForAlerts().getStatus(), 0U);
 }
 
-TEST_F(RuntimeInterface, LetsThreadsRebuildDifferentKindsAtOnce)
-{
-    auto const rebuild = [this](unsigned int first) {
-        Events own;
-        for (int round = 0; round < 20; ++round) {
-            Nodes nodes;
-            for (unsigned int id = first; id < first + 50; ++id) {
-                nodes.push_back(new Mortal(id, own));
-                interface_.addNewNode(nodes.back());
-            }
-            Nodes seen;
-            interface_.getMap(seen);
-            Node* found = nullptr;
-            EXPECT_EQ(interface_.getNode(std::to_string(first), found).getStatus(), 0U);
-            EXPECT_EQ(found, nodes.front());
-            for (Node* node : nodes)
-                EXPECT_EQ(interface_.deleteNode(node).getStatus(), 0U);
-        }
-        EXPECT_EQ(own.size(), 20U * 50U);
-    };
-    std::thread other(rebuild, 1000);
-    rebuild(2000);
-    other.join();
-    EXPECT_TRUE(listed().empty());
-}
-
 TEST_F(RuntimeInterface, FailsToInitializeOnRequestButIsPrepared)
 {
     IC::Error const failure(9, IC::Number(0U), "on request");
@@ -441,4 +414,4 @@ TEST_F(RuntimeInterface, FailsToInitializeOnRequestButIsPrepared)
     EXPECT_EQ(interface_.initialize(30, IC::Number(0U), IC::Number(0U)).getStatus(), 0U);
 }
 
-} // namespace
+} // namespace interface_test

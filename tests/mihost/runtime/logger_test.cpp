@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace logger_test
 {
 
 using VXLog::VXLogger;
@@ -53,4 +53,4 @@ TEST(Logger, DropsMessagesWithoutASink)
     EXPECT_TRUE(log.records().empty());
 }
 
-} // namespace
+} // namespace logger_test

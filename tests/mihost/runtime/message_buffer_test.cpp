@@ -11,7 +11,7 @@
 #include <random>
 #include <string>
 
-namespace
+namespace message_buffer_test
 {
 
 using NQ::make_string;
@@ -205,4 +205,4 @@ TEST(MessageBuffer, WritesPlainDigitsWhateverTheHostsLocale)
     EXPECT_EQ(text, "1234567");
 }
 
-} // namespace
+} // namespace message_buffer_test

@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace nodes_test
 {
 
 using IC::Error;
@@ -122,4 +122,4 @@ TEST_F(NodeStore, OverridesTheFirstSixOperationsOfItsBase)
     EXPECT_EQ(base.getProperties().size(), 1U);
 }
 
-} // namespace
+} // namespace nodes_test

@@ -11,7 +11,7 @@
 #include <cerrno>
 #include <cstdio>
 
-namespace
+namespace sinks_test
 {
 
 using mihost::LineWriter;
@@ -90,4 +90,4 @@ TEST(LineWriter, TellsOfAFailureThatComesToLightAtTheEnd)
     std::fclose(full);
 }
 
-} // namespace
+} // namespace sinks_test

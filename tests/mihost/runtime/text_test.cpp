@@ -5,7 +5,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace text_test
 {
 
 using mihost::jsonString;
@@ -84,4 +84,4 @@ TEST(JsonString, IsAppendedBehindWhatStandsThere)
     EXPECT_EQ(text, "\"key\":\"a\\u0009b\"");
 }
 
-} // namespace
+} // namespace text_test

@@ -13,7 +13,7 @@
 #include <string>
 #include <vector>
 
-namespace
+namespace values_test
 {
 
 using IC::EnumValue;
@@ -315,4 +315,4 @@ TEST(PropertyValue, JoinsDatesLikeOtherNumbers)
     EXPECT_EQ(asText(numbers({Number(0L, 0), Number(7U)})), "1970-01-01 00:00:00,7");
 }
 
-} // namespace
+} // namespace values_test

@@ -3,7 +3,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace mount_table_test
 {
 
 using Paths = std::vector<std::string>;
@@ -73,4 +73,4 @@ TEST(MountTable, IsNotTakenForEmptyWhenItCannotBeRead)
     EXPECT_THROW(mihost::mountsToCopy("/nonexistent/mountinfo"), std::runtime_error);
 }
 
-} // namespace
+} // namespace mount_table_test

@@ -21,7 +21,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-namespace
+namespace border_test
 {
 
 std::string mountTable()
@@ -453,4 +453,4 @@ TEST_F(Border, GoesToTheRootWhereTheWorkingDirectoryIsNotInTheCopy)
     EXPECT_EQ(caller.hearAll(), "/");
 }
 
-} // namespace
+} // namespace border_test

@@ -15,7 +15,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-namespace
+namespace changes_test
 {
 
 namespace fs = std::filesystem;
@@ -268,4 +268,4 @@ TEST_F(Changes, CannotReachTheMachineThroughWhatTheyAreReadFrom)
     EXPECT_EQ(contentOf(file), "text");
 }
 
-} // namespace
+} // namespace changes_test

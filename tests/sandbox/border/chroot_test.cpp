@@ -12,7 +12,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-namespace
+namespace chroot_test
 {
 
 class Chroot : public BorderTest
@@ -116,4 +116,4 @@ TEST_F(Chroot, IsNotLeftByTheCopy)
     EXPECT_EQ(caller.wait(), 0);
 }
 
-} // namespace
+} // namespace chroot_test

@@ -8,7 +8,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-namespace
+namespace overlay_test
 {
 
 constexpr unsigned int modeBits = 07777;
@@ -199,4 +199,4 @@ TEST_F(Overlay, LayingOverTheMachineItselfIsRefused)
     EXPECT_THROW(mihost::layOver(folder.name()), std::logic_error);
 }
 
-} // namespace
+} // namespace overlay_test

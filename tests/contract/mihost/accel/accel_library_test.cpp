@@ -7,7 +7,7 @@
 #include <cstdlib>
 #include <gtest/gtest.h>
 
-namespace
+namespace accel_library_test
 {
 
 using Words = std::vector<std::string>;
@@ -65,4 +65,4 @@ TEST(AccelLibraryFile, DefinesNothingButItsFaceAndTheTwoCalls)
     EXPECT_EQ(names, "miaccel_counts\nmiaccel_enable\npclose\npopen\n");
 }
 
-} // namespace
+} // namespace accel_library_test

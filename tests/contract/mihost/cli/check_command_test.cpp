@@ -12,7 +12,7 @@
 #include <nlohmann/json.hpp>
 #include <set>
 
-namespace
+namespace check_command_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -311,4 +311,4 @@ TEST(CheckOutsideOfASandbox, NeverRuns)
     EXPECT_EQ(mihostRun({"shell"}, "check\n").code, 2);
 }
 
-} // namespace
+} // namespace check_command_test

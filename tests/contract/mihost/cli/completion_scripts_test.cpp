@@ -3,7 +3,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace completion_scripts_test
 {
 
 /** What bash's completion of a line leaves in COMPREPLY, and the options it sets. */
@@ -52,4 +52,4 @@ TEST(BashCompletion, OffersNothingWhereNothingFits)
     EXPECT_EQ(inBash("mihost nonsense "), "\n");
 }
 
-} // namespace
+} // namespace completion_scripts_test

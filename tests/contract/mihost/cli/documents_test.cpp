@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace documents_test
 {
 
 TEST(ReferenceDocuments, AreWhatTheCatalogueSays)
@@ -43,4 +43,4 @@ TEST(CatalogueCommands, TellAMethodsParametersInItsHelp)
     EXPECT_NE(mihostRun({"call", "--help"}).out.find("UserSetHomeDir"), std::string::npos);
 }
 
-} // namespace
+} // namespace documents_test

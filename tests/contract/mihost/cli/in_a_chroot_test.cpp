@@ -11,7 +11,7 @@
 #include <nlohmann/json.hpp>
 #include <sstream>
 
-namespace
+namespace in_a_chroot_test
 {
 
 namespace fs = std::filesystem;
@@ -82,4 +82,4 @@ TEST(MihostInAChroot, TriesAChangeInASandbox)
     EXPECT_EQ(machine.content("etc/group"), "root:x:0:\n");
 }
 
-} // namespace
+} // namespace in_a_chroot_test

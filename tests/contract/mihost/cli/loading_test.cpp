@@ -6,7 +6,7 @@
 #include <gtest/gtest.h>
 #include <unistd.h>
 
-namespace
+namespace loading_test
 {
 
 void expectOneLine(std::string const& text)
@@ -99,4 +99,4 @@ TEST(LoadingThePlugin, TakesAPathRelativeToTheWorkingDirectory)
     EXPECT_EQ(mihostRun({"--plugin", file.substr(slash + 1), "get", "os"}).code, 0);
 }
 
-} // namespace
+} // namespace loading_test

@@ -6,7 +6,7 @@
 #include <regex>
 #include <set>
 
-namespace
+namespace manual_pages_test
 {
 
 Outcome shell(std::string const& line)
@@ -109,4 +109,4 @@ TEST(ManualPageOfThePlugin, HasTheListsOfTheCatalogue)
         EXPECT_NE(page.find(line), std::string::npos) << line << page;
 }
 
-} // namespace
+} // namespace manual_pages_test

@@ -7,7 +7,7 @@
 #include <cstdlib>
 #include <gtest/gtest.h>
 
-namespace
+namespace readme_test
 {
 
 struct Step {
@@ -68,4 +68,4 @@ TEST(TheSessionInTheReadme, IsWhatTheProgramSays)
     }
 }
 
-} // namespace
+} // namespace readme_test

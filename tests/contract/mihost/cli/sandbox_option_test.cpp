@@ -12,7 +12,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-namespace
+namespace sandbox_option_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -182,4 +182,4 @@ TEST(MihostWithoutTheSandbox, IsNeverSilent)
     EXPECT_EQ(outcome.err.rfind("mihost: no sandbox, so nothing was run: ", 0), 0U) << outcome.err;
 }
 
-} // namespace
+} // namespace sandbox_option_test

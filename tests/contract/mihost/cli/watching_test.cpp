@@ -7,7 +7,7 @@
 #include <cstdlib>
 #include <gtest/gtest.h>
 
-namespace
+namespace watching_test
 {
 
 constexpr std::size_t stampLength = sizeof "YYYY-MM-DD HH:MM:SS" - 1;
@@ -43,4 +43,4 @@ TEST(Watching, WaitsForANodeThatIsGone)
     EXPECT_EQ(lines[0].substr(stampLength), "   89 group-id  3");
 }
 
-} // namespace
+} // namespace watching_test

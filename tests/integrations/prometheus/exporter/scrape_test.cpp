@@ -9,7 +9,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-namespace
+namespace scrape_test
 {
 
 using namespace std::chrono_literals;
@@ -72,4 +72,4 @@ TEST(Scrape, EndsALateProgramAndItsCommands)
     EXPECT_EQ(written, "begun\n");
 }
 
-} // namespace
+} // namespace scrape_test

@@ -6,7 +6,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace login_defs_test
 {
 
 using mihost::LoginDefs;
@@ -84,4 +84,4 @@ TEST(IdRange, SaysWhichBoundAnIdIsBeyond)
               "UID_MAX is not set in /etc/login.defs");
 }
 
-} // namespace
+} // namespace login_defs_test

@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace user_description_test
 {
 
 using namespace mihost;
@@ -198,4 +198,4 @@ TEST(GroupDescription, SaysWhyAGroupHasNoNode)
     EXPECT_FALSE(describeGroup(machineWith(""), "none"));
 }
 
-} // namespace
+} // namespace user_description_test

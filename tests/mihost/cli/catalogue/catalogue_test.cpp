@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 #include <set>
 
-namespace
+namespace catalogue_test
 {
 
 using mihost::methods;
@@ -100,4 +100,4 @@ TEST(Catalogue, NamesTypesThatAMethodCallKnows)
                 << parameter.name;
 }
 
-} // namespace
+} // namespace catalogue_test

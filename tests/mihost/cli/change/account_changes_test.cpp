@@ -3,7 +3,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace account_changes_test
 {
 
 using mihost::AccountFiles;
@@ -41,4 +41,4 @@ TEST(AccountFileChanges, HideHashesOfBrokenLines)
               (Lines{"jdoe:(hidden)", "noColonAtAll"}));
 }
 
-} // namespace
+} // namespace account_changes_test

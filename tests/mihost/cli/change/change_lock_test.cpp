@@ -12,7 +12,7 @@
 #include <sys/stat.h>
 #include <thread>
 
-namespace
+namespace change_lock_test
 {
 
 using mihost::ChangeLock;
@@ -125,4 +125,4 @@ TEST_F(TheChangeLock, FollowsNoLinkAndSaysWhatIsWrong)
     EXPECT_FALSE(std::filesystem::exists(folder.path("elsewhere")));
 }
 
-} // namespace
+} // namespace change_lock_test

@@ -6,7 +6,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace file_change_test
 {
 
 using mihost::FileChange;
@@ -159,4 +159,4 @@ TEST(ShownChanges, LeaveOutLockFilesAndTheProgramsOwn)
     EXPECT_EQ(shown(changes), "created /tmp/owner (mode 0600, owner 0:0)\n");
 }
 
-} // namespace
+} // namespace file_change_test

@@ -7,7 +7,7 @@
 #include <gtest/gtest.h>
 #include <map>
 
-namespace
+namespace membership_check_test
 {
 
 using namespace mihost;
@@ -132,4 +132,4 @@ TEST(MembershipChange, MayKeepGroupsWithBlanksOrWithoutNames)
               "none");
 }
 
-} // namespace
+} // namespace membership_check_test

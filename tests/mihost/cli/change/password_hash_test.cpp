@@ -1,7 +1,7 @@
 #include "mihost/cli/change/PasswordHash.h"
 #include "tests/mihost/cli/Refusal.h"
 
-namespace
+namespace password_hash_test
 {
 
 using mihost::escapedForShell;
@@ -35,4 +35,4 @@ TEST(PasswordHash, IsEscapedCharacterByCharacter)
     EXPECT_EQ(escapedForShell("$6$rounds=9$*`\\;"), "\\$6\\$rounds\\=9\\$\\*\\`\\\\\\;");
 }
 
-} // namespace
+} // namespace password_hash_test

@@ -3,7 +3,7 @@
 #include <cctype>
 #include <gtest/gtest.h>
 
-namespace
+namespace user_check_test
 {
 
 using mihost::Account;
@@ -82,4 +82,4 @@ TEST(UserWrites, AreRefusedForEachUnsafeByte)
     }
 }
 
-} // namespace
+} // namespace user_check_test

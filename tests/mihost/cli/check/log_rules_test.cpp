@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace log_rules_test
 {
 
 using namespace mihost;
@@ -134,4 +134,4 @@ TEST(CheckOfTheLog, KeepsEveryArgumentOfACall)
     EXPECT_TRUE(record.calls().empty());
 }
 
-} // namespace
+} // namespace log_rules_test

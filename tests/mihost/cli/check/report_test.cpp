@@ -8,7 +8,7 @@
 #include <gtest/gtest.h>
 #include <set>
 
-namespace
+namespace report_test
 {
 
 using namespace mihost;
@@ -149,4 +149,4 @@ TEST(CheckOfSymbols, RefusesALibraryThatIsNotLoaded)
     EXPECT_THROW(symbolsOf("/nonexistent"), std::runtime_error);
 }
 
-} // namespace
+} // namespace report_test

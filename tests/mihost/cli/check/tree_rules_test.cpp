@@ -7,7 +7,7 @@
 #include <gtest/gtest.h>
 #include <memory>
 
-namespace
+namespace tree_rules_test
 {
 
 using namespace mihost::checks;
@@ -195,4 +195,4 @@ TEST(CheckOfReads, NamesStoredPropertiesThatAreNotAnswered)
     EXPECT_EQ(wrongReads({&os}), Findings{"os #9: clear-log (191): cannot be read"});
 }
 
-} // namespace
+} // namespace tree_rules_test

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace file_checks_test
 {
 
 using namespace mihost;
@@ -88,4 +88,4 @@ TEST(ProblemOfStamps, IsTheNewestLineWithoutOne)
         EXPECT_NE(problemOfStamps({line}), std::nullopt) << line;
 }
 
-} // namespace
+} // namespace file_checks_test

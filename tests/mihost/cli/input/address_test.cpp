@@ -4,7 +4,7 @@
 #include <gtest/gtest.h>
 #include <memory>
 
-namespace
+namespace address_test
 {
 
 using mihost::Failure;
@@ -127,4 +127,4 @@ TEST_F(Addresses, OfNodesReadBackAsTheyAreShown)
     EXPECT_EQ(mihost::addressOf(*nodes_[8]), "11");
 }
 
-} // namespace
+} // namespace address_test

@@ -4,7 +4,7 @@
 #include <CLI/Formatter.hpp>
 #include <gtest/gtest.h>
 
-namespace
+namespace choices_test
 {
 
 using mihost::Choices;
@@ -56,4 +56,4 @@ TEST_F(ChoiceTableTest, ShowsFewWordsInTheHelpAndLeavesOutMany)
     EXPECT_EQ(app_.help().find("restart|"), std::string::npos) << app_.help();
 }
 
-} // namespace
+} // namespace choices_test

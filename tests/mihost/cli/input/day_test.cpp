@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace day_test
 {
 
 using mihost::Day;
@@ -36,4 +36,4 @@ TEST(DayNumber, HasNoDayBeyondTheYearsThatCanBeWritten)
     EXPECT_FALSE(dayOfNumber(dayNumber({1901, 1, 1}) - 1));
 }
 
-} // namespace
+} // namespace day_test

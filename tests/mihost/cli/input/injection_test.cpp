@@ -10,7 +10,7 @@
 #include <array>
 #include <optional>
 
-namespace
+namespace injection_test
 {
 
 using mihost::Form;
@@ -169,4 +169,4 @@ TEST_F(Injection, IntoAPropertyThatActsLeavesHashesDatesAndNumbers)
         }
 }
 
-} // namespace
+} // namespace injection_test

@@ -6,7 +6,7 @@
 #include <functional>
 #include <gtest/gtest.h>
 
-namespace
+namespace input_validation_test
 {
 
 using mihost::Form;
@@ -200,4 +200,4 @@ TEST(PasswordHashes, AreNoPlainPasswordsAndNothingThatBreaksALine)
         EXPECT_NE(mihost::objectionToHash(wrong), std::nullopt) << wrong;
 }
 
-} // namespace
+} // namespace input_validation_test

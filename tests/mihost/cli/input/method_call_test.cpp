@@ -3,7 +3,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace method_call_test
 {
 
 using mihost::parseCall;
@@ -130,4 +130,4 @@ TEST(MethodCall, IsDangerousWhereItDeletesRoot)
     EXPECT_EQ(dangerOf(takeApart("UserAdd,UserName:CMPI_string:root")), "");
 }
 
-} // namespace
+} // namespace method_call_test

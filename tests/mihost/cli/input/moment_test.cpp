@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace moment_test
 {
 
 using namespace mihost;
@@ -47,4 +47,4 @@ TEST(Moment, IsNothingElse)
         EXPECT_EQ(moment(text), "none") << text;
 }
 
-} // namespace
+} // namespace moment_test

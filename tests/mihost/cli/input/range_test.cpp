@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace range_test
 {
 
 TEST(Between, AcceptsTheNumbersFromTheLeastToTheMost)
@@ -19,4 +19,4 @@ TEST(Between, RefusesOtherNumbersAndWhatIsNotANumber)
         EXPECT_EQ(check(text), "'" + std::string(text) + "' is not a number from 1 to 86400");
 }
 
-} // namespace
+} // namespace range_test

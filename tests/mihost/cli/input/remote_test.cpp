@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace remote_test
 {
 
 using namespace mihost;
@@ -76,4 +76,4 @@ TEST(RemoteCommand, GivesSshOneLineForTheShellThere)
               (Words{"ssh", "-T", "-n", "--", "box", "exec mihost tree"}));
 }
 
-} // namespace
+} // namespace remote_test

@@ -3,7 +3,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace shell_words_test
 {
 
 using mihost::holdsPassword;
@@ -78,4 +78,4 @@ TEST(ALineForTheHistory, HoldsNoneElsewhere)
         EXPECT_FALSE(holdsPassword(line)) << line;
 }
 
-} // namespace
+} // namespace shell_words_test

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace suggestion_test
 {
 
 using mihost::nearest;
@@ -52,4 +52,4 @@ TEST(Suggestion, AsksForANameThatIsNearAndListsAllOtherwise)
     EXPECT_EQ(suggestion("refresh", {}, "it has"), "it has none");
 }
 
-} // namespace
+} // namespace suggestion_test

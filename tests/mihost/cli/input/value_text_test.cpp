@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace value_text_test
 {
 
 using IC::PropertyValue;
@@ -113,4 +113,4 @@ TEST(ValueText, OfAMethodCallMayBeWhatDoesNothing)
     EXPECT_EQ(refusal(os, 74, "dummy"), "accepted");
 }
 
-} // namespace
+} // namespace value_text_test

@@ -7,7 +7,7 @@
 #include <gtest/gtest.h>
 #include <system_error>
 
-namespace
+namespace log_file_test
 {
 
 namespace fs = std::filesystem;
@@ -115,4 +115,4 @@ TEST_F(LogFileTest, CannotBeReadIfThereIsNone)
     EXPECT_THROW(LogFile(folder.path("none")), std::system_error);
 }
 
-} // namespace
+} // namespace log_file_test

@@ -6,7 +6,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace log_line_test
 {
 
 using namespace mihost;
@@ -114,4 +114,4 @@ TEST(LogFilter, RefusesAPatternThatIsNone)
     EXPECT_TRUE(filter.shows({1, "anything"}));
 }
 
-} // namespace
+} // namespace log_line_test

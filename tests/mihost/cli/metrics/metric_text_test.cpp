@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace metric_text_test
 {
 
 using mihost::metricText;
@@ -43,4 +43,4 @@ TEST(MetricText, WritesWholeNumbersInFull)
     EXPECT_NE(text.find("x 1795276425\nx 68719476736\n"), std::string::npos) << text;
 }
 
-} // namespace
+} // namespace metric_text_test

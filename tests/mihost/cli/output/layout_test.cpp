@@ -6,7 +6,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace layout_test
 {
 
 using mihost::Branch;
@@ -164,4 +164,4 @@ TEST(Styles, BecomeColoursThatEndWithTheLine)
     EXPECT_EQ(mihost::withColours(text), "a\x1b[31mb\x1b[0m\nc\x1b[0md");
 }
 
-} // namespace
+} // namespace layout_test

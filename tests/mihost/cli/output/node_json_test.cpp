@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace node_json_test
 {
 
 using IC::Number;
@@ -99,4 +99,4 @@ TEST(NodeAsJson, NeverShowsAMethodCallThatHoldsAPassword)
               "UserDel,UserName:CMPI_string:jdoe");
 }
 
-} // namespace
+} // namespace node_json_test

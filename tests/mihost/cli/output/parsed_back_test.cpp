@@ -8,7 +8,7 @@
 #include <gtest/gtest.h>
 #include <random>
 
-namespace
+namespace parsed_back_test
 {
 
 using mihost::Json;
@@ -96,4 +96,4 @@ TEST(Csv, IsReadBackAsItWasWritten)
         EXPECT_EQ(read[at].dump(), expected[at].dump());
 }
 
-} // namespace
+} // namespace parsed_back_test

@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace table_test
 {
 
 using mihost::Cell;
@@ -148,4 +148,4 @@ TEST(TableAsCsvOrValues, HasARowOnEachLineWhateverTheTextsHold)
     EXPECT_EQ(valueText(table), "1\\n2\\r\t3\\t4\\x1b\\xff\n");
 }
 
-} // namespace
+} // namespace table_test

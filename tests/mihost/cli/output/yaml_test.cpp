@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace yaml_test
 {
 
 using mihost::documentText;
@@ -80,4 +80,4 @@ TEST(JsonLines, HasALineForEachElementOrOneForTheDocument)
     EXPECT_EQ(documentText(Json::array(), Format::JsonText), "[]\n");
 }
 
-} // namespace
+} // namespace yaml_test

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace accelerator_loader_test
 {
 
 std::vector<mihost::Accelerator::Row> const rows{
@@ -25,4 +25,4 @@ TEST(AnswersJson, HasNullIfNoReasonIsKnown)
               R"({"command":"other","answered":0,"run":12,"reason":"unknown"}])");
 }
 
-} // namespace
+} // namespace accelerator_loader_test

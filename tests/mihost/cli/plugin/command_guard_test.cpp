@@ -5,7 +5,7 @@
 #include <gtest/gtest.h>
 #include <string>
 
-namespace
+namespace command_guard_test
 {
 
 using mihost::objectionToCommand;
@@ -99,4 +99,4 @@ TEST(CommandGuard, NamesNoPartOfALineThatMayHoldAPassword)
     EXPECT_EQ(reason, "it contains the shell metacharacter ';'");
 }
 
-} // namespace
+} // namespace command_guard_test

@@ -8,7 +8,7 @@
 #include <gtest/gtest.h>
 #include <sys/wait.h>
 
-namespace
+namespace command_tap_test
 {
 
 namespace tap = mihost::commandTap;
@@ -120,4 +120,4 @@ TEST_F(CommandTap, KeepsTheBeginningOfWhatItsOwnCommandsPrint)
     EXPECT_EQ(tap::outputOf(writing(many)).substr(BoundedText::limit + 1), marker);
 }
 
-} // namespace
+} // namespace command_tap_test

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace phase_counter_test
 {
 
 using mihost::LogMessage;
@@ -84,4 +84,4 @@ TEST(PhaseCounter, CountsNothingInAPhaseOfOneStep)
     EXPECT_EQ(counter.text(), "operating system");
 }
 
-} // namespace
+} // namespace phase_counter_test

@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace phases_test
 {
 
 using mihost::LogMessage;
@@ -115,4 +115,4 @@ TEST(SinkGroup, IsTheLogsSinkUntilItGoes)
     EXPECT_EQ(counter.count, 1);
 }
 
-} // namespace
+} // namespace phases_test

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace redaction_test
 {
 
 using mihost::RedactingSink;
@@ -61,4 +61,4 @@ TEST(RedactingSink, RemovesSecretsWhileTheyAreHidden)
     EXPECT_EQ(texts.all, (std::vector<std::string>{text, "outputBuffer: (hidden)", text}));
 }
 
-} // namespace
+} // namespace redaction_test

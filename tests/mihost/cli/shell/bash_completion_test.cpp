@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace bash_completion_test
 {
 
 using namespace mihost;
@@ -70,4 +70,4 @@ TEST(BashQuoting, IsReadBackAsItWas)
         }
 }
 
-} // namespace
+} // namespace bash_completion_test

@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace completion_test
 {
 
 using namespace mihost;
@@ -251,4 +251,4 @@ TEST(CompletionText, HasALineForEachCandidateWithItsNote)
     EXPECT_EQ(completionText({Completion::What::Folders, {}}), "folders\n");
 }
 
-} // namespace
+} // namespace completion_test

@@ -11,7 +11,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-namespace
+namespace history_file_test
 {
 
 namespace fs = std::filesystem;
@@ -134,4 +134,4 @@ TEST(HistoryPath, IsInTheStateDirectory)
     EXPECT_EQ(mihost::historyPath(), "");
 }
 
-} // namespace
+} // namespace history_file_test

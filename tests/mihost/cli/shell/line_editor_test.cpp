@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <gtest/gtest.h>
 
-namespace
+namespace line_editor_test
 {
 
 using mihost::commonStart;
@@ -38,4 +38,4 @@ TEST(WordsInColumns, AreNotMoreThanAPersonReads)
     EXPECT_EQ(text.substr(text.rfind('\n', text.size() - 2)), "\nand 2800 more\n");
 }
 
-} // namespace
+} // namespace line_editor_test

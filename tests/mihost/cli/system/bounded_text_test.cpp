@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace bounded_text_test
 {
 
 using mihost::BoundedText;
@@ -33,4 +33,4 @@ TEST(BoundedText, PutsTheCountOnALineOfItsOwn)
     EXPECT_EQ(text.text(), std::string(BoundedText::limit - 1, 'x') + "\n... (1 more bytes)\n");
 }
 
-} // namespace
+} // namespace bounded_text_test

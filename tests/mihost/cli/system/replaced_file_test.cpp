@@ -10,7 +10,7 @@
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 
-namespace
+namespace replaced_file_test
 {
 
 namespace fs = std::filesystem;
@@ -74,4 +74,4 @@ TEST(ReplacedFile, LeavesNothingIfItCannotBePutInPlace)
     EXPECT_EQ(entriesOf(folder.name()), 1U);
 }
 
-} // namespace
+} // namespace replaced_file_test

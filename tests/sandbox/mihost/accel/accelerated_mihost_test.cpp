@@ -11,7 +11,7 @@
 #include <nlohmann/json.hpp>
 #include <regex>
 
-namespace
+namespace accelerated_mihost_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -124,4 +124,4 @@ TEST(MihostAccel, IsNotMentionedWhenItIsTurnedOff)
     EXPECT_EQ(run.err.find("answered"), std::string::npos) << run.err;
 }
 
-} // namespace
+} // namespace accelerated_mihost_test

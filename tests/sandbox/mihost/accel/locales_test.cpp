@@ -9,7 +9,7 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 
-namespace
+namespace locales_test
 {
 
 void makeLocale(std::string const& name)
@@ -80,4 +80,4 @@ TEST(AccelZones, FollowTheSystemsOwnZoneFile)
     EXPECT_GE(bothways::countOf("date").answered, 3U);
 }
 
-} // namespace
+} // namespace locales_test

@@ -9,7 +9,7 @@
 #include <random>
 #include <sys/mount.h>
 
-namespace
+namespace modules_test
 {
 
 using bothways::answered;
@@ -260,4 +260,4 @@ TEST(AccelModinfo, SeesWhatChangedSinceTheLastTime)
     expectAgreement("one");
 }
 
-} // namespace
+} // namespace modules_test

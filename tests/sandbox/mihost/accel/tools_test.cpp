@@ -8,7 +8,7 @@
 #include <filesystem>
 #include <unistd.h>
 
-namespace
+namespace tools_test
 {
 
 using bothways::answered;
@@ -185,4 +185,4 @@ TEST_P(AccelBusybox, IsRunForADateInALocaleThatItDoesNotFollow)
     EXPECT_EQ(reasonOf("date"), "date prints something else than expected here");
 }
 
-} // namespace
+} // namespace tools_test

@@ -10,7 +10,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace account_views_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -144,4 +144,4 @@ TEST_F(AccountViews, SayWhatOnlyRootCanSee)
     EXPECT_TRUE(holds(outcome.err, "/etc/shadow cannot be read: Permission denied")) << outcome.err;
 }
 
-} // namespace
+} // namespace account_views_test

@@ -14,7 +14,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace commands_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -444,4 +444,4 @@ TEST(MihostPluginRun, TakesTheCodeSetOfTheLocaleWithoutLang)
     EXPECT_EQ(mihostRun({"get", "os", "code-set"}).out, "154 code-set  ANSI_X3.4-1968\n");
 }
 
-} // namespace
+} // namespace commands_test

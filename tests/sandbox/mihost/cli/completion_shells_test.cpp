@@ -9,7 +9,7 @@
 #include <gtest/gtest.h>
 #include <unistd.h>
 
-namespace
+namespace completion_shells_test
 {
 
 namespace fs = std::filesystem;
@@ -136,4 +136,4 @@ TEST_P(ShellCompletion, OffersNoNameThatIsNotPlainText)
 INSTANTIATE_TEST_SUITE_P(Shells, ShellCompletion, testing::ValuesIn(shells),
                          [](auto const& which) { return which.param.name; });
 
-} // namespace
+} // namespace completion_shells_test

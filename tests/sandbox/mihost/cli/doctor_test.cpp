@@ -10,7 +10,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace doctor_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -350,4 +350,4 @@ TEST_F(Doctor, MissesRootsPrivilegesWhereItHasNone)
     EXPECT_EQ(found, 3);
 }
 
-} // namespace
+} // namespace doctor_test

@@ -10,7 +10,7 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 
-namespace
+namespace examples_test
 {
 
 /** The lines that a help text shows as examples, without what they mean. */
@@ -102,4 +102,4 @@ INSTANTIATE_TEST_SUITE_P(All, Examples, testing::ValuesIn(mihost::commandTable()
                              return name;
                          });
 
-} // namespace
+} // namespace examples_test

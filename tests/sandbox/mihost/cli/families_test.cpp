@@ -11,7 +11,7 @@
 #include <gtest/gtest.h>
 #include <set>
 
-namespace
+namespace families_test
 {
 
 /** A command, what it ends with and a text that it says; each sees what those before it changed. */
@@ -160,4 +160,4 @@ TEST(Opensuse, HasNoOrdinaryAccountsIfLoginDefsIsBelowUsrOnly)
     });
 }
 
-} // namespace
+} // namespace families_test

@@ -9,7 +9,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace formats_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -198,4 +198,4 @@ TEST_F(MihostFormats, BecomesRecordsOnANarrowTerminal)
                             "full-name       Anna, \"A\"\r\n");
 }
 
-} // namespace
+} // namespace formats_test

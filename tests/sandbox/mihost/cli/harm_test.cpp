@@ -9,7 +9,7 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 
-namespace
+namespace harm_test
 {
 
 constexpr char hash[] = "$6$saltsalt$hashhashhash";
@@ -192,4 +192,4 @@ TEST_F(MihostMembership, OfNobodyIsLeftToThePlugin)
     EXPECT_TRUE(stands(outcome.err, "no such user")) << outcome.err;
 }
 
-} // namespace
+} // namespace harm_test

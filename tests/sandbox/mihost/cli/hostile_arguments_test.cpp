@@ -15,7 +15,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace hostile_arguments_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -378,4 +378,4 @@ TEST_F(InjectionInto, AnyModuleNameReachesNoShell)
     EXPECT_FALSE(std::filesystem::exists(mark));
 }
 
-} // namespace
+} // namespace hostile_arguments_test

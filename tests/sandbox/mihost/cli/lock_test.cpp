@@ -12,7 +12,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-namespace
+namespace lock_test
 {
 
 using mihost::ChangeLock;
@@ -131,4 +131,4 @@ TEST_F(MihostLock, CannotBeTakenWithoutRootAndSaysSo)
               "mihost: cannot lock /run/mihost.lock: Permission denied (changes need root)\n");
 }
 
-} // namespace
+} // namespace lock_test

@@ -14,7 +14,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace log_command_test
 {
 
 namespace fs = std::filesystem;
@@ -192,4 +192,4 @@ TEST_F(MihostLog, CannotBeFollowedIfThereIsNone)
                            "'mihost doctor')\n");
 }
 
-} // namespace
+} // namespace log_command_test

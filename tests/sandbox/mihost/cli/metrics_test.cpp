@@ -12,7 +12,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace metrics_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -188,4 +188,4 @@ TEST_F(Metrics, AreAListInJson)
     EXPECT_NE(std::find(all.begin(), all.end(), expected), all.end());
 }
 
-} // namespace
+} // namespace metrics_test

@@ -7,7 +7,7 @@
 #include <algorithm>
 #include <gtest/gtest.h>
 
-namespace
+namespace offered_words_test
 {
 
 using Words = std::vector<std::string>;
@@ -58,4 +58,4 @@ TEST(Completion, OffersTheModulesOfTheTree)
     EXPECT_EQ(offered("driver:"), shown(plugin, IC::nodeType::driver, "driver:"));
 }
 
-} // namespace
+} // namespace offered_words_test

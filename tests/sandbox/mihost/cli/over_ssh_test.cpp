@@ -12,7 +12,7 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 
-namespace
+namespace over_ssh_test
 {
 
 namespace fs = std::filesystem;
@@ -223,4 +223,4 @@ TEST_F(MihostRemote, IsNotForTheShellsLines)
     EXPECT_EQ(mihostRun({"shell"}, "--host box get os\n").code, 2);
 }
 
-} // namespace
+} // namespace over_ssh_test

@@ -8,7 +8,7 @@
 #include <cstdlib>
 #include <gtest/gtest.h>
 
-namespace
+namespace pager_test
 {
 
 constexpr char ctrlC[] = "\x03";
@@ -185,4 +185,4 @@ TEST_F(MihostPager, KeepsTheExitCodeOfTheCommand)
     EXPECT_TRUE(stands(refused.output(), "mihost: no column 'none'"));
 }
 
-} // namespace
+} // namespace pager_test

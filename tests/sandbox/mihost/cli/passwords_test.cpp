@@ -9,7 +9,7 @@
 #include <cstdlib>
 #include <gtest/gtest.h>
 
-namespace
+namespace passwords_test
 {
 
 constexpr char password[] = "geheim42";
@@ -154,4 +154,4 @@ TEST_F(Passwords, AreRefusedIfStandardInputHoldsNone)
     EXPECT_EQ(outcome.err, "mihost: Password: standard input holds no line\n");
 }
 
-} // namespace
+} // namespace passwords_test

@@ -11,7 +11,7 @@
 #include <gtest/gtest.h>
 #include <unistd.h>
 
-namespace
+namespace private_directory_test
 {
 
 namespace fs = std::filesystem;
@@ -166,4 +166,4 @@ TEST_F(MihostPrivateDirectory, IsRemovedWhereDescriptorsRunOut)
     }
 }
 
-} // namespace
+} // namespace private_directory_test

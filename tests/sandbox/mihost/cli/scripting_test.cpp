@@ -6,7 +6,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace scripting_test
 {
 
 /** Runs a line in bash, where $mihost is the program and a pipe fails if anything in it does. */
@@ -128,4 +128,4 @@ TEST(MihostJson, IsReadByJqWhateverTheSystemsTextsHold)
             << arguments;
 }
 
-} // namespace
+} // namespace scripting_test

@@ -7,7 +7,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace shell_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -146,4 +146,4 @@ TEST_F(MihostScript, DoesNotStartWhereThePluginCannotBeLoaded)
     EXPECT_EQ(outcome.out, "");
 }
 
-} // namespace
+} // namespace shell_test

@@ -7,7 +7,7 @@
 
 #include <gtest/gtest.h>
 
-namespace
+namespace standard_files_test
 {
 
 Outcome bash(std::string const& line)
@@ -74,4 +74,4 @@ TEST(MihostStandardFiles, WithoutAnyTheTraceIsStillWhole)
     expectJsonLinesOnly("/tmp/trace");
 }
 
-} // namespace
+} // namespace standard_files_test

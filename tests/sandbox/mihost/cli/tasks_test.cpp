@@ -11,7 +11,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace tasks_test
 {
 
 bool opens(std::string const& account, std::string const& password)
@@ -331,4 +331,4 @@ TEST_F(Tasks, ShowAnAccountThatIsNamedLikeATask)
     EXPECT_EQ(mihostRun({"group", "nosuch"}).code, 4);
 }
 
-} // namespace
+} // namespace tasks_test

@@ -16,7 +16,7 @@
 #include <gtest/gtest.h>
 #include <sstream>
 
-namespace
+namespace terminal_test
 {
 
 constexpr char prompt[] = "mihost> ";
@@ -455,4 +455,4 @@ TEST_F(MihostTerminal, SaysInTheShellsPromptThatItIsASandbox)
     EXPECT_EQ(run.end(), 0);
 }
 
-} // namespace
+} // namespace terminal_test

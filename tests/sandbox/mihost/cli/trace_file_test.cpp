@@ -11,7 +11,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-namespace
+namespace trace_file_test
 {
 
 constexpr char file[] = "/tmp/trace";
@@ -159,4 +159,4 @@ TEST(MihostTraceFile, GoesOnWhereAStandardStreamStands)
     EXPECT_EQ(modeOf("/tmp/log"), 0644U); // whose it is was settled by who opened it
 }
 
-} // namespace
+} // namespace trace_file_test

@@ -9,7 +9,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace unknown_values_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -128,4 +128,4 @@ TEST_F(UnknownValues, AreNoZerosThatTheShadowFileHolds)
     }
 }
 
-} // namespace
+} // namespace unknown_values_test

@@ -12,7 +12,7 @@
 #include <nlohmann/json.hpp>
 #include <unistd.h>
 
-namespace
+namespace verified_writes_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -337,4 +337,4 @@ TEST_F(VerifiedWrite, FailsWhereARefreshMissesAnAccount)
     EXPECT_EQ(outcome.err, "mihost: refresh: list of users is without 'long', not complete\n");
 }
 
-} // namespace
+} // namespace verified_writes_test

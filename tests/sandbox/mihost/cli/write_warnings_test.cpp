@@ -8,7 +8,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace write_warnings_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -134,4 +134,4 @@ TEST_F(WriteWarnings, PropertiesThatOnlyChangeTheTreeNameTheCommand)
               "mihost: refresh changed in memory only\n");
 }
 
-} // namespace
+} // namespace write_warnings_test

@@ -10,7 +10,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace
+namespace writes_test
 {
 
 using Json = nlohmann::ordered_json;
@@ -239,4 +239,4 @@ TEST(MihostPower, AsksTheMachineToRestartOrHaltWhenTold)
               (Lines{"/sbin/shutdown -r now", "/sbin/shutdown -h now"}));
 }
 
-} // namespace
+} // namespace writes_test

@@ -22,7 +22,7 @@
 #include <thread>
 #include <vector>
 
-namespace
+namespace concurrent_host_test
 {
 
 constexpr unsigned int writesEach = 20;
@@ -139,4 +139,4 @@ TEST_F(ConcurrentHost, ReadsNodesDuringRefreshesAndNewGroups)
     std::cout << reads << " reads, " << writes << " writes\n";
 }
 
-} // namespace
+} // namespace concurrent_host_test

@@ -10,7 +10,7 @@
 #include <thread>
 #include <unistd.h>
 
-namespace
+namespace mutex_test
 {
 
 using NQ::Mutex;
@@ -121,4 +121,4 @@ TEST(Mutex, LetsOneThreadInAtATime)
     EXPECT_EQ(counter, 20000);
 }
 
-} // namespace
+} // namespace mutex_test

@@ -19,7 +19,7 @@
 #include <thread>
 #include <vector>
 
-namespace
+namespace concurrent_refresh_test
 {
 
 constexpr unsigned int userCount = 4; // on the fixture machine
@@ -99,4 +99,4 @@ TEST_F(ConcurrentRefresh, LeavesOneCompleteSetOfNodes)
     EXPECT_EQ(*ids.rbegin(), lastId + 2 * refreshesEach * (userCount + groupCount));
 }
 
-} // namespace
+} // namespace concurrent_refresh_test

@@ -20,9 +20,9 @@ class Views(PageTest):
         self.listed('#users-table', 'anna', 'ben', 'carl', 'root')
         self.browser.click('#users-table th:nth-child(1) button')
         self.listed('#users-table', 'root', 'carl', 'ben', 'anna')
-        self.browser.click('#users-table th:nth-child(2) button')  # by number: 0 before 1000
+        self.browser.button('Warned days', '#users-table')  # by number: 7 before 14
         self.listed('#users-table', 'root', 'anna', 'ben', 'carl')
-        self.assertEqual(self.browser.attributes('#users-table th[aria-sort]:nth-child(2)', 'aria-sort'), ['ascending'])
+        self.assertEqual(self.browser.attributes('#users-table th:nth-child(7)', 'aria-sort')[0], 'ascending')
 
     def test_users_have_their_ageing(self):
         self.browser.open('users')

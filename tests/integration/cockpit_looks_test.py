@@ -92,6 +92,14 @@ class Looks(PageTest):
         self.assert_fits_every_width('delete')
         self.close_dialog()
 
+    def test_shows_the_chosen_tab_where_there_is_little_room(self):
+        self.browser.size(400, 900)
+        for name in ('doctor', 'tree'):
+            self.view(name)
+            tab = self.browser.run(f'return document.getElementById("tab-{name}").getBoundingClientRect()')
+            self.assertGreaterEqual(tab['left'], 0, name)
+            self.assertLessEqual(tab['right'], 400, name)
+
     def test_keeps_to_its_policy(self):
         for name in VIEWS:
             self.view(name)

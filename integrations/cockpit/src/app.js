@@ -93,6 +93,7 @@ export class App {
             this.buttons.get(name).tabIndex = chosen ? 0 : -1;
             this.buttons.get(name).parentElement.classList.toggle("pf-m-current", chosen);
         }
+        this.buttons.get(tab.name).scrollIntoView({ block: "nearest", inline: "nearest", behavior: "instant" });
         if (!this.views.has(tab.name)) {
             const view = new tab.View({
                 state: this.state,

@@ -9,7 +9,7 @@
 #include <gtest/gtest.h>
 #include <set>
 
-namespace
+namespace packages_test
 {
 
 namespace fs = std::filesystem;
@@ -66,4 +66,4 @@ TEST(Packages, HaveTheVersionOfTheProject)
         << version;
 }
 
-} // namespace
+} // namespace packages_test

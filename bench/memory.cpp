@@ -1,4 +1,4 @@
-// bench_memory [--quick]: what nodes take, and whether refreshes leave anything behind.
+// bench_memory [--quick]: what nodes take, and whether refreshes leak.
 //
 // In a copy of this machine, in one process: the heap and the resident memory of a plug-in with
 // 10,000 users and as many groups for each of its nodes; then, with 1,000 of both, memory after 10

@@ -27,7 +27,7 @@ namespace
 constexpr unsigned int small = 1000;
 constexpr unsigned int large = 10000;
 constexpr double growthLimit = 12;
-constexpr unsigned int firstId = 10000; // all ids have five digits, whatever the size
+constexpr unsigned int firstId = 10000; // all ids have five digits, at any size
 
 std::string nameOf(unsigned int user)
 {
@@ -83,7 +83,7 @@ private:
     FakeFiles files_;
 };
 
-/** The interface with all that stands above users and groups, and nothing else. */
+/** The interface with only the parents of users and groups. */
 class Interface : public IC::OsSwMI
 {
 public:
@@ -199,7 +199,7 @@ void printMemoryHere()
               << " kept" << std::endl;
 }
 
-/** Builds the user nodes in a process of their own, whose memory nothing else has touched. */
+/** Builds the user nodes in a new process with untouched memory. */
 void printPeakMemory()
 {
     pid_t const child = fork();

@@ -13,7 +13,7 @@ public:
     /**
      * The machine's network node name, as uname reports it.
      *
-     * @param name  left as it was on failure
+     * @param name  unchanged on failure
      * @return true on success
      */
     static bool getComputerName(std::string& name);

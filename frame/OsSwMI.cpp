@@ -61,7 +61,7 @@ unsigned int OsSwMI::takeUnnotedNodeId()
 
 MutableNode* OsSwMI::adopt(std::unique_ptr<MutableNode> node, std::vector<Node*>* kin)
 {
-    nodes_.push_back(nullptr); // may fail for want of memory, while the node is still ours
+    nodes_.push_back(nullptr); // may run out of memory; the node is still ours
     currentNode_ = node.release();
     nodes_.back() = currentNode_;
     if (kin)

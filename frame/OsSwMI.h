@@ -68,14 +68,14 @@ private:
     /** Takes the next node id and notes it in the node-id list. */
     MI_INTERNAL unsigned int takeNodeId();
 
-    /** Takes the next node id for a node of a rebuild, whose id is not noted. */
+    /** Takes the next node id for a rebuild, which does not note ids. */
     MI_INTERNAL unsigned int takeUnnotedNodeId();
 
     /**
-     * Makes a freshly made node the current one and hands it to the framework.
+     * Makes a new node the current one and passes it to the framework.
      *
-     * @param kin  gets it, too; has room for it
-     * @return the node, the framework's from here on
+     * @param kin  the list to append it to; has room for it
+     * @return the node, now owned by the framework
      */
     MI_INTERNAL MutableNode* adopt(std::unique_ptr<MutableNode> node,
                                    std::vector<Node*>* kin = nullptr);

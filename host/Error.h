@@ -23,7 +23,7 @@ public:
 
     /**
      * @param status  0 for success
-     * @param code    a finer code for the host; a management interface leaves it 0 or empty
+     * @param code    a detailed code for the host; a management interface leaves it 0 or empty
      * @param text    a reason for people to read, may be empty
      */
     Error(unsigned char status, Number const& code, std::string const& text);
@@ -36,7 +36,7 @@ public:
     /** The same status as an enumeration. */
     operator StatusType() const;
 
-    /** A form for log messages: the status and, where there is one, the text. */
+    /** A form for log messages: the status and the text, if any. */
     operator std::string() const;
 
     /** The reason alone, what a host reads; management interfaces do not call it. */

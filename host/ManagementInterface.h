@@ -72,15 +72,14 @@ public:
      * Informs the host of a node through the load callback, and lists the node unless it is in the
      * list already.
      *
-     * @return the callback's answer; on a non-zero status the node stays where it is
+     * @return the callback's answer; on a non-zero status the node stays in the list
      */
     virtual Error addNewNode(Node*& node);
 
-    /** Unlists the node, informs the host and deletes it. Status 1 for a node that is not listed.
-     */
+    /** Unlists the node, informs the host and deletes it. Status 1 for an unlisted node. */
     virtual Error deleteNode(Node* node);
 
-    /** Finds a node by the text of its id. Status 1 where there is none. */
+    /** Finds a node by the text of its id. Status 1 if there is none. */
     virtual Error getNode(std::string const& id, Node*& node);
 
 protected:
@@ -98,7 +97,7 @@ private:
     ManagementInterface& operator=(ManagementInterface const&) = delete;
 
     struct Own;
-    std::unique_ptr<Own> own_; // the host's own; its layout is no part of the contract
+    std::unique_ptr<Own> own_; // private to the host; not part of the contract
 };
 
 } // namespace IC

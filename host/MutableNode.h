@@ -54,7 +54,7 @@ public:
 
 private:
     struct Identity;
-    std::unique_ptr<Identity> identity_; // the host's own; its layout is no part of the contract
+    std::unique_ptr<Identity> identity_; // private to the host; not part of the contract
 };
 
 } // namespace IC

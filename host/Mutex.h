@@ -7,7 +7,7 @@ namespace NQ
 {
 
 /**
- * A lock between threads, not to be taken twice by the same thread.
+ * A lock between threads, not recursive.
  *
  * Contract: the plug-in makes room for objects of this class itself, so their size is fixed; see
  * OpenMI.h.
@@ -20,7 +20,7 @@ public:
 
     /**
      * @param timeout  milliseconds to wait; 0xFFFFFFFF and more wait without limit
-     * @return 0 once the lock is held, non-zero where the time ran out
+     * @return 0 once the lock is held, non-zero if the time ran out
      */
     int lock(unsigned long timeout);
 

@@ -29,8 +29,8 @@ public:
      * Reads one property.
      *
      * @param id     the property's number
-     * @param value  receives the value; left as it was on failure
-     * @return status 0, or non-zero where the property is not set
+     * @param value  receives the value; unchanged on failure
+     * @return status 0, or non-zero if the property is not set
      */
     virtual Error getProperty(unsigned int id, PropertyValue& value) const;
 
@@ -47,7 +47,7 @@ protected:
     Node();
 
     struct Store;
-    std::unique_ptr<Store> store_; // the host's own; its layout is no part of the contract
+    std::unique_ptr<Store> store_; // private to the host; not part of the contract
 
 private:
     Node(Node const&) = delete;

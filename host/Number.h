@@ -42,7 +42,7 @@ public:
     /** The number, 0 or 1 for a truth value, seconds since 1970 for a point in time. */
     long long getValue() const;
 
-    /** What a point in time was given beside its seconds; 0 for other kinds. */
+    /** The subSeconds of a point in time; 0 for other kinds. */
     unsigned short getSubSeconds() const;
 
 private:

@@ -101,7 +101,7 @@ constexpr unsigned int logState = 114;
 
 } // namespace property
 
-/** What a write of a number to a command property asks for; other numbers are only stored. */
+/** The numbers that act when written to a command property; others are only stored. */
 namespace command
 {
 

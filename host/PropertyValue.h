@@ -62,7 +62,7 @@ public:
 
     /**
      * The value as an unsigned number: the number itself, or that of a text that is wholly decimal;
-     * 0 for everything else and for what does not fit.
+     * 0 for everything else and for numbers that do not fit.
      */
     operator unsigned int() const;
 

@@ -10,7 +10,7 @@ namespace VXLog
 namespace level
 {
 
-constexpr int progress = 3000; // entries and exits of functions, and what goes on
+constexpr int progress = 3000; // entries and exits of functions, and progress
 constexpr int power = 4000;    // the machine is about to halt or to restart
 constexpr int error = 6000;
 
@@ -18,9 +18,9 @@ constexpr int error = 6000;
 
 /**
  * The host's log. Both operations take the same arguments and may be called from any thread; a
- * management interface calls first the one and then the other for each of its messages.
+ * management interface calls the first and then the second for each message.
  *
- * @param function  name of the function that speaks
+ * @param function  name of the function that logs
  * @param file      its source unit, such as "OsSwMI"
  * @param line      its source line
  * @param category  the unit's dotted category

@@ -13,7 +13,7 @@ std::string make_string(char const* text);
 std::string make_string(std::wstring const& text);
 
 /**
- * Wide text from UTF-8. A byte that is no UTF-8 survives the way to wide text and back unchanged.
+ * Wide text from UTF-8. A byte that is not UTF-8 survives the conversion and back unchanged.
  */
 std::wstring make_wstring(std::string const& text);
 

@@ -41,7 +41,7 @@ void OsSwMI::createGroupNodes(bool refresh)
     if (refresh)
         deleteNodes(groupNodes_, "Delete a group entry: ", scope);
     else
-        groupNodes_.clear(); // the framework's own from now on
+        groupNodes_.clear(); // owned by the framework from now on
     std::vector<groupInfo> groups;
     NQ::getGroupInfo(groups);
     auto const count = static_cast<unsigned int>(groups.size());

@@ -9,8 +9,8 @@ namespace IC
 /**
  * One of the newest lines of the system log; index 1 is the last line.
  *
- * Message and time are read from the log on every read, so they are those of a newer line once the
- * log has grown. The stored copies keep what stood there when the node was made.
+ * Every read reads message and time from the log, so once the log has grown they are those of a
+ * newer line. The stored copies are from the time the node was built.
  */
 class LogEntryNode : public MutableNode
 {

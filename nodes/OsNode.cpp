@@ -139,7 +139,7 @@ void OsSwMI::createOsNodes()
     store(info, storedFigures, *osNode_);
     store(info, localeFacts, *osNode_);
 
-    // Contract: one value serves all, so a figure that cannot be had stores the one before it.
+    // Contract: all share one value, so a figure that cannot be read stores the previous one.
     PropertyValue value = values::emptyValue();
     for (NumberFact const& figure : liveFigures) {
         osNode_->getProperty(figure.id, value);

@@ -14,11 +14,11 @@ public:
            unsigned int nodeType, unsigned int index);
     ~OsNode() override;
 
-    /** A live figure that cannot be had leaves value as it was and still succeeds. */
+    /** A live figure that cannot be read leaves value unchanged and still succeeds. */
     Error getProperty(unsigned int id, PropertyValue& value) const override;
 
     /**
-     * Stores the value, and acts on the system first where the property is a command: requested
+     * Stores the value, and acts on the system first if the property is a command: requested
      * state, clear log, refresh and create user. Only a create-user text that fails yields status
      * 1 and is not stored; an empty text is then stored in its place.
      */

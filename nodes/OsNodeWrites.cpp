@@ -26,7 +26,7 @@ void rebuildAccounts()
     pOsSwMI->createGroupNodes(true);
 }
 
-/** Carries out the method that the value calls for, if any. @return false where it failed */
+/** Runs the method that the value calls, if any. @return false if it failed */
 bool administer(NQ::OsInfo& info, PropertyValue const& value, NQ::log::Scope const& scope)
 {
     scope.progress("PropertyType::CreateUser: entry");

@@ -18,7 +18,7 @@ namespace
 
 using NQ::userInfo;
 
-/** For as long as it lives, user nodes take writes for the builder's own and only store them. */
+/** While it lives, user nodes only store what is written, as the builder needs. */
 class BuilderWrites
 {
 public:
@@ -104,7 +104,7 @@ void setPassword(std::string const& user, std::string const& password, NQ::log::
         scope.error("Cannot open process: ", line);
 }
 
-/** Does to the system what a write asks for; nothing, for most properties. */
+/** Carries out a write on the system; nothing for most properties. */
 void act(MutableNode const& node, unsigned int id, PropertyValue const& value,
          NQ::log::Scope const& scope)
 {
@@ -168,7 +168,7 @@ void OsSwMI::createUserNodes(bool refresh)
     if (refresh)
         deleteNodes(userNodes_, "Delete a user entry: ", scope);
     else
-        userNodes_.clear(); // the framework's own from now on
+        userNodes_.clear(); // owned by the framework from now on
     std::vector<userInfo> users;
     NQ::getUserInfo(users);
     userNodes_.reserve(users.size());

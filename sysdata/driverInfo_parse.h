@@ -14,7 +14,7 @@ class driverInfo;
 namespace MI_INTERNAL driverLines
 {
 
-/** Room for one line and its NUL. A longer line comes in pieces, each a line of its own. */
+/** Room for one line and its NUL. A longer line is read in pieces, each as a line. */
 constexpr std::size_t lineSize = 512;
 
 /**
@@ -24,7 +24,7 @@ constexpr std::size_t lineSize = 512;
  */
 bool findModule(char const* line, char (&module)[lineSize]);
 
-/** Contract: takes every module whose name begins with "Module" for the header as well. */
+/** Contract: treats every module whose name begins with "Module" as the header, too. */
 bool isHeader(char const* module);
 
 /** How often modinfo gave a fact of one module. */

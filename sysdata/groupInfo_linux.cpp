@@ -21,7 +21,7 @@ namespace
 
 log::Unit const unit{loggerGroupInfo, "groupInfo_linux"};
 
-/** The group database, read from its start; closed when the object goes. */
+/** The group database, read from its start; closed by the destructor. */
 class GroupDatabase
 {
 public:
@@ -64,7 +64,7 @@ public:
     SharedPrimaryMembers(SharedPrimaryMembers const&) = delete;
     SharedPrimaryMembers& operator=(SharedPrimaryMembers const&) = delete;
 
-    /** Those of a group, read from /etc/passwd unless this thread is in the middle of a listing. */
+    /** The primary members of a group, read from /etc/passwd unless this thread is listing. */
     static std::string of(unsigned int groupId)
     {
         bool const listing = owner.load() == std::this_thread::get_id();
@@ -73,7 +73,7 @@ public:
 
 private:
     static inline std::atomic<std::thread::id> owner;
-    static inline GROUP_INFO::PrimaryMembers const* shared = nullptr; // the owner's alone
+    static inline GROUP_INFO::PrimaryMembers const* shared = nullptr; // used only by the owner
 
     GROUP_INFO::PrimaryMembers const primary_;
 };

@@ -10,7 +10,7 @@ namespace NQ
 /** Logger category of this source unit. */
 extern std::string loggerGroupInfo;
 
-/** One local group as it stood when it was listed. */
+/** One local group as of its listing. */
 class groupInfo
 {
 public:

@@ -13,9 +13,9 @@ namespace
 {
 
 /**
- * The pieces of a members field, which tells whether NAME followed by "," stands in the field.
+ * The pieces of a members field, to find whether it contains NAME followed by ",".
  *
- * A name without "," does so where a piece ends in it. The pieces are kept back to front, so that
+ * It does if a piece ends in NAME. The pieces are kept back to front, so that
  * such a piece begins with the reversed name and is found by one lookup: searching the field itself
  * would cost a large group the square of its size.
  */

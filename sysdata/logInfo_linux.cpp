@@ -25,7 +25,7 @@ log::Unit const unit{loggerLogInfo, "logInfo_linux"};
 constexpr char countCommand[] = "wc -l /var/log/messages";
 constexpr char fetchCommand[] = "sed -n '%dp' /var/log/messages";
 
-/** One line of a command's output; empty where there is none. */
+/** One line of a command's output; empty if there is none. */
 void readLine(FILE* output, char (&line)[lineSize])
 {
     if (!std::fgets(line, sizeof line, output))
@@ -38,7 +38,7 @@ void readEntry(logInfo& log, unsigned int index, char (&entry)[lineSize])
     log.getLog(log.getMaxLine() - index + 1, entry, sizeof entry - 1);
 }
 
-/** Whether the index is one that can be read; if not, says so. */
+/** Whether the index can be read; logs if not. */
 bool isReadable(logInfo& log, unsigned int index, char const* label, log::Scope const& scope)
 {
     // Contract: counted once for the message, also when there will be none, and again to compare.

@@ -21,16 +21,16 @@ public:
     logInfo();
     ~logInfo();
 
-    /** Number of lines in the log; 0 where they cannot be counted. */
+    /** Number of lines in the log; 0 if they cannot be counted. */
     unsigned int getMaxLine();
 
     /**
-     * Copies one line without its leading blanks and its end; empty where there is no such line or
-     * it cannot be read.
+     * Copies one line without its leading blanks and its end; empty if there is no such line or it
+     * cannot be read.
      *
      * @param line    counted from 1 at the top of the file
      * @param buffer  takes length bytes, the rest after the text filled with NUL. Contract: a text
-     *                of that length or more is cut and gets no NUL
+     *                of that length or more is truncated and gets no NUL
      * @param length  at least 1
      */
     void getLog(unsigned int line, char* buffer, int length);
@@ -40,7 +40,7 @@ public:
      *
      * Contract: 0 and the index after the oldest entry are accepted and read as an empty message.
      *
-     * @param text  left as it was on failure
+     * @param text  unchanged on failure
      * @return whether there is such an entry
      */
     bool getData(std::string& text, unsigned int index);
@@ -48,7 +48,7 @@ public:
     /**
      * The time stamp of an entry, read as local time, in the current year or the one before.
      *
-     * @param time  seconds since 1970, 0 where the date cannot be had; left as it was on failure
+     * @param time  seconds since 1970, 0 if the date cannot be read; unchanged on failure
      * @return whether there is such an entry with a time stamp
      */
     bool getCreationTime(long& time, unsigned int index);

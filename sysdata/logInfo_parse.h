@@ -33,7 +33,7 @@ struct Today {
     char month[lineSize] = "";
 };
 
-/** The number that a line of wc begins with. @return false where there is none */
+/** The number that a line of wc begins with. @return false if there is none */
 bool findCount(char const* line, unsigned int& count);
 
 /** @return false unless the text begins with a time stamp */

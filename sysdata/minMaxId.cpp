@@ -87,7 +87,7 @@ unsigned int minMaxId::getMaxGroupId()
     return maxGroupId_;
 }
 
-// Both bounds are asked for with every id, 0 too.
+// Contract: both bounds are queried for every id, 0 included.
 bool isReportedUser(unsigned int uid)
 {
     unsigned int const lowest = minMaxId::Instance()->getMinUserId();

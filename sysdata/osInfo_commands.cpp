@@ -131,7 +131,7 @@ void removeExpiry(Arguments& arguments)
     arguments.insert(arguments.end(), {"-E", "-1"});
 }
 
-/** @return false where the account must not be deleted */
+/** @return false if the account must not be deleted */
 bool closeLists(Method const& method, Commands& commands)
 {
     if (method.kind == MethodKind::userAdd && !commands.expires)
@@ -168,7 +168,7 @@ bool beginsWithAny(std::string const& text, char const* const (&beginnings)[coun
 constexpr char const* agingNotices[] = {"Aging information changed",
                                         "Aging information not changed"};
 
-// userdel for an account without a crontab, and usermod for one that is as wanted already.
+// userdel for an account without a crontab, and usermod for one that is already in that state.
 constexpr char const* harmlessNotices[] = {"no crontab for", "usermod: no changes"};
 
 } // namespace

@@ -34,7 +34,7 @@ enum class MethodKind {
     plain
 };
 
-/** Where a method's program takes the account name. */
+/** The place of the account name in a method's command. */
 enum class AccountName { nowhere, amongOthers, last };
 
 struct Method {

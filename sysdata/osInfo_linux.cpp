@@ -54,7 +54,7 @@ void getRam(unsigned long Figures::*amount, char const* failure, unsigned int& o
     }
 }
 
-/** Zeros where the call fails. */
+/** Zeros if the call fails. */
 Figures figuresOrZero()
 {
     Figures figures{};
@@ -197,7 +197,7 @@ bool OsInfo::getUserCount(unsigned int& out)
     log::Scope const scope(facts);
     lckpwdf();
     setpwent();
-    minMaxId::Instance(); // read before the accounts, and also where there are none
+    minMaxId::Instance(); // read before the accounts, even if there are none
     unsigned int count = 0;
     if (files::File const file("/etc/passwd", "ro"); file.stream()) {
         passwd entry{};

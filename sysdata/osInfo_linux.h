@@ -34,7 +34,7 @@ public:
     bool getOSCreateUser(std::string& out);
 
     /**
-     * Memory in KiB, from sysinfo; 0 where sysinfo fails. Always true.
+     * Memory in KiB, from sysinfo; 0 if sysinfo fails. Always true.
      *
      * Contract: with a memory unit of 0 or of 2 to 1023 bytes nothing is written, so initialise
      * out.
@@ -42,14 +42,14 @@ public:
     bool getPhysicalMemorySize(unsigned int& out);
     bool getPhysicalMemoryFree(unsigned int& out);
 
-    /** Swap in the kernel's memory units, not scaled; 0 where sysinfo fails. Always true. */
+    /** Swap in the kernel's memory units, not scaled; 0 if sysinfo fails. Always true. */
     bool getSwapFileSize(unsigned int& out);
     bool getSwapFileFree(unsigned int& out);
 
-    /** Swap in use, in the kernel's memory units; 0 where sysinfo fails. Always true. */
+    /** Swap in use, in the kernel's memory units; 0 if sysinfo fails. Always true. */
     bool getSwapFileSizeStored(unsigned int& out);
 
-    /** Number of current processes, from sysinfo; 0 where it fails. Always true. */
+    /** Number of current processes, from sysinfo; 0 if it fails. Always true. */
     bool getProcessCount(unsigned int& out);
 
     /** Seconds since 1970, from the clock and sysinfo's uptime. */
@@ -67,7 +67,7 @@ public:
     /** First line of the file, as it is. */
     bool getOSReleaseName(std::string path, std::string& out);
 
-    /** The distribution's version; at most 9 characters where a command yields it. */
+    /** The distribution's version; at most 9 characters if read by a command. */
     bool getOSVersion(std::string& out);
 
     /** Major and minor number of a release file of key = value lines, joined by a point. */
@@ -103,10 +103,10 @@ public:
      * Carries out one administration method, given as text: its name, then items of name, type and
      * value joined by colons, all separated by commas.
      *
-     * Values become part of shell command lines as they are, apart from escaped blanks: whoever
-     * may call this may run anything.
+     * Values become part of shell command lines as they are, apart from escaped blanks: whoever may
+     * call this can run any command.
      *
-     * @return true where the method succeeded
+     * @return true if the method succeeded
      */
     bool setCreateUser(std::string methodAndParams);
 
@@ -116,10 +116,10 @@ public:
      * Takes a method-call text apart.
      *
      * A text or number parameter without a value ends the parsing without an error, and so does an
-     * item that is no parameter at all; what stood before it counts.
+     * item that is not a parameter; the ones before it count.
      *
-     * @param method  the first item; left as it was where there is none
-     * @param params  appended to, also when the text is rejected later on
+     * @param method  the first item; unchanged if there is none
+     * @param params  appended to, even if the text is rejected later
      * @return 1 for an unknown type or an unreadable date
      */
     int parseMethodAndParams(std::string methodAndParams, std::string& method,
@@ -138,16 +138,16 @@ public:
     /**
      * Runs one command line through the shell, standard error merged in. Silence is success.
      *
-     * @param program    path, with fixed options where there are any
+     * @param program    path, with fixed options if any
      * @param arguments  the program's own entry, then the arguments up to the first empty one;
      *                   they are joined by blanks and not quoted
-     * @param output     receives what was printed, NUL-terminated and cut to the 5000 bytes that it
-     *                   must have room for
-     * @return 1 where anything was printed or the command could not be run
+     * @param output     receives what was printed, NUL-terminated and truncated to the 5000 bytes
+     *                   of the buffer
+     * @return 1 if anything was printed or the command could not be run
      */
     int executeCommand(char* program, char** arguments, char* output);
 
-    /** Sets a password through passwd. Whether it was taken is not judged. */
+    /** Sets a password through passwd. Failures are not noticed. */
     void executePasswordEncryption(char* password, char* user);
 
     /**

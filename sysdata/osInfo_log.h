@@ -13,10 +13,10 @@ namespace NQ
 namespace MI_INTERNAL os
 {
 
-/** Contract: the facts speak under the frame's source name, which hosts filter on. */
+/** Contract: facts are logged under the frame's source name, which hosts filter on. */
 extern log::Unit const facts;
 
-/** The administration methods speak under their own source name. */
+/** Administration methods are logged under their own source name. */
 extern log::Unit const methods;
 
 /**

@@ -1,4 +1,4 @@
-// Group membership: usermod takes the whole list of a user's groups, so id is asked for it first.
+// Group membership: usermod sets the whole list of a user's groups, so id reads it first.
 
 #include "host/Methods.h"
 #include "sysdata/osInfo_commands.h"
@@ -49,7 +49,7 @@ int difference(char const* left, char const* right)
     return static_cast<unsigned char>(*left) - static_cast<unsigned char>(*right);
 }
 
-/** The name in the next parentheses; at moves behind it. */
+/** The name in the next parentheses; at moves after it. */
 std::optional<std::string> nextName(std::string const& text, std::string::size_type& at)
 {
     std::string::size_type const open = text.find('(', at);
@@ -60,7 +60,7 @@ std::optional<std::string> nextName(std::string const& text, std::string::size_t
     return text.substr(open + 1, close - open - 1);
 }
 
-/** Where the list of all groups begins; id translates the word before it. */
+/** The start of the list of all groups; id translates the word before it. */
 std::string::size_type listStart(std::string const& identity, std::string::size_type gid)
 {
     std::string::size_type const word = identity.find("groups", gid);

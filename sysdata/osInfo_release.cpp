@@ -22,7 +22,7 @@ using os::facts;
 #pragma GCC diagnostic push
 #pragma GCC diagnostic ignored "-Wmismatched-dealloc"
 #endif
-// Contract: fclose on a command's stream, so that the shell's exit status is never asked for.
+// Contract: fclose on a command's stream, so the shell's exit status is never read.
 void closeAsFile(FILE* pipe)
 {
     std::fclose(pipe);

@@ -14,7 +14,7 @@ namespace MI_INTERNAL os
 {
 
 struct Ran {
-    int status;         // 0 where the command was run and stayed silent
+    int status;         // 0 if the command ran and printed nothing
     std::string output; // up to the first NUL
 };
 
@@ -22,7 +22,7 @@ struct Ran {
 Ran run(OsInfo& info, Arguments arguments);
 
 /**
- * As run, and logs the output for the function whose scope it is.
+ * Like run, and logs the output for the function of the scope.
  *
  * @param params  those of the call, whose passwords are hidden
  */

@@ -25,7 +25,7 @@ constexpr std::size_t commandSize = 1024;
 constexpr std::size_t lineSize = 1024;
 constexpr std::size_t runnerSize = 5000;
 
-// The address is what matters: it tells executeLinCommand that the output's buffer is ours.
+// The address is what matters: executeLinCommand recognises our output buffer by it.
 char passwdProgram[] = "/usr/bin/passwd";
 
 // What error messages begin with; the command follows.
@@ -42,9 +42,9 @@ bool run(char const* command)
 /**
  * The chage command that sets an age in days, so that it is reached on a date.
  *
- * @param label   what chage calls the day that the age is counted from
+ * @param label   chage's label of the day that the age is counted from
  * @param option  chage's option for the age
- * @return false where a command line did not fit, which has been logged
+ * @return false if a command line did not fit, which has been logged
  */
 bool makeAgeCommand(userInfo& info, std::string const& date, std::string const& user, char* label,
                     char const* option, char (&command)[commandSize], log::Scope const& scope)
@@ -153,7 +153,7 @@ bool userInfo::executeLinCommand(char* command, char const* const* args, char* o
     }
     FILE* const pipe = popen(line.c_str(), "r");
     if (!pipe) {
-        // The line itself may hold what is not for the log.
+        // The line itself may contain secrets.
         scope.error("Cannot open process: ", command);
         return false;
     }

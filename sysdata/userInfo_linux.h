@@ -13,16 +13,16 @@ namespace USER_INFO
 /** Logger category of this source unit. */
 extern std::string loggerUserInfo;
 
-/** An ageing field that holds no value: 0xFFFFFFFF, also where unsigned long is wider. */
+/** An ageing field that holds no value: 0xFFFFFFFF, even if unsigned long is wider. */
 extern unsigned long const never;
 
 } // namespace USER_INFO
 
 /**
- * One local account as it stood when it was listed, and the operations that change accounts.
+ * One local account as of its listing, and the operations that change accounts.
  *
- * The operations act on the system by running its account tools and leave the record as it is; the
- * next listing shows their effect. A tool that runs and fails goes unnoticed.
+ * The operations act on the system by running its account tools and do not change the record; the
+ * next listing shows their effect. A tool's failure is not noticed.
  */
 class userInfo
 {
@@ -57,11 +57,11 @@ public:
     bool IsUserAcctDisabled();
     void setUserAcctDisabled(bool disabled);
 
-    /** Always false: nothing asks for a deletion through the record. */
+    /** Always false: no deletion goes through the record. */
     bool IsDelete();
 
     // Days. The setters take the shadow file's numbers; never, and all bits set in the full width
-    // of the argument, become the value that the system uses where the field is empty.
+    // of the argument, become the value that the system uses for an empty field.
 
     unsigned long getPwdMinDays();
 
@@ -107,13 +107,13 @@ public:
     /**
      * Deletes an account and its home directory with userdel.
      *
-     * @return 1, whatever happened
+     * @return always 1
      */
     int setDelete(std::string user);
 
     /**
      * Lets the account become inactive on a date, by setting with chage how many days after the
-     * password's expiry that is; 99999 where the date lies before the expiry.
+     * password's expiry that is; 99999 if the date is before the expiry.
      *
      * @param date  "YYYY-MM-DD 00:00:00"
      * @return whether chage could be started
@@ -122,7 +122,7 @@ public:
 
     /**
      * Lets the present password expire on a date, by setting its maximum age with chage; 99999
-     * days where the date lies before the last change.
+     * days if the date is before the last change.
      *
      * @param date  "YYYY-MM-DD 00:00:00"
      * @return whether chage could be started
@@ -137,11 +137,11 @@ public:
      * @param command    shell command line
      * @param label      what the date's line begins with
      * @param reference  seconds since 1970
-     * @return 99999 where the command cannot be started or the date lies after the reference
+     * @return 99999 if the command cannot be started or the date is after the reference
      */
     long getDays(char* command, char* label, long reference);
 
-    /** Asks passwd whether the account is locked; false where that cannot be found out. */
+    /** Asks passwd whether the account is locked; false if that cannot be determined. */
     bool findIsAcctDisabled(char* user);
 
     /**
@@ -177,7 +177,7 @@ private:
 /**
  * Lists the ordinary accounts and those with UID 0, in the order of /etc/passwd.
  *
- * The list is emptied first and stays empty where /etc/passwd cannot be read. Password and ageing
+ * The list is emptied first and stays empty if /etc/passwd cannot be read. Password and ageing
  * come from /etc/shadow as long as it names the accounts in the same order. The system's account
  * lock is held for the whole listing; callers that must not overlap serialise themselves.
  */

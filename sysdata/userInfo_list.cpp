@@ -1,4 +1,4 @@
-// The listing: who is reported, and what the account files say of them.
+// The listing: who is reported, and their account data.
 
 #include "host/make_string.h"
 #include "sysdata/minMaxId.h"
@@ -25,7 +25,7 @@ using USER_INFO::unit;
 
 constexpr std::size_t lineSize = 4096;
 
-/** The two account files, open and with the account lock held until the object goes. */
+/** The two account files, open and with the account lock held by the object. */
 class AccountFiles
 {
 public:
@@ -46,7 +46,7 @@ public:
     AccountFiles(AccountFiles const&) = delete;
     AccountFiles& operator=(AccountFiles const&) = delete;
 
-    /** @return null at the end, and where an entry cannot be read */
+    /** @return null at the end, and if an entry cannot be read */
     passwd const* nextAccount()
     {
         passwd* found = nullptr;
@@ -57,7 +57,7 @@ public:
     }
 
     /**
-     * The shadow entry of an account, looked for from where the last search stopped. Contract: an
+     * The shadow entry of an account, searched from where the last search stopped. Contract: an
      * account that is missing uses the file up, and no later one is found.
      */
     spwd const* findShadow(char const* name)
@@ -80,7 +80,7 @@ private:
     char ageingLine_[lineSize] = "";
 };
 
-/** An empty field comes as -1, in whatever width a long has. */
+/** An empty field is -1, in the width of a long. */
 unsigned long daysOf(long field)
 {
     return field == -1 ? USER_INFO::never : static_cast<unsigned long>(field);
@@ -124,7 +124,7 @@ void getUserInfo(std::vector<userInfo>& users)
         userInfo user(account->pw_name);
         user.setUserId(std::to_string(account->pw_uid));
         user.setGroupId(std::to_string(account->pw_gid));
-        // An entry that stands for a remote database has none of these texts.
+        // An entry for a remote database has none of these texts.
         user.setUserFullName(make_string(account->pw_gecos));
         user.setUserHomeDir(make_string(account->pw_dir));
         user.setUserScriptPath(make_string(account->pw_shell));

@@ -13,18 +13,18 @@ namespace NQ
 namespace USER_INFO
 {
 
-/** What a line has to say about what is looked for in it. */
+/** The result of searching a line. */
 enum class Scan { absent, valid, invalid };
 
 /**
- * The next line that holds "deny=", without its end; empty where there is none.
+ * The next line that contains "deny=", without its end; empty if there is none.
  *
- * @param rules  what follows that line from now on
+ * @param rules  then starts after that line
  */
 MI_INTERNAL std::string takeDenyLine(std::string_view& rules);
 
 /**
- * Reads the number behind the first "deny=" of a line of the login service's rules.
+ * Reads the number after the first "deny=" of a line of the login service's rules.
  *
  * @param deny  set only by a valid line
  */
@@ -39,11 +39,11 @@ struct MI_INTERNAL LabelledDate {
 /**
  * Reads a date of the form "LABEL : Mon DD, YYYY".
  *
- * Contract: what could be read of an invalid date replaces what stood in its place, and "never"
- * counts as a date in 2038 only where a day and a year follow it.
+ * Contract: the readable parts of an invalid date replace the old value, and "never" counts as a
+ * date in 2038 only if a day and a year follow it.
  *
  * @param line   NUL-terminated
- * @param label  may stand anywhere in a line that is not absent, and at its start in a valid one
+ * @param label  may be anywhere in a line that is not absent, at the start of a valid one
  * @param date   the date read so far
  */
 MI_INTERNAL Scan scanLabelledDate(char const* line, char const* label, LabelledDate& date);

@@ -7,7 +7,7 @@
 namespace NQ
 {
 
-/** Holds a mutex, waited for without limit, until it is released or the object goes. */
+/** Holds a mutex, waited for without limit, until it is released or the object is destroyed. */
 class MI_INTERNAL MutexLock
 {
 public:

@@ -13,7 +13,7 @@ namespace NQ
 extern std::string loggerMyProcess;
 
 /**
- * One read pipe to a shell command, closed when the object goes. Logs nothing.
+ * One read pipe to a shell command, closed by the destructor. Logs nothing.
  *
  * Holders of the object never close the stream themselves. No exit status is ever read.
  */
@@ -30,7 +30,7 @@ public:
      *
      * @param command  shell command line
      * @param mode     popen mode, always "r" here
-     * @return the stream, owned by this object, or null where the command could not be started
+     * @return the stream, owned by this object, or null if the command could not be started
      */
     FILE* mypopen(char const* command, char const* mode);
 

@@ -15,7 +15,7 @@ namespace NQ
 namespace MI_INTERNAL files
 {
 
-/** A stream opened with fopen, closed when the object goes. */
+/** A stream opened with fopen, closed by the destructor. */
 class File
 {
 public:
@@ -24,7 +24,7 @@ public:
     File(File const&) = delete;
     File& operator=(File const&) = delete;
 
-    /** Null where the file could not be opened. */
+    /** Null if the file could not be opened. */
     FILE* stream() const;
 
 private:
@@ -35,7 +35,7 @@ private:
 bool canOpen(char const* path);
 
 /**
- * Reads a stream to its end and keeps what the buffer holds, with a NUL behind it.
+ * Reads a stream to its end and keeps what the buffer holds, with a NUL after it.
  *
  * @param size  of the buffer, at least 1
  * @return whether there was anything to read

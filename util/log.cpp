@@ -8,7 +8,7 @@ namespace NQ::log
 namespace
 {
 
-/** Hands one message to the host, once through each of the logger's two operations. */
+/** Passes one message to the host, once through each of the logger's two operations. */
 void hand(Unit const& unit, int level, std::string const& message, char const* function, int line)
 {
     using VXLog::VXLogger;

@@ -31,14 +31,14 @@ struct Beginning {
     int line;
 };
 
-/** A message put together from texts and numbers, in a buffer of its own. */
+/** A message built from texts and numbers, in its own buffer. */
 template <class... Pieces> std::string assembled(Pieces const&... pieces)
 {
     VXLog::VXMessageBuffer buffer;
     return buffer.str((buffer << ... << pieces));
 }
 
-/** Logs a function's entry now and its exit on whatever path the function is left. */
+/** Logs a function's entry now and its exit on every path out of the function. */
 class Scope
 {
 public:
@@ -50,7 +50,7 @@ public:
     explicit Scope(Unit const& unit, Named named = {nullptr},
                    char const* function = __builtin_FUNCTION(), int line = __builtin_LINE());
 
-    /** The exit is lost when there is no memory for it. */
+    /** Without memory, the exit is not logged. */
     ~Scope();
 
     Scope(Scope const&) = delete;
@@ -86,7 +86,7 @@ private:
 void entry(Unit const& unit, char const* name, char const* function = __builtin_FUNCTION(),
            int line = __builtin_LINE());
 
-/** As entry, for a destructor: it is lost when there is no memory for it. */
+/** Like entry, for a destructor; not logged without memory. */
 void lastEntry(Unit const& unit, char const* name, char const* function = __builtin_FUNCTION(),
                int line = __builtin_LINE()) noexcept;
 

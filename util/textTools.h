@@ -25,7 +25,7 @@ void replaceAfterFirst(char* s, char from, char to);
 /**
  * Prints into a buffer of the given size, as snprintf does.
  *
- * @return false where the text does not fit; the buffer then holds its beginning
+ * @return false if the text does not fit; the buffer then holds its beginning
  */
 bool print(char* buffer, std::size_t size, char const* format, ...)
     __attribute__((format(printf, 3, 4)));

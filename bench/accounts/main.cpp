@@ -1,10 +1,10 @@
 // bench_accounts [--quick]: users and groups, at the start and on a refresh.
 //
 // In a copy of this machine with 10, 1,000 and 10,000 users, as many groups with one member and one
-// group that holds all users, run by turns
+// group that holds all users, run alternately
 //
 //   plug-in  accounts_host: what a start spends on users and groups, and what a refresh takes
-//   calls    accounts_calls: the C library's calls that a refresh consists of, and nothing else
+//   calls    accounts_calls: only the C library's calls of a refresh
 //   Python   list.py: lists the same with the modules pwd, spwd and grp, for its own time and for
 //            that of the whole program
 

@@ -11,7 +11,7 @@
 class Loopback
 {
 public:
-    /** The process stays in the network where it is. @throws std::system_error */
+    /** Keeps the process in its present network. @throws std::system_error */
     Loopback();
 
     /** Takes the process there; what it starts from now on reaches nobody outside. */

@@ -1,14 +1,14 @@
-// bench_peers [--quick]: other programs that tell facts of a machine, on the same machine.
+// bench_peers [--quick]: other programs that report facts of a machine, on the same machine.
 //
-// In a copy of this machine, into which their Debian packages are installed, so that nothing of
-// them stays. With 120 kernel modules and a log of 1,000 lines, run by turns with mihost, with and
-// without the accelerator, which always starts the plug-in as a whole:
+// In a copy of this machine, in which their Debian packages are installed and discarded. With 120
+// kernel modules and a log of 1,000 lines, run alternately with mihost, with and without the
+// accelerator, which always starts the plug-in as a whole:
 //
 //   with 10 users      facter, ansible's setup module, inxi, snmpwalk of the host resources (once
 //                      without and once with the start of its agent); mihost prints its whole tree
 //   with 10,000 users  userdbctl, getent; mihost lists users and groups
 //
-// snmpd runs in a network of its own, of which nothing stays either.
+// snmpd runs in its own network namespace.
 
 #include "TestPaths.h"
 #include "bench/peers/Loopback.h"
@@ -33,7 +33,7 @@ constexpr std::size_t quickRounds = 2;
 struct Peer {
     char const* name;
     std::string command;
-    char const* leavesOut; // of what the plug-in tells
+    char const* leavesOut; // of the plug-in's facts
 };
 
 /** Listens on the loopback alone, which by then is that of a network of its own. */
@@ -137,7 +137,7 @@ std::string mihostTelling(std::string const& options, std::string const& script)
     return "printf '" + script + "' | " MIHOST_FILE " " + options + " shell";
 }
 
-/** @param script  what mihost is asked, a command a line */
+/** @param script  the commands for mihost, one per line */
 void compare(std::vector<Peer> const& peers, int users, std::string const& script, bool quick)
 {
     madeUp::accounts(users);

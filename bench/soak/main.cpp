@@ -1,4 +1,4 @@
-// soak [SHARE]: long use of one plug-in, and what it leaves behind.
+// soak [SHARE]: long use of one plug-in, and what it leaks.
 //
 // In a copy of this machine with 1,000 users and as many groups, in one process:
 //
@@ -7,7 +7,7 @@
 //   lives       1,000 times loaded, initialised, unloaded and closed (on a machine with 10 users)
 //
 // For each it prints resident memory, open descriptors and children at 10, 50 and 100 percent of
-// the way; flat figures mean that nothing is lost. SHARE, a percentage, shortens all three. Exits 1
+// the way; flat figures mean no leak. SHARE, a percentage, shortens all three. Exits 1
 // when descriptors or children grew, or memory by more than 2 percent between 50 and 100.
 
 #include "host/Properties.h"
@@ -49,7 +49,7 @@ Figures figuresNow()
             children};
 }
 
-/** Accounts from 1000 on, each with a group of its own, and a short log. */
+/** Accounts from 1000 on, each with its own group, and a short log. */
 void makeMachine(int users)
 {
     std::string passwd = "root:x:0:0:root:/root:/bin/bash\n";

@@ -2,12 +2,11 @@
 // runs.
 //
 // In a copy of this machine with 120 kernel modules, 10 users and a log of 1,000, 100,000 and
-// 1,000,000 lines, run by turns
+// 1,000,000 lines, run alternately
 //
-//   bare         startup_commands: gives the very command lines of a start, in their order, to
-//                popen and reads what they print
-//   plug-in      startup_host: loads the plug-in and initialises it, from its start to its end
-//   accelerated  startup_host_fast: the same host, linked to the accelerator
+//   bare         startup_commands: passes the command lines of a start, in order, to popen and
+//   reads their output plug-in      startup_host: loads the plug-in and initialises it, from its
+//   start to its end accelerated  startup_host_fast: the same host, linked to the accelerator
 //   mihost       mihost get os: the first answer of the program, which uses the accelerator
 //
 // Prints for each log the time of each, from its start to its end, and the processor time that

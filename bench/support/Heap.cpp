@@ -1,4 +1,4 @@
-// Counts allocations by standing before the C library's.
+// Counts allocations by interposing the C library's.
 
 #include "bench/support/Heap.h"
 

@@ -8,8 +8,8 @@ namespace madeUp
 {
 
 /**
- * Users from 10000 on, each with a group of its own, and one group that holds all of them; beside
- * them only root.
+ * Users from 10000 on, each with its own group, and one group with all of them; otherwise only
+ * root.
  */
 void accounts(int users);
 

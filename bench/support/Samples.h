@@ -15,7 +15,7 @@ double median(Samples samples);
 /** "980 [971, 990]": the median and the two quartiles. */
 std::string shown(Samples const& samples, int digits = 0);
 
-/** The ratios of what was measured by turns, pair by pair. */
+/** The ratios of alternating measurements, pair by pair. */
 Samples ratios(Samples const& above, Samples const& below);
 
 /** Has everybody run once a round, in turning order. */

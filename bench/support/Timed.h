@@ -14,13 +14,13 @@ struct Timed {
     std::string output;
 };
 
-/** @throws std::runtime_error where it does not end with exit code 0 */
+/** @throws std::runtime_error if its exit code is not 0 */
 Timed timed(std::vector<std::string> const& arguments);
 
-/** Goes into a copy of this machine. @throws std::runtime_error where none can be had */
+/** Enters a copy of this machine. @throws std::runtime_error if none can be created */
 void enterCopy();
 
-/** A program's main: what stops the measurement goes to standard error. Takes --quick. */
+/** A program's main: errors go to standard error. Takes --quick. */
 int runBench(int argc, char* argv[], void (*measure)(bool quick));
 
 #endif

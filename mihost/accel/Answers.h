@@ -36,9 +36,9 @@ Answer wc(Operands const& operands);
 Answer sed(Operands const& operands);
 
 /**
- * date. Not every date follows the locale alike, so one of them runs first, and again in every
- * other hour or environment; its output is compared with what would have been answered. Within an
- * hour only digits of minutes and seconds change, which all of them print alike.
+ * date. Versions of date treat locales differently, so the real one runs first, and again in each
+ * new hour or environment, and its output is compared with the answer. Within an hour only the
+ * digits of minutes and seconds change, which all versions print the same.
  */
 Answer date(Operands const&);
 

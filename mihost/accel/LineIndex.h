@@ -14,7 +14,7 @@ namespace miaccel
 bool readAt(int file, char* buffer, std::uint64_t length, std::uint64_t offset);
 
 /**
- * Where the lines of a file are: how many line ends are before each block of the file.
+ * The positions of a file's lines: the number of line ends before each block.
  *
  * Finding a line reads one block of the file. Files are given by their descriptors.
  */
@@ -22,15 +22,15 @@ class LineIndex
 {
 public:
     static constexpr std::uint64_t block = 65'536;
-    /** So much of both ends of what is indexed is compared each time. */
+    /** The bytes at both ends of the indexed part that are compared each time. */
     static constexpr std::uint64_t edge = 16'384;
 
     /**
-     * Makes the index that of the file, reading what was added, or everything if it is another file
-     * or has changed in any other way.
+     * Updates the index: reads what was appended, or everything if the file is another one or
+     * changed in another way.
      *
      * @param now  the file's state, which was taken before
-     * @return false if the file cannot be read to the end that it had then
+     * @return false if the file cannot be read to its end at that time
      */
     bool update(int file, struct stat const& now);
 

@@ -17,7 +17,7 @@ FILE* openAnswer(char const* command, char const* mode) noexcept;
 /** A stream without a descriptor that reads the text, which it owns; null if none can be made. */
 FILE* openStream(std::string text);
 
-/** The popen and pclose that this library stands before. */
+/** The popen and pclose that this library interposes. */
 FILE* realPopen(char const* command, char const* mode);
 int realPclose(FILE* stream);
 

@@ -1,5 +1,5 @@
-// The plug-in calls popen and pclose by their ordinary names. The loader binds them to the
-// program's own, which stand before libc's.
+// The plug-in calls popen and pclose by their ordinary names. The loader binds them to this
+// program's, which interpose libc's.
 
 #include "mihost/cli/plugin/CommandTap.h"
 

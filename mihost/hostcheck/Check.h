@@ -32,7 +32,7 @@ Checks interfaceChecks(); // ManagementInterface: the node list and the load cal
 /** The first that is not empty; empty if all are. */
 std::string firstOf(std::initializer_list<std::string> explanations);
 
-/** Empty if both are equal, else what was found and what was expected. */
+/** Empty if both are equal, else the found and the expected value. */
 std::string equal(char const* what, long long found, long long expected);
 std::string equal(char const* what, std::string const& found, std::string const& expected);
 

@@ -65,8 +65,8 @@ private:
 } // namespace hostcheck
 
 /**
- * Returns 1, and no objects, to a host whose classes are not those of host/: it could call nothing
- * of them. Standard error has the reason, since nothing else can carry it.
+ * Returns 1, and no objects, to a host whose classes differ from those of host/: it could not use
+ * them. The only place for the reason is standard error.
  */
 extern "C" int OpenMI(IC::ManagementInterface** managementInterface, IC::Error** error)
 {

@@ -47,7 +47,7 @@ Error noteLoad(Node* const& node, void const* context)
     return {loads->answer, IC::Number(0U), loads->answer == 0 ? "" : "refused"};
 }
 
-/** An interface of its own for each check. */
+/** A separate interface for each check. */
 class TestInterface : public IC::ManagementInterface
 {
 public:

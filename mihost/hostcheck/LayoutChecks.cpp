@@ -57,7 +57,7 @@ std::string propertyValue()
     return firstOf({copiesWithin(text), copiesWithin(asNumber)});
 }
 
-/** A list's elements must stand as far apart for the host as for the plug-in. */
+/** A list's elements must have the same distance for host and plug-in. */
 std::string numbersInAList()
 {
     std::vector<IC::Number> const list = {IC::Number(1U), IC::Number(2U), IC::Number(3U)};

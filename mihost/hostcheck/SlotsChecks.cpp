@@ -21,7 +21,7 @@ namespace
 
 struct Slot {
     char const* name;
-    char const* symbol; // null where hosts need not export one
+    char const* symbol; // null if hosts need not export one
 };
 
 // A destructor takes two slots: for objects in place and for those made with new.

@@ -17,7 +17,7 @@ class Tap
 public:
     explicit Tap(std::size_t count);
 
-    /** Whether the file that was asked for could be opened, or none was asked for. */
+    /** Whether the requested file could be opened, or none was requested. */
     bool ready() const
     {
         return ready_;
@@ -39,7 +39,7 @@ private:
     void line(std::string const& text);
 
     bool ready_ = true;
-    std::unique_ptr<std::FILE, Close> out_; // null if nobody asked
+    std::unique_ptr<std::FILE, Close> out_; // null if not requested
 };
 
 } // namespace hostcheck

@@ -31,7 +31,7 @@ Error failure(std::string const& reason)
 struct [[gnu::visibility("hidden")]] ManagementInterface::Own
 {
     // Guards the node list, for one look or one change at a time, since different threads may
-    // rebuild nodes of different kinds at once. Nobody outside is called while it is held.
+    // rebuild nodes of different kinds at once. It is not held during calls to the outside.
     std::mutex listLock;
     mihost::NodeIndex index;
     AlertCallBack alertCallBack = nullptr;

@@ -7,7 +7,7 @@ namespace mihost
 
 void NodeIndex::catchUp(List const& list)
 {
-    if (indexed_ > list.size()) // somebody else took nodes out
+    if (indexed_ > list.size()) // nodes were removed by others
         reset();
     for (; indexed_ < list.size(); ++indexed_)
         if (list[indexed_])

@@ -14,10 +14,10 @@ namespace mihost
 {
 
 /**
- * Where each node is in the node list of an interface, which appends to the list on its own.
+ * The position of each node in the node list of an interface, which appends to the list itself.
  *
  * A removed node leaves a null pointer in the list. These gaps are closed once they outnumber the
- * nodes, so that a removal takes the same time however long the list is.
+ * nodes, so that a removal takes constant time.
  */
 class [[gnu::visibility("hidden")]] NodeIndex
 {
@@ -38,7 +38,7 @@ private:
     void closeGaps(List & list);
 
     std::unordered_map<IC::Node const*, std::size_t> positions_;
-    std::size_t indexed_ = 0; // entries of the list whose positions are known, gaps included
+    std::size_t indexed_ = 0; // indexed entries of the list, gaps included
 };
 
 } // namespace mihost

@@ -12,7 +12,7 @@ class Node;
 namespace mihost
 {
 
-/** One message as a plug-in handed it to the logger. Valid only during LogSink::write. */
+/** One message as passed to the logger. Valid only during LogSink::write. */
 struct LogMessage {
     enum class Operation { Log, Trace };
 
@@ -46,12 +46,12 @@ public:
 };
 
 /**
- * Sets where log messages go, null for nowhere. The sink stays the caller's and must outlive its
+ * Sets the sink of log messages, null for none. The caller owns the sink, which must outlive its
  * use. Set it while no plug-in code runs.
  */
 void setLogSink(LogSink* sink);
 
-/** Sets who is informed of nodes, null for nobody. Ownership and timing as for the sink. */
+/** Sets the observer of nodes, null for none. Ownership and timing as for the sink. */
 void setNodeObserver(NodeObserver* observer);
 
 NodeObserver* nodeObserver();

@@ -23,7 +23,7 @@ public:
     /** Adds the line end. */
     void write(std::string line);
 
-    /** Writes out what is buffered. @return the errno of the first failure, 0 for none */
+    /** Flushes the buffer. @return the errno of the first failure, 0 for none */
     int finish();
 
 private:
@@ -47,8 +47,8 @@ private:
 };
 
 /**
- * Every logger call, and every node that comes or goes, as a JSON object on a line of its own.
- * Written by hand, since this library needs nothing but the standard one.
+ * Every logger call, and every added or deleted node, as a JSON object on its own line. Written by
+ * hand, so that this library needs only the standard library.
  */
 class JsonLines : public LogSink, public NodeObserver
 {

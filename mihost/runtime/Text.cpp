@@ -10,7 +10,7 @@ namespace
 
 constexpr char hexDigits[] = "0123456789abcdef";
 
-/** What the first byte of a sequence says of the rest. */
+/** The length and range that the first byte of a sequence implies. */
 struct Lead {
     unsigned char mask;
     unsigned char pattern;
@@ -70,7 +70,7 @@ bool isCharacter(char32_t character, char32_t smallest)
     return character >= smallest && character <= 0x10FFFF && !surrogate;
 }
 
-/** Printable ASCII, which nobody here rewrites. */
+/** Printable ASCII, which is never rewritten. */
 bool isPlain(char byte)
 {
     return byte >= 0x20 && byte < 0x7F;

@@ -15,18 +15,18 @@ struct Utf8Piece {
     bool valid;         // false for a byte that is part of no character
 };
 
-/** The piece that the text begins with. Overlong forms and surrogates are no UTF-8. */
+/** The piece that the text begins with. Overlong forms and surrogates are not UTF-8. */
 Utf8Piece firstPiece(std::string_view text);
 
 /** The byte as \xNN. */
 std::string hexByte(unsigned char byte);
 
-/** The text with each byte that is no UTF-8 written as \xNN. */
+/** The text with each byte that is not UTF-8 written as \xNN. */
 std::string validUtf8(std::string_view text);
 
 /**
  * The text on one line and harmless to a terminal: control characters, characters that change the
- * direction of writing or break lines, and bytes that are no UTF-8 are written as escapes.
+ * direction of writing or break lines, and bytes that are not UTF-8 are written as escapes.
  */
 std::string printable(std::string_view text);
 

@@ -40,7 +40,7 @@ struct [[gnu::visibility("hidden")]] VXMessageBuffer::Stream
 {
     explicit Stream(std::string & text) : buffer(text), out(&buffer)
     {
-        out.imbue(std::locale::classic()); // plain digits, whatever the host's own locale groups
+        out.imbue(std::locale::classic()); // plain digits, regardless of the host's locale
     }
 
     AppendToString buffer;

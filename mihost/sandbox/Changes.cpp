@@ -67,7 +67,7 @@ private:
                (found->second.opaque || !S_ISDIR(found->second.status.st_mode));
     }
 
-    /** Those that may differ: written in one of the states, or hidden by only one of them. */
+    /** The files that may differ: written in one of the states, or hidden by only one of them. */
     std::set<std::string> paths() const
     {
         std::set<std::string> written;
@@ -113,7 +113,7 @@ private:
         return state;
     }
 
-    /** Empty for what is not there, none for what is not a text. */
+    /** Empty for a missing file, none for a file that is not text. */
     std::optional<std::string> textOf(std::optional<Found> const& found,
                                       std::string const& path) const
     {
@@ -134,7 +134,7 @@ private:
             return true;
         if (!old.written)
             return layerFiles::sameContent(layer_.machine, layer_.written, path);
-        // The old content is gone, but for texts.
+        // The old content is lost, except for texts.
         if (old.written->text && now.written && now.written->text)
             return old.written->text == now.written->text;
         return old.status.st_ino == now.status.st_ino &&

@@ -29,7 +29,7 @@ struct PathChange {
     std::optional<std::string> newText;
 };
 
-/** What was written in the copy of the machine so far, on every file system that is copied. */
+/** Everything written in the copy of the machine so far, on every copied file system. */
 class CopyState
 {
 public:

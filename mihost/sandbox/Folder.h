@@ -12,7 +12,7 @@ namespace mihost
 /**
  * The names in an open folder, in no order.
  *
- * @param path  what the folder is called in an error
+ * @param path  what the directory is called in an error
  * @throws std::system_error
  */
 std::vector<std::string> namesIn(Descriptor const& folder, std::string const& path);

@@ -17,7 +17,7 @@ namespace
 
 constexpr off_t longestText = 8'388'608;
 
-/** As the calls that take an open directory want it. */
+/** In the form for calls relative to an open directory. */
 std::string below(std::string const& path)
 {
     return path.empty() ? "." : path.substr(1);

@@ -9,8 +9,8 @@
 #include <sys/stat.h>
 
 /**
- * Files below an open directory, whose path begins with a slash and is taken from there. All throw
- * std::system_error for what cannot be read.
+ * Files below an open directory; their paths begin with a slash and are relative to it. All throw
+ * std::system_error for unreadable files.
  */
 namespace mihost::layerFiles
 {
@@ -35,7 +35,7 @@ bool isWhiteout(struct stat const& status);
 
 using Visit = std::function<void(std::string const& path, struct stat const& status)>;
 
-/** Visits all that is below a path, a directory before what is in it; "" is the open directory. */
+/** Visits everything below a path, a directory before its contents; "" is the open directory. */
 void walk(Descriptor const& root, std::string const& path, Visit const& visit);
 
 } // namespace mihost::layerFiles

@@ -11,15 +11,15 @@ namespace mihost
 
 /** One file system of the machine in its copy. Neither view can be written through. */
 struct Layer {
-    std::string path;   // where it is mounted, without a slash at the end; empty for the root
-    Descriptor machine; // the machine's own files, without what is mounted below
-    Descriptor written; // what was written in the copy, in the kernel's overlay format
+    std::string path;   // its mount point, without a slash at the end; empty for the root
+    Descriptor machine; // the machine's own files, without mounts below
+    Descriptor written; // the changes in the copy, in the kernel's overlay format
 };
 
 /** Opens a directory so that nothing can be written through it, even by way of /proc. */
 Descriptor openReadOnly(std::string const& path);
 
-/** Those of the copy that this process runs in. */
+/** The layers of the copy that this process runs in. */
 std::vector<Layer>& layers();
 
 } // namespace mihost

@@ -5,10 +5,10 @@ namespace mihost
 {
 
 /**
- * Makes the copy of the machine and makes it the calling process's root, working directory
- * included where the copy has it.
+ * Builds the copy of the machine and makes it the calling process's root. Keeps the working
+ * directory if the copy has it.
  *
- * To be called by the first process of its own mount and process namespaces.
+ * Call it from the first process of new mount and process namespaces.
  *
  * @throws std::system_error
  */

@@ -8,11 +8,10 @@ namespace mihost
 {
 
 /**
- * The mount points, other than / itself, whose content belongs into a copy of the machine: each
- * once, a parent before what is mounted below it. Those of the kernel's own file systems and those
- * below /proc, /sys, /dev and /run are left out.
+ * The mount points, other than / itself, to copy: each once, a parent before the mounts below it.
+ * The kernel's own file systems and mounts below /proc, /sys, /dev and /run are omitted.
  *
- * @param file  /proc/self/mountinfo, perhaps in another place
+ * @param file  /proc/self/mountinfo or a file in its format
  * @throws std::runtime_error if it cannot be read
  */
 std::vector<std::string> mountsToCopy(std::string const& file);

@@ -5,8 +5,8 @@ namespace mihost
 {
 
 /**
- * Turns on the only interface of a new network namespace, so that what runs there can talk to
- * itself. It stays off where CAP_NET_ADMIN is missing, as in a copy made inside another.
+ * Turns on the only interface of a new network namespace, so that its processes can reach each
+ * other. It stays off without CAP_NET_ADMIN, as in a copy inside another.
  */
 void startLoopback();
 

@@ -4,7 +4,7 @@
 namespace mihost
 {
 
-/** Puts a command that only says and notes what it was asked for in place of the power commands. */
+/** Replaces the power commands by one that only prints and records its arguments. */
 void replacePowerCommands();
 
 } // namespace mihost

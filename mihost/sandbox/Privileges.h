@@ -4,7 +4,7 @@
 namespace mihost
 {
 
-/** Takes away for good what reaches past a copy of the machine to the machine itself. */
+/** Drops for good the privileges that reach from the copy to the machine itself. */
 void dropMachinePrivileges();
 
 /**

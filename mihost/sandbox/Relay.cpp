@@ -40,7 +40,7 @@ int relayTo(pid_t child)
         siginfo_t info{};
         int const signal = sigwaitinfo(&set, &info);
         if (signal == SIGCHLD) {
-            // One signal may stand for several children.
+            // One signal may report several children.
             int status = 0;
             for (pid_t ended = 0; (ended = waitpid(-1, &status, WNOHANG)) > 0;)
                 if (ended == child)

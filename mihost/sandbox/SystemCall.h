@@ -8,7 +8,7 @@
 namespace mihost
 {
 
-/** Throws what errno says, headed by what was tried. */
+/** Throws errno as std::system_error, with the attempted action. */
 [[noreturn]] inline void failed(std::string const& what)
 {
     throw std::system_error(errno, std::generic_category(), what);

@@ -33,7 +33,7 @@ public:
         posix_spawn_file_actions_adddup2(&actions, output, STDOUT_FILENO);
         posix_spawnattr_t attributes;
         posix_spawnattr_init(&attributes);
-        // A group of its own, so that its commands are killed with it.
+        // Its own process group, so that its commands are killed with it.
         posix_spawnattr_setflags(&attributes, POSIX_SPAWN_SETPGROUP);
         if (posix_spawn(&pid_, arguments[0], &actions, &attributes, arguments.data(), environ) != 0)
             pid_ = -1;

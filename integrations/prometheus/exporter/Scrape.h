@@ -7,10 +7,9 @@
 #include <vector>
 
 /**
- * What a program prints on standard output, whatever its exit status.
+ * A program's standard output, regardless of its exit status.
  *
- * @return nothing if it cannot be started, prints nothing, or has not ended in time; it is killed
- * then
+ * @return nothing if it cannot be started, prints nothing, or runs too long and is killed
  */
 std::optional<std::string> scrape(std::vector<std::string> const& command,
                                   std::chrono::milliseconds timeLimit);

@@ -21,7 +21,7 @@ constexpr unsigned int fromShadow[] = {
     IC::property::inactiveTime, IC::property::lastPwdChange,  IC::property::passwordExpiration,
 };
 
-/** Those of which an entry that was read hardly leaves all at zero. */
+/** Properties that are hardly ever all zero if an entry was read. */
 constexpr unsigned int telling[] = {IC::property::pwdMaxDays, IC::property::pwdExpDays,
                                     IC::property::inactiveTime, IC::property::lastPwdChange};
 

@@ -9,8 +9,8 @@ namespace mihost
 {
 
 /**
- * Whether the plug-in found a user's entry in /etc/shadow, and why not. Where it found none, the
- * values that come from there are zero or empty, which is not what they are.
+ * Whether the plug-in found a user's entry in /etc/shadow, and why not. If not, the values from
+ * there are zero or empty, not the real ones.
  */
 class ShadowGap
 {

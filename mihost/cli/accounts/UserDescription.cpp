@@ -14,7 +14,7 @@ namespace
 /** Contract of the account tools: a password this old never expires. */
 constexpr long neverExpires = 10000;
 
-/** Nothing for an empty field, -1 and whatever is not a number. */
+/** Nothing for an empty field, -1 and texts that are not numbers. */
 std::optional<long> daysOf(std::string const& field)
 {
     long days = 0;

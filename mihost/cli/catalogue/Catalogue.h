@@ -17,7 +17,7 @@ namespace mihost
 
 using ValueKind = IC::PropertyValue::KindType;
 
-/** What a text must look like before it is handed to the plug-in. */
+/** The form that a text must have before it is passed to the plug-in. */
 enum class Form {
     Free,        // anything; the plug-in only stores it
     AccountName, // the name of a user or group
@@ -62,9 +62,9 @@ struct NodeKind {
     bool single;               // there is one node of this kind
     char const* listName;      // what the list command calls it; "" for single nodes
     unsigned int nameProperty; // what follows the colon in an address; 0 for none
-    unsigned int headline;     // the property that says most, shown beside a node; 0 for none
+    unsigned int headline;     // the most telling property, shown next to a node; 0 for none
     char const* meaning;
-    std::vector<std::string> columns; // of its table where none are chosen
+    std::vector<std::string> columns; // of its table if none are chosen
     std::vector<Property> properties; // in the order in which the plug-in sets them
 };
 
@@ -97,7 +97,7 @@ template <class Rows> std::vector<std::string> rowNames(Rows const& rows)
 
 NodeKind const* findKind(unsigned int nodeType);
 
-/** The kind that the list command calls so; null where there is none. */
+/** The kind with this name in the list command; null if there is none. */
 NodeKind const* findList(std::string_view name);
 
 Property const* findProperty(NodeKind const& kind, unsigned int id);

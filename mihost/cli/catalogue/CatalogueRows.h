@@ -129,7 +129,7 @@ inline KindRow one(unsigned int type, char const* name, char const* meaning)
     return {{type, name, name, true, "", 0, 0, meaning, {}, {}}};
 }
 
-/** A kind of which there are several nodes, told apart by a property. */
+/** A kind with several nodes, distinguished by a property. */
 inline KindRow several(unsigned int type, char const* name, unsigned int nameProperty,
                        char const* meaning)
 {

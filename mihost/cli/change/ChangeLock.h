@@ -9,16 +9,15 @@
 namespace mihost
 {
 
-/** Only root can make and open this file, so nobody else can hold the lock. */
+/** Only root can create and open this file, so nobody else can hold the lock. */
 constexpr char changeLockFile[] = "/run/mihost.lock";
 
-/** Makes sure that one mihost at a time changes the machine. Ends with the process at the latest.
- */
+/** Lets one mihost at a time change the machine. Released with the process at the latest. */
 class ChangeLock
 {
 public:
     struct Patience {
-        std::chrono::milliseconds silent; // after that, standard error says what is waited for
+        std::chrono::milliseconds silent; // after this time, standard error reports the wait
         std::chrono::milliseconds limit;
     };
 

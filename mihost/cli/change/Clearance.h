@@ -14,13 +14,12 @@ namespace mihost
 using MachineCheck = std::function<void()>;
 
 /**
- * Clears one change: checks it, asks for the user's consent if it is dangerous, and keeps every
- * other mihost from changing the machine for as long as the result lives.
+ * Clears one change: checks it, asks for the user's consent if it is dangerous, and keeps other
+ * mihosts from changing the machine while the result lives.
  *
- * The check runs under the lock; for a dangerous change also before, so that nobody is asked in
- * vain.
+ * The check runs under the lock; for a dangerous change also before the prompt.
  *
- * @param danger  what to ask about, such as "halt the machine"; empty for nothing
+ * @param danger  the question, such as "halt the machine"; empty for nothing
  * @throws Failure
  */
 ChangeLock clearChange(

@@ -23,7 +23,7 @@ constexpr char absent[] = "absent";
 constexpr char givenOne[] = "the given one";
 constexpr char otherOne[] = "another one";
 constexpr char never[] = "never";
-constexpr char unknown[] = "unknown"; // no record, or none that may be read
+constexpr char unknown[] = "unknown"; // no record, or an unreadable one
 
 /** A record that a method makes or removes. */
 struct RecordEffect {
@@ -101,7 +101,7 @@ std::string dayOfField(std::string const& field)
     return day ? dayText(*day) : never;
 }
 
-/** What the argument asks for, as fieldText writes what there is. */
+/** The requested value, in the form of fieldText. */
 std::string wantedText(Form form, std::string const& value)
 {
     switch (form) {
@@ -184,7 +184,7 @@ std::string dayOfSum(std::string const& user, std::vector<std::size_t> const& fi
 
 constexpr char logFile[] = "/var/log/messages";
 
-/** What tells a log from the same one after it was emptied, also if lines came since. */
+/** Distinguishes a log from the same log emptied, even if lines were added since. */
 struct LogState {
     off_t size;
     std::string start;

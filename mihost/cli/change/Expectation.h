@@ -11,20 +11,20 @@
 namespace mihost
 {
 
-/** Something that holds once a write has done what it was asked to do. */
+/** A condition that holds after a successful write. */
 struct Expectation {
     std::string subject;                 // such as "login shell of jdoe"
     std::string wanted;                  // such as "/bin/bash"
-    std::function<std::string()> actual; // what it is now, written as the wanted one
+    std::function<std::string()> actual; // the present value, in the form of the wanted one
 };
 
-/** What a method call asks for, in the account files. */
+/** The results of a method call in the account files. */
 std::vector<Expectation> expectationsOf(MethodCall const& call);
 
 /** That the account's shadow record holds this hash. */
 Expectation passwordHash(std::string const& user, std::string const& hash);
 
-/** That the account is gone. */
+/** The account does not exist. */
 Expectation deletedAccount(std::string const& user);
 
 /** That the account never expires. */

@@ -51,7 +51,7 @@ Json toJson(FileChange const& change)
     return document;
 }
 
-/** Such as "mode 0640 -> 0600"; only the later one where the file is new. */
+/** Such as "mode 0640 -> 0600"; only the later one if the file is new. */
 std::string textOf(char const* name, FileChange::Attribute const& attribute)
 {
     if (attribute.before.empty())
@@ -70,7 +70,7 @@ bool isBackup(std::string const& file)
     return file.back() == '-';
 }
 
-/** Such as " (directory, mode 0700, owner 1000:1000)"; empty where nothing is to be said. */
+/** Such as " (directory, mode 0700, owner 1000:1000)"; empty if there is nothing to say. */
 std::string remark(FileChange const& change)
 {
     std::vector<std::string> remarks;
@@ -115,7 +115,7 @@ void hideHash(std::string& record, std::size_t field)
             return;
     }
     std::size_t const length = std::min(record.find(':', start), record.size()) - start;
-    // What stands there for an account that has no password.
+    // The field of an account without a password.
     bool const isNone = record.substr(start, length).find_first_not_of("!*x") == std::string::npos;
     if (!isNone)
         record.replace(start, length, "(hidden)");
@@ -134,7 +134,7 @@ void writeText(std::vector<FileChange> const& changes, Output& out)
     for (FileChange const& change : changes) {
         out.line(change.change + " " + printable(change.file) + remark(change));
         if (isBackup(change.file))
-            continue; // it differs by more than was done, and nobody asked for it
+            continue; // more than this write differs, and it was not requested
         for (std::string const& line : change.removed)
             out.line("  - " + printable(line));
         for (std::string const& line : change.added)

@@ -11,7 +11,7 @@ namespace mihost
 enum class Expiry {
     Keep,      // it is passed along
     KeepAloud, // it is passed along, with a warning
-    Erase,     // it is erased, which is checked afterwards
+    Erase,     // it is erased, which is verified
     EraseAloud // it is erased, with a warning
 };
 

@@ -7,8 +7,8 @@ namespace mihost
 {
 
 /**
- * The write of a property that the catalogue knows, save that of a method call. It warns of what
- * the write does beside the expected, or that it changes nothing outside of the tree.
+ * The write of a catalogued property, except of a method call. It warns of side effects, or if
+ * nothing outside the tree changes.
  */
 Write propertyWrite(Session& session, IC::MutableNode& node, Property const& property,
                     IC::PropertyValue const& value);

@@ -30,7 +30,8 @@ constexpr AccountFile accountFiles[] = {
     {"/etc/gshadow", 1}, {"/etc/security/opasswd", 3},
 };
 
-/** The file itself or a copy that a tool keeps beside it, such as /etc/shadow- or /etc/shadow.org.
+/** The file itself or a backup that a tool keeps next to it, such as /etc/shadow- or
+ * /etc/shadow.org.
  */
 AccountFile const* accountFileOf(std::string_view path)
 {

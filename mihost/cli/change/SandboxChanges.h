@@ -12,9 +12,9 @@ namespace mihost
 {
 
 /**
- * The changes as they are shown: without lock files and without what is in the program's own
- * directory; with lines for texts. Where secrets are to be hidden, so are the hashes in account
- * files, and all lines of other files that not everybody may read.
+ * The changes to show: without lock files and the program's own directory, with lines for texts. If
+ * secrets are hidden, so are the hashes in account files, and all lines of other files that are not
+ * world-readable.
  *
  * @param ownDirectory  where the plug-in works; empty for none
  */

@@ -9,7 +9,7 @@
 
 /**
  * Checks a write to a user node against the machine. The plug-in gives the account's name or UID to
- * account tools as the node holds them, whoever bears that name by now.
+ * account tools as the node has them, even if another account has that name by now.
  */
 namespace mihost
 {

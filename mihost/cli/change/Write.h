@@ -24,10 +24,10 @@ struct Write {
 };
 
 /**
- * Gives the warnings, carries the write out, checks that what it asked for holds now, and reports
- * what changed. In a sandbox that includes the commands that were run and their output.
+ * Prints the warnings, carries out the write, verifies the result, and reports the changes. In a
+ * sandbox that includes the commands that were run and their output.
  *
- * A write that finds everything as it asked for succeeds and says that nothing changed.
+ * A write of the present state succeeds and reports that nothing changed.
  *
  * @throws Failure (PluginRefused) if the plug-in or a command refuses, or the change is not there
  */

@@ -13,7 +13,7 @@ namespace mihost
 /** What came of a write. */
 struct WriteReport {
     std::string error;               // why it failed; empty if it did not
-    bool changed;                    // the machine, in whatever way
+    bool changed;                    // the machine, in any way
     std::vector<FileChange> changes; // in a sandbox every file, elsewhere the account files
     std::vector<std::string> warnings;
     std::vector<commandTap::RunCommand> commands;

@@ -16,8 +16,8 @@ struct Settings {
 };
 
 /**
- * Runs one scenario in a process of its own, so that a crash, an abort, an exit or a hang of the
- * plug-in is a finding of the check that it came in. Checks after that one are skipped.
+ * Runs one scenario in its own process, so that a crash, an abort, an exit or a hang of the
+ * plug-in is a finding of the running check. Later checks are skipped.
  *
  * @return a result for each check of the scenario
  * @throws Failure (NoPlugin) if the plug-in cannot be loaded

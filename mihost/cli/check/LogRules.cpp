@@ -52,7 +52,7 @@ std::optional<std::string> nameBefore(std::string_view ending, std::string const
     return text.substr(0, text.size() - ending.size());
 }
 
-/** Whether an entry of this name may stand without an exit. */
+/** Whether an entry of this name may have no exit. */
 bool mayLackExit(std::string const& name)
 {
     if (name == "PropertyType::CreateUser")

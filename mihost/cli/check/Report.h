@@ -10,7 +10,7 @@ namespace mihost::checks
 
 using Results = std::vector<Result>;
 
-/** One line a check, what is wrong below it, and a sum at the end. */
+/** One line per check, findings below it, and a summary at the end. */
 void writeText(Results const& results, Output& out);
 
 /** The Test Anything Protocol, version 14. */

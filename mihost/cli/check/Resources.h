@@ -6,7 +6,7 @@
 namespace mihost::checks
 {
 
-/** What a process holds that a plug-in may leave behind. */
+/** The resources of a process that a plug-in may leak. */
 struct Resources {
     std::size_t descriptors; // open
     std::size_t threads;

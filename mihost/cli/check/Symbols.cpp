@@ -50,12 +50,12 @@ public:
     /** What one of its undefined names means: in the libraries that it brings, else in the host. */
     void const* find(std::string const& symbol) const
     {
-        // A host, or a sanitizer, may put a function of its own before that of a library.
+        // A host or a sanitizer may interpose a library's function.
         void const* const brought = dlsym(handle_, symbol.c_str());
         return brought ? brought : dlsym(RTLD_DEFAULT, symbol.c_str());
     }
 
-    /** The names of the libraries that it asks for. */
+    /** The names of the libraries that it needs. */
     std::set<std::string> needed() const
     {
         std::set<std::string> names;

@@ -17,7 +17,8 @@ struct Symbol {
     bool versioned; // an undefined one that names the version of a library, as those of libc do
 };
 
-/** What a loaded library defines and wants. @throws std::runtime_error if it is not loaded */
+/** The symbols that a loaded library defines and needs. @throws std::runtime_error if it is not
+ * loaded */
 std::vector<Symbol> symbolsOf(std::string const& file);
 
 /** Undefined names that no header of the contract declares, although something provides them. */

@@ -11,7 +11,7 @@ namespace mihost::checks
 
 class Subject;
 
-/** What is wrong, one line each; empty if nothing is. */
+/** The findings, one line each; empty if there are none. */
 using Findings = std::vector<std::string>;
 
 /** What a check has to say. */
@@ -33,7 +33,7 @@ struct Check {
     Verdict (*run)(Subject& subject);
 };
 
-/** Checks that follow one another on one plug-in, in a process of their own. */
+/** Consecutive checks of one plug-in, in their own process. */
 struct Scenario {
     char const* name;
     std::vector<Check> checks;

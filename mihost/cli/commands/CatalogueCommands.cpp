@@ -10,7 +10,7 @@ namespace mihost
 namespace
 {
 
-/** The rows of that name, or all where none is given. */
+/** The rows of that name, or all rows without a name. */
 template <class Rows> auto chosen(Rows const& rows, std::string const& name)
 {
     std::vector<typename Rows::value_type const*> result;

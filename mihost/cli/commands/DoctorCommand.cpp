@@ -69,7 +69,7 @@ void writeUnmet(Need const& need, Output& out)
             out.line(fmt::format("           {:<8} {}", row.heading, row.text));
 }
 
-/** What can be fixed comes last, where a person looks first. */
+/** What can be fixed comes last, next to the prompt. */
 void write(std::vector<Need> needs, Output& out)
 {
     auto const unmet = std::stable_partition(needs.begin(), needs.end(), isMet);

@@ -12,7 +12,7 @@ namespace mihost
 namespace
 {
 
-/** Values alone are the values of the properties; who wants more of them takes CSV. */
+/** The format value prints the properties' values alone; CSV has more columns. */
 Table rowsOf(NodeView const& view, Format format)
 {
     Selection selection;

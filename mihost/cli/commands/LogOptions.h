@@ -25,7 +25,7 @@ public:
     /** The first of the options that was given, such as "--since"; empty for none. */
     std::string firstGiven() const;
 
-    /** Takes those that hold for all commands. @throws Failure (BadUsage) if some do not fit */
+    /** Adopts the options of all commands. @throws Failure (BadUsage) if some conflict */
     void check(Options const& options);
 
     bool follows() const

@@ -9,8 +9,8 @@ namespace mihost
 {
 
 /**
- * Reads a password that is to be set: from a file, or else from standard input, which at a terminal
- * is asked twice.
+ * Reads a password that is to be set: from a file or from standard input, with two prompts at a
+ * terminal.
  *
  * @param file  empty or "-" for standard input
  * @throws Failure (BadUsage) if there is none, or if the two differ

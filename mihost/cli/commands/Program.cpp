@@ -22,7 +22,7 @@ namespace mihost
 namespace
 {
 
-/** Runs the step. What goes wrong becomes the exit code. */
+/** Runs the step and returns the exit code. */
 template <class Step> int guarded(Step step)
 {
     try {
@@ -39,7 +39,7 @@ template <class Step> int guarded(Step step)
     }
 }
 
-/** Somebody who types a password must not see it, which takes a terminal on both sides. */
+/** A typed password must not be echoed, which needs terminals on both sides. */
 RemoteTerminal remoteTerminal()
 {
     if (isatty(STDIN_FILENO) != 1)
@@ -76,7 +76,7 @@ int answer(std::string const& text)
 int runProgram(int argc, char** argv)
 {
     if (argc > 1 && std::string_view(argv[1]) == "__complete")
-        // What the completion scripts of shells run. Their words are no command line yet.
+        // Run by the shells' completion scripts. The words are not a complete command line.
         return answer(
             completionText(complete({argv + 2, argv + argc}, localNames, commandTable())));
     if (argc == 4 && std::string_view(argv[1]) == "__complete-bash")

@@ -8,10 +8,10 @@ namespace mihost
 {
 
 /**
- * Waits between two rounds of a command that goes on until Ctrl-C.
+ * Waits between two rounds of a command that runs until Ctrl-C.
  *
- * @return whether it goes on
- * @throws OutputClosed, which a command that has nothing to print would never notice
+ * @return whether to continue
+ * @throws OutputClosed, which a command without output would not notice
  */
 bool waitForNextRound(Output const& out, SignalWaiter& signals, double seconds);
 

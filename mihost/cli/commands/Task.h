@@ -24,7 +24,7 @@ struct Task {
     char const* method;
     std::vector<TaskValue> values; // the first is what the task is about
     Example examples[2];
-    char const* question = nullptr; // asked first, {} being the first value; null for none
+    char const* question = nullptr; // the prompt, {} being the first value; null for none
     bool isNothingWithoutOption = false;
 
     Task asking(char const* text) const

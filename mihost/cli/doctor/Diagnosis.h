@@ -19,8 +19,7 @@ struct Need {
 };
 
 /**
- * Looks at this machine. Changes nothing on it. What can only be told of something that is missing
- * itself is left out.
+ * Inspects this machine without changing it. Properties of missing things are omitted.
  */
 std::vector<Need> diagnose();
 

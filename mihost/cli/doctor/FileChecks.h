@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-/** What keeps the plug-in from reading the contents of files; nothing where all is as it wants. */
+/** Problems in files that keep the plug-in from reading them; nothing if there are none. */
 namespace mihost
 {
 
@@ -22,7 +22,7 @@ Problem problemOfGroups(std::string const& text);
 
 /**
  * Shadow entries are matched going forward only, so one that is missing, malformed or out of order
- * takes those of all accounts behind it away.
+ * hides those of all later accounts.
  *
  * @param accounts  names of the accounts that are shown, in the order of /etc/passwd
  * @param text      of /etc/shadow

@@ -13,8 +13,8 @@ namespace mihost
 
 /** A node as a person writes it: an id, or a kind and, for repeated kinds, a name. */
 struct Address {
-    NodeKind const* kind; // null where the node is given by id
-    unsigned int id;      // meaningful where kind is null
+    NodeKind const* kind; // null if the node is given by id
+    unsigned int id;      // valid only if kind is null
     std::string name;     // what follows the colon
 };
 
@@ -27,10 +27,10 @@ std::vector<IC::MutableNode*> nodesOf(IC::ManagementInterface& interface);
 /** @throws Failure (NotFound) naming the address */
 IC::MutableNode& findNode(std::vector<IC::MutableNode*> const& nodes, std::string const& address);
 
-/** A stored property as text; empty where the node has none of this id. */
+/** A stored property as text; empty if the node does not have it. */
 std::string storedText(IC::MutableNode const& node, unsigned int property);
 
-/** How a node is addressed: "os", "user:jdoe", or its id where its kind has no address. */
+/** How a node is addressed: "os", "user:jdoe", or its id if its kind has no address. */
 std::string addressOf(IC::MutableNode const& node);
 
 } // namespace mihost

@@ -11,7 +11,7 @@ namespace mihost
 
 CLI::Option* ChoiceTable::restrict(CLI::Option* option, Choices const& choices)
 {
-    constexpr std::size_t longestForm = 40; // what is longer leaves no room for the meaning
+    constexpr std::size_t longestForm = 40; // longer names leave no room for the meaning
     table_[option] = choices;
     std::string const form = fmt::format("{}", fmt::join(choices, "|"));
     option->type_name(form.size() <= longestForm ? form : "");

@@ -49,7 +49,7 @@ struct CommandRow {
     enum Traits : unsigned {
         Plain = 0,
         NotInShell = 1,   // not among the commands of the shell
-        AlwaysSandbox = 2 // runs in a sandbox, asked for or not
+        AlwaysSandbox = 2 // always runs in a sandbox
     };
 
     char const* name;

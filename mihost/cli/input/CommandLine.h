@@ -32,13 +32,13 @@ public:
         return options_;
     }
 
-    /** What is to run; null where help or the version was asked for. */
+    /** The command to run; null for help or the version. */
     Command* command() const
     {
         return command_;
     }
 
-    /** The help or the version that was asked for. */
+    /** The requested help or version. */
     std::string const& answer() const
     {
         return answer_;
@@ -59,7 +59,7 @@ private:
     CommandTable const& table_;
     Place place_;
     Options options_;
-    bool isFormatGiven_ = false; // on this line, rather than where the shell was started
+    bool isFormatGiven_ = false; // on this line, not when the shell was started
     ChoiceTable choices_;        // of the options that hold for all commands
     std::vector<Declared> all_;
     std::vector<std::string> helpWords_;

@@ -14,7 +14,7 @@ constexpr int lastYear = 9999;
 constexpr std::size_t dayLength = 10;
 constexpr long secondsPerDay = 24L * 60 * 60;
 
-/** Whether the text looks like the pattern, where 0 stands for any digit. */
+/** Whether the text matches the pattern, in which 0 means any digit. */
 bool looksLike(std::string_view text, std::string_view pattern)
 {
     if (text.size() != pattern.size())

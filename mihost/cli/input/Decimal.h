@@ -7,7 +7,7 @@
 namespace mihost
 {
 
-/** The number that the whole text is, in digits; nothing where it is none or does not fit. */
+/** The number that the whole text is, in digits; nothing if it is not one or does not fit. */
 std::optional<unsigned int> parseDecimal(std::string_view text);
 
 } // namespace mihost

@@ -12,7 +12,7 @@ namespace mihost
 enum class Format {
     TableText, // for people
     JsonText,  // a document on one line
-    JsonLines, // each element of a list on a line of its own
+    JsonLines, // each element of a list on its own line
     YamlText,
     CsvText,   // rows, below their headings
     BareValues // rows of bare values with tabs between them

@@ -8,8 +8,8 @@
 #include <string_view>
 
 /**
- * What may be handed to the plug-in. It puts texts into shell lines as they are, and runs those as
- * root; nothing but this stands between.
+ * Decides what may be passed to the plug-in, which puts texts into shell lines unchanged and runs
+ * these as root. There is no other protection.
  */
 namespace mihost
 {
@@ -21,15 +21,15 @@ constexpr std::string_view shellMetacharacters = "|&;<>()$`\\\"'*?[]#~=%!{}^";
 constexpr std::size_t longestArgument = 254;
 
 /**
- * Why a text may not be handed on as one value of a method call or as an account's name; nothing
- * where it may. The reason does not repeat passwords.
+ * Why a text must not be passed as a value of a method call or as an account's name; nothing if it
+ * may. The reason does not repeat passwords.
  *
- * Refused in every form: shell metacharacters, control characters, bytes that are no UTF-8, the
- * separators "," and ":", what is empty, and what is too long.
+ * Refused in every form: shell metacharacters, control characters, bytes that are not UTF-8, the
+ * separators "," and ":", empty texts and texts that are too long.
  */
 std::optional<std::string> objection(Form form, std::string_view text);
 
-/** Why a text is no password hash as the shadow file holds it; nothing where it is one. */
+/** Why a text is not a password hash for the shadow file; nothing if it is one. */
 std::optional<std::string> objectionToHash(std::string_view text);
 
 } // namespace mihost

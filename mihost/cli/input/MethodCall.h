@@ -21,16 +21,16 @@ struct MethodCall {
     std::vector<Argument> arguments; // in the order given; commands are built in it
 };
 
-/** What stands in a secret's place where it is to be asked for. */
+/** Given instead of a secret to have it read from a prompt. */
 constexpr char toBeAsked[] = "-";
 
-/** Asks for a value that is not to stand on the command line; gets the parameter's name. */
+/** Reads a value that is not on the command line; gets the parameter's name. */
 using AskSecret = std::function<std::string(std::string const& name)>;
 
 /**
- * A call from "NAME=VALUE" words. A password given as "-" is asked for.
+ * A call from "NAME=VALUE" words. A password given as "-" is read from a prompt.
  *
- * @throws Failure (BadUsage) naming what is wrong and what would be right
+ * @throws Failure (BadUsage) with what is wrong and what would be right
  */
 MethodCall parseCall(std::string const& method, std::vector<std::string> const& assignments,
                      AskSecret const& ask);
@@ -38,7 +38,7 @@ MethodCall parseCall(std::string const& method, std::vector<std::string> const& 
 /** A value for a parameter, as a person writes it. */
 struct Assignment {
     Parameter const* parameter;
-    std::string label; // what the person knows the parameter by
+    std::string label; // the user's name for the parameter
     std::string value;
 };
 
@@ -48,7 +48,7 @@ void checkAssignment(Assignment const& assignment);
 /** A call from values. @throws Failure (BadUsage) as above */
 MethodCall makeCall(Method const& method, std::vector<Assignment> const& assignments);
 
-/** Whether property 74 only stores this text, as the empty one and that of a fresh tree. */
+/** Whether property 74 only stores this text: the empty text and a new tree's. */
 bool callsNothing(std::string const& text);
 
 /** A call from its text form. @throws Failure (BadUsage) as above */
@@ -57,7 +57,7 @@ MethodCall takeApart(std::string const& text);
 /** The text form, as property 74 takes it. */
 std::string textOf(MethodCall const& call);
 
-/** The value of a parameter, empty where it is not given. */
+/** The value of a parameter, empty if it is not given. */
 std::string valueOf(MethodCall const& call, std::string_view name);
 
 /** What must be confirmed before it is carried out; empty for nothing. */

@@ -9,9 +9,9 @@
 namespace mihost
 {
 
-/** What stands before the command and holds for all of them. */
+/** The options before the command, common to all commands. */
 struct Options {
-    std::string host;    // where ssh is to run the command; empty for this machine
+    std::string host;    // the host for ssh; empty for this machine
     std::string plugin;  // empty for the one that was installed with this program
     std::string trace;   // empty for none, "-" for standard error
     std::string overlay; // a folder to lay over the sandbox; empty for none

@@ -7,7 +7,7 @@
 namespace mihost
 {
 
-/** A check for an option: what is wrong with a value that is not a number from least to most. */
+/** A check for an option: rejects values that are not numbers from least to most. */
 std::function<std::string(std::string const&)> between(double least, double most);
 
 } // namespace mihost

@@ -9,16 +9,16 @@ namespace mihost
 
 /** What ssh is to do with the terminal. */
 enum class RemoteTerminal {
-    Use,   // a terminal there, too: somebody sits here and sees the output
+    Use,   // a terminal there, too: a person here sees the output
     None,  // streams only
-    Ignore // nothing is read: what is typed here would be shown, a password too
+    Ignore // nothing is read, since typed text, including passwords, would be echoed
 };
 
 /**
- * The words without the one that names the host.
+ * The words without the option for the host.
  *
- * @param host  as the words were understood
- * @throws Failure (BadUsage) if it does not stand in the words by itself
+ * @param host  as parsed
+ * @throws Failure (BadUsage) if it is part of another word
  */
 std::vector<std::string> withoutHost(std::vector<std::string> const& words,
                                      std::string const& host);

@@ -26,7 +26,7 @@ public:
 
     std::vector<std::string> words;
     bool inWord = false;
-    char quote = '\0';    // ' or " within one; \ where the next byte is kept as it is
+    char quote = '\0';    // ' or " within one; \ if the next byte is taken literally
     char outer = '\0';    // the quote around a backslash
     std::size_t kept = 0; // bytes of the last word before the last break
 
@@ -93,7 +93,7 @@ private:
     bool inComment_ = false;
 };
 
-/** A word after which a password may be typed, rightly or not. */
+/** A word that a password may follow, correctly or not. */
 struct PasswordMark {
     std::string_view word;
     std::ptrdiff_t wordsBetween;
@@ -145,7 +145,7 @@ bool holdsPassword(std::string const& line)
 {
     std::vector<std::string> const words = Splitter(line).words;
     bool const inWord = std::any_of(words.begin(), words.end(), [](std::string const& word) {
-        return word.find("Password") != std::string::npos || // whatever the form of the call
+        return word.find("Password") != std::string::npos || // in any form of the call
                word.rfind("--password=", 0) == 0;
     });
     return inWord ||

@@ -9,7 +9,7 @@ namespace mihost
 
 /**
  * The words of a line, as a shell would split it: blanks separate, quotes and backslashes keep
- * together, # begins a comment where a word would begin. Nothing is expanded.
+ * together, # at the start of a word begins a comment. Nothing is expanded.
  *
  * @throws Failure (BadUsage) for a quote that does not end
  */
@@ -28,7 +28,7 @@ struct TypedLine {
 /** @param breaks  the characters after which the replaced part begins if they are not quoted */
 TypedLine typedLine(std::string const& line, std::string const& breaks);
 
-/** Whether a password stands in the line, so that it must not be kept. */
+/** Whether the line contains a password, so that it must not be kept. */
 bool holdsPassword(std::string const& line);
 
 /**

@@ -8,13 +8,13 @@
 namespace mihost
 {
 
-/** The name that differs from the word by no more than case or a slip or two; empty for none. */
+/** The name that differs from the word only by case or one or two typing errors; empty for none. */
 std::string nearest(std::string_view word, std::vector<std::string> const& names);
 
 /**
- * What to write instead of a word that is none of the names.
+ * What to write instead of a word that is not one of the names.
  *
- * @param lead  what stands before all of the names, such as "it has"
+ * @param lead  goes before the list of names, such as "use"
  */
 std::string suggestion(std::string_view word, std::vector<std::string> const& names,
                        std::string_view lead);

@@ -12,7 +12,7 @@ namespace mihost
 /**
  * A value of the property's kind, from what a person writes.
  *
- * @throws Failure (BadUsage) saying which form is right, or what may not stand in it
+ * @throws Failure (BadUsage) with the right form, or what it must not contain
  */
 IC::PropertyValue parseValue(Property const& property, std::string const& text);
 

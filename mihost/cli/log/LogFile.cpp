@@ -16,7 +16,7 @@ namespace
 {
 
 constexpr long long newestBytes = 1 << 18;   // hold the newest lines unless they are long
-constexpr std::size_t longestKept = 1 << 16; // bytes of a line; nobody shows more
+constexpr std::size_t longestKept = 1 << 16; // bytes of a line; more are never shown
 
 Descriptor openLog(std::string const& path)
 {
@@ -82,7 +82,7 @@ void LogFile::readTo(std::vector<std::string>& lines)
     }
 }
 
-/** What is in the old file was read; whoever writes the log may still have it open until then. */
+/** The old file has been read to its end; the writer may have kept it open until then. */
 bool LogFile::takeNewFile()
 {
     struct stat now {

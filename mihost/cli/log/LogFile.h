@@ -17,8 +17,8 @@ public:
     explicit LogFile(std::string const& path);
 
     /**
-     * The newest lines, the newest last; newLines() goes on after them. Lines that are longer than
-     * some KiB may be fewer than asked for.
+     * The newest lines, the newest last; newLines() continues after them. With lines of several KiB
+     * there may be fewer than requested.
      */
     std::vector<std::string> newestLines(std::size_t count);
 
@@ -34,7 +34,7 @@ private:
 
     std::string path_;
     Descriptor file_;
-    long long position_ = 0; // of what is read next, also in a log of more than 2 GiB
+    long long position_ = 0; // of the next read, also in a log of more than 2 GiB
     std::string unfinished_; // the start of a line that has not ended
 };
 

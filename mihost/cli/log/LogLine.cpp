@@ -18,7 +18,7 @@ constexpr char const* months[] = {"Jan", "Feb", "Mar", "Apr", "May", "Jun",
                                   "Jul", "Aug", "Sep", "Oct", "Nov", "Dec"};
 constexpr int december = 11;
 
-/** Contract: what is not a month counts as January. */
+/** Contract: anything but a month counts as January. */
 int monthOf(char const* name)
 {
     auto const found =

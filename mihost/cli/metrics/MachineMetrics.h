@@ -11,17 +11,17 @@
 namespace mihost
 {
 
-/** What the metrics are made of. */
+/** The data of the metrics. */
 struct MachineState {
     std::vector<NodeView> nodes; // with secrets
-    std::vector<Need> needs;     // those that depend on the machine alone
+    std::vector<Need> needs;     // the needs that depend only on the machine
     std::uint64_t swapSize = 0;  // bytes
     std::uint64_t swapFree = 0;  // bytes
     std::uint64_t logLines = 0;  // of the whole log
     std::time_t now = 0;
 };
 
-/** Whether series of single accounts are wanted: their names are then labels. */
+/** Whether to include series of single accounts, with their names as labels. */
 enum class AccountSeries { Leave, Make };
 
 std::vector<Metric> machineMetrics(MachineState const& state, AccountSeries accounts);

@@ -25,8 +25,8 @@ struct Metric {
 /**
  * The metrics as OpenMetrics text.
  *
- * It is the older text format of Prometheus as well, which node_exporter's textfile collector
- * reads: every metric is a gauge, and what only OpenMetrics knows is a comment there.
+ * This is also valid in Prometheus' older text format, which node_exporter's textfile collector
+ * reads: every metric is a gauge, and additions of OpenMetrics are comments there.
  */
 std::string metricText(std::vector<Metric> const& metrics);
 

@@ -29,7 +29,7 @@ std::string methodsDocument();
 /** A property's kind with its unit, such as "number, KiB". */
 std::string typeText(Property const& property);
 
-/** What is known of a property beyond its kind: "live, acts". */
+/** The traits of a property beyond its kind: "live, acts". */
 std::string traitsText(Property const& property);
 
 /** How a value of this form is written. */

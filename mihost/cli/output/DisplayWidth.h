@@ -9,7 +9,7 @@
 namespace mihost
 {
 
-/** While it lives, this thread's characters are those of UTF-8, whatever the user's code set. */
+/** While it lives, this thread uses UTF-8 instead of the user's code set. */
 class UnicodeCharacters
 {
 public:
@@ -26,7 +26,7 @@ private:
 std::size_t displayWidth(std::string_view text);
 
 /**
- * The text in lines of that width, broken at blanks where there are some, and never between a
+ * The text in lines of that width, broken at blanks if there are any, and never between a
  * letter and its accent.
  */
 std::vector<std::string> wrapped(std::string_view text, std::size_t width);

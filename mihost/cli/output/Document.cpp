@@ -6,7 +6,7 @@ namespace mihost
 namespace
 {
 
-/** Each element of a list on a line of its own. */
+/** Each element of a list on its own line. */
 std::string jsonLines(Json const& document)
 {
     if (!document.is_array())

@@ -9,7 +9,7 @@
 namespace mihost
 {
 
-// Keys stand in the order in which they are written.
+// Keys keep the order in which they are written.
 using Json = nlohmann::ordered_json;
 
 /** Bytes that are not UTF-8 become \xNN, so that the document is always valid. */

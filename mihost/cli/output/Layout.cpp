@@ -133,7 +133,7 @@ std::vector<std::size_t> widthsOf(Grid const& grid)
     return widths;
 }
 
-/** The column that is wrapped where it must be. */
+/** The column that wraps if needed. */
 std::optional<std::size_t> wrappingColumn(Grid const& grid)
 {
     for (std::size_t at = grid.columns.size(); at-- > 0;)
@@ -216,7 +216,7 @@ std::string wholeBranch(Branch const& branch, Room const& room, std::size_t inde
     if (!branch.details.rows.empty())
         for (std::string const& line : layOut(branch.details, room.indented(branchWidth)))
             lines.push_back(std::string(branchWidth, ' ') + line);
-    for (std::size_t at = 1; at < lines.size(); ++at) // libsmartcols draws no branches beside them
+    for (std::size_t at = 1; at < lines.size(); ++at) // libsmartcols draws no branches next to them
         lines[at].insert(0, indent, ' ');
     return joined(lines);
 }

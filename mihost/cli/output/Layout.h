@@ -18,7 +18,7 @@ struct Room {
     std::size_t columns = unlimited;
     bool hasUnicode = true; // for a tree's branches
 
-    /** What is left below an indentation. */
+    /** The width left after an indentation. */
     Room indented(std::size_t by) const
     {
         return {columns == unlimited ? unlimited : columns - (columns < by ? columns : by),
@@ -37,19 +37,19 @@ struct Grid {
 std::vector<std::string> layOut(Grid const& grid, Room const& room);
 
 /**
- * A table as rows below headings. Where they do not fit the room with 20 columns for the text that
- * wraps, each row becomes lines of heading and value, with an empty line between rows.
+ * A table as rows below headings. If the rows do not fit with 20 columns for the wrapping text,
+ * each row becomes lines of heading and value, with an empty line between rows.
  */
 std::vector<std::string> layOut(Table const& table, Room const& room, bool hasHeadings = true);
 
-/** Each row as lines of heading and value, whatever the room. */
+/** Each row as lines of heading and value, at any width. */
 std::vector<std::string> layOutRecords(Table const& table, Room const& room);
 
 /** One node of a tree. */
 struct Branch {
     std::size_t parent; // an index of the same list, smaller than its own; itself for none
     std::string name;   // printable and perhaps styled, never wrapped unless the room is too small
-    std::string text;   // beside the name
+    std::string text;   // next to the name
     Grid details;       // below the text
 };
 

@@ -18,7 +18,7 @@ struct PropertyStyle {
 };
 
 /**
- * Writes the nodes, all of one kind, as far as they are stored: as a table, or as documents like
+ * Writes the stored values of nodes of one kind: as a table, or as documents like
  * those of the tree, with the selected properties only if columns are selected. Columns are
  * properties by name or id, and the attributes id, index, status and description.
  *

@@ -16,7 +16,7 @@ namespace mihost
 namespace
 {
 
-/** What says most about a node beside its description; empty if nothing does. */
+/** The most telling value of a node besides its description; empty for none. */
 std::string headlineOf(IC::MutableNode const& node)
 {
     NodeKind const* const kind = findKind(node.getNodeType());

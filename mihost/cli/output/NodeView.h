@@ -11,7 +11,7 @@
 namespace mihost
 {
 
-/** One property of a node, with what the catalogue knows of it. */
+/** One property of a node and its catalogue row. */
 struct PropertyView {
     unsigned int id;
     Property const* row; // null for a property that the catalogue does not know
@@ -31,19 +31,19 @@ enum class Secrets { Hide, Show };
 /** Everything that is stored, and what answers only live. */
 NodeView storedView(IC::MutableNode const& node, Secrets secrets);
 
-/** Every property read anew through the node; those that do not answer are left out. */
+/** Reads every property through the node; omits those that fail. */
 NodeView liveView(IC::MutableNode const& node, Secrets secrets);
 
 /**
- * Reads the named properties anew through the node.
+ * Reads the named properties through the node.
  *
  * @param names  ids or catalogue names
- * @throws Failure for a property that the node does not have or that does not answer
+ * @throws Failure for a property that the node does not have or that cannot be read
  */
 NodeView liveView(IC::MutableNode const& node, std::vector<std::string> const& names,
                   Secrets secrets);
 
-/** A property by id or catalogue name. @throws Failure (NotFound) naming those that there are */
+/** A property by id or catalogue name. @throws Failure (NotFound) listing the existing ones */
 unsigned int propertyId(IC::MutableNode const& node, std::string const& name);
 
 /** The value as a person reads it, "-" if it is unknown; not yet safe for a terminal. */
@@ -52,7 +52,7 @@ std::string valueText(PropertyView const& property);
 /** The value for a table. */
 Cell cellOf(PropertyView const& property);
 
-/** The property's catalogue name, or its id where it has none. */
+/** The property's catalogue name, or its id if it has none. */
 std::string nameOf(PropertyView const& property);
 
 } // namespace mihost

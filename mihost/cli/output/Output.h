@@ -13,12 +13,12 @@
 namespace mihost
 {
 
-/** The reader of the output has gone: nothing is left to do, and nothing is wrong. */
+/** The reader closed the output: nothing is left to do, and this is not an error. */
 class OutputClosed : public std::exception
 {
 };
 
-/** Where a command's results go, in the format that the user wants. */
+/** The destination of a command's results, in the user's format. */
 class Output
 {
 public:
@@ -30,7 +30,7 @@ public:
         options_ = options;
     }
 
-    /** @throws OutputClosed, or Failure where the text cannot be written */
+    /** @throws OutputClosed, or Failure if the text cannot be written */
     void write(std::string_view text);
 
     /** Writes printable, perhaps styled text and a line end. */
@@ -53,8 +53,7 @@ public:
     /** Writes the table in the user's format, whichever it is. */
     void table(Table const& table);
 
-    /** Writes the table's one row in the user's format: an object, or lines of heading and value.
-     */
+    /** Writes the table's row in the user's format: an object, or lines of heading and value. */
     void record(Table const& table);
 
     /**
@@ -78,7 +77,7 @@ public:
         return fileno(stream_);
     }
 
-    /** What a line may take: the terminal's columns if it goes to one. */
+    /** The width of a line: the terminal's columns, if it is one. */
     Room room() const;
 
 private:
@@ -89,7 +88,7 @@ private:
     std::FILE* stream_;
     Options options_;
     std::size_t size_ = 0;
-    std::optional<std::string> held_; // what is written, until it is known whether it is paged
+    std::optional<std::string> held_; // buffered text, until it is known whether to page
 };
 
 } // namespace mihost

@@ -10,7 +10,7 @@ namespace mihost
 std::string pagerCommand();
 
 /**
- * Shows the text in the pager and waits for its end. The terminal is left as it was.
+ * Shows the text in the pager and waits for its end. Restores the terminal.
  *
  * @return false if there is no such pager; a warning says so, and nothing was shown
  */

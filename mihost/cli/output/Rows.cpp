@@ -12,7 +12,7 @@ namespace mihost
 namespace
 {
 
-/** A line of one empty field would be taken for no line. */
+/** A line with a single empty field would be read as no line. */
 std::string csvField(std::string const& text, bool isOnlyOne)
 {
     bool const isQuoted = text.find_first_of(",\"") != std::string::npos ||

@@ -9,7 +9,7 @@
 namespace mihost
 {
 
-/** Comma-separated values as in RFC 4180, but for the line ends, which are those of text files. */
+/** Comma-separated values as in RFC 4180, but with the line ends of text files. */
 std::string csvText(Table const& table, bool hasHeadings);
 
 /** A line for each row, with tabs between its values. */

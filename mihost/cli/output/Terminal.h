@@ -4,11 +4,11 @@
 #include <string>
 #include <string_view>
 
-/** The terminal that a person sits at, where there is one. */
+/** The user's terminal, if there is one. */
 namespace mihost::terminal
 {
 
-/** Columns of the terminal behind a descriptor; 0 where it is none. */
+/** Columns of a descriptor's terminal; 0 if it is not one. */
 unsigned int width(int descriptor);
 
 /** Whether the terminal shows all of the printable text above its last line. */
@@ -17,7 +17,7 @@ bool fits(int descriptor, std::string_view text);
 /** Whether the user's code set has the signs that lines and cuts are drawn with. */
 bool hasUnicode();
 
-/** Whether somebody can be asked: standard input is a terminal. */
+/** Whether prompts are possible: standard input is a terminal. */
 bool canAsk();
 
 /** Asks on standard error. @return whether the answer was yes */
@@ -26,7 +26,7 @@ bool confirm(std::string const& question);
 /**
  * Reads one line from standard input; at a terminal after a prompt and without showing it.
  *
- * @throws Failure where there is none
+ * @throws Failure if there is none
  */
 std::string readSecret(std::string const& prompt);
 

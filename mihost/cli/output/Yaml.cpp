@@ -78,14 +78,14 @@ std::string scalar(Json const& value)
 
 void append(std::string& to, Json const& value, std::size_t indent);
 
-/** What stands after a key or a dash. */
+/** The text after a key or a dash. */
 void appendValue(std::string& to, Json const& value, std::size_t indent, bool isOnSameLine)
 {
     if (!isNested(value)) {
         to += ' ' + scalar(value) + '\n';
         return;
     }
-    if (isOnSameLine) { // the first key stands beside the dash
+    if (isOnSameLine) { // the first key follows the dash
         std::string nested;
         append(nested, value, indent);
         to += ' ' + nested.substr(indent);

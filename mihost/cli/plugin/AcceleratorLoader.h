@@ -16,7 +16,7 @@ namespace mihost
 class Accelerator
 {
 public:
-    /** How often a command was asked for. */
+    /** How often a command was used. */
     struct Row {
         std::string command;
         unsigned long answered; // in the process
@@ -26,7 +26,7 @@ public:
 
     Accelerator();
 
-    /** In the library's order, without the commands that were never asked for. */
+    /** In the library's order, without the commands that were never used. */
     std::vector<Row> rows() const;
 
 private:

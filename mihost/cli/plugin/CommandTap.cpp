@@ -71,7 +71,7 @@ private:
     Descriptor before_;
 };
 
-/** Negative where no pipe can be had: then commands complain where this program does. */
+/** Negative without a pipe: commands then share this program's standard error. */
 int standardErrorEnd()
 {
     try {

@@ -6,10 +6,9 @@
 #include <vector>
 
 /**
- * The program's own popen and pclose stand in front of libc's (see popen.cpp). Commands that the
- * plug-in starts therefore pass through here. They run just as they are given, but with no standard
- * input, so that none can eat what is meant for this program, and with their standard error kept
- * apart from it.
+ * The program's own popen and pclose interpose libc's (see popen.cpp). Commands that the
+ * plug-in starts therefore pass through here. They run unchanged, but without standard input, so
+ * that none reads input meant for this program, and with a separate standard error.
  *
  * All state is the process's, as popen itself is. One thread at a time.
  */
@@ -34,11 +33,10 @@ struct Runner {
 
 void setRunner(Runner const& runner);
 
-/** Decides whether a command line may run. One that may not cannot be started: popen yields null.
- */
+/** Decides whether a command line may run. If not, popen returns null. */
 using Guard = bool(char const* line);
 
-/** @param guard  asked about each command line of the plug-in; null for nobody */
+/** @param guard  called for each command line of the plug-in; null for none */
 void setGuard(Guard* guard);
 
 /** How many commands were started so far. */
@@ -69,7 +67,7 @@ std::string takeStandardError();
  */
 std::string outputOf(std::string const& line);
 
-/** Where popen and pclose come in. */
+/** The entry points for popen and pclose. */
 std::FILE* open(char const* line, char const* mode);
 int close(std::FILE* stream);
 

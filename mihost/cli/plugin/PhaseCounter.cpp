@@ -18,7 +18,7 @@ struct PhaseSteps {
 
     std::string_view phase; // its function
     Message step;
-    Message total; // its text goes on with the number of steps; never logged if it has no function
+    Message total; // its text continues with the number of steps; never logged without a function
     unsigned int mostSteps = 0; // 0 for any number
 };
 

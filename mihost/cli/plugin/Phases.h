@@ -24,7 +24,7 @@ public:
     virtual void phaseEnds(Phase const& phase) = 0;
 };
 
-/** Tells phases from the plug-in's log messages. */
+/** Derives phases from the plug-in's log messages. */
 class PhaseSink : public LogSink
 {
 public:
@@ -37,7 +37,7 @@ private:
     std::vector<PhaseListener*> listeners_;
 };
 
-/** Hands messages on to several sinks, which stay the caller's; the log's sink while it has any. */
+/** Passes messages to several sinks, owned by the caller; is the log's sink while it has any. */
 class SinkGroup : public LogSink
 {
 public:

@@ -8,7 +8,7 @@
 namespace mihost
 {
 
-/** The plug-in's file as named, or where it stands beside this program, or its plain name. */
+/** The named plug-in file, or the one next to this program, or its plain name. */
 std::string pluginFile(std::string const& named);
 
 /** A loaded plug-in; going away, it unloads what it started and then the library. */
@@ -16,17 +16,17 @@ class Plugin
 {
 public:
     /**
-     * Loads the library and asks it for its interface.
+     * Loads the library and gets its interface.
      *
      * @param file  a path, or a plain name for the loader to look up
-     * @throws Failure naming the file and the reason
+     * @throws Failure with the file and the reason
      */
     explicit Plugin(std::string const& file);
     ~Plugin();
     Plugin(Plugin const&) = delete;
     Plugin& operator=(Plugin const&) = delete;
 
-    /** Builds the tree. @throws Failure where the plug-in says that it could not */
+    /** Builds the tree. @throws Failure if the plug-in fails */
     void start();
 
     bool started() const
@@ -38,7 +38,7 @@ public:
         return *interface_;
     }
 
-    /** The status object, as OpenMI handed it out; may be null. */
+    /** The status object from OpenMI; may be null. */
     IC::Error const* status() const
     {
         return status_;
@@ -47,7 +47,7 @@ public:
     /** The file that was loaded, as an absolute path. */
     std::string path() const;
 
-    /** The name that the library gives itself, empty where it gives none. */
+    /** The library's SONAME, empty if it has none. */
     std::string soname() const;
 
 private:

@@ -7,8 +7,8 @@ namespace mihost
 {
 
 /**
- * Shows on standard error, in one line that goes away, which phase the start-up is in and how far:
- * "groups 57/120". To be made only if that is a terminal.
+ * Shows on standard error, in one temporary line, the phase of the start-up and its progress:
+ * "groups 57/120". Create it only if that is a terminal.
  */
 class Progress : public PhaseListener, public LogSink
 {

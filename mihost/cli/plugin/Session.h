@@ -20,20 +20,20 @@
 namespace mihost
 {
 
-/** One run of the program: the options, the output, and the plug-in once a command wants it. */
+/** One run of the program: the options, the output, and the plug-in once a command needs it. */
 class Session
 {
 public:
     /**
-     * Opens the trace and, where that is asked for, goes on in a sandbox.
+     * Opens the trace and, if requested, enters a sandbox.
      *
-     * @throws Failure where one of them cannot be had
+     * @throws Failure if one of them fails
      */
     explicit Session(Options const& options);
     Session(Session const&) = delete;
     Session& operator=(Session const&) = delete;
 
-    /** Takes the plug-in down. @throws Failure where the trace or the output was cut short */
+    /** Unloads the plug-in. @throws Failure if the trace or the output is incomplete */
     void finish();
 
     Options const& options() const
@@ -67,7 +67,7 @@ public:
         return scripted_;
     }
 
-    /** @throws Failure where there is nobody to ask and nothing to read */
+    /** @throws Failure without a terminal and without input */
     std::string askSecret(std::string const& name) const;
     Output& out()
     {
@@ -88,10 +88,10 @@ public:
     IC::MutableNode& node(std::string const& address);
 
     /**
-     * Returns where that is to be done.
+     * Returns only if the user agreed.
      *
      * @param what  such as "delete the account jdoe"
-     * @throws Failure (BadUsage) where it is not, or where nobody can be asked
+     * @throws Failure (BadUsage) if not, or without a terminal
      */
     void confirm(std::string const& what) const;
 

@@ -42,7 +42,7 @@ Trace::~Trace()
 
 void Trace::finish()
 {
-    // A reader that went early has seen what it wanted.
+    // A reader may close the trace early.
     if (int const problem = writer_.finish(); problem != 0 && problem != EPIPE)
         throw cannotWriteTrace(file_, problem);
 }

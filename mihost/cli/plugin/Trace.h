@@ -15,7 +15,7 @@ class Trace
 public:
     /**
      * @param file  a path, or "-" for standard error
-     * @throws Failure where the file cannot be opened for writing
+     * @throws Failure if the file cannot be opened for writing
      */
     explicit Trace(std::string const& file);
     ~Trace();
@@ -28,7 +28,7 @@ public:
         return lines_;
     }
 
-    /** @throws Failure where something could not be written */
+    /** @throws Failure if something could not be written */
     void finish();
 
 private:

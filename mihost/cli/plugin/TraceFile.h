@@ -12,9 +12,9 @@ namespace mihost
 /**
  * Opens an empty file that only its owner can read, or the pipe, terminal or device at the path.
  *
- * A trace holds lines of a log that not everybody may read. A file that somebody else may have open
- * already is therefore replaced, and one that belongs to another user is refused. A path that leads
- * to standard output or standard error goes on where that stands.
+ * A trace contains lines of a log that may not be world-readable. A file that others may have open
+ * is therefore replaced, and one that belongs to another user is refused. A path to standard output
+ * or standard error appends at its position.
  *
  * @throws Failure if the file cannot be opened for writing
  */

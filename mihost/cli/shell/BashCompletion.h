@@ -21,9 +21,9 @@ std::string bashCompletionText(std::string const& line, std::string const& break
                                NodeNames const& names, CommandTable const& table);
 
 /**
- * The text as bash reads it back, whatever it holds but control characters.
+ * The text quoted for bash. It must not contain control characters.
  *
- * @param quote  the quote that is open before it and is closed after it, ' or "; NUL for none
+ * @param quote  the quote, ' or ", that is open before the text and closed after it; NUL for none
  */
 std::string quotedForBash(std::string_view text, char quote);
 

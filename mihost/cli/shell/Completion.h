@@ -13,8 +13,8 @@ namespace mihost
 {
 
 struct Candidate {
-    std::string word; // the whole word; one that ends in ':' or '=' goes on
-    std::string note; // what it means, on one line; may be empty
+    std::string word; // the whole word; incomplete if it ends in ':' or '='
+    std::string note; // its meaning, on one line; may be empty
 };
 
 struct Completion {
@@ -25,8 +25,8 @@ struct Completion {
 };
 
 /**
- * The names that nodes of a kind go by, such as login names for users. Those that hold control
- * characters or bytes that are no UTF-8 are not offered.
+ * The names of a kind's nodes, such as login names for users. Names that contain control characters
+ * or bytes that are not UTF-8 are not offered.
  */
 using NodeNames = std::function<std::vector<std::string>(NodeKind const& kind)>;
 
@@ -39,8 +39,8 @@ Completion complete(std::vector<std::string> const& words, NodeNames const& name
                     CommandLine::Place place = CommandLine::Place::Program);
 
 /**
- * What a shell's completion script reads: a line that says words, files or folders, then a line for
- * each candidate, with a tab and its note behind it where it has one.
+ * What a shell's completion script reads: a line with words, files or folders, then a line for each
+ * candidate, followed by a tab and its note if it has one.
  */
 std::string completionText(Completion const& completion);
 

@@ -17,7 +17,7 @@ namespace
 
 namespace fs = std::filesystem;
 
-constexpr std::size_t longestLine = 4096; // bytes; nobody types a longer one
+constexpr std::size_t longestLine = 4096; // bytes; typed lines are shorter
 constexpr off_t mostRead = 1 << 20;       // bytes at the end of the file
 
 bool isOwn(struct stat const& status)
@@ -115,7 +115,7 @@ void HistoryFile::add(std::string const& line) const
         writeAll(file.get(), line + '\n');
 }
 
-/** Either all of the lines are there afterwards or the file is as it was. */
+/** Either writes all lines or leaves the file unchanged. */
 void HistoryFile::replace(std::vector<std::string> const& lines) const
 {
     std::string const other = name_ + '.' + std::to_string(getpid());

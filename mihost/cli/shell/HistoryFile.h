@@ -12,16 +12,16 @@ namespace mihost
 constexpr int historyLimit = 1000; // lines
 
 /**
- * Where the shell's history is kept: $XDG_STATE_HOME/mihost/history, or .local/state/mihost/history
+ * The file of the shell's history: $XDG_STATE_HOME/mihost/history, or .local/state/mihost/history
  * in the home directory; empty if neither variable names a directory.
  */
 std::string historyPath();
 
 /**
- * Lines that were typed in earlier shells, oldest first, in a file that only its owner can read.
+ * The lines of earlier shells, oldest first, in a file that only its owner can read.
  *
- * There is no history, and nothing fails, if the file's directory cannot be made or belongs to
- * somebody else: sudo may keep another user's home directory.
+ * There is no history, and nothing fails, if the file's directory cannot be created or belongs to
+ * another user: sudo may keep another user's home directory.
  */
 class HistoryFile
 {

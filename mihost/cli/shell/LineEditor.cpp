@@ -48,8 +48,7 @@ LineEditor::LineEditor(char const* prompt, Completer completer)
     EditLine* const editor = editor_.get();
     el_set(editor, EL_CLIENTDATA, this);
     el_set(editor, EL_EDITOR, "emacs");
-    // With Ctrl-C the kernel would drop what is on its way to the terminal, perhaps the next
-    // prompt.
+    // On Ctrl-C the kernel would drop pending output to the terminal, perhaps the next prompt.
     el_set(editor, EL_SETTY, "-d", "+noflsh", nullptr);
     el_set(editor, EL_PROMPT, &LineEditor::promptOf);
     el_set(editor, EL_HIST, history, history_.get());
@@ -111,8 +110,8 @@ void LineEditor::obey(int signal)
         el_resize(editor_.get());
     if (signal != SIGTSTP)
         return;
-    // Stopped, the terminal is somebody else's; afterwards the line is to be seen again. From
-    // inside the sandbox, whose outer process stops as well, it is perhaps somebody else's already.
+    // While stopped, another process owns the terminal; afterwards the line is shown again. In the
+    // sandbox, whose outer process stops as well, another process may own it already.
     if (!inSandbox())
         el_set(editor_.get(), EL_PREP_TERM, 0);
     raise(SIGSTOP);
@@ -151,7 +150,7 @@ LineEditor::End LineEditor::read(std::string& line)
     signals_.emplace(std::vector<int>{SIGWINCH, SIGTSTP});
     interrupted_ = false;
     interrupts::setTerminalToRestore(&settings_);
-    // It would show the prompt first; what is typed between the two would be taken amiss.
+    // It would show the prompt first; text typed in between would be misread.
     el_set(editor_.get(), EL_PREP_TERM, 1);
     if (ioctl(STDIN_FILENO, FIONREAD, &typedBefore_) != 0)
         typedBefore_ = 0;

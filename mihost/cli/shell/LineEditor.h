@@ -19,7 +19,7 @@ namespace mihost
 class LineEditor
 {
 public:
-    /** What the word that a line ends in may become; each goes on where it ends in ':' or '='. */
+    /** The completions of the last word of a line; those ending in ':' or '=' are incomplete. */
     using Completer = std::function<std::vector<std::string>(std::string const& line)>;
 
     enum class End { Line, Interrupted, Finished };

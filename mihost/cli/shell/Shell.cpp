@@ -17,7 +17,7 @@ namespace mihost
 namespace
 {
 
-/** Words of the shell itself, beside the commands. */
+/** The shell's own words, in addition to the commands. */
 constexpr char const* ownWords[] = {"exit", "quit"};
 
 bool isExit(std::vector<std::string> const& words)
@@ -81,7 +81,7 @@ void Shell::runScript(std::istream& script, bool keepGoing)
         } catch (Failure const& failure) {
             Failure const numbered(failure.code(),
                                    fmt::format("line {}: {}", number, failure.what()));
-            // A command has a line of its own also where it has no result.
+            // A command prints a line even without a result.
             if (session_.options().json && session_.out().size() == before)
                 tellAsJson(numbered);
             if (!keepGoing)

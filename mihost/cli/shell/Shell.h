@@ -21,10 +21,10 @@ public:
     void runInteractively();
 
     /**
-     * A script. Lines that fail are told with their number.
+     * Runs a script. Failed lines are reported with their number.
      *
-     * @param keepGoing  whether the script goes on behind a line that fails
-     * @throws Failure of the first line that fails, unless it is to go on
+     * @param keepGoing  whether the script continues after a failed line
+     * @throws Failure of the first failed line, unless it continues
      */
     void runScript(std::istream& script, bool keepGoing);
 

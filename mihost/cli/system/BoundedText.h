@@ -17,8 +17,7 @@ public:
 
     void append(std::string_view part);
 
-    /** What was kept, and after it, on a line of its own, "... (N more bytes)" if there was more.
-     */
+    /** The kept text, and on a last line "... (N more bytes)" if there was more. */
     std::string text() const;
 
 private:

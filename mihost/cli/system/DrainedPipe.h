@@ -11,11 +11,11 @@
 namespace mihost
 {
 
-/** A pipe that never fills up: a thread reads what is written and keeps its beginning. */
+/** A pipe that never fills up: a thread reads everything and keeps the beginning. */
 class DrainedPipe
 {
 public:
-    /** @throws std::system_error if no pipe or no thread can be had */
+    /** @throws std::system_error without a pipe or a thread */
     DrainedPipe();
     ~DrainedPipe();
     DrainedPipe(DrainedPipe const&) = delete;

@@ -10,9 +10,10 @@ namespace mihost
 enum ExitCode {
     Done = 0,
     PluginRefused = 1, // the plug-in answered with a non-zero status; the doctor misses something
-    BadUsage = 2,      // wrong usage, refused input, or what was asked for beside cannot be had
-    NoPlugin = 3,      // the plug-in cannot be loaded, or has no folder to run in
-    NotFound = 4       // no such node or property
+    BadUsage =
+        2, // wrong usage, refused input, or a sandbox, trace or output file that cannot be opened
+    NoPlugin = 3, // the plug-in cannot be loaded, or has no folder to run in
+    NotFound = 4  // no such node or property
 };
 
 /** Ends a command: what went wrong, on one line, and what the program then exits with. */

@@ -14,7 +14,7 @@ namespace mihost::interrupts
 namespace
 {
 
-// Read by the handler, so nothing but plain data; what is pointed to belongs to others.
+// Read by the signal handler, so only plain data, not owned here.
 char const* volatile folder = nullptr;
 termios const* volatile terminal = nullptr;
 char const* volatile lastWords = nullptr;
@@ -45,7 +45,7 @@ void handle(int signal)
     int const before = errno;
     if (char const* const words = lastWords)
         if (write(screen, words, std::strlen(words)) < 0)
-            errno = 0; // nobody is there to be told
+            errno = 0; // there is no reader left
     if (termios const* const settings = terminal)
         tcsetattr(STDIN_FILENO, TCSANOW, settings);
     if (char const* const path = folder)
@@ -68,13 +68,13 @@ bool isIgnored(int signal)
 
 void install()
 {
-    // Standard error goes elsewhere for the moment in which a command is started.
+    // Standard error is redirected while a command starts.
     screen = fcntl(STDERR_FILENO, F_DUPFD_CLOEXEC, 3);
     for (int const signal : endingSignals)
         if (!isIgnored(signal)) // as nohup leaves it
             setHandler(signal, handle, SA_RESTART);
-    // A reader that goes early or a file that grows too long is an error of writing, not the end.
-    // Not SIG_IGN, which the commands would inherit.
+    // A closed pipe or a file size limit is a write error, not a reason to die. Not SIG_IGN, which
+    // commands would inherit.
     for (int const signal : {SIGPIPE, SIGXFSZ})
         setHandler(signal, ignore, SA_RESTART);
 }

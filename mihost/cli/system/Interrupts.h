@@ -19,7 +19,7 @@ void install();
 /** @param path  a folder to remove when a signal ends the program; null for none */
 void setFolderToRemove(char const* path);
 
-/** @param settings  what the terminal goes back to when a signal ends the program; null for none */
+/** @param settings  restored when a signal ends the program; null for none */
 void setTerminalToRestore(termios const* settings);
 
 /** @param text  written to standard error when a signal ends the program; null for none */

@@ -9,16 +9,16 @@ namespace mihost
 {
 
 /**
- * A working directory that nobody else can look into, since the plug-in writes a password hash to a
- * file where it stands. Going away, it takes its contents with it and goes back where it came from.
+ * A working directory that nobody else can read, since the plug-in writes a password hash to a file
+ * there. The destructor removes it with its contents and restores the previous working directory.
  *
- * It holds a lock file, locked while its process lives. What a process that was killed left is
- * removed when the next one makes its own.
+ * It contains a lock file, locked while its process lives. A killed process's directory is removed
+ * when the next one creates its own.
  */
 class PrivateDirectory
 {
 public:
-    /** @throws Failure where it cannot be made */
+    /** @throws Failure if it cannot be created */
     PrivateDirectory();
     ~PrivateDirectory();
     PrivateDirectory(PrivateDirectory const&) = delete;

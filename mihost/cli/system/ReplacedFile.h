@@ -7,11 +7,11 @@ namespace mihost
 {
 
 /**
- * Puts a file with this text in the place of the one at the path, if there is one. A reader sees
- * the old text or the new one, never a part. Everybody can read it.
+ * Replaces the file at the path atomically: a reader sees the old text or the new one, never a
+ * part. The file is world-readable.
  *
  * @param doing  what is being done, for the message
- * @throws Failure; the old file is then as it was, and nothing else is left
+ * @throws Failure; the old file is then unchanged, and nothing else is left
  */
 void replaceFile(std::string const& path, std::string const& text, char const* doing);
 

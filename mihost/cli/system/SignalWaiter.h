@@ -24,7 +24,7 @@ public:
     enum class Event { Ready, Timeout, Signal };
 
     /**
-     * @param file     what poll is to look at; ready also where it has something unasked to tell
+     * @param file     the descriptor to poll; also ready on errors
      * @param seconds  how long; negative for ever
      */
     Event wait(pollfd file, double seconds);

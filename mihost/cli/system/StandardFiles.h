@@ -5,8 +5,8 @@ namespace mihost
 {
 
 /**
- * Fills the places of missing standard files, so that no file opened later becomes one of them.
- * Reading or writing what is missing stays an error.
+ * Opens missing standard descriptors, so that no file opened later becomes one of them. Reading or
+ * writing a missing one is still an error.
  *
  * @return false if a place could not be filled
  */

@@ -8,7 +8,7 @@
 namespace mihost
 {
 
-/** Writes to standard error. If nobody reads it any more, there is nobody to tell so either. */
+/** Writes to standard error; errors are ignored. */
 void writeStderr(std::string const& text);
 
 /** How messages are shown from now on, for the whole program. @param isQuiet  drops warnings */

@@ -7,7 +7,7 @@
 namespace mihost
 {
 
-/** The text of a file; empty where it cannot be read. */
+/** The text of a file; empty if it cannot be read. */
 std::string contentOf(std::string const& path);
 
 /** The lines of a text, without their ends. */

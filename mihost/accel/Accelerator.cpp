@@ -49,7 +49,7 @@ FILE* open(Row& row, Answer answer)
         ++row.answered;
     } else {
         ++row.handedOn;
-        row.reason = answer.reason ? answer.reason : "no stream could be made";
+        row.reason = answer.reason ? answer.reason : "no stream could be created";
     }
     return stream;
 }
@@ -61,8 +61,7 @@ FILE* openAnswerTo(std::string_view line, std::string_view mode)
     for (Row& row : rows)
         if (row.form && isPlainRead && (operands = operandsOf(row.form, line)))
             return open(row, ask(row, *operands));
-    return open(*std::prev(std::end(rows)),
-                declined("not one of the commands that are answered here"));
+    return open(*std::prev(std::end(rows)), declined("not an accelerated command"));
 }
 
 } // namespace

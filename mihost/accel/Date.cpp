@@ -17,7 +17,7 @@ namespace
 
 using Locale = std::unique_ptr<std::remove_pointer_t<locale_t>, decltype(&freelocale)>;
 
-/** What programs set with setlocale(LC_ALL, ""): the built-in one if a part cannot be had. */
+/** The result of setlocale(LC_ALL, ""): the built-in locale if a part is missing. */
 Locale environmentLocale()
 {
     locale_t const own = newlocale(LC_ALL_MASK, "", nullptr);
@@ -37,12 +37,12 @@ std::string formatted(std::time_t now, std::string const& format, Locale const& 
 
 std::time_t clockTime()
 {
-    timespec now{}; // not time(), whose clock is late by up to a tick
+    timespec now{}; // not time(), whose clock may lag by a tick
     clock_gettime(CLOCK_REALTIME, &now);
     return now.tv_sec;
 }
 
-/** Everything besides minutes and seconds that may change what date prints. */
+/** Everything that affects date's output except minutes and seconds. */
 std::string circumstances(std::time_t now)
 {
     std::string text = formatted(now, "%Y %j %H %z %Z", environmentLocale());
@@ -65,7 +65,7 @@ Answer compare(Comparison& made)
     // Some take the time from the clock that is late.
     for (std::time_t moment = before - 1; printed && moment <= after; ++moment)
         made.agrees = made.agrees || dateAt(moment) == *printed;
-    return {std::move(printed), "date is run once an hour, to compare"};
+    return {std::move(printed), "date runs once an hour, for comparison"};
 }
 
 } // namespace
@@ -85,7 +85,7 @@ Answer date(Operands const&)
     if (made.circumstances != circumstances(now))
         return compare(made);
     if (!made.agrees)
-        return declined("date prints something else than expected here");
+        return declined("date printed an unexpected text");
     return {dateAt(now)};
 }
 

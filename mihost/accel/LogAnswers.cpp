@@ -39,7 +39,7 @@ Reason doubt(int file, struct stat& state)
         return "the file is not a regular file";
     if (std::count(std::begin(declinedFileSystems), std::end(declinedFileSystems),
                    static_cast<unsigned int>(system.f_type)) != 0)
-        return "the file system may not give every change a new time";
+        return "the file system may not give each change a new time stamp";
     return nullptr;
 }
 
@@ -53,15 +53,15 @@ Answer lineText(int file, LineIndex const& index, Operands const& operands)
     std::uint64_t const line = operands.line;
     // busybox ends a line at NUL, and adds the end that the last line may lack.
     if (index.hasNul())
-        return declined("the file has NUL bytes, which not every sed reads alike");
+        return declined("the file has NUL bytes, which versions of sed treat differently");
     std::optional<std::uint64_t> const begin = index.find(file, line);
     std::optional<std::uint64_t> const end = index.find(file, line + 1);
     if (!begin || !end || *end < *begin)
         return declined(unsteady);
     if (line > index.lineEnds() && *end > *begin)
-        return declined("the line has no end, which not every sed prints alike");
+        return declined("the line has no newline, which versions of sed treat differently");
     if (*end - *begin > longestLine)
-        return declined("the line is too long to be held");
+        return declined("the line is too long");
     std::string text(*end - *begin, '\0');
     if (!readAt(file, text.data(), text.size(), *begin))
         return declined(unsteady);
@@ -69,8 +69,8 @@ Answer lineText(int file, LineIndex const& index, Operands const& operands)
 }
 
 /**
- * Works with the file and its index, brought up to date. One index is kept, that of the last file:
- * the plug-in reads a single log.
+ * Works on the file with its updated index. Only the last file's index is kept, since the plug-in
+ * reads a single log.
  */
 Answer withIndex(Operands const& operands,
                  Answer (*work)(int file, LineIndex const& index, Operands const& operands))
@@ -89,7 +89,7 @@ Answer withIndex(Operands const& operands,
     if (!index.update(file, before))
         return declined(unsteady);
     Answer answer = work(file, index, operands);
-    // What was added meanwhile, a command that began earlier would not have seen either.
+    // A command that started earlier would not have seen later additions either.
     struct stat after {
     };
     if (fstat(file, &after) != 0 || after.st_size < before.st_size)

@@ -125,7 +125,7 @@ Answer factsOf(kmod_module const* module)
 {
     char const* const path = kmod_module_get_path(module);
     if (!path)
-        return declined("not every modinfo knows modules that are built in");
+        return declined("some versions of modinfo do not know built-in modules");
     kmod_list* list = nullptr;
     int const got = kmod_module_get_info(module, &list);
     Facts const facts(list);
@@ -137,7 +137,7 @@ Answer factsOf(kmod_module const* module)
         std::string_view const key = kmod_module_info_get_key(fact);
         std::string const value = kmod_module_info_get_value(fact);
         if (key.size() >= valueColumn)
-            return declined("not every modinfo prints a long key alike");
+            return declined("versions of modinfo print a long key differently");
         if (key != "parm" && key != "parmtype")
             text += factLine(key, value);
         else if (!add(parameters, value, key == "parmtype"))

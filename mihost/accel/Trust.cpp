@@ -73,7 +73,7 @@ std::string directoryOf(std::string const& path)
     return path.substr(0, path.rfind('/') + 1);
 }
 
-/** Whether nobody but root can write it. Access control lists show as the group's permissions. */
+/** Whether only root can write it. Access control lists appear as the group's permissions. */
 bool isRootsAlone(std::string const& path)
 {
     struct stat state {
@@ -105,7 +105,7 @@ Program programAt(std::string const& path)
     std::string const file = real.get();
     std::string const name = file.substr(directoryOf(file).size());
     if (!isRootsAlone(file) || !isRootsAlone(directoryOf(file)) || !isRootsAlone(directoryOf(path)))
-        return {name, "others than root can replace the shell or the tool"};
+        return {name, "users other than root can replace the shell or the tool"};
     return {name, isBinary(file) ? nullptr : "the shell or the tool is a script"};
 }
 
@@ -118,7 +118,7 @@ std::string found(std::string const& name)
     for (std::size_t begin = 0, end = 0; begin <= path.size(); begin = end + 1) {
         end = std::min(path.find(':', begin), path.size());
         std::string const directory = path.substr(begin, end - begin);
-        // An empty one is the working directory; dash takes a % in PATH for more than a character.
+        // An empty entry is the working directory; dash gives % in PATH a special meaning.
         if (directory.empty() || directory[0] != '/' || directory.find('%') != std::string::npos)
             return {};
         std::string candidate = directory;
@@ -133,7 +133,7 @@ std::string found(std::string const& name)
     return {};
 }
 
-/** busybox may prefer tools of its own to PATH's, and its lsmod is another one. */
+/** busybox may prefer its own tools to PATH's, and its lsmod differs. */
 bool isKnownShell(std::string const& name, Tool tool)
 {
     return name == "dash" || name == "bash" || (name == "busybox" && tool == Tool::Any);
@@ -149,7 +149,7 @@ Reason distrust(char const* name, Tool tool)
     if (shell.doubt)
         return shell.doubt;
     if (!isKnownShell(shell.name, tool))
-        return "/bin/sh is another shell than dash, bash or, for some tools, busybox";
+        return "/bin/sh is not dash, bash or, for some tools, busybox";
     std::string const path = found(name);
     if (path.empty())
         return "PATH does not find the tool in a system directory";

@@ -16,7 +16,7 @@ namespace mihost
 namespace
 {
 
-/** Whether a folder stands there, be it through a symbolic link. */
+/** Whether there is a directory, possibly through a symbolic link. */
 bool isFolder(std::string const& path)
 {
     struct stat status {
@@ -45,7 +45,7 @@ void layFile(Descriptor const& folder, std::string const& name, std::string cons
     removeOld(path);
     Descriptor const to(
         check(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, S_IRUSR | S_IWUSR),
-              "cannot make " + path));
+              "cannot create " + path));
     copyContent(from, to, path);
     check(fchown(to.get(), 0, 0), "cannot set the owner of " + path);
     check(fchmod(to.get(), modeFor(path, mode)), "cannot set the mode of " + path);
@@ -58,7 +58,7 @@ void layLink(Descriptor const& folder, std::string const& name, std::string cons
     check(readlinkat(folder.get(), name.c_str(), target.data(), length),
           "cannot read the link for " + path);
     removeOld(path);
-    check(symlink(target.c_str(), path.c_str()), "cannot make " + path);
+    check(symlink(target.c_str(), path.c_str()), "cannot create " + path);
     check(lchown(path.c_str(), 0, 0), "cannot set the owner of " + path);
 }
 
@@ -67,7 +67,7 @@ void makeFolder(std::string const& path, mode_t mode)
     if (isFolder(path))
         return;
     removeOld(path);
-    check(mkdir(path.c_str(), S_IRWXU), "cannot make " + path);
+    check(mkdir(path.c_str(), S_IRWXU), "cannot create " + path);
     check(chown(path.c_str(), 0, 0), "cannot set the owner of " + path);
     check(chmod(path.c_str(), mode & 07777), "cannot set the mode of " + path);
 }
@@ -89,11 +89,11 @@ void layFolder(Descriptor const& folder, std::string const& path)
             makeFolder(place, status.st_mode);
             layFolder(Descriptor(check(
                           openat(folder.get(), name.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC),
-                          "cannot read the folder for " + place)),
+                          "cannot read the directory for " + place)),
                       place);
         } else {
             errno = EINVAL;
-            failed("cannot lay over " + place + ", neither a file nor a link nor a folder");
+            failed("cannot lay over " + place + ", neither a file nor a link nor a directory");
         }
     }
 }
@@ -103,7 +103,7 @@ void layFolder(Descriptor const& folder, std::string const& path)
 Descriptor openFolder(std::string const& path)
 {
     return Descriptor(check(open(path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC),
-                            "cannot open the folder " + path));
+                            "cannot open the directory " + path));
 }
 
 void layOver(Descriptor const& folder)

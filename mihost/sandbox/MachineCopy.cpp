@@ -37,7 +37,7 @@ void makeFolder(std::string const& path, mode_t mode)
     if (mkdir(path.c_str(), mode) == 0)
         check(chmod(path.c_str(), mode), "cannot set the mode of " + path);
     else if (errno != EEXIST)
-        failed("cannot make " + path);
+        failed("cannot create " + path);
 }
 
 void bind(std::string const& from, std::string const& to, unsigned long flags = 0)
@@ -123,7 +123,7 @@ void addDevices()
         if (access(device.c_str(), F_OK) != 0)
             continue;
         Descriptor const file(check(open(place.c_str(), O_CREAT | O_WRONLY | O_CLOEXEC, 0600),
-                                    "cannot make " + place));
+                                    "cannot create " + place));
         bind(device, place);
         makeReadOnly(place); // the device still takes writes, its owner and mode do not change
     }
@@ -135,7 +135,7 @@ void addDevices()
                              Link{"stdout", "/proc/self/fd/1"}, Link{"stderr", "/proc/self/fd/2"},
                              Link{"ptmx", "pts/ptmx"}})
         check(symlink(link.target, (devices + "/" + link.name).c_str()),
-              std::string("cannot make /dev/") + link.name);
+              std::string("cannot create /dev/") + link.name);
     makeFolder(devices + "/pts", 0755);
     mountAt(devices + "/pts", "devpts", MS_NOSUID | MS_NOEXEC,
             "newinstance,ptmxmode=0666,mode=0620,gid=5");
@@ -174,10 +174,10 @@ void changeRoot(Descriptor const& root)
 }
 
 /**
- * Keeps what is mounted from now on from the machine.
+ * Keeps later mounts from reaching the machine.
  *
- * The caller's root need not be a mount point: it may be any directory, as in a chroot. So the root
- * of the whole mount namespace is taken, and with it every mount.
+ * The caller's root need not be a mount point: it may be any directory, as in a chroot. So this
+ * uses the root of the mount namespace, and with it every mount.
  *
  * @return that root
  */
@@ -191,7 +191,7 @@ Descriptor keepMountsPrivate()
     return top;
 }
 
-/** From a /proc of its own: the machine's may be missing, as in a chroot. */
+/** From its own /proc: the machine's may be missing, as in a chroot. */
 std::vector<std::string> readMounts()
 {
     mountAt(stage, "proc", MS_NOSUID | MS_NODEV | MS_NOEXEC, "");

@@ -14,7 +14,7 @@ namespace mihost
 void startLoopback()
 {
     Descriptor const socket(
-        check(::socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0), "cannot make a socket"));
+        check(::socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0), "cannot create a socket"));
     ifreq request{};
     std::strcpy(request.ifr_name, "lo");
     request.ifr_flags = IFF_UP;

@@ -17,7 +17,7 @@ namespace
 
 char const* const notes = "/run/power-commands";
 
-// Noted before it is said: nobody may be listening any more.
+// Recorded before it is printed, since printing may fail.
 char const* const standIn = "#!/bin/sh\n"
                             "printf '%s\\n' \"$0${*:+ $*}\" >>/run/power-commands\n"
                             "echo \"sandbox: the machine itself would run: $0${*:+ $*}\" >&2\n";
@@ -28,7 +28,7 @@ void replace(std::string const& path)
     if (unlink(path.c_str()) != 0 && errno != ENOENT)
         failed("cannot replace " + path);
     Descriptor const file(check(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0700),
-                                "cannot make " + path));
+                                "cannot create " + path));
     writeAll(file, standIn, std::char_traits<char>::length(standIn), path);
     check(fchmod(file.get(), 0755), "cannot set the mode of " + path);
 }

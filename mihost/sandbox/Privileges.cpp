@@ -24,7 +24,7 @@ constexpr cap_value_t machinePrivileges[] = {
     CAP_BPF,            // programs in the kernel
     CAP_MAC_ADMIN,      // the policy of a security module
     CAP_MAC_OVERRIDE,   // no policy at all
-    CAP_MKNOD,          // a device file of one's own making
+    CAP_MKNOD,          // creating device files
     CAP_NET_ADMIN,      // interfaces, routes, packet filters
     CAP_PERFMON,        // counters and traces of every process
     CAP_SYSLOG,         // read and clear the kernel's log
@@ -80,12 +80,13 @@ void refuseKernelsRecords()
     std::unique_ptr<void, ReleaseFilter> const filter(seccomp_init(SCMP_ACT_ALLOW));
     if (!filter)
         failed("cannot filter system calls");
-    // Tools of the other word size, where the kernel runs them; elsewhere these are refused.
+    // Tools of the other word size, if the kernel runs them; otherwise refused.
     std::uint32_t const others[] = {SCMP_ARCH_X86_64, SCMP_ARCH_X86, SCMP_ARCH_X32};
     for (std::uint32_t const architecture : others)
         seccomp_arch_add(filter.get(), architecture);
     checkFilter(seccomp_attr_set(filter.get(), SCMP_FLTATR_ACT_BADARCH, SCMP_ACT_ALLOW));
-    checkFilter(seccomp_attr_set(filter.get(), SCMP_FLTATR_CTL_NNP, 0)); // su and its kin go on
+    checkFilter(
+        seccomp_attr_set(filter.get(), SCMP_FLTATR_CTL_NNP, 0)); // su and the like still work
     // Before Linux 6.8 CAP_SYS_ADMIN alone opens the kernel's log.
     checkFilter(seccomp_rule_add(filter.get(), SCMP_ACT_ERRNO(EPERM), SCMP_SYS(syslog), 0));
     checkFilter(seccomp_rule_add(filter.get(), SCMP_ACT_ERRNO(EAFNOSUPPORT), SCMP_SYS(socket), 2,

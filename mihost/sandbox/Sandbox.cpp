@@ -35,7 +35,7 @@ struct Pipe {
     Pipe()
     {
         int ends[2];
-        check(pipe2(ends, O_CLOEXEC), "cannot make a pipe");
+        check(pipe2(ends, O_CLOEXEC), "cannot create a pipe");
         readEnd = Descriptor(ends[0]);
         writeEnd = Descriptor(ends[1]);
     }
@@ -62,7 +62,7 @@ std::string readToEnd(Descriptor const& from)
 pid_t forkFirstProcess()
 {
     Descriptor const own = openSelf();
-    check(unshare(CLONE_NEWPID), "cannot have a process namespace");
+    check(unshare(CLONE_NEWPID), "cannot create a process namespace");
     pid_t const child = fork();
     int const problemOfFork = errno;
     if (child != 0)
@@ -77,13 +77,13 @@ void dieWithTheCaller(Descriptor const& report)
     prctl(PR_SET_PDEATHSIG, SIGKILL);
     pollfd watched{report.get(), 0, 0};
     if (poll(&watched, 1, 0) != 0)
-        _exit(EXIT_FAILURE); // it was gone before
+        _exit(EXIT_FAILURE); // it ended before
 }
 
 void makeSandbox(Descriptor const& overlay)
 {
     check(unshare(CLONE_NEWNS | CLONE_NEWIPC | CLONE_NEWUTS | CLONE_NEWNET),
-          "cannot have namespaces");
+          "cannot create namespaces");
     startLoopback();
     enterMachineCopy();
     if (overlay)
@@ -115,12 +115,12 @@ void runAsFirstProcess(Descriptor overlay, Descriptor report)
         int const status = relayTo(child);
         writeAll(report, reinterpret_cast<char const*>(&status), sizeof status, "the report");
     } catch (std::system_error const&) {
-        _exit(EXIT_FAILURE); // the caller's process is gone
+        _exit(EXIT_FAILURE); // the caller's process has ended
     }
     _exit(EXIT_SUCCESS);
 }
 
-/** Returns only where no sandbox came to be. */
+/** Returns only if no sandbox was created. */
 std::string runAsCaller(pid_t child, Descriptor report)
 {
     char first = 0;
@@ -129,7 +129,7 @@ std::string runAsCaller(pid_t child, Descriptor report)
         count = read(report.get(), &first, 1);
     } while (count < 0 && errno == EINTR);
     if (count == 1 && first == ready) {
-        int end = relayTo(child); // that of the first process; it counts where it was killed
+        int end = relayTo(child); // that of the first process; used if it was killed
         std::string const status = readToEnd(report);
         if (status.size() == sizeof end)
             status.copy(reinterpret_cast<char*>(&end), sizeof end);
@@ -148,8 +148,8 @@ std::optional<std::string> enterSandbox(std::string const& overlay)
         Descriptor folder = overlay.empty() ? Descriptor() : openFolder(overlay);
         Pipe report;
         HeldSignals const held;
-        signal(SIGCHLD, SIG_DFL); // where it is ignored, no child's end would be seen
-        std::fflush(nullptr);     // or both processes would write what is kept back
+        signal(SIGCHLD, SIG_DFL); // if ignored, children's ends would not be noticed
+        std::fflush(nullptr);     // or both processes would write the buffered output
         pid_t const child = forkFirstProcess();
         if (child == 0) {
             report.readEnd.reset();

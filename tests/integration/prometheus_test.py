@@ -149,7 +149,7 @@ class ExporterAlone(Daemons):
     def test_says_when_there_are_no_metrics(self):
         self.start_exporter(9813, '/bin/false')
         status, _, body = until(lambda: get(9813, '/metrics'), 'no exporter')
-        self.assertEqual((status, body), (500, 'mihost gave no metrics\n'))
+        self.assertEqual((status, body), (500, 'mihost printed no metrics\n'))
 
     def test_needs_a_socket(self):
         done = subprocess.run([EXPORTER, '/bin/true'], capture_output=True, text=True)

@@ -67,7 +67,7 @@ MHD_Result handle(void* command, MHD_Connection* connection, char const* path, c
         return answer(connection, MHD_HTTP_NOT_FOUND, "only /metrics\n", plain);
     auto const text = scrape(*static_cast<std::vector<std::string>*>(command), timeLimit);
     if (!text)
-        return answer(connection, MHD_HTTP_INTERNAL_SERVER_ERROR, "mihost gave no metrics\n",
+        return answer(connection, MHD_HTTP_INTERNAL_SERVER_ERROR, "mihost printed no metrics\n",
                       plain);
     return answer(connection, MHD_HTTP_OK, *text, openMetrics);
 }
@@ -88,7 +88,7 @@ int main(int argc, char* argv[])
                    stderr);
         return 2;
     }
-    // Its commands must not take the socket for their own.
+    // Its commands must not inherit the socket.
     fcntl(socket, F_SETFD, FD_CLOEXEC);
     for (char const* name : {"LISTEN_PID", "LISTEN_FDS", "LISTEN_FDNAMES"})
         unsetenv(name);

@@ -25,17 +25,15 @@ constexpr Parameter localGroup =
 constexpr Parameter member =
     required(parameter::domainAndMember, Form::AccountName, "login name of the member");
 constexpr Parameter fullName = required(parameter::fullName, Form::Words, "full name");
-constexpr char homeMeaning[] = "home directory; made, or moved there with its files";
+constexpr char homeMeaning[] = "home directory; created, or moved with its files";
 
 std::vector<Parameter> const ageing = {
-    optional(parameter::daysMustKeepPassword, Form::Digits,
-             "days before a password may be changed"),
-    optional(parameter::daysMustChangePasswordAfter, Form::Digits,
-             "days that a password stays valid"),
+    optional(parameter::daysMustKeepPassword, Form::Digits, "minimum password age, in days"),
+    optional(parameter::daysMustChangePasswordAfter, Form::Digits, "maximum password age, in days"),
     optional(parameter::daysWarnBeforePasswordExpire, Form::Digits,
-             "days of warning before it expires"),
+             "days of warning before the password expires"),
     optional(parameter::daysExpireAfter, Form::Digits,
-             "days from a password's expiry until the account goes inactive"),
+             "days from the password's expiry until the account becomes inactive"),
     optional(parameter::passwordExpirationDate, Form::Day,
              "day on which the account expires; never if not given"),
 };
@@ -48,7 +46,7 @@ std::vector<Parameter> withAgeing(std::vector<Parameter> parameters)
 }
 
 std::vector<Method> const allMethods = {
-    {method::userAdd, "makes a user account and sets its password ageing",
+    {method::userAdd, "adds a user account and sets its password ageing",
      withAgeing({
          newUserName,
          optional(parameter::comment, Form::Words, "the account's comment field"),
@@ -56,7 +54,7 @@ std::vector<Method> const allMethods = {
          optional(parameter::scriptPath, Form::Path, "login shell"),
          optional(parameter::password, Form::Password, "plain password"),
      })},
-    {method::userDel, "deletes a user account; home directory and mail stay", {userName}},
+    {method::userDel, "deletes a user account; keeps its home directory and mail", {userName}},
     {method::userSetAttrib, "sets an account's password ageing", withAgeing({userName})},
     {method::userSetFullName, "sets an account's comment field", {userName, fullName}},
     {method::userSetScriptPath,
@@ -68,7 +66,7 @@ std::vector<Method> const allMethods = {
     {method::userSetPassword,
      "sets an account's password",
      {userName, required(parameter::password, Form::Password, "plain password")}},
-    {method::localGroupAdd, "makes a group", {newGroupName}},
+    {method::localGroupAdd, "adds a group", {newGroupName}},
     {method::localGroupDel, "deletes a group", {groupName}},
     {method::localGroupAddUser, "adds a user to a group", {localGroup, member}},
     {method::localGroupDelUser, "removes a user from a group", {localGroup, member}},

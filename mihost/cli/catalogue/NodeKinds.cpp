@@ -31,18 +31,17 @@ std::vector<Property> const osProperties = {
     fixedNumbers,
     text(property::name, "os-name", "first line of the distribution's release file, else Linux"),
     text(property::version, "os-version",
-         "the distribution's version; unset where no release file is known"),
+         "the distribution's version; unset if no release file is known"),
     text(property::createUser, "create-user",
-         "writing a method-call text carries out an administration method; empty after a failure")
+         "writing a method-call text runs an administration method; empty after a failure")
         .acts()
         .mayBeSecret()
         .takes(Form::MethodCall),
-    number(property::refresh, "refresh", "writing 0 builds the user and group nodes again").acts(),
+    number(property::refresh, "refresh", "writing 0 rebuilds the user and group nodes").acts(),
     boolean(property::distributed, "distributed", "fixed: false"),
     number(property::processMaxNumber, "process-max-number", "fixed: 32000").in("processes"),
     number(property::processMaxMemory, "process-max-memory", "fixed: 0"),
-    number(property::userCount, "user-count",
-           "ordinary accounts and those with UID 0, at the start")
+    number(property::userCount, "user-count", "ordinary accounts and those with UID 0, at start-up")
         .in("accounts"),
     number(property::licensedUserCount, "licensed-user-count", "fixed: 0").in("accounts"),
     number(property::virtualMemorySize, "virtual-memory-size", "fixed: 0"),
@@ -50,24 +49,24 @@ std::vector<Property> const osProperties = {
     text(property::languageEdition, "language-edition",
          "language tag of the locale, such as en-US"),
     text(property::codeSet, "code-set", "code set of the locale, such as UTF-8"),
-    number(property::processCount, "process-count", "processes at this moment")
+    number(property::processCount, "process-count", "current number of processes")
         .in("processes")
         .live(),
     number(property::physicalMemoryFree, "physical-memory-free", "free RAM").in("KiB").live(),
     number(property::physicalMemorySize, "physical-memory-size", "RAM").in("KiB").live(),
-    number(property::swapFileSize, "swap-size", "swap space, not scaled; cut to 32 bits")
+    number(property::swapFileSize, "swap-size", "swap space, unscaled; truncated to 32 bits")
         .in("kernel memory units")
         .live(),
-    number(property::swapFileFree, "swap-free", "free swap space, not scaled; cut to 32 bits")
+    number(property::swapFileFree, "swap-free", "free swap space, unscaled; truncated to 32 bits")
         .in("kernel memory units")
         .live(),
     number(property::swapFileSizeStored, "swap-used",
-           "swap space in use, not scaled; cut to 32 bits")
+           "swap space in use, unscaled; truncated to 32 bits")
         .in("kernel memory units")
         .live(),
     date(property::lastBootTime, "last-boot-time", "when the machine was started"),
     date(property::installDate, "install-date",
-         "last status change of the release file; the epoch where there is none"),
+         "last status change of the release file; the epoch if there is none"),
     number(property::clearLog, "clear-log", "always reads 0; writing 9 empties the system log")
         .live()
         .unstored()
@@ -75,7 +74,7 @@ std::vector<Property> const osProperties = {
 };
 
 std::vector<Property> const driverProperties = {
-    text(property::version, "driver-version", "the module's version; empty where it states none"),
+    text(property::version, "driver-version", "the module's version; empty if it has none"),
     text(property::name, "driver-name", "the module's name"),
     text(property::buildNumber, "build-number", "always empty"),
     text(property::manufacturer, "manufacturer", "always empty"),
@@ -84,11 +83,10 @@ std::vector<Property> const driverProperties = {
 std::vector<Property> const userProperties = {
     requestedState,
     fixedNumbers,
-    text(property::name, "user-name", "login name; account commands take it from here")
+    text(property::name, "user-name", "login name; account commands use it")
         .takes(Form::AccountName),
     number(property::nameLength, "user-name-length", "length of the login name").in("bytes"),
-    text(property::id, "user-id", "UID in decimal; a delete takes it from here")
-        .takes(Form::Digits),
+    text(property::id, "user-id", "UID in decimal; a deletion uses it").takes(Form::Digits),
     number(property::idLength, "user-id-length", "length of the UID's text").in("bytes"),
     text(property::groupId, "group-id", "GID of the primary group in decimal").takes(Form::Digits),
     text(property::fullName, "full-name", "the account's comment field"),
@@ -99,33 +97,32 @@ std::vector<Property> const userProperties = {
         .secret()
         .takes(Form::Hash),
     number(property::passwordLength, "password-length", "length of the password hash").in("bytes"),
-    number(property::pwdMaxDays, "password-max-days",
-           "how long a password stays valid; 99999 means for ever")
+    number(property::pwdMaxDays, "password-max-days", "maximum password age; 99999 for no limit")
         .in("days"),
     number(property::pwdWarnDays, "password-warn-days", "warning before a password expires")
         .in("days"),
-    number(property::pwdMinDays, "password-min-days", "wait before a password may be changed")
-        .in("days"),
+    number(property::pwdMinDays, "password-min-days", "minimum password age").in("days"),
     number(property::pwdExpDays, "password-expiry-days",
-           "from a password's expiry until the account goes inactive; 99999 means never")
+           "from a password's expiry until the account becomes inactive; 99999 for never")
         .in("days"),
     date(property::inactiveTime, "inactive-time",
-         "account expiry, 2038-01-19 for never; writing a day makes the account inactive from then "
-         "on")
+         "reads the account's expiry date, 2038-01-19 for never; writing a date sets when the "
+         "account becomes inactive")
         .acts(),
     number(property::passwordHistoryDepth, "password-history-depth", "fixed: 0"),
     text(property::reservedText, "reserved-text", "fixed: empty"),
     date(property::passwordExpiration, "password-expiration",
-         "account expiry, as inactive-time; writing a day lets the password expire then")
+         "reads the account's expiry date, as inactive-time does; writing a date sets the "
+         "password's")
         .acts(),
     date(property::lastPwdChange, "last-password-change", "when the password was last changed"),
     number(property::maxLoginFailures, "max-login-failures",
            "the deny= of /etc/pam.d/login, 0 for none"),
     boolean(property::deleteUser, "delete",
-            "reads false; writing true deletes the account that is named like this UID, home "
-            "directory included")
+            "reads false; writing true deletes the account whose name is this UID, with its home "
+            "directory")
         .acts(),
-    number(property::elementCount, "user-count", "reported accounts at this moment")
+    number(property::elementCount, "user-count", "current number of reported accounts")
         .in("accounts")
         .live(),
 };
@@ -134,8 +131,8 @@ std::vector<Property> const groupProperties = {
     text(property::name, "group-name", "the group's name"),
     number(property::id, "group-id", "GID"),
     texts(property::members, "members",
-          "login names: those whose primary group it is, then those it lists"),
-    number(property::elementCount, "group-count", "reported groups at this moment")
+          "login names: users with this primary group, then listed members"),
+    number(property::elementCount, "group-count", "current number of reported groups")
         .in("groups")
         .live(),
 };
@@ -150,7 +147,7 @@ std::vector<Property> const logProperties = {
 };
 
 std::vector<Property> const logEntryProperties = {
-    number(property::id, "index", "position counted from the newest line, which is 1").live(),
+    number(property::id, "index", "position from the newest line, which is 1").live(),
     text(property::message, "message", "the line without its time stamp, between asterisks").live(),
     date(property::creationTime, "time", "the line's time stamp, read as local time").live(),
 };

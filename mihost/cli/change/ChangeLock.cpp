@@ -55,11 +55,12 @@ ChangeLock::ChangeLock(std::string const& file, Patience patience)
     while (!tryLock(file_.get(), file)) {
         auto const now = steady_clock::now();
         if (now >= limit)
-            throw Failure(PluginRefused,
-                          fmt::format("another mihost is still changing this machine, so nothing "
-                                      "was run (try again, or wait longer with --lock-timeout; "
-                                      "'fuser {}' shows the process)",
-                                      file));
+            throw Failure(
+                PluginRefused,
+                fmt::format("waiting for the change lock: another mihost still holds it (try "
+                            "again, or raise --lock-timeout; 'fuser {}' shows the "
+                            "process)",
+                            file));
         if (!isSaid && now - start >= patience.silent) {
             warn("waiting for another mihost to finish its change");
             isSaid = true;

@@ -32,7 +32,7 @@ public:
         return true;
     }
 
-    /** An id and, in parentheses, its name; groups that nobody named have none. */
+    /** An id and, in parentheses, its name; groups without a name have none. */
     std::optional<Group> takeGroup()
     {
         std::size_t const digits = std::min(rest_.find_first_not_of("0123456789"), rest_.size());
@@ -69,7 +69,7 @@ std::string_view withoutWarnings(std::string_view text)
     return text;
 }
 
-/** Whether usermod reads the text as a group's id whatever the groups are called. */
+/** Whether usermod reads the text as a GID, even if a group has that name. */
 bool isReadAsId(std::string_view name)
 {
     if (!name.empty() && (name[0] == '+' || name[0] == '-'))
@@ -92,7 +92,7 @@ std::optional<std::string> objectionToGroup(Group const& group, Form form,
         return because(*reason);
     auto const found = findGroup(group.name);
     if (!found)
-        return because("is not a group that usermod finds");
+        return because("is not found by usermod");
     if (*found != group.id)
         return because(fmt::format("has GID {}, but usermod finds GID {}", group.id, *found));
     return std::nullopt;
@@ -158,13 +158,13 @@ void checkMembership(MethodCall const& call)
     std::string const member = valueOf(call, IC::parameter::domainAndMember);
     std::string const said =
         commandTap::outputOf(fmt::format("LC_ALL=C /usr/bin/id \"{}\" 2>&1", member));
-    // The plug-in goes no further then.
+    // The plug-in stops there.
     if (said.find("gid") == std::string::npos)
         return;
     auto const identity = parseIdentity(said);
-    auto const reason =
-        identity ? objectionToIdentity(*identity, member, groupOfMachine)
-                 : "id says: " + printable(linesOf(said).front()) + ", which is not its usual form";
+    auto const reason = identity ? objectionToIdentity(*identity, member, groupOfMachine)
+                                 : "id printed: " + printable(linesOf(said).front()) +
+                                       ", which is not its usual form";
     if (reason)
         throw Failure(BadUsage,
                       fmt::format("the groups of '{}' are not changed: {}", member, *reason));

@@ -68,15 +68,16 @@ void treatExpiry(MethodCall& call, Expiry expiry, std::vector<std::string>& warn
                                         "(set it with 'mihost user expire' first)",
                                         text)
                           : fmt::format("UserSetAttrib erases the account's expiry, and {} "
-                                        "cannot be passed along (add --yes to erase it)",
+                                        "cannot be kept (add --yes to erase it)",
                                         text));
     Parameter const* const parameter =
         findParameter(*call.method, IC::parameter::passwordExpirationDate);
     call.arguments.push_back({parameter, dateTimeText(*day)});
     if (expiry == Expiry::KeepAloud)
-        warnings.push_back(fmt::format("UserSetAttrib would erase the account's expiry {}, so it "
-                                       "is passed along (add --yes to erase it)",
-                                       text));
+        warnings.push_back(
+            fmt::format("UserSetAttrib would erase the account's expiry {}, so mihost "
+                        "passes it (add --yes to erase it)",
+                        text));
 }
 
 } // namespace

@@ -61,8 +61,8 @@ std::string hashOf(std::string const& password)
     bool const separates = hash.find_first_of(",:") != std::string::npos;
     if (!fits(password, hash) || objectionToHash(hash) || separates ||
         escapedForShell(hash).size() > longestArgument)
-        throw Failure(BadUsage, "Password: /usr/bin/passwd here does not read passwords from "
-                                "a pipe, and libcrypt cannot hash this one (set it with passwd)");
+        throw Failure(BadUsage, "hashing the password: this machine's passwd cannot read it from a "
+                                "pipe, and libcrypt cannot hash it (set it with passwd)");
     return hash;
 }
 

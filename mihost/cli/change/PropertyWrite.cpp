@@ -14,7 +14,7 @@ namespace mihost
 namespace
 {
 
-/** What a write of one property asks for. */
+/** The requested change of one property. */
 struct Act {
     using Expect = std::vector<Expectation>(Session& session, IC::MutableNode const& node,
                                             IC::PropertyValue const& value);
@@ -80,7 +80,7 @@ Expectation completeList(Session& session, NodeKind const& kind)
                         shown.insert(storedText(*node, kind.nameProperty));
                 for (std::string const& name : localNames(kind))
                     if (shown.count(name) == 0)
-                        return fmt::format("without '{}'", name);
+                        return fmt::format("missing '{}'", name);
                 return "complete";
             }};
 }

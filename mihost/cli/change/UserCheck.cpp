@@ -45,11 +45,10 @@ std::optional<std::string> objectionToDelete(Account const& node,
         fmt::format("use 'mihost user delete {}', which keeps the home directory", node.name);
     // Contract: the plug-in runs userdel with property 89.
     if (find(accounts, node.id))
-        return fmt::format("userdel would be given the UID {0}, which is the name of another "
+        return fmt::format("userdel would get the UID {0}, which is the name of another "
                            "account: '{0}' would be deleted ({1})",
                            node.id, right);
-    return fmt::format("userdel would be given the UID {}, but takes names only ({})", node.id,
-                       right);
+    return fmt::format("userdel would get the UID {}, but accepts only names ({})", node.id, right);
 }
 
 /** As the plug-in and the account tools read the file. */

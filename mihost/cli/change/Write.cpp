@@ -27,7 +27,7 @@ namespace
 
 using commandTap::RunCommand;
 
-/** What was found after the plug-in had carried a write out. */
+/** The state after the plug-in carried out a write. */
 struct Result {
     IC::Error error;
     std::vector<RunCommand> commands;
@@ -64,7 +64,7 @@ Result perform(Write const& write, Secrets secrets)
     result.complaints = linesOf(withoutSecrets(commandTap::takeStandardError(), write.secrets));
     result.changes = changesBetween(accounts, readAccountFiles(), secrets);
     result.accountsDiffer = !result.changes.empty();
-    if (inSandbox()) // where every file can be compared
+    if (inSandbox()) // in a sandbox, where every file can be compared
         result.changes = shownChanges(copy.changesTo(CopyState::read()),
                                       std::filesystem::current_path(), secrets);
     result.after = findings(write.expectations);
@@ -96,8 +96,8 @@ bool hasFailed(RunCommand const& command)
 }
 
 /**
- * The plug-in offers every password to passwd, also where that refuses; the password itself is
- * among the expectations.
+ * The plug-in passes every password to passwd, even one that fails; the password is verified as an
+ * expectation.
  */
 bool isPasswordOffer(RunCommand const& command)
 {
@@ -187,7 +187,7 @@ std::string problemOf(Write const& write, Result const& result)
     if (result.error.getStatus() != 0)
         return isAsAsked
                    ? ""
-                   : fmt::format("the plug-in answered {}", static_cast<std::string>(result.error));
+                   : fmt::format("the plug-in returned {}", static_cast<std::string>(result.error));
     if (!missed.empty())
         return missed;
     if (!write.tool.empty() && !ranTool(write, result))
@@ -207,16 +207,16 @@ WriteReport judged(Write const& write, Result const& result)
     } else {
         std::string const words = lastWords(result);
         if (!words.empty())
-            problem += "; a command said: " + words;
+            problem += "; a command printed: " + words;
         report.error = problem;
         said.erase(std::remove(said.begin(), said.end(), words), said.end());
     }
     for (std::string const& line : said)
-        report.warnings.push_back("a command said: " + line);
+        report.warnings.push_back("a command printed: " + line);
     return report;
 }
 
-/** Says that everything was as asked for already. */
+/** Warns that the machine already was in the requested state. */
 void tellUnchanged(Write const& write)
 {
     std::vector<std::string> facts;

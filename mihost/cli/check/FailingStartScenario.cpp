@@ -50,7 +50,7 @@ Scenario failingStartScenario()
     return {"failing-start",
             {
                 {"answer", "a failure of the host's initialize is passed on", answer},
-                {"tree", "the tree is built all the same", tree},
+                {"tree", "the tree is still built", tree},
                 {"unload", "the interface can be unloaded after that", unload},
             }};
 }

@@ -35,13 +35,13 @@ constexpr char findingsKey[] = "findings";
 constexpr char notesKey[] = "notes";
 constexpr char skippedKey[] = "skipped";
 constexpr char notLoadedKey[] = "not-loaded";
-constexpr char lastKey[] = "last"; // the plug-in is in no state to go on
+constexpr char lastKey[] = "last"; // the plug-in's state is unusable
 
 struct Pipe {
     Pipe()
     {
         int ends[2];
-        mihost::check(pipe2(ends, O_CLOEXEC), "cannot make a pipe");
+        mihost::check(pipe2(ends, O_CLOEXEC), "cannot create a pipe");
         readEnd = Descriptor(ends[0]);
         writeEnd = Descriptor(ends[1]);
     }
@@ -153,7 +153,7 @@ public:
     }
 
 private:
-    /** @throws std::system_error if the process cannot be watched; then it is gone, too */
+    /** @throws std::system_error if the process cannot be watched; it is killed then */
     static Descriptor openHandle(pid_t id)
     {
         // By its number: glibc 2.36 declares the function for C only.
@@ -174,7 +174,7 @@ private:
 
 enum class Ending { Itself, TimeLimit };
 
-/** Appends what is there to read. @return whether more may come */
+/** Appends the available bytes. @return whether more may follow */
 bool readSome(Descriptor const& from, std::string& text)
 {
     char block[4096];
@@ -314,9 +314,9 @@ std::vector<Result> runIsolated(Scenario const& scenario, Settings const& settin
 {
     try {
         Pipe report;
-        Descriptor const complaints(
-            mihost::check(memfd_create("complaints", MFD_CLOEXEC), "cannot make a temporary file"));
-        std::fflush(nullptr); // or both processes would write what is kept back
+        Descriptor const complaints(mihost::check(memfd_create("complaints", MFD_CLOEXEC),
+                                                  "cannot create a temporary file"));
+        std::fflush(nullptr); // or both processes would write the buffered output
         pid_t const id = mihost::check(fork(), "cannot start a process");
         if (id == 0)
             runInChild(scenario, settings, report.writeEnd, complaints);

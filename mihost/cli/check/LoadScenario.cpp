@@ -46,13 +46,13 @@ Verdict entryPointTwice(Subject& subject)
     HandedOut const again = call(entryPoint(plugin.path()));
     Findings findings;
     if (again.answer != 0)
-        findings.push_back(fmt::format("the second call answered {} rather than 0", again.answer));
+        findings.push_back(fmt::format("the second call returned {} rather than 0", again.answer));
     if (again.interface != &plugin.interface())
-        findings.emplace_back("the second call hands out another interface");
+        findings.emplace_back("the second call returns another interface");
     if (again.error != plugin.status())
-        findings.emplace_back("the second call hands out another status");
+        findings.emplace_back("the second call returns another status");
     if (!plugin.status())
-        findings.emplace_back("no status is handed out");
+        findings.emplace_back("no status is returned");
     else if (unsigned int const status = plugin.status()->getStatus(); status != 0)
         findings.push_back(fmt::format("the status is {} rather than 0 before initialize", status));
     return {findings};
@@ -98,11 +98,11 @@ Scenario loadScenario()
 {
     return {"load",
             {
-                {"opening", "the library is loaded and gives its interface", library},
-                {"entry-point", "OpenMI answers 0 and the same two addresses each time",
+                {"opening", "the library loads and provides its interface", library},
+                {"entry-point", "OpenMI returns 0 and the same two addresses each time",
                  entryPointTwice},
                 {"own-symbols", "the file itself defines OpenMI", ownSymbols},
-                {"host-symbols", "the headers in host/ declare all that it wants of its host",
+                {"host-symbols", "host/ declares every symbol that it needs from its host",
                  hostSymbols},
                 {"public-names", "names that tools may replace; missing ones are only noted",
                  noteMissingNames},

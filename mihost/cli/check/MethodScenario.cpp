@@ -108,7 +108,7 @@ Verdict groupNode(Subject& subject)
 {
     group const* const made = getgrnam(groupName);
     if (!made)
-        return skippedFor("no group was made");
+        return skippedFor("no group was added");
     std::string const objection = readLoginDefs().groups().objectionTo("gid", made->gr_gid);
     if (!objection.empty())
         return skippedFor(objection);
@@ -122,8 +122,8 @@ Verdict groupNode(Subject& subject)
 Scenario methodScenario()
 {
     std::vector<Check> checks = {
-        {"failure", "an unknown method answers 1 and empties the property", failure},
-        {"success", "LocalGroupAdd answers 0, stores the call and makes the group", success},
+        {"failure", "an unknown method returns 1 and empties the property", failure},
+        {"success", "LocalGroupAdd returns 0, stores the call and adds the group", success},
         {"group-node", "the new group has a node", groupNode},
     };
     for (Check const& check : logChecks())

@@ -101,7 +101,7 @@ std::string nameOf(IC::MutableNode const& node, Property const& property)
     return fmt::format("{}: {} ({})", checks::nameOf(node), property.name, property.id);
 }
 
-/** Looks at each stored value whose property is known. */
+/** Checks each stored value of a known property. */
 template <class Look> void forEachValue(Nodes const& nodes, Look look)
 {
     for (IC::MutableNode const* node : nodes) {
@@ -232,8 +232,8 @@ Findings wrongReads(Nodes const& nodes)
             checkRead(findings, *node, property, values.count(property.id) != 0);
         IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
         if (node->getProperty(unknown, value).getStatus() == 0)
-            findings.push_back(
-                fmt::format("{}: answers the unknown property {}", checks::nameOf(*node), unknown));
+            findings.push_back(fmt::format("{}: returns a value for the unknown property {}",
+                                           checks::nameOf(*node), unknown));
     }
     return findings;
 }

@@ -46,8 +46,7 @@ Verdict answer(Subject& subject)
     IC::Error const error = refresh(subject);
     Findings findings;
     if (error.getStatus() != 0)
-        findings.push_back(
-            fmt::format("the write was answered: {}", static_cast<std::string>(error)));
+        findings.push_back(fmt::format("the write returned: {}", static_cast<std::string>(error)));
     IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
     subject.os().getProperty(IC::property::refresh, value);
     if (static_cast<std::string>(value) != "0")
@@ -79,10 +78,10 @@ Verdict ids(Subject& subject)
     std::set<unsigned int> seen;
     for (IC::MutableNode const* node : subject.nodes())
         if (!seen.insert(node->getNodeId()).second)
-            findings.push_back(fmt::format("{}: the id of another node, too", nameOf(*node)));
+            findings.push_back(fmt::format("{}: another node has this id, too", nameOf(*node)));
     for (IC::MutableNode const* node : accountsOf(subject.nodes()))
         if (node->getNodeId() <= highest)
-            findings.push_back(fmt::format("{}: not a fresh id", nameOf(*node)));
+            findings.push_back(fmt::format("{}: not a new id", nameOf(*node)));
     return {findings};
 }
 
@@ -124,11 +123,11 @@ Verdict tree(Subject& subject)
 Scenario refreshScenario()
 {
     std::vector<Check> checks = {
-        {"answer", "writing 0 to refresh answers 0 and stores the 0", answer},
+        {"answer", "writing 0 to refresh returns 0 and stores the 0", answer},
         {"deleted", "each user and group node is deleted once, and no other", deleted},
-        {"node-ids", "the new nodes have fresh ids", ids},
+        {"node-ids", "the new nodes have new ids", ids},
         {"published", "each new node is published once, and no other", published},
-        {"tree", "the new nodes are as those at the start", tree},
+        {"tree", "the new nodes are the same as at the start", tree},
     };
     for (Check const& check : logChecks())
         checks.push_back(check);

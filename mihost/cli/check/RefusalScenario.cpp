@@ -29,7 +29,7 @@ Verdict build(Subject& subject)
     Findings findings;
     if (error.getStatus() != 0)
         findings.push_back(
-            fmt::format("the refresh was answered: {}", static_cast<std::string>(error)));
+            fmt::format("the refresh returned: {}", static_cast<std::string>(error)));
     std::size_t const tried = subject.events().published().size();
     if (tried != expected)
         findings.push_back(fmt::format("{} nodes were published rather than {}", tried, expected));
@@ -58,7 +58,7 @@ Scenario refusalScenario()
 {
     return {"refusal",
             {
-                {"build", "a refresh goes on when the host refuses its nodes", build},
+                {"build", "a refresh continues if the host refuses its nodes", build},
                 {"messages", "each refusal is logged once, as an error", messages},
             }};
 }

@@ -63,7 +63,7 @@ template <std::size_t Resources::*count> Verdict nothingLeft(Subject& subject)
 Verdict children(Subject&)
 {
     if (growth().after.children)
-        return {{"a child is running, or has ended and was not waited for"}};
+        return {{"a child process is running, or ended and was not waited for"}};
     return {};
 }
 
@@ -72,11 +72,11 @@ Verdict heap(Subject& subject)
     std::size_t const before = growth().before.heap;
     std::size_t const after = growth().after.heap;
     if (before == 0)
-        return skippedFor("the allocator of this build does not say what is in use");
+        return skippedFor("the allocator of this build does not report memory in use");
     std::size_t const bound = subject.rounds() * heapForARound;
     if (after <= before + bound)
         return {};
-    return {{fmt::format("{} bytes more after {} rounds; {} are allowed", after - before,
+    return {{fmt::format("{} bytes more after {} rounds ({} are allowed)", after - before,
                          subject.rounds(), bound)}};
 }
 
@@ -86,7 +86,7 @@ Scenario roundsScenario()
 {
     return {"rounds",
             {
-                {"life", "load, initialize, refresh, unload and close, again and again", rounds},
+                {"life", "load, initialize, refresh, unload and close, repeatedly", rounds},
                 {"descriptors", "no descriptor is left open", nothingLeft<&Resources::descriptors>},
                 {"children", "no child is left", children},
                 {"threads", "no thread is left", nothingLeft<&Resources::threads>},

@@ -17,7 +17,7 @@ Verdict initialize(Subject& subject)
     IC::Error const error = subject.initialize();
     Findings findings;
     if (error.getStatus() != 0)
-        findings.push_back(fmt::format("initialize answered: {}", static_cast<std::string>(error)));
+        findings.push_back(fmt::format("initialize returned: {}", static_cast<std::string>(error)));
     IC::Error const* const kept = subject.plugin().status();
     if (kept && kept->getStatus() != error.getStatus())
         findings.push_back(fmt::format("the status of OpenMI is {} rather than {}",
@@ -57,10 +57,10 @@ Verdict close(Subject& subject)
 Scenario startScenario()
 {
     std::vector<Check> checks = {
-        {"initialize", "initialize answers 0 and publishes nothing", initialize},
+        {"initialize", "initialize returns 0 and publishes nothing", initialize},
         {"node-types", "each kind of node is there, in the order of building",
          onTree<wrongTypeOrder>},
-        {"node-ids", "ids count on from the interface's own", onOwnTree<wrongIds>},
+        {"node-ids", "ids count up from the interface's own", onOwnTree<wrongIds>},
         {"parents", "each node names its parent", onTree<wrongParents>},
         {"indexes", "single nodes have the index 0, others count from 1", onTree<wrongIndexes>},
         {"status", "each node has the status 1", onTree<wrongStatuses>},
@@ -69,10 +69,10 @@ Scenario startScenario()
         {"property-ids", "each kind of node has its properties and no others",
          onTree<wrongPropertyIds>},
         {"property-kinds", "each value is of its property's kind", onTree<wrongKinds>},
-        {"property-flags", "each flag is true but that of the system's requested state",
+        {"property-flags", "each flag is true except that of the system's requested state",
          onTree<wrongFlags>},
         {"property-values", "fixed values, lengths and counts are right", onTree<wrongValues>},
-        {"reads", "one node of each kind answers reads", onTree<wrongReads>},
+        {"reads", "one node of each kind can be read", onTree<wrongReads>},
         {"unload", "no node is left after unload", unload},
     };
     for (Check const& check : logChecks())

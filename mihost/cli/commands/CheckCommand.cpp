@@ -26,16 +26,18 @@ class CheckCommand : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("PLUGIN", plugin_, "the file to check; by default that of --plugin")
+        app.add_option("PLUGIN", plugin_,
+                       "the file to check; by default the plug-in that mihost loads")
             ->type_name("FILE");
         choices_
             .restrict(app.add_option("--format", format_, "how to show the results"),
                       {text, tap, junit})
             ->capture_default_str();
-        app.add_option("--rounds", rounds_, "start and stop so often when looking for leaks")
+        app.add_option("--rounds", rounds_, "number of starts and stops when looking for leaks")
             ->check(between(1, 1000))
             ->capture_default_str();
-        app.add_option("--time-limit", timeLimit_, "end each group of checks after so many seconds")
+        app.add_option("--time-limit", timeLimit_,
+                       "stop each group of checks after this many seconds")
             ->type_name("SECONDS")
             ->check(between(1, 86400))
             ->capture_default_str();
@@ -62,7 +64,7 @@ private:
         if (options.format != Format::TableText && format_ != text)
             throw Failure(BadUsage, "check: --format and -o exclude each other");
         if (!options.trace.empty())
-            throw Failure(BadUsage, "check: no trace can be written (leave out --trace)");
+            throw Failure(BadUsage, "check: --trace is not supported (leave it out)");
     }
 
     checks::Results runAll(Options const& options) const
@@ -103,7 +105,7 @@ private:
 
 CommandRow const commandRows::check{
     "check",
-    "check a plug-in in a sandbox, as a host sees it",
+    "check a plug-in from the host's side, in a sandbox",
     newCommand<CheckCommand>,
     {
         {"mihost check --rounds 1", "check the installed plug-in"},

@@ -21,10 +21,9 @@ void failForNoAccount(char const* kind, std::string const& name,
                       std::vector<std::string> const& known)
 {
     std::string const meant = nearest(name, known);
-    throw Failure(NotFound,
-                  fmt::format("no local {} '{}' ({})", kind, name,
-                              meant.empty() ? fmt::format("'mihost list {}s' shows them", kind)
-                                            : fmt::format("did you mean '{}'?", meant)));
+    throw Failure(NotFound, fmt::format("no local {} '{}' ({})", kind, name,
+                                        meant.empty() ? fmt::format("see 'mihost list {}s'", kind)
+                                                      : fmt::format("did you mean '{}'?", meant)));
 }
 
 } // namespace mihost

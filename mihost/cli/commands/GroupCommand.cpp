@@ -29,7 +29,7 @@ std::vector<Task> const tasks = {
         {{"GROUP", "GroupName", "", "the group's name"}},
         {
             {"mihost group delete staff", "delete after a prompt"},
-            {"mihost --sandbox group delete staff -y", "try it in a copy of this machine"},
+            {"mihost --sandbox group delete staff -y", "try it in a sandbox"},
         },
     }
         .asking("delete the group {}"),
@@ -40,7 +40,7 @@ std::vector<Task> const tasks = {
         {localGroup, member},
         {
             {"mihost group add-member staff jdoe", "make jdoe a member of staff"},
-            {"mihost --sandbox group add-member staff jdoe", "try it in a copy of this machine"},
+            {"mihost --sandbox group add-member staff jdoe", "try it in a sandbox"},
         },
     },
     {
@@ -49,7 +49,7 @@ std::vector<Task> const tasks = {
         "LocalGroupDelUser",
         {localGroup, member},
         {
-            {"mihost group remove-member crew jdoe", "end jdoe's membership of crew"},
+            {"mihost group remove-member crew jdoe", "remove jdoe from crew"},
             {"mihost --json group remove-member crew jdoe", "print what changed as JSON"},
         },
     },

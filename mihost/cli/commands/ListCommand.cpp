@@ -43,8 +43,9 @@ public:
         NodeKind const& kind = *findList(kind_);
         bool const isLog = kind.type == IC::nodeType::logEntry;
         if (std::string const option = logOptions_.firstGiven(); !isLog && !option.empty())
-            throw Failure(BadUsage, fmt::format("list {}: {} is an option of 'mihost list log'",
-                                                kind_, option));
+            throw Failure(BadUsage,
+                          fmt::format("list {}: {} is an option of the log (use 'mihost list log')",
+                                      kind_, option));
         logOptions_.check(session.options());
         if (logOptions_.follows()) {
             logOptions_.follow(session);
@@ -67,7 +68,7 @@ public:
             writeNodes(kind, nodes, {session.secrets(), shownText}, selection_, out);
         });
         if (isEmpty && !out.takesDocuments())
-            warn(fmt::format("nothing to list under {}; see 'mihost doctor'", kind_));
+            warn(fmt::format("nothing to list under {} (see 'mihost doctor')", kind_));
     }
 
 private:

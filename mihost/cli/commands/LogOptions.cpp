@@ -64,8 +64,8 @@ void LogOptions::declare(CLI::App& app)
     app.add_option("--grep", pattern_,
                    "log: show entries whose message matches this extended regular expression")
         ->type_name("PATTERN");
-    app.add_flag("--follow", follow_, "log: go on with new lines as they come");
-    app.add_flag("--no-hostname", noHostName_, "log: leave out the name of the host");
+    app.add_flag("--follow", follow_, "log: follow new lines as they arrive");
+    app.add_flag("--no-hostname", noHostName_, "log: omit the name of the host");
 }
 
 std::string LogOptions::firstGiven() const

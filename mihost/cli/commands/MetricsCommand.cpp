@@ -74,9 +74,9 @@ public:
     void declare(CLI::App& app) override
     {
         app.add_option("--output", output_,
-                       "put them into this file, which readers never see half written");
+                       "write the metrics to this file, replacing it atomically");
         app.add_flag("--accounts", accounts_,
-                     "also series of each account, with its name as a label");
+                     "add series for each account, with its name as a label");
     }
 
     void run(Session& session) override
@@ -119,10 +119,10 @@ private:
 
 CommandRow const commandRows::metrics{
     "metrics",
-    "print figures for Prometheus",
+    "print metrics for Prometheus",
     newCommand<Metrics>,
     {
-        {"mihost metrics", "show the figures"},
+        {"mihost metrics", "print the metrics"},
         {"mihost metrics --output /tmp/mihost.prom", "replace a file that node_exporter reads"},
     },
     CommandRow::NotInShell,

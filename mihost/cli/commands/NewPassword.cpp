@@ -54,8 +54,8 @@ std::string readNewPassword(Session const& session, std::string const& file)
     if (!file.empty() && file != "-")
         return passwordIn(textOf(file), file);
     if (session.isScripted())
-        throw Failure(BadUsage, "no password can be read, since standard input is the script (use "
-                                "--password-file FILE)");
+        throw Failure(BadUsage, "cannot read a password from standard input, which is the script "
+                                "(use --password-file FILE)");
     return terminal::canAsk() ? askTwice() : terminal::readSecret("Password");
 }
 

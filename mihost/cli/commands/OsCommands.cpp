@@ -1,4 +1,4 @@
-// The operating-system node's command properties, under names of their own.
+// The command properties of the operating-system node as commands.
 
 #include "host/Properties.h"
 #include "mihost/cli/change/Clearance.h"
@@ -76,8 +76,7 @@ class Power : public Command
 public:
     void declare(CLI::App& app) override
     {
-        choices_
-            .restrict(app.add_option("ACTION", action_, "what the machine does"), {restart, halt})
+        choices_.restrict(app.add_option("ACTION", action_, "restart or halt"), {restart, halt})
             ->required();
     }
 
@@ -98,7 +97,7 @@ private:
 
 CommandRow const commandRows::refresh{
     "refresh",
-    "build the user and group nodes again",
+    "rebuild the user and group nodes",
     newCommand<Refresh>,
     {
         {"mihost refresh", "read the accounts again"},
@@ -112,7 +111,7 @@ CommandRow const commandRows::clearLog{
     newCommand<ClearLog>,
     {
         {"mihost clear-log", "empty the log after a prompt"},
-        {"mihost --sandbox clear-log -y", "try it in a copy of this machine"},
+        {"mihost --sandbox clear-log -y", "try it in a sandbox"},
     },
 };
 

@@ -16,12 +16,12 @@ namespace mihost
 namespace
 {
 
-/** A write that is asked about first. */
+/** A write that needs a prompt. */
 struct Danger {
     unsigned int nodeType;
     unsigned int property;
     unsigned int value;
-    char const* what; // {} stands for the account's name
+    char const* what; // {} is the account's name
 };
 
 constexpr Danger dangers[] = {
@@ -106,7 +106,7 @@ public:
         if (!property)
             throw Failure(
                 NotFound,
-                fmt::format("set: property '{}' of node '{}' is unknown, so it is not written",
+                fmt::format("set: unknown property '{}' of node '{}' (see 'mihost properties')",
                             name_, address_));
         if (property->has(Property::Secret) && text_ == toBeAsked)
             text_ = session.askSecret(fmt::format("{} hash", property->name));
@@ -132,7 +132,7 @@ CommandRow const commandRows::set{
     "write one property of a node",
     newCommand<Set>,
     {
-        {"mihost set os refresh 0", "build the user and group nodes again"},
+        {"mihost set os refresh 0", "rebuild the user and group nodes"},
         {"mihost --sandbox set user:jdoe password '!'", "try locking an account's password"},
     },
 };

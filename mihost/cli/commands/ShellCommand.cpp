@@ -42,7 +42,7 @@ CommandRow const commandRows::shell{
     "run many commands on one loaded plug-in",
     newCommand<ShellCommand>,
     {
-        {"mihost --sandbox shell", "type commands in a copy of this machine"},
+        {"mihost --sandbox shell", "type commands in a sandbox"},
         {"echo 'get os os-name' | mihost shell", "run a script"},
     },
     CommandRow::NotInShell,

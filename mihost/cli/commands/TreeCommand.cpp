@@ -10,7 +10,7 @@ namespace mihost
 namespace
 {
 
-/** The node and everything below it; parents stand before their children in the list. */
+/** The node and everything below it; the list has parents before their children. */
 std::vector<IC::MutableNode*> branchOf(std::vector<IC::MutableNode*> const& nodes,
                                        IC::MutableNode const& top)
 {
@@ -29,7 +29,7 @@ class Tree : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("NODE", address_, "show only this node and what is below it");
+        app.add_option("NODE", address_, "show only this node and its descendants");
         app.add_flag("--all", all_, "show every node's properties");
     }
 

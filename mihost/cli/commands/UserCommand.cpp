@@ -10,13 +10,13 @@ namespace
 
 constexpr TaskValue user = {"USER", "UserName", "", "login name"};
 constexpr TaskValue minDays = {"--min-days", "daysMustKeepPassword", "N",
-                               "keep a new password for at least N days"};
+                               "set the minimum password age"};
 constexpr TaskValue maxDays = {"--max-days", "daysMustChangePasswordAfter", "N",
-                               "let a password expire after N days"};
+                               "set the maximum password age"};
 constexpr TaskValue warnDays = {"--warn-days", "daysWarnBeforePasswordExpire", "N",
-                                "warn N days before it expires"};
+                                "warn N days before the password expires"};
 constexpr TaskValue inactiveDays = {"--inactive-days", "daysExpireAfter", "N",
-                                    "disable the account N days after its password expired"};
+                                    "disable the account N days after the password expired"};
 
 std::vector<Task> const tasks = {
     {
@@ -35,22 +35,22 @@ std::vector<Task> const tasks = {
             warnDays,
             inactiveDays,
             {"--expires", "passwordExpirationDate", "DAY",
-             "let the account expire on DAY, YYYY-MM-DD or never"},
+             "expire the account on DAY, YYYY-MM-DD or never"},
         },
         {
             {"mihost user add asmith --full-name 'A. Smith' --shell /bin/bash",
              "an account without a password"},
-            {"mihost user add asmith --password --max-days 90", "ask for a password"},
+            {"mihost user add asmith --password --max-days 90", "prompt for a password"},
         },
     },
     Task{
         "delete",
-        "delete an account; its home directory and mail stay",
+        "delete an account, keeping its home directory and mail",
         "UserDel",
         {user},
         {
             {"mihost user delete jdoe", "delete after a prompt"},
-            {"mihost --sandbox user delete jdoe -y", "try it in a copy of this machine"},
+            {"mihost --sandbox user delete jdoe -y", "try it in a sandbox"},
         },
     }
         .asking("delete the account {}"),
@@ -90,7 +90,7 @@ std::vector<Task> const tasks = {
         "UserSetPassword",
         {user, {"--password", "Password", "", ""}},
         {
-            {"mihost user set-password jdoe", "ask for the password twice"},
+            {"mihost user set-password jdoe", "prompt for the password"},
             {"mihost user set-password jdoe --password-file /root/secret", "read it from a file"},
         },
     },
@@ -100,8 +100,8 @@ std::vector<Task> const tasks = {
         "UserSetAttrib",
         {user, {"DAY", "passwordExpirationDate", "", "YYYY-MM-DD or never"}},
         {
-            {"mihost user expire jdoe 2030-12-31", "let the account expire on that day"},
-            {"mihost user expire jdoe never", "let it never expire"},
+            {"mihost user expire jdoe 2030-12-31", "expire the account on that day"},
+            {"mihost user expire jdoe never", "remove the expiry date"},
         },
     },
     Task{
@@ -111,7 +111,7 @@ std::vector<Task> const tasks = {
         {user, minDays, maxDays, warnDays, inactiveDays},
         {
             {"mihost user age jdoe --max-days 90 --warn-days 14", "change the password quarterly"},
-            {"mihost user age jdoe --max-days 99999", "let the password never expire"},
+            {"mihost user age jdoe --max-days 99999", "set no maximum password age"},
         },
     }
         .needingAnOption(),

@@ -28,11 +28,11 @@ public:
         app.add_option("NODE", address_, "an id, or a name such as os or log:1; see 'mihost tree'")
             ->required();
         app.add_option("PROPERTY", names_, "ids or names, see 'mihost properties'")->required();
-        app.add_option("--interval", interval_, "wait S seconds between readings")
+        app.add_option("--interval", interval_, "wait S seconds between reads")
             ->check(between(0, 86400))
             ->type_name("S")
             ->capture_default_str();
-        app.add_option("-n,--count", count_, "stop after N readings; 0 means never")
+        app.add_option("-n,--count", count_, "stop after N reads; 0 means never")
             ->check(between(0, 1000000000))
             ->type_name("N")
             ->capture_default_str();
@@ -48,7 +48,7 @@ public:
         bool isThere = true;
         for (unsigned int reading = 1;; ++reading) {
             NodeView view = readNode(session, isThere);
-            // Ctrl-C reaches the commands, too: what was read then is not to be shown.
+            // Ctrl-C also reaches the commands, so this read is incomplete and not shown.
             if (!waitForNextRound(session.out(), signals, 0))
                 return;
             view.properties = changedOf(view, last);
@@ -131,7 +131,7 @@ CommandRow const commandRows::watch{
     "print properties whenever they change",
     newCommand<Watch>,
     {
-        {"mihost watch os physical-memory-free -n 2", "stop after two readings"},
+        {"mihost watch os physical-memory-free -n 2", "stop after two reads"},
         {"mihost watch log:1 message --interval 0.5 -n 2", "read twice a second"},
     },
 };

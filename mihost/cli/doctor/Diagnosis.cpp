@@ -30,7 +30,7 @@ namespace
 
 constexpr char releaseFile[] = "/etc/release";
 
-/** By the rights that this process has, which need not be those of its user. */
+/** By the effective rights of this process, not those of its user. */
 Problem accessProblem(std::string const& path, int mode = R_OK)
 {
     if (faccessat(AT_FDCWD, path.c_str(), mode, AT_EACCESS) == 0)
@@ -53,7 +53,7 @@ struct CommandNeed {
 };
 
 constexpr CommandNeed commandNeeds[] = {
-    {"/bin/sh", "everything that is learnt or changed by a command", "dash", "bash"},
+    {"/bin/sh", "everything read or changed by a command", "dash", "bash"},
     {"lsmod", "all drivers", "kmod", "kmod"},
     {"modinfo", "versions and descriptions of drivers", "kmod", "kmod"},
     {"wc", "all log entries", "coreutils", "coreutils"},
@@ -66,7 +66,8 @@ constexpr CommandNeed commandNeeds[] = {
     {"cut", "os-version of os", "coreutils", "coreutils"},
     {"chage", "writing inactive-time and password-expiration of users", "passwd", "shadow-utils"},
     {"chpasswd", "writing password of users", "passwd", "shadow-utils"},
-    {"rm", "writing password of users: a file with the hash stays", "coreutils", "coreutils"},
+    {"rm", "writing password of users: the file with the hash is not removed", "coreutils",
+     "coreutils"},
     {"userdel", "writing delete of users", "passwd", "shadow-utils"},
     {"/usr/sbin/useradd", "the method UserAdd", "passwd", "shadow-utils"},
     {"/usr/sbin/userdel", "the method UserDel", "passwd", "shadow-utils"},
@@ -81,7 +82,7 @@ constexpr CommandNeed commandNeeds[] = {
     {"/sbin/shutdown", "restart and halt", "systemd-sysv", "systemd"},
 };
 
-/** The first of the folders that the command stands in; empty for none. */
+/** The first of the directories that has the command; empty for none. */
 std::string folderOf(std::string const& command, std::string const& path)
 {
     std::istringstream folders(path);
@@ -131,14 +132,14 @@ Need redHatNeed(std::string const& what, Problem const& problem, std::string con
     return {what, problem, effect, "", redHat, hasRedHatPackages() ? "" : noFix};
 }
 
-/** Where there is this file, UserAdd gives useradd an option that newer ones do not have. */
+/** If this file exists, UserAdd passes an option that newer versions of useradd lack. */
 std::vector<Need> groupOption()
 {
     if (!isThere("/etc/redhat-release"))
         return {};
     std::string const said = commandTap::outputOf("LC_ALL=C /usr/sbin/useradd -n 2>&1");
     bool const isUnknown = said.find("invalid option") != std::string::npos;
-    return {{"useradd -n", isUnknown ? Problem("useradd does not know it") : std::nullopt,
+    return {{"useradd -n", isUnknown ? Problem("not supported by useradd") : std::nullopt,
              "the method UserAdd", "", "",
              "the useradd of this system has no such option: add accounts with useradd itself"}};
 }
@@ -164,10 +165,9 @@ std::vector<Need> capabilities()
     for (CapabilityNeed const& row : capabilityNeeds)
         needs.push_back(
             {fmt::format("capability {}", row.name),
-             hasCapability(row.capability) ? std::nullopt : Problem("root does not have it here"),
-             row.effect, "", "",
-             "no process can gain it: it has to be granted where this container or service is "
-             "started"});
+             hasCapability(row.capability) ? std::nullopt : Problem("root lacks it"), row.effect,
+             "", "",
+             "no process can gain it: grant it where this container or service is started"});
     return needs;
 }
 
@@ -183,7 +183,7 @@ std::vector<Need> surroundings()
          "localectl set-locale LANG=C.UTF-8", ""},
     };
     if (isThere(systemLog))
-        needs.push_back({"leave to empty the system log", accessProblem(systemLog, W_OK),
+        needs.push_back({"permission to empty the system log", accessProblem(systemLog, W_OK),
                          "clear-log", "sudo mihost", "sudo mihost", ""});
     if (isRoot) {
         std::vector<Need> const ofRoot = capabilities();
@@ -200,7 +200,7 @@ std::vector<Need> commandLines()
     if (isThere("/usr/bin/passwd"))
         needs.push_back(redHatNeed(
             "passwd --stdin",
-            passwdReadsStdin() ? std::nullopt : Problem("passwd does not know it"),
+            passwdReadsStdin() ? std::nullopt : Problem("not supported by passwd"),
             "Password in methods: mihost passes a hash, other hosts store the plain text",
             "dnf install passwd", "the passwd of this system has no such option"));
     return needs;
@@ -228,17 +228,17 @@ std::vector<Need> accounts()
          "sudo mihost, or pwconv", "sudo mihost, or pwconv", ""},
     };
     if (isThere(accountFile))
-        needs.push_back({"form of /etc/passwd", problemOfAccounts(contentOf(accountFile)),
+        needs.push_back({"format of /etc/passwd", problemOfAccounts(contentOf(accountFile)),
                          "that user; after a line that is too long, all users", "vipw", "vipw",
                          ""});
     if (isThere(groupFile))
-        needs.push_back({"form of /etc/group", problemOfGroups(contentOf(groupFile)), "that group",
-                         "vigr", "vigr", ""});
+        needs.push_back({"format of /etc/group", problemOfGroups(contentOf(groupFile)),
+                         "that group", "vigr", "vigr", ""});
     if (isThere(accountFile) && isThere(shadowFile))
         needs.push_back(
             {"order of /etc/shadow",
              problemOfShadow(localNames(*findKind(IC::nodeType::user)), contentOf(shadowFile)),
-             "passwords and ageing of that user and of all after it", "pwconv; pwck -s",
+             "passwords and ageing of that user and all later ones", "pwconv; pwck -s",
              "pwconv; pwck -s", ""});
     return needs;
 }
@@ -248,7 +248,7 @@ Problem noneOf(std::vector<std::string> const& files)
 {
     if (std::any_of(files.begin(), files.end(), isThere))
         return std::nullopt;
-    return "none of the files that are known";
+    return "no known file exists";
 }
 
 std::vector<Need> release()
@@ -316,7 +316,7 @@ std::vector<Need> log()
          "dnf install rsyslog; systemctl enable --now rsyslog", ""}};
     if (!isThere(systemLog))
         return needs;
-    needs.push_back({"classic stamps in the system log",
+    needs.push_back({"traditional time stamps in the system log",
                      problemOfStamps(LogFile(systemLog).newestLines(mostLogEntries)),
                      "messages and times of log entries", traditional, traditional, ""});
     return needs;

@@ -97,7 +97,7 @@ bool isStamp(std::string_view line)
 {
     static constexpr std::array<std::string_view, 12> months = {
         "Jan", "Feb", "Mar", "Apr", "May", "Jun", "Jul", "Aug", "Sep", "Oct", "Nov", "Dec"};
-    constexpr std::string_view form = " 00 00:00:00 "; // 0 is a digit; the first may be a blank
+    constexpr std::string_view form = " 00 00:00:00 "; // 0 means a digit; the first may be a blank
     constexpr std::size_t monthLength = 3;
     if (std::find(months.begin(), months.end(), line.substr(0, monthLength)) == months.end())
         return false;
@@ -139,7 +139,7 @@ Problem problemOfShadow(std::vector<std::string> const& accounts, std::string co
     for (std::string const& account : accounts) {
         auto const found = std::find(entry, shadow.end(), account);
         if (found == shadow.end())
-            return fmt::format("no entry for '{}' where the order of /etc/passwd wants it",
+            return fmt::format("no entry for '{}' at its place in the order of /etc/passwd",
                                account);
         entry = found + 1;
     }
@@ -153,7 +153,7 @@ Problem problemOfRelease(std::string const& text)
     auto const lines = linesOf(text);
     if (lines.size() >= 3 && lines[1].size() >= shortestMajor && lines[2].size() >= shortestMinor)
         return std::nullopt;
-    return "no lines like 'VERSION = 1' and 'PATCHLEVEL = 0' behind the first";
+    return "no lines like 'VERSION = 1' and 'PATCHLEVEL = 0' after the first";
 }
 
 Problem problemOfStamps(std::vector<std::string> const& lines)
@@ -162,7 +162,7 @@ Problem problemOfStamps(std::vector<std::string> const& lines)
                                     [](std::string const& line) { return !isStamp(line); });
     if (other == lines.rend())
         return std::nullopt;
-    return fmt::format("a line begins with '{}' rather than a stamp like 'Jan  2 03:04:05 '",
+    return fmt::format("a line begins with '{}' instead of a time stamp like 'Jan  2 03:04:05 '",
                        other->substr(0, 16));
 }
 

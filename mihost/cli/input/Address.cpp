@@ -51,10 +51,10 @@ Address parseAddress(std::string const& text)
             return {&kind, 0, single ? "" : text.substr(colon + 1)};
     for (NodeKind const& kind : nodeKinds())
         if (!kind.single && (word == kind.address || word == kind.listName))
-            throw Failure(NotFound, fmt::format("no node '{}': write {}:NAME; 'mihost list {}' "
-                                                "shows them",
-                                                text, kind.address, kind.listName));
-    throw Failure(NotFound, fmt::format("no node '{}': a node is {}", text, forms));
+            throw Failure(NotFound,
+                          fmt::format("no node '{}' (write {}:NAME; see 'mihost list {}')", text,
+                                      kind.address, kind.listName));
+    throw Failure(NotFound, fmt::format("no node '{}' (use {})", text, forms));
 }
 
 std::vector<IC::MutableNode*> nodesOf(IC::ManagementInterface& interface)
@@ -77,8 +77,8 @@ IC::MutableNode& findNode(std::vector<IC::MutableNode*> const& nodes, std::strin
     if (found != nodes.end())
         return **found;
     std::string const meant = nameMeant(nodes, wanted);
-    throw Failure(NotFound, fmt::format("no node '{}' in the tree; {}", address,
-                                        meant.empty() ? "'mihost tree' shows all of them"
+    throw Failure(NotFound, fmt::format("no node '{}' in the tree ({})", address,
+                                        meant.empty() ? "see 'mihost tree'"
                                                       : fmt::format("did you mean {}:{}?",
                                                                     wanted.kind->address, meant)));
 }

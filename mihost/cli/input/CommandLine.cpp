@@ -35,7 +35,7 @@ std::string helpFor(CLI::App const& app, bool inShell)
     return words.empty() ? "help" : "help " + words;
 }
 
-/** Those that may stand where the words were given. */
+/** The options allowed at this place. */
 std::vector<std::string> optionNames(CLI::App const& app)
 {
     std::vector<std::string> names;
@@ -46,7 +46,7 @@ std::vector<std::string> optionNames(CLI::App const& app)
     return names;
 }
 
-/** The argument that was typed where a command of this command may stand; empty for none. */
+/** The argument in the place of a subcommand; empty for none. */
 std::string wordForCommand(CLI::App const& command)
 {
     if (command.get_subcommands({}).empty())
@@ -68,13 +68,11 @@ Colours coloursOf(std::string const& name)
 void checkFormat(Format format, Command const& command, std::string const& name)
 {
     if (isRows(format) && !command.hasRows())
-        throw Failure(
-            BadUsage,
-            fmt::format("{}: -o {} needs results in rows (use table, json, jsonl or yaml)", name,
-                        formatNames()[static_cast<std::size_t>(format)]));
+        throw Failure(BadUsage, fmt::format("{}: -o {} needs rows (use table, json, jsonl or yaml)",
+                                            name, formatNames()[static_cast<std::size_t>(format)]));
 }
 
-/** What is wrong with the first word that nothing takes. */
+/** The error for the first unexpected word. */
 std::string excessOf(CLI::App const& app, std::string const& help)
 {
     std::string const word = app.remaining(true).front();
@@ -127,7 +125,7 @@ void CommandLine::declareForProgram(CLI::App& app)
 {
     app.set_version_flag("--version", "mihost " MIHOST_VERSION);
     app.add_option("-H,--host", options_.host,
-                   "run the command on HOST by ssh, with the mihost that is installed there")
+                   "run the command on HOST by ssh, with the mihost installed there")
         ->type_name("[USER@]HOST")
         ->each(expectHost);
     app.add_option("--plugin", options_.plugin, "load this plug-in file")->type_name("FILE");
@@ -135,13 +133,14 @@ void CommandLine::declareForProgram(CLI::App& app)
                    "write every log message to FILE, - for standard error")
         ->type_name("FILE");
     app.add_flag("--sandbox", options_.sandbox,
-                 "run everything in a copy of this machine; nothing on the machine changes");
-    app.add_option("--overlay", options_.overlay, "lay the files of DIR over the sandbox first")
+                 "run everything in a copy of this machine, without changing it");
+    app.add_option("--overlay", options_.overlay,
+                   "replace files of the sandbox by those of DIR; implies --sandbox")
         ->type_name("DIR");
     app.add_flag("--no-accel", options_.noAccel,
-                 "run every command of the plug-in, also those that could be answered in-process");
+                 "turn the accelerator off: run every command of the plug-in");
     app.add_flag("--timing", options_.timing,
-                 "show the time of each phase of the start, and what was answered in-process");
+                 "show the time of each start-up phase, and which commands were accelerated");
 }
 
 void CommandLine::setFormat(Format format)
@@ -161,16 +160,16 @@ void CommandLine::declareOutput(CLI::App& app)
                           "print results in this format"),
                       formatNames());
     app.add_flag_callback(
-        "--json", [this] { setFormat(Format::JsonText); }, "as -o json");
-    app.add_flag("--no-headers", options_.noHeaders, "leave the headings of tables and CSV out");
-    app.add_flag("--full", options_.full, "wrap nothing at the width of the terminal");
+        "--json", [this] { setFormat(Format::JsonText); }, "same as -o json");
+    app.add_flag("--no-headers", options_.noHeaders, "omit the headings of tables and CSV");
+    app.add_flag("--full", options_.full, "do not wrap at the width of the terminal");
     app.add_flag("--no-pager", options_.noPager, "do not page long tables and trees");
     choices_.restrict(app.add_option_function<std::string>(
                           "--color",
                           [this](std::string const& when) { options_.colours = coloursOf(when); },
                           "when to use colours"),
                       {"auto", "always", "never"});
-    app.add_flag("-q,--quiet", options_.quiet, "show no warnings and no progress");
+    app.add_flag("-q,--quiet", options_.quiet, "suppress warnings and progress");
 }
 
 void CommandLine::declare(CLI::App& app)
@@ -183,7 +182,7 @@ void CommandLine::declare(CLI::App& app)
     app.add_flag("--show-secrets", options_.showSecrets, "show password hashes");
     app.add_flag("-y,--yes", options_.yes, "answer yes to all prompts");
     app.add_option("--lock-timeout", options_.lockTimeout,
-                   "give up after S seconds if another mihost is changing this machine")
+                   "wait at most S seconds while another mihost changes this machine")
         ->check(between(0, 86400))
         ->type_name("S")
         ->capture_default_str();
@@ -202,9 +201,10 @@ void CommandLine::declareCommands(CLI::App& app)
         all_.back().command->declare(command);
         setExamples(command, row->examples);
     }
-    app.add_subcommand(helpCommand, "show help for a command")
-        ->group("Commands")
-        ->add_option("COMMAND", helpWords_, "such as get, or user add");
+    CLI::App& help = *app.add_subcommand(helpCommand, "show help for a command")->group("Commands");
+    help.add_option("COMMAND", helpWords_, "such as get, or user add");
+    setExamples(help, {{"mihost help get", "the arguments and options of get"},
+                       {"mihost help user add", "those of one task"}});
 }
 
 Choices const* CommandLine::choicesOf(CLI::Option const& option) const
@@ -231,12 +231,12 @@ void CommandLine::parse(std::vector<std::string> words)
     CLI::App app(
         inShell ? "Commands run on the loaded plug-in. Run 'help COMMAND' for details, exit to "
                   "leave."
-                : "Loads the management-interface plug-in, shows its tree and drives it.\n"
+                : "Loads the management-interface plug-in, and shows and changes its tree.\n"
                   "Without a command it shows the tree. Run 'mihost help COMMAND' for details.",
         inShell ? "" : "mihost");
     declare(app);
     try {
-        std::reverse(words.begin(), words.end()); // as it wants them
+        std::reverse(words.begin(), words.end()); // in the order that CLI11 expects
         app.parse(words);
         if (app.got_subcommand(helpCommand)) {
             app.clear(); // otherwise it would show the help for help

@@ -20,7 +20,7 @@ bool isControl(char32_t character)
     return character < 0x20 || (character >= 0x7F && character <= 0x9F);
 }
 
-/** What no value may hold, whatever its form. */
+/** Bytes that no value may contain. */
 std::optional<std::string> objectionToCharacters(std::string_view text)
 {
     while (!text.empty()) {
@@ -86,15 +86,15 @@ std::optional<std::string> objectionToForm(Form form, std::string_view text)
         return objectionToWord(text);
     case Form::Path:
         if (text[0] != '/')
-            return "is not an absolute path: it must begin with '/'";
+            return "is not an absolute path (it must begin with '/')";
         return std::nullopt;
     case Form::Digits:
         if (!isDecimal(text) || text.size() > mostDigits)
-            return fmt::format("is not a number: it must be 1 to {} decimal digits", mostDigits);
+            return fmt::format("is not a number (it must be 1 to {} decimal digits)", mostDigits);
         return std::nullopt;
     case Form::Day:
         if (!parseDay(text))
-            return fmt::format("is not a day: it must be {}", dayForm);
+            return fmt::format("is not a day (use {})", dayForm);
         return std::nullopt;
     case Form::Free:
     case Form::Words:

@@ -19,8 +19,8 @@ Method const& method(std::string_view name)
 {
     Method const* const found = findMethod(name);
     if (!found)
-        throw Failure(BadUsage, fmt::format("no method '{}'; {}", name,
-                                            suggestion(name, rowNames(methods()), "there are")));
+        throw Failure(BadUsage, fmt::format("no method '{}' ({})", name,
+                                            suggestion(name, rowNames(methods()), "use")));
     return *found;
 }
 
@@ -28,9 +28,8 @@ Parameter const& parameter(Method const& method, std::string_view name)
 {
     Parameter const* const found = findParameter(method, name);
     if (!found)
-        throw Failure(BadUsage,
-                      fmt::format("{} has no parameter '{}'; {}", method.name, name,
-                                  suggestion(name, rowNames(method.parameters), "it has")));
+        throw Failure(BadUsage, fmt::format("{} has no parameter '{}' ({})", method.name, name,
+                                            suggestion(name, rowNames(method.parameters), "use")));
     return *found;
 }
 
@@ -44,7 +43,7 @@ void checkWhole(MethodCall const& call)
             throw Failure(BadUsage, fmt::format("{} is given twice", parameter.name));
         if (given == 0 && parameter.required)
             throw Failure(BadUsage,
-                          fmt::format("{0} needs {1}, {2}; 'mihost methods {0}' has all",
+                          fmt::format("{0} needs {1}, {2} (see 'mihost methods {0}')",
                                       call.method->name, parameter.name, parameter.meaning));
     }
 }
@@ -69,14 +68,14 @@ std::vector<std::string> split(std::string const& text, char separator)
     return pieces;
 }
 
-/** @param value  as it stands in the text form */
+/** @param value  in the text form */
 void checkTextForm(Parameter const& parameter, std::string const& value)
 {
     if (parameter.form != Form::Day)
         checkAssignment({&parameter, parameter.name, value});
     else if (!parseDateTime(value))
-        throw Failure(BadUsage, fmt::format("{} is not a date-time: it must be {}", parameter.name,
-                                            dateTimeForm));
+        throw Failure(BadUsage,
+                      fmt::format("{} is not a date-time (use {})", parameter.name, dateTimeForm));
 }
 
 MethodCall::Argument argumentOf(Method const& method, std::string const& item)
@@ -84,11 +83,12 @@ MethodCall::Argument argumentOf(Method const& method, std::string const& item)
     std::vector<std::string> const parts = split(item, ':');
     Parameter const& known = parameter(method, parts.empty() ? std::string_view() : parts[0]);
     if (parts.size() != 3)
-        throw Failure(BadUsage, fmt::format("{} must be written {}:{}:VALUE, without ':' in VALUE",
-                                            known.name, known.name, known.type));
-    if (parts[1] != known.type)
         throw Failure(BadUsage,
-                      fmt::format("{} is of type {}, not '{}'", known.name, known.type, parts[1]));
+                      fmt::format("{} is malformed (write {}:{}:VALUE, without ':' in VALUE)",
+                                  known.name, known.name, known.type));
+    if (parts[1] != known.type)
+        throw Failure(BadUsage, fmt::format("{} has the type {}, not '{}'", known.name, known.type,
+                                            parts[1]));
     checkTextForm(known, parts[2]);
     return {&known, parts[2]};
 }
@@ -98,12 +98,12 @@ Assignment parseAssignment(Method const& method, std::string const& text, AskSec
 {
     std::size_t const equals = text.find('=');
     if (equals == std::string::npos && !findParameter(method, text))
-        throw Failure(BadUsage, fmt::format("'{}' is not NAME=VALUE; {}", text,
+        throw Failure(BadUsage, fmt::format("'{}' is not NAME=VALUE ({})", text,
                                             suggestion(text, rowNames(method.parameters),
                                                        fmt::format("{} takes", method.name))));
     Parameter const& known = parameter(method, std::string_view(text).substr(0, equals));
     if (equals == std::string::npos)
-        throw Failure(BadUsage, fmt::format("{0} needs a value: {0}=VALUE", known.name));
+        throw Failure(BadUsage, fmt::format("{0} needs a value (write {0}=VALUE)", known.name));
     std::string value = text.substr(equals + 1);
     if (known.form == Form::Password && value == toBeAsked)
         value = ask(known.name);

@@ -37,7 +37,8 @@ std::vector<std::string> withoutHost(std::vector<std::string> const& words, std:
             rest.erase(first, first + static_cast<std::ptrdiff_t>(count));
             return rest;
         }
-    throw Failure(BadUsage, "--host: it is part of another word (write --host HOST by itself)");
+    throw Failure(BadUsage,
+                  "--host: it is part of another argument (write --host HOST separately)");
 }
 
 void expectHost(std::string const& host)
@@ -54,8 +55,8 @@ std::vector<std::string> remoteCommand(std::string const& host,
                                        std::vector<std::string> const& words,
                                        RemoteTerminal terminal)
 {
-    // With exec no shell stands between: after Ctrl-C it would report the signal instead of the
-    // status.
+    // exec leaves no shell in between, which would report the signal instead of the status after
+    // Ctrl-C.
     std::string line = "exec mihost";
     for (std::string const& word : words)
         line += ' ' + quotedForShell(word);

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <fmt/format.h>
-#include <fmt/ranges.h>
 
 namespace mihost
 {
@@ -17,6 +16,19 @@ std::string inLowerCase(std::string_view text)
         if (letter >= 'A' && letter <= 'Z')
             letter = static_cast<char>(letter - 'A' + 'a');
     return lower;
+}
+
+/** The names, as many as fit into a message. */
+std::string listed(std::vector<std::string> const& names)
+{
+    constexpr std::size_t longestList = 90; // characters
+    std::string list;
+    for (std::string const& name : names) {
+        if (!list.empty() && list.size() + name.size() > longestList)
+            return list + ", ...";
+        list += (list.empty() ? "" : ", ") + name;
+    }
+    return list;
 }
 
 /** How many letters must be added, dropped, replaced or swapped to make one of the other. */
@@ -43,11 +55,12 @@ std::size_t slipsBetween(std::string_view one, std::string_view other)
 
 std::string nearest(std::string_view word, std::vector<std::string> const& names)
 {
-    constexpr std::size_t longest = 64; // what is longer is no slip
+    constexpr std::size_t longest = 64; // longer words are not typing errors
     if (word.size() < 2 || word.size() > longest)
         return "";
     std::string const wanted = inLowerCase(word);
-    std::size_t fewest = word.size() < 6 ? 2 : 3; // one more than is taken for a slip
+    std::size_t const maxCorrections = word.size() < 6 ? 1 : 2;
+    std::size_t fewest = maxCorrections + 1;
     std::string best;
     for (std::string const& name : names) {
         if (name.size() > longest)
@@ -66,8 +79,7 @@ std::string suggestion(std::string_view word, std::vector<std::string> const& na
 {
     if (std::string const meant = nearest(word, names); !meant.empty())
         return fmt::format("did you mean {}?", meant);
-    return fmt::format("{} {}", lead,
-                       names.empty() ? "none" : fmt::format("{}", fmt::join(names, ", ")));
+    return fmt::format("{} {}", lead, names.empty() ? "none" : listed(names));
 }
 
 } // namespace mihost

@@ -154,8 +154,7 @@ void addAccountCounts(Accounts const& accounts, std::time_t now, std::vector<Met
     auto const untilExpiry = [now](Account const& account) {
         return *account.expiry - static_cast<double>(now);
     };
-    Metric expiring{
-        "mi_accounts_expiring", "", "Accounts that expire within so many days from now.", {}};
+    Metric expiring{"mi_accounts_expiring", "", "Accounts that expire within this many days.", {}};
     for (int const days : {7, 30})
         expiring.samples.push_back(
             {{{"days", std::to_string(days)}}, countOf(accounts, [&](Account const& account) {
@@ -176,7 +175,7 @@ void addAccountCounts(Accounts const& accounts, std::time_t now, std::vector<Met
          {{{}, countOf(accounts, [](Account const& account) { return account.disabled; })}}});
     to.push_back({"mi_accounts_password_never_changed",
                   "",
-                  "Accounts without a day of the last password change.",
+                  "Accounts without a date of the last password change.",
                   {{{}, countOf(accounts, [](Account const& account) {
                         return account.passwordChange == 0;
                     })}}});
@@ -231,8 +230,7 @@ void addAccounts(MachineState const& state, AccountSeries series, std::vector<Me
 void addNeeds(std::vector<Need> const& needs, std::vector<Metric>& to)
 {
     Metric ok{"mi_doctor_ok", "", "Whether the machine has what a full tree needs.", {}};
-    Metric fixable{
-        "mi_doctor_fixable", "", "Whether what is missing can be had on this machine.", {}};
+    Metric fixable{"mi_doctor_fixable", "", "Whether this machine can have what is missing.", {}};
     for (Need const& need : needs) {
         ok.samples.push_back({{{"need", need.what}}, need.problem ? 0.0 : 1.0});
         if (need.problem)

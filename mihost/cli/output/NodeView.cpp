@@ -21,7 +21,7 @@ bool isHidden(Property const* row, IC::PropertyValue const& value, Secrets secre
         return false;
     if (row->has(Property::Secret))
         return secrets == Secrets::Hide;
-    // A plain password is shown to nobody, whatever is asked for.
+    // A plain password is never shown.
     return row->has(Property::MayBeSecret) &&
            static_cast<std::string>(value).find("Password") != std::string::npos;
 }
@@ -51,7 +51,7 @@ std::set<unsigned int> idsOf(IC::MutableNode const& node)
     return ids;
 }
 
-/** Adds what the node answers for the property now, where it answers. */
+/** Adds the property's present value if the node returns one. */
 void addLive(NodeView& to, unsigned int id, Secrets secrets, ShadowGap const& gap)
 {
     IC::PropertyValue value = emptyValue();
@@ -98,7 +98,7 @@ NodeView liveView(IC::MutableNode const& node, std::vector<std::string> const& n
         IC::Error const error = node.getProperty(id, value);
         if (error.getStatus() != 0)
             throw Failure(PluginRefused,
-                          fmt::format("property '{}' of node '{}': {}; see 'mihost doctor'", name,
+                          fmt::format("property '{}' of node '{}': {} (see 'mihost doctor')", name,
                                       addressOf(node), static_cast<std::string>(error)));
         result.properties.push_back(view(kind, id, value, secrets, gap));
     }
@@ -118,8 +118,8 @@ unsigned int propertyId(IC::MutableNode const& node, std::string const& name)
         Property const* const row = kind ? findProperty(*kind, each) : nullptr;
         known.push_back(row ? row->name : std::to_string(each));
     }
-    throw Failure(NotFound, fmt::format("node '{}' has no property '{}'; {}", addressOf(node), name,
-                                        suggestion(name, known, "it has")));
+    throw Failure(NotFound, fmt::format("node '{}' has no property '{}' ({})", addressOf(node),
+                                        name, suggestion(name, known, "use")));
 }
 
 std::string valueText(PropertyView const& property)

@@ -65,12 +65,11 @@ bool isBefore(Cell const& one, Cell const& other)
 
 void Selection::declare(CLI::App& app)
 {
-    app.add_option("--columns", columns, "columns to show, with commas between them")
-        ->delimiter(',');
-    app.add_option("--sort", sort, "order the rows by this column; -COLUMN for descending")
+    app.add_option("--columns", columns, "columns to show, separated by commas")->delimiter(',');
+    app.add_option("--sort", sort, "sort the rows by this column; -COLUMN for descending order")
         ->type_name("[-]COLUMN");
     app.add_option("--where", where,
-                   "show only rows whose COLUMN is VALUE, or contains TEXT; may be given again")
+                   "show only rows whose COLUMN is VALUE, or contains TEXT; repeatable")
         ->type_name("COLUMN=VALUE|COLUMN~TEXT")
         ->expected(1)
         ->take_all();
@@ -95,7 +94,7 @@ std::size_t Table::columnOf(std::string const& name) const
         names.push_back(column.name);
     }
     throw Failure(NotFound,
-                  fmt::format("no column '{}'; {}", name, suggestion(name, names, "there are")));
+                  fmt::format("no column '{}' ({})", name, suggestion(name, names, "use")));
 }
 
 Table Table::selected(Selection const& selection) const

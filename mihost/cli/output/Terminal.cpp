@@ -24,7 +24,7 @@ namespace
 
 constexpr unsigned int usualWidth = 80;
 
-/** Byte by byte: what follows the line belongs to whoever reads next. */
+/** Byte by byte, so that the rest is left for the next reader. */
 std::optional<std::string> readLine()
 {
     std::string line;
@@ -44,7 +44,7 @@ std::optional<std::string> readLine()
     }
 }
 
-/** Keeps what is typed from being shown, also past a signal that ends the program. */
+/** Turns echo off; restores it even if a signal ends the program. */
 class EchoOff
 {
 public:
@@ -124,7 +124,7 @@ std::string readSecret(std::string const& prompt)
         secret = readLine();
     }
     if (!secret)
-        throw Failure(BadUsage, fmt::format("{}: standard input holds no line", prompt));
+        throw Failure(BadUsage, fmt::format("{}: standard input is empty", prompt));
     return *secret;
 }
 

@@ -53,8 +53,7 @@ bool isControl(char byte)
     return value < 0x20 || value == 0x7F;
 }
 
-/** Words separated by blanks; what a shell acts on is escaped, blanks may stand in double quotes.
- */
+/** Words separated by blanks; metacharacters are escaped, blanks may be in double quotes. */
 std::optional<std::string> objectionToWords(std::string_view text)
 {
     bool inQuotes = false;
@@ -116,7 +115,7 @@ bool mayRun(char const* line)
     if (!reason)
         return true;
     std::string_view const text = line;
-    warn(fmt::format("a command was not run: {}: {}", text.substr(0, text.find(' ')), *reason));
+    warn(fmt::format("command not run: {}: {}", text.substr(0, text.find(' ')), *reason));
     return false;
 }
 

@@ -64,9 +64,9 @@ Plugin::Plugin(std::string const& file) : library_(dlopen(file.c_str(), RTLD_NOW
     if (!open)
         reason = "it has no entry point OpenMI";
     else if (int const answer = open(&interface_, &status_); answer != 0)
-        reason = fmt::format("OpenMI answered {}", answer);
+        reason = fmt::format("OpenMI returned {}", answer);
     else if (!interface_)
-        reason = "OpenMI handed out no interface";
+        reason = "OpenMI returned no interface";
     if (reason.empty())
         return;
     dlclose(library_);

@@ -32,8 +32,8 @@ void goIntoSandbox(std::string const& overlay)
         return;
     bool const isLimitedRoot = geteuid() == 0 && !hasCapability(CAP_SYS_ADMIN);
     throw Failure(BadUsage,
-                  fmt::format("no sandbox, so nothing was run: {}{}", *reason,
-                              isLimitedRoot ? " (root lacks CAP_SYS_ADMIN here: grant it "
+                  fmt::format("creating the sandbox: {}{}", *reason,
+                              isLimitedRoot ? " (root lacks CAP_SYS_ADMIN: grant it "
                                               "where this container or service is started)"
                                             : ""));
 }
@@ -136,8 +136,8 @@ std::string Session::askSecret(std::string const& name) const
 {
     if (scripted_)
         throw Failure(BadUsage,
-                      fmt::format("{} cannot be read, since standard input is the script; "
-                                  "it may stand there",
+                      fmt::format("{} cannot be read from standard input, which is the script "
+                                  "(write it in the script)",
                                   name));
     return terminal::readSecret(name);
 }

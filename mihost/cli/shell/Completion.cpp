@@ -123,7 +123,7 @@ Candidates names(NodeKind const& kind, std::string const& before, NodeNames cons
     return all;
 }
 
-// What may stand in each kind of place, the word being typed not yet compared.
+// The candidates for each kind of place, not yet compared with the typed word.
 
 Candidates nodes(Typed const&, std::string const& word, NodeNames const& nodeNames)
 {
@@ -161,7 +161,7 @@ Candidates values(Typed const& typed, std::string const&, NodeNames const&)
     NodeKind const* const kind = kindAt(typed.arguments.at(0));
     Property const* const property = kind ? findProperty(*kind, typed.arguments.at(1)) : nullptr;
     if (property && property->has(Property::Secret))
-        return {{toBeAsked, "asked for"}};
+        return {{toBeAsked, "read from a prompt"}};
     if (property && property->kind == IC::PropertyValue::BooleanKind)
         return {{"true", ""}, {"false", ""}};
     return {};
@@ -187,7 +187,7 @@ constexpr NamingParameter namingParameters[] = {
     {IC::parameter::localGroupName, "group:"},
 };
 
-/** The kind of node that a parameter's value names; null where it names none, or one to come. */
+/** The kind of node that a parameter's value names; null if it names none, or a new one. */
 NodeKind const* namedKind(Method const& method, std::string const& parameter)
 {
     constexpr std::string_view adds = "Add";
@@ -218,7 +218,7 @@ Candidates parameters(Typed const& typed, std::string const& word, NodeNames con
     }
     Candidates all;
     for (Parameter const& parameter : method->parameters)
-        if (!isGiven(typed.arguments, parameter.name)) // a password is better asked for
+        if (!isGiven(typed.arguments, parameter.name)) // a password should be prompted for
             all.push_back({fmt::format("{}={}", parameter.name,
                                        parameter.form == Form::Password ? toBeAsked : ""),
                            parameter.meaning});
@@ -233,7 +233,7 @@ Candidates commandsOf(CLI::App const& app)
     return all;
 }
 
-/** The commands that help may be shown for. */
+/** The commands that have help. */
 Candidates commandsOfHelp(Typed const& typed, std::string const&, NodeNames const&)
 {
     CLI::App* app = typed.program;
@@ -251,7 +251,7 @@ Candidates columns(Typed const& typed, std::string const& word, NodeNames const&
     return all;
 }
 
-/** The column of --where, as far as its sign; the value is anything. */
+/** The column of --where up to its sign; the value is free. */
 Candidates conditions(Typed const& typed, std::string const& word, NodeNames const&)
 {
     Candidates all = columns(typed, "", {});
@@ -306,7 +306,7 @@ Completion completeValue(Typed const& typed, CLI::Option const& option, std::str
     return {Completion::What::Words, choices(*typed.line, option)};
 }
 
-/** An option's value behind its equals sign. */
+/** An option's value after its equals sign. */
 Completion completeAssignment(Typed const& typed, std::string const& word,
                               NodeNames const& nodeNames)
 {

@@ -35,10 +35,10 @@ template <class Function> std::thread startWithoutSignals(Function function)
 
 } // namespace
 
-DrainedPipe::DrainedPipe() : stop_(check(eventfd(0, EFD_CLOEXEC), "cannot make an event"))
+DrainedPipe::DrainedPipe() : stop_(check(eventfd(0, EFD_CLOEXEC), "cannot create an event"))
 {
     int ends[2];
-    check(pipe2(ends, O_CLOEXEC), "cannot make a pipe");
+    check(pipe2(ends, O_CLOEXEC), "cannot create a pipe");
     readEnd_ = Descriptor(ends[0]);
     writeEnd_ = Descriptor(ends[1]);
     thread_ = startWithoutSignals([this] { drain(); });

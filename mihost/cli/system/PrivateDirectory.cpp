@@ -32,7 +32,7 @@ std::string parentDirectory()
     return std::filesystem::absolute(wanted && *wanted ? wanted : "/tmp", ignored);
 }
 
-/** Whether nobody but the caller can have put anything into the directory. */
+/** Whether only the caller can have put files into the directory. */
 bool isOwn(Descriptor const& directory)
 {
     struct stat status {
@@ -41,7 +41,7 @@ bool isOwn(Descriptor const& directory)
            status.st_uid == geteuid() && (status.st_mode & 07777) == S_IRWXU;
 }
 
-/** Removes the files of a directory whose process is gone, and the directory if that empties it. */
+/** Removes the files of a directory whose process has ended, and the directory if empty then. */
 void removeIfLeft(Descriptor const& parent, std::string const& name)
 {
     Descriptor const directory(
@@ -56,7 +56,7 @@ void removeIfLeft(Descriptor const& parent, std::string const& name)
     for (std::string const& file : namesIn(directory, name))
         if (file != privateDirectoryLock)
             unlinkat(directory.get(), file.c_str(), 0);
-    // The last one: without it nobody would try again.
+    // The last one: without it there would be no further try.
     unlinkat(directory.get(), privateDirectoryLock, 0);
     unlinkat(parent.get(), name.c_str(), AT_REMOVEDIR);
 }
@@ -77,7 +77,7 @@ void removeWhatWasLeft(std::string const& parent)
 
 Failure cannotMakeIn(std::string const& parent)
 {
-    return {NoPlugin, fmt::format("cannot make a private directory in '{}': {}", parent,
+    return {NoPlugin, fmt::format("cannot create a private directory in '{}': {}", parent,
                                   std::strerror(errno))};
 }
 
@@ -102,7 +102,7 @@ PrivateDirectory::PrivateDirectory()
 
 PrivateDirectory::~PrivateDirectory()
 {
-    // Where the way back is gone, the root serves: a directory that is stood in stays around.
+    // If the way back is gone, use the root: a working directory cannot be removed.
     if (fchdir(previous_.get()) != 0 && chdir("/") != 0)
         std::perror("mihost: chdir");
     remove();
@@ -121,7 +121,7 @@ bool PrivateDirectory::make(std::string const& parent)
         remove();
         throw failure;
     }
-    flock(lock_.get(), LOCK_EX); // where files cannot be locked, nothing that was left is removed
+    flock(lock_.get(), LOCK_EX); // without file locks no leftover is removed
     struct stat status {
     };
     return fstat(lock_.get(), &status) == 0 && status.st_nlink > 0;
@@ -129,7 +129,7 @@ bool PrivateDirectory::make(std::string const& parent)
 
 void PrivateDirectory::remove() const
 {
-    // This much takes no descriptor, of which there may be none left.
+    // This needs no descriptor, of which none may be left.
     for (char const* const file : privateDirectoryFiles)
         unlink((path_ + "/" + file).c_str());
     if (rmdir(path_.c_str()) == 0)

@@ -141,7 +141,7 @@ TEST(AccelDate, IsRunOnceAndThenAnswered)
     answered("date");
     EXPECT_GE(countOf("date").answered, 1U);
     EXPECT_GE(countOf("date").handed_on, 1U); // the hour may have changed
-    EXPECT_EQ(bothways::reasonOf("date"), "date is run once an hour, to compare");
+    EXPECT_EQ(bothways::reasonOf("date"), "date runs once an hour, for comparison");
 }
 
 TEST(AccelDate, IsRunAgainInAnotherEnvironment)
@@ -172,7 +172,7 @@ TEST(AccelDate, IsLeftToADateThatPrintsSomethingElse)
     std::string const first = answered("date").value();
     EXPECT_EQ(first.substr(0, 10), real("date").substr(0, 10)) << "not what the real one printed";
     EXPECT_FALSE(answered("date"));
-    EXPECT_EQ(bothways::reasonOf("date"), "date prints something else than expected here");
+    EXPECT_EQ(bothways::reasonOf("date"), "date printed an unexpected text");
     shiftClock(0); // another hour, so it is compared again
     EXPECT_TRUE(answered("date"));
     EXPECT_TRUE(answered("date"));

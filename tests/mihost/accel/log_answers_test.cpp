@@ -71,11 +71,11 @@ TEST_F(AccelLog, LeavesNulBytesAndALineWithoutEndToSed)
     folder_.write("log", "1\n2");
     EXPECT_EQ(answered(sed(1)), "1\n");
     EXPECT_FALSE(answered(sed(2)));
-    EXPECT_EQ(reasonOf("sed"), "the line has no end, which not every sed prints alike");
+    EXPECT_EQ(reasonOf("sed"), "the line has no newline, which versions of sed treat differently");
     EXPECT_EQ(answered(sed(3)), "");
     folder_.append("log", std::string("\n\0\n", 3));
     EXPECT_FALSE(answered(sed(1)));
-    EXPECT_EQ(reasonOf("sed"), "the file has NUL bytes, which not every sed reads alike");
+    EXPECT_EQ(reasonOf("sed"), "the file has NUL bytes, which versions of sed treat differently");
     EXPECT_EQ(answered(wc_), real(wc_));
 }
 
@@ -167,7 +167,7 @@ TEST_F(AccelLog, DeclinesFileSystemsWithUnreliableTimes)
             return result;
         };
         EXPECT_FALSE(answered(wc_)) << type;
-        EXPECT_EQ(reasonOf("wc"), "the file system may not give every change a new time");
+        EXPECT_EQ(reasonOf("wc"), "the file system may not give each change a new time stamp");
     }
     libc::hooks().fstatfs = [](int, struct statfs*) { return -1; };
     EXPECT_FALSE(answered(wc_));

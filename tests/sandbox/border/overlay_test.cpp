@@ -190,7 +190,7 @@ TEST_F(Overlay, WithoutPrivilegesTheReasonSaysWhatIsNeeded)
                          if (setuid(65534) != 0)
                              _exit(1);
                      }),
-              "cannot have a process namespace: Operation not permitted; root's privileges are "
+              "cannot create a process namespace: Operation not permitted; root's privileges are "
               "needed");
 }
 

@@ -90,7 +90,7 @@ TEST_P(BrokenPlugin, IsFoundAndNamed)
 }
 
 Broken const ways[] = {
-    {"entry-point", "the second call hands out another status", {"load.entry-point"}},
+    {"entry-point", "the second call returns another status", {"load.entry-point"}},
     {"trace",
      "logged but not traced after: createRootNode: entry",
      {"start.log-repeats", "refresh.log-repeats", "method.log-repeats"}},
@@ -307,7 +307,7 @@ TEST(CheckOutsideOfASandbox, NeverRuns)
     Outcome const outcome = mihostRun({"--overlay", "/nonexistent", "check"});
     EXPECT_EQ(outcome.code, 2);
     EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(outcome.err.rfind("mihost: no sandbox, so nothing was run: ", 0), 0U) << outcome.err;
+    EXPECT_EQ(outcome.err.rfind("mihost: creating the sandbox: ", 0), 0U) << outcome.err;
     EXPECT_EQ(mihostRun({"shell"}, "check\n").code, 2);
 }
 

@@ -28,7 +28,7 @@ TEST(CatalogueCommands, DescribeOneKindOrMethod)
     EXPECT_NE(group.find("165  members      texts"), std::string::npos) << group;
     EXPECT_EQ(group.find("user-name"), std::string::npos);
     std::string const method = mihostRun({"methods", "LocalGroupAdd"}).out;
-    EXPECT_EQ(method, "LocalGroupAdd: makes a group\n"
+    EXPECT_EQ(method, "LocalGroupAdd: adds a group\n"
                       "  parameter  value  required  meaning\n"
                       "  GroupName  name   required  the group's name\n");
     EXPECT_EQ(mihostRun({"properties", "things"}).code, 2);

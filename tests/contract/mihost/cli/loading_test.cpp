@@ -48,13 +48,13 @@ TEST(LoadingThePlugin, NamesTheSymbolThatTheHostLacks)
 TEST(LoadingThePlugin, TellsWhatTheEntryPointAnswered)
 {
     setenv("ODD", "answer", 1);
-    expectRefused(PLUGIN_THAT_IS_ODD, "OpenMI answered 7");
+    expectRefused(PLUGIN_THAT_IS_ODD, "OpenMI returned 7");
 }
 
 TEST(LoadingThePlugin, MissesTheInterface)
 {
     setenv("ODD", "interface", 1);
-    expectRefused(PLUGIN_THAT_IS_ODD, "OpenMI handed out no interface");
+    expectRefused(PLUGIN_THAT_IS_ODD, "OpenMI returned no interface");
 }
 
 TEST(LoadingThePlugin, TellsWhyAPluginDidNotStart)
@@ -73,7 +73,7 @@ TEST(LoadingThePlugin, ShowsButNeverWritesANodeOfUnknownKind)
     Outcome const outcome = mihostRun({"--plugin", PLUGIN_THAT_IS_ODD, "set", "2", "7", "eight"});
     EXPECT_EQ(outcome.code, 4);
     EXPECT_EQ(outcome.err,
-              "mihost: set: property '7' of node '2' is unknown, so it is not written\n");
+              "mihost: set: unknown property '7' of node '2' (see 'mihost properties')\n");
 }
 
 TEST(LoadingThePlugin, NeedsAFolderForItsPrivateOne)
@@ -82,7 +82,7 @@ TEST(LoadingThePlugin, NeedsAFolderForItsPrivateOne)
     Outcome const outcome = mihostRun({"tree"});
     EXPECT_EQ(outcome.code, 3);
     EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(outcome.err, "mihost: cannot make a private directory in '/nonexistent': "
+    EXPECT_EQ(outcome.err, "mihost: cannot create a private directory in '/nonexistent': "
                            "No such file or directory\n");
 }
 

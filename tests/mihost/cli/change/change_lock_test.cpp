@@ -81,8 +81,8 @@ TEST_F(TheChangeLock, IsHeldByOneAtATimeAndReleased)
 TEST_F(TheChangeLock, GivesUpAtTheLimitAndSaysWhatToDo)
 {
     ChangeLock const lock(file, none);
-    EXPECT_EQ(problem(), "another mihost is still changing this machine, so nothing was run (try "
-                         "again, or wait longer with --lock-timeout; 'fuser " +
+    EXPECT_EQ(problem(), "waiting for the change lock: another mihost still holds it (try again, "
+                         "or raise --lock-timeout; 'fuser " +
                              file + "' shows the process)");
 }
 

@@ -118,7 +118,7 @@ TEST(MembershipChange, IsRefusedIfUsermodFindsAnotherGroup)
     EXPECT_EQ(objectionTo("uid=1000(jdoe) gid=1000(jdoe) groups=1000(jdoe),1501(root)\n"),
               "its group 'root' has GID 1501, but usermod finds GID 0");
     EXPECT_EQ(objectionTo("uid=1000(jdoe) gid=1000(jdoe) groups=1000(jdoe),1600(x),0(root)\n"),
-              "its group 'x' is not a group that usermod finds");
+              "its group 'x' is not found by usermod");
 }
 
 TEST(MembershipChange, IsRefusedIfIdReadsTheMemberAsAUid)

@@ -28,7 +28,7 @@ std::string objectionToChange(Account const& node)
 TEST(UserDelete, IsRefusedIfTheUidIsTheNameOfAnotherAccount)
 {
     EXPECT_EQ(objectionToDelete({"jdoe", "1500"}),
-              "userdel would be given the UID 1500, which is the name of another account: '1500' "
+              "userdel would get the UID 1500, which is the name of another account: '1500' "
               "would be deleted (use 'mihost user delete jdoe', which keeps the home "
               "directory)");
 }
@@ -36,7 +36,7 @@ TEST(UserDelete, IsRefusedIfTheUidIsTheNameOfAnotherAccount)
 TEST(UserDelete, IsRefusedIfTheUidIsNobodysName)
 {
     EXPECT_EQ(objectionToDelete({"ann", "1001"}),
-              "userdel would be given the UID 1001, but takes names only (use 'mihost user delete "
+              "userdel would get the UID 1001, but accepts only names (use 'mihost user delete "
               "ann', which keeps the home directory)");
 }
 

@@ -183,7 +183,7 @@ TEST(CheckOfReads, NamesUnknownPropertiesAndWrongKinds)
 {
     AnswersAll node(9, 0, {}, IC::nodeType::computer, 0);
     EXPECT_EQ(wrongReads({&node}),
-              Findings{"computer #9: answers the unknown property 4294967295"});
+              Findings{"computer #9: returns a value for the unknown property 4294967295"});
     AnswersAll group(9, 0, {}, IC::nodeType::group, 1);
     EXPECT_EQ(wrongReads({&group}).front(),
               "group #9: group-id (89): reads as text rather than number");

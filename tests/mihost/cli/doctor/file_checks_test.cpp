@@ -52,23 +52,23 @@ TEST(ProblemOfShadow, IsTheFirstAccountThatIsNotFoundGoingForward)
                                "ben:!:1::::::\n";
     EXPECT_EQ(problemOfShadow({"root", "anna", "ben"}, shadow), std::nullopt);
     EXPECT_EQ(problemOfShadow({"root", "ben", "anna"}, shadow),
-              "no entry for 'anna' where the order of /etc/passwd wants it");
+              "no entry for 'anna' at its place in the order of /etc/passwd");
     EXPECT_EQ(problemOfShadow({"root", "carl"}, shadow),
-              "no entry for 'carl' where the order of /etc/passwd wants it");
+              "no entry for 'carl' at its place in the order of /etc/passwd");
 }
 
 TEST(ProblemOfShadow, IsAnEntryThatLibcDoesNotTake)
 {
     EXPECT_EQ(problemOfShadow({"root", "ben"}, "root:*:never:0:99999:7:::\nben:!:1::::::\n"),
-              "no entry for 'root' where the order of /etc/passwd wants it");
+              "no entry for 'root' at its place in the order of /etc/passwd");
     EXPECT_EQ(problemOfShadow({"ben"}, "x:" + std::string(5000, 'x') + ":1::::::\nben:!:1::::::\n"),
-              "no entry for 'ben' where the order of /etc/passwd wants it");
+              "no entry for 'ben' at its place in the order of /etc/passwd");
 }
 
 TEST(ProblemOfRelease, IsALackOfTheTwoLinesBehindTheFirst)
 {
     EXPECT_EQ(problemOfRelease("Name\nVERSION = 4\nPATCHLEVEL = 0\n"), std::nullopt);
-    char const* const problem = "no lines like 'VERSION = 1' and 'PATCHLEVEL = 0' behind the first";
+    char const* const problem = "no lines like 'VERSION = 1' and 'PATCHLEVEL = 0' after the first";
     EXPECT_EQ(problemOfRelease(""), problem);
     EXPECT_EQ(problemOfRelease("Name 1.2\n"), problem);
     EXPECT_EQ(problemOfRelease("Name\nVERSION=4\nPATCHLEVEL = 0\n"), problem); // 9 characters
@@ -79,9 +79,10 @@ TEST(ProblemOfStamps, IsTheNewestLineWithoutOne)
 {
     EXPECT_EQ(problemOfStamps({}), std::nullopt);
     EXPECT_EQ(problemOfStamps({"Jan  2 03:04:05 host x: y", "Dec 31 23:59:59 "}), std::nullopt);
-    EXPECT_EQ(problemOfStamps({"2026-01-02T03:04:05.6+00:00 host", "2025-01-02T03:04:05 x",
-                               "Jan  2 03:04:05 host"}),
-              "a line begins with '2025-01-02T03:04' rather than a stamp like 'Jan  2 03:04:05 '");
+    EXPECT_EQ(
+        problemOfStamps(
+            {"2026-01-02T03:04:05.6+00:00 host", "2025-01-02T03:04:05 x", "Jan  2 03:04:05 host"}),
+        "a line begins with '2025-01-02T03:04' instead of a time stamp like 'Jan  2 03:04:05 '");
     for (char const* line :
          {"", "Jan", "jan  2 03:04:05 x", "Jan 2 03:04:05 x", "Jan  2 3:04:05 x",
           "Jan  2 03:04:05x", "Jan  2 03:04:0", "Jan 2  03:04:05 x", "Jan    03:04:05 x"})

@@ -105,18 +105,17 @@ TEST_F(Addresses, ThatAreInvalidAreRefusedWithAnExample)
 
 TEST_F(Addresses, ThatNameAKindOfNodeAreToldHowToListIt)
 {
-    EXPECT_EQ(refusalOf("group"),
-              "no node 'group': write group:NAME; 'mihost list groups' shows them");
+    EXPECT_EQ(refusalOf("group"), "no node 'group' (write group:NAME; see 'mihost list groups')");
     EXPECT_EQ(refusalOf("drivers"),
-              "no node 'drivers': write driver:NAME; 'mihost list drivers' shows them");
+              "no node 'drivers' (write driver:NAME; see 'mihost list drivers')");
 }
 
 TEST_F(Addresses, ThatNearlyNameANodeOfTheirKindAreToldItsName)
 {
-    EXPECT_EQ(refusalOf("user:jdoo"), "no node 'user:jdoo' in the tree; did you mean user:jdoe?");
+    EXPECT_EQ(refusalOf("user:jdoo"), "no node 'user:jdoo' in the tree (did you mean user:jdoe?)");
     for (char const* address : {"user:ext4", "user:", "log:2", "3"})
-        EXPECT_EQ(refusalOf(address), std::string("no node '") + address +
-                                          "' in the tree; 'mihost tree' shows all of them");
+        EXPECT_EQ(refusalOf(address),
+                  std::string("no node '") + address + "' in the tree (see 'mihost tree')");
 }
 
 TEST_F(Addresses, OfNodesReadBackAsTheyAreShown)

@@ -164,14 +164,13 @@ TEST(MethodCallValues, OfDaysAreDaysOfTheCalendar)
         EXPECT_EQ(objection(Form::Day, right), std::nullopt) << right;
     for (char const* wrong : {"2030-13-01", "2030-00-10", "2030-02-30", "2029-02-29", "2030-1-1",
                               "31.12.2030", "20301231", "1900-12-31", "2030-12-31 00"})
-        EXPECT_EQ(objection(Form::Day, wrong),
-                  "is not a day: it must be YYYY-MM-DD, such as 2030-12-31")
+        EXPECT_EQ(objection(Form::Day, wrong), "is not a day (use YYYY-MM-DD, such as 2030-12-31)")
             << wrong;
 }
 
 TEST(MethodCallValues, OfPathsAreAbsolute)
 {
-    EXPECT_EQ(objection(Form::Path, "home"), "is not an absolute path: it must begin with '/'");
+    EXPECT_EQ(objection(Form::Path, "home"), "is not an absolute path (it must begin with '/')");
 }
 
 TEST(Objections, NameTheCharacterButNeverOneOfAPassword)

@@ -53,24 +53,24 @@ TEST(MethodCall, AsksForAPasswordThatIsADash)
 TEST(MethodCall, IsRefusedWithTheNamesThatWouldBeRight)
 {
     EXPECT_EQ(refusal([] { textFor("Useradd", {}); }),
-              "no method 'Useradd'; did you mean UserAdd?");
+              "no method 'Useradd' (did you mean UserAdd?)");
     EXPECT_NE(refusal([] { textFor("Adduser", {}); }).find("UserAdd, UserDel"), std::string::npos);
     EXPECT_EQ(refusal([] { textFor("LocalGroupAdd", {"Name=staff"}); }),
-              "LocalGroupAdd has no parameter 'Name'; it has GroupName");
+              "LocalGroupAdd has no parameter 'Name' (use GroupName)");
 }
 
 TEST(MethodCall, IsRefusedWhereAParameterHasNoName)
 {
     EXPECT_EQ(refusal([] { textFor("LocalGroupAddUser", {"jdoe"}); }),
-              "'jdoe' is not NAME=VALUE; LocalGroupAddUser takes LocalGroupName, DomainAndMember");
+              "'jdoe' is not NAME=VALUE (LocalGroupAddUser takes LocalGroupName, DomainAndMember)");
     EXPECT_EQ(refusal([] { textFor("GetShadowing", {"now"}); }),
-              "'now' is not NAME=VALUE; GetShadowing takes none");
+              "'now' is not NAME=VALUE (GetShadowing takes none)");
 }
 
 TEST(MethodCall, IsRefusedForMissingOrDoubleParameters)
 {
     EXPECT_EQ(refusal([] { textFor("UserDel", {}); }),
-              "UserDel needs UserName, login name; 'mihost methods UserDel' has all");
+              "UserDel needs UserName, login name (see 'mihost methods UserDel')");
     EXPECT_EQ(refusal([] {
                   textFor("UserDel", {"UserName=a", "UserName=b"});
               }),
@@ -78,9 +78,9 @@ TEST(MethodCall, IsRefusedForMissingOrDoubleParameters)
     EXPECT_EQ(refusal([] {
                   textFor("UserSetPassword", {"UserName=a", "Password"});
               }),
-              "Password needs a value: Password=VALUE");
+              "Password needs a value (write Password=VALUE)");
     EXPECT_EQ(refusal([] { textFor("UserDel", {"UserName"}); }),
-              "UserName needs a value: UserName=VALUE");
+              "UserName needs a value (write UserName=VALUE)");
     EXPECT_EQ(refusal([] { textFor("UserDel", {"UserName="}); }), "UserName is empty");
 }
 
@@ -103,7 +103,7 @@ TEST(MethodCallText, IsRefusedIfThePluginWouldReadLessOfIt)
         refusal([] { takeApart("UserAdd,UserName:CMPI_string:jdoe,Comment:CMPI_string:12:30"); }),
         "accepted");
     EXPECT_EQ(refusal([] { takeApart("UserDel,UserName:CMPI_boolean:jdoe"); }),
-              "UserName is of type CMPI_string, not 'CMPI_boolean'");
+              "UserName has the type CMPI_string, not 'CMPI_boolean'");
     EXPECT_NE(refusal([] { takeApart("UserDel,GroupName:CMPI_string:jdoe"); }), "accepted");
     EXPECT_NE(refusal([] { takeApart("rm -rf /"); }), "accepted");
     EXPECT_NE(refusal([] { takeApart(",,"); }), "accepted");

@@ -54,7 +54,7 @@ TEST(WithoutHost, RefusesAHostWithinAnotherWord)
     EXPECT_EQ(refusal([] {
                   withoutHost({"-yH", "box", "get", "os"}, "box");
               }),
-              "--host: it is part of another word (write --host HOST by itself)");
+              "--host: it is part of another argument (write --host HOST separately)");
 }
 
 TEST(ExpectHost, RefusesWhatSshWouldTakeForSomethingElse)

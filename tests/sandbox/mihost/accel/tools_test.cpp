@@ -18,7 +18,7 @@ using bothways::reasonOf;
 namespace fs = std::filesystem;
 
 char const* const count = "wc -l /etc/hostname";
-char const* const replaceable = "others than root can replace the shell or the tool";
+char const* const replaceable = "users other than root can replace the shell or the tool";
 
 /** A machine on which everything is answered at first. */
 class AccelTools : public testing::Test
@@ -182,7 +182,7 @@ TEST_P(AccelBusybox, IsRunForADateInALocaleThatItDoesNotFollow)
     setenv("LC_ALL", "de_DE.UTF-8", 1);
     EXPECT_TRUE(answered("date")); // runs it
     EXPECT_FALSE(answered("date"));
-    EXPECT_EQ(reasonOf("date"), "date prints something else than expected here");
+    EXPECT_EQ(reasonOf("date"), "date printed an unexpected text");
 }
 
 } // namespace tools_test

@@ -123,7 +123,7 @@ TEST_F(AccountViews, EndWith4ForANameThatNobodyHas)
     EXPECT_EQ(user.err, "mihost: no local user 'jdeo' (did you mean 'jdoe'?)\n");
     Outcome const group = mihostRun({"group", "xyz"});
     EXPECT_EQ(group.code, 4);
-    EXPECT_EQ(group.err, "mihost: no local group 'xyz' ('mihost list groups' shows them)\n");
+    EXPECT_EQ(group.err, "mihost: no local group 'xyz' (see 'mihost list groups')\n");
 }
 
 TEST_F(AccountViews, ShowNoControlCharactersAtATerminal)

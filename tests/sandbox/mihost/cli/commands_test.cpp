@@ -180,7 +180,7 @@ TEST(MihostGet, ExitsWith1WhereThePluginAnswersWithANonZeroStatus)
     Outcome const outcome = mihostRun({"get", "os", "os-version"});
     EXPECT_EQ(outcome.code, 1);
     EXPECT_EQ(outcome.err, "mihost: property 'os-version' of node 'os': status 1: property 134 is "
-                           "not set; see 'mihost doctor'\n");
+                           "not set (see 'mihost doctor')\n");
 }
 
 TEST(MihostList, IsATableOfOneKind)
@@ -210,7 +210,7 @@ TEST(MihostList, PointsToTheDoctorWhereThereIsNothingOfTheKind)
     auto const outcome = mihostRun({"list", "log"});
     EXPECT_EQ(outcome.code, 0);
     EXPECT_EQ(outcome.out, "index  time  message\n");
-    EXPECT_EQ(outcome.err, "mihost: nothing to list under log; see 'mihost doctor'\n");
+    EXPECT_EQ(outcome.err, "mihost: nothing to list under log (see 'mihost doctor')\n");
     EXPECT_EQ(mihostRun({"--json", "list", "log"}).err, "");
 }
 

@@ -172,10 +172,10 @@ TEST_F(Doctor, TellsACommandThatIsThereFromAPathThatIsTooShort)
 TEST_F(Doctor, MissesAPasswdThatTakesPasswordsFromAPipe)
 {
     machine::fake("/usr/bin/passwd", "echo 'nothing of the kind'\n");
-    expectNoFix("passwd --stdin", "passwd does not know it",
+    expectNoFix("passwd --stdin", "not supported by passwd",
                 "the passwd of this system has no such option");
     machine::fake("/usr/bin/dnf", "");
-    expectMissing("passwd --stdin", "passwd does not know it",
+    expectMissing("passwd --stdin", "not supported by passwd",
                   "Password in methods: mihost passes a hash, other hosts store the plain text");
 }
 
@@ -183,7 +183,7 @@ TEST_F(Doctor, MissesAUseraddThatKnowsTheOptionOfItsFamily)
 {
     machine::fake("/usr/sbin/useradd",
                   "[ \"$*\" = -n ] && echo \"useradd: invalid option -- 'n'\"\n");
-    expectNoFix("useradd -n", "useradd does not know it",
+    expectNoFix("useradd -n", "not supported by useradd",
                 "the useradd of this system has no such option: add accounts with useradd itself");
     machine::remove("/etc/redhat-release");
     EXPECT_EQ(need("useradd -n"), nullptr);
@@ -233,12 +233,12 @@ TEST_F(Doctor, MissesIdRangesAndWhatTheyName)
 TEST_F(Doctor, MissesAccountFilesAndTheirForm)
 {
     machine::write("/etc/group", "root:x:0:\nstaff:x:fifty:\n");
-    expectMissing("form of /etc/group", "line 2 is malformed", "that group");
+    expectMissing("format of /etc/group", "line 2 is malformed", "that group");
     machine::remove("/etc/group");
     expectMissing("groups in /etc/group", "No such file or directory", "all groups");
-    EXPECT_EQ(need("form of /etc/group"), nullptr);
+    EXPECT_EQ(need("format of /etc/group"), nullptr);
     machine::write("/etc/passwd", "root:x:0:0::/:/bin/sh\nnonsense\n");
-    expectMissing("form of /etc/passwd", "line 2 is malformed",
+    expectMissing("format of /etc/passwd", "line 2 is malformed",
                   "that user; after a line that is too long, all users");
     machine::remove("/etc/passwd");
     expectMissing("accounts in /etc/passwd", "No such file or directory", "all users");
@@ -249,13 +249,13 @@ TEST_F(Doctor, MissesAccountFilesAndTheirForm)
 
 TEST_F(Doctor, MissesShadowEntriesInTheirOrderAndKnowsHowToSortThem)
 {
-    std::string const effect = "passwords and ageing of that user and of all after it";
+    std::string const effect = "passwords and ageing of that user and all later ones";
     machine::write("/etc/shadow",
                    "bin:*:19000:0:99999:7:::\nben:!:19000:0:99999:7:::\n"
                    "anna:!:19000:0:99999:7:::\nroot:*:19000:0:99999:7:::\n",
                    0600);
     expectMissing("order of /etc/shadow",
-                  "no entry for 'anna' where the order of /etc/passwd wants it", effect);
+                  "no entry for 'anna' at its place in the order of /etc/passwd", effect);
     follow(need("order of /etc/shadow"));
     EXPECT_EQ(need("order of /etc/shadow")["ok"], true);
     machine::remove("/etc/shadow");
@@ -270,10 +270,8 @@ TEST_F(Doctor, MissesAReleaseFileAndKnowsHowToWriteOne)
     machine::write("/etc/os-release", "PRETTY_NAME=\"Some System 12\"\nVERSION_ID=\"12\"\n");
     EXPECT_EQ(need("date of a release file")["no-fix"],
               "such a file would make this another distribution");
-    expectMissing("version in a release file", "none of the files that are known",
-                  "os-version of os");
-    expectMissing("name in a release file", "none of the files that are known",
-                  "os-name is just \"Linux\"");
+    expectMissing("version in a release file", "no known file exists", "os-version of os");
+    expectMissing("name in a release file", "no known file exists", "os-name is just \"Linux\"");
     follow(need("name in a release file"));
     EXPECT_EQ(need("name in a release file")["ok"], true);
     EXPECT_EQ(need("version in a release file")["ok"], true);
@@ -281,21 +279,21 @@ TEST_F(Doctor, MissesAReleaseFileAndKnowsHowToWriteOne)
               "108 os-name     Some System 12\n134 os-version  12.0\n");
     machine::write("/etc/release", "Some System 12\n");
     expectMissing("version in a release file",
-                  "no lines like 'VERSION = 1' and 'PATCHLEVEL = 0' behind the first",
+                  "no lines like 'VERSION = 1' and 'PATCHLEVEL = 0' after the first",
                   "os-version of os");
 }
 
 TEST_F(Doctor, MissesALogWithClassicStamps)
 {
     machine::write("/var/log/messages", "2026-01-02T03:04:05.678901+00:00 host x: y\n");
-    expectMissing("classic stamps in the system log",
-                  "a line begins with '2026-01-02T03:04' rather than a stamp like "
+    expectMissing("traditional time stamps in the system log",
+                  "a line begins with '2026-01-02T03:04' instead of a time stamp like "
                   "'Jan  2 03:04:05 '",
                   "messages and times of log entries");
     machine::remove("/var/log/messages");
     expectMissing("system log in /var/log/messages", "No such file or directory",
                   "all log entries");
-    EXPECT_EQ(need("classic stamps in the system log"), nullptr);
+    EXPECT_EQ(need("traditional time stamps in the system log"), nullptr);
 }
 
 TEST_F(Doctor, LooksAtTheNewestLinesOfALongLogOnly)
@@ -304,9 +302,9 @@ TEST_F(Doctor, LooksAtTheNewestLinesOfALongLogOnly)
     for (int line = 0; line < 20000; ++line)
         log += "Jan  2 03:04:05 host x: y\n";
     machine::write("/var/log/messages", log);
-    EXPECT_EQ(need("classic stamps in the system log")["ok"], true);
+    EXPECT_EQ(need("traditional time stamps in the system log")["ok"], true);
     machine::write("/var/log/messages", log + "2026-01-02T03:04:05 newest\n");
-    EXPECT_EQ(need("classic stamps in the system log")["ok"], false);
+    EXPECT_EQ(need("traditional time stamps in the system log")["ok"], false);
 }
 
 TEST_F(Doctor, NeverObeysWhatALogLineHolds)
@@ -314,7 +312,7 @@ TEST_F(Doctor, NeverObeysWhatALogLineHolds)
     machine::write("/var/log/messages", "\x1b[2J\xff\n");
     std::string const out = mihostRun({"doctor"}).out;
     EXPECT_NE(out.find(R"(a line begins with '\x1b[2J\xff' rather)"), std::string::npos) << out;
-    EXPECT_FALSE(need("classic stamps in the system log").is_null());
+    EXPECT_FALSE(need("traditional time stamps in the system log").is_null());
 }
 
 TEST_F(Doctor, MissesLoadedModulesAndAKernelThatHasAny)
@@ -341,8 +339,8 @@ TEST_F(Doctor, MissesRootsPrivilegesWhereItHasNone)
     EXPECT_EQ(outcome.out.find("capability"), std::string::npos); // a user has none
     int found = 0;
     for (Json const& need : Json::parse(outcome.out))
-        for (char const* name :
-             {"root's privileges", "passwords in /etc/shadow", "leave to empty the system log"})
+        for (char const* name : {"root's privileges", "passwords in /etc/shadow",
+                                 "permission to empty the system log"})
             if (need["need"] == name) {
                 EXPECT_EQ(need["ok"], false) << name;
                 ++found;

@@ -100,7 +100,7 @@ TEST_F(MihostFormats, RefusesConditionsAndColumnsThatMakeNoSense)
     EXPECT_EQ(mihostRun({"list", "users", "--where", "user-name"}).code, 2);
     EXPECT_EQ(mihostRun({"list", "users", "--where", "none=1"}).code, 4);
     EXPECT_EQ(mihostRun({"list", "users", "--sort", "user-nam"}).err,
-              "mihost: no column 'user-nam'; did you mean user-name?\n");
+              "mihost: no column 'user-nam' (did you mean user-name?)\n");
 }
 
 TEST_F(MihostFormats, MarksEmptyCells)
@@ -137,7 +137,7 @@ TEST_F(MihostFormats, RefusesRowsOfACommandThatHasNoneBeforeItRuns)
             Outcome const outcome = mihostRun(words);
             EXPECT_EQ(outcome.code, 2) << command[0];
             EXPECT_EQ(outcome.err, "mihost: " + command[0] + ": -o " + format +
-                                       " needs results in rows (use table, json, jsonl or yaml)\n");
+                                       " needs rows (use table, json, jsonl or yaml)\n");
         }
     EXPECT_EQ(machine::entry("/etc/passwd", "anna").at(0), "anna");
     EXPECT_EQ(mihostRun({"-o", "xml", "tree"}).code, 2);
@@ -167,7 +167,7 @@ TEST_F(MihostFormats, IsQuietOnDemand)
 {
     machine::write("/var/log/messages", "");
     EXPECT_EQ(mihostRun({"list", "log"}).err,
-              "mihost: nothing to list under log; see 'mihost doctor'\n");
+              "mihost: nothing to list under log (see 'mihost doctor')\n");
     EXPECT_EQ(mihostRun({"-q", "list", "log"}).err, "");
     EXPECT_EQ(linesOf(mihostRun({"-q", "get", "none"}).err).size(), 1U); // errors stay
     TerminalRun run({"-q", "get", "os", "os-name"});

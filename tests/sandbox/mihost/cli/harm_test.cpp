@@ -54,7 +54,7 @@ TEST_F(MihostHarm, DeletesNoOtherAccountThatIsNamedLikeTheUid)
     EXPECT_EQ(outcome.code, 2);
     EXPECT_EQ(outcome.out, "");
     EXPECT_EQ(outcome.err,
-              "mihost: nothing is run for user:jdoe: userdel would be given the UID 1500, which is "
+              "mihost: nothing is run for user:jdoe: userdel would get the UID 1500, which is "
               "the name of another account: '1500' would be deleted (use 'mihost user delete "
               "jdoe', which keeps the home directory)\n");
     EXPECT_FALSE(ran("userdel"));
@@ -151,8 +151,9 @@ TEST_F(MihostMembership, IsNotChangedIfAGroupIsNamedLikeACommand)
 TEST_F(MihostMembership, IsNotChangedIfAGroupNameLooksLikeTwo)
 {
     addToGroup("x)(root");
-    expectRefusal("id says: uid=1500(jdoe) gid=1500(jdoe) groups=1500(jdoe),1700(x)(root), which "
-                  "is not its usual form");
+    expectRefusal(
+        "id printed: uid=1500(jdoe) gid=1500(jdoe) groups=1500(jdoe),1700(x)(root), which "
+        "is not its usual form");
     EXPECT_EQ(machine::entry("/etc/group", "root").at(3), "");
 }
 

@@ -368,7 +368,7 @@ TEST_F(InjectionInto, AnyModuleNameReachesNoShell)
     EXPECT_EQ(Json::parse(outcome.out).size(), expected.size());
     EXPECT_EQ(linesOf(outcome.err).size(), refused);
     EXPECT_EQ(linesOf(outcome.err).back(),
-              "mihost: a command was not run: modinfo: the name of the module '-x' begins with "
+              "mihost: command not run: modinfo: the name of the module '-x' begins with "
               "'-', so a command would read it as an option");
     Lines ran = machine::ran();
     ran.erase(std::remove_if(ran.begin(), ran.end(),

@@ -53,8 +53,8 @@ TEST_F(MihostLock, IsNeededByEveryChange)
         Outcome const outcome = mihostRun(arguments);
         EXPECT_EQ(outcome.code, 1);
         EXPECT_EQ(outcome.out, "");
-        EXPECT_EQ(outcome.err, "mihost: another mihost is still changing this machine, so nothing "
-                               "was run (try again, or wait longer with --lock-timeout; 'fuser "
+        EXPECT_EQ(outcome.err, "mihost: waiting for the change lock: another mihost still holds it "
+                               "(try again, or raise --lock-timeout; 'fuser "
                                "/run/mihost.lock' shows the process)\n");
     }
     EXPECT_EQ(machine::entry("/etc/group", "crew"), Lines());

@@ -168,7 +168,7 @@ TEST_F(MihostRemote, LeavesTheTerminalsInputIfOutputIsAFile)
     std::string const command = std::string(MIHOST_FILE) +
                                 " --host box call UserSetPassword UserName=jdoe Password=- | cat";
     TerminalRun run({"-c", command}, 200, "/bin/bash");
-    run.waitFor("standard input holds no line");
+    run.waitFor("standard input is empty");
     run.end();
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), "!");
 }

@@ -151,7 +151,7 @@ TEST_F(Passwords, AreRefusedIfStandardInputHoldsNone)
     Outcome const outcome =
         mihostRun({"call", "UserSetPassword", "UserName=jdoe", "Password=-"}, "");
     EXPECT_EQ(outcome.code, 2);
-    EXPECT_EQ(outcome.err, "mihost: Password: standard input holds no line\n");
+    EXPECT_EQ(outcome.err, "mihost: Password: standard input is empty\n");
 }
 
 } // namespace passwords_test

@@ -51,7 +51,7 @@ TEST_F(MihostScript, EndsAtTheFirstLineThatFailsAndNamesIt)
         char const* message;
     };
     for (Script const& script : std::initializer_list<Script>{
-             {"get nothing", 4, "mihost: line 2: no node 'nothing': a node is"},
+             {"get nothing", 4, "mihost: line 2: no node 'nothing' (use an id"},
              {"get os nothing", 4, "mihost: line 2: node 'os' has no property 'nothing'"},
              {"nonsense", 2, "mihost: line 2: "},
              {"get 'os", 2, "mihost: line 2: nothing follows the last '"},
@@ -129,8 +129,8 @@ TEST_F(MihostScript, IsNeverReadForAPassword)
         mihostRun({"shell"}, "call UserSetPassword UserName=root Password=-\nget os 108\n");
     EXPECT_EQ(outcome.code, 2);
     EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(outcome.err, "mihost: line 1: Password cannot be read, since standard input is the "
-                           "script; it may stand there\n");
+    EXPECT_EQ(outcome.err, "mihost: line 1: Password cannot be read from standard input, which is "
+                           "the script (write it in the script)\n");
 }
 
 TEST_F(MihostScript, MayBeEmpty)

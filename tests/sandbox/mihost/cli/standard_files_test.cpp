@@ -64,7 +64,7 @@ TEST(MihostStandardFiles, WithoutInputAPasswordIsRefused)
     machine::lay("plain");
     Outcome const outcome = bash("$mihost call UserSetPassword UserName=root Password=- <&-");
     EXPECT_EQ(outcome.code, 2);
-    EXPECT_NE(outcome.err.find("standard input holds no line"), std::string::npos) << outcome.err;
+    EXPECT_NE(outcome.err.find("standard input is empty"), std::string::npos) << outcome.err;
 }
 
 TEST(MihostStandardFiles, WithoutAnyTheTraceIsStillWhole)

@@ -158,14 +158,14 @@ TEST_F(Tasks, RefuseWrongValuesByTheNameOfTheOption)
 {
     machine::recordShell();
     expectUnchanged(mihostRun({"user", "add", "asmith", "--shell", "bash"}), 2,
-                    "user add: --shell is not an absolute path: it must begin with '/'");
+                    "user add: --shell is not an absolute path (it must begin with '/')");
     expectUnchanged(mihostRun({"user", "age", "jdoe", "--max-days", "-1"}), 2,
-                    "user age: --max-days is not a number: it must be 1 to 9 decimal digits");
+                    "user age: --max-days is not a number (it must be 1 to 9 decimal digits)");
     expectUnchanged(mihostRun({"user", "age", "jdoe"}), 2,
                     "user age: nothing to change (use --min-days, --max-days, --warn-days, "
                     "--inactive-days)");
     expectUnchanged(mihostRun({"user", "expire", "jdoe", "tomorrow"}), 2,
-                    "user expire: DAY is not a day: it must be YYYY-MM-DD, such as 2030-12-31");
+                    "user expire: DAY is not a day (use YYYY-MM-DD, such as 2030-12-31)");
     expectUnchanged(mihostRun({"user", "add", "a;b"}), 2,
                     "user add: NAME contains the shell metacharacter ';'");
     expectUnchanged(mihostRun({"group", "add", "1000"}), 2,
@@ -303,15 +303,15 @@ TEST_F(Tasks, RefuseAPasswordThatCannotBeRead)
                            "line)");
     expectUnchanged(from("/root/blank"), 2, what + "the password is empty");
     expectUnchanged(mihostRun({"user", "set-password", "jdoe"}), 2,
-                    what + "Password: standard input holds no line");
+                    what + "Password: standard input is empty");
 }
 
 TEST_F(Tasks, ReadNoPasswordFromTheScriptOfTheShell)
 {
     machine::recordShell();
     expectUnchanged(mihostRun({"shell"}, "user set-password jdoe\nSecret-1\n"), 2,
-                    "line 1: user set-password: no password can be read, since standard input is "
-                    "the script (use --password-file FILE)");
+                    "line 1: user set-password: cannot read a password from standard input, which "
+                    "is the script (use --password-file FILE)");
     machine::write("/root/secret", "Secret-3\n", 0600);
     EXPECT_EQ(mihostRun({"shell"}, "user set-password jdoe --password-file /root/secret\n").code,
               0);

@@ -421,7 +421,7 @@ TEST_F(MihostTerminal, KeepsTheShellsLinesButNoPasswords)
     run.waitFor("108 os-name  Linux");
     run.waitFor(prompt);
     run.type("call UserSetPassword UserName=none Password=geheim42\n");
-    run.waitFor("mihost: call UserSetPassword: the plug-in answered");
+    run.waitFor("mihost: call UserSetPassword: the plug-in returned");
     run.waitFor(prompt);
     run.type(up);
     EXPECT_FALSE(stands(run.waitFor("get os 108"), "geheim42"));

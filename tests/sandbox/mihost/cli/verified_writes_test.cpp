@@ -249,9 +249,10 @@ TEST_F(VerifiedWrite, FailsWithTheToolsWordsWhereAToolComplains)
         mihostRun({"--json", "set", "user:jdoe", "password-expiration", "2030-01-01"});
     EXPECT_EQ(outcome.code, 1);
     Json const answer = Json::parse(outcome.out);
-    EXPECT_EQ(answer["error"], "password expiry of jdoe is never, not 2030-01-01; a command said: "
-                               "chage: cannot open file");
-    EXPECT_EQ(answer["warnings"].back(), "a command said: second");
+    EXPECT_EQ(answer["error"],
+              "password expiry of jdoe is never, not 2030-01-01; a command printed: "
+              "chage: cannot open file");
+    EXPECT_EQ(answer["warnings"].back(), "a command printed: second");
 }
 
 TEST_F(VerifiedWrite, FailsWhereAToolFailsThoughTheChangeIsThere)
@@ -262,9 +263,9 @@ TEST_F(VerifiedWrite, FailsWhereAToolFailsThoughTheChangeIsThere)
     EXPECT_EQ(outcome.code, 1);
     Json const answer = Json::parse(outcome.out);
     EXPECT_EQ(answer["changed"], true);
-    EXPECT_NE(
-        answer["error"].get<std::string>().find("exit status 12; a command said: userdel: no home"),
-        std::string::npos)
+    EXPECT_NE(answer["error"].get<std::string>().find(
+                  "exit status 12; a command printed: userdel: no home"),
+              std::string::npos)
         << answer;
 }
 
@@ -273,8 +274,8 @@ TEST_F(VerifiedWrite, PassesOnWhatASuccessfulToolSays)
     machine::fake("/usr/sbin/userdel", "sed -i /^1500:/d /etc/passwd\necho 'no mail' >&2\n");
     Outcome const outcome = mihostRun({"--yes", "--json", "set", "user:1500", "delete", "true"});
     EXPECT_EQ(outcome.code, 0);
-    EXPECT_EQ(Json::parse(outcome.out)["warnings"], Json::array({"a command said: no mail"}));
-    EXPECT_EQ(outcome.err, "mihost: a command said: no mail\n");
+    EXPECT_EQ(Json::parse(outcome.out)["warnings"], Json::array({"a command printed: no mail"}));
+    EXPECT_EQ(outcome.err, "mihost: a command printed: no mail\n");
 }
 
 TEST_F(VerifiedWrite, PassesOnWhatUseraddSaysOfASuccess)
@@ -284,7 +285,7 @@ TEST_F(VerifiedWrite, PassesOnWhatUseraddSaysOfASuccess)
                                        "echo 'useradd: warning: home exists'\n");
     Outcome const outcome = mihostRun({"call", "UserAdd", "UserName=new"});
     EXPECT_EQ(outcome.code, 0);
-    EXPECT_EQ(outcome.err, "mihost: a command said: useradd: warning: home exists\n");
+    EXPECT_EQ(outcome.err, "mihost: a command printed: useradd: warning: home exists\n");
 }
 
 TEST_F(VerifiedWrite, FailsWhereTheLogCannotBeEmptied)
@@ -318,11 +319,11 @@ TEST_F(VerifiedWrite, FailsWhereTheMachineRefusesToHalt)
     EXPECT_EQ(refused.code, 1);
     EXPECT_EQ(Json::parse(refused.out)["changed"], false);
     EXPECT_EQ(refused.err, "mihost: power halt: a command failed: '/sbin/shutdown -h now', exit "
-                           "status 1; a command said: must be root\n");
+                           "status 1; a command printed: must be root\n");
     machine::remove("/sbin/shutdown");
     Outcome const missing = mihostRun({"--yes", "power", "restart"});
     EXPECT_EQ(missing.code, 1);
-    EXPECT_NE(missing.err.find("exit status 127; a command said: "), std::string::npos)
+    EXPECT_NE(missing.err.find("exit status 127; a command printed: "), std::string::npos)
         << missing.err;
 }
 
@@ -334,7 +335,7 @@ TEST_F(VerifiedWrite, FailsWhereARefreshMissesAnAccount)
                                       ":/:/bin/sh\nlast:x:1500:1500::/:/bin/sh\n");
     Outcome const outcome = mihostRun({"refresh"});
     EXPECT_EQ(outcome.code, 1);
-    EXPECT_EQ(outcome.err, "mihost: refresh: list of users is without 'long', not complete\n");
+    EXPECT_EQ(outcome.err, "mihost: refresh: list of users is missing 'long', not complete\n");
 }
 
 } // namespace verified_writes_test

@@ -38,8 +38,8 @@ TEST_F(WriteWarnings, UserSetAttribKeepsTheAccountsExpiry)
     EXPECT_EQ(outcome.code, 0);
     EXPECT_EQ(expiry(), expiryDay);
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(3), "3");
-    std::string const warning = "UserSetAttrib would erase the account's expiry 2030-01-05, so it "
-                                "is passed along (add --yes to erase it)";
+    std::string const warning = "UserSetAttrib would erase the account's expiry 2030-01-05, so "
+                                "mihost passes it (add --yes to erase it)";
     EXPECT_EQ(outcome.err, "mihost: " + warning + "\n");
     EXPECT_EQ(Json::parse(outcome.out)["warnings"], Json::array({warning}));
 }
@@ -80,7 +80,7 @@ TEST_F(WriteWarnings, UserSetAttribIsRefusedIfTheExpiryWouldBeLost)
         mihostRun({"call", "UserSetAttrib", "UserName=jdoe", "daysMustKeepPassword=3"});
     EXPECT_EQ(outcome.code, 2);
     EXPECT_EQ(outcome.err, "mihost: UserSetAttrib erases the account's expiry, and day '99999999' "
-                           "cannot be passed along (add --yes to erase it)\n");
+                           "cannot be kept (add --yes to erase it)\n");
     EXPECT_EQ(expiry(), "99999999");
 }
 

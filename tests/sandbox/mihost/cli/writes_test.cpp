@@ -54,7 +54,7 @@ TEST(MihostCall, ExitsWith1AndTellsWhatTheCommandSaidWhereItFails)
     machine::lay("plain");
     Outcome const outcome = mihostRun({"--json", "call", "UserDel", "UserName=nobody-here"});
     EXPECT_EQ(outcome.code, 1);
-    std::string const error = "the plug-in answered status 1; a command said: userdel: user "
+    std::string const error = "the plug-in returned status 1; a command printed: userdel: user "
                               "'nobody-here' does not exist";
     EXPECT_EQ(outcome.out, "{\"status\":1,\"changed\":false,\"changes\":[],\"warnings\":[],"
                            "\"error\":\"" +

@@ -17,7 +17,7 @@ namespace
 
 using namespace mihost;
 
-/** A hyphen is one to be typed; quotes and dots at a line's start are no macros. */
+/** A hyphen is one to be typed; quotes and dots at the start of a line are not macros. */
 std::string escaped(std::string const& text)
 {
     std::string result;

@@ -232,7 +232,7 @@ class Scraped(Daemons):
             f'--storage.tsdb.path={cls.folder}/data', f'--web.listen-address=127.0.0.1:{PROMETHEUS_PORT}',
         )
         for job in ('direct', 'textfile'):
-            until(lambda: query(f'mi_collection_success{{job="{job}"}}'), f'no figures of {job}')
+            until(lambda: query(f'mi_collection_success{{job="{job}"}}'), f'no metrics of {job}')
 
     def value(self, expression):
         samples = query(expression)
@@ -278,7 +278,7 @@ class Scraped(Daemons):
             until(lambda: self.value('mi_collection_success{job="textfile"}') == 0, 'the failure is not seen')
         finally:
             mihost('metrics', '--accounts', '--output', self.textfile)
-            until(lambda: self.value('mi_collection_success{job="textfile"}') == 1, 'no figures any more')
+            until(lambda: self.value('mi_collection_success{job="textfile"}') == 1, 'no metrics any more')
 
     def test_every_query_of_the_dashboard_has_an_answer(self):
         with open(os.path.join(PROMETHEUS, 'grafana', 'mihost.json')) as file:

@@ -10,7 +10,7 @@ class ModuleDocFragment(object):
 options:
   mihost:
     description:
-      - The program on the target, as a name that is looked up in the PATH or as an absolute path.
+      - The program on the target, as a name in the PATH or an absolute path.
     type: str
     default: mihost
 requirements:
@@ -27,15 +27,14 @@ options:
 attributes:
   check_mode:
     description:
-      - The change really runs, in a sandbox on the target which is gone afterwards.
-      - What the tools refuse there fails the task with their own words.
-      - Each task has a sandbox of its own, so a task that relies on the change of an earlier task
-        fails in check mode.
+      - The change really runs, in a sandbox on the target.
+      - If a tool fails there, the task fails with its message.
+      - Each task has its own sandbox, so a task that relies on an earlier task fails in check mode.
     support: full
   diff_mode:
     description: The lines of the files that change, with password hashes hidden.
     support: full
 notes:
-  - Changes need root on the target, which C(become) gives.
-  - With C(pipelining = True) in the configuration each task takes one round trip over ssh.
+  - Changes need root on the target, as with C(become).
+  - With C(pipelining = True) in the configuration each task takes one ssh round trip.
 '''

@@ -1,4 +1,4 @@
-"""Runs mihost, and turns its exit status into the outcome of a module."""
+"""Runs mihost, and converts its exit status to the outcome of a module."""
 
 from __future__ import absolute_import, division, print_function
 
@@ -35,7 +35,7 @@ def script_line(words, confirmed=False):
 
 
 def without_place(message):
-    """What follows 'mihost: ' and the number of a script's line, which means nothing to the user."""
+    """The message without 'mihost: ' and the line number of the script, which the user does not see."""
     return re.sub(r'^(mihost: )?(line \d+: )?', '', message)
 
 
@@ -47,7 +47,7 @@ class Mihost(object):
         self.program = module.get_bin_path(module.params['mihost'], required=True)
 
     def read(self, *words):
-        """The JSON document that a reading command prints."""
+        """The JSON document printed by a command that reads."""
         code, output, errors = self._run(words)
         if code != 0:
             self._fail(code, errors)
@@ -67,7 +67,7 @@ class Mihost(object):
     def change(self, lines):
         """Runs all commands on one loaded plug-in, in check mode within one sandbox.
 
-        Returns what the module exits with.
+        Returns the module's result.
         """
         if not lines:
             return self._outcome([])
@@ -81,7 +81,7 @@ class Mihost(object):
         code, output, errors = self._run(words + ['shell'], '\n'.join(lines))
         result = self._outcome([json.loads(line) for line in output.splitlines()])
         if code != 0 and check:
-            result['changed'] = False  # nothing of the sandbox is left
+            result['changed'] = False  # the sandbox is discarded
         if code != 0:
             self._fail(code, errors, **result)
         if check:

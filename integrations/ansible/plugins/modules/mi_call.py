@@ -6,11 +6,11 @@ __metaclass__ = type
 
 DOCUMENTATION = r'''
 module: mi_call
-short_description: Carry out one administration method
+short_description: Run one administration method
 description:
-  - Carries out a method of the operating system's node, such as C(UserAdd).
-  - A method does what its name says each time; M(mi.host.mi_user) and M(mi.host.mi_group) take a
-    desired state instead.
+  - Runs a method of the operating-system node, such as C(UserAdd).
+  - A method runs each time; M(mi.host.mi_user) and M(mi.host.mi_group) take a desired state
+    instead.
 version_added: 0.1.0
 author:
   - The mihost developers (!UNKNOWN)
@@ -31,7 +31,7 @@ options:
     type: str
   confirm:
     description:
-      - Answers yes to the questions of mihost, such as whether to delete the account root, and lets
+      - Answers yes to the prompts of mihost, such as before deleting the account root, and lets
         C(UserSetAttrib) erase the expiry date of an account.
     type: bool
     default: false
@@ -44,7 +44,7 @@ seealso:
 '''
 
 EXAMPLES = r'''
-- name: Make a group
+- name: Create a group
   mi.host.mi_call:
     method: LocalGroupAdd
     parameters:
@@ -62,18 +62,18 @@ EXAMPLES = r'''
 
 RETURN = r'''
 changed:
-  description: Whether the target is different now, or would be, in check mode.
+  description: Whether the target changed, or would change in check mode.
   returned: always
   type: bool
 changes:
-  description: The account files that differ, in check mode every file that does.
+  description: The account files that changed, in check mode all files.
   returned: always
   type: list
   elements: dict
   sample:
     - {file: /etc/group, change: changed, kind: file, removed: [], added: ['crew:x:1001:']}
 commands:
-  description: What ran in the sandbox, and what it printed.
+  description: The commands that ran in the sandbox, and their output.
   returned: in check mode
   type: list
   elements: dict

@@ -9,8 +9,8 @@ module: mi_group
 short_description: Manage a local group and its members
 description:
   - Brings an ordinary local group to a desired state.
-  - In check mode the change runs in a sandbox on the target, so what C(groupadd) would refuse is
-    known before.
+  - In check mode the change runs in a sandbox on the target, so errors of C(groupadd)
+    show beforehand.
 version_added: 0.1.0
 author:
   - The mihost developers (!UNKNOWN)
@@ -22,33 +22,33 @@ options:
     required: true
   state:
     description:
-      - Whether there is such a group.
+      - Whether the group exists.
     type: str
     choices: [present, absent]
     default: present
   members:
     description:
-      - Login names of the members. If it is not given, they are left alone.
-      - An account whose primary group it is always is a member.
+      - Login names of the members. If it is not given, they are not changed.
+      - Accounts with this primary group are always members.
     type: list
     elements: str
   append:
     description:
-      - Whether members that I(members) lacks stay.
+      - Whether to keep members that are not in I(members).
     type: bool
     default: false
 extends_documentation_fragment:
   - mi.host.mihost
   - mi.host.mihost.change
 notes:
-  - Groups whose GID is outside of the range for ordinary ones are left alone, and the task fails.
+  - For a group whose GID is outside the range of ordinary ones the task fails.
 seealso:
   - module: mi.host.mi_user
   - module: ansible.builtin.group
 '''
 
 EXAMPLES = r'''
-- name: Make a group of two
+- name: Create a group of two
   mi.host.mi_group:
     name: crew
     members: [jdoe, dora]
@@ -63,18 +63,18 @@ EXAMPLES = r'''
 
 RETURN = r'''
 changed:
-  description: Whether the target is different now, or would be, in check mode.
+  description: Whether the target changed, or would change in check mode.
   returned: always
   type: bool
 changes:
-  description: The account files that differ, in check mode every file that does.
+  description: The account files that changed, in check mode all files.
   returned: always
   type: list
   elements: dict
   sample:
     - {file: /etc/group, change: changed, kind: file, removed: [], added: ['crew:x:1001:']}
 commands:
-  description: What ran in the sandbox, and what it printed.
+  description: The commands that ran in the sandbox, and their output.
   returned: in check mode
   type: list
   elements: dict

@@ -22,7 +22,7 @@ options:
     default: tree
   facts:
     description:
-      - Whether the result becomes the fact C(mi) of the host.
+      - Whether to set the result as the fact C(mi) of the host.
     type: bool
     default: false
 extends_documentation_fragment:
@@ -47,7 +47,7 @@ EXAMPLES = r'''
     facts: true
   become: true
 
-- name: Show who has a login shell of bash
+- name: Show who has bash as login shell
   ansible.builtin.debug:
     msg: "{{ ansible_facts.mi.users.values() | selectattr('login_shell', '==', '/bin/bash')
           | map(attribute='user_name') }}"
@@ -64,7 +64,7 @@ mi:
     - The nodes. C(computer) and C(os) are one dictionary each; C(drivers), C(users) and C(groups)
       have one for each name; C(log) is a list of entries, the newest first.
     - The keys are the names of the properties with underscores, see C(mihost properties). Dates are
-      seconds since 1970, and what could not be read is null.
+      seconds since 1970, and values that could not be read are null.
   returned: if I(facts=false)
   type: dict
   sample:

@@ -9,8 +9,8 @@ module: mi_set
 short_description: Write one property of a node
 description:
   - Writes a property that acts on the machine, such as C(password) of a user.
-  - A property that is kept in the memory of the plug-in only changes nothing on the target, and the
-    task warns of that.
+  - A property that only changes in the memory of the plug-in changes nothing on the target; the task
+    warns.
 version_added: 0.1.0
 author:
   - The mihost developers (!UNKNOWN)
@@ -31,11 +31,11 @@ options:
     type: str
   secret:
     description:
-      - The value instead, never logged, which the properties C(password) and C(create-user) need.
+      - The value of the properties C(password) and C(create-user), instead of I(value); never logged.
     type: str
   confirm:
     description:
-      - Answers yes to the questions of mihost, such as whether to restart the machine.
+      - Answers yes to the prompts of mihost, such as before restarting the machine.
     type: bool
     default: false
 extends_documentation_fragment:
@@ -57,18 +57,18 @@ EXAMPLES = r'''
 
 RETURN = r'''
 changed:
-  description: Whether the target is different now, or would be, in check mode.
+  description: Whether the target changed, or would change in check mode.
   returned: always
   type: bool
 changes:
-  description: The account files that differ, in check mode every file that does.
+  description: The account files that changed, in check mode all files.
   returned: always
   type: list
   elements: dict
   sample:
     - {file: /etc/group, change: changed, kind: file, removed: [], added: ['crew:x:1001:']}
 commands:
-  description: What ran in the sandbox, and what it printed.
+  description: The commands that ran in the sandbox, and their output.
   returned: in check mode
   type: list
   elements: dict

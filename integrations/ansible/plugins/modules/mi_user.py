@@ -8,9 +8,9 @@ DOCUMENTATION = r'''
 module: mi_user
 short_description: Manage a local user account
 description:
-  - Brings an ordinary local account to a desired state. Options that are not given are left alone.
-  - In check mode the change runs in a sandbox on the target, so what C(useradd) would refuse is
-    known before.
+  - Brings an ordinary local account to a desired state. Options that are not given are not changed.
+  - In check mode the change runs in a sandbox on the target, so errors of C(useradd)
+    show beforehand.
 version_added: 0.1.0
 author:
   - The mihost developers (!UNKNOWN)
@@ -22,7 +22,7 @@ options:
     required: true
   state:
     description:
-      - Whether there is such an account. The home directory of a deleted account stays.
+      - Whether the account exists. The home directory of a deleted account is kept.
     type: str
     choices: [present, absent]
     default: present
@@ -32,8 +32,8 @@ options:
     type: str
   home:
     description:
-      - The home directory. It is made with a new account, and moved with its files otherwise.
-      - A new account without this option gets the usual one, which is not made unless the target is
+      - The home directory, created with a new account, otherwise moved with its files.
+      - A new account without this option gets the default one, which is only created if the target is
         configured so.
     type: str
   shell:
@@ -42,24 +42,24 @@ options:
     type: str
   password:
     description:
-      - The password hash, as the shadow file holds it, or C(!) or C(*) for none.
-      - It reaches the target on standard input only.
+      - The password hash, as in the shadow file, or C(!) or C(*) for none.
+      - It is passed to the target on standard input only.
     type: str
   password_min_days:
     description:
-      - How many days pass before a password may be changed.
+      - The minimum password age in days.
     type: int
   password_max_days:
     description:
-      - How many days a password stays valid, 99999 for ever.
+      - The maximum password age in days, 99999 for no limit.
     type: int
   password_warn_days:
     description:
-      - How many days before that the user is warned.
+      - How many days before the password expires the user is warned.
     type: int
   inactive_days:
     description:
-      - How many days after that the account stays active, 99999 for ever.
+      - How many days after that the account stays active, 99999 for no limit.
     type: int
   expires:
     description:
@@ -69,14 +69,14 @@ extends_documentation_fragment:
   - mi.host.mihost
   - mi.host.mihost.change
 notes:
-  - Accounts whose UID is outside of the range for ordinary ones are left alone, and the task fails.
+  - For an account whose UID is outside the range of ordinary ones the task fails.
 seealso:
   - module: mi.host.mi_group
   - module: ansible.builtin.user
 '''
 
 EXAMPLES = r'''
-- name: Make an account, or bring it to this state
+- name: Create an account, or bring it to this state
   mi.host.mi_user:
     name: jdoe
     full_name: J. Doe
@@ -95,18 +95,18 @@ EXAMPLES = r'''
 
 RETURN = r'''
 changed:
-  description: Whether the target is different now, or would be, in check mode.
+  description: Whether the target changed, or would change in check mode.
   returned: always
   type: bool
 changes:
-  description: The account files that differ, in check mode every file that does.
+  description: The account files that changed, in check mode all files.
   returned: always
   type: list
   elements: dict
   sample:
     - {file: /etc/group, change: changed, kind: file, removed: [], added: ['crew:x:1001:']}
 commands:
-  description: What ran in the sandbox, and what it printed.
+  description: The commands that ran in the sandbox, and their output.
   returned: in check mode
   type: list
   elements: dict

@@ -23,7 +23,7 @@ done
 
 GETENT = [{'ansible.builtin.getent': {'database': name}} for name in ('passwd', 'shadow', 'group')]
 
-# The plays, and the pattern of their machines.
+# The plays, each with the pattern of its machines.
 PLAYS = {
     '`ping`, to compare': ('all', [{'ansible.builtin.ping': {}}]),
     '`mi_info`': ('all', [task('mi_info', facts=True)]),

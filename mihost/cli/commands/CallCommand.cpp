@@ -18,8 +18,9 @@ class Call : public Command
 public:
     void declare(CLI::App& app) override
     {
-        method_ = app.add_option("METHOD", name_, "such as UserAdd; add --help for its parameters")
-                      ->required();
+        method_ =
+            app.add_option("METHOD", name_, "such as UserAdd; see 'mihost call UserAdd --help'")
+                ->required();
         app.add_option(
             "PARAMETER", assignments_,
             "NAME=VALUE; days as YYYY-MM-DD; Password=- reads it from a prompt or standard "
@@ -30,7 +31,7 @@ public:
             Method const* const known =
                 method_->empty() ? nullptr : findMethod(method_->results().front());
             auto const lines = known ? methodLines(*known, Room()) : layOut(methodsTable(), Room());
-            return withoutStyles(fmt::format("{}", fmt::join(lines, "\n")));
+            return withoutStyles(fmt::format("{}\n", fmt::join(lines, "\n")));
         });
     }
 

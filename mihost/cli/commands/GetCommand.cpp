@@ -62,7 +62,7 @@ private:
 
 CommandRow const commandRows::get{
     "get",
-    "read properties of a node, live",
+    "read properties of a node",
     newCommand<Get>,
     {
         {"mihost get os physical-memory-free", "the memory that is free now"},

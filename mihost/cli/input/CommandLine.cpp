@@ -123,7 +123,7 @@ CommandLine::CommandLine(CommandTable const& table, Place place, Options const& 
 
 void CommandLine::declareForProgram(CLI::App& app)
 {
-    app.set_version_flag("--version", "mihost " MIHOST_VERSION);
+    app.set_version_flag("--version", "mihost " MIHOST_VERSION, "show the version");
     app.add_option("-H,--host", options_.host,
                    "run the command on HOST by ssh, with the mihost installed there")
         ->type_name("[USER@]HOST")

@@ -47,9 +47,17 @@ TEST(Suggestion, IsNoneForALetterAPageOrAnotherWord)
 
 TEST(Suggestion, AsksForANameThatIsNearAndListsAllOtherwise)
 {
-    EXPECT_EQ(suggestion("gte", {"get", "set"}, "there are"), "did you mean get?");
-    EXPECT_EQ(suggestion("refresh", {"get", "set"}, "there are"), "there are get, set");
+    EXPECT_EQ(suggestion("gte", {"get", "set"}, "use"), "did you mean get?");
+    EXPECT_EQ(suggestion("refresh", {"get", "set"}, "use"), "use get, set");
     EXPECT_EQ(suggestion("refresh", {}, "it has"), "it has none");
+}
+
+TEST(Suggestion, ListsAsManyNamesAsFitIntoAMessage)
+{
+    std::string const half(44, 'x');
+    EXPECT_EQ(suggestion("refresh", {half, half}, "use"), "use " + half + ", " + half);
+    EXPECT_EQ(suggestion("refresh", {half, half, "y"}, "use"),
+              "use " + half + ", " + half + ", ...");
 }
 
 } // namespace suggestion_test

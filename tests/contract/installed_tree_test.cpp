@@ -52,7 +52,7 @@ protected:
         return top_ / "work";
     }
 
-    /** Runs lines as they stand in the page; the first that fails is told. */
+    /** Runs lines of the page; the first that fails is reported. */
     std::string shell(std::string const& lines) const
     {
         Outcome const outcome =

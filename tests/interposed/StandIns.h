@@ -8,7 +8,7 @@
 #include <vector>
 
 /**
- * Stands in for the facts of the operating system, the id ranges, points in time, values made of
+ * Replaces the facts of the operating system, the id ranges, points in time, values made of
  * literals and the store of its node, all of which this program replaces.
  *
  * The fact getters answer with what is given here and consult nothing.

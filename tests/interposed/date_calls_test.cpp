@@ -1,4 +1,4 @@
-// What the date conversions, which a host may replace, are asked for and in which order of
+// The calls of the date conversions, which a host may replace, and their order,
 // arguments.
 
 #include "util/MyProcess.h"

@@ -68,7 +68,7 @@ protected:
     Recording log;
 };
 
-/** Notes what stands in the password file at the moment that chpasswd is started. */
+/** Records the password file when chpasswd starts. */
 class PasswordWrite : public UserWrite
 {
 protected:

@@ -1,4 +1,4 @@
-// Kernel modules as lsmod and modinfo really tell of them.
+// Kernel modules as the real lsmod and modinfo describe them.
 
 #include "TestPaths.h"
 #include "host/Properties.h"

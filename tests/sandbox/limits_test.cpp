@@ -1,5 +1,5 @@
 // A machine at its limits: no descriptors, processes or disk space left, and tools that print
-// without measure or die halfway. What must hold: the plug-in lives and leaves nothing behind.
+// without measure or die halfway. The plug-in must survive and leak nothing.
 
 #include "host/Properties.h"
 #include "tests/support/Machine.h"

@@ -32,7 +32,7 @@ std::string line(LogRecord const& record)
     return text;
 }
 
-/** The two times that a run tells give way to a word, so long as they look like times. */
+/** Replaces the two times of a run by a word if they look like times. */
 std::string withoutTimes(std::string const& text)
 {
     static std::regex const time(

@@ -1,4 +1,4 @@
-// The system log as the real wc, sed and date tell of it.
+// The system log as read by the real wc, sed and date.
 
 #include "host/Properties.h"
 #include "mihost/runtime/Runtime.h"
@@ -320,7 +320,7 @@ TEST_F(Log, IsWithoutTimesWhereDateSpeaksAnotherForm)
     EXPECT_TRUE(recording.has("Invalid format: buffer = 2026-11-21\n", 6000));
 }
 
-/** Counts the nodes that the host is told of. */
+/** Counts the nodes of which the host is informed. */
 struct Told : mihost::NodeObserver {
     Told()
     {

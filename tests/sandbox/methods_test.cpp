@@ -96,7 +96,7 @@ bool succeeds(char const* command)
 struct Account {
     char const* machine;
     std::string user;
-    std::string groups; // as id lists them, each in quotes, behind the unquoted primary one
+    std::string groups; // as id lists them, each in quotes, after the unquoted primary one
 };
 
 void PrintTo(Account const& account, std::ostream* out)

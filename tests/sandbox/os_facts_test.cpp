@@ -1,4 +1,4 @@
-// What the operating-system node says of each kind of machine.
+// The operating-system node on each kind of machine.
 
 #include "host/Properties.h"
 #include "tests/support/Machine.h"

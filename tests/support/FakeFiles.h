@@ -9,7 +9,7 @@
 /**
  * For as long as it lives, /etc and /var/log hold nothing but the files written here.
  *
- * The files stand in a folder of their own, which goes with the object.
+ * The files are in their own directory, which the destructor removes.
  */
 class FakeFiles
 {

@@ -59,7 +59,7 @@ public:
         return found;
     }
 
-    /** The nodes that went through publication, and those whose deletion was asked for. */
+    /** The nodes that went through publication, and those whose deletion was requested. */
     std::vector<IC::Node*> published;
     std::vector<IC::Node*> deleted;
 };

@@ -135,7 +135,7 @@ void index()
 
 void load(std::vector<Loaded> const& modules)
 {
-    // Neither of the two takes new files. All else of /proc is still there, behind links.
+    // Neither of the two accepts new files. The rest of /proc is linked.
     bind("/proc", "/run/processes");
     mountEmptyFolder("/proc");
     for (auto const& entry : std::filesystem::directory_iterator("/run/processes"))

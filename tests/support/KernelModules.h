@@ -27,7 +27,7 @@ void write(std::string const& fileName, std::string const& content);
 /** Has depmod index what is in the folder. */
 void index();
 
-/** A module that is loaded, as the kernel tells of it. */
+/** A loaded module, as the kernel describes it. */
 struct Loaded {
     std::string name;
     long size;

@@ -88,7 +88,7 @@ std::vector<std::string> ran()
 {
     std::vector<std::string> lines;
     for (Call const& call : recorded(shell)) {
-        // sh -c LINE, with newer C libraries sh -c -- LINE; anything else is no command line.
+        // sh -c LINE, with newer C libraries sh -c -- LINE; anything else is not a command line.
         auto const& arguments = call.arguments;
         if (arguments.size() < 3 || arguments[1] != "-c")
             continue;

@@ -9,7 +9,7 @@
 #include <vector>
 
 /**
- * The plug-in's library, loaded as a host loads it: opened, asked for its interface, unloaded if
+ * The plug-in's library, loaded as a host loads it: opened, its interface obtained, unloaded if
  * it was initialised, closed.
  *
  * Nodes belong to the plug-in's framework; a pointer to one is good until a rebuild or unload.
@@ -28,7 +28,7 @@ public:
 
     IC::ManagementInterface& interface() const;
 
-    /** The status object that OpenMI handed out. */
+    /** The status object from OpenMI. */
     IC::Error const& status() const;
 
     IC::Error initialize(unsigned int first = 1);

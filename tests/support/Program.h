@@ -15,7 +15,7 @@ struct Outcome {
  * Runs a program to its end.
  *
  * @param arguments  the program's path first
- * @param input      what it reads from standard input, which is no terminal
+ * @param input      what it reads from standard input, which is not a terminal
  */
 Outcome runToEnd(std::vector<std::string> const& arguments, std::string const& input = "");
 

@@ -27,7 +27,7 @@ public:
     void type(std::string const& text) const;
 
     /**
-     * Reads until the text turns up behind what was read before.
+     * Reads until the text appears after what was read before.
      *
      * @param limit  how long at most; a failing test must end, a slow machine must not fail one
      * @return what was read, up to the end of the text

@@ -14,7 +14,7 @@ constexpr std::size_t bufferSize = 5000;
 class ExecuteCommand : public MethodTest
 {
 protected:
-    /** Runs a program with the arguments; an empty one is put behind them. */
+    /** Runs a program with the arguments; an empty one is appended. */
     int run(std::string program, Lines arguments)
     {
         std::string slot = "(the program's own entry)";

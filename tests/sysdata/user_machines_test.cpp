@@ -96,7 +96,7 @@ TEST(UserMachine, WestOfGreenwichHasItsDatesAtLocalMidnight)
 {
     EXPECT_EQ(ageingOn("users-shadow-in-step", "EST5").at(1),
               "anna $6$anna$hash 1209618000 1 90 14 30 1296018000");
-    // A time of 32 bits ends before that midnight, and what cannot be told is 0.
+    // A time of 32 bits ends before that midnight, and an unknown time is 0.
     std::string const inactive = sizeof(time_t) == 4 ? "0" : "2147490000";
     EXPECT_EQ(ageingOn("users-shadow-in-step", "EST5").at(0),
               "root $6$root$hash 1199163600 0 99999 7 99999 " + inactive);

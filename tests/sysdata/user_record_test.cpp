@@ -171,7 +171,7 @@ TEST(UserInactiveTime, Is19January2038WhereTheFieldIsEmptyOr99999)
         useZone(east);
         EXPECT_EQ(inactiveTime(days), 2147472000U - 3600);
         useZone(west);
-        // A time of 32 bits ends before that midnight, and what cannot be told is 0.
+        // A time of 32 bits ends before that midnight, and an unknown time is 0.
         EXPECT_EQ(inactiveTime(days), sizeof(time_t) == 4 ? 0U : 2147472000U + 5 * 3600);
     }
 }

@@ -58,7 +58,7 @@ FILE* answer(char const* command, char const*)
     return stream;
 }
 
-/** From which on writers stop: after so many writes or, if asked for, so many seconds. */
+/** When writers stop: after this many writes or, if set, seconds. */
 class Duration
 {
 public:

@@ -14,7 +14,7 @@ namespace my_process_test
 
 using NQ::MyProcess;
 
-/** Hands out the streams of popen one after the other and notes which of them are closed. */
+/** Returns the streams of popen one after the other and records which of them are closed. */
 class Pipes
 {
 public:

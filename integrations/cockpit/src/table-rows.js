@@ -14,7 +14,7 @@ export function filterRows(rows, columns, filter) {
 function compare(a, b, order) {
     if (order === "number") {
         const [x, y] = [Number(a), Number(b)];
-        // What is no number, such as an unknown one, comes last.
+        // Values that are not numbers, such as unknown ones, come last.
         if (Number.isNaN(x) || Number.isNaN(y))
             return Number.isNaN(x) - Number.isNaN(y);
         return x - y;

@@ -30,7 +30,7 @@ test("json fails with mihost's message for any other exit status", async () => {
     await assert.rejects(answer, { kind: "failed", message: "user: no account 'x'", exit: 4 });
 });
 
-test("json fails for output that is no document", async () => {
+test("json fails for output that is not a document", async () => {
     const { answer } = mihost.json(["tree"]);
     last().succeed("[{\"id\":");
     await assert.rejects(answer, { kind: "garbled" });
@@ -53,7 +53,7 @@ test("stream calls back with each line's document", async () => {
     await assert.rejects(answer, { kind: "killed" });
 });
 
-test("stream stops at a line that is no document", async () => {
+test("stream stops at a line that is not a document", async () => {
     const documents = [];
     const { answer } = mihost.stream(["watch", "os", "x"], document => documents.push(document));
     last().print("{\"a\":1}\nUsage: mihost\n{\"a\":2}\n");

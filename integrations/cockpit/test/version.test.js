@@ -8,7 +8,7 @@ test("isRecent takes the version itself and newer ones", () => {
         assert.ok(isRecent(`mihost ${version}\n`, "1.2.3"), version);
 });
 
-test("isRecent refuses older ones and what is no version", () => {
+test("isRecent refuses older versions and other texts", () => {
     for (const output of ["mihost 1.2.2", "mihost 1.1.9", "mihost 0.9.9", "", "usage: mihost"])
         assert.ok(!isRecent(output, "1.2.3"), output);
 });

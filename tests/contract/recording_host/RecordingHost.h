@@ -8,7 +8,7 @@
 #include <string>
 #include <vector>
 
-/** One logger call, with all that was handed over. */
+/** One logger call with all its arguments. */
 struct LogCall {
     std::string operation; // "log" or "trace"
     std::string function;

@@ -104,7 +104,7 @@ protected:
         return object<IC::OsSwMI*>("IC::pOsSwMI");
     }
 
-    /** Deletes the nodes of a kind and makes them anew, as a write of a host does. */
+    /** Deletes the nodes of a kind and creates them again, as a write of a host does. */
     void rebuild(char const* builder) const
     {
         auto* const rebuilds =
@@ -669,7 +669,7 @@ TEST_P(Rebuilding, SaysNothingOfADeletionThatFailsAndGoesOn)
     Lines const calls = host.calls();
     EXPECT_EQ(std::count_if(calls.begin(), calls.end(),
                             [](auto const& call) { return call.rfind("deleteNode(", 0) == 0; }),
-              static_cast<std::ptrdiff_t>(nodes)); // each asked for once
+              static_cast<std::ptrdiff_t>(nodes)); // each requested once
 }
 
 } // namespace lifecycle_test

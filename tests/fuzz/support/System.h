@@ -37,7 +37,7 @@ private:
 
 std::string text(std::uint8_t const* data, std::size_t size);
 
-/** As many texts as asked for: the input cut at lines "%%", the rest empty. */
+/** The requested number of texts: the input cut at lines "%%", the rest empty. */
 std::vector<std::string> sections(std::uint8_t const* data, std::size_t size, std::size_t count);
 
 /** Ends the program, and so the run, where something that must hold does not. */

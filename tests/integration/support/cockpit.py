@@ -380,7 +380,7 @@ class Browser:
         return self.run('return window.refused')
 
     def complaints(self):
-        """The problems that the browser's console was told of since it was asked last."""
+        """The problems in the browser's console since the last call."""
         return [entry['message'] for entry in self.driver.get_log('browser')
                 if entry['level'] in ('SEVERE', 'WARNING') and '/favicon.ico' not in entry['message']]
 

@@ -43,7 +43,7 @@ private:
     Events& events_;
 };
 
-/** Notes what the host is told, and whether the node is listed at that moment. */
+/** Records the host's notifications, and whether the node is listed then. */
 class Host : public mihost::NodeObserver
 {
 public:

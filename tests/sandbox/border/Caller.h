@@ -53,7 +53,7 @@ private:
     pid_t process_;
 };
 
-/** Whether anything stands there, be it a link that leads nowhere. */
+/** Whether anything is there, even a dangling link. */
 bool exists(std::string const& path);
 
 /** Skips its tests where no copy can be had, unless MI_SANDBOX_REQUIRED is 1. */

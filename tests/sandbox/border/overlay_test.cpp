@@ -45,7 +45,7 @@ std::string describe(std::initializer_list<char const*> paths)
 class Overlay : public BorderTest
 {
 protected:
-    /** What stands in a copy with the folder laid over. */
+    /** The content of a copy with the overlay. */
     std::string laid(std::initializer_list<char const*> paths) const
     {
         Caller caller(

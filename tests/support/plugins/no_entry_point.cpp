@@ -1,4 +1,4 @@
-// A library that is no plug-in: it lacks OpenMI.
+// A library that is not a plug-in: it lacks OpenMI.
 
 extern "C" int OpenSomethingElse()
 {

@@ -1,4 +1,4 @@
-// Stands in place of a program: notes how it was called, then becomes the real one, which was
+// Replaces a program: records how it was called, then becomes the real one, which was
 // renamed to its name and ".real".
 
 #include <climits>
@@ -13,7 +13,7 @@ int main(int argc, char* argv[])
     if (readlink("/proc/self/exe", self, sizeof self - 1) < 0)
         return 127;
 
-    // The program, the number of arguments and the arguments, a NUL behind each; written at once,
+    // The program, the number of arguments and the arguments, a NUL after each; written at once,
     // so that programs that run at the same time do not mix their notes.
     std::string note = self;
     note.push_back('\0');

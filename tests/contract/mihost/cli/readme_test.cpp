@@ -12,7 +12,7 @@ namespace readme_test
 
 struct Step {
     std::string command;
-    Lines output; // a line of dots stands for any lines
+    Lines output; // a line of dots matches any lines
 };
 
 std::vector<Step> readSession()

@@ -13,7 +13,7 @@ TEST(PasswordHash, FitsItsPasswordAndNoOther)
     std::string const hash = hashOf("geheim42");
     EXPECT_TRUE(fits("geheim42", hash));
     EXPECT_FALSE(fits("geheim43", hash));
-    EXPECT_FALSE(fits("geheim42", "geheim42")); // plain text is no hash
+    EXPECT_FALSE(fits("geheim42", "geheim42")); // plain text is not a hash
     EXPECT_FALSE(fits("geheim42", ""));
     EXPECT_FALSE(fits("geheim42", "!"));
 }

@@ -32,7 +32,7 @@ void forEachParameter(
 
 std::string noSecret(std::string const&)
 {
-    ADD_FAILURE() << "nothing is to be asked for";
+    ADD_FAILURE() << "nothing must be prompted for";
     return "";
 }
 
@@ -47,7 +47,7 @@ TEST(MethodCallValues, AreRefusedForEachForbiddenByte)
         for (int byte = 0; byte < 256; ++byte) {
             char const character = static_cast<char>(byte);
             bool const isControl = byte < 0x20 || byte == 0x7F;
-            bool const isForbidden = isControl || byte >= 0x80 || // alone, such a byte is no UTF-8
+            bool const isForbidden = isControl || byte >= 0x80 || // alone, such a byte is not UTF-8
                                      std::string(forbidden).find(character) != std::string::npos;
             if (!isForbidden)
                 continue;
@@ -103,7 +103,7 @@ TEST(MethodCallValues, AreRefusedIfTheyLookLikeAnOption)
     EXPECT_EQ(objection(Form::AccountName, "-r"),
               "begins with '-', so a command would read it as an option");
     EXPECT_NE(objection(Form::Password, "-n"), std::nullopt);
-    EXPECT_EQ(objection(Form::Words, "-r"), std::nullopt); // always stands behind its option
+    EXPECT_EQ(objection(Form::Words, "-r"), std::nullopt); // always follows its option
 }
 
 TEST(Names, AreRefusedIfToolsWouldReadThemAsIdsOrPaths)

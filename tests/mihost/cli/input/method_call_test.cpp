@@ -11,7 +11,7 @@ using mihost::takeApart;
 
 std::string noSecret(std::string const& name)
 {
-    ADD_FAILURE() << name << " is not to be asked for";
+    ADD_FAILURE() << name << "  must not be prompted for";
     return "";
 }
 

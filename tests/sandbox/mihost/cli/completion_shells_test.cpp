@@ -56,7 +56,7 @@ protected:
         for (char const* name : {"tab\tx", "esc\x1B[2Jx", "high\xFFx"})
             accounts += std::string(name) + ":x:1501:1501::/:/bin/sh\n";
         machine::write("/etc/passwd", accounts);
-        // Completes as ever, and else notes what it gets.
+        // Completes as usual, otherwise records its input.
         machine::fake("/usr/local/bin/mihost", "case $1 in\n"
                                                "__complete*) exec " MIHOST_FILE " \"$@\" ;;\n"
                                                "esac\n"

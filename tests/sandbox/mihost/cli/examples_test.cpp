@@ -1,4 +1,4 @@
-// The examples that the help texts show, run as they stand there.
+// Runs the examples of the help texts.
 
 #include "TestPaths.h"
 #include "mihost/cli/commands/CommandRows.h"

@@ -1,4 +1,4 @@
-// mihost among other programs: what comes before and behind it in a pipe, and what JSON they read.
+// mihost among other programs: before and after them in a pipe, and as a source of JSON.
 
 #include "TestPaths.h"
 #include "tests/support/Machine.h"
@@ -78,7 +78,7 @@ TEST(MihostOnAFullDisk, TellsThatTheTraceWasCutShort)
         bash("mkdir /tmp/small && mount -t tmpfs -o size=16k none /tmp/small && "
              "$mihost --trace /tmp/small/trace get os 108");
     EXPECT_EQ(outcome.code, 2);
-    EXPECT_EQ(outcome.out, "108 os-name  Linux\n"); // the trace is no reason to do less
+    EXPECT_EQ(outcome.out, "108 os-name  Linux\n"); // the trace does not change the result
     EXPECT_EQ(outcome.err,
               "mihost: cannot write the trace '/tmp/small/trace': No space left on device\n");
     EXPECT_EQ(bash("test $(stat -c %s /tmp/small/trace) -gt 8000").code, 0);

@@ -10,9 +10,9 @@ namespace
 
 constexpr TaskValue user = {"USER", "UserName", "", "login name"};
 constexpr TaskValue minDays = {"--min-days", "daysMustKeepPassword", "N",
-                               "set the minimum password age"};
+                               "set the minimum password age in days"};
 constexpr TaskValue maxDays = {"--max-days", "daysMustChangePasswordAfter", "N",
-                               "set the maximum password age"};
+                               "set the maximum password age in days"};
 constexpr TaskValue warnDays = {"--warn-days", "daysWarnBeforePasswordExpire", "N",
                                 "warn N days before the password expires"};
 constexpr TaskValue inactiveDays = {"--inactive-days", "daysExpireAfter", "N",

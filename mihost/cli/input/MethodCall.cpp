@@ -28,8 +28,9 @@ Parameter const& parameter(Method const& method, std::string_view name)
 {
     Parameter const* const found = findParameter(method, name);
     if (!found)
-        throw Failure(BadUsage, fmt::format("{} has no parameter '{}' ({})", method.name, name,
-                                            suggestion(name, rowNames(method.parameters), "use")));
+        throw Failure(BadUsage,
+                      fmt::format("{} has no parameter '{}' ({})", method.name, name,
+                                  suggestion(name, rowNames(method.parameters), "it has")));
     return *found;
 }
 

@@ -119,7 +119,7 @@ unsigned int propertyId(IC::MutableNode const& node, std::string const& name)
         known.push_back(row ? row->name : std::to_string(each));
     }
     throw Failure(NotFound, fmt::format("node '{}' has no property '{}' ({})", addressOf(node),
-                                        name, suggestion(name, known, "use")));
+                                        name, suggestion(name, known, "it has")));
 }
 
 std::string valueText(PropertyView const& property)

@@ -56,7 +56,7 @@ TEST(MethodCall, IsRefusedWithTheNamesThatWouldBeRight)
               "no method 'Useradd' (did you mean UserAdd?)");
     EXPECT_NE(refusal([] { textFor("Adduser", {}); }).find("UserAdd, UserDel"), std::string::npos);
     EXPECT_EQ(refusal([] { textFor("LocalGroupAdd", {"Name=staff"}); }),
-              "LocalGroupAdd has no parameter 'Name' (use GroupName)");
+              "LocalGroupAdd has no parameter 'Name' (it has GroupName)");
 }
 
 TEST(MethodCall, IsRefusedWhereAParameterHasNoName)

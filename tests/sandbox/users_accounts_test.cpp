@@ -42,7 +42,7 @@ IC::PropertyValue written(std::string const& text)
     return {text, true};
 }
 
-/** Local midnight of a day, as a host hands over a point in time. */
+/** Local midnight of a day, as a host passes a point in time. */
 IC::PropertyValue midnight(int year, int month, int day)
 {
     std::tm fields{};
@@ -267,7 +267,7 @@ TEST_F(RealAccounts, HaveTheirGroupsCountedLiveWithoutARefresh)
     EXPECT_EQ(plugin.find(IC::nodeType::group, "team"), nullptr);
 }
 
-/** What stands in one property of all nodes of a type, in their order. */
+/** The value of one property in all nodes of a type, in order. */
 Lines all(Plugin const& plugin, unsigned int type, unsigned int id)
 {
     Lines found;

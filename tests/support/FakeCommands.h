@@ -32,10 +32,10 @@ public:
 
     std::vector<std::string> ran;
 
-    /** The modes asked for, one for each command. */
+    /** The requested modes, one for each command. */
     std::vector<std::string> modes;
 
-    /** Streams handed out and not closed yet. */
+    /** Streams returned and not closed yet. */
     int open = 0;
 };
 

@@ -27,7 +27,7 @@ constexpr char const* suseCommand =
     "echo $(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 9)."
     "$(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 12) | tr -d [:space:]";
 
-/** A machine with release files of its own, and commands that answer as they are told. */
+/** A machine with release files of its own, and commands with given output. */
 class ReleaseFiles : public testing::Test
 {
 protected:

@@ -55,7 +55,7 @@ export class Form {
                 el("div", { class: "mi-help" }, fault, meaning)));
     }
 
-    /** Says of each field what mihost says of its parameter. */
+    /** Describes each field as mihost describes its parameter. */
     explain(parameters) {
         for (const { name, parameter } of this.task.fields)
             replace(this.meanings.get(name), parameters.get(parameter)?.meaning);

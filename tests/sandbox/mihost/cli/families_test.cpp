@@ -129,7 +129,7 @@ TEST(Opensuse, TakesEveryCommand)
         {{"refresh"}, 0, ""},
         {{"watch", "--count", "1", "os", "os-name"}, 0, "Linux"},
         {{"shell"}, 0, "Linux", "get os os-name\n"},
-        {{"doctor"}, 1, "classic stamps in the system log"},
+        {{"doctor"}, 1, "traditional time stamps in the system log"},
         {{"metrics"}, 0, "name=\"Linux\""},
         {{"check", PLUGIN_FILE}, 0, "passed"},
         {{"version"}, 0, "mihost"},

@@ -1,6 +1,6 @@
 # `cpack` makes an RPM of each component, for Fedora or for openSUSE. script/package configures the
 # build as the family lays files out, builds it and calls cpack. Debian's own tools make its packages;
-# what debian/control says of a package goes for its RPM, too.
+# descriptions in debian/control apply to the RPMs, too.
 
 # Packages are made of a whole build.
 if(NOT TARGET mihost OR NOT TARGET miaccel OR NOT TARGET mihost-exporter)

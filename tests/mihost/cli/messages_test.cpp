@@ -11,7 +11,7 @@
 #include <optional>
 #include <regex>
 
-namespace
+namespace messages_test
 {
 
 namespace fs = std::filesystem;
@@ -186,4 +186,4 @@ TEST(MessageForm, HasNoneOfTheseFlaws)
     EXPECT_EQ(flawOf("{" + std::string(200, 'x') + "}"), std::nullopt);
 }
 
-} // namespace
+} // namespace messages_test

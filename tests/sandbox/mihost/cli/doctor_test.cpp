@@ -311,7 +311,7 @@ TEST_F(Doctor, NeverObeysWhatALogLineHolds)
 {
     machine::write("/var/log/messages", "\x1b[2J\xff\n");
     std::string const out = mihostRun({"doctor"}).out;
-    EXPECT_NE(out.find(R"(a line begins with '\x1b[2J\xff' rather)"), std::string::npos) << out;
+    EXPECT_NE(out.find(R"(a line begins with '\x1b[2J\xff' instead)"), std::string::npos) << out;
     EXPECT_FALSE(need("traditional time stamps in the system log").is_null());
 }
 

@@ -68,7 +68,7 @@ TEST_F(MihostHarm, RunsNoUserdelThatWouldFindNobody)
     addAccount("-M -u 1500 jdoe");
     Outcome const outcome = mihostRun({"set", "user:jdoe", "delete", "true"}); // asks for nothing
     EXPECT_EQ(outcome.code, 2);
-    EXPECT_TRUE(stands(outcome.err, "takes names only (use 'mihost user delete jdoe'"))
+    EXPECT_TRUE(stands(outcome.err, "accepts only names (use 'mihost user delete jdoe'"))
         << outcome.err;
     EXPECT_FALSE(ran("userdel"));
     EXPECT_EQ(mihostRun({"call", "UserDel", "UserName=jdoe"}).code, 0);

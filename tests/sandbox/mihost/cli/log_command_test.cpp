@@ -117,11 +117,9 @@ TEST_F(MihostLog, RefusesWrongValuesAndItsOptionsForOtherLists)
     };
     for (Case const& each : {
              Case{{"users", "--since", "today"},
-                  "list users: --since is an option of 'mihost "
-                  "list log'"},
+                  "list users: --since is an option of the log (use 'mihost list log')"},
              Case{{"drivers", "-n", "3"},
-                  "list drivers: --lines is an option of 'mihost list "
-                  "log'"},
+                  "list drivers: --lines is an option of the log (use 'mihost list log')"},
              Case{{"groups", "--follow"}, "list groups: --follow is an option of"},
              Case{{"log", "--since", "soon"}, "'soon' is not YYYY-MM-DD"},
              Case{{"log", "--until", "2026-02-30"}, "'2026-02-30' is not YYYY-MM-DD"},

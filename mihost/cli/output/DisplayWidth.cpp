@@ -11,6 +11,13 @@ namespace mihost
 namespace
 {
 
+/** Null if there is none. */
+locale_t unicodeLocale()
+{
+    static locale_t const locale = newlocale(LC_CTYPE_MASK, "C.UTF-8", nullptr);
+    return locale;
+}
+
 std::size_t widthOf(char32_t character)
 {
     if (character < 0x80)
@@ -36,15 +43,16 @@ std::size_t fitting(std::string_view text, std::size_t width)
 
 } // namespace
 
-UnicodeCharacters::UnicodeCharacters()
-{
-    static locale_t const unicode = newlocale(LC_CTYPE_MASK, "C.UTF-8", nullptr);
-    before_ = uselocale(unicode); // without such a locale nothing changes
-}
+UnicodeCharacters::UnicodeCharacters() : before_(uselocale(unicodeLocale())) {}
 
 UnicodeCharacters::~UnicodeCharacters()
 {
     uselocale(before_);
+}
+
+bool UnicodeCharacters::areAvailable()
+{
+    return unicodeLocale() != nullptr;
 }
 
 std::size_t displayWidth(std::string_view text)

@@ -18,6 +18,9 @@ public:
     UnicodeCharacters(UnicodeCharacters const&) = delete;
     UnicodeCharacters& operator=(UnicodeCharacters const&) = delete;
 
+    /** False on machines without any UTF-8 locale, where this class changes nothing. */
+    static bool areAvailable();
+
 private:
     locale_t before_;
 };

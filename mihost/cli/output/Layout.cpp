@@ -15,6 +15,7 @@
 #include <numeric>
 #include <optional>
 #include <sstream>
+#include <string_view>
 
 namespace mihost
 {
@@ -58,6 +59,24 @@ void require(int result)
         throw std::bad_alloc();
 }
 
+/**
+ * The text as libsmartcols can measure it. Without a UTF-8 locale it would never finish with a
+ * character outside ASCII: '?' for each, and no styles.
+ */
+std::string measurable(std::string const& text)
+{
+    if (UnicodeCharacters::areAvailable())
+        return text;
+    std::string const plain = withoutStyles(text);
+    std::string ascii;
+    for (std::string_view rest = plain; !rest.empty();) {
+        Utf8Piece const piece = firstPiece(rest);
+        ascii += piece.character < 0x80 ? rest.front() : '?';
+        rest.remove_prefix(piece.length);
+    }
+    return ascii;
+}
+
 class Printer
 {
 public:
@@ -75,8 +94,8 @@ public:
      */
     void addColumn(std::string const& heading, int flags)
     {
-        libscols_column* const column =
-            made(scols_table_new_column(table_.get(), heading.c_str(), 0, SCOLS_FL_WRAP | flags));
+        libscols_column* const column = made(scols_table_new_column(
+            table_.get(), measurable(heading).c_str(), 0, SCOLS_FL_WRAP | flags));
         require(scols_column_set_wrapfunc(column, scols_wrapnl_chunksize, scols_wrapnl_nextchunk,
                                           nullptr));
     }
@@ -94,7 +113,7 @@ public:
     {
         libscols_line* const line = made(scols_table_new_line(table_.get(), parent));
         for (std::size_t at = 0; at < cells.size(); ++at)
-            require(scols_line_set_data(line, at, cells[at].c_str()));
+            require(scols_line_set_data(line, at, measurable(cells[at]).c_str()));
         return line;
     }
 

@@ -6,6 +6,7 @@
 #include "tests/support/TerminalRun.h"
 
 #include <cstdlib>
+#include <filesystem>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
@@ -41,6 +42,17 @@ std::string outOf(Lines const& arguments)
     EXPECT_EQ(outcome.code, 0) << arguments[0] << outcome.err;
     EXPECT_EQ(outcome.err, "") << arguments[0];
     return outcome.out;
+}
+
+TEST_F(MihostFormats, PrintsTablesWithoutAnyUtf8Locale)
+{
+    machine::write("/etc/passwd", "root:x:0:0:Bj\u00F6rn:/root:/bin/sh\n");
+    std::filesystem::remove_all("/usr/lib/locale");
+    setenv("LC_ALL", "C", 1);
+    EXPECT_EQ(outOf({"list", "users", "--columns", "user-name,full-name", "--no-headers"}),
+              "root       Bj?rn\n");
+    EXPECT_NE(outOf({"tree"}).find("user:root"), std::string::npos);
+    EXPECT_EQ(outOf({"get", "user:root", "full-name", "-o", "value"}), "Bj\u00F6rn\n");
 }
 
 TEST_F(MihostFormats, PrintsABareValue)

@@ -134,27 +134,28 @@ Json documentOf(UserDescription const& user)
     for (NamedGroup const& group : user.otherGroups)
         groups.push_back(documentOf(group));
     Json const daysLeft = ageing.lastValid ? Json(*ageing.lastValid - today()) : Json(nullptr);
-    Json document = {{"user", toJson(user.name)},
-                     {"full-name", toJson(user.fullName)},
-                     {"uid", user.id},
-                     {"primary-group", documentOf(user.primaryGroup)},
-                     {"other-groups", groups},
-                     {"home-directory", toJson(user.home)},
-                     {"login-shell", toJson(user.shell)},
-                     {"state", orNull(accountState(user, today()))},
-                     {"password", orNull(passwordText(user.password))},
-                     {"password-changed", dayToJson(ageing.changed)},
-                     {"must-change-password", ageing.mustChange},
-                     {"change-allowed-from", dayToJson(ageing.changeableFrom)},
-                     {"warned-from", dayToJson(ageing.warnsFrom)},
-                     {"password-valid-until", dayToJson(ageing.lastValid)},
-                     {"password-days-left", daysLeft},
-                     {"active-until", dayToJson(ageing.lastActive)},
-                     {"account-expires", dayToJson(user.expires)},
-                     {"login-failures-allowed",
-                      user.loginFailures == 0 ? Json(nullptr) : Json(user.loginFailures)},
-                     {"node", user.noNode.empty() ? toJson("user:" + user.name) : Json(nullptr)},
-                     {"no-node", orNull(user.noNode)}};
+    Json document = {
+        {"user", toJson(user.name)},
+        {"full-name", toJson(user.fullName)},
+        {"uid", user.id},
+        {"primary-group", documentOf(user.primaryGroup)},
+        {"other-groups", groups},
+        {"home-directory", toJson(user.home)},
+        {"login-shell", toJson(user.shell)},
+        {"state", orNull(accountState(user, today()))},
+        {"password", orNull(passwordText(user.password))},
+        {"password-changed", dayToJson(ageing.changed)},
+        {"must-change-password", user.unknown.empty() ? Json(ageing.mustChange) : Json(nullptr)},
+        {"change-allowed-from", dayToJson(ageing.changeableFrom)},
+        {"warned-from", dayToJson(ageing.warnsFrom)},
+        {"password-valid-until", dayToJson(ageing.lastValid)},
+        {"password-days-left", daysLeft},
+        {"active-until", dayToJson(ageing.lastActive)},
+        {"account-expires", dayToJson(user.expires)},
+        {"login-failures-allowed",
+         user.loginFailures == 0 ? Json(nullptr) : Json(user.loginFailures)},
+        {"node", user.noNode.empty() ? toJson("user:" + user.name) : Json(nullptr)},
+        {"no-node", orNull(user.noNode)}};
     if (!user.unknown.empty())
         document["unknown"] = toJson(user.unknown);
     return document;

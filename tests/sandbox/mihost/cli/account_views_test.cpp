@@ -99,6 +99,7 @@ TEST_F(AccountViews, SayWhyAnAccountHasNoNode)
     EXPECT_EQ(user["no-node"], "uid 65534 is above UID_MAX 60000");
     EXPECT_EQ(user["state"], nullptr);
     EXPECT_EQ(user["unknown"], "'nobody' has no entry in /etc/shadow");
+    EXPECT_TRUE(user["must-change-password"].is_null());
 }
 
 TEST_F(AccountViews, TellAboutOneGroupWhatAPersonWantsToKnow)

@@ -138,14 +138,14 @@ TEST_F(Overlay, DoesNotBringBackThePowerCommands)
 TEST_F(Overlay, IsRefusedWithTheReasonWhereTheFolderIsMissing)
 {
     EXPECT_EQ(reason(folder.path("missing")),
-              "cannot open the folder " + folder.path("missing") + ": No such file or directory");
+              "cannot open the directory " + folder.path("missing") + ": No such file or directory");
 }
 
 TEST_F(Overlay, IsRefusedWithTheReasonForAFile)
 {
     folder.write("file", "");
     EXPECT_EQ(reason(folder.path("file")),
-              "cannot open the folder " + folder.path("file") + ": Not a directory");
+              "cannot open the directory " + folder.path("file") + ": Not a directory");
 }
 
 TEST_F(Overlay, RefusesWhatIsNeitherFileLinkNorFolder)
@@ -153,7 +153,7 @@ TEST_F(Overlay, RefusesWhatIsNeitherFileLinkNorFolder)
     folder.write("etc/file", "");
     ASSERT_EQ(mkfifo(folder.path("etc/pipe").c_str(), 0600), 0);
     EXPECT_EQ(reason(folder.name()), "cannot lay over /etc/pipe, neither a file nor a link nor "
-                                     "a folder: Invalid argument");
+                                     "a directory: Invalid argument");
 }
 
 TEST_F(Overlay, IsRefusedWithTheReasonWhereAFileWouldReplaceAFolder)

@@ -137,8 +137,9 @@ TEST_F(Overlay, DoesNotBringBackThePowerCommands)
 
 TEST_F(Overlay, IsRefusedWithTheReasonWhereTheFolderIsMissing)
 {
-    EXPECT_EQ(reason(folder.path("missing")),
-              "cannot open the directory " + folder.path("missing") + ": No such file or directory");
+    EXPECT_EQ(reason(folder.path("missing")), "cannot open the directory " +
+                                                  folder.path("missing") +
+                                                  ": No such file or directory");
 }
 
 TEST_F(Overlay, IsRefusedWithTheReasonForAFile)

@@ -1,4 +1,4 @@
-// Loads the plug-in and takes it down again, for the example programs.
+// Loads and unloads the plug-in, for the example programs.
 
 #ifndef LOAD_PLUGIN_H
 #define LOAD_PLUGIN_H
@@ -26,7 +26,7 @@ public:
 
     ~LoadedPlugin()
     {
-        interface_->unload(); // the nodes go before the library that holds their code
+        interface_->unload(); // deletes the nodes, whose code is in the library
         dlclose(library_);
     }
 
@@ -45,7 +45,7 @@ public:
             throw std::runtime_error("the plug-in did not start");
     }
 
-    /** The nodes of one type, in the order of the tree; good until the next write. */
+    /** The nodes of one type, in the order of the tree; valid until the next write. */
     std::vector<IC::MutableNode*> nodes(unsigned int type)
     {
         std::vector<IC::Node*> all;

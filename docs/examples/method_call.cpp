@@ -1,5 +1,5 @@
 // Carries out a method call, such as "LocalGroupAdd,GroupName:CMPI_string:builders", as root.
-// A refused call carries no reason, so this host collects it from the log.
+// A refused call returns no reason, so this host collects it from the log.
 
 #include "host/VXLogger.h"
 #include "load_plugin.h"

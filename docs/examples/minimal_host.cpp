@@ -1,4 +1,4 @@
-// Loads the plug-in and prints its tree: a node's depth shows in its indentation.
+// Loads the plug-in and prints its tree, indented by depth.
 
 #include "host/MutableNode.h"
 #include "host/OpenMI.h"
@@ -36,7 +36,7 @@ int main(int argc, char** argv)
                   << node->getDescription() << '\n';
     }
 
-    mi->unload(); // the nodes go before the library that holds their code
+    mi->unload(); // deletes the nodes, whose code is in the library
     dlclose(library);
     return started ? 0 : 1;
 }

@@ -1,4 +1,4 @@
-// The beginning of a framework of one's own: bodies for what a header declares.
+// The beginning of a host's own framework: definitions for one header.
 
 #include "host/EnumValue.h"
 

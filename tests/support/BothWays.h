@@ -9,6 +9,7 @@
 #include <cstdio>
 #include <optional>
 #include <string>
+#include <utility>
 
 /** What one command prints, asked in both ways. For the tiers that hold the accelerator's parts. */
 namespace bothways
@@ -41,6 +42,17 @@ inline std::optional<std::string> answered(std::string const& command)
     std::string text = readAll(stream);
     std::fclose(stream);
     return text;
+}
+
+/** What date prints and what is answered for it, both in the same second. */
+inline std::pair<std::string, std::optional<std::string>> dates()
+{
+    for (;;) {
+        std::string const before = real("date");
+        std::optional<std::string> const between = answered("date");
+        if (before == real("date"))
+            return {before, between};
+    }
 }
 
 /** The counts of one command, by its row in the table. */

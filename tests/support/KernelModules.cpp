@@ -127,6 +127,13 @@ void write(std::string const& fileName, std::string const& content)
     machine::write(folder() + '/' + fileName, content);
 }
 
+void install(std::vector<std::pair<std::string, std::vector<std::string>>> const& modules)
+{
+    for (auto const& [fileName, facts] : modules)
+        write(fileName, file(facts));
+    index();
+}
+
 void index()
 {
     if (std::system("depmod 2>/dev/null") != 0)

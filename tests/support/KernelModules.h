@@ -2,6 +2,7 @@
 #define TESTS_SUPPORT_KERNELMODULES_H
 
 #include <string>
+#include <utility>
 #include <vector>
 
 /** Kernel modules of our own making, for the copy of the machine that a test runs in. */
@@ -23,6 +24,9 @@ std::string signature(std::string const& signer);
 
 /** Puts a module into the folder. */
 void write(std::string const& fileName, std::string const& content);
+
+/** Puts modules of these file names and facts into the folder, and indexes it. */
+void install(std::vector<std::pair<std::string, std::vector<std::string>>> const& modules);
 
 /** Has depmod index what is in the folder. */
 void index();

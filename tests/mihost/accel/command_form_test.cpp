@@ -14,18 +14,11 @@ constexpr char const* modinfo = "modinfo ~";
 TEST(AccelCommand, KnowsTheCommandsOfThePlugIn)
 {
     EXPECT_EQ(operandsOf(wc, "wc -l /var/log/messages").value().name, "/var/log/messages");
-    auto const ofSed = operandsOf(sed, "sed -n '120p' /var/log/messages");
-    ASSERT_TRUE(ofSed);
-    EXPECT_EQ(ofSed->name, "/var/log/messages");
-    EXPECT_EQ(ofSed->line, 120U);
+    EXPECT_EQ(operandsOf(sed, "sed -n '120p' /var/log/messages").value().name, "/var/log/messages");
+    EXPECT_EQ(operandsOf(sed, "sed -n '120p' f").value().line, 120U);
+    EXPECT_EQ(operandsOf(sed, "sed -n '999999999999999999p' f").value().line, 999999999999999999U);
     EXPECT_EQ(operandsOf(modinfo, "modinfo snd_hda-intel").value().name, "snd_hda-intel");
     EXPECT_TRUE(operandsOf("date", "date"));
-}
-
-TEST(AccelCommand, ReadsLineNumbersOfUpTo18Digits)
-{
-    EXPECT_EQ(operandsOf(sed, "sed -n '999999999999999999p' f").value().line, 999999999999999999U);
-    EXPECT_FALSE(operandsOf(sed, "sed -n '1000000000000000000p' f"));
 }
 
 TEST(AccelCommand, LeavesEverythingElseToTheShell)
@@ -44,7 +37,7 @@ TEST(AccelCommand, LeavesEverythingElseToTheShell)
           "modinfo a,b", "sed", "sed -n", "sed -n 1p f", "sed -n '1p'", "sed '1p' f",
           "sed -n '1p' f g", "sed -n '1p' -", "sed -n '1p' -i", "sed -n '1d' f", "sed -n 'p' f",
           "sed -n '' f", "sed -n '$p' f", "sed -n '1,2p' f", "sed -n '1q' f", "sed -n '1pp' f",
-          "sed -n '+1p' f", "sed -n '-1p' f",
+          "sed -n '+1p' f", "sed -n '-1p' f", "sed -n '1000000000000000000p' f",
           // refused by some seds
           "sed -n '0p' f", "sed -n '00p' f", "sed -n '01p' f"})
         for (char const* form : {wc, sed, "date", modinfo})

@@ -1,6 +1,5 @@
 #include "mihost/accel/LineIndex.h"
 #include "mihost/sandbox/Descriptor.h"
-#include "tests/interpose/Libc.h"
 #include "tests/support/ReadCounter.h"
 #include "tests/support/ScratchFolder.h"
 
@@ -15,36 +14,44 @@ namespace line_index_test
 using miaccel::LineIndex;
 
 constexpr std::size_t edge = LineIndex::edge;
+constexpr std::size_t textSize = 100'000;
+constexpr std::size_t endsOfEdges[] = {0, edge - 1, textSize - edge, textSize - 1};
 
 class AccelLineIndex : public testing::Test
 {
 protected:
     void write(std::string const& text)
     {
-        folder_.write("log", text);
-        file_ = mihost::Descriptor(open(folder_.path("log").c_str(), O_RDWR | O_CLOEXEC));
+        file_ = mihost::Descriptor(open(folder_.write("log", text).c_str(), O_RDWR | O_CLOEXEC));
     }
 
-    bool update()
+    void writeLineEnd(std::size_t place)
     {
-        struct stat now {
-        };
-        return fstat(file_.get(), &now) == 0 && index_.update(file_.get(), now);
+        ASSERT_EQ(pwrite(file_.get(), "\n", 1, static_cast<off_t>(place)), 1);
     }
 
-    /** How much it reads for that. */
-    std::size_t bytesToUpdate()
+    struct stat state() const
+    {
+        struct stat now = {};
+        EXPECT_EQ(fstat(file_.get(), &now), 0);
+        return now;
+    }
+
+    /** @return how many bytes it reads for that */
+    std::size_t update()
     {
         ReadCounter const counter;
-        EXPECT_TRUE(update());
+        EXPECT_TRUE(index_.update(file_.get(), state()));
         return counter.bytes();
     }
 
     void expectIndexOf(std::string const& text)
     {
-        ASSERT_TRUE(update());
+        write(text);
+        update();
         auto const lines = std::count(text.begin(), text.end(), '\n');
         ASSERT_EQ(index_.lineEnds(), static_cast<std::uint64_t>(lines));
+        ASSERT_EQ(index_.hasNul(), text.find('\0') != std::string::npos);
         std::uint64_t const step = 1 + index_.lineEnds() / 500; // of many lines not all are sought
         std::size_t begin = 0;
         for (std::uint64_t line = 1; line <= index_.lineEnds() + 1; ++line) {
@@ -56,7 +63,7 @@ protected:
         ASSERT_EQ(index_.find(file_.get(), index_.lineEnds() + 2), text.size());
     }
 
-    ScratchFolder folder_;
+    ScratchFolder const folder_;
     mihost::Descriptor file_;
     LineIndex index_;
 };
@@ -69,36 +76,26 @@ TEST_F(AccelLineIndex, FindsEveryLineWhereverItsBlocksEnd)
         while (text.size() < 3 * LineIndex::block)
             text += std::string(random() % longest, 'x') + '\n';
         text.resize(text.size() - random() % 2, '\n');
-        write(text);
         expectIndexOf(text);
     }
-    for (std::size_t const size : {LineIndex::block - 1, +LineIndex::block, LineIndex::block + 1}) {
-        std::string const text(size, '\n');
-        write(text);
-        expectIndexOf(text);
-    }
+    for (std::size_t const size : {LineIndex::block - 1, +LineIndex::block, LineIndex::block + 1})
+        expectIndexOf(std::string(size, '\n'));
 }
 
-TEST_F(AccelLineIndex, ReadsOnlyTheEdgesOfAFileThatIsUnchanged)
+TEST_F(AccelLineIndex, ReadsOnlyEdgesAndWhatIsNew)
 {
     write(std::string(4'000'000, '\n'));
-    EXPECT_EQ(bytesToUpdate(), 4'000'000 + 2 * edge);
-    EXPECT_EQ(bytesToUpdate(), 2 * edge);
-}
-
-TEST_F(AccelLineIndex, ReadsOnlyEdgesAndTheNewPartOfAGrownFile)
-{
-    write(std::string(4'000'000, '\n'));
-    ASSERT_TRUE(update());
+    EXPECT_EQ(update(), 4'000'000 + 2 * edge);
+    EXPECT_EQ(update(), 2 * edge);
     folder_.append("log", "new\n");
-    EXPECT_EQ(bytesToUpdate(), 4 * edge + 4);
+    EXPECT_EQ(update(), 4 * edge + 4);
     EXPECT_EQ(index_.lineEnds(), 4'000'001U);
 }
 
 TEST_F(AccelLineIndex, ReadsOneBlockToFindALine)
 {
     write(std::string(4'000'000, '\n'));
-    ASSERT_TRUE(update());
+    update();
     ReadCounter counter;
     for (std::uint64_t line = 1; line < index_.lineEnds(); line += 99991) {
         counter.reset();
@@ -109,88 +106,54 @@ TEST_F(AccelLineIndex, ReadsOneBlockToFindALine)
 
 TEST_F(AccelLineIndex, NoticesOtherEdgesOfAGrownFile)
 {
-    std::string const text(100'000, 'a');
-    for (std::size_t const changed :
-         {std::size_t{0}, edge - 1, text.size() - edge, text.size() - 1}) {
-        write(text);
-        ASSERT_TRUE(update());
+    std::string const text(textSize, 'a');
+    for (std::size_t const changed : endsOfEdges) {
+        expectIndexOf(text);
         std::string other = text + "more\n";
         other[changed] = '\n';
-        folder_.write("log", other);
         expectIndexOf(other);
     }
 }
 
-TEST_F(AccelLineIndex, NoticesWritesAtItsEdgesDespiteOldTimes)
+TEST_F(AccelLineIndex, NoticesWritesAtItsEdgesOrByTheTime)
 {
-    std::string text(100'000, 'a');
-    write(text);
-    ASSERT_TRUE(update());
-    struct stat state {
-    };
-    ASSERT_EQ(fstat(file_.get(), &state), 0);
-    for (std::size_t const changed :
-         {std::size_t{0}, edge - 1, text.size() - edge, text.size() - 1}) {
-        text[changed] = '\n';
-        ASSERT_EQ(pwrite(file_.get(), "\n", 1, static_cast<off_t>(changed)), 1);
-        ASSERT_TRUE(index_.update(file_.get(), state)); // with the times of before
-        EXPECT_EQ(index_.lineEnds(),
-                  static_cast<std::size_t>(std::count(text.begin(), text.end(), '\n')));
+    write(std::string(textSize, 'a'));
+    struct stat taken = state();
+    ASSERT_TRUE(index_.update(file_.get(), taken));
+    std::uint64_t lineEnds = 0;
+    for (std::size_t const changed : endsOfEdges) {
+        writeLineEnd(changed);
+        ASSERT_TRUE(index_.update(file_.get(), taken)); // with the time of before
+        EXPECT_EQ(index_.lineEnds(), ++lineEnds);
     }
+    writeLineEnd(textSize / 2);
+    ++taken.st_ctim.tv_nsec;
+    ASSERT_TRUE(index_.update(file_.get(), taken));
+    EXPECT_EQ(index_.lineEnds(), ++lineEnds);
 }
 
-TEST_F(AccelLineIndex, NoticesAChangeFurtherInsideByItsTime)
+TEST_F(AccelLineIndex, FollowsAFileThatGrowsAndShrinks)
 {
-    std::string text(100'000, 'a');
-    write(text);
-    struct stat state {
-    };
-    ASSERT_EQ(fstat(file_.get(), &state), 0);
-    ASSERT_TRUE(index_.update(file_.get(), state));
-    text[50'000] = '\n';
-    ASSERT_EQ(pwrite(file_.get(), "\n", 1, 50'000), 1);
-    ++state.st_ctim.tv_nsec;
-    ASSERT_TRUE(index_.update(file_.get(), state));
-    EXPECT_EQ(index_.lineEnds(), 1U);
-}
-
-TEST_F(AccelLineIndex, ReadsAFileAgainThatGotShorter)
-{
-    write(std::string(100'000, '\n'));
-    ASSERT_TRUE(update());
-    folder_.write("log", std::string(99'999, '\n'));
-    expectIndexOf(std::string(99'999, '\n'));
-}
-
-TEST_F(AccelLineIndex, TellsNulBytesWhereverTheyAre)
-{
-    write("1\n2\n");
-    ASSERT_TRUE(update());
-    EXPECT_FALSE(index_.hasNul());
-    folder_.append("log", std::string(1, '\0'));
-    ASSERT_TRUE(update());
-    EXPECT_TRUE(index_.hasNul());
-    folder_.write("log", "1\n");
-    ASSERT_TRUE(update());
-    EXPECT_FALSE(index_.hasNul());
+    std::string const lines(textSize, '\n');
+    std::string const few = "1\n2\n";
+    for (std::string const& text : {lines, lines.substr(1), few, few + '\0', few.substr(2)})
+        expectIndexOf(text);
 }
 
 TEST_F(AccelLineIndex, FailsWhenTheFileEndsBeforeItsSize)
 {
     write("1\n2\n");
-    {
-        libc::HookGuard const guard;
-        libc::hooks().pread = [](int, void*, std::size_t, off_t) -> ssize_t { return 0; };
-        EXPECT_FALSE(update());
-    }
+    libc::hooks().pread = [](int, void*, std::size_t, off_t) -> ssize_t { return 0; };
+    EXPECT_FALSE(index_.update(file_.get(), state()));
+    libc::hooks().pread.reset();
     expectIndexOf("1\n2\n");
 }
 
 TEST_F(AccelLineIndex, FindsNothingInAnotherFile)
 {
     write("1\n2\n3\n");
-    ASSERT_TRUE(update());
-    folder_.write("log", "123456");
+    update();
+    write("123456");
     EXPECT_FALSE(index_.find(file_.get(), 2));
 }
 

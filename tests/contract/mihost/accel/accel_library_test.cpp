@@ -10,59 +10,50 @@
 namespace accel_library_test
 {
 
-using Words = std::vector<std::string>;
-
-Words line(Words words, Words const& more)
-{
-    words.insert(words.end(), more.begin(), more.end());
-    return words;
-}
-
 class AccelLibrary : public testing::Test
 {
 protected:
-    ScratchFolder folder_;
-    std::string log_ = folder_.write("log", "first\nsecond\n");
-    Words commands_{"wc -l " + log_, "sed -n '2p' " + log_, "echo hi; exit 3",
-                    "wc -c " + log_, "wc -l /nonexistent",  "modinfo no_such_module"};
-    Outcome plain_ = runToEnd(line({PROBE_FILE}, commands_));
-    std::string counts_ = "wc 1 1\nsed 1 0\ndate 0 0\nlsmod 0 0\nmodinfo 0 1\nother 0 2\n";
+    Outcome run(char const* probe) const
+    {
+        return runToEnd({probe, "wc -l " + log_, "sed -n '2p' " + log_, "echo hi; exit 3",
+                         "wc -c " + log_, "wc -l /nonexistent", "modinfo no_such_module"});
+    }
+
+    void expectAnswers(Outcome const& outcome) const
+    {
+        EXPECT_EQ(outcome.out, "2 " + log_ + "\nsecond\nhi\n13 " + log_ + "\n");
+        EXPECT_EQ(outcome.out, plain_.out);
+        EXPECT_EQ(outcome.err, plain_.err + "wc 1 1\nsed 1 0\ndate 0 0\nlsmod 0 0\n"
+                                            "modinfo 0 1\nother 0 2\n");
+    }
+
+    ScratchFolder const folder_;
+    std::string const log_ = folder_.write("log", "first\nsecond\n");
+    Outcome const plain_ = run(PROBE_FILE);
 };
 
 TEST_F(AccelLibrary, AnswersWhenLinked)
 {
-    ASSERT_EQ(plain_.out, "2 " + log_ + "\nsecond\nhi\n13 " + log_ + "\n");
-    Outcome const run = runToEnd(line({ACCEL_PROBE_FILE}, commands_));
-    EXPECT_EQ(run.out, plain_.out);
-    EXPECT_EQ(run.err, plain_.err + counts_);
+    expectAnswers(run(ACCEL_PROBE_FILE));
 }
 
 #if !defined(__SANITIZE_ADDRESS__) && !defined(__SANITIZE_THREAD__) // they want to be first
-TEST_F(AccelLibrary, AnswersWhenPreloaded)
+TEST_F(AccelLibrary, AnswersWhenPreloadedAlone)
 {
     setenv("LD_PRELOAD", ACCEL_FILE, 1);
-    Outcome const run = runToEnd(line({PROBE_FILE}, commands_));
-    EXPECT_EQ(run.out, plain_.out);
-    EXPECT_EQ(run.err, plain_.err + counts_);
-}
-
-TEST_F(AccelLibrary, StepsAsideWhenPreloadedBesideAnotherLibrary)
-{
+    expectAnswers(run(PROBE_FILE));
     setenv("LD_PRELOAD", ACCEL_FILE ":libc.so.6", 1);
-    Outcome const run = runToEnd({PROBE_FILE, "date"});
-    EXPECT_NE(run.err.find("date 0 1\n"), std::string::npos) << run.err;
+    std::string const counts = run(PROBE_FILE).err;
+    EXPECT_NE(counts.find("\nwc 0 2\nsed 0 1\n"), std::string::npos) << counts;
 }
 #endif
 
 TEST(AccelLibraryFile, DefinesNothingButItsFaceAndTheTwoCalls)
 {
-    FILE* const stream =
-        popen("nm --dynamic --defined-only --format=just-symbols " ACCEL_FILE " | sort", "r");
-    std::string names;
-    for (int character = fgetc(stream); character != EOF; character = fgetc(stream))
-        names += static_cast<char>(character);
-    pclose(stream);
-    EXPECT_EQ(names, "miaccel_counts\nmiaccel_enable\npclose\npopen\n");
+    EXPECT_EQ(runToEnd({"/usr/bin/nm", "--dynamic", "--defined-only", "--format=just-symbols",
+                        ACCEL_FILE})
+                  .out,
+              "miaccel_counts\nmiaccel_enable\npclose\npopen\n");
 }
 
 } // namespace accel_library_test

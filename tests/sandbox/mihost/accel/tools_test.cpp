@@ -1,12 +1,12 @@
-// On a machine with other shells and tools, answers are those of the ones that are there.
+// On a machine with other shells, tools, locales and zones, answers are those of the ones that are
+// there.
 
+#include "TestPaths.h"
 #include "tests/support/ComparedLog.h"
 #include "tests/support/KernelModules.h"
-#include "tests/support/Machine.h"
+#include "tests/support/Program.h"
 
 #include <cstdlib>
-#include <filesystem>
-#include <unistd.h>
 
 namespace tools_test
 {
@@ -15,10 +15,18 @@ using bothways::answered;
 using bothways::real;
 using bothways::reasonOf;
 
-namespace fs = std::filesystem;
-
-char const* const count = "wc -l /etc/hostname";
+char const* const count = "wc -l /etc/passwd";
+char const* const script = "the shell or the tool is a script";
 char const* const replaceable = "users other than root can replace the shell or the tool";
+char const* const notRunnable = "the shell or the tool cannot be run";
+char const* const notFound = "PATH does not find the tool in a system directory";
+char const* const unknownShell = "/bin/sh is not dash, bash or, for some tools, busybox";
+char const* const notKmod = "the tool is not a link to kmod";
+
+void run(std::string const& command)
+{
+    ASSERT_EQ(std::system(command.c_str()), 0) << command;
+}
 
 /** A machine on which everything is answered at first. */
 class AccelTools : public testing::Test
@@ -26,131 +34,95 @@ class AccelTools : public testing::Test
 protected:
     AccelTools()
     {
-        machine::write("/etc/hostname", "name\n");
-        EXPECT_EQ(answered(count), real(count));
-        EXPECT_TRUE(answered("date"));
+        setenv("PATH", "/usr/local/bin:/usr/sbin:/usr/bin", 1);
+        kernelModules::load({});
+        kernelModules::install({{"some.ko", {"version=1"}}});
+        for (char const* command : {count, "date", "lsmod", "modinfo some"})
+            EXPECT_TRUE(answered(command)) << command;
     }
 };
 
-void link(std::string const& program, std::string const& target)
+struct Change {
+    char const* command; // makes it
+    char const* asked;
+    char const* reason;
+};
+
+class AccelChangedTools : public AccelTools, public testing::WithParamInterface<Change>
 {
-    machine::remove(program);
-    fs::create_symlink(target, program);
+};
+
+TEST_P(AccelChangedTools, AreRunForTheirReason)
+{
+    auto const [command, asked, reason] = GetParam();
+    run(command);
+    EXPECT_FALSE(answered(asked)) << command;
+    std::string const line = asked;
+    EXPECT_EQ(reasonOf(line.substr(0, line.find(' '))), reason) << command;
 }
 
-TEST_F(AccelTools, AreRunWhenTheyAreScripts)
-{
-    machine::fake("/usr/bin/wc", "echo fake\n");
-    EXPECT_FALSE(answered(count));
-    EXPECT_EQ(reasonOf("wc"), "the shell or the tool is a script");
-    EXPECT_TRUE(answered("date"));
-}
+INSTANTIATE_TEST_SUITE_P(
+    Tools, AccelChangedTools,
+    testing::Values(Change{"echo '#!/bin/sh' > /usr/bin/wc", count, script},
+                    Change{"chown 1000 /usr/bin/wc", count, replaceable},
+                    Change{"chmod g+w /usr/bin/wc", count, replaceable},
+                    Change{"chmod o+w /usr/bin/wc", count, replaceable},
+                    Change{"chmod g+w /usr/bin", count, replaceable},
+                    Change{"chmod o+w /usr/bin", count, replaceable},
+                    Change{"chmod 400 /usr/bin/wc", count, notRunnable},
+                    Change{"rm /usr/bin/wc", count, notFound},
+                    Change{"cp /usr/bin/wc /usr/local/bin", count, notFound},
+                    Change{"ln -sf /usr/bin/busybox /usr/sbin/lsmod", "lsmod", notKmod},
+                    Change{"rm /usr/sbin/lsmod && cp /usr/bin/kmod /usr/sbin/lsmod", "lsmod",
+                           notKmod},
+                    Change{"rm /usr/sbin/modinfo && cp /usr/bin/ldd /usr/sbin/modinfo",
+                           "modinfo some", script}));
 
-TEST_F(AccelTools, AreRunWhenOthersCanReplaceThem)
-{
-    ASSERT_EQ(chown("/usr/bin/wc", 1000, 0), 0);
-    EXPECT_FALSE(answered(count));
-    EXPECT_EQ(reasonOf("wc"), replaceable);
-    ASSERT_EQ(chown("/usr/bin/wc", 0, 0), 0);
-    for (fs::perms const others : {fs::perms::group_write, fs::perms::others_write})
-        for (char const* path : {"/usr/bin/wc", "/usr/bin", "/bin/dash"}) {
-            fs::perms const before = fs::status(path).permissions();
-            fs::permissions(path, others, fs::perm_options::add);
-            EXPECT_FALSE(answered(count)) << path;
-            EXPECT_EQ(reasonOf("wc"), replaceable);
-            fs::permissions(path, before);
-            EXPECT_TRUE(answered(count));
-        }
-}
+INSTANTIATE_TEST_SUITE_P(
+    Shells, AccelChangedTools,
+    testing::Values(Change{"chmod g+w /bin/dash", count, replaceable},
+                    Change{"chmod o+w /bin/dash", count, replaceable},
+                    Change{"rm /bin/sh", count, notRunnable},
+                    Change{"ln -sf /usr/bin/ldd /bin/sh", count, script},
+                    Change{"cp /bin/dash /bin/other && ln -sf other /bin/sh", count, unknownShell},
+                    Change{"cp /bin/dash /bin/other && ln -sf other /bin/sh", "date", unknownShell},
+                    Change{"ln -sf busybox /bin/sh", "lsmod", unknownShell}));
 
-TEST_F(AccelTools, AreRunWhenALinkLeadsToAFolderThatOthersCanWrite)
+TEST_F(AccelTools, AreAnsweredUnlessALinkLeadsToAFolderOfOthers)
 {
-    fs::create_directory("/opt/tools");
-    fs::copy_file("/usr/bin/wc", "/opt/tools/wc");
-    link("/usr/bin/wc", "/opt/tools/wc");
+    run("mkdir /opt/tools && cp /usr/bin/wc /opt/tools && ln -sf /opt/tools/wc /usr/bin/wc");
     EXPECT_TRUE(answered(count));
-    fs::permissions("/opt/tools", fs::perms::others_write, fs::perm_options::add);
+    run("chmod o+w /opt/tools");
     EXPECT_FALSE(answered(count));
     EXPECT_EQ(reasonOf("wc"), replaceable);
+    EXPECT_TRUE(answered("date"));
+    run("chmod o-w /opt/tools");
+    EXPECT_TRUE(answered(count));
 }
 
-TEST_F(AccelTools, AreRunWhenTheyCannotBeRun)
+TEST_F(AccelTools, AreAnsweredWhenTheShellIsBashOrBusybox)
 {
-    fs::permissions("/usr/bin/wc", fs::perms::owner_read);
-    EXPECT_FALSE(answered(count));
-    machine::remove("/usr/bin/wc");
-    EXPECT_FALSE(answered(count));
-}
-
-TEST_F(AccelTools, AreRunByAShellThatIsNotKnown)
-{
-    machine::recordShell();
-    EXPECT_FALSE(answered(count));
-    EXPECT_FALSE(answered("date"));
-    machine::remove("/bin/sh");
-    EXPECT_FALSE(answered(count));
-    machine::write("/bin/sh", "#!/bin/bash\n", 0755);
-    EXPECT_FALSE(answered(count));
-}
-
-TEST_F(AccelTools, AreAnsweredWhenTheShellIsBash)
-{
-    link("/bin/sh", "bash");
-    EXPECT_EQ(answered(count), real(count));
+    for (char const* shell : {"busybox", "bash"}) {
+        run(std::string("ln -sf /usr/bin/") + shell + " /bin/sh");
+        EXPECT_EQ(answered(count), real(count)) << shell;
+    }
     setenv("BASH_FUNC_wc%%", "() { echo function; }", 1);
     EXPECT_EQ(real(count), "function\n");
     EXPECT_FALSE(answered(count));
 }
 
-TEST_F(AccelTools, AreAnsweredWhenTheShellIsBusyboxButForModules)
-{
-    kernelModules::load({});
-    EXPECT_TRUE(answered("lsmod"));
-    link("/bin/sh", "busybox");
-    EXPECT_EQ(answered(count), real(count));
-    EXPECT_FALSE(answered("lsmod"));
-}
-
-TEST_F(AccelTools, OfModulesAreRunUnlessTheyAreLinksToKmod)
-{
-    kernelModules::load({});
-    EXPECT_TRUE(answered("lsmod"));
-    link("/usr/sbin/lsmod", "/usr/bin/busybox");
-    EXPECT_FALSE(answered("lsmod"));
-    EXPECT_EQ(reasonOf("lsmod"), "the tool is not a link to kmod");
-    machine::remove("/usr/sbin/lsmod");
-    fs::copy_file("/usr/bin/kmod", "/usr/sbin/lsmod");
-    EXPECT_FALSE(answered("lsmod"));
-    machine::fake("/usr/sbin/modinfo", "echo fake\n");
-    EXPECT_FALSE(answered("modinfo ext4"));
-}
-
-TEST_F(AccelTools, AreRunWhenAnotherComesFirstInPath)
-{
-    machine::fake("/usr/local/bin/wc", "echo fake\n");
-    setenv("PATH", "/usr/local/bin:/usr/sbin:/usr/bin", 1);
-    EXPECT_EQ(real(count), "fake\n");
-    EXPECT_FALSE(answered(count));
-    EXPECT_TRUE(answered("date"));
-}
-
 /** A machine whose tools are those of busybox, as links or, hard to tell, as programs. */
-class AccelBusybox : public testing::TestWithParam<bool>
+class AccelBusybox : public testing::TestWithParam<char const*>
 {
 protected:
     AccelBusybox()
     {
-        for (char const* tool : {"/usr/bin/wc", "/usr/bin/sed", "/usr/bin/date"}) {
-            machine::remove(tool);
-            if (GetParam())
-                fs::create_symlink("busybox", tool);
-            else
-                fs::create_hard_link("/usr/bin/busybox", tool);
-        }
+        for (std::string const tool : {"wc", "sed", "date"})
+            run(std::string(GetParam()) + " /usr/bin/busybox /usr/bin/" + tool);
     }
 };
 
-INSTANTIATE_TEST_SUITE_P(Kinds, AccelBusybox, testing::Bool());
+INSTANTIATE_TEST_SUITE_P(Kinds, AccelBusybox, testing::Values("ln -sf", "ln -f"));
 
 TEST_P(AccelBusybox, ReadsALogAsIsAnsweredWhateverHappensToIt)
 {
@@ -165,24 +137,60 @@ TEST_P(AccelBusybox, PrintsTheDateThatIsAnsweredInEveryZone)
                              "<+03>-3", "CET-1CEST,M3.5.0,M10.5.0/3", ""}) {
         setenv("TZ", zone, 1);
         answered("date"); // runs it
-        std::string before;
-        std::optional<std::string> between;
-        do {
-            before = real("date");
-            between = answered("date");
-        } while (before != real("date"));
-        EXPECT_EQ(between.value_or(before), before) << zone;
+        auto const [expected, found] = bothways::dates();
+        EXPECT_EQ(found.value_or(expected), expected) << zone;
     }
     EXPECT_GE(bothways::countOf("date").answered, 5U);
 }
 
 TEST_P(AccelBusybox, IsRunForADateInALocaleThatItDoesNotFollow)
 {
-    ASSERT_EQ(std::system("localedef -i de_DE -f UTF-8 de_DE.UTF-8"), 0);
+    run("localedef -i de_DE -f UTF-8 de_DE.UTF-8");
     setenv("LC_ALL", "de_DE.UTF-8", 1);
     EXPECT_TRUE(answered("date")); // runs it
     EXPECT_FALSE(answered("date"));
     EXPECT_EQ(reasonOf("date"), "date printed an unexpected text");
+}
+
+class AccelLocale : public testing::TestWithParam<char const*>
+{
+};
+
+INSTANTIATE_TEST_SUITE_P(Languages, AccelLocale,
+                         testing::Values("ar_SA", "de_DE", "en_GB", "en_US", "fa_IR", "ja_JP",
+                                         "ru_RU", "th_TH"));
+
+/** In a fresh process, whose locale is that of its beginning. date runs first, then is answered. */
+TEST_P(AccelLocale, GivesTheDateThatDateGives)
+{
+    std::string const name = GetParam();
+    run("localedef -i " + name + " -f UTF-8 " + name + ".UTF-8 2>/dev/null || test $? = 1");
+    unsetenv("LC_ALL");
+    setenv("TZ", "America/St_Johns", 1);
+    for (char const* variable : {"LC_TIME", "LC_ALL"}) {
+        setenv(variable, (name + ".UTF-8").c_str(), 1);
+        std::string before;
+        Outcome between;
+        do {
+            before = runToEnd({PROBE_FILE, "date", "date"}).out;
+            between = runToEnd({ACCEL_PROBE_FILE, "date", "date"});
+        } while (before != runToEnd({PROBE_FILE, "date", "date"}).out);
+        EXPECT_EQ(between.out, before) << variable;
+        EXPECT_NE(between.err.find("date 1 1\n"), std::string::npos) << between.err;
+    }
+}
+
+TEST(AccelZones, FollowTheSystemsOwnZoneFile)
+{
+    unsetenv("TZ");
+    setenv("LC_ALL", "C", 1);
+    for (char const* zone : {"Asia/Kolkata", "America/St_Johns", "Europe/Berlin"}) {
+        run(std::string("ln -sf /usr/share/zoneinfo/") + zone + " /etc/localtime");
+        bothways::answered("date"); // runs it
+        auto const [expected, found] = bothways::dates();
+        EXPECT_EQ(found, expected) << zone;
+    }
+    EXPECT_GE(bothways::countOf("date").answered, 3U);
 }
 
 } // namespace tools_test

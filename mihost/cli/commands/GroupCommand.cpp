@@ -69,7 +69,7 @@ CommandRow const commandRows::group{
     newCommand<Group>,
     {
         {"mihost group crew", "its id and members"},
-        {"mihost group add-member staff jdoe", "change it"},
+        {"mihost group add-member staff jdoe", "add a member"},
     },
 };
 

@@ -29,7 +29,8 @@ std::vector<Task> const tasks = {
             {"--home", "HomeDir", "DIR", "set the home directory"},
             {"--shell", "ScriptPath", "FILE", "set the login shell"},
             {"--password", "Password", "",
-             "set a password, read from a prompt or standard input; without one nobody can log in"},
+             "set a password, read from a prompt or standard input; without one, no login by "
+             "password"},
             minDays,
             maxDays,
             warnDays,
@@ -110,7 +111,8 @@ std::vector<Task> const tasks = {
         "UserSetAttrib",
         {user, minDays, maxDays, warnDays, inactiveDays},
         {
-            {"mihost user age jdoe --max-days 90 --warn-days 14", "change the password quarterly"},
+            {"mihost user age jdoe --max-days 90 --warn-days 14",
+             "require a new password every 90 days"},
             {"mihost user age jdoe --max-days 99999", "set no maximum password age"},
         },
     }
@@ -131,7 +133,7 @@ CommandRow const commandRows::user{
     newCommand<User>,
     {
         {"mihost user jdoe", "ids, groups, state and password ageing"},
-        {"mihost user set-shell jdoe /bin/sh", "change it"},
+        {"mihost user set-shell jdoe /bin/sh", "set the login shell"},
     },
 };
 

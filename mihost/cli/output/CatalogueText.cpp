@@ -1,5 +1,7 @@
 #include "mihost/cli/output/CatalogueText.h"
 
+#include "host/Properties.h"
+
 #include <algorithm>
 #include <fmt/format.h>
 #include <fmt/ranges.h>
@@ -13,7 +15,10 @@ namespace
 
 std::string addressForm(NodeKind const& kind)
 {
-    return kind.single ? kind.address : fmt::format("{}:NAME", kind.address);
+    if (kind.single)
+        return kind.address;
+    return fmt::format("{}:{}", kind.address,
+                       kind.nameProperty == IC::property::id ? "INDEX" : "NAME");
 }
 
 /** The title, and the table below it, which may have no rows. */

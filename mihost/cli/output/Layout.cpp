@@ -71,7 +71,7 @@ std::string measurable(std::string const& text)
     std::string ascii;
     for (std::string_view rest = plain; !rest.empty();) {
         Utf8Piece const piece = firstPiece(rest);
-        ascii += piece.character < 0x80 ? rest.front() : '?';
+        ascii += piece.character < 0x80 ? static_cast<char>(piece.character) : '?';
         rest.remove_prefix(piece.length);
     }
     return ascii;

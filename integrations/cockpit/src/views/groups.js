@@ -16,7 +16,7 @@ export class GroupsView extends Pair {
                 id: "groups-table",
                 filterId: "groups-filter",
                 label: _("Groups"),
-                none: _("There are no groups."),
+                none: _("No groups."),
                 columns: [
                     {
                         property: "group-name", title: _("Name"), text: row => row["group-name"],

@@ -46,7 +46,7 @@ export class UsersView extends Pair {
             ...page,
             list: "users",
             table: {
-                id: "users-table", filterId: "users-filter", label: _("Users"), none: _("There are no users."),
+                id: "users-table", filterId: "users-filter", label: _("Users"), none: _("No users."),
                 columns: columns(),
             },
             buttons: [button(_("Add user"), () => page.preview(tasks.userAdd), {

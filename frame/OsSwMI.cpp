@@ -32,8 +32,8 @@ Error OsSwMI::initialize(unsigned int first, Number const& second, Number const&
 void OsSwMI::unload()
 {
     NQ::log::Scope const scope(OSSWMI::unit);
-    ManagementInterface::unload(); // deletes the nodes: a later life must not mistake others for
-                                   // them
+    ManagementInterface::unload();
+    // The nodes are deleted: a later initialize must not find their addresses here.
     for (std::vector<Node*>* kind : {&logEntryNodes_, &groupNodes_, &userNodes_})
         kind->clear();
     delete nodeIds_;

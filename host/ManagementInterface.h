@@ -16,8 +16,8 @@ namespace IC
 /**
  * The object that a plug-in passes to its host, and the base class that the host provides for it.
  *
- * Life: the host takes it from OpenMI, may call setLoadCallBack, calls initialize once, uses the
- * tree, calls unload and then closes the library.
+ * Lifecycle: the host gets it from OpenMI, may call setLoadCallBack, calls initialize once, uses
+ * the tree, calls unload and then closes the library.
  *
  * Contract: the plug-in derives from this class, so the order of the virtual operations and of the
  * protected members is fixed; see OpenMI.h.
@@ -46,7 +46,7 @@ public:
     virtual Error registerForAlerts(AlertCallBack callBack, void const* context);
 
     /**
-     * Stores who is informed of new nodes and who finds nodes by path. Calls neither.
+     * Stores the callbacks that announce new nodes and find nodes by path. Calls neither.
      *
      * The nodes that initialize builds cause no call: take them from getMap. A rebuild passes each
      * of its new nodes to addNewNode, which calls once for each.

@@ -5,7 +5,7 @@
  * The words of a method-call text, which a host writes to property::createUser of the
  * operating-system node: METHOD,NAME:TYPE:VALUE,NAME:TYPE:VALUE...
  *
- * None may change.
+ * Contract: none may change, since hosts send them.
  */
 namespace IC
 {

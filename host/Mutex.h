@@ -32,7 +32,7 @@ private:
     Mutex& operator=(Mutex const&) = delete;
 
     struct Handle;
-    std::unique_ptr<Handle> handle_; // the host's own; what it points to is free
+    std::unique_ptr<Handle> handle_; // private to the host; not part of the contract
 };
 
 } // namespace NQ

@@ -5,7 +5,7 @@
 #include "host/ManagementInterface.h"
 
 /*
- * What a host provides beyond the declarations of these headers:
+ * What a host must provide beyond the declarations of these headers:
  *
  * - Every operation declared here as a symbol that the dynamic linker finds when it loads the
  *   plug-in: in a shared library that the host is linked to, or in a program that exports its
@@ -15,8 +15,9 @@
  *   _GLIBCXX_USE_CXX11_ABI as 0 has other symbols.
  * - The layouts. The plug-in creates Error, Number, EnumValue, PropertyValue, VXMessageBuffer and
  *   Mutex by value and calls nothing but their operations: size and alignment are fixed, the
- * private members are not. It derives from ManagementInterface and MutableNode: their size and the
- * order of their virtual operations are fixed, and in ManagementInterface the protected members.
+ *   private members are not. It derives from ManagementInterface and MutableNode: their size and
+ *   the order of their virtual operations are fixed, and in ManagementInterface the protected
+ *   members.
  * - A node list that the plug-in can append to while it builds the tree: the protected nodes_.
  */
 

@@ -2,10 +2,10 @@
 #define HOST_PROPERTIES_H
 
 /*
- * The numbers that node types, properties and commands go by. Both sides know them; none may
- * change.
+ * The numbers of node types, properties and commands. Contract: none may change, since hosts use
+ * them.
  *
- * Constants rather than enumerations: the contract takes ids by reference to unsigned int.
+ * Constants rather than enumerations: setProperty takes ids by reference to unsigned int.
  */
 namespace IC
 {

@@ -40,7 +40,7 @@ public:
     /** @param text  must not be null */
     PropertyValue(char const* text, bool const& flag);
 
-    /** A number, a truth value or a date, as the number's own kind says. */
+    /** A number, a truth value or a date, according to the number's kind. */
     PropertyValue(Number const& number, bool const& flag);
 
     PropertyValue(EnumValue const& value, bool const& flag);
@@ -61,8 +61,8 @@ public:
     operator std::string() const;
 
     /**
-     * The value as an unsigned number: the number itself, or that of a text that is wholly decimal;
-     * 0 for everything else and for numbers that do not fit.
+     * The value as an unsigned number: a number, truth value, enumeration value or date in seconds,
+     * or a text of decimal digits only; 0 for everything else and for numbers that do not fit.
      */
     operator unsigned int() const;
 

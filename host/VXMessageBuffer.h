@@ -11,8 +11,8 @@ namespace VXLog
 /**
  * Assembles one log message. Not reused: each message takes a new buffer.
  *
- * Text leaves the buffer as the result, so that more of its operators can follow; a number
- * leaves a stream on the same buffer, so that anything a stream takes can follow.
+ * Writing text returns the buffer, so more of its operators can follow; writing a number returns a
+ * stream on the same buffer, so anything that a stream accepts can follow.
  *
  * Contract: the plug-in makes room for objects of this class itself, so their size is fixed; see
  * OpenMI.h.

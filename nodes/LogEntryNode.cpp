@@ -13,7 +13,7 @@ namespace IC
 namespace
 {
 
-/** Each entry costs several commands at the start. */
+/** Each entry runs several commands when it is built. */
 constexpr unsigned int maxEntries = 50;
 
 } // namespace

@@ -9,7 +9,7 @@ namespace IC
 /**
  * One of the newest lines of the system log; index 1 is the last line.
  *
- * Every read reads message and time from the log, so once the log has grown they are those of a
+ * Message and time are read from the log each time, so once the log has grown they are those of a
  * newer line. The stored copies are from the time the node was built.
  */
 class LogEntryNode : public MutableNode
@@ -19,10 +19,10 @@ public:
                  unsigned int nodeType, unsigned int index);
     ~LogEntryNode() override;
 
-    /** Status 1, and value as it was, for a message or time that cannot be read. */
+    /** Status 1, and value unchanged, for a message or time that cannot be read. */
     Error getProperty(unsigned int id, PropertyValue& value) const override;
 
-    /** Stores the value in the node alone; the log stays as it is. */
+    /** Stores the value in the node only; the log is unchanged. */
     Error setProperty(unsigned int const& id, PropertyValue const& value) override;
 };
 

@@ -6,7 +6,10 @@
 namespace IC
 {
 
-/** The operating system: memory, swap and process figures are live, all else is stored. */
+/**
+ * The operating system. Physical memory, swap and the number of processes are read live, the
+ * command to clear the log always reads as 0, and all else is stored.
+ */
 class OsNode : public MutableNode
 {
 public:
@@ -19,8 +22,8 @@ public:
 
     /**
      * Stores the value, and acts on the system first if the property is a command: requested
-     * state, clear log, refresh and create user. Only a create-user text that fails yields status
-     * 1 and is not stored; an empty text is then stored in its place.
+     * state, clear log, refresh and create user. Contract: only a create-user text that fails
+     * yields status 1; an empty text is stored in its place. Other commands hide their failures.
      */
     Error setProperty(unsigned int const& id, PropertyValue const& value) override;
 };

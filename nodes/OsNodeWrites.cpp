@@ -1,4 +1,4 @@
-// What the operating-system node does when a host writes to it.
+// Writes to the operating-system node, and the commands that they start.
 
 #include "frame/OsSwMI.h"
 #include "host/Methods.h"

@@ -72,7 +72,7 @@ void setUserProperties(MutableNode& node, userInfo& user, std::size_t userCount)
          {property::passwordHistoryDepth,
           number(static_cast<unsigned long>(user.getPasswordHistoryDepth()))},
          {property::reservedText, {"", true}},
-         {property::passwordExpiration, inactiveTime}, // Contract: a write gives it its meaning
+         {property::passwordExpiration, inactiveTime}, // Contract: reads as the account's expiry
          {property::lastPwdChange, date(user.getLstPwdChg())},
          {property::maxLoginFailures,
           number(static_cast<unsigned long>(user.getMaxLoginFailures()))},
@@ -80,7 +80,7 @@ void setUserProperties(MutableNode& node, userInfo& user, std::size_t userCount)
          {property::elementCount, number(userCount)}});
 }
 
-/** Through wide text and back, which is how the host's texts are read. */
+/** Through wide text and back, as all texts of the host are read. */
 std::string textOf(PropertyValue const& value)
 {
     return NQ::make_string(NQ::make_wstring(value));
@@ -93,7 +93,7 @@ std::string textOf(MutableNode const& node, unsigned int id)
     return textOf(value);
 }
 
-/** Gives an account a new encrypted password by way of a file that chpasswd reads. */
+/** Sets an account's encrypted password with chpasswd, which reads it from a file. */
 void setPassword(std::string const& user, std::string const& password, NQ::log::Scope const& scope)
 {
     std::ofstream file("usrandpwd");
@@ -104,7 +104,7 @@ void setPassword(std::string const& user, std::string const& password, NQ::log::
         scope.error("Cannot open process: ", line);
 }
 
-/** Carries out a write on the system; nothing for most properties. */
+/** Carries out a write on the system; most properties have no effect there. */
 void act(MutableNode const& node, unsigned int id, PropertyValue const& value,
          NQ::log::Scope const& scope)
 {
@@ -143,7 +143,7 @@ UserNode::~UserNode()
 
 Error UserNode::getProperty(unsigned int id, PropertyValue& value) const
 {
-    // Contract: the messages name the class twice, which log filters of hosts expect.
+    // Contract: logged under the constructor's name, which log filters of hosts expect.
     NQ::log::Scope const scope(OSSWMI::unit, {"UserNode::UserNode"});
     if (id != property::elementCount)
         return MutableNode::getProperty(id, value);

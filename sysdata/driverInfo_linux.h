@@ -43,7 +43,7 @@ private:
  * that modinfo cannot be started for is left out; one that it does not know has no version and the
  * description "Driver".
  *
- * @param drivers  its contents are replaced; empty where lsmod cannot be started
+ * @param drivers  its contents are replaced; empty if lsmod cannot be started
  */
 void getDriverInfo(std::vector<driverInfo>& drivers);
 

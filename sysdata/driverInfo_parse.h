@@ -10,7 +10,7 @@ namespace NQ
 
 class driverInfo;
 
-/** What the lines that lsmod and modinfo print mean. Not part of the plug-in's interface. */
+/** Parsers for the lines of lsmod and modinfo. Not part of the plug-in's interface. */
 namespace MI_INTERNAL driverLines
 {
 
@@ -27,21 +27,21 @@ bool findModule(char const* line, char (&module)[lineSize]);
 /** Contract: treats every module whose name begins with "Module" as the header, too. */
 bool isHeader(char const* module);
 
-/** How often modinfo gave a fact of one module. */
+/** How often each fact occurred in the output of modinfo for one module; the last one counts. */
 struct Seen {
     unsigned int versions = 0;
     unsigned int descriptions = 0;
 };
 
 /**
- * Takes a version or description over from one line of modinfo; other lines say nothing.
+ * Sets the version or the description from a line of modinfo; ignores other lines.
  *
  * @param line  changed in place
- * @return false for a version or description that no space follows; nothing is taken over then
+ * @return false for a version or description without a space after it; the driver is unchanged
  */
 bool takeFact(char* line, driverInfo& driver, Seen& seen);
 
-/** Completes a record once all lines of modinfo are taken in. */
+/** Completes a record after the last line of modinfo. */
 void complete(driverInfo& driver, Seen const& seen, char const* module);
 
 } // namespace driverLines

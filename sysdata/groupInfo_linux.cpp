@@ -51,7 +51,7 @@ public:
 class SharedPrimaryMembers
 {
 public:
-    /** To be made by one listing at a time. */
+    /** At most one exists at a time: the listing's mutex is held. */
     SharedPrimaryMembers()
     {
         shared = &primary_;

@@ -15,9 +15,9 @@ namespace
 /**
  * The pieces of a members field, to find whether it contains NAME followed by ",".
  *
- * It does if a piece ends in NAME. The pieces are kept back to front, so that
- * such a piece begins with the reversed name and is found by one lookup: searching the field itself
- * would cost a large group the square of its size.
+ * It does if a piece ends in NAME. The pieces are kept back to front, so that such a piece begins
+ * with the reversed name and is found by one lookup: searching the field itself would cost a large
+ * group the square of its size.
  */
 class Pieces
 {

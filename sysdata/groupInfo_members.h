@@ -6,14 +6,14 @@
 #include <string>
 #include <unordered_map>
 
-/** How a group's members are put together. Nothing here logs. */
+/** The list of a group's members. Nothing here logs. */
 namespace NQ
 {
 
 namespace GROUP_INFO
 {
 
-/** Who has which group as primary group, as /etc/passwd said when the object was made. */
+/** The accounts by primary group, as in /etc/passwd when the object was made. */
 class MI_INTERNAL PrimaryMembers
 {
 public:
@@ -27,8 +27,8 @@ private:
 };
 
 /**
- * Appends to a members field each name, followed by ",", unless the field holds that very text
- * somewhere already; then takes the last "," away.
+ * Appends each name and a "," to a members field, unless the field contains that text already; at
+ * the end, removes the last ",".
  *
  * @param field    names, each followed by ","
  * @param members  ended by a null pointer

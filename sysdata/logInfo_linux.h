@@ -12,8 +12,8 @@ extern std::string loggerLogInfo;
 /**
  * Reads the system log, /var/log/messages, a line at a time, and empties it.
  *
- * Entries are counted from the newest: index 1 is the last line of the file. Nothing is held in
- * memory: each call runs its own commands, so an index means another line once the log has grown.
+ * Entries are counted from the newest: index 1 is the last line of the file. Nothing is cached:
+ * each call runs its own commands, so an index means another line once the log has grown.
  */
 class logInfo
 {
@@ -48,7 +48,8 @@ public:
     /**
      * The time stamp of an entry, read as local time, in the current year or the one before.
      *
-     * @param time  seconds since 1970, 0 if the date cannot be read; unchanged on failure
+     * @param time  seconds since 1970, 0 if the command date cannot be started; unchanged on
+     *              failure
      * @return whether there is such an entry with a time stamp
      */
     bool getCreationTime(long& time, unsigned int index);

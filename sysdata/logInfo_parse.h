@@ -8,7 +8,7 @@
 namespace NQ
 {
 
-/** What the log's lines and the commands' output mean. Not part of the plug-in's interface. */
+/** Parsers for the log's lines and for command output. Not part of the plug-in's interface. */
 namespace MI_INTERNAL logLines
 {
 

@@ -52,7 +52,7 @@ void minMaxId::parse(char const* text)
         for (Key& key : keys) {
             if (std::strncmp(line, key.name, keyLength) != 0)
                 continue;
-            // One separating byte is passed over unseen. A value that is none leaves the old one.
+            // One byte separates, whatever it is. A value that is not a number keeps the old one.
             std::sscanf(line + keyLength + 1, "%u", &key.value);
             found += key.found ? 0 : 1;
             key.found = true;

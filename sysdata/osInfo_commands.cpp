@@ -168,7 +168,7 @@ bool beginsWithAny(std::string const& text, char const* const (&beginnings)[coun
 constexpr char const* agingNotices[] = {"Aging information changed",
                                         "Aging information not changed"};
 
-// userdel for an account without a crontab, and usermod for one that is already in that state.
+// From userdel for an account without a crontab, and from usermod if there is nothing to change.
 constexpr char const* harmlessNotices[] = {"no crontab for", "usermod: no changes"};
 
 } // namespace

@@ -47,7 +47,7 @@ struct Method {
 /** Null for an unknown method. */
 Method const* findMethod(std::string const& name);
 
-/** A program and its arguments; an empty one ends the list when it is run. */
+/** A program and its arguments. Contract: the first empty argument ends the list when it is run. */
 using Arguments = std::vector<std::string>;
 
 /** Bytes in a command line or in what it prints, the terminating NUL included. */

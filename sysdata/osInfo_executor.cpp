@@ -20,7 +20,7 @@ using os::Ran;
 
 std::string programOf(Method const& method)
 {
-    // There useradd creates a group for each user without this option.
+    // On these systems, useradd without this option creates a group for each user.
     bool const needsOption =
         method.kind == MethodKind::userAdd && files::canOpen("/etc/redhat-release");
     return needsOption ? std::string(method.program) + " -n" : method.program;
@@ -85,7 +85,7 @@ void OsInfo::executePasswordEncryption(char* password, char* user)
 {
     log::Scope const scope(methods);
     if (*user == '\0') {
-        // Without a name passwd would change the caller's own password.
+        // Without a name, passwd would change the caller's own password.
         scope.error("No user name for the password");
         return;
     }

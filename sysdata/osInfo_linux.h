@@ -15,7 +15,7 @@ extern std::string loggerOsInfo;
 /**
  * The facts about the running operating system, and its administration.
  *
- * Holds nothing and caches nothing: each call reads the system afresh. A fact getter writes its
+ * Holds nothing and caches nothing: each call reads the system. A fact getter writes its
  * result into its argument and returns true for success.
  */
 class OsInfo
@@ -70,7 +70,7 @@ public:
     /** The distribution's version; at most 9 characters if read by a command. */
     bool getOSVersion(std::string& out);
 
-    /** Major and minor number of a release file of key = value lines, joined by a point. */
+    /** The values in lines 2 and 3 of a release file of key = value lines, joined by a dot. */
     bool getKestoVersion(std::string path, std::string& out);
 
     /** The language of LANG, else of LC_CTYPE, such as "en-US". Always true. */
@@ -147,7 +147,7 @@ public:
      */
     int executeCommand(char* program, char** arguments, char* output);
 
-    /** Sets a password through passwd. Failures are not noticed. */
+    /** Sets a password with passwd, unless the user name is empty. Failures are not detected. */
     void executePasswordEncryption(char* password, char* user);
 
     /**

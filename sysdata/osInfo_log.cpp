@@ -14,7 +14,7 @@ std::string withoutPasswords(std::string const& output, std::vector<ParamInfo> c
     for (ParamInfo const& param : params)
         if (param.name == IC::parameter::password && !param.value.empty())
             hidden.insert(hidden.end(), {param.value, withEscapedBlanks(param.value)});
-    // The longest first, or a password that another one begins with would leave the rest of that.
+    // The longest first: else a password that begins another would leave the rest of it visible.
     std::sort(hidden.begin(), hidden.end(), [](std::string const& one, std::string const& other) {
         return one.size() > other.size();
     });

@@ -37,8 +37,8 @@ bool holds(std::string const& text, char const* part)
 }
 
 /**
- * The difference of the first bytes that differ, which is what the system's string comparison
- * yields; in some environments that yields no more than its sign.
+ * The difference of the first bytes that differ. That is what the system's strcmp returns, but some
+ * replacements of it return only the sign.
  */
 int difference(char const* left, char const* right)
 {

@@ -25,7 +25,7 @@ constexpr std::size_t commandSize = 1024;
 constexpr std::size_t lineSize = 1024;
 constexpr std::size_t runnerSize = 5000;
 
-// The address is what matters: executeLinCommand recognises our output buffer by it.
+// executeLinCommand compares its address, to know that the output buffer is ours.
 char passwdProgram[] = "/usr/bin/passwd";
 
 // What error messages begin with; the command follows.
@@ -40,7 +40,7 @@ bool run(char const* command)
 }
 
 /**
- * The chage command that sets an age in days, so that it is reached on a date.
+ * The chage command that sets an age in days so that it is reached on a date.
  *
  * @param label   chage's label of the day that the age is counted from
  * @param option  chage's option for the age

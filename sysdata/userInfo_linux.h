@@ -179,7 +179,8 @@ private:
  *
  * The list is emptied first and stays empty if /etc/passwd cannot be read. Password and ageing
  * come from /etc/shadow as long as it names the accounts in the same order. The system's account
- * lock is held for the whole listing; callers that must not overlap serialise themselves.
+ * lock is held for the whole listing; it does not exclude other threads of this
+ * process.
  */
 void getUserInfo(std::vector<userInfo>& users);
 

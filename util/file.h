@@ -42,11 +42,11 @@ bool canOpen(char const* path);
  */
 bool readToEnd(FILE* stream, char* buffer, std::size_t size);
 
-/** Reads files as a whole; one reading uses the memory of the one before it. */
+/** Reads whole files, each into the memory of the one before. */
 class WholeText
 {
 public:
-    /** @return what could be read of the file, good until the next reading */
+    /** @return what could be read of the file, valid until the next read */
     std::string_view read(char const* path);
 
 private:

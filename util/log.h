@@ -8,7 +8,7 @@
 #include <ostream>
 #include <string>
 
-/** The plug-in's log points. Not part of its interface, so nothing here is exported. */
+/** The plug-in's logging. Not part of its interface, so nothing here is exported. */
 namespace NQ
 {
 
@@ -56,7 +56,7 @@ public:
     Scope(Scope const&) = delete;
     Scope& operator=(Scope const&) = delete;
 
-    // One message of the function, at the level of that name, assembled from the pieces.
+    // Each writes one message of the function, at the level of its name.
 
     template <class... Rest> void progress(Beginning first, Rest const&... rest) const
     {

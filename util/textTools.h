@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-/** Small text work that several units share. Not part of the plug-in's interface. */
+/** Text functions that several units share. Not part of the plug-in's interface. */
 namespace NQ
 {
 
@@ -15,7 +15,7 @@ namespace MI_INTERNAL text
 {
 
 /**
- * Replaces characters in place, from the second one on: the first is never looked at. A
+ * Replaces characters in place, from the second one on; the first is always kept. A
  * replacement by NUL ends the text and the scan.
  *
  * @param s  NUL-terminated, may be empty

@@ -1,4 +1,4 @@
-// What `cmake --install` puts in place, used by the page that tells how to write a host.
+// The tree that `cmake --install` makes, used as docs/writing-a-host.md shows.
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -52,7 +52,7 @@ protected:
         return top_ / "work";
     }
 
-    /** Runs lines of the page; the first that fails is reported. */
+    /** Runs shell lines of the page; the first failure ends them and is reported. */
     std::string shell(std::string const& lines) const
     {
         Outcome const outcome =
@@ -71,7 +71,7 @@ constexpr char topOfTheTree[] = "1 OsSw Management Interface\n"
                                 "    3 Computer\n"
                                 "      4 Operating System\n";
 
-TEST_F(InstalledTree, StandsInTheUsualDirectories)
+TEST_F(InstalledTree, HasTheUsualDirectories)
 {
     for (char const* file :
          {"include/mihost/host/OpenMI.h", "include/mihost/host/Properties.h",
@@ -85,7 +85,7 @@ TEST_F(InstalledTree, StandsInTheUsualDirectories)
 }
 
 #ifdef HAS_MIHOST
-TEST_F(InstalledTree, RunsMihostWithThePluginBesideIt)
+TEST_F(InstalledTree, RunsMihostWithItsOwnPlugin)
 {
     for (char const* file : {"bin/mihost", "share/man/man1/mihost.1"})
         EXPECT_TRUE(fs::is_regular_file(prefix() / file)) << file;
@@ -94,7 +94,7 @@ TEST_F(InstalledTree, RunsMihostWithThePluginBesideIt)
     EXPECT_NE(outcome.out, "");
 }
 #else
-TEST_F(InstalledTree, HasNothingOfTheProgramWithoutIt)
+TEST_F(InstalledTree, LacksTheProgramsFilesIfItIsNotBuilt)
 {
     for (char const* file :
          {"bin", "share/man/man1", "share/bash-completion", "share/zsh", "share/fish"})
@@ -103,7 +103,7 @@ TEST_F(InstalledTree, HasNothingOfTheProgramWithoutIt)
 #endif
 
 #ifdef ACCEL_FILE
-TEST_F(InstalledTree, RunsMihostWithTheAcceleratorBesideIt)
+TEST_F(InstalledTree, RunsMihostWithItsOwnAccelerator)
 {
     EXPECT_TRUE(fs::is_regular_file(libraries() / "libmiaccel.so"));
     EXPECT_TRUE(fs::is_regular_file(prefix() / "include/mihost/mihost/accel/Accel.h"));
@@ -113,10 +113,10 @@ TEST_F(InstalledTree, RunsMihostWithTheAcceleratorBesideIt)
 #endif
 
 /** Runs the page's lines for a compiler and pkg-config, with the compiler of this build. */
-class ThroughPkgConfig : public InstalledTree
+class PkgConfig : public InstalledTree
 {
 protected:
-    ThroughPkgConfig()
+    PkgConfig()
     {
         setenv("PKG_CONFIG_PATH", (libraries() / "pkgconfig").c_str(), 1);
         setenv("LD_LIBRARY_PATH", libraries().c_str(), 1);
@@ -131,13 +131,13 @@ protected:
     }
 };
 
-TEST_F(ThroughPkgConfig, AHostGetsHeadersAndRuntime)
+TEST_F(PkgConfig, GivesAHostHeadersAndRuntime)
 {
     std::string const tree = build("--libs mihost)");
     EXPECT_EQ(tree.find(topOfTheTree), 0U) << tree;
 }
 
-TEST_F(ThroughPkgConfig, AFrameworkGetsTheHeadersAlone)
+TEST_F(PkgConfig, GivesAFrameworkOnlyTheHeaders)
 {
     build("mihost-headers");
     EXPECT_TRUE(fs::is_regular_file(work() / "own_framework.o"));
@@ -145,7 +145,7 @@ TEST_F(ThroughPkgConfig, AFrameworkGetsTheHeadersAlone)
 }
 
 #ifdef ACCEL_FILE
-TEST_F(ThroughPkgConfig, AHostGetsTheAccelerator)
+TEST_F(PkgConfig, GivesAHostTheAccelerator)
 {
     std::string const tree = build("--libs mihost miaccel)", "readelf -d fast_host\n./fast_host\n");
     EXPECT_NE(tree.find("[libmiaccel.so.0]"), std::string::npos) << tree;
@@ -154,7 +154,7 @@ TEST_F(ThroughPkgConfig, AHostGetsTheAccelerator)
 #endif
 
 /** Builds the page's lines for CMake with the compiler of this build. */
-class ThroughFindPackage : public InstalledTree
+class FindPackage : public InstalledTree
 {
 protected:
     std::string build(std::string const& text, std::string const& then) const
@@ -171,19 +171,19 @@ protected:
     }
 };
 
-TEST_F(ThroughFindPackage, AHostGetsHeadersAndRuntime)
+TEST_F(FindPackage, GivesAHostHeadersAndRuntime)
 {
     std::string const tree = build("mihost::mihost)", "build/minimal_host");
     EXPECT_EQ(tree.find(topOfTheTree), 0U) << tree;
 }
 
-TEST_F(ThroughFindPackage, AFrameworkGetsTheHeadersAlone)
+TEST_F(FindPackage, GivesAFrameworkOnlyTheHeaders)
 {
     build("mihost::headers)", "test -f build/CMakeFiles/own_framework.dir/own_framework.cpp.o");
 }
 
 #ifdef ACCEL_FILE
-TEST_F(ThroughFindPackage, AHostGetsTheAccelerator)
+TEST_F(FindPackage, GivesAHostTheAccelerator)
 {
     std::string const tree =
         build("mihost::miaccel)", "readelf -d build/fast_host\nbuild/fast_host\n");

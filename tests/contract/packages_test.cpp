@@ -1,4 +1,4 @@
-// Which package gets which of the files that `cmake --install` puts in place.
+// How the files that `cmake --install` writes are divided among the packages.
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"

@@ -1,6 +1,6 @@
-// What the libraries want of others and what they give, against the lists beside this file.
+// The symbols that the libraries need and export, compared with the lists in this directory.
 //
-// To write the lists again, on purpose only: script/symbols --update
+// To update the lists on purpose: script/symbols --update
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -38,7 +38,7 @@ protected:
             contentOf(std::string(TESTS_DIR "/contract/") + GetParam().name + "_symbols.txt"));
     }
 
-    /** Those of the one list that the other lacks; both are sorted. */
+    /** The names of one list that the other lacks; both are sorted. */
     static Names missing(Names const& from, Names const& in)
     {
         Names found;
@@ -74,7 +74,7 @@ TEST(Runtime, ExportsNothingOfTheStandardLibrary)
             EXPECT_EQ(line.find(beginning), std::string::npos) << line;
 }
 
-/** What the library wants of anybody, the C and C++ runtimes included, in the linker's words. */
+/** All symbols that the library needs, also of the C and C++ runtimes; mangled. */
 std::string wanted()
 {
     Outcome const outcome = runToEnd({"/usr/bin/nm", "--dynamic", "--undefined-only", PLUGIN_FILE});
@@ -97,7 +97,7 @@ TEST(Library, ThrowsNothingOfItsOwn)
     EXPECT_EQ(names.find("__cxa_throw"), std::string::npos);
 }
 
-TEST(Library, SignalsNobody)
+TEST(Library, SendsNoSignal)
 {
     std::string const names = wanted();
     ASSERT_NE(names.find(" popen"), std::string::npos);

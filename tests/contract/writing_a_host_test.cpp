@@ -55,7 +55,7 @@ TEST(LiveReadHost, ReadsMemoryAndAMissingProperty)
     EXPECT_NE(outcome.out.find("no such property: status 1\n"), std::string::npos);
 }
 
-TEST(LoadCallbackHost, IsCalledByARebuildAlone)
+TEST(LoadCallbackHost, IsCalledOnlyByARebuild)
 {
     Outcome const outcome = run("load_callback");
     EXPECT_EQ(outcome.code, 0);
@@ -67,14 +67,14 @@ TEST(MethodCallHost, ShowsWhyACallWasRefused)
 {
     Outcome const outcome = run("method_call", {"Nonsense"});
     EXPECT_EQ(outcome.code, 1);
-    // Complaints of the commands that build the tree may come first.
+    // Error messages of the commands that build the tree may come first.
     std::string const reason = "refused with status 1\nUnknown method: Nonsense\n";
     EXPECT_NE(outcome.err.find(reason), std::string::npos) << outcome.err;
     EXPECT_NE(contentOf(DOCS_DIR "/writing-a-host.md").find("```\n" + reason + "```"),
               std::string::npos);
 }
 
-TEST(MethodCallHost, WantsACall)
+TEST(MethodCallHost, NeedsACall)
 {
     EXPECT_EQ(run("method_call").code, 2);
 }

@@ -1,6 +1,6 @@
-// Every system call that can fail is made to fail once, one after the other, in each scenario. What
-// must hold each time: the plug-in lives, nothing stays open or locked, and the next start is
-// whole.
+// In each scenario, every system call that can fail is made to fail once, one after the other. Each
+// time the plug-in must survive, nothing may stay open or locked, and the next start must be
+// complete.
 
 #include "TestPaths.h"
 #include "frame/OsSwMI.h"
@@ -77,7 +77,7 @@ private:
     }
 
     libc::HookGuard const guard_;
-    FileRoot const root_{"machine"}; // in the test's own folder
+    FileRoot const root_{"machine"}; // in the test's own directory
 };
 
 IC::ManagementInterface& openInterface()
@@ -115,7 +115,7 @@ bool variesByItself(unsigned int property)
            (property >= IC::property::processCount && property <= IC::property::swapFileFree);
 }
 
-/** What the tree says, to be compared with that of another start. */
+/** The texts of the tree, to be compared with those of another start. */
 std::vector<std::string> treeTexts()
 {
     std::vector<IC::Node*> nodes;
@@ -215,12 +215,12 @@ long openDescriptors()
     return std::distance(begin(listing), end(listing));
 }
 
-class EachCallFails : public testing::TestWithParam<std::tuple<Scenario, AnyCall*>>
+class FailingCall : public testing::TestWithParam<std::tuple<Scenario, AnyCall*>>
 {
 protected:
     void SetUp() override
     {
-        // "usrandpwd" is written where the process stands.
+        // "usrandpwd" is written to the working directory.
         std::filesystem::copy(MACHINES_DIR "/faults", folder_.path("machine"),
                               std::filesystem::copy_options::recursive);
         std::filesystem::current_path(folder_.name());
@@ -231,7 +231,7 @@ protected:
         std::filesystem::current_path("/");
     }
 
-    /** One run with the call numbered at failing. @return how many of the calls were made */
+    /** Runs the scenario; call number at fails. @return how many of the calls were made */
     static unsigned long runWithFault(Scenario const& scenario, AnyCall& call, unsigned long at)
     {
         FakeMachine machine;
@@ -269,7 +269,7 @@ private:
     ScratchFolder const folder_;
 };
 
-TEST_P(EachCallFails, AndNothingIsLeftBehind)
+TEST_P(FailingCall, LeavesNothingOpenOrLocked)
 {
     auto const& [scenario, call] = GetParam();
     std::vector<std::string> const whole = treeOfAWholeStart();
@@ -301,7 +301,7 @@ std::string caseName(testing::TestParamInfo<std::tuple<Scenario, AnyCall*>> cons
     return scenario.name + std::string("_") + call->name();
 }
 
-INSTANTIATE_TEST_SUITE_P(Faults, EachCallFails,
+INSTANTIATE_TEST_SUITE_P(Faults, FailingCall,
                          testing::Combine(testing::ValuesIn(scenarios),
                                           testing::ValuesIn(allCalls())),
                          caseName);

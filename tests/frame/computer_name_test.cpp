@@ -17,7 +17,7 @@ namespace computer_name_test
 
 using NQ::ComputerInfo;
 
-/** A machine whose names are all different; it may not tell them. */
+/** A machine whose names all differ; uname can fail. */
 class ComputerName : public testing::Test
 {
 protected:
@@ -43,7 +43,7 @@ TEST_F(ComputerName, IsTheMachinesNodeName)
     EXPECT_EQ(name, "harbour");
 }
 
-TEST_F(ComputerName, FailsWithoutAnAnswerOfTheKernel)
+TEST_F(ComputerName, FailsIfUnameFails)
 {
     fails_ = true;
     std::string name = "before";
@@ -51,7 +51,7 @@ TEST_F(ComputerName, FailsWithoutAnAnswerOfTheKernel)
     EXPECT_EQ(name, "before");
 }
 
-TEST_F(ComputerName, IsMadeATextByTheHost)
+TEST_F(ComputerName, IsConvertedByTheHost)
 {
     WideTexts const texts;
     std::string name;
@@ -59,7 +59,7 @@ TEST_F(ComputerName, IsMadeATextByTheHost)
     EXPECT_EQ(texts.made, Lines{"harbour"});
 }
 
-TEST_F(ComputerName, LogsItsEntryAndExitAsTheFrame)
+TEST_F(ComputerName, LogsEntryAndExitUnderTheFramesName)
 {
     for (bool const fails : {false, true}) {
         fails_ = fails;

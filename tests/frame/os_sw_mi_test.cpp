@@ -18,7 +18,7 @@ public:
     }
 };
 
-TEST(Interface, IsTheOneInUseOnceItIsInitialised)
+TEST(Interface, IsTheCurrentOneOnceItIsInitialised)
 {
     FakeFiles const files;
     FakeCommands const commands;

@@ -33,7 +33,7 @@ TEST(HostLayout, GivesNodeClassesNoMembersOfTheirOwn)
     EXPECT_EQ(sizeof(IC::LogEntryNode), sizeof(IC::MutableNode));
 }
 
-/** Where the interface's members are in it, in the order that is fixed. */
+/** The offsets of the interface's members, in their fixed order. */
 std::vector<std::ptrdiff_t> offsetsIn(OpenInterface const& interface)
 {
     auto const offset = [&interface](auto const& member) {
@@ -108,7 +108,7 @@ template <class Expected, class Actual> constexpr bool is(Actual)
     return std::is_same_v<Expected, Actual>;
 }
 
-// What symbols do not tell.
+// Return types, which are not part of a symbol.
 static_assert(is<void (*)(std::vector<NQ::driverInfo>&)>(&NQ::getDriverInfo));
 static_assert(is<unsigned int (NQ::logInfo::*)()>(&NQ::logInfo::getMaxLine));
 static_assert(is<void (NQ::logInfo::*)(unsigned int, char*, int)>(&NQ::logInfo::getLog));

@@ -23,12 +23,12 @@ struct LogCall {
 };
 
 /**
- * A host of its own, in this program instead of the reference runtime: its framework keeps nodes
- * and properties, notes what the plug-in asks of it and fails when told to.
+ * A second host, in this program in place of the reference runtime: its framework keeps nodes and
+ * properties, records the plug-in's calls and fails on request.
  */
 struct RecordingHost {
     /**
-     * What was asked, in order. Calls of the framework with their arguments, such as
+     * What happened, in order. Calls of the framework with their arguments, such as
      * "MutableNode(6, 5, [5], 59, 0)"; of the locks; the construction and destruction of objects
      * that are part of the plug-in's library; and messages, once each, as "log: TEXT".
      */
@@ -46,7 +46,7 @@ struct RecordingHost {
     unsigned char setterStatus = 0; // of a node's setStatus, setDescription and setProperty
     int lockStatus = 0;             // of a mutex, which is locked all the same
 
-    /** The interface ids that initialize sets; its own where empty. */
+    /** The interface ids that initialize sets; if empty, its own. */
     std::vector<unsigned int> miIds;
 
     /** Called first by the framework's own initialize, unload, node constructor and setStatus. */
@@ -68,7 +68,7 @@ struct RecordingHost {
 /** The one in this program. */
 RecordingHost& recordingHost();
 
-/** The same, as if nothing had happened yet. */
+/** The same, reset to its initial state. */
 RecordingHost& freshHost();
 
 #endif

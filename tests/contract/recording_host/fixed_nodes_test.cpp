@@ -45,14 +45,14 @@ protected:
     }
 };
 
-TEST_F(FixedNodes, TheInterfacesNodeIsMadeOfTheInterfacesOwnId)
+TEST_F(FixedNodes, TheInterfacesNodeHasTheInterfacesId)
 {
     plugin.initialize(5);
     EXPECT_EQ(eventsOf("createOsSwNodes"), (Lines{"MutableNode(5, 0, [5], 39, 0)", "setStatus(1)",
                                                   "setDescription(OsSw Management Interface)"}));
 }
 
-TEST_F(FixedNodes, TheRootIsMadeOfTheFirstCountedId)
+TEST_F(FixedNodes, TheRootHasTheFirstCountedId)
 {
     plugin.initialize(5);
     EXPECT_EQ(eventsOf("createRootNode"), (Lines{"MutableNode(6, 5, [5], 59, 0)", "setStatus(1)",
@@ -68,7 +68,7 @@ TEST_F(FixedNodes, TheComputerIsMadeBelowTheRootAndNamed)
                      "setProperty(108, text harbour true)"}));
 }
 
-TEST_F(FixedNodes, TheComputerStaysWithoutANameWhereUnameFails)
+TEST_F(FixedNodes, TheComputerHasNoNameIfUnameFails)
 {
     libc::hooks().uname = [](utsname*) { return -1; };
     plugin.initialize(5);
@@ -81,7 +81,7 @@ TEST_F(FixedNodes, TheComputerStaysWithoutANameWhereUnameFails)
     EXPECT_FALSE(property(computer, IC::property::name));
 }
 
-TEST_F(FixedNodes, TheComputersNameIsReadOnceOnly)
+TEST_F(FixedNodes, TheComputersNameIsReadOnce)
 {
     plugin.initialize();
     libc::hooks().uname = [](utsname* system) {
@@ -98,7 +98,7 @@ TEST_F(FixedNodes, NeitherTheInterfacesNodeNorTheRootHasProperties)
     EXPECT_TRUE(plugin.node(IC::nodeType::root).getProperties().empty());
 }
 
-TEST_F(FixedNodes, ThreeArePlainNodesAndTheFourthIsOfAClassOfItsOwn)
+TEST_F(FixedNodes, OnlyTheOperatingSystemHasItsOwnClass)
 {
     plugin.initialize();
     for (unsigned int const type :
@@ -130,7 +130,7 @@ TEST_F(FixedNodes, AreFollowedByAllOthersInTheIdList)
     EXPECT_EQ(*inside(&OpenInterface::nodeIds_), expected);
 }
 
-TEST_F(FixedNodes, IdsAreCountedInTheOrderInWhichTheKindsAreBuilt)
+TEST_F(FixedNodes, IdsAreCountedInTheOrderOfBuilding)
 {
     commands.answers = {{"lsmod", "exnet 24576 0\n"},
                         {"modinfo exnet", ""},
@@ -149,7 +149,7 @@ TEST_F(FixedNodes, IdsAreCountedInTheOrderInWhichTheKindsAreBuilt)
     EXPECT_EQ(inside(&OpenInterface::nextNodeId_), next);
 }
 
-TEST_F(FixedNodes, TheInterfacesNodeLeavesTheCounterAlone)
+TEST_F(FixedNodes, TheInterfacesNodeDoesNotAdvanceTheCounter)
 {
     unsigned int counter = 0;
     host.onSetStatus = [this, &counter](IC::MutableNode& node) {
@@ -199,7 +199,7 @@ TEST_F(FixedNodes, AreListedBeforeTheirStatusIsSet)
     EXPECT_EQ(types, (std::set<unsigned int>{17, 35, 39, 40, 44, 46, 47, 51, 59}));
 }
 
-TEST_F(FixedNodes, AreParentsByTheIdThatTheyAnswerWith)
+TEST_F(FixedNodes, EachIsTheParentOfTheNext)
 {
     plugin.initialize(5);
     EXPECT_EQ(plugin.node(IC::nodeType::osSw).getLinkedId(), 0U);
@@ -247,7 +247,7 @@ TEST_F(FixedNodes, AreInTheirMemberBeforeTheirStatusIsSet)
     EXPECT_EQ(seen, (Ids{39, 59, 40, 17, 35}));
 }
 
-TEST_F(FixedNodes, NoteTheInterfacesOwnIdOnceTheyAreMade)
+TEST_F(FixedNodes, NoteTheInterfacesIdAfterTheyAreMade)
 {
     Ids noted;
     host.onNode = [this, &noted] {
@@ -258,7 +258,7 @@ TEST_F(FixedNodes, NoteTheInterfacesOwnIdOnceTheyAreMade)
     EXPECT_EQ(Ids(noted.begin(), noted.begin() + 3), (Ids{0, 2, 4}));
 }
 
-TEST_F(FixedNodes, TakeTheCountersValueOfTheMoment)
+TEST_F(FixedNodes, TakeTheCountersCurrentValue)
 {
     host.onSetStatus = [this](IC::MutableNode& node) {
         if (node.getNodeType() == IC::nodeType::osSw)
@@ -286,7 +286,7 @@ TEST_F(FixedNodes, AreSetUpBeforeTheirPropertiesAreSet)
                      "setProperty(125, numbers 0,1,24 true)", "log: OsNode::setProperty: exit"}));
 }
 
-/** A node that answers with another id than it was made with. */
+/** A node that reports an id other than the one it was made with. */
 class Renumbered : public IC::MutableNode
 {
 public:
@@ -297,7 +297,7 @@ public:
     }
 };
 
-TEST_F(FixedNodes, LikeAllParentsAreAskedForTheirIds)
+TEST_F(FixedNodes, ParentsAreQueriedForTheirIds)
 {
     commands.answers = {{"lsmod", "exnet 24576 0\n"},
                         {"modinfo exnet", ""},

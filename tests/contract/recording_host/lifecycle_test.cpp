@@ -25,8 +25,7 @@ Lines const builders = {"createOsSwNodes",  "createRootNode",    "createComputer
                         "createOsNodes",    "createDriverNodes", "createUserNodes",
                         "createGroupNodes", "createLogNodes",    "createLogEntryNodes"};
 
-/** Those of the messages that say that a builder, initialize, unload or publishNode began or ended.
- */
+/** The entry and exit messages of builders, initialize, unload and publishNode. */
 Lines frameMessages(Lines const& messages)
 {
     Lines found;
@@ -121,7 +120,7 @@ protected:
     }
 };
 
-TEST_F(Lifecycle, StartsWithEmptyListsAndTheFlagDown)
+TEST_F(Lifecycle, StartsWithEmptyListsAndAClearFlag)
 {
     EXPECT_TRUE(inside(&OpenInterface::userNodes_).empty());
     EXPECT_TRUE(inside(&OpenInterface::groupNodes_).empty());
@@ -130,7 +129,7 @@ TEST_F(Lifecycle, StartsWithEmptyListsAndTheFlagDown)
     EXPECT_FALSE(object<bool>("IC::OSSWMI::MI_call"));
 }
 
-TEST_F(Lifecycle, ReadsTheIdRangesNotBeforeTheyAreAskedFor)
+TEST_F(Lifecycle, ReadsTheIdRangesOnceOnFirstUse)
 {
     auto const& instance = object<void*>("NQ::minMaxId::pinstance");
     EXPECT_EQ(instance, nullptr);
@@ -141,7 +140,7 @@ TEST_F(Lifecycle, ReadsTheIdRangesNotBeforeTheyAreAskedFor)
     EXPECT_EQ(instance, first);
 }
 
-TEST_F(Lifecycle, OpenMIYieldsTheSameTwoAddressesEachTime)
+TEST_F(Lifecycle, OpenMIReturnsTheSameTwoObjectsEachTime)
 {
     auto* const open = reinterpret_cast<decltype(&OpenMI)>(plugin.symbol("OpenMI"));
     IC::ManagementInterface* interface = nullptr;
@@ -155,7 +154,7 @@ TEST_F(Lifecycle, OpenMIYieldsTheSameTwoAddressesEachTime)
     EXPECT_EQ(error, plugin.symbol("IC::OSSWMI::myerr"));
 }
 
-TEST_F(Lifecycle, OpenMIAsksNothingOfTheHostAndSaysNothing)
+TEST_F(Lifecycle, OpenMICallsNothingOfTheHostAndLogsNothing)
 {
     host.events.clear();
     auto* const open = reinterpret_cast<decltype(&OpenMI)>(plugin.symbol("OpenMI"));
@@ -165,7 +164,7 @@ TEST_F(Lifecycle, OpenMIAsksNothingOfTheHostAndSaysNothing)
     EXPECT_EQ(host.events, Lines());
 }
 
-TEST_F(Lifecycle, SetLoadCallBackStoresItsArguments)
+TEST_F(Lifecycle, SetLoadCallBackOnlyStoresItsArguments)
 {
     IC::ManagementInterface::LoadCallBack const load = [](IC::Node* const&,
                                                           void const*) -> IC::Error { throw 1; };
@@ -191,7 +190,7 @@ TEST_F(Lifecycle, InitializePassesItsThreeArgumentsOnUnchanged)
     mi().unload();
 }
 
-TEST_F(Lifecycle, InitializeIsReadyBeforeTheFramework)
+TEST_F(Lifecycle, InitializeSetsItsMembersBeforeTheFramework)
 {
     bool isReady = false;
     host.onInitialize = [this, &isReady] {
@@ -202,7 +201,7 @@ TEST_F(Lifecycle, InitializeIsReadyBeforeTheFramework)
     EXPECT_TRUE(isReady);
 }
 
-TEST_F(Lifecycle, InitializeForgetsTheNodeBuiltLastBeforeItBuilds)
+TEST_F(Lifecycle, InitializeClearsTheCurrentNodeBeforeBuilding)
 {
     IC::MutableNode last(1, 0, {1}, 39, 0);
     inside(&OpenInterface::currentNode_) = &last;
@@ -248,9 +247,9 @@ TEST_F(Lifecycle, BuildsTheTreeIfTheFrameworkFails)
     EXPECT_EQ(Ids(whole.begin(), whole.begin() + 4), (Ids{39, 59, 40, 17}));
 }
 
-TEST_F(Lifecycle, TheTreeStandsWhateverTheSettersAnswer)
+TEST_F(Lifecycle, BuildsTheTreeWhateverTheSettersReturn)
 {
-    // Told from the clock, the time of the last boot may differ by a second from start to start.
+    // Computed from the clock, the time of the last boot could differ by a second between starts.
     libc::hooks().time = [](std::time_t*) { return std::time_t{1273659825}; };
     libc::hooks().sysinfo = [](struct sysinfo* figures) {
         *figures = {};
@@ -276,7 +275,7 @@ TEST_F(Lifecycle, TheTreeStandsWhateverTheSettersAnswer)
     libc::hooks().sysinfo = nullptr;
 }
 
-TEST_F(Lifecycle, PassesOnThatMemoryIsExhausted)
+TEST_F(Lifecycle, PropagatesBadAlloc)
 {
     commands.answers = {{"lsmod", "exnet 24576 0\n"},
                         {"modinfo exnet", ""},
@@ -299,7 +298,7 @@ TEST_F(Lifecycle, PassesOnThatMemoryIsExhausted)
     }
 }
 
-TEST_F(Lifecycle, TheTreeStandsWhateverALockAnswers)
+TEST_F(Lifecycle, BuildsTheTreeWhateverALockReturns)
 {
     plugin.initialize();
     Ids const whole = nodeTypes();
@@ -313,7 +312,7 @@ TEST_F(Lifecycle, TheTreeStandsWhateverALockAnswers)
     EXPECT_EQ(std::count(host.events.begin(), host.events.end(), "unlock()"), 3);
 }
 
-TEST_F(Lifecycle, NodesOfTheStartAreNotPublishedOneByOne)
+TEST_F(Lifecycle, PublishesNoNodeAtTheStart)
 {
     commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
     plugin.initialize();
@@ -343,7 +342,7 @@ protected:
     }
 };
 
-TEST_F(Publishing, HandsTheNodeToTheFramework)
+TEST_F(Publishing, PassesTheNodeToTheFramework)
 {
     publish(inside(&OpenInterface::rootNode_));
     EXPECT_EQ(host.events, (Lines{"log: publishNode: entry", "addNewNode(ROOT Node)",
@@ -362,7 +361,7 @@ TEST_F(Publishing, LogsARefusalAndKeepsTheNode)
     EXPECT_EQ(plugin.nodes().size(), nodes);
 }
 
-TEST_F(Publishing, TakesAnyStatusButZeroForARefusal)
+TEST_F(Publishing, TreatsEveryNonZeroStatusAsARefusal)
 {
     host.addNewNodeStatus = 255;
     publish(inside(&OpenInterface::rootNode_));
@@ -384,7 +383,7 @@ class Rebuilding : public Publishing, public testing::WithParamInterface<Rebuild
 {
 };
 
-TEST_P(Rebuilding, LogsEachRefusalOnceAndGoesOn)
+TEST_P(Rebuilding, LogsEachRefusalOnceAndContinues)
 {
     commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
     host.addNewNodeStatus = 1;
@@ -405,7 +404,7 @@ class LockedBuild : public Loaded, public testing::WithParamInterface<char const
 {
 };
 
-TEST_P(LockedBuild, HoldsTheLockFromBeginningToEnd)
+TEST_P(LockedBuild, HoldsTheLockThroughout)
 {
     plugin.initialize();
     std::string const builder = GetParam();
@@ -461,7 +460,7 @@ TEST_F(Lifecycle, UnloadWithoutInitializeOnlyCallsTheFrameworks)
     EXPECT_EQ(host.events, (Lines{"log: unload: entry", "unload()", "log: unload: exit"}));
 }
 
-TEST_F(Lifecycle, CanBeginAgainAfterUnload)
+TEST_F(Lifecycle, StartsAgainAfterUnload)
 {
     plugin.initialize(5);
     plugin.unload();
@@ -497,7 +496,7 @@ TEST_F(Lifecycle, EachMessageGoesToBothLoggerOperations)
     }
 }
 
-TEST_F(Lifecycle, TheFrameSpeaksUnderItsOwnCategoryAndFile)
+TEST_F(Lifecycle, TheFrameLogsUnderItsOwnCategoryAndFile)
 {
     plugin.initialize();
     plugin.unload();
@@ -548,7 +547,7 @@ TEST_F(Library, ReadsTheIdRangesAgainWhenItIsLoadedAgain)
     EXPECT_EQ(lowest, (Ids{500, 1000}));
 }
 
-TEST_F(Lifecycle, RaisesTheFlagOnlyWhileAUserNodeIsSetUp)
+TEST_F(Lifecycle, SetsTheFlagOnlyWhileAUserNodeIsSetUp)
 {
     bool const& flag = object<bool>("IC::OSSWMI::MI_call");
     host.onNode = [&flag] { EXPECT_FALSE(flag); };
@@ -559,13 +558,13 @@ TEST_F(Lifecycle, RaisesTheFlagOnlyWhileAUserNodeIsSetUp)
     EXPECT_GE(plugin.nodes(IC::nodeType::user).size(), 2U);
 }
 
-TEST_F(Lifecycle, ARebuildHoldsTheLockFromItsBeginningToItsEnd)
+TEST_F(Lifecycle, HoldsTheLockThroughoutARebuild)
 {
     plugin.initialize();
     struct {
         std::string name;
         char const* symbol;
-        int unlocks; // the listing of groups has a lock of its own
+        int unlocks; // the listing of groups has its own lock
     } const rebuilds[] = {{"createUserNodes", "IC::OsSwMI::createUserNodes(bool)", 1},
                           {"createGroupNodes", "IC::OsSwMI::createGroupNodes(bool)", 2}};
     for (auto const& made : rebuilds) {
@@ -592,7 +591,7 @@ TEST_F(Lifecycle, HasTheCategoryOfEveryUnitFromTheStart)
         EXPECT_EQ(object<std::string>(symbol), std::string("Veltrix.IC.MI.OsSwMI") + end);
 }
 
-TEST_F(Lifecycle, LeavesTheDriversAloneWhenOtherNodesAreMadeAnew)
+TEST_F(Lifecycle, KeepsTheDriversWhenOtherNodesAreRebuilt)
 {
     commands.answers = {{"lsmod", "exnet 24576 0\n"},
                         {"modinfo exnet", ""},
@@ -613,7 +612,7 @@ TEST_F(Lifecycle, LeavesTheDriversAloneWhenOtherNodesAreMadeAnew)
         EXPECT_NE(command, "lsmod");
 }
 
-TEST_F(Publishing, OfLogEntriesTakesNoLock)
+TEST_F(Publishing, TakesNoLockForLogEntries)
 {
     commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
     rebuild("IC::OsSwMI::createLogEntryNodes(bool)");
@@ -622,7 +621,7 @@ TEST_F(Publishing, OfLogEntriesTakesNoLock)
         EXPECT_EQ(event.find("lock("), std::string::npos) << event;
 }
 
-TEST_F(Lifecycle, OpensNoFileButThoseOfTheSystemThatItIsToRead)
+TEST_F(Lifecycle, OpensOnlyTheSystemFilesThatItReads)
 {
     std::set<std::string> opened;
     libc::hooks().fopen = [&opened, below = libc::hooks().fopen.answer()](char const* path,
@@ -640,7 +639,7 @@ TEST_F(Lifecycle, OpensNoFileButThoseOfTheSystemThatItIsToRead)
         EXPECT_EQ(known.count(path), 1U) << path;
 }
 
-TEST_F(Lifecycle, InitializeReturnsTheFrameworksAnswerAsKept)
+TEST_F(Lifecycle, InitializeReturnsTheStatusObjectsLastValue)
 {
     host.initializeStatus = 3;
     Ids kept;
@@ -653,7 +652,7 @@ TEST_F(Lifecycle, InitializeReturnsTheFrameworksAnswerAsKept)
     EXPECT_EQ(kept.front(), 3U);
 }
 
-TEST_P(Rebuilding, SaysNothingOfADeletionThatFailsAndGoesOn)
+TEST_P(Rebuilding, IgnoresADeletionThatFails)
 {
     commands.answers["wc -l /var/log/messages"] = "3 /var/log/messages\n";
     rebuild(GetParam().builder);

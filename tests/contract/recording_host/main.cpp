@@ -1,5 +1,5 @@
-// Some builds keep the plug-in loaded when it is closed, so each test has a process that has never
-// loaded it.
+// Some builds keep the plug-in loaded when it is closed, so each test runs in a process that has
+// never loaded it.
 
 #include "tests/support/OneByOne.h"
 

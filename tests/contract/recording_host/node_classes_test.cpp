@@ -17,7 +17,7 @@ protected:
     }
 };
 
-TEST_P(NodeClasses, PassTheirArgumentsOnAndThenSayOneLine)
+TEST_P(NodeClasses, PassTheirArgumentsOnAndLogOneMessage)
 {
     std::unique_ptr<IC::MutableNode> const node(construct(GetParam()));
     std::string const name = GetParam();
@@ -25,7 +25,7 @@ TEST_P(NodeClasses, PassTheirArgumentsOnAndThenSayOneLine)
                                   "log: " + name + "::" + name + ": entry"}));
 }
 
-TEST_P(NodeClasses, SayOneLineBeforeTheyAreDestroyed)
+TEST_P(NodeClasses, LogOneMessageBeforeTheyAreDestroyed)
 {
     std::unique_ptr<IC::MutableNode> node(construct(GetParam()));
     host.events.clear();
@@ -34,7 +34,7 @@ TEST_P(NodeClasses, SayOneLineBeforeTheyAreDestroyed)
     EXPECT_EQ(host.events, (Lines{"log: " + name + "::~" + name + ": entry", "~MutableNode()"}));
 }
 
-TEST_P(NodeClasses, SpeakUnderTheFramesCategoryAndFile)
+TEST_P(NodeClasses, LogUnderTheFramesCategoryAndFile)
 {
     host.logCalls.clear();
     std::unique_ptr<IC::MutableNode>(construct(GetParam())).reset();
@@ -52,7 +52,7 @@ INSTANTIATE_TEST_SUITE_P(All, NodeClasses,
 
 struct Operation {
     char const* className;
-    char const* says; // what its two messages begin with
+    char const* says; // the beginning of its two messages
 };
 
 void PrintTo(Operation const& operation, std::ostream* out)
@@ -60,14 +60,14 @@ void PrintTo(Operation const& operation, std::ostream* out)
     *out << operation.says;
 }
 
-// Of no meaning to any class: stored and read back like every other number.
+// No class handles this id: it is only stored and read back.
 constexpr unsigned int plainProperty = 4711;
 
 class Reads : public Loaded, public testing::WithParamInterface<Operation>
 {
 };
 
-TEST_P(Reads, SayTwoLinesAroundTheFrameworksOwn)
+TEST_P(Reads, LogEntryAndExitAroundTheFrameworksRead)
 {
     std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
     host.events.clear();
@@ -78,7 +78,7 @@ TEST_P(Reads, SayTwoLinesAroundTheFrameworksOwn)
     EXPECT_EQ(host.events, (Lines{"log: " + says + ": entry", "log: " + says + ": exit"}));
 }
 
-// Kept: a user node's read speaks as its constructor.
+// Contract: a user node's read logs under its constructor's name.
 INSTANTIATE_TEST_SUITE_P(All, Reads,
                          testing::Values(Operation{"OsNode", "OsNode::getProperty"},
                                          Operation{"UserNode", "UserNode::UserNode"},
@@ -92,7 +92,7 @@ class Writes : public Loaded, public testing::WithParamInterface<Operation>
 {
 };
 
-TEST_P(Writes, SayTwoLinesAroundTheFrameworksStore)
+TEST_P(Writes, LogEntryAndExitAroundTheFrameworksStore)
 {
     std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
     host.events.clear();
@@ -104,7 +104,7 @@ TEST_P(Writes, SayTwoLinesAroundTheFrameworksStore)
     EXPECT_EQ(text(*node, plainProperty), "x");
 }
 
-TEST_P(Writes, AnswerWhatTheFrameworksStoreAnswers)
+TEST_P(Writes, ReturnTheFrameworksStatus)
 {
     std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
     host.setterStatus = 7;
@@ -120,7 +120,7 @@ INSTANTIATE_TEST_SUITE_P(All, Writes,
                              return std::string(operation.param.className);
                          });
 
-/** A property that a class answers itself, and the status that it makes for that. */
+/** A property that a class reads itself, and the status that it makes. */
 struct OwnAnswer {
     char const* name;
     char const* className;
@@ -137,7 +137,7 @@ class OwnReads : public Loaded, public testing::WithParamInterface<OwnAnswer>
 {
 };
 
-TEST_P(OwnReads, MakeOneStatusAndAskNothingOfTheFramework)
+TEST_P(OwnReads, MakeOneStatusWithoutTheFramework)
 {
     std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
     host.errors.clear();
@@ -167,7 +167,7 @@ protected:
     std::unique_ptr<IC::MutableNode> const os{construct("OsNode")};
 };
 
-TEST_F(CommandWrites, ThatFailHaveTheirOwnStatus)
+TEST_F(CommandWrites, ReturnTheirOwnStatusIfAMethodFails)
 {
     host.setterStatus = 7;
     host.errors.clear();
@@ -175,7 +175,7 @@ TEST_F(CommandWrites, ThatFailHaveTheirOwnStatus)
     EXPECT_EQ(host.errors, (Lines{"Error(7, empty 0, \"\")", failure}));
 }
 
-TEST_F(CommandWrites, AnswerAsTheStoreIfTheActionFails)
+TEST_F(CommandWrites, ReturnTheStoresStatusIfTheActionFails)
 {
     host.setterStatus = 7;
     for (unsigned int const id : {123U, 191U})
@@ -184,7 +184,7 @@ TEST_F(CommandWrites, AnswerAsTheStoreIfTheActionFails)
     EXPECT_EQ(commands.ran, Lines{"/sbin/shutdown -h now"}); // which could not be started
 }
 
-TEST_F(CommandWrites, TakeNoLockWhereTheyRebuildNothing)
+TEST_F(CommandWrites, TakeNoLockIfNothingIsRebuilt)
 {
     host.events.clear();
     for (unsigned int const id : {123U, 191U, 75U, 108U})
@@ -198,7 +198,7 @@ class GroupNodeWrites : public Loaded
 {
 };
 
-TEST_F(GroupNodeWrites, AreTheFrameworksOwnAndSayNothing)
+TEST_F(GroupNodeWrites, OnlyStoreTheValueAndLogNothing)
 {
     std::unique_ptr<IC::MutableNode> const node(construct("GroupNode"));
     host.events.clear();
@@ -210,9 +210,9 @@ class UserCommandWrites : public Loaded
 {
 };
 
-TEST_F(UserCommandWrites, AnswerAsTheStoreIfTheActionFails)
+TEST_F(UserCommandWrites, ReturnTheStoresStatusIfTheActionFails)
 {
-    std::filesystem::current_path("/proc"); // no "usrandpwd" can be made there
+    std::filesystem::current_path("/proc"); // "usrandpwd" cannot be created there
     std::unique_ptr<IC::MutableNode> const user(construct("UserNode"));
     host.setterStatus = 7;
     for (unsigned int const id : {117U, 118U, 91U, 138U})
@@ -232,7 +232,7 @@ class LogEntryReads : public Loaded
 {
 };
 
-TEST_F(LogEntryReads, ThatSucceedMakeOneEmptySuccessAndTakeNoLock)
+TEST_F(LogEntryReads, MakeOneSuccessStatusAndTakeNoLock)
 {
     commands.answers = {{"wc -l /var/log/messages", "16 f\n"},
                         {"sed -n '1p' /var/log/messages", "Nov 20 10:11:12 host\n"},
@@ -249,7 +249,7 @@ TEST_F(LogEntryReads, ThatSucceedMakeOneEmptySuccessAndTakeNoLock)
     }
 }
 
-TEST_F(CommandWrites, AnswerAsTheStoreIfTheRebuildFails)
+TEST_F(CommandWrites, ReturnTheStoresStatusIfTheRebuildFails)
 {
     commands.otherwise = "";
     plugin.initialize();

@@ -32,7 +32,7 @@ std::string operationName(void* code)
     return name.substr(0, name.find_first_of("([<"));
 }
 
-/** Every slot of the table that an object points to, none more and none less. */
+/** All slots of the table that an object points to. */
 Lines slotsOf(void const* object)
 {
     auto* const table = *static_cast<void* const* const*>(object);
@@ -40,7 +40,7 @@ Lines slotsOf(void const* object)
     void* entry = nullptr;
     if (dladdr1(table, &info, &entry, RTLD_DL_SYMENT) == 0 || !entry)
         return {"no table"};
-    // Before the slots stand the offset of the whole object and the type information.
+    // The offset of the whole object and the type information come before the slots.
     std::size_t const count = static_cast<ElfW(Sym) const*>(entry)->st_size / sizeof(void*) - 2;
     Lines names;
     for (std::size_t slot = 0; slot < count; ++slot)
@@ -49,7 +49,7 @@ Lines slotsOf(void const* object)
 }
 
 // The destructor takes two slots of the table: for objects in place and for those made with new.
-// What a conversion to text is called begins with the type's full name.
+// The name of a conversion to text begins with the type's full name.
 
 Lines const interfaceSlots = {"IC::ManagementInterface::getMap",
                               "IC::ManagementInterface::initialize",
@@ -98,19 +98,19 @@ class Slots : public Loaded
 {
 };
 
-TEST_F(Slots, OfAnInterfaceStandInOrder)
+TEST_F(Slots, OfAnInterfaceAreInOrder)
 {
     IC::ManagementInterface const interface;
     EXPECT_EQ(slotsOf(&interface), interfaceSlots);
 }
 
-TEST_F(Slots, DifferByInitializeUnloadAndTheDestructor)
+TEST_F(Slots, OfThePluginDifferInWhatItOverrides)
 {
     EXPECT_EQ(slotsOf(&plugin.interface()), overridden(interfaceSlots, "ManagementInterface",
                                                        "OsSwMI", {"initialize", "unload"}));
 }
 
-TEST_F(Slots, OfANodeStandInOrder)
+TEST_F(Slots, OfANodeAreInOrder)
 {
     IC::MutableNode const node(1, 0, {1}, 39, 0);
     EXPECT_EQ(slotsOf(&node), nodeSlots);
@@ -130,7 +130,7 @@ class NodeSlots : public Loaded, public testing::WithParamInterface<NodeClass>
 {
 };
 
-TEST_P(NodeSlots, DifferFromAPlainNodesByWhatTheClassAnswersItself)
+TEST_P(NodeSlots, DifferInWhatTheClassOverrides)
 {
     std::unique_ptr<IC::MutableNode> const node(construct(GetParam().name));
     EXPECT_EQ(slotsOf(node.get()),

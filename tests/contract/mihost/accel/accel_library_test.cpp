@@ -1,4 +1,4 @@
-// The built library, brought to a program in either of the two ways.
+// The built library, linked to a program or preloaded.
 
 #include "TestPaths.h"
 #include "tests/support/Program.h"
@@ -32,13 +32,13 @@ protected:
     Outcome const plain_ = run(PROBE_FILE);
 };
 
-TEST_F(AccelLibrary, AnswersWhenLinked)
+TEST_F(AccelLibrary, AnswersCommandsWhenLinked)
 {
     expectAnswers(run(ACCEL_PROBE_FILE));
 }
 
-#if !defined(__SANITIZE_ADDRESS__) && !defined(__SANITIZE_THREAD__) // they want to be first
-TEST_F(AccelLibrary, AnswersWhenPreloadedAlone)
+#if !defined(__SANITIZE_ADDRESS__) && !defined(__SANITIZE_THREAD__) // must be preloaded first
+TEST_F(AccelLibrary, AnswersCommandsOnlyWhenPreloadedAlone)
 {
     setenv("LD_PRELOAD", ACCEL_FILE, 1);
     expectAnswers(run(PROBE_FILE));
@@ -48,7 +48,7 @@ TEST_F(AccelLibrary, AnswersWhenPreloadedAlone)
 }
 #endif
 
-TEST(AccelLibraryFile, DefinesNothingButItsFaceAndTheTwoCalls)
+TEST(AccelLibraryFile, ExportsOnlyItsInterfaceAndTheTwoCalls)
 {
     EXPECT_EQ(runToEnd({"/usr/bin/nm", "--dynamic", "--defined-only", "--format=just-symbols",
                         ACCEL_FILE})

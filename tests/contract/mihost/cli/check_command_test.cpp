@@ -1,4 +1,4 @@
-// mihost check: that the plug-in passes, and that plug-ins broken on purpose are found and named.
+// mihost check passes the plug-in, and fails plug-ins that are broken on purpose.
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -18,7 +18,7 @@ namespace check_command_test
 using Json = nlohmann::ordered_json;
 using Names = std::set<std::string>;
 
-/** It runs in a sandbox only, which needs the privilege for one. */
+/** mihost check runs only in a sandbox, which needs root. */
 void needSandbox()
 {
     Outcome const outcome = mihostRun({"--sandbox", "version"});
@@ -69,7 +69,7 @@ protected:
     }
 };
 
-TEST_P(BrokenPlugin, IsFoundAndNamed)
+TEST_P(BrokenPlugin, FailsTheChecksOfItsFault)
 {
     setenv("BROKEN", GetParam().way, 1);
     Outcome const outcome =
@@ -78,11 +78,11 @@ TEST_P(BrokenPlugin, IsFoundAndNamed)
     Json const failed = namesWith(results, "failed");
     Names expected = GetParam().failed;
     for (Json const& skipped : namesWith(results, "skipped"))
-        if (skipped == "rounds.memory") // as in builds with a sanitizer
+        if (skipped == "rounds.memory") // in builds with a sanitizer
             expected.erase(skipped);
     EXPECT_EQ(failed.get<Names>(), expected) << outcome.out;
     if (expected.empty())
-        GTEST_SKIP() << "this build does not say what is in use";
+        GTEST_SKIP() << "this build cannot count the memory in use";
     EXPECT_EQ(outcome.code, 1) << outcome.err;
     ASSERT_FALSE(failed.empty());
     EXPECT_NE(findingsOf(results, failed[0]).dump().find(GetParam().finding), std::string::npos)
@@ -178,7 +178,7 @@ protected:
     }
 };
 
-// A sanitizer's allocator does not say what is in use, so there the check of memory is skipped.
+// A sanitizer's allocator does not report the memory in use, so that check is skipped.
 #if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
 constexpr bool countsMemory = false;
 #else
@@ -206,7 +206,7 @@ TEST_F(Check, PassesTheBrokenPluginWhenNothingIsBroken)
     expectAllPassed(checkRun(BROKEN_PLUGIN, {"--rounds", "2"}));
 }
 
-TEST_F(Check, SkipsTheMethodOnAMachineWhereItCannotWork)
+TEST_F(Check, SkipsTheMethodIfNoGroupCanBeAdded)
 {
     ScratchFolder const machine;
     std::string const tool =
@@ -223,7 +223,7 @@ TEST_F(Check, SkipsTheMethodOnAMachineWhereItCannotWork)
     EXPECT_EQ(namesWith(Json::parse(outcome.out), "skipped"), expected);
 }
 
-TEST_F(Check, TakesThePluginOfTheOptionToo)
+TEST_F(Check, ChecksThePluginOfTheOption)
 {
     setenv("BROKEN", "entry-point", 1);
     EXPECT_EQ(
@@ -237,7 +237,7 @@ TEST_F(Check, ChangesNothingOnThisMachine)
     EXPECT_EQ(contentOf("/etc/group"), groups);
 }
 
-TEST_F(Check, NamesASymbolThatOnlyThisProgramHas)
+TEST_F(Check, NamesASymbolThatNoHeaderDeclares)
 {
     Outcome const outcome = checkRun(PLUGIN_THAT_WANTS_THE_PROGRAM, {"--json", "--rounds", "1"});
     EXPECT_EQ(outcome.code, 1) << outcome.err;
@@ -285,7 +285,7 @@ TEST_F(Check, PrintsJunitForBuildServers)
         << outcome.out;
 }
 
-TEST(CheckUsage, RefusesOptionsThatDoNotFit)
+TEST(CheckUsage, RefusesInvalidOptionValues)
 {
     EXPECT_EQ(mihostRun({"check", "--format", "html"}).code, 2);
     EXPECT_EQ(mihostRun({"check", "--rounds", "0"}).code, 2);
@@ -293,7 +293,7 @@ TEST(CheckUsage, RefusesOptionsThatDoNotFit)
     EXPECT_EQ(mihostRun({"check", "--rounds", "some"}).code, 2);
 }
 
-TEST_F(Check, RefusesToMixFormsOrToTrace)
+TEST_F(Check, RefusesTwoFormatsOrATrace)
 {
     Outcome const mixed = mihostRun({"--json", "check", "--format", "tap"});
     EXPECT_EQ(mixed.code, 2);
@@ -302,7 +302,7 @@ TEST_F(Check, RefusesToMixFormsOrToTrace)
     EXPECT_EQ(mihostRun({"--trace", folder.path("trace"), "check"}).code, 2);
 }
 
-TEST(CheckOutsideOfASandbox, NeverRuns)
+TEST(CheckWithoutASandbox, DoesNotRun)
 {
     Outcome const outcome = mihostRun({"--overlay", "/nonexistent", "check"});
     EXPECT_EQ(outcome.code, 2);

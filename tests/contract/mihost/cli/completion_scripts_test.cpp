@@ -6,7 +6,7 @@
 namespace completion_scripts_test
 {
 
-/** What bash's completion of a line leaves in COMPREPLY, and the options it sets. */
+/** The options that bash's completion of a line sets, and the words in COMPREPLY. */
 std::string inBash(std::string const& line)
 {
     std::string const mihost = MIHOST_FILE;
@@ -29,13 +29,13 @@ TEST(BashCompletion, OffersWords)
     EXPECT_EQ(inBash("mihost power re"), "restart\n");
 }
 
-TEST(BashCompletion, WritesNoBlankBehindAWordThatGoesOn)
+TEST(BashCompletion, WritesNoBlankAfterAnIncompleteWord)
 {
     EXPECT_EQ(inBash("mihost get us"), "-o nospace\nuser:\n");
     EXPECT_EQ(inBash("mihost call UserDel U"), "-o nospace\nUserName=\n");
 }
 
-TEST(BashCompletion, LeavesOutWhatReadlineKeeps)
+TEST(BashCompletion, OmitsThePartBeforeAColonOrEqualsSign)
 {
     EXPECT_EQ(inBash("mihost get user:roo"), "root\n");
     EXPECT_EQ(inBash("mihost call UserDel UserName=roo"), "root\n");
@@ -47,7 +47,7 @@ TEST(BashCompletion, OffersFilesAndFolders)
     EXPECT_EQ(inBash("mihost --overlay /etc/pam"), "-o filenames\n/etc/pam.d\n");
 }
 
-TEST(BashCompletion, OffersNothingWhereNothingFits)
+TEST(BashCompletion, OffersNothingForAnUnknownCommand)
 {
     EXPECT_EQ(inBash("mihost nonsense "), "\n");
 }

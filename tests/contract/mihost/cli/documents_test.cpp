@@ -7,7 +7,7 @@
 namespace documents_test
 {
 
-TEST(ReferenceDocuments, AreWhatTheCatalogueSays)
+TEST(ReferenceDocuments, MatchTheCatalogue)
 {
     EXPECT_EQ(contentOf(DOCS_DIR "/properties.md"), mihostRun({"properties", "--markdown"}).out)
         << "made by: mihost properties --markdown >docs/properties.md";
@@ -35,7 +35,7 @@ TEST(CatalogueCommands, DescribeOneKindOrMethod)
     EXPECT_EQ(mihostRun({"methods", "useradd"}).code, 2);
 }
 
-TEST(CatalogueCommands, TellAMethodsParametersInItsHelp)
+TEST(CatalogueCommands, ListAMethodsParametersInItsHelp)
 {
     std::string const help = mihostRun({"call", "LocalGroupAdd", "--help"}).out;
     EXPECT_NE(help.find("GroupName  name   required  the group's name"), std::string::npos) << help;

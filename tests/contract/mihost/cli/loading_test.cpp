@@ -30,7 +30,7 @@ TEST(LoadingThePlugin, NamesAFileThatIsMissing)
     expectRefused("/nonexistent/plugin.so", "No such file or directory");
 }
 
-TEST(LoadingThePlugin, NamesAFileThatIsNoElfFile)
+TEST(LoadingThePlugin, NamesAFileThatIsNotElf)
 {
     expectRefused("/etc/passwd", "invalid ELF header");
 }
@@ -45,19 +45,19 @@ TEST(LoadingThePlugin, NamesTheSymbolThatTheHostLacks)
     expectRefused(PLUGIN_THAT_WANTS_MORE, "undefined symbol: hostOperationFromTheFuture");
 }
 
-TEST(LoadingThePlugin, TellsWhatTheEntryPointAnswered)
+TEST(LoadingThePlugin, ReportsTheEntryPointsStatus)
 {
     setenv("ODD", "answer", 1);
     expectRefused(PLUGIN_THAT_IS_ODD, "OpenMI returned 7");
 }
 
-TEST(LoadingThePlugin, MissesTheInterface)
+TEST(LoadingThePlugin, ReportsAMissingInterface)
 {
     setenv("ODD", "interface", 1);
     expectRefused(PLUGIN_THAT_IS_ODD, "OpenMI returned no interface");
 }
 
-TEST(LoadingThePlugin, TellsWhyAPluginDidNotStart)
+TEST(LoadingThePlugin, ReportsWhyAPluginDidNotStart)
 {
     setenv("ODD", "start", 1);
     Outcome const outcome = mihostRun({"--plugin", PLUGIN_THAT_IS_ODD, "tree"});
@@ -76,7 +76,7 @@ TEST(LoadingThePlugin, ShowsButNeverWritesANodeOfUnknownKind)
               "mihost: set: unknown property '7' of node '2' (see 'mihost properties')\n");
 }
 
-TEST(LoadingThePlugin, NeedsAFolderForItsPrivateOne)
+TEST(LoadingThePlugin, ReportsAMissingTemporaryDirectory)
 {
     setenv("TMPDIR", "/nonexistent", 1);
     Outcome const outcome = mihostRun({"tree"});

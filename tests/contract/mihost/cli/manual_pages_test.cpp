@@ -49,7 +49,7 @@ TEST_P(ManualPage, IsRenderedWithoutWarnings)
     EXPECT_EQ(man.err, "");
 }
 
-TEST_P(ManualPage, HoldsToTheMacros)
+TEST_P(ManualPage, PassesMandocsLint)
 {
     for (std::string const& note :
          linesOf(shell("mandoc -T lint '" + std::string(GetParam()) + "'").out))
@@ -64,10 +64,10 @@ INSTANTIATE_TEST_SUITE_P(All, ManualPage,
                                          EXPORTER_PAGE),
                          [](auto const& which) { return std::string(pageNames[which.index]); });
 
-TEST(ManualPageOfMihost, TellsOfEveryOption)
+TEST(ManualPageOfMihost, DescribesEveryOption)
 {
     char const* const option = "(--[a-z][a-z-]*)";
-    auto const told = matches(rendered(MIHOST_PAGE), option);
+    auto const described = matches(rendered(MIHOST_PAGE), option);
     std::string help = mihostRun({"--help-all"}).out;
     for (char const* const group : {"user", "group"})
         for (std::string const& task : commandsOf(mihostRun({"help", group}).out))
@@ -75,10 +75,10 @@ TEST(ManualPageOfMihost, TellsOfEveryOption)
     auto const options = matches(help, option);
     EXPECT_FALSE(options.empty());
     for (std::string const& name : options)
-        EXPECT_EQ(told.count(name), 1U) << name;
+        EXPECT_EQ(described.count(name), 1U) << name;
 }
 
-TEST(ManualPageOfMihost, TellsOfEveryCommand)
+TEST(ManualPageOfMihost, DescribesEveryCommand)
 {
     std::string const help = mihostRun({"--help"}).out;
     std::string const page = rendered(MIHOST_PAGE);
@@ -92,8 +92,8 @@ TEST(ManualPageOfMihost, TellsOfEveryCommand)
         EXPECT_TRUE(std::regex_search(page, std::regex("\n {5,7}" + command + "[ \n]"))) << command;
 }
 
-// Otherwise: cmake --build --preset dev --target manual_pages
-TEST(ManualPageOfThePlugin, IsWhatItsTemplateAndTheCatalogueMake)
+// To update the page: cmake --build --preset dev --target manual_pages
+TEST(ManualPageOfThePlugin, IsMadeOfItsTemplateAndTheCatalogue)
 {
     Outcome const filled = runToEnd({FILL_PAGE_FILE, PLUGIN_PAGE ".in"});
     EXPECT_EQ(filled.code, 0) << filled.err;

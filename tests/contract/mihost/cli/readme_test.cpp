@@ -1,4 +1,4 @@
-// The session that the README shows is one that the program holds.
+// The commands in the README print what it shows.
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -44,7 +44,7 @@ bool matches(Lines const& lines, std::size_t line, Lines const& shown, std::size
            matches(lines, line + 1, shown, at + 1);
 }
 
-TEST(TheSessionInTheReadme, IsWhatTheProgramSays)
+TEST(ReadmeSession, IsWhatTheProgramPrints)
 {
     Outcome const sandbox = mihostRun({"--sandbox", "version"});
     char const* const required = std::getenv("MI_SANDBOX_REQUIRED");

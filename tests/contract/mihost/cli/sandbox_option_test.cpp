@@ -1,4 +1,4 @@
-// The --sandbox option: what it shows, and that the machine stays as it is.
+// The --sandbox option: what it shows, and that the machine is unchanged.
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -61,7 +61,7 @@ TEST_F(MihostSandbox, ShowsCommandsOutputAndChangedLines)
     EXPECT_EQ(contentOf("/etc/passwd"), before);
 }
 
-TEST_F(MihostSandbox, ShowsTheSameToPeople)
+TEST_F(MihostSandbox, ShowsCommandsAndChangedLinesAsText)
 {
     Outcome const outcome =
         mihostRun({"--overlay", plain_, "call", "LocalGroupAdd", "GroupName=sandboxed"});
@@ -72,7 +72,7 @@ TEST_F(MihostSandbox, ShowsTheSameToPeople)
         << outcome.out;
 }
 
-TEST_F(MihostSandbox, ShowsEveryFileThatCameWentOrChanged)
+TEST_F(MihostSandbox, ShowsCreatedChangedAndRemovedFiles)
 {
     ScratchFolder const machine;
     std::string const tool =
@@ -101,7 +101,7 @@ TEST_F(MihostSandbox, ShowsEveryFileThatCameWentOrChanged)
     EXPECT_EQ(changeOf("/srv/old/file", answer)["change"], "removed");
 }
 
-TEST_F(MihostSandbox, ShowsOfEachWriteOnlyWhatItChanged)
+TEST_F(MihostSandbox, ShowsOnlyTheChangesOfEachWrite)
 {
     Outcome const outcome =
         mihostRun({"--json", "--overlay", plain_, "shell"},
@@ -155,7 +155,7 @@ TEST_F(MihostSandbox, LaysTheOverlaysFilesOverTheMachine)
     EXPECT_EQ(outcome.out, "108 os-name  Example Appliance\n");
 }
 
-TEST_F(MihostSandbox, ExitsAsTheCommandInsideDoes)
+TEST_F(MihostSandbox, HasTheExitCodeOfTheCommandInside)
 {
     EXPECT_EQ(mihostRun({"--sandbox", "get", "none"}).code, 4);
     EXPECT_EQ(mihostRun({"--sandbox", "--plugin", "/nonexistent", "tree"}).code, 3);
@@ -175,7 +175,7 @@ TEST_F(MihostSandbox, NamesTheCapabilityThatRootLacks)
         << outcome.err;
 }
 
-TEST(MihostWithoutTheSandbox, IsNeverSilent)
+TEST(MihostWithoutTheSandbox, ReportsTheReason)
 {
     Outcome const outcome = mihostRun({"--overlay", "/nonexistent", "tree"});
     EXPECT_EQ(outcome.code, 2);

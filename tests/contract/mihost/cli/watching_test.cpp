@@ -18,7 +18,7 @@ Outcome watchCrew()
                       "3", "--interval", "0"});
 }
 
-TEST(Watching, GoesOnWithANodeThatIsBuiltAgain)
+TEST(Watching, ContinuesWithARebuiltNode)
 {
     setenv("ODD", "rebuild", 1);
     Outcome const outcome = watchCrew();

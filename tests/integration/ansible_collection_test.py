@@ -48,7 +48,8 @@ class Collection(unittest.TestCase):
         installed = glob.glob(os.path.join(self.installed, 'plugins', 'modules', '*.py'))
         self.assertEqual(sorted(os.path.basename(path)[:-3] for path in installed), MODULES)
         listed = self.controller.run('ansible-galaxy', 'collection', 'list', 'mi.host').stdout
-        self.assertIn('0.1.0', listed)
+        version = os.path.basename(self.archive)[len('mi-host-'):-len('.tar.gz')]
+        self.assertIn(version, listed)
         leftovers = [path for path in glob.glob(self.installed + '/**', recursive=True) if '.pyc' in path]
         self.assertEqual(leftovers, [])
 

@@ -1,5 +1,5 @@
 // The oldest mihost whose output this page reads.
-export const oldestMihost = "0.1.0";
+export const oldestMihost = "1.0.0";
 
 /** Whether the output of 'mihost --version' names a version that this page works with. */
 export function isRecent(output, oldest = oldestMihost) {

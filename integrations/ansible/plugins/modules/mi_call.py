@@ -11,7 +11,7 @@ description:
   - Runs a method of the operating-system node, such as C(UserAdd).
   - A method runs each time; M(mi.host.mi_user) and M(mi.host.mi_group) take a desired state
     instead.
-version_added: 0.1.0
+version_added: 1.0.0
 author:
   - The mihost developers (!UNKNOWN)
 options:

@@ -10,7 +10,7 @@ short_description: Read the management tree of a machine
 description:
   - Returns the operating system, its kernel modules, local users and groups, and the newest lines of
     the system log, as native types keyed by name.
-version_added: 0.1.0
+version_added: 1.0.0
 author:
   - The mihost developers (!UNKNOWN)
 options:

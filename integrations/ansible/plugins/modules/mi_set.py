@@ -11,7 +11,7 @@ description:
   - Writes a property that acts on the machine, such as C(password) of a user.
   - A property that only changes in the memory of the plug-in changes nothing on the target; the task
     warns.
-version_added: 0.1.0
+version_added: 1.0.0
 author:
   - The mihost developers (!UNKNOWN)
 options:

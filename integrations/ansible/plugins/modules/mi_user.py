@@ -11,7 +11,7 @@ description:
   - Brings an ordinary local account to a desired state. Options that are not given are not changed.
   - In check mode the change runs in a sandbox on the target, so errors of C(useradd)
     show beforehand.
-version_added: 0.1.0
+version_added: 1.0.0
 author:
   - The mihost developers (!UNKNOWN)
 options:

@@ -1,4 +1,4 @@
-// Who includes whom.
+// Which directory includes which.
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -16,7 +16,7 @@ namespace includes_test
 namespace fs = std::filesystem;
 using Names = std::vector<std::string>;
 
-/** What the files of a folder may include: other folders, or single files of them. */
+/** What the files of a directory may include: other directories, or single files of them. */
 using Rules = std::map<std::string, Names>;
 
 Rules const ownRules = {
@@ -32,7 +32,7 @@ Rules const ownRules = {
     {"integrations/prometheus/exporter", {"mihost/sandbox/Descriptor.h"}},
 };
 
-/** What every folder of the program may include beside those that it uses. */
+/** What every directory of the program may include besides those that it uses. */
 Names const belowTheProgram = {"host", "mihost/runtime", "mihost/sandbox", "mihost/accel/Accel.h"};
 
 void add(Names& names, Names const& more)
@@ -40,8 +40,8 @@ void add(Names& names, Names const& more)
     names.insert(names.end(), more.begin(), more.end());
 }
 
-/** From lines such as "mi_add_cli_part(doctor USES change log LIBRARIES ...)", lower folders first.
- */
+/** From lines such as "mi_add_cli_part(doctor USES change log LIBRARIES ...)", in which the
+ * directories that others use come first. */
 Rules rulesOfTheProgram()
 {
     static std::regex const part("mi_add_cli_part\\((\\w+)(?: USES((?: [a-z]+)+))?.*");

@@ -1,4 +1,4 @@
-// libmihostcheck in hosts that are right, and in hosts that are wrong in one way each.
+// libmihostcheck in correct hosts, and in hosts that are each broken in one way.
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -130,12 +130,12 @@ Names symbols(char const* kind, char const* library)
     return linesOf(outcome.out);
 }
 
-TEST(HostCheck, ExportsTheEntryPointAlone)
+TEST(HostCheck, ExportsOnlyTheEntryPoint)
 {
     EXPECT_EQ(symbols("exported", HOSTCHECK_FILE), Names{"OpenMI"});
 }
 
-/** Of the runtime's own, or with its body in the header: nothing that a plug-in can want. */
+/** Whether it is internal to the runtime or defined in a header, so no plug-in imports it. */
 bool isInside(std::string const& name)
 {
     static Names const insides = {"::Own::",    "::Store::",  "::Identity::",      "::Handle::",
@@ -190,7 +190,7 @@ class BrokenHosts : public testing::TestWithParam<BrokenHost>
 {
 };
 
-TEST_P(BrokenHosts, AreFoundAndNamed)
+TEST_P(BrokenHosts, FailTheCheckOfTheirFault)
 {
     Outcome const outcome = checked({host(std::string("broken_") + GetParam().way)});
     EXPECT_NE(outcome.code, 0);
@@ -273,7 +273,7 @@ TEST(BrokenHost, PublishesTheFailedCheckAndFailsToStart)
         << outcome.out;
 }
 
-/** Hosts whose classes are others: whatever is called of them goes astray. */
+/** Hosts whose classes have another layout, so that none of their operations can be called. */
 class MisdeclaredHosts : public testing::TestWithParam<BrokenHost>
 {
 };
@@ -303,7 +303,7 @@ class IncompleteHosts : public testing::TestWithParam<BrokenHost>
 {
 };
 
-TEST_P(IncompleteHosts, CannotLoadIt)
+TEST_P(IncompleteHosts, CannotLoadTheChecker)
 {
     Outcome const outcome = checked({host(std::string("broken_") + GetParam().way)});
     EXPECT_EQ(outcome.code, 1);

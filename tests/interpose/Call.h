@@ -32,23 +32,23 @@ public:
     /** Counts a call. @return whether it is the one to fail */
     bool failsNow();
 
-    /** As it was when the program began. */
+    /** Restores the state of the program's start. */
     virtual void reset();
 
 private:
     friend void resetAll();
 
     char const* const name_;
-    AnyCall* const next_; // of all that there are
+    AnyCall* const next_; // in the list of all
     bool counting_ = false;
     unsigned long failing_ = 0;
     unsigned long made_ = 0;
 };
 
-/** Takes all hooks away. */
+/** Removes all hooks. */
 void resetAll();
 
-/** Within one of these calls are not counted. */
+/** While one exists, calls of its thread are not counted. */
 class InHook
 {
 public:
@@ -71,7 +71,7 @@ public:
     using Function = Result(Arguments...);
     using Failure = std::conditional_t<std::is_void_v<Result>, std::monostate, Result>;
 
-    /** @param failure  what a call returns that is made to fail; errno is EIO then */
+    /** @param failure  what a failing call returns; it also sets errno to EIO */
     explicit Call(char const* name, Failure failure = {}) : AnyCall(name), failure_(failure) {}
 
     /** From now on this is called instead; null: the real function. */

@@ -52,10 +52,10 @@ struct Hooks {
 
 Hooks& hooks();
 
-/** From now on this command, and it alone, cannot be started: popen yields null. */
+/** From now on popen returns null for this command, and only for it. */
 void refuse(std::string const& command);
 
-/** Takes all hooks away when it goes. */
+/** Removes all hooks when it is destroyed. */
 class HookGuard
 {
 public:

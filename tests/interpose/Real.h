@@ -6,8 +6,7 @@
 namespace interpose
 {
 
-/** The next definition of the function that contains the address. Ends the program if there is
- * none. */
+/** The next definition of the function that contains the address. Aborts if there is none. */
 void* nextDefinition(void const* address);
 
 /** The function that the program replaces with its own of the same name: real(popen). */
@@ -26,7 +25,7 @@ auto real(Result (Class::*own)(Arguments...))
 }
 
 /**
- * The function that the one calling this replaces, for those that are virtual or overloaded.
+ * The function that the caller of this replaces; for virtual and overloaded functions.
  *
  * @tparam Function  its type; a member function takes its object as first argument
  */

@@ -1,5 +1,5 @@
-// Which commands run through NQ::MyProcess, which a host may replace, and which have a pipe of
-// their own.
+// Which commands run through NQ::MyProcess, which a host may replace, and which open their own
+// pipe.
 
 #include "util/MyProcess.h"
 
@@ -108,7 +108,7 @@ TEST_F(CommandRunner, RunsChpasswdForAUsersNewPassword)
     EXPECT_EQ(throughTheRunner(), Commands{"chpasswd -e < usrandpwd ; rm -f usrandpwd|r"});
 }
 
-TEST_F(CommandRunner, LeavesMethodsAndAccountLocksAlone)
+TEST_F(CommandRunner, DoesNotRunMethodsOrLockQueries)
 {
     NQ::OsInfo info;
     info.setCreateUser("UserDel,UserName:CMPI_string:jdoe");

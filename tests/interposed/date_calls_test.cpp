@@ -1,5 +1,4 @@
-// The calls of the date conversions, which a host may replace, and their order,
-// arguments.
+// The order and the arguments of calls of the date conversions, which a host may replace.
 
 #include "util/MyProcess.h"
 
@@ -69,7 +68,7 @@ protected:
     FakeCommands commands_;
 };
 
-TEST_F(DateCalls, OfANumberPassEverythingOnUnderTheMonthsName)
+TEST_F(DateCalls, ByNumberPassTheirArgumentsOnByName)
 {
     NQ::ito_time_t(2009, 2, 3, 4, 5, 6, 7, 0);
     NQ::ito_time_t(2009, 0, 3, 4, 5, 6, 7, 1);
@@ -113,7 +112,7 @@ TEST_F(DateCalls, OfALastChangeAreByNumberAtMidnight)
               (Calls{"by number 1970 1 1 0 0 0 0 -1", "by name 1970 Jan 1 0 0 0 0 -1"}));
 }
 
-TEST_F(DateCalls, OfAnAgeingDateAreByNumberOfChageByName)
+TEST_F(DateCalls, OfAnAgeingDateAreByNumberAndOfChageByName)
 {
     commands_.answers["chage -l jdoe"] = "Password expires : Mar 02, 2008\n"
                                          "Last password change : Feb 01, 2008\n";

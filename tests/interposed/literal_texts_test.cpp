@@ -1,4 +1,4 @@
-// Which text properties are made of literals, and which of texts.
+// Which text properties are made of literals, and which of std::string.
 
 #include "tests/interposed/StandIns.h"
 #include "tests/support/FakeFiles.h"
@@ -39,19 +39,19 @@ protected:
     Frame frame_;
 };
 
-TEST_F(LiteralTexts, TheComputersNameIsNone)
+TEST_F(LiteralTexts, TheComputersNameIsNotALiteral)
 {
     EXPECT_EQ(computerName("harbour"), "text harbour true");
     EXPECT_EQ(standIns().literals, Lines());
 }
 
-TEST_F(LiteralTexts, AnEmptyComputersNameIsSetAndIsNone)
+TEST_F(LiteralTexts, AnEmptyComputersNameIsSetAndNotALiteral)
 {
     EXPECT_EQ(computerName(""), "text  true");
     EXPECT_EQ(standIns().literals, Lines());
 }
 
-TEST_F(LiteralTexts, Property113OfAUserIsTheOnlyOne)
+TEST_F(LiteralTexts, OnlyProperty113OfAUserIsALiteral)
 {
     files_.write("/etc/passwd", "anna:x:1000:100::/home/anna:/bin/sh\n");
     frame_.createUserNodes(false);

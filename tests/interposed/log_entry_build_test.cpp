@@ -1,4 +1,4 @@
-// What the building of log entries asks of them and of the log's reader.
+// What the builder of log entries reads from them and from the log reader.
 
 #include "nodes/LogEntryNode.h"
 #include "sysdata/logInfo_linux.h"
@@ -91,12 +91,12 @@ TEST_F(LogEntryBuild, FetchesAtMost511Characters)
     EXPECT_EQ(asked().fetches, (Lines{"1 511", "1 511"}));
 }
 
-TEST_F(LogEntryBuild, GivesNothingBesideTheSecondsOfItsTime)
+TEST_F(LogEntryBuild, GivesItsTimeNoSubSeconds)
 {
     EXPECT_EQ(standIns().dates, (std::vector<std::pair<long, unsigned short>>{{1795169472, 0}}));
 }
 
-TEST_F(LogEntryBuild, TakesAFreshReaderForTheCountAndForEachRead)
+TEST_F(LogEntryBuild, MakesAReaderForTheCountAndForEachRead)
 {
     EXPECT_EQ(standIns().lives, readers(3));
     for (unsigned int const id : {81U, 89U, 79U, 4711U}) {

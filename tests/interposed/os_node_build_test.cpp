@@ -57,7 +57,7 @@ protected:
         return *interface_.osNode_;
     }
 
-    /** What is stored, whatever a live read would answer. */
+    /** The stored value, even of a live property. */
     std::string stored(unsigned int id)
     {
         return storedValue(*interface_.osNode_, id);
@@ -121,7 +121,7 @@ TEST_F(OsNodeBuild, StoresTheDistributedFlagAsATruthValue)
     EXPECT_EQ(stored(140), "boolean true true");
 }
 
-TEST_F(OsNodeBuild, AsksAndStoresInAFixedOrder)
+TEST_F(OsNodeBuild, ReadsAndStoresInAFixedOrder)
 {
     standIns().calls.clear();
     build();
@@ -186,7 +186,7 @@ TEST_F(OsNodeBuild, StoresTheProcessCountForUnknownFreeMemory)
     EXPECT_EQ(stored(150), "number 1500 true");
 }
 
-TEST_F(OsNodeBuild, CarriesAFigureOverEveryOneThatCannotBeHad)
+TEST_F(OsNodeBuild, StoresThePreviousFigureForUnreadableOnes)
 {
     standIns().failing = {"getSwapFileSize", "getSwapFileFree", "getSwapFileSizeStored"};
     build();
@@ -195,7 +195,7 @@ TEST_F(OsNodeBuild, CarriesAFigureOverEveryOneThatCannotBeHad)
     EXPECT_EQ(stored(152), "number 1500 true");
 }
 
-TEST_F(OsNodeBuild, StoresAnEmptyValueWhenTheFirstFigureCannotBeHad)
+TEST_F(OsNodeBuild, StoresAnEmptyValueForAnUnreadableFirstFigure)
 {
     standIns().failing = {"getProcessCount"};
     build();
@@ -214,7 +214,7 @@ TEST_F(OsNodeBuild, SeedsWithTheNodesOwnReads)
     EXPECT_EQ(std::count(texts.begin(), texts.end(), "OsNode::setProperty: exit"), 24);
 }
 
-TEST_F(OsNodeBuild, GivesNothingBesideTheSecondsOfItsTwoTimes)
+TEST_F(OsNodeBuild, GivesItsTwoTimesNoSubSeconds)
 {
     build();
     std::vector<std::pair<long, unsigned short>> const expected{{1273659825, 0}, {1230767999, 0}};
@@ -260,7 +260,7 @@ TEST_F(OsNodeBuild, WritesTheTimesInLocalTime)
     EXPECT_EQ(stored(141), "date 1273659825 true");
 }
 
-/** Notes messages among the fact readers that come and go. */
+/** Records messages in order with the lives of the fact readers. */
 class MessagesAmongLives : public mihost::LogSink
 {
 public:
@@ -281,7 +281,7 @@ public:
     }
 };
 
-TEST_F(OsNodeBuild, ReleasesItsFactReaderBeforeItsExitLine)
+TEST_F(OsNodeBuild, DestroysItsFactReaderBeforeLoggingItsExit)
 {
     MessagesAmongLives const noting;
     build();
@@ -302,7 +302,7 @@ protected:
         standIns().calls.clear();
     }
 
-    /** What a read leaves behind, by a caller whose value said "before". */
+    /** The caller's value after a read; it was "before". */
     std::string read(unsigned int id)
     {
         PropertyValue value("before", false);
@@ -322,7 +322,7 @@ constexpr Live liveProperties[] = {{144, "getProcessCount"},       {149, "getPhy
                                    {150, "getPhysicalMemorySize"}, {151, "getSwapFileSize"},
                                    {152, "getSwapFileSizeStored"}, {153, "getSwapFileFree"}};
 
-TEST_F(OsNodeRead, AsksAfreshForEveryLiveFigure)
+TEST_F(OsNodeRead, ReadsALiveFigureEachTime)
 {
     for (Live const& live : liveProperties) {
         standIns().calls.clear();
@@ -341,14 +341,14 @@ TEST_F(OsNodeRead, DoesNotStoreALiveFigure)
     EXPECT_EQ(stored(144), "number 1440 true");
 }
 
-TEST_F(OsNodeRead, AnswersALiveFigureWhateverWasStoredInItsPlace)
+TEST_F(OsNodeRead, IgnoresTheStoredValueOfALiveFigure)
 {
     EXPECT_EQ(node_.setProperty(144, PropertyValue("stored", true)).getStatus(), 0U);
     EXPECT_EQ(read(144), "number 1440 true");
     EXPECT_EQ(stored(144), "text stored true");
 }
 
-TEST_F(OsNodeRead, KeepsTheCallersValueForAnUnknownFigure)
+TEST_F(OsNodeRead, KeepsTheCallersValueForAnUnreadableFigure)
 {
     for (Live const& live : liveProperties) {
         standIns().failing = {live.getter};
@@ -356,7 +356,7 @@ TEST_F(OsNodeRead, KeepsTheCallersValueForAnUnknownFigure)
     }
 }
 
-TEST_F(OsNodeRead, AnswersZeroForTheClearCommandWhateverWasStored)
+TEST_F(OsNodeRead, ReadsTheClearCommandAsZeroWhateverWasStored)
 {
     EXPECT_EQ(stored(191), "unset");
     for (unsigned int const written : {9U, 1U}) {
@@ -386,7 +386,7 @@ TEST_F(OsNodeRead, AnswersTheRequestedStateAsWritten)
     EXPECT_EQ(read(123), "enumeration 5 true");
 }
 
-TEST_F(OsNodeRead, HandsBackTheFrameworksErrorForAnUnknownProperty)
+TEST_F(OsNodeRead, ReturnsTheFrameworksErrorForAnUnknownProperty)
 {
     PropertyValue value("before", false);
     Error const error = node_.getProperty(4711, value);
@@ -422,7 +422,7 @@ TEST_F(OsNodeRead, LogsItsEntryAndExitUnderTheClassName)
     }
 }
 
-TEST_F(OsNodeBuild, MakesItsOneLiteralTextOfTheLiteral)
+TEST_F(OsNodeBuild, MakesOnlyTheDummyTextOfALiteral)
 {
     standIns().literals.clear();
     build();

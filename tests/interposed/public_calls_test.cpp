@@ -1,5 +1,5 @@
-// Public functions that other public functions call by name, so that whoever replaces one is
-// noticed.
+// Contract: public functions call other public functions by name, so a host that replaces one
+// sees these calls.
 
 #include "sysdata/groupInfo_linux.h"
 #include "sysdata/minMaxId.h"
@@ -133,7 +133,7 @@ TEST_F(PublicCalls, TheGroupListingSetsTheMembersOfEachGroup)
     EXPECT_EQ(groups[0].getGroupMembers(), (Calls{"anna", "ben", "carl"}));
 }
 
-TEST_F(PublicCalls, TheGroupListingAsksForBothBoundsWithEveryGroup)
+TEST_F(PublicCalls, TheGroupListingReadsBothBoundsForEveryGroup)
 {
     files_.write("/etc/group", "team:x:500:\ncrew:x:501:\n");
     standIns() = {};
@@ -144,7 +144,7 @@ TEST_F(PublicCalls, TheGroupListingAsksForBothBoundsWithEveryGroup)
     EXPECT_EQ(standIns().calls, Calls(4, "Instance"));
 }
 
-TEST_F(PublicCalls, TheUserListingAsksForBothBoundsWithEveryAccount)
+TEST_F(PublicCalls, TheUserListingReadsBothBoundsForEveryAccount)
 {
     files_.write("/etc/passwd", "root:x:0:0:::\ndaemon:x:2:2:::\njdoe:x:1000:1000:::\n");
     standIns() = {};
@@ -156,7 +156,7 @@ TEST_F(PublicCalls, TheUserListingAsksForBothBoundsWithEveryAccount)
     EXPECT_EQ(standIns().calls, expected);
 }
 
-TEST_F(PublicCalls, TheParserSplitsAtBothLevelsWithTheSplitter)
+TEST_F(PublicCalls, TheParserSplitsAtBothLevelsWithTokenize)
 {
     for (char const* text : {"UserDel,UserName:CMPI_string:jdoe,A:CMPI_string:b",
                              "UserDel,Password:CMPI_string:jdoe,A:CMPI_string:b"}) {
@@ -181,7 +181,7 @@ TEST_F(PublicCalls, TheExecutorUsesRunnerAndPasswordSetter)
                      "executeCommand echo", "executeCommand /usr/bin/chage"}));
 }
 
-TEST_F(PublicCalls, TheExecutorPassesMembershipsOnWhole)
+TEST_F(PublicCalls, TheExecutorPassesMembershipsOnUnchanged)
 {
     bool shadowing = false;
     EXPECT_EQ(

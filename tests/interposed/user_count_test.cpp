@@ -12,7 +12,7 @@ namespace
 
 using Calls = std::vector<std::string>;
 
-/** What is called for an account file, the opening of that file among it. */
+/** The calls made for an account file, its opening included. */
 Calls callsFor(char const* passwd)
 {
     FakeFiles const files;
@@ -35,13 +35,13 @@ Calls callsFor(char const* passwd)
     return standIns().calls;
 }
 
-TEST(UserCount, AsksForTheRangesOnceBeforeItOpensTheAccountFile)
+TEST(UserCount, GetsTheRangesBeforeOpeningTheAccountFile)
 {
-    callsFor(nullptr); // the instance has read its file now
+    callsFor(nullptr); // makes the instance read its file
     EXPECT_EQ(callsFor(nullptr), (Calls{"lock", "setpwent", "Instance", "/etc/passwd"}));
 }
 
-TEST(UserCount, AsksForBothBoundsAgainWithEveryAccount)
+TEST(UserCount, ReadsBothBoundsForEveryAccount)
 {
     callsFor(nullptr);
     Calls const bounds{"Instance", "getMinUserId", "Instance", "getMaxUserId"};

@@ -10,7 +10,7 @@
 namespace
 {
 
-TEST(UserNodeBuild, GivesNothingBesideTheSecondsOfItsTimes)
+TEST(UserNodeBuild, GivesItsTimesNoSubSeconds)
 {
     useZone("UTC0");
     FakeFiles const files;

@@ -34,7 +34,7 @@ protected:
     Frame frame;
 };
 
-TEST_F(DriverNodes, StandUnderTheOperatingSystemInTheOrderOfLsmod)
+TEST_F(DriverNodes, AreBelowTheOperatingSystemInTheOrderOfLsmod)
 {
     haveThreeModules();
     frame.nextNodeId_ = 30;
@@ -87,7 +87,7 @@ TEST_F(DriverNodes, AreSetUpInTheOrderThatHostsSee)
                                   "setProperty(108)", "setProperty(70)", "setProperty(36)"}));
 }
 
-TEST_F(DriverNodes, CarryTheIdListOfTheMomentTheyWereMade)
+TEST_F(DriverNodes, KeepTheInterfaceIdsTheyWereMadeWith)
 {
     haveThreeModules();
     frame.miIds_ = {7, 9};
@@ -97,7 +97,7 @@ TEST_F(DriverNodes, CarryTheIdListOfTheMomentTheyWereMade)
         EXPECT_EQ(node->getMIIds(), (Ids{7, 9}));
 }
 
-TEST_F(DriverNodes, AreNotPublishedOneByOne)
+TEST_F(DriverNodes, AreNotPublished)
 {
     haveThreeModules();
     frame.createDriverNodes();

@@ -25,7 +25,7 @@ namespace group_nodes_test
 
 using Ids = std::vector<unsigned int>;
 
-/** A machine with two groups, one of them empty. */
+/** A machine with two groups to report, one of them empty, and one that is not reported. */
 class GroupNodes : public testing::Test
 {
 protected:
@@ -72,7 +72,7 @@ TEST_F(GroupNodes, HaveTheOrderOfTheDatabase)
     EXPECT_EQ(frame.groupNodes_, inOrder());
 }
 
-TEST_F(GroupNodes, CarryTheIdListOfTheMomentTheyWereMade)
+TEST_F(GroupNodes, KeepTheInterfaceIdsTheyWereMadeWith)
 {
     frame.miIds_ = {7, 9};
     frame.createGroupNodes(false);
@@ -134,7 +134,7 @@ TEST_F(GroupNodes, ArePublishedOnARefreshAndTheirIdsNotNoted)
     }
 }
 
-TEST_F(GroupNodes, ArePublishedEachAsSoonAsItIsComplete)
+TEST_F(GroupNodes, ArePublishedAsSoonAsEachIsComplete)
 {
     struct Publications {
         Frame const& frame;
@@ -180,7 +180,7 @@ TEST_F(GroupNodes, AreNotDeletedWhenBuiltWithoutARefresh)
     EXPECT_EQ(groups()[2]->getIndex(), 1U);
 }
 
-TEST_F(GroupNodes, SayHowManyThereAreAndWhichEachOneIs)
+TEST_F(GroupNodes, LogTheirNumberAndEachNameAndId)
 {
     Recording const log;
     frame.createGroupNodes(false);
@@ -195,7 +195,7 @@ TEST_F(GroupNodes, SayHowManyThereAreAndWhichEachOneIs)
                               "Id = 0", "Name = team", "Id = 500", "createGroupNodes: exit"}));
 }
 
-TEST_F(GroupNodes, SayTheirNameAndIdBeforeTheirPropertiesAreSet)
+TEST_F(GroupNodes, LogTheirNameAndIdBeforeTheirProperties)
 {
     files.write("/etc/group", "root:x:0:\n");
     NodeCalls const calls;
@@ -232,7 +232,7 @@ TEST_F(GroupNodes, AreBuiltUnderTheLockThatTheyShareWithUsers)
                             "unlock shared"}));
 }
 
-TEST_F(GroupNodes, LeaveNoLockBehindWhenAnExceptionPasses)
+TEST_F(GroupNodes, ReleaseTheLocksWhenAnExceptionPasses)
 {
     libc::hooks().getgrent = []() -> group* { throw std::bad_alloc(); };
     int held = 0;
@@ -246,7 +246,7 @@ TEST_F(GroupNodes, LeaveNoLockBehindWhenAnExceptionPasses)
     EXPECT_EQ(held, 0);
 }
 
-TEST_F(GroupNodes, AreStoredWithoutTheMarkOfTheUserBuilder)
+TEST_F(GroupNodes, AreStoredWithoutTheUserBuildersFlag)
 {
     struct FlagSeen : mihost::LogSink {
         void write(mihost::LogMessage const&) override
@@ -316,7 +316,7 @@ TEST_F(GroupNodes, OnlyStoreWhatIsWrittenToThem)
     EXPECT_TRUE(log.records().empty()); // the framework's own store
 }
 
-TEST_F(GroupNodes, SpeakOfAReadOfTheirBirthAndOfTheirDeath)
+TEST_F(GroupNodes, LogReadsConstructionAndDestruction)
 {
     Recording log;
     auto* const node = new IC::GroupNode(1, 2, {}, 51, 3);
@@ -331,7 +331,7 @@ TEST_F(GroupNodes, SpeakOfAReadOfTheirBirthAndOfTheirDeath)
     EXPECT_EQ(log.texts(), Lines{"GroupNode::~GroupNode: entry"});
 }
 
-TEST_F(GroupNodes, SpeakOfEveryReadForTheFrame)
+TEST_F(GroupNodes, LogEveryReadUnderTheFramesName)
 {
     frame.createGroupNodes(false);
     for (unsigned int const id : {51U, 108U}) {
@@ -360,7 +360,7 @@ TEST_F(GroupNodes, AreAnnouncedByTheirDescriptionWhenDeleted)
     EXPECT_TRUE(log.has("Delete a group entry: Renamed", 3000));
 }
 
-TEST_F(GroupNodes, LeaveTheMarkOfTheUserBuilderAsItStands)
+TEST_F(GroupNodes, DoNotChangeTheUserBuildersFlag)
 {
     IC::OSSWMI::MI_call = true;
     frame.createGroupNodes(false);
@@ -368,7 +368,7 @@ TEST_F(GroupNodes, LeaveTheMarkOfTheUserBuilderAsItStands)
     IC::OSSWMI::MI_call = false;
 }
 
-TEST_F(GroupNodes, SpeakFromTheLineOnWhichEachMessageStands)
+TEST_F(GroupNodes, LogTheSourceLineOfEachMessage)
 {
     Lines const source = linesOf(contentOf(TESTS_DIR "/../nodes/GroupNode.cpp"));
     Recording const log;
@@ -386,7 +386,7 @@ TEST_F(GroupNodes, SpeakFromTheLineOnWhichEachMessageStands)
     EXPECT_EQ(found, 2 * (1 + 2 + 2)); // both operations; two groups
 }
 
-TEST_F(GroupNodes, AskTheirParentForItsIdOnceEach)
+TEST_F(GroupNodes, QueryTheirParentsIdOnceEach)
 {
     Counter parent;
     IC::MutableNode* const real = std::exchange(frame.osNode_, &parent);

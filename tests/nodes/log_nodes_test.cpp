@@ -112,7 +112,7 @@ TEST_F(LogNodes, SetTheLogUpInTheOrderThatHostsSee)
                                   "setProperty(114)", "setProperty(84)"}));
 }
 
-TEST_F(LogNodes, LogEntryAndExitOfTheLogsBuilderAlone)
+TEST_F(LogNodes, LogOnlyEntryAndExitOfTheLogsBuilder)
 {
     Recording const recording;
     frame.createLogNodes();
@@ -249,7 +249,7 @@ TEST_F(LogNodes, HaveNoEntriesWhenTheLogCannotBeCounted)
     EXPECT_TRUE(entries().empty());
 }
 
-TEST_F(LogNodes, LeaveTheTimeUnsetWhereALineHasNone)
+TEST_F(LogNodes, LeaveTheTimeUnsetIfALineHasNone)
 {
     haveLines(2);
     haveLine(2, "kernel: no stamp at all here\n");
@@ -309,7 +309,7 @@ TEST_F(LogNodes, AnswerOtherPropertiesFromTheStore)
     EXPECT_EQ(read(*entries()[0], 108), "0 text mine true");
 }
 
-TEST_F(LogNodes, FailAReadBeyondTheLogAndLeaveTheValueAlone)
+TEST_F(LogNodes, FailAReadBeyondTheLogAndKeepTheValue)
 {
     haveLines(3);
     build();
@@ -334,7 +334,7 @@ TEST_F(LogNodes, FailWithAnEmptyText)
               static_cast<std::string>(IC::Error(1, IC::Number(IC::Number::EmptyKind), "")));
 }
 
-TEST_F(LogNodes, StoreWhatIsWrittenAndLeaveTheLogAlone)
+TEST_F(LogNodes, StoreWhatIsWrittenAndKeepTheLog)
 {
     haveLines(1);
     build();
@@ -346,7 +346,7 @@ TEST_F(LogNodes, StoreWhatIsWrittenAndLeaveTheLogAlone)
     EXPECT_EQ(read(*entries()[0], 81), "0 text *message 1* true");
 }
 
-TEST_F(LogNodes, NameAnEntrysDestruction)
+TEST_F(LogNodes, LogAnEntrysDestruction)
 {
     haveLines(1);
     build();
@@ -356,7 +356,7 @@ TEST_F(LogNodes, NameAnEntrysDestruction)
     EXPECT_EQ(recording.texts(), Lines{"LogEntryNode::~LogEntryNode: entry"});
 }
 
-TEST_F(LogNodes, GiveWayToNewOnesOnARefresh)
+TEST_F(LogNodes, AreReplacedOnARefresh)
 {
     haveLines(2);
     build();
@@ -401,7 +401,7 @@ TEST_F(LogNodes, AreAllDeletedAndNoneMadeWhenTheLogWasCleared)
     EXPECT_EQ(frame.ofType(35).size(), 1U);
 }
 
-TEST_F(LogNodes, ArePublishedEachAsSoonAsItIsComplete)
+TEST_F(LogNodes, ArePublishedAsSoonAsEachIsComplete)
 {
     haveLines(2);
     frame.createLogNodes();
@@ -417,7 +417,7 @@ TEST_F(LogNodes, ArePublishedEachAsSoonAsItIsComplete)
     EXPECT_NE(storedValue(*frame.published[0], 79), "unset");
 }
 
-TEST_F(LogNodes, AreAllMadeThoughTheHostRefusesThem)
+TEST_F(LogNodes, AreAllMadeEvenIfTheHostRefusesThem)
 {
     haveLines(2);
     frame.createLogNodes();
@@ -433,7 +433,7 @@ TEST_F(LogNodes, AreAllMadeThoughTheHostRefusesThem)
     EXPECT_EQ(recording.texts(6000), Lines(2, "addNewNode error = status 1: no room"));
 }
 
-TEST_F(LogNodes, OfAnEarlierLifeAreForgottenWithIt)
+TEST_F(LogNodes, AreForgottenAfterUnload)
 {
     haveLines(2);
     build();
@@ -459,7 +459,7 @@ struct RefusingFrame : Frame {
     }
 };
 
-TEST_F(LogNodes, AreAllReplacedWhateverTheirDeletionAnswers)
+TEST_F(LogNodes, AreAllReplacedWhateverTheirDeletionReturns)
 {
     RefusingFrame other;
     haveLines(3);

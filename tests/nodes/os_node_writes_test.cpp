@@ -111,7 +111,7 @@ TEST_F(OsNodeWrites, OfOtherStatesDoNothingElse)
     EXPECT_EQ(rebuilt(log), Lines());
 }
 
-TEST_F(OsNodeWrites, TakeTextsThatAreNumbersForNumbers)
+TEST_F(OsNodeWrites, TreatNumericTextsAsNumbers)
 {
     write(123, PropertyValue("12", true));
     EXPECT_EQ(commands_.ran, Lines{"/sbin/shutdown -h now"});
@@ -195,7 +195,7 @@ TEST_F(OsNodeWrites, OfOtherNumbersToRefreshRebuildNothing)
     EXPECT_EQ(rebuilt(log), Lines());
 }
 
-TEST_F(OsNodeWrites, TakeATextThatIsNoNumberForZero)
+TEST_F(OsNodeWrites, TreatOtherTextsAsZero)
 {
     Recording const log;
     write(75, PropertyValue("later", true));
@@ -233,7 +233,7 @@ TEST_F(OsNodeWrites, OfAMethodThatFailsReturnStatus1)
     EXPECT_EQ(rebuilt(log), Lines());
 }
 
-TEST_F(OsNodeWrites, OfATextThatIsNoMethodFail)
+TEST_F(OsNodeWrites, OfATextThatIsNotAMethodFail)
 {
     for (char const* text : {"x", "dummy ", "Dummy", ",", "UserAdd,A:CMPI_boolean:b"}) {
         EXPECT_EQ(writeText(text).getStatus(), 1) << text;
@@ -268,7 +268,7 @@ TEST_F(OsNodeWrites, OfAMethodAreLoggedInFull)
                "CreateUser: inMethodAndParams = " + addition, "OsNode::setCreateUser: entry"}));
 }
 
-TEST_F(OsNodeWrites, ThatHoldPasswordAnywhereAreNotLogged)
+TEST_F(OsNodeWrites, ThatContainPasswordAreNotLogged)
 {
     for (char const* text : {"UserSetPassword", "x,Password:CMPI_string:s", "aPasswordb"}) {
         Recording const log;
@@ -278,7 +278,7 @@ TEST_F(OsNodeWrites, ThatHoldPasswordAnywhereAreNotLogged)
     }
 }
 
-TEST_F(OsNodeWrites, HandTheTextOnByteForByte)
+TEST_F(OsNodeWrites, PassTheTextOnByteForByte)
 {
     std::string const name = "j\xC3\xB6rg\xFF\xE2\x82";
     commands_.answers["/usr/sbin/userdel " + name + " 2>&1"] = "";
@@ -294,7 +294,7 @@ TEST_F(OsNodeWrites, OfAMethodPassTheTextThroughWideTextAndBack)
     EXPECT_EQ(texts.narrowed, texts.widened);
 }
 
-TEST_F(OsNodeWrites, AreStoredOnceTheyHaveBeenActedOn)
+TEST_F(OsNodeWrites, AreStoredAfterTheirAction)
 {
     struct {
         unsigned int id;
@@ -344,7 +344,7 @@ TEST_F(OsNodeWrites, OfAnyOtherPropertyAreStoredOnly)
     EXPECT_EQ(commands_.ran, Lines());
 }
 
-TEST_F(OsNodeWrites, SpeakForTheFrame)
+TEST_F(OsNodeWrites, LogUnderTheFramesName)
 {
     Recording const log;
     writeText("dummy");
@@ -356,7 +356,7 @@ TEST_F(OsNodeWrites, SpeakForTheFrame)
     }
 }
 
-TEST_F(OsNodeWrites, SayWhenTheyEndOnEveryPath)
+TEST_F(OsNodeWrites, LogTheirExitOnEveryPath)
 {
     commands_.answers.clear();
     for (unsigned int const id : {123U, 191U, 75U, 74U, 108U}) {
@@ -367,7 +367,7 @@ TEST_F(OsNodeWrites, SayWhenTheyEndOnEveryPath)
     }
 }
 
-TEST_F(OsNodeWrites, TakeTheTextFormOfAnyValueForAMethod)
+TEST_F(OsNodeWrites, UseTheTextFormOfAnyValueAsAMethod)
 {
     Recording const log;
     EXPECT_EQ(write(74, 5).getStatus(), 1);

@@ -76,7 +76,7 @@ TEST_F(UserNodes, HaveTheOrderOfTheAccountFile)
     EXPECT_EQ(frame.userNodes_, inOrder());
 }
 
-TEST_F(UserNodes, CarryTheIdListOfTheMomentTheyWereMade)
+TEST_F(UserNodes, KeepTheInterfaceIdsTheyWereMadeWith)
 {
     frame.miIds_ = {7, 9};
     frame.createUserNodes(false);
@@ -128,7 +128,7 @@ TEST_F(UserNodes, CountTheBytesOfTheirTexts)
     EXPECT_EQ(storedValue(*users()[0], 109), "number 5 true");
 }
 
-TEST_F(UserNodes, HoldTheSystemsValuesForEmptyAgeingFields)
+TEST_F(UserNodes, HaveTheSystemsDefaultsForEmptyAgeingFields)
 {
     files.write("/etc/passwd", account("anna", 1000));
     files.write("/etc/shadow", "anna:!:::::::\n");
@@ -185,7 +185,7 @@ TEST_F(UserNodes, ArePublishedOnARefreshAndTheirIdsNotNoted)
     EXPECT_EQ(frame.nextNodeId_, next + 3);
 }
 
-TEST_F(UserNodes, ArePublishedEachAsSoonAsItIsComplete)
+TEST_F(UserNodes, ArePublishedAsSoonAsEachIsComplete)
 {
     struct Publications {
         Frame const& frame;
@@ -292,7 +292,7 @@ TEST_F(UserNodes, AreNoneWithoutAnAccountFileAndTheLockIsReleased)
     EXPECT_EQ(unlocks, 1);
 }
 
-/** Notes how the flag stands at each message; throws at one of them, if told to. */
+/** Records the flag at each message, and throws at the message throwAt. */
 class FlagAtMessages : public mihost::LogSink
 {
 public:
@@ -319,7 +319,7 @@ public:
     std::string throwAt;
 };
 
-TEST_F(UserNodes, AreMarkedOnlyWhileTheirPropertiesAreStored)
+TEST_F(UserNodes, SetTheFlagOnlyWhileTheirPropertiesAreStored)
 {
     files.write("/etc/passwd", account("root", 0));
     FlagAtMessages flag;
@@ -392,7 +392,7 @@ TEST_F(UserNodes, AnswerAllElseFromWhatIsStored)
     EXPECT_EQ(shown(untouched), "text untouched true");
 }
 
-TEST_F(UserNodes, SpeakOfAReadUnderTheNameOfTheClass)
+TEST_F(UserNodes, LogAReadUnderTheConstructorsName)
 {
     frame.createUserNodes(false);
     IC::PropertyValue value = IC::values::emptyValue();
@@ -407,7 +407,7 @@ TEST_F(UserNodes, SpeakOfAReadUnderTheNameOfTheClass)
     EXPECT_EQ(texts.back(), "UserNode::UserNode: exit");
 }
 
-TEST_F(UserNodes, SpeakOfTheirBirthAndOfTheirDeath)
+TEST_F(UserNodes, LogTheirConstructionAndDestruction)
 {
     Recording log;
     auto* const node = new IC::UserNode(1, 2, {}, 46, 3);
@@ -426,7 +426,7 @@ TEST_F(UserNodes, AreAnnouncedByTheirDescriptionWhenDeleted)
     EXPECT_TRUE(log.has("Delete a user entry: Renamed", 3000));
 }
 
-TEST_F(UserNodes, SpeakOfAReadForTheFrame)
+TEST_F(UserNodes, LogAReadUnderTheFramesName)
 {
     frame.createUserNodes(false);
     Recording const log;
@@ -452,7 +452,7 @@ TEST_F(UserNodes, CountTheDigitsOfTheirIdApartFromTheirName)
     EXPECT_EQ(storedValue(*users()[1], 90), "number 5 true");
 }
 
-TEST_F(UserNodes, AskTheirParentForItsIdOnceEach)
+TEST_F(UserNodes, QueryTheirParentsIdOnceEach)
 {
     Counter parent;
     IC::MutableNode* const real = std::exchange(frame.osNode_, &parent);

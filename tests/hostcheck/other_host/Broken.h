@@ -1,7 +1,7 @@
 #ifndef TESTS_HOSTCHECK_OTHER_HOST_BROKEN_H
 #define TESTS_HOSTCHECK_OTHER_HOST_BROKEN_H
 
-/** The ways in which this host can be wrong; BROKEN names one when a file is compiled. */
+/** The ways in which this host can be broken; BROKEN names one when a file is compiled. */
 enum class Way {
     Nothing,
     BooleanIsANumber,
@@ -34,7 +34,7 @@ enum class Way {
 #define BROKEN Nothing
 #endif
 
-// Of each file's own: files of one host are compiled with different answers.
+// Static: the files of one host are compiled with different values of BROKEN.
 static constexpr bool broken(Way way)
 {
     return way == Way::BROKEN;

@@ -15,7 +15,7 @@
 namespace NQ
 {
 
-// Held or not, under a guard of its own.
+// A flag that a standard mutex guards.
 struct Mutex::Handle {
     std::mutex guard;
     std::condition_variable released;
@@ -53,7 +53,7 @@ namespace
 // A byte that is not UTF-8 becomes a wide character beyond those of Unicode.
 constexpr unsigned long firstStray = 0x110000;
 
-/** The bytes of the character that the text has at this place; 0 if it has none there. */
+/** The size in bytes of the character at this place; 0 if it is not UTF-8. */
 std::size_t sizeOfCharacter(std::string const& text, std::size_t at)
 {
     auto const byte = [&](std::size_t place) {

@@ -48,8 +48,8 @@ public:
     /**
      * The time stamp of an entry, read as local time, in the current year or the one before.
      *
-     * @param time  seconds since 1970, 0 if the command date cannot be started; unchanged on
-     *              failure
+     * @param time  seconds since 1970, 0 if the current year is unknown or out of range; unchanged
+     *              on failure
      * @return whether there is such an entry with a time stamp
      */
     bool getCreationTime(long& time, unsigned int index);

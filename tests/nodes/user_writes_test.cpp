@@ -32,7 +32,7 @@ Lines sorted(Lines texts)
     return texts;
 }
 
-/** The node of anna, UID 1000, in a working directory of its own. */
+/** The node of anna, UID 1000, in its own working directory. */
 class UserWrite : public testing::Test
 {
 protected:
@@ -103,14 +103,14 @@ TEST_F(PasswordWrite, EmptiesAFileThatIsThereAlready)
     EXPECT_EQ(handedOver, Lines{"anna:new\n"});
 }
 
-TEST_F(PasswordWrite, TakesTheNameThatTheNodeHoldsNow)
+TEST_F(PasswordWrite, UsesTheNodesCurrentName)
 {
     write(108, IC::values::text("renamed"));
     write(117, IC::values::text("new"));
     EXPECT_EQ(handedOver, Lines{"renamed:new\n"});
 }
 
-TEST_F(PasswordWrite, IsStoredAlsoWhenChpasswdCannotBeStarted)
+TEST_F(PasswordWrite, IsStoredEvenIfChpasswdCannotBeStarted)
 {
     write(117, IC::values::text("new"));
     EXPECT_EQ(log.texts(6000),
@@ -124,7 +124,7 @@ TEST_F(PasswordWrite, IsStoredAlsoWhenChpasswdCannotBeStarted)
         }
 }
 
-TEST_F(PasswordWrite, StartsChpasswdAlsoWhenTheFileCannotBeCreated)
+TEST_F(PasswordWrite, StartsChpasswdEvenIfTheFileCannotBeCreated)
 {
     std::filesystem::create_directory("usrandpwd");
     commands.answers[setPasswords] = "";
@@ -178,7 +178,7 @@ TEST_F(UserWrite, OfAPasswordExpirationCountsFromTheChange)
     EXPECT_EQ(storedValue(anna(), 91), "text 2008-01-11 00:00:00 true");
 }
 
-TEST_F(UserWrite, OfADateTakesItsText)
+TEST_F(UserWrite, OfADateUsesItsTextForm)
 {
     commands.answers = {{"chage -l anna", "Password expires : Jan 01, 2008\n"
                                           "Last password change : Jan 02, 2008\n"}};
@@ -200,7 +200,7 @@ TEST_F(UserWrite, OfADatePassesDateAndNameThroughWideText)
     }
 }
 
-TEST_F(UserWrite, IsStoredWhateverBecomesOfTheCommand)
+TEST_F(UserWrite, IsStoredEvenIfTheCommandFails)
 {
     write(118, IC::values::text("tomorrow"));
     write(91, IC::values::text("tomorrow"));
@@ -211,7 +211,7 @@ TEST_F(UserWrite, IsStoredWhateverBecomesOfTheCommand)
     EXPECT_EQ(log.texts(6000).back(), "Cannot open process: command = userdel -r 1000");
 }
 
-TEST_F(UserWrite, IsStoredOnceItHasBeenActedOn)
+TEST_F(UserWrite, IsStoredAfterItsAction)
 {
     for (unsigned int const id : {117U, 118U, 91U, 138U}) {
         std::string const before = storedValue(anna(), id);
@@ -283,7 +283,7 @@ TEST_F(UserWrite, OfTheBuilderIsOnlyStored)
     EXPECT_EQ(storedValue(anna(), 138), "number 1 true");
 }
 
-TEST_F(UserWrite, SpeaksOfItself)
+TEST_F(UserWrite, LogsItsEntryAndExit)
 {
     log.clear();
     write(312, IC::values::text("x"));
@@ -291,7 +291,7 @@ TEST_F(UserWrite, SpeaksOfItself)
               (Lines{"UserNode::setProperty: entry", "UserNode::setProperty: exit"}));
 }
 
-TEST_F(UserWrite, LeavesTheOtherNodesAsTheyAre)
+TEST_F(UserWrite, DeletesAndPublishesNoNode)
 {
     commands.answers["userdel -r 1000"] = "";
     write(138, IC::values::number(1));

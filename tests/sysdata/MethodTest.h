@@ -12,7 +12,7 @@
 #include <string>
 #include <vector>
 
-/** A machine with an empty /etc on which every command is only noted, and stays silent. */
+/** A machine with an empty /etc; commands are only recorded, and print nothing. */
 class MethodTest : public testing::Test
 {
 protected:

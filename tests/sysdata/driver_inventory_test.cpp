@@ -91,7 +91,7 @@ TEST_F(DriverInventory, KeepsLsmodOpenWhileEachModinfoRuns)
     EXPECT_EQ(openBefore, (std::vector<int>{0, 1, 1}));
 }
 
-TEST_F(DriverInventory, IsEmptyWithTheHeaderAlone)
+TEST_F(DriverInventory, IsEmptyWithTheHeaderOnly)
 {
     commands.answers = {{"lsmod", header}};
     EXPECT_TRUE(list().empty());
@@ -145,7 +145,7 @@ TEST_F(DriverInventory, KeepsAModuleThatModinfoDoesNotKnow)
     EXPECT_EQ(driver.getDescription(), "Driver");
 }
 
-TEST_F(DriverInventory, ReportsABlankLineAndGoesOn)
+TEST_F(DriverInventory, ReportsABlankLineAndContinues)
 {
     commands.answers = {{"lsmod", "\n \t\nloop 1 0\n"}, {"modinfo loop", ""}};
     Recording const recording;
@@ -198,7 +198,7 @@ TEST_F(DriverInventory, LogsEveryStepInOrder)
     EXPECT_EQ(recording.texts(6000), Lines{});
 }
 
-TEST_F(DriverInventory, SpeaksUnderItsOwnNameUnitAndCategory)
+TEST_F(DriverInventory, LogsUnderItsOwnNameUnitAndCategory)
 {
     commands.answers = {{"lsmod", "\nloop\ngone\n"}, {"modinfo loop", "version:1\n"}};
     Recording const recording;
@@ -267,7 +267,7 @@ TEST_F(DriverInventory, RunsNoCommandThatExceedsItsBuffer)
     EXPECT_EQ(recording.texts(6000), Lines{"Command too long: modinfo " + module});
 }
 
-TEST_F(DriverInventory, TakesALastLineWithoutAnEnd)
+TEST_F(DriverInventory, ReadsALastLineWithoutALineEnd)
 {
     commands.answers = {{"lsmod", "loop 1 0"}, {"modinfo loop", "version: 1"}};
     EXPECT_EQ(only().getVersion(), "1");
@@ -332,7 +332,7 @@ TEST_F(DriverInventory, CompletesARecordStepByStep)
     EXPECT_EQ(recording.texts(), expected);
 }
 
-TEST_F(DriverInventory, DoesNotLookAtHowItsCommandsEnded)
+TEST_F(DriverInventory, IgnoresTheExitStatusOfItsCommands)
 {
     commands.answers = {{"lsmod", "loop 1 0\n"},
                         {"modinfo loop", "version: 1\ndescription: Disk\n"}};

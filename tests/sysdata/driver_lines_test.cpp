@@ -41,19 +41,19 @@ TEST(DriverLines, YieldTheFirstWordAsTheModule)
     EXPECT_EQ(word.text, "ext4");
 }
 
-TEST(DriverLines, PassOverBlanksAndTabsBeforeTheModule)
+TEST(DriverLines, SkipBlanksAndTabsBeforeTheModule)
 {
     EXPECT_EQ(wordOf(" \t ext4 823296 1\n").text, "ext4");
     EXPECT_EQ(wordOf("ext4\t823296\n").text, "ext4");
 }
 
-TEST(DriverLines, YieldAModuleWithoutAnythingBehindIt)
+TEST(DriverLines, YieldAModuleWithNothingAfterIt)
 {
     EXPECT_EQ(wordOf("ext4").text, "ext4");
     EXPECT_EQ(wordOf("ext4\n").text, "ext4");
 }
 
-TEST(DriverLines, YieldNoModuleWhereTheyAreBlank)
+TEST(DriverLines, YieldNoModuleIfTheyAreBlank)
 {
     EXPECT_FALSE(wordOf("\n").found);
     EXPECT_FALSE(wordOf("").found);
@@ -66,14 +66,14 @@ TEST(DriverLines, NeverOverflowTheModuleBuffer)
     EXPECT_EQ(wordOf(std::string(5000, 'a')).text, std::string(511, 'a'));
 }
 
-TEST(DriverHeader, IsToldByItsFirstSixCharactersAlone)
+TEST(DriverHeader, IsRecognisedByItsFirstSixCharacters)
 {
     EXPECT_TRUE(isHeader("Module"));
     EXPECT_TRUE(isHeader("Module_of_mine"));
     EXPECT_TRUE(isHeader("Modules"));
 }
 
-TEST(DriverHeader, IsNoOtherWord)
+TEST(DriverHeader, IsNotAnyOtherWord)
 {
     EXPECT_FALSE(isHeader("Modul"));
     EXPECT_FALSE(isHeader("module"));
@@ -81,7 +81,7 @@ TEST(DriverHeader, IsNoOtherWord)
     EXPECT_FALSE(isHeader(""));
 }
 
-TEST(DriverFacts, TakeTheVersionBehindTheBlanks)
+TEST(DriverFacts, TakeTheVersionAfterTheBlanks)
 {
     Facts facts;
     EXPECT_TRUE(facts.take("version:        7.3.21-k8-NAPI\n"));
@@ -90,7 +90,7 @@ TEST(DriverFacts, TakeTheVersionBehindTheBlanks)
     EXPECT_EQ(facts.seen.descriptions, 0U);
 }
 
-TEST(DriverFacts, TakeTheDescriptionBehindTheBlanks)
+TEST(DriverFacts, TakeTheDescriptionAfterTheBlanks)
 {
     Facts facts;
     EXPECT_TRUE(facts.take("description:    Intel(R) PRO/1000 Network Driver\n"));
@@ -106,14 +106,14 @@ TEST(DriverFacts, KeepBlanksAndCarriageReturnsAtTheEnd)
     EXPECT_EQ(facts.driver.getVersion(), "1.0  \r");
 }
 
-TEST(DriverFacts, TakeALineWithoutAnEnd)
+TEST(DriverFacts, TakeALineWithoutALineEnd)
 {
     Facts facts;
     facts.take("version: 1.0");
     EXPECT_EQ(facts.driver.getVersion(), "1.0");
 }
 
-TEST(DriverFacts, BeginAtTheFirstSpaceOfTheLineWhereverItStands)
+TEST(DriverFacts, BeginAtTheFirstSpaceOfTheLine)
 {
     Facts facts;
     EXPECT_TRUE(facts.take("version:1.0 beta 2\n"));
@@ -130,7 +130,7 @@ TEST(DriverFacts, AreNotTakenFromKeysThatMerelyEndInVersion)
     EXPECT_EQ(facts.driver.getVersion(), "");
 }
 
-TEST(DriverFacts, AreNotTakenFromKeysBehindABlank)
+TEST(DriverFacts, AreNotTakenFromKeysAfterABlank)
 {
     Facts facts;
     EXPECT_TRUE(facts.take(" version: 1.0\n"));
@@ -199,7 +199,7 @@ TEST(DriverCompletion, DefaultsWhatWasNeverSeen)
     EXPECT_EQ(facts.driver.getManufacturer(), "");
 }
 
-TEST(DriverCompletion, LeavesWhatWasSeenEvenWhenItIsEmpty)
+TEST(DriverCompletion, KeepsWhatWasSeenEvenIfItIsEmpty)
 {
     Facts facts;
     facts.take("version: 3\n");

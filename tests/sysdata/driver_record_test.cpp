@@ -53,7 +53,7 @@ TEST(DriverRecord, IsCopiedByValue)
     EXPECT_EQ(second.getName(), "xfs");
 }
 
-TEST(DriverRecord, LogsEntryAndExitOfGettersAndSettersAlone)
+TEST(DriverRecord, LogsOnlyEntryAndExitOfGettersAndSetters)
 {
     Recording recording;
     driverInfo driver;

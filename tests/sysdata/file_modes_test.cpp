@@ -1,4 +1,4 @@
-// The mode in which each file is opened, whatever it is opened for.
+// The mode in which each file is opened.
 
 #include "sysdata/groupInfo_linux.h"
 #include "sysdata/logInfo_linux.h"
@@ -21,7 +21,7 @@ namespace file_modes_test
 
 using Opened = std::set<std::string>;
 
-/** A machine with every file that is probed; notes path and mode of each that is opened. */
+/** A machine with every file that is probed; records path and mode of each file that is opened. */
 class FileModes : public testing::Test
 {
 protected:
@@ -32,7 +32,7 @@ protected:
         files_.write("/etc/group", "root:x:0:\n");
         files_.write("/etc/pam.d/login", "deny=3\n");
         files_.write("/var/log/messages", "line\n");
-        NQ::minMaxId::Instance(); // has read its file now
+        NQ::minMaxId::Instance(); // reads its file here
         commands_.otherwise = "";
         auto const below = libc::hooks().fopen.answer();
         libc::hooks().fopen = [this, below](char const* path, char const* mode) {
@@ -74,7 +74,7 @@ protected:
     NQ::OsInfo info_;
 };
 
-TEST_F(FileModes, OfTheListingsAreThreeKinds)
+TEST_F(FileModes, OfTheListingsAreRoOrR)
 {
     auto const list = [this] {
         std::vector<NQ::userInfo> users;
@@ -87,7 +87,7 @@ TEST_F(FileModes, OfTheListingsAreThreeKinds)
     EXPECT_EQ(openedBy(list), (Opened{"/etc/passwd|ro", "/etc/shadow|ro", "/etc/pam.d/login|r"}));
 }
 
-TEST_F(FileModes, OfASearchForReleaseFilesIsReading)
+TEST_F(FileModes, OfSearchedReleaseFilesAreR)
 {
     auto const search = [this] {
         searchReleaseFiles();
@@ -99,14 +99,14 @@ TEST_F(FileModes, OfASearchForReleaseFilesIsReading)
                       "/etc/release|r", "/etc/vmware-release|r"}));
 }
 
-TEST_F(FileModes, OfFoundReleaseFilesIsReading)
+TEST_F(FileModes, OfFoundReleaseFilesAreR)
 {
     haveReleaseFiles();
     EXPECT_EQ(openedBy([this] { searchReleaseFiles(); }),
               (Opened{"/etc/release|r", "/etc/SuSE-release|r", "/etc/UnitedLinux-release|r"}));
 }
 
-TEST_F(FileModes, OfTheProbesOfMethodsIsReading)
+TEST_F(FileModes, OfTheProbesOfMethodsAreR)
 {
     auto const probe = [this] {
         bool shadowing = false;
@@ -116,7 +116,7 @@ TEST_F(FileModes, OfTheProbesOfMethodsIsReading)
     EXPECT_EQ(openedBy(probe), (Opened{"/etc/redhat-release|r", "/etc/shadow|r"}));
 }
 
-TEST_F(FileModes, OfTheLogThatIsClearedIsWriting)
+TEST_F(FileModes, OfTheClearedLogIsW)
 {
     EXPECT_EQ(openedBy([] { NQ::logInfo().clearLog(); }), Opened{"/var/log/messages|w"});
 }

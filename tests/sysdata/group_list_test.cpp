@@ -59,7 +59,7 @@ TEST(GroupMachine, WithoutAnAccountFileHasTheGroupsOwnMembers)
     EXPECT_EQ(groupsOn("groups-without-passwd"), (Lines{"root 0", "team 1500 ben carl"}));
 }
 
-TEST(GroupMachine, WithoutLoginDefsListsTheGroupWithIdZeroAlone)
+TEST(GroupMachine, WithoutLoginDefsListsOnlyTheGroupWithIdZero)
 {
     EXPECT_EQ(groupsOn("groups-without-login-defs"), Lines{"root 0 root anna"});
 }
@@ -69,7 +69,7 @@ TEST(GroupMachine, WithNamesThatEndInOthersLosesTheShorterOnes)
     EXPECT_EQ(groupsOn("groups-name-endings"), Lines{"team 1500 xbob bobx bo carl"});
 }
 
-/** A machine with its own groups, whose database takes notes. */
+/** A machine with its own groups; calls of the group database are recorded. */
 class GroupListing : public testing::Test
 {
 protected:
@@ -218,7 +218,7 @@ TEST_F(GroupListing, ClosesAndUnlocksWhenAnExceptionPasses)
     EXPECT_EQ(steps_, (Lines{"setgrent", "endgrent"}));
     libc::hooks().getgrent = next;
     files_.write("/etc/group", "root:x:0:\n");
-    EXPECT_EQ(listed(), Lines{"root 0"}); // would wait for ever on a mutex still held
+    EXPECT_EQ(listed(), Lines{"root 0"}); // would hang if the mutex were still locked
 }
 
 TEST_F(GroupListing, IsEmptyOnAnEmptyDatabase)

@@ -27,7 +27,7 @@ std::string joined(std::string const& field, Names const& names)
     return withMembers(field, terminated(names).data());
 }
 
-/** The same, as plainly as it can be said: two searches of the whole field for each name. */
+/** The same in the plainest way: two searches of the whole field for each name. */
 std::string plainlyJoined(std::string field, Names const& names)
 {
     for (std::string const& name : names)
@@ -49,12 +49,12 @@ TEST(GroupMembers, AreNoneWithoutFieldAndNames)
     EXPECT_EQ(joined("", {}), "");
 }
 
-TEST(GroupMembers, AreTheFieldAloneWithoutNames)
+TEST(GroupMembers, AreTheFieldIfThereAreNoNames)
 {
     EXPECT_EQ(joined("anna,ben,", {}), "anna,ben");
 }
 
-TEST(GroupMembers, AreTheNamesAloneWithoutAField)
+TEST(GroupMembers, AreTheNamesIfThereIsNoField)
 {
     EXPECT_EQ(joined("", {"anna", "ben"}), "anna,ben");
 }
@@ -81,7 +81,7 @@ TEST(GroupMembers, HoldANameOnce)
     EXPECT_EQ(joined("anna,anna,", {}), "anna,anna");
 }
 
-TEST(GroupMembers, KeepTheCommaOfAnEmptyNameThatStandsAlone)
+TEST(GroupMembers, KeepTheCommaOfASingleEmptyName)
 {
     EXPECT_EQ(joined("", {""}), ",");
     EXPECT_EQ(joined(",", {}), ",");
@@ -93,7 +93,7 @@ TEST(GroupMembers, FindANameWithACommaAcrossListedOnes)
     EXPECT_EQ(joined("xa,b,", {"a,b", "b,a"}), "xa,b,b,a");
 }
 
-TEST(GroupMembers, AreThoseOfThePlainSearchForAnyNames)
+TEST(GroupMembers, MatchThePlainSearchForRandomNames)
 {
     std::mt19937 random(20101);
     auto const below = [&random](unsigned int limit) {

@@ -77,7 +77,7 @@ TEST(GroupRecord, TakesAccountsOfAnyUidAsPrimaryMembers)
     EXPECT_EQ(members(500, {}), Names{"daemon"});
 }
 
-TEST(GroupRecord, HasItsOwnMembersAloneWithoutAnAccountFile)
+TEST(GroupRecord, HasOnlyItsOwnMembersWithoutAnAccountFile)
 {
     FakeFiles const files;
     EXPECT_EQ(members(500, {"ben", "carl"}), (Names{"ben", "carl"}));
@@ -91,7 +91,7 @@ TEST(GroupRecord, LosesAMemberWhenAListedNameEndsInIt)
     EXPECT_EQ(members(500, {"bob", "bobx"}), (Names{"xbob", "bobx"}));
 }
 
-TEST(GroupRecord, StartsItsMembersAfresh)
+TEST(GroupRecord, ReplacesItsMembers)
 {
     FakeFiles const files;
     files.write("/etc/passwd", account("anna", 1000, 500));
@@ -106,7 +106,7 @@ TEST(GroupRecord, StartsItsMembersAfresh)
     EXPECT_EQ(group.getGroupMembers(), Names{"ben"});
 }
 
-TEST(GroupRecord, ReadsTheAccountFileInItsOwnMode)
+TEST(GroupRecord, OpensTheAccountFileInModeRo)
 {
     FakeFiles const files;
     files.write("/etc/passwd", account("anna", 1000, 500));

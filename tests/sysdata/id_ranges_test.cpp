@@ -35,7 +35,7 @@ unsigned int minUserId(std::string const& text)
 
 using Ids = std::vector<unsigned int>;
 
-TEST(IdRanges, ReadsTheFourKeysBehindOneBlank)
+TEST(IdRanges, ReadsTheFourKeysAfterOneBlank)
 {
     EXPECT_EQ(ids("UID_MIN 500\nUID_MAX 60000\nGID_MIN 500\nGID_MAX 60000\n"),
               (Ids{500, 60000, 500, 60000}));
@@ -63,13 +63,13 @@ TEST(IdRanges, SkipsFurtherTabsBeforeTheValue)
     EXPECT_EQ(minUserId("UID_MIN\t\t\t1000\n"), 1000U);
 }
 
-TEST(IdRanges, PassesOverTheByteAfterTheKeyUnseen)
+TEST(IdRanges, IgnoresTheByteAfterTheKey)
 {
     EXPECT_EQ(minUserId("UID_MIN=1000\n"), 1000U);
     EXPECT_EQ(minUserId("UID_MIN#1000\n"), 1000U);
 }
 
-TEST(IdRanges, LosesTheFirstDigitOfAValueRightBehindTheKey)
+TEST(IdRanges, LosesTheFirstDigitOfAValueRightAfterTheKey)
 {
     EXPECT_EQ(minUserId("UID_MIN1000\n"), 0U);
     EXPECT_EQ(minUserId("UID_MIN1234\n"), 234U);
@@ -81,7 +81,7 @@ TEST(IdRanges, MatchesAKeyWhateverFollowsIt)
     EXPECT_EQ(minUserId("UID_MIN 1000 and more\n"), 1000U);
 }
 
-TEST(IdRanges, IgnoresAKeyBehindAHashOrABlank)
+TEST(IdRanges, IgnoresAKeyAfterAHashOrABlank)
 {
     EXPECT_EQ(minUserId("#UID_MIN 1000\n"), 0U);
     EXPECT_EQ(minUserId(" UID_MIN 1000\n"), 0U);
@@ -89,7 +89,7 @@ TEST(IdRanges, IgnoresAKeyBehindAHashOrABlank)
     EXPECT_EQ(minUserId("SYS_UID_MIN 1000\n"), 0U);
 }
 
-TEST(IdRanges, TakesNoNoticeOfOtherLines)
+TEST(IdRanges, IgnoresOtherLines)
 {
     EXPECT_EQ(minUserId("# Range of ids\n\nUMASK 022\nUID_MI 7\nuid_min 8\nUID_MIN 1000\n"), 1000U);
 }
@@ -106,7 +106,7 @@ TEST(IdRanges, EndsAtAByte255)
     EXPECT_EQ(ids("UID_MIN 1000\nUMASK \xFF\nUID_MAX 60000\n"), (Ids{1000, 0, 0, 0}));
 }
 
-TEST(IdRanges, GoesOnBehindANulByte)
+TEST(IdRanges, ContinuesAfterANulByte)
 {
     EXPECT_EQ(ids(std::string("UID_MIN 1\0"
                               "2\nUID_MAX 60000\n",
@@ -138,7 +138,7 @@ TEST(IdRanges, CountsARepeatedKeyOnlyOnceTowardsTheFour)
     EXPECT_EQ(ids("UID_MIN 1\nUID_MIN 2\nUID_MAX 3\nGID_MIN 4\nGID_MAX 5\n"), (Ids{2, 3, 4, 5}));
 }
 
-TEST(IdRanges, KeepsTheEarlierValueWhenALaterOneIsNoNumber)
+TEST(IdRanges, KeepsTheEarlierValueIfALaterOneIsNotANumber)
 {
     EXPECT_EQ(minUserId("UID_MIN 500\nUID_MIN many\n"), 500U);
     EXPECT_EQ(minUserId("UID_MIN many\n"), 0U);
@@ -150,7 +150,7 @@ TEST(IdRanges, CountsAKeyWithoutANumberAsFound)
               (Ids{0, 60000, 500, 60000}));
 }
 
-TEST(IdRanges, TakesTheLargestId)
+TEST(IdRanges, ReadsTheLargestId)
 {
     EXPECT_EQ(ids("UID_MAX 4294967295\n"), (Ids{0, 4294967295, 0, 0}));
 }
@@ -167,7 +167,7 @@ TEST(IdRanges, AreZeroWithoutAFile)
     EXPECT_TRUE(log.records().empty());
 }
 
-TEST(IdRanges, TakesAFolderInPlaceOfTheFileForAnEmptyOne)
+TEST(IdRanges, TreatsADirectoryAsAnEmptyFile)
 {
     FakeFiles const files;
     files.write("/etc/login.defs/file", "");
@@ -191,7 +191,6 @@ TEST(IdRanges, ClosesTheFileItRead)
 
 TEST(IdRanges, IsReadOncePerProcess)
 {
-    // Other tests that reach the instance use the same ranges, so this holds in any company.
     FakeFiles const files;
     files.write("/etc/login.defs", "UID_MIN 500\nUID_MAX 60000\nGID_MIN 500\nGID_MAX 60000\n");
     minMaxId* const first = minMaxId::Instance();
@@ -204,7 +203,7 @@ TEST(IdRanges, IsReadOncePerProcess)
     EXPECT_EQ(second->getMaxGroupId(), 60000U);
 }
 
-TEST(IdRanges, HoldsTheLowestIdsAndThenTheHighestAndNothingElse)
+TEST(IdRanges, HasOnlyTheLowestIdsAndThenTheHighestAsFields)
 {
     FakeFiles const files;
     files.write("/etc/login.defs", "UID_MIN 1\nGID_MIN 2\nUID_MAX 3\nGID_MAX 4\n");

@@ -25,14 +25,14 @@ Stamp stampOf(char const* month)
     return stamp;
 }
 
-TEST(LogCount, StandsBeforeTheFileName)
+TEST(LogCount, IsReadBeforeTheFileName)
 {
     unsigned int count = 0;
     EXPECT_TRUE(findCount("120 /var/log/messages\n", count));
     EXPECT_EQ(count, 120U);
 }
 
-TEST(LogCount, MayStandAloneOrBehindBlanks)
+TEST(LogCount, MayBeAloneOrAfterBlanks)
 {
     unsigned int count = 0;
     EXPECT_TRUE(findCount("0", count));
@@ -99,7 +99,7 @@ TEST(LogToday, IsTheSecondWordAndTheLastNumber)
     EXPECT_EQ(today.year, 2026);
 }
 
-TEST(LogToday, StandsADayOfOneDigitAndMoreWordsInBetween)
+TEST(LogToday, AcceptsADayOfOneDigitAndMoreWords)
 {
     Today today;
     ASSERT_TRUE(findToday("Fri Jan  2 03:15:30 AM CET 2026\n", today));
@@ -155,7 +155,7 @@ TEST(LogYear, IsNotCorrectedForOtherMonthsOrSpellings)
     EXPECT_EQ(yearOf(stampOf("Dec"), todayOf(2026, "January")), 2026);
 }
 
-TEST(LogYear, StaysWhereThereIsNoneBefore)
+TEST(LogYear, IsKeptIfThereIsNoYearBefore)
 {
     EXPECT_EQ(yearOf(stampOf("Dec"), todayOf(0, "Jan")), 0);
     EXPECT_EQ(yearOf(stampOf("Dec"), todayOf(INT_MIN, "Jan")), INT_MIN);

@@ -43,7 +43,7 @@ long at(int year, int month, int day, int hour, int minute, int second)
     return static_cast<long>(timegm(&fields));
 }
 
-/** A log with one line, number 10, out of 10. */
+/** A log of 10 lines, of which only line 10 can be fetched. */
 class LogReader : public testing::Test
 {
 protected:
@@ -55,7 +55,7 @@ protected:
                             {"date", "Sat Nov 21 03:15:30 UTC 2026\n"}};
     }
 
-    /** A buffer of the length filled by getLog, all of it. */
+    /** The whole buffer of this length after getLog. */
     std::string fetched(unsigned int line, std::size_t length)
     {
         std::string buffer(length, '#');
@@ -81,12 +81,12 @@ protected:
     logInfo log;
 };
 
-TEST_F(LogReader, IsOneString)
+TEST_F(LogReader, HasTheSizeOfOneString)
 {
     EXPECT_EQ(sizeof(logInfo), sizeof(std::string));
 }
 
-TEST_F(LogReader, IsMadeAndGoneInSilence)
+TEST_F(LogReader, IsMadeAndDestroyedWithoutAMessage)
 {
     Recording const recording;
     {
@@ -117,7 +117,7 @@ TEST_F(LogReader, CountsNothingWhenWcCannotBeStarted)
     EXPECT_EQ(recording.texts(3000), (Lines{"getMaxLine: entry", "getMaxLine: exit"}));
 }
 
-TEST_F(LogReader, CountsNothingInOutputThatIsNoNumber)
+TEST_F(LogReader, CountsNothingInOutputThatIsNotANumber)
 {
     commands.answers[wc] = "what is this 10\n";
     Recording const recording;
@@ -140,7 +140,7 @@ TEST_F(LogReader, ReadsOnlyTheFirstLineOfWc)
     EXPECT_EQ(log.getMaxLine(), 3U);
 }
 
-TEST_F(LogReader, SpeaksUnderItsUnitAndCategory)
+TEST_F(LogReader, LogsUnderItsUnitAndCategory)
 {
     commands.answers.erase("date");
     Recording const recording;
@@ -205,10 +205,10 @@ TEST_F(LogReader, ReadsAMissingLineAsEmpty)
     EXPECT_EQ(recording.remarks(), Lines{"buffer = "});
 }
 
-TEST_F(LogReader, ReadsALineAsEmptyWhoseReadingBreaksOff)
+TEST_F(LogReader, ReadsALineAsEmptyIfReadingFails)
 {
     libc::hooks().fgets = [](char* buffer, int, FILE*) -> char* {
-        std::strcpy(buffer, "7 left over"); // nothing is said of the buffer after a failure
+        std::strcpy(buffer, "7 left over"); // after a failure the content is unspecified
         return nullptr;
     };
     EXPECT_EQ(log.getMaxLine(), 0U);
@@ -277,7 +277,7 @@ TEST_F(LogReader, NamesTheFirstCountAndRefusesByTheSecond)
     EXPECT_EQ(recording.texts(6000), Lines{"Invalid index: getMaxLine()=12, Index=12"});
 }
 
-TEST_F(LogReader, AcceptsTheIndexBehindTheOldestLineAsEmpty)
+TEST_F(LogReader, AcceptsTheIndexAfterTheOldestLineAsEmpty)
 {
     commands.answers[sed(0)] = "";
     EXPECT_EQ(data(11), "**");
@@ -291,7 +291,7 @@ TEST_F(LogReader, AcceptsTheIndexZeroAsEmpty)
     EXPECT_EQ(commands.ran.back(), "sed -n '11p' /var/log/messages");
 }
 
-TEST_F(LogReader, RefusesTheNextIndexAndLeavesTheTextAlone)
+TEST_F(LogReader, RefusesTheNextIndexAndKeepsTheText)
 {
     Recording const recording;
     std::string text = "before";
@@ -452,7 +452,7 @@ TEST_F(LogReader, FindsNoTimeInTheLinesThatItAcceptsBeyondTheLog)
     EXPECT_EQ(time, 5);
 }
 
-TEST_F(LogReader, FindsNoTimeInAnotherStampAndAsksForNoDate)
+TEST_F(LogReader, FindsNoTimeInAnotherStampAndRunsNoDate)
 {
     commands.answers[sed(10)] = "2026-11-20T10:11:12.000000+00:00 host sshd\n";
     Recording const recording;
@@ -463,7 +463,7 @@ TEST_F(LogReader, FindsNoTimeInAnotherStampAndAsksForNoDate)
     EXPECT_EQ(commands.ran, (Lines{wc, wc, wc, sed(10)}));
 }
 
-TEST_F(LogReader, LooksForATimeInFifteenCharactersAlone)
+TEST_F(LogReader, ReadsATimeFromFifteenCharactersOnly)
 {
     commands.answers[sed(10)] = "Nov  20 10:11:12 host\n"; // the last digit is the sixteenth
     EXPECT_EQ(timeOf(1), at(2026, 11, 20, 10, 11, 1));
@@ -472,7 +472,7 @@ TEST_F(LogReader, LooksForATimeInFifteenCharactersAlone)
     EXPECT_FALSE(log.getCreationTime(time, 1));
 }
 
-TEST_F(LogReader, DatesAnEntryToZeroWhenDateCannotBeStarted)
+TEST_F(LogReader, DatesAnEntryToZeroIfDateCannotBeStarted)
 {
     commands.answers.erase("date");
     Recording const recording;
@@ -493,7 +493,7 @@ TEST_F(LogReader, FindsNoTimeWhenDatePrintsAnotherForm)
     }
 }
 
-TEST_F(LogReader, DatesAnEntryToZeroWhereTheYearCannotBeConverted)
+TEST_F(LogReader, DatesAnEntryToZeroIfTheYearIsTooEarly)
 {
     commands.answers["date"] = "Sat Nov 21 03:15:30 UTC 1900\n";
     Recording const recording;
@@ -579,7 +579,7 @@ TEST_F(LogClearing, OpensTheLogForWritingAndClosesIt)
     EXPECT_EQ(fcntl(descriptor, F_GETFD), -1);
 }
 
-TEST_F(LogClearing, FailsInSilenceAndLeavesAFileThatCannotBeOpened)
+TEST_F(LogClearing, FailsWithoutAMessageIfTheFileCannotBeOpened)
 {
     files.write("/var/log/messages", "one\n");
     libc::hooks().fopen = [](char const*, char const*) -> FILE* { return nullptr; };
@@ -590,7 +590,7 @@ TEST_F(LogClearing, FailsInSilenceAndLeavesAFileThatCannotBeOpened)
     EXPECT_EQ(recording.texts(), (Lines{"clearLog: entry", "clearLog: exit"}));
 }
 
-TEST_F(LogClearing, FailsWhereThereIsNoPlaceForTheFile)
+TEST_F(LogClearing, FailsWithoutTheDirectory)
 {
     EXPECT_FALSE(logInfo().clearLog());
 }
@@ -601,7 +601,7 @@ std::string replaced(std::string text, char from, char to)
     return text;
 }
 
-TEST(LogStrreplace, LeavesTheFirstCharacterAsItIs)
+TEST(LogStrreplace, KeepsTheFirstCharacter)
 {
     EXPECT_EQ(replaced("-a-b-", '-', ' '), "-a b ");
     EXPECT_EQ(replaced("-", '-', ' '), "-");
@@ -614,7 +614,7 @@ TEST(LogStrreplace, StopsAtTheFirstReplacementByNul)
     EXPECT_EQ(std::string(text, 5), std::string("a\0cbd", 5));
 }
 
-TEST(LogStrreplace, LeavesAnEmptyTextAlone)
+TEST(LogStrreplace, KeepsAnEmptyText)
 {
     char text[] = {'\0', '-', '\0'};
     logInfo().strreplace(text, '-', ' ');
@@ -628,7 +628,7 @@ TEST(LogStrreplace, LogsEntryAndExit)
     EXPECT_EQ(recording.texts(3000), (Lines{"strreplace: entry", "strreplace: exit"}));
 }
 
-TEST_F(LogClearing, SpeaksUnderItsUnitAndCategory)
+TEST_F(LogClearing, LogsUnderItsUnitAndCategory)
 {
     files.write("/var/log/messages", "one\n");
     Recording const recording;
@@ -642,7 +642,7 @@ TEST_F(LogClearing, SpeaksUnderItsUnitAndCategory)
     }
 }
 
-TEST_F(LogReader, EndsEveryReadOfATimeWithItsExit)
+TEST_F(LogReader, LogsTheExitOfEveryReadOfATime)
 {
     auto const expectBothEnds = [this](unsigned int index) {
         Recording const recording;
@@ -678,7 +678,7 @@ TEST_F(LogReader, NeitherReadsNorWritesItsString)
     }
 }
 
-TEST_F(LogReader, DoesNotLookAtHowItsCommandsEnded)
+TEST_F(LogReader, IgnoresTheExitStatusOfItsCommands)
 {
     libc::hooks().pclose = [close = libc::hooks().pclose.answer()](FILE* stream) {
         close(stream);

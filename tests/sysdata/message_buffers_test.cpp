@@ -1,4 +1,4 @@
-// Every message is assembled in a buffer of the host's, fixed texts included.
+// Every message is assembled in its own buffer of the host, fixed texts included.
 
 #include "sysdata/driverInfo_linux.h"
 #include "sysdata/osInfo_linux.h"
@@ -11,7 +11,7 @@
 
 #include <algorithm>
 
-TEST(Messages, TakeABufferEach)
+TEST(Messages, UseOneBufferEach)
 {
     libc::HookGuard const guard;
     libc::hooks().popen = [](char const*, char const*) -> FILE* { return nullptr; };

@@ -1,4 +1,4 @@
-// The shell lines of each method, with each parameter in each place that matters.
+// The shell lines of each method, with each parameter in each relevant place.
 
 #include "tests/support/Lines.h"
 #include "tests/sysdata/MethodTest.h"
@@ -117,7 +117,7 @@ INSTANTIATE_TEST_SUITE_P(
 INSTANTIATE_TEST_SUITE_P(
     OfUserSetAttrib, MethodLines,
     testing::Values(
-        LineCase{"RemovesAnExpiryThatWasNotAskedFor",
+        LineCase{"RemovesAnExpiryThatIsNotGiven",
                  "UserSetAttrib,UserName:CMPI_string:jdoe,daysMustKeepPassword:CMPI_uint32:3",
                  {"/usr/bin/chage jdoe -m 3 -E -1 2>&1"}},
         LineCase{"KeepsTheOrderWritten",
@@ -134,7 +134,7 @@ INSTANTIATE_TEST_SUITE_P(
                  "UserSetAttrib,UserName:CMPI_string:jdoe,passwordExpirationDate:CMPI_dateTime:,"
                  "daysExpireAfter:CMPI_uint32:4",
                  {"/usr/bin/chage jdoe -E 2>&1"}},
-        LineCase{"TakesNumbersAsTheyStand",
+        LineCase{"TakesNumbersUnchanged",
                  "UserSetAttrib,UserName:CMPI_string:jdoe,daysExpireAfter:CMPI_uint32: 4 5",
                  {"/usr/bin/chage jdoe -I  4 5 -E -1 2>&1"}},
         LineCase{"TextsGoToTheMainList",
@@ -191,10 +191,10 @@ INSTANTIATE_TEST_SUITE_P(
 
 INSTANTIATE_TEST_SUITE_P(
     OfAnyMethod, MethodLines,
-    testing::Values(LineCase{"EchoTheCodeWhereverUseraddStandsInTheLine",
+    testing::Values(LineCase{"EchoTheCodeIfUseraddIsInTheLine",
                              "UserDel,UserName:CMPI_string:useradder",
                              {"/usr/sbin/userdel useradder 2>&1;echo rc=$? 2>&1"}},
-                    LineCase{"RunWithWhatStoodBeforeABlankParameter",
+                    LineCase{"RunWithTheParametersBeforeABlankOne",
                              "UserSetHomeDir,UserName:CMPI_string:jdoe,HomeDir:CMPI_string:",
                              {"/usr/sbin/usermod jdoe 2>&1"}}),
     nameOf);
@@ -212,14 +212,14 @@ TEST_F(Methods, AddUsersWithoutAGroupOnARedhatMachine)
     EXPECT_EQ(commands_.ran, (Lines{line, "/usr/bin/chage -E -1 jdoe 2>&1"}));
 }
 
-TEST_F(Methods, OpenTheRedhatReleaseFileForAddingUsersOnly)
+TEST_F(Methods, PassTheRedhatOptionToUseraddOnly)
 {
     files_.write("/etc/redhat-release", "");
     EXPECT_TRUE(call("UserDel,UserName:CMPI_string:jdoe"));
     EXPECT_EQ(commands_.ran, Lines{"/usr/sbin/userdel jdoe 2>&1"});
 }
 
-TEST_F(Methods, TakeTheOptionOfAnEmptyPathBackOutAgain)
+TEST_F(Methods, OmitTheOptionOfAnEmptyPath)
 {
     EXPECT_EQ(execute("UserSetHomeDir", {text("HomeDir", ""), text("ScriptPath", ""),
                                          text("Comment", "x"), text("UserName", "jdoe")}),
@@ -286,7 +286,7 @@ protected:
     }
 };
 
-TEST_F(Shadowing, IsReportedWhereTheShadowFileCanBeOpened)
+TEST_F(Shadowing, IsReportedIfTheShadowFileCanBeOpened)
 {
     files_.write("/etc/shadow", "");
     EXPECT_EQ(ask(), 0);
@@ -294,7 +294,7 @@ TEST_F(Shadowing, IsReportedWhereTheShadowFileCanBeOpened)
     EXPECT_EQ(commands_.ran, Lines());
 }
 
-TEST_F(Shadowing, IsNotReportedWhereItCannot)
+TEST_F(Shadowing, IsNotReportedWithoutAShadowFile)
 {
     shadowing_ = true;
     EXPECT_EQ(ask(), 0);
@@ -302,14 +302,7 @@ TEST_F(Shadowing, IsNotReportedWhereItCannot)
     EXPECT_EQ(commands_.ran, Lines());
 }
 
-TEST_F(Shadowing, IsWrittenByNoOtherMethod)
-{
-    shadowing_ = true;
-    EXPECT_EQ(NQ::OsInfo().executeMethod("UserDel", {text("UserName", "jdoe")}, shadowing_), 0);
-    EXPECT_TRUE(shadowing_);
-}
-
-TEST_F(Methods, SpeakUnderTheNamesThatHostsKnow)
+TEST_F(Methods, LogUnderTheNamesThatHostsKnow)
 {
     Recording const log;
     EXPECT_TRUE(call("UserDel,UserName:CMPI_string:jdoe"));
@@ -331,7 +324,7 @@ TEST_F(Methods, SpeakUnderTheNamesThatHostsKnow)
                "setCreateUser | OsNode::setCreateUser: exit"}));
 }
 
-TEST_F(Methods, SayWhenTheyLeaveOnEveryPath)
+TEST_F(Methods, LogTheirExitOnEveryPath)
 {
     for (char const* text : {"UserSetShell", "UserDel,A:CMPI_boolean:b", "GetShadowing",
                              "LocalGroupAddUser", "UserDel,UserName:CMPI_string:jdoe"}) {
@@ -344,14 +337,14 @@ TEST_F(Methods, SayWhenTheyLeaveOnEveryPath)
     }
 }
 
-TEST_F(Shadowing, MakesNoDifferenceToTheHost)
+TEST_F(Shadowing, DoesNotAffectTheResultOfACall)
 {
     EXPECT_TRUE(call("GetShadowing"));
     files_.write("/etc/shadow", "");
     EXPECT_TRUE(call("GetShadowing"));
 }
 
-TEST_F(Shadowing, IsLeftAloneByEveryOtherMethod)
+TEST_F(Shadowing, IsKeptByEveryOtherMethod)
 {
     for (bool const before : {true, false}) {
         for (char const* method :

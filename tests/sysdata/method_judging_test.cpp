@@ -27,12 +27,12 @@ protected:
     std::string const chageLine_ = "/usr/bin/chage -E -1 jdoe 2>&1";
 };
 
-TEST_F(Judging, TakesSilenceForSuccess)
+TEST_F(Judging, TreatsSilenceAsSuccess)
 {
     EXPECT_EQ(statusOf(""), 0);
 }
 
-TEST_F(Judging, TakesAnyOutputForFailure)
+TEST_F(Judging, TreatsAnyOutputAsFailure)
 {
     EXPECT_EQ(statusOf("userdel: user 'jdoe' does not exist\n"), 1);
     EXPECT_EQ(statusOf("\n"), 1);
@@ -40,7 +40,7 @@ TEST_F(Judging, TakesAnyOutputForFailure)
     EXPECT_EQ(statusOf(std::string("\0", 1)), 1);
 }
 
-TEST_F(Judging, TakesFourKnownBeginningsForSuccess)
+TEST_F(Judging, TreatsFourKnownBeginningsAsSuccess)
 {
     EXPECT_EQ(statusOf("Aging information changed"), 0);
     EXPECT_EQ(statusOf("Aging information changed.\n"), 0);
@@ -49,7 +49,7 @@ TEST_F(Judging, TakesFourKnownBeginningsForSuccess)
     EXPECT_EQ(statusOf("usermod: no changes\n"), 0);
 }
 
-TEST_F(Judging, KnowsThoseAtTheBeginningOnlyAndWhole)
+TEST_F(Judging, MatchesThoseWholeAndAtTheBeginningOnly)
 {
     EXPECT_EQ(statusOf(" Aging information changed\n"), 1);
     EXPECT_EQ(statusOf("userdel: no crontab for jdoe\n"), 1);
@@ -59,7 +59,7 @@ TEST_F(Judging, KnowsThoseAtTheBeginningOnlyAndWhole)
     EXPECT_EQ(statusOf("aging information changed\n"), 1);
 }
 
-TEST_F(Judging, TakesTheEchoedCodeForNoMethodButUserAdd)
+TEST_F(Judging, UsesTheEchoedCodeForUserAddOnly)
 {
     EXPECT_EQ(statusOf("rc=0\n"), 1);
 }
@@ -72,7 +72,7 @@ TEST_F(Judging, LogsTheOutput)
         log.has("outputBuffer: userdel: user jdoe is currently used by process 4711\n", 3000));
 }
 
-TEST_F(Judging, FailsWhereTheMainCommandCannotBeStarted)
+TEST_F(Judging, FailsIfTheMainCommandCannotBeStarted)
 {
     commands_.otherwise.reset();
     Recording const log;
@@ -80,7 +80,7 @@ TEST_F(Judging, FailsWhereTheMainCommandCannotBeStarted)
     EXPECT_EQ(log.texts(6000), Lines{"Cannot open process: /usr/sbin/userdel"});
 }
 
-TEST_F(Judging, TakesChageOnItsOwnForSuccessAfterUserSetAttrib)
+TEST_F(Judging, AcceptsTheNoticeOfChageForUserSetAttrib)
 {
     std::string const line = "/usr/bin/chage jdoe -m 3 -E -1 2>&1";
     commands_.answers[line] = "Aging information changed.\n";
@@ -88,7 +88,7 @@ TEST_F(Judging, TakesChageOnItsOwnForSuccessAfterUserSetAttrib)
     EXPECT_EQ(commands_.ran, Lines{line});
 }
 
-TEST_F(Judging, SetsTheAgeingOfANewUserIfUseraddSaysCode0)
+TEST_F(Judging, SetsTheAgeingOfANewUserIfUseraddPrintsCode0)
 {
     EXPECT_EQ(statusOf("rc=0\n", ""), 0);
     EXPECT_EQ(commands_.ran, (Lines{useraddLine_, chageLine_}));
@@ -99,13 +99,13 @@ TEST_F(Judging, AcceptsWarningsOfUseraddAboveItsCode)
     EXPECT_EQ(statusOf("useradd: warning: the home directory already exists.\nrc=0\n", ""), 0);
 }
 
-TEST_F(Judging, StopsWhereUseraddFails)
+TEST_F(Judging, StopsIfUseraddFails)
 {
     EXPECT_EQ(statusOf("useradd: user 'jdoe' already exists\nrc=9\n", ""), 1);
     EXPECT_EQ(commands_.ran, Lines{useraddLine_});
 }
 
-TEST_F(Judging, TakesWhatChageSaysOfANewUserForTheResult)
+TEST_F(Judging, JudgesUserAddByTheOutputOfChage)
 {
     EXPECT_EQ(statusOf("rc=0\n", "chage: invalid date\n"), 1);
     EXPECT_EQ(statusOf("rc=0\n", "Aging information changed\n"), 0);
@@ -115,7 +115,7 @@ TEST_F(Judging, TakesWhatChageSaysOfANewUserForTheResult)
     EXPECT_EQ(statusOf("rc=0\n", "rc=0\n"), 1);
 }
 
-TEST_F(Judging, FailsWhereTheAgingOfANewUserCannotBeStarted)
+TEST_F(Judging, FailsIfTheAgeingOfANewUserCannotBeStarted)
 {
     commands_.otherwise.reset();
     commands_.answers[useraddLine_] = "Aging information changed\nrc=0\n";
@@ -143,21 +143,21 @@ protected:
     }
 };
 
-TEST_F(SettingAPassword, DoesNotJudgeWhatPasswdSays)
+TEST_F(SettingAPassword, IgnoresTheOutputOfPasswd)
 {
     commands_.answers[passwdLine_] = "passwd: unrecognized option '--stdin'\n";
     EXPECT_EQ(setPassword(), 0);
     EXPECT_EQ(commands_.ran, (Lines{usermodLine_, passwdLine_}));
 }
 
-TEST_F(SettingAPassword, StopsWhereTheMainCommandFails)
+TEST_F(SettingAPassword, StopsIfTheMainCommandFails)
 {
     commands_.answers[usermodLine_] = "usermod: user 'jdoe' does not exist\n";
     EXPECT_EQ(setPassword(), 1);
     EXPECT_EQ(commands_.ran, Lines{usermodLine_});
 }
 
-TEST_F(SettingAPassword, GoesOnIfThereWasNothingElseToChange)
+TEST_F(SettingAPassword, ContinuesIfThereWasNothingElseToChange)
 {
     commands_.answers[usermodLine_] = "usermod: no changes\n";
     EXPECT_EQ(setPassword(), 0);
@@ -172,7 +172,7 @@ TEST_F(SettingAPassword, ComesBetweenTheTwoCommandsOfUserAdd)
     EXPECT_EQ(commands_.ran, (Lines{useraddLine, passwdLine_, chageLine_}));
 }
 
-TEST_F(SettingAPassword, IsDoneForAnyMethodThatBringsOne)
+TEST_F(SettingAPassword, IsDoneForAnyMethodWithAPassword)
 {
     EXPECT_EQ(execute("UserSetFullName", {text("UserName", "jdoe"), text("FullName", "J"),
                                           text("Password", "secret")}),
@@ -188,7 +188,7 @@ TEST_F(SettingAPassword, RunsNothingWithoutAUserName)
     EXPECT_EQ(log.texts(6000), Lines{"No user name for the password"});
 }
 
-TEST_F(Judging, OfANewUserTakesTheSameBeginningsAndTheCodeAnywhere)
+TEST_F(Judging, AcceptsBeginningsAndTheCodeAnywhereForUserAdd)
 {
     EXPECT_EQ(statusOf("no crontab for jdoe\nrc=9\n", ""), 0);
     EXPECT_EQ(statusOf("usermod: no changes\nrc=9\n", ""), 0);

@@ -10,7 +10,7 @@ using Params = std::vector<NQ::ParamInfo>;
 class MethodLimits : public MethodTest
 {
 protected:
-    /** That the call runs nothing and leaves one line at level 6000. */
+    /** Expects that the call runs nothing and logs one message at level 6000. */
     void expectRefused(std::string const& method, Params const& params, std::string const& program)
     {
         commands_.ran.clear();
@@ -55,7 +55,7 @@ TEST_F(MethodLimits, CountTheAccountNameThatUsermodTakesLast)
     expectRefused("UserSetHomeDir", params, "/usr/sbin/usermod");
 }
 
-TEST_F(MethodLimits, CountWhatClosesTheList)
+TEST_F(MethodLimits, CountTheClosingArguments)
 {
     Params params(36, text("GroupName", "g"));
     params.push_back(text("UserName", "jdoe"));
@@ -135,7 +135,7 @@ TEST_F(MethodLimits, HoldForTheAgingLineBeforeAnythingRuns)
     expectRefused("UserAdd", params, "/usr/bin/chage");
 }
 
-TEST_F(MethodLimits, DoNotCountWhatTheLineEndsBefore)
+TEST_F(MethodLimits, DoNotCountWhatFollowsAnEmptyArgument)
 {
     Params params(21, text("GroupName", std::string(254, 'x')));
     params.front().value.clear();
@@ -143,7 +143,7 @@ TEST_F(MethodLimits, DoNotCountWhatTheLineEndsBefore)
     expectRefused("LocalGroupAdd", Params(params.begin() + 1, params.end()), "/usr/sbin/groupadd");
 }
 
-TEST_F(MethodLimits, LeaveTheHostWithAFailure)
+TEST_F(MethodLimits, ReturnAFailureToTheHost)
 {
     EXPECT_FALSE(call("UserDel,UserName:CMPI_string:" + std::string(255, 'x')));
     EXPECT_EQ(commands_.ran, Lines());
@@ -199,7 +199,7 @@ TEST_F(MemberLimits, LetAMemberOf200GroupsJoinOneMore)
               (Lines{idLine_, "/usr/sbin/usermod -G " + list + "\"g\" \"jdoe\" 2>&1"}));
 }
 
-TEST_F(MemberLimits, KeepAMemberInGroupsThatIdHadNoRoomFor)
+TEST_F(MemberLimits, ChangeNothingIfTheOutputOfIdMayBeCut)
 {
     // One byte more would be cut off, and with it a group that usermod then takes away.
     std::string const ends = "uid=1000(jdoe) gid=100(users) groups=27()\n";

@@ -1,6 +1,5 @@
-// What an administration method leaves in the log, line by line. All that is withheld of a call
-// that carries a password: the tokens, the parameter's value, and that value within a tool's
-// output.
+// What an administration method logs, line by line. Of a call with a password, the tokens, the
+// parameter's value, and that value in a tool's output are withheld.
 
 #include "nodes/OsNode.h"
 #include "tests/support/Frame.h"
@@ -30,7 +29,7 @@ protected:
         return lines;
     }
 
-    /** What one call logs of what its tools print. */
+    /** The messages of one call about its tools' output. */
     Lines outputsOf(std::string const& method, Params const& params)
     {
         Recording const log;
@@ -111,7 +110,7 @@ TEST_F(MethodLog, WithholdsTokensAndValueOfAPassword)
 
 TEST_F(MethodLog, WithholdsTheTokensOfEveryItemBesideAPassword)
 {
-    // The piece after the comma is an item of its own, and no parameter.
+    // The piece after the comma is a separate item, and not a parameter.
     Lines const lines = linesOf("GetShadowing,Password:CMPI_string:Zq7,Wx9,A:CMPI_string:b");
     EXPECT_EQ(lines, executed(parsed({tokenizeEntry, tokenizeExit, said("method=GetShadowing"),
                                       tokenizeEntry, tokenizeExit, said("paramInfo.name=Password"),
@@ -135,7 +134,7 @@ TEST_F(MethodLog, JudgesEachItemByItselfWhenNoParameterIsAPassword)
                  {"3000 executeMethod | outputBuffer: "}));
 }
 
-TEST_F(MethodLog, TakesNoOtherNameForAPassword)
+TEST_F(MethodLog, TreatsNoOtherNameAsAPassword)
 {
     for (char const* name : {"daysMustKeepPassword", "Passwords", "password", "MyPassword"}) {
         Lines const lines =
@@ -146,7 +145,7 @@ TEST_F(MethodLog, TakesNoOtherNameForAPassword)
     }
 }
 
-TEST_F(MethodLog, TakesAMethodOfThatNameForNoParameter)
+TEST_F(MethodLog, DoesNotTreatAMethodOfThatNameAsAPassword)
 {
     EXPECT_EQ(linesOf("Password,A:CMPI_string:b"),
               executed(parsed({tokenizeEntry, tokenizeExit, said("method=Password"), tokenizeEntry,
@@ -156,7 +155,7 @@ TEST_F(MethodLog, TakesAMethodOfThatNameForNoParameter)
                        {"6000 executeMethod | Unknown method: Password"}));
 }
 
-TEST_F(MethodLog, WithholdsThePasswordOfAnyTextOrNumber)
+TEST_F(MethodLog, WithholdsAPasswordOfTextOrNumberType)
 {
     for (char const* type : {"CMPI_string", "CMPI_uint32"})
         EXPECT_EQ(linesOf(std::string("GetShadowing,Password:") + type + ":1234"),
@@ -166,7 +165,7 @@ TEST_F(MethodLog, WithholdsThePasswordOfAnyTextOrNumber)
                            {}));
 }
 
-TEST_F(MethodLog, HoldsADateWhateverItsName)
+TEST_F(MethodLog, HoldsADateEvenIfNamedPassword)
 {
     Lines const lines = linesOf("GetShadowing,Password:CMPI_dateTime:20101231000000.000000+000");
     EXPECT_EQ(lines.at(lines.size() - 5), said("paramInfo.value=2010-12-31"));
@@ -203,7 +202,7 @@ TEST_F(MethodLog, EndsAtADateThatCannotBeRead)
     EXPECT_EQ(linesOf("UserAdd,D:CMPI_dateTime:soon"), lines);
 }
 
-TEST_F(MethodLog, SaysNothingOfATextWithoutItems)
+TEST_F(MethodLog, HasNoParserLinesForATextWithoutItems)
 {
     Lines const parser = parsed({tokenizeEntry, tokenizeExit});
     EXPECT_EQ(linesOf(",,"), executed(parser, {"6000 executeMethod | Unknown method: "}));
@@ -231,7 +230,7 @@ TEST_F(MethodLog, NamesTheFunctionThatRanTheTool)
     EXPECT_EQ(linesIn(added).at(2), "3000 executeMethod | outputBuffer: rc=0\n"); // chage
 }
 
-TEST_F(MethodLog, NamesTheExecutorForATypeThatItDoesNotKnow)
+TEST_F(MethodLog, NamesTheExecutorForAnUnknownType)
 {
     Recording const log;
     EXPECT_EQ(execute("UserAdd", {{"Active", "CMPI_boolean", "true"}}), 1);
@@ -240,7 +239,7 @@ TEST_F(MethodLog, NamesTheExecutorForATypeThatItDoesNotKnow)
                                    "3000 executeMethod | OsNode::executeMethod: exit"}));
 }
 
-TEST_F(MethodLog, HoldsAToolsOutputAsItIs)
+TEST_F(MethodLog, HoldsAToolsOutputUnchanged)
 {
     for (char const* output : {"", "\n", "usermod: no changes", "usermod: no changes\n",
                                "sh: 1: Password: not found\n", "a\n\nb", "rc=12\nno newline"})
@@ -304,7 +303,7 @@ TEST_F(MethodLog, NeverHoldsThePasswordWhateverByteIsInIt)
 {
     for (int byte = 1; byte < 256; ++byte) {
         char const c = static_cast<char>(byte);
-        if (c == ',' || c == ':') // the rest is then no part of the password
+        if (c == ',' || c == ':') // what follows is not part of the password
             continue;
         std::string const password = std::string("Zq7") + c + "Wx9";
         commands_.otherwise = "sh: cannot read " + password + "\n";
@@ -334,7 +333,7 @@ TEST_F(MethodLog, NamesOnlyTheProgramOfALineThatCannotBeStarted)
     EXPECT_EQ(log.texts(6000), Lines{"Cannot open process: /usr/sbin/usermod"});
 }
 
-TEST_F(MethodLog, BeginsWithTheWrittenTextUnlessThatHoldsPassword)
+TEST_F(MethodLog, BeginsWithTheWrittenTextUnlessItHoldsPassword)
 {
     Frame frame;
     IC::OsNode node(9, 7, {7}, 17, 0);

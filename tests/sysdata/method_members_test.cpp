@@ -1,4 +1,4 @@
-// Adding members to groups and taking them out again.
+// Adding members to groups and removing them.
 
 #include "tests/sysdata/MethodTest.h"
 
@@ -25,7 +25,7 @@ protected:
         return change("LocalGroupDelUser", group);
     }
 
-    /** The line that sets this list of groups, after the one that asks for the present ones. */
+    /** The line that reads the present groups, and the one that sets this list. */
     Lines linesThatSet(std::string const& groups) const
     {
         return {idLine_, "/usr/sbin/usermod -G " + groups + " \"jdoe\" 2>&1"};
@@ -43,14 +43,14 @@ private:
 std::string const identityOfJdoe =
     "uid=1001(jdoe) gid=1001(jdoe) groups=1001(jdoe),27(sudo),100(users)\n";
 
-TEST_F(GroupMemberChanges, AreAddedAfterThePresentGroups)
+TEST_F(GroupMemberChanges, AddTheGroupAfterThePresentOnes)
 {
     identity(identityOfJdoe);
     EXPECT_EQ(add("staff"), 0);
     EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\""));
 }
 
-TEST_F(GroupMemberChanges, AreRemovedByLeavingTheGroupOut)
+TEST_F(GroupMemberChanges, RemoveTheGroupFromTheList)
 {
     identity(identityOfJdoe);
     EXPECT_EQ(remove("sudo"), 0);
@@ -64,14 +64,14 @@ TEST_F(GroupMemberChanges, KeepThePrimaryGroupAsTheOnlyOne)
     EXPECT_EQ(commands_.ran, linesThatSet("users"));
 }
 
-TEST_F(GroupMemberChanges, StayInGroupsWhoseNamesOnlyBeginAlike)
+TEST_F(GroupMemberChanges, KeepGroupsWhoseNamesOnlyBeginAlike)
 {
     identity("uid=1001(jdoe) gid=100(users) groups=100(users),27(sudo),28(sudoers),29(su)\n");
     EXPECT_EQ(remove("sudo"), 0);
     EXPECT_EQ(commands_.ran, linesThatSet("users,\"users\",\"sudoers\",\"su\""));
 }
 
-TEST_F(GroupMemberChanges, KeepThePrimaryGroupEvenIfItIsToLeave)
+TEST_F(GroupMemberChanges, KeepThePrimaryGroupEvenIfItIsRemoved)
 {
     identity(identityOfJdoe);
     EXPECT_EQ(remove("jdoe"), 0);
@@ -102,28 +102,28 @@ TEST_F(GroupMemberChanges, KeepSuchAPrimaryGroupWhenAdded)
     EXPECT_EQ(commands_.ran, linesThatSet("#jdoe,\"sudo\",\"users\""));
 }
 
-TEST_F(GroupMemberChanges, AreReadAfterEqualsInOtherLanguages)
+TEST_F(GroupMemberChanges, FindTheListInOtherLanguages)
 {
     identity("uid=1001(jdoe) gid=100(users) Gruppen=100(users),27(sudo)\n");
     EXPECT_EQ(add("staff"), 0);
     EXPECT_EQ(commands_.ran, linesThatSet("users,\"users\",\"sudo\",\"staff\""));
 }
 
-TEST_F(GroupMemberChanges, MayBeInNoGroupButThePrimaryOne)
+TEST_F(GroupMemberChanges, WorkForAMemberOfOnlyThePrimaryGroup)
 {
     identity("uid=1001(jdoe) gid=100(users)\n");
     EXPECT_EQ(add("staff"), 0);
     EXPECT_EQ(commands_.ran, linesThatSet("users,\"staff\""));
 }
 
-TEST_F(GroupMemberChanges, AreReadAfterTheWordGroups)
+TEST_F(GroupMemberChanges, FindTheListAfterTheWordGroups)
 {
     identity("uid=1001(jdoe) gid=100(users) egid=5(tty) groups=27(sudo)\n");
     EXPECT_EQ(add("staff"), 0);
     EXPECT_EQ(commands_.ran, linesThatSet("users,\"sudo\",\"staff\""));
 }
 
-TEST_F(GroupMemberChanges, MayHaveAPrimaryGroupWithoutAName)
+TEST_F(GroupMemberChanges, WorkForAPrimaryGroupWithoutAName)
 {
     identity("uid=1001(jdoe) gid=5000\n");
     EXPECT_EQ(add("staff"), 0);
@@ -143,14 +143,14 @@ TEST_F(GroupMemberChanges, KeepAUserInItsOnlyNamedGroup)
     EXPECT_EQ(commands_.ran, (Lines{idLine_, line}));
 }
 
-TEST_F(GroupMemberChanges, AreNotTakenFromACutOffName)
+TEST_F(GroupMemberChanges, IgnoreACutOffName)
 {
     identity("uid=1001(jdoe) gid=100(us");
     EXPECT_EQ(add("staff"), 0);
     EXPECT_EQ(commands_.ran, linesThatSet("\"staff\""));
 }
 
-TEST_F(GroupMemberChanges, MayHaveNamesThatHoldTheWordsLookedFor)
+TEST_F(GroupMemberChanges, WorkForNamesThatHoldTheSearchedWords)
 {
     commands_.answers["/usr/bin/id \"groupsgid\" 2>&1"] =
         "uid=1001(groupsgid) gid=1002(groups) groups=1002(groups),27(gid=)\n";
@@ -161,7 +161,7 @@ TEST_F(GroupMemberChanges, MayHaveNamesThatHoldTheWordsLookedFor)
                                     " \"groupsgid\" 2>&1");
 }
 
-TEST_F(GroupMemberChanges, AreLeftAloneWhereIdKnowsNothing)
+TEST_F(GroupMemberChanges, AreNotMadeIfIdKnowsNothing)
 {
     for (char const* output : {"", "id: jdoe: No such user\n", "uid=1(jdoe)\n",
                                "id: gid: No such user\n", "id: 'jdoe': no such user\n"}) {
@@ -171,14 +171,14 @@ TEST_F(GroupMemberChanges, AreLeftAloneWhereIdKnowsNothing)
     }
 }
 
-TEST_F(GroupMemberChanges, AreLeftAloneWhereIdCannotBeStarted)
+TEST_F(GroupMemberChanges, AreNotMadeIfIdCannotBeStarted)
 {
     commands_.otherwise.reset();
     EXPECT_EQ(add("staff"), 1);
     EXPECT_EQ(commands_.ran, Lines{idLine_});
 }
 
-TEST_F(GroupMemberChanges, FailWhereUsermodSaysAnything)
+TEST_F(GroupMemberChanges, FailIfUsermodPrintsAnything)
 {
     identity(identityOfJdoe);
     commands_.answers[linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\"").at(1)] =
@@ -194,7 +194,7 @@ TEST_F(GroupMemberChanges, SucceedForThePrimaryGroup)
     EXPECT_EQ(remove("jdoe"), 0);
 }
 
-TEST_F(GroupMemberChanges, FailWhereUsermodCannotBeStarted)
+TEST_F(GroupMemberChanges, FailIfUsermodCannotBeStarted)
 {
     identity(identityOfJdoe);
     commands_.otherwise.reset();
@@ -214,13 +214,13 @@ TEST_F(GroupMemberChanges, TakeTheirNamesFromTextParametersOnly)
     EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"my staff\""));
 }
 
-TEST_F(GroupMemberChanges, AreQuotedAlsoWhereNoneIsGiven)
+TEST_F(GroupMemberChanges, QuoteAMemberThatIsNotGiven)
 {
     EXPECT_EQ(execute("LocalGroupAddUser", {}), 1);
     EXPECT_EQ(commands_.ran, Lines{"/usr/bin/id \"\" 2>&1"});
 }
 
-TEST_F(GroupMemberChanges, AreRemovedByAnyMethodButTheOneThatAdds)
+TEST_F(GroupMemberChanges, RemoveForAnyMethodButTheOneThatAdds)
 {
     identity(identityOfJdoe);
     NQ::OsInfo info;
@@ -229,7 +229,7 @@ TEST_F(GroupMemberChanges, AreRemovedByAnyMethodButTheOneThatAdds)
     EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"users\""));
 }
 
-TEST_F(GroupMemberChanges, AreChangedThroughAMethodCallToo)
+TEST_F(GroupMemberChanges, AreMadeByAMethodCall)
 {
     identity(identityOfJdoe);
     EXPECT_TRUE(call("LocalGroupDelUser,LocalGroupName:CMPI_string:users,"
@@ -237,7 +237,7 @@ TEST_F(GroupMemberChanges, AreChangedThroughAMethodCallToo)
     EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\""));
 }
 
-TEST_F(GroupMemberChanges, LeaveALogOfWhatTheToolsSaid)
+TEST_F(GroupMemberChanges, LogTheOutputOfTheTools)
 {
     identity(identityOfJdoe);
     Recording const log;
@@ -250,7 +250,7 @@ TEST_F(GroupMemberChanges, LeaveALogOfWhatTheToolsSaid)
                "OsNode::executeMethod: exit"}));
 }
 
-TEST_F(GroupMemberChanges, AreListedTwiceWhereTheyAreAddedAgain)
+TEST_F(GroupMemberChanges, ListAGroupTwiceIfItIsAddedAgain)
 {
     identity(identityOfJdoe);
     EXPECT_EQ(add("sudo"), 0);

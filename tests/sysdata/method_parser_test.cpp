@@ -16,7 +16,7 @@ namespace method_parser_test
 
 using NQ::ParamInfo;
 
-/** The outcome of one parse; method and parameters as they were before where nothing was set. */
+/** The outcome of one parse; method and parameters are unchanged if nothing was set. */
 struct Parsed {
     explicit Parsed(std::string const& text)
     {
@@ -31,7 +31,7 @@ struct Parsed {
     Lines params;
 };
 
-/** What the parser itself says about a text, entry and exit lines included. */
+/** What the parser itself logs about a text, entry and exit included. */
 Lines said(std::string const& text)
 {
     Recording const log;
@@ -75,7 +75,7 @@ TEST(MethodParser, SplitsATextIntoTheMethodAndItsParameters)
     EXPECT_EQ(parsed.params, (Lines{"UserName|CMPI_string|jdoe", "Comment|CMPI_string|Test"}));
 }
 
-TEST(MethodParser, ConvertsDatesOnTheWay)
+TEST(MethodParser, ConvertsDates)
 {
     Parsed const parsed("UserSetAttrib,UserName:CMPI_string:jdoe,passwordExpirationDate:"
                         "CMPI_dateTime:20101231000000.000000+000");
@@ -85,7 +85,7 @@ TEST(MethodParser, ConvertsDatesOnTheWay)
                                     "passwordExpirationDate|CMPI_dateTime|2010-12-31"}));
 }
 
-TEST(MethodParser, LeavesTheMethodAsItWasWhereThereAreNoItems)
+TEST(MethodParser, KeepsTheMethodIfThereAreNoItems)
 {
     for (char const* text : {"", ",", ",,,"}) {
         Parsed const parsed(text);
@@ -121,7 +121,7 @@ TEST(MethodParser, IgnoresPartsBeyondTheThird)
     EXPECT_EQ(parsed.params, Lines{"Comment|CMPI_string|12"});
 }
 
-TEST(MethodParser, TakesEveryByteButTheSeparatorsForAPartOfAValue)
+TEST(MethodParser, AcceptsEveryByteButTheSeparatorsInAValue)
 {
     std::string value;
     for (int byte = 1; byte < 256; ++byte)
@@ -144,7 +144,7 @@ TEST(MethodParser, AppendsToTheList)
     EXPECT_EQ(params[1].name, "UserName");
 }
 
-TEST(MethodParser, DoesNotCheckThatANumberIsOne)
+TEST(MethodParser, DoesNotCheckThatANumberIsNumeric)
 {
     Parsed const parsed("UserSetAttrib,daysExpireAfter:CMPI_uint32:soon");
     EXPECT_EQ(parsed.status, 0);
@@ -172,7 +172,7 @@ TEST(MethodParser, StopsQuietlyAtABlankNumber)
     EXPECT_EQ(parsed.params, Lines());
 }
 
-TEST(MethodParser, TakesAnItemThatIsNoParameterForABlankOne)
+TEST(MethodParser, TreatsAnItemThatIsNotAParameterAsBlank)
 {
     for (char const* item : {"Comment", "Comment:", "::", ":"}) {
         std::string const text =
@@ -187,7 +187,7 @@ TEST(MethodParser, TakesAnItemThatIsNoParameterForABlankOne)
     }
 }
 
-TEST(MethodParser, GoesOnAfterABlankDate)
+TEST(MethodParser, ContinuesAfterABlankDate)
 {
     std::string const text = "UserSetAttrib,passwordExpirationDate:CMPI_dateTime:,"
                              "UserName:CMPI_string:jdoe";
@@ -229,7 +229,7 @@ INSTANTIATE_TEST_SUITE_P(Of, UnreadableDate,
                                          "20101231000000.000000", "20101231000000.000000+",
                                          "20101231000000.000000*000", "2010123.000000+000"));
 
-TEST_P(UnreadableDate, RejectsTheTextAndKeepsWhatStoodBefore)
+TEST_P(UnreadableDate, RejectsTheTextAndKeepsEarlierParameters)
 {
     std::string const text = std::string("UserAdd,UserName:CMPI_string:jdoe,"
                                          "passwordExpirationDate:CMPI_dateTime:") +
@@ -244,7 +244,7 @@ TEST_P(UnreadableDate, RejectsTheTextAndKeepsWhatStoodBefore)
                       "paramInfo.type=CMPI_dateTime"}));
 }
 
-TEST(MethodParser, RejectsAnUnknownTypeAndKeepsWhatStoodBefore)
+TEST(MethodParser, RejectsAnUnknownTypeAndKeepsEarlierParameters)
 {
     std::string const text = "UserAdd,UserName:CMPI_string:jdoe,Active:CMPI_boolean:true,"
                              "Comment:CMPI_string:Test";
@@ -256,7 +256,7 @@ TEST(MethodParser, RejectsAnUnknownTypeAndKeepsWhatStoodBefore)
     EXPECT_EQ(log.texts().back(), "OsNode::parseMethodAndParams: exit");
 }
 
-TEST(MethodParser, SpeaksOnItsOwnLogger)
+TEST(MethodParser, LogsUnderItsUnitAndCategory)
 {
     Recording const log;
     Parsed const parsed("UserAdd,Active:CMPI_boolean:true");
@@ -298,7 +298,7 @@ TEST(MethodParser, RejectsAnUnknownTypeAlsoWithoutAValue)
     }
 }
 
-TEST(MethodParser, ReadsDatesAsTheTwoScanningFormsDo)
+TEST(MethodParser, ReadsDatesByTheTwoScanningFormats)
 {
     std::string const head = "passwordExpirationDate|CMPI_dateTime|";
     EXPECT_EQ(dateOf("2010 1 2 3.4+5"), head + "2010-1-2");
@@ -319,14 +319,14 @@ TEST(MethodParser, KnowsNoQuotesAndNoEscapes)
               (Lines{"Comment|CMPI_string|\"a", "Colour|CMPI_string|b\""}));
 }
 
-TEST(MethodParser, SaysThatANumberIsBlank)
+TEST(MethodParser, LogsThatANumberIsBlank)
 {
     EXPECT_EQ(said("UserSetAttrib,daysExpireAfter:CMPI_uint32:"),
               inside({"method=UserSetAttrib", "paramInfo.name=daysExpireAfter",
                       "paramInfo.type=CMPI_uint32", "This parameter is blank ---exiting "}));
 }
 
-TEST(MethodParser, SpeaksAtLevel3000AsLongAsItRejectsNothing)
+TEST(MethodParser, LogsAtLevel3000IfItRejectsNothing)
 {
     Recording const log;
     Parsed const parsed("UserAdd,UserName:CMPI_string:jdoe,D:CMPI_dateTime:"

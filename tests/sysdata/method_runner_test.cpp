@@ -31,7 +31,7 @@ protected:
         return output_.data();
     }
 
-    std::array<char, bufferSize + 1> output_{}; // the last byte is not the runner's
+    std::array<char, bufferSize + 1> output_{}; // the runner must not write the last byte
 };
 
 TEST_F(ExecuteCommand, JoinsTheProgramAndItsArgumentsByBlanks)
@@ -87,7 +87,7 @@ TEST_F(ExecuteCommand, ReportsASingleByteAndSilence)
     EXPECT_EQ(said(), "\n");
 }
 
-TEST_F(ExecuteCommand, WritesNothingBehindTheOutput)
+TEST_F(ExecuteCommand, WritesNothingAfterTheOutput)
 {
     output_.fill('#');
     commands_.otherwise = "abc";
@@ -95,7 +95,7 @@ TEST_F(ExecuteCommand, WritesNothingBehindTheOutput)
     EXPECT_EQ(std::string(output_.begin(), output_.begin() + 6), std::string("abc\0##", 6));
 }
 
-TEST_F(ExecuteCommand, FailsWhereThePipeCannotBeOpened)
+TEST_F(ExecuteCommand, FailsIfThePipeCannotBeOpened)
 {
     commands_.otherwise.reset();
     output_.fill('#');
@@ -105,7 +105,7 @@ TEST_F(ExecuteCommand, FailsWhereThePipeCannotBeOpened)
     EXPECT_EQ(log.texts(6000), Lines{"Cannot open process: /bin/one"});
 }
 
-TEST_F(ExecuteCommand, DoesNotLookAtHowTheCommandEnded)
+TEST_F(ExecuteCommand, IgnoresTheExitStatusOfTheCommand)
 {
     libc::hooks().pclose = [](FILE* stream) {
         std::fclose(stream);
@@ -173,7 +173,7 @@ TEST_F(ExecuteCommand, CountsTheEchoedCodeAsPartOfTheLine)
     EXPECT_EQ(commands_.ran.size(), 1U);
 }
 
-TEST_F(ExecuteCommand, SaysThatItCameAndWent)
+TEST_F(ExecuteCommand, LogsItsEntryAndExit)
 {
     Recording const log;
     run("/bin/one", {});
@@ -213,7 +213,7 @@ TEST_F(PasswordEncryption, RunsNothingWithoutAUserName)
     EXPECT_EQ(log.texts(6000), Lines{"No user name for the password"});
 }
 
-TEST_F(PasswordEncryption, IsLimitedByTheRunnersBufferAlone)
+TEST_F(PasswordEncryption, IsLimitedOnlyByTheRunnersBuffer)
 {
     std::string const ends = "echo  | /usr/bin/passwd jdoe --stdin 2>&1";
     std::string const longest(4999 - ends.size(), 'x');

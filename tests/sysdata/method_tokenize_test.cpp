@@ -24,7 +24,7 @@ TEST(Tokenize, AppendsEveryRunThatHoldsNoDelimiterInOrder)
     EXPECT_EQ(tokens("one,two,three", ","), (Lines{"one", "two", "three"}));
 }
 
-TEST(Tokenize, TakesEveryCharacterOfTheSetAsDelimiter)
+TEST(Tokenize, SplitsAtEveryCharacterOfTheSet)
 {
     EXPECT_EQ(tokens("one:two,three:,four", ",:"), (Lines{"one", "two", "three", "four"}));
 }
@@ -34,13 +34,13 @@ TEST(Tokenize, MakesNoEmptyTokensOfRunsAndEnds)
     EXPECT_EQ(tokens(",,one,,,two,", ","), (Lines{"one", "two"}));
 }
 
-TEST(Tokenize, FindsNothingInAnEmptyTextOrInDelimitersAlone)
+TEST(Tokenize, FindsNothingInAnEmptyTextOrOnlyDelimiters)
 {
     EXPECT_EQ(tokens("", ","), Lines());
     EXPECT_EQ(tokens(",,,", ","), Lines());
 }
 
-TEST(Tokenize, YieldsTheWholeTextWhereNoDelimiterIsInIt)
+TEST(Tokenize, YieldsTheWholeTextIfItHoldsNoDelimiter)
 {
     EXPECT_EQ(tokens("one two", ","), Lines{"one two"});
     EXPECT_EQ(tokens("one,two", ""), Lines{"one,two"});
@@ -101,7 +101,7 @@ TEST(Tokenize, LogsATextThatHoldsPasswordInLowerCaseOnly)
     EXPECT_EQ(log.remarks(), Lines{"str.substr(lastPos, pos - lastPos) = password"});
 }
 
-/** How many tokens the list holds when each of them is logged. */
+/** Records how many tokens the list holds when each of them is logged. */
 class CountAtLog : public mihost::LogSink
 {
 public:

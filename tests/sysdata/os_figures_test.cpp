@@ -28,7 +28,7 @@ public:
     {
         libc::hooks().sysinfo = [this](Figures* out) {
             ++calls;
-            // What a failed call leaves behind is anybody's guess, so it is not to be looked at.
+            // A failed call may leave anything here, so it must not be used.
             *out = figures;
             return fails ? -1 : 0;
         };
@@ -97,7 +97,7 @@ class OsInfoRam : public testing::TestWithParam<RamCase>
 protected:
     unsigned int of(unsigned long amount, unsigned int memoryUnit)
     {
-        // Every other field holds a figure that would show.
+        // Every other field has a value that would be noticed.
         kernel_.figures.totalram = kernel_.figures.freeram = 11 << 20;
         kernel_.figures.totalhigh = kernel_.figures.bufferram = 13 << 20;
         GetParam().field(kernel_.figures) = amount;
@@ -135,14 +135,14 @@ TEST_P(OsInfoRam, IsFourTimesTheFieldWhenTheUnitIs4096)
     EXPECT_EQ(of(123456, 4096), 4U * 123456U);
 }
 
-TEST_P(OsInfoRam, DropsWhatTheUnitHasOverWholeKibibytes)
+TEST_P(OsInfoRam, RoundsTheUnitDownToWholeKibibytes)
 {
     EXPECT_EQ(of(100, 1025), 100U);
     EXPECT_EQ(of(100, 2047), 100U);
     EXPECT_EQ(of(100, 2048), 200U);
 }
 
-TEST_P(OsInfoRam, IsUnknownForAUnitOfZeroOrBetween2And1023)
+TEST_P(OsInfoRam, IsNotWrittenForAUnitOfZeroOrBetween2And1023)
 {
     for (unsigned int const memoryUnit : {0U, 2U, 512U, 1023U})
         EXPECT_EQ(of(123456, memoryUnit), untouched) << memoryUnit;
@@ -156,7 +156,7 @@ TEST_P(OsInfoRam, WrapsAt32Bits)
     EXPECT_EQ(of(3, 0x80000000), 0x600000U);
 }
 
-TEST_P(OsInfoRam, IsZeroAndSaysSoWhenTheKernelDoesNotAnswer)
+TEST_P(OsInfoRam, IsZeroAndLogsThatSysinfoFailed)
 {
     kernel_.fails = true;
     Recording const log;
@@ -168,7 +168,7 @@ TEST_P(OsInfoRam, IsZeroAndSaysSoWhenTheKernelDoesNotAnswer)
         EXPECT_EQ(record.function, function);
 }
 
-TEST_P(OsInfoRam, SaysNothingOfItsOwnOtherwise)
+TEST_P(OsInfoRam, LogsNoRemarkOtherwise)
 {
     Recording const log;
     of(123456, 1);
@@ -176,7 +176,7 @@ TEST_P(OsInfoRam, SaysNothingOfItsOwnOtherwise)
     EXPECT_TRUE(log.remarks().empty());
 }
 
-TEST_P(OsInfoRam, AsksTheKernelOnceForEachRead)
+TEST_P(OsInfoRam, CallsSysinfoOnceForEachRead)
 {
     of(1024, 1);
     of(1024, 1);
@@ -216,7 +216,7 @@ INSTANTIATE_TEST_SUITE_P(
                     FigureCase{&OsInfo::getProcessCount, "getProcessCount", 65535}),
     [](auto const& test) { return std::string(test.param.function); });
 
-TEST_P(OsInfoFigure, IsWhatTheKernelReportsWhateverTheMemoryUnit)
+TEST_P(OsInfoFigure, IgnoresTheMemoryUnit)
 {
     for (unsigned int const memoryUnit : {0U, 1U, 512U, 1024U, 4096U}) {
         kernel_.figures.mem_unit = memoryUnit;
@@ -225,7 +225,7 @@ TEST_P(OsInfoFigure, IsWhatTheKernelReportsWhateverTheMemoryUnit)
     EXPECT_EQ(kernel_.calls, 5);
 }
 
-TEST_P(OsInfoFigure, IsZeroWithoutAnAnswerOfTheKernel)
+TEST_P(OsInfoFigure, IsZeroIfSysinfoFails)
 {
     kernel_.fails = true;
     Recording const log;
@@ -243,7 +243,7 @@ TEST(OsInfoLastBootTime, IsTheClockLessTheUptime)
     EXPECT_EQ(out, 1273658825);
 }
 
-TEST(OsInfoLastBootTime, FailsWithoutAnAnswerOfTheKernel)
+TEST(OsInfoLastBootTime, FailsIfSysinfoFails)
 {
     Kernel kernel;
     kernel.fails = true;
@@ -263,7 +263,7 @@ TEST_P(OsInfoRam, IsShiftedBeforeItIsCutTo32Bits)
     }
 }
 
-TEST_P(OsInfoRam, GoesToBothLogsBeforeItIsZero)
+TEST_P(OsInfoRam, LogsItsFailureToBothLogsBeforeItIsZero)
 {
     using Operation = mihost::LogMessage::Operation;
     kernel_.fails = true;
@@ -287,7 +287,7 @@ TEST_P(OsInfoRam, GoesToBothLogsBeforeItIsZero)
     EXPECT_TRUE(sink.seen[1] == std::pair(Operation::Trace, untouched));
 }
 
-TEST(OsInfoLastBootTime, AsksTheKernelAndTheClockAgainEachTime)
+TEST(OsInfoLastBootTime, ReadsSysinfoAndTheClockEachTime)
 {
     Kernel kernel;
     time_t now = 1273659825;
@@ -303,9 +303,9 @@ TEST(OsInfoLastBootTime, AsksTheKernelAndTheClockAgainEachTime)
     EXPECT_EQ(kernel.calls, 2);
 }
 
-TEST(OsInfoFixedValues, ConsultNeitherFilesNorCommandsNorTheClock)
+TEST(OsInfoFixedValues, UseNoFilesCommandsOrClock)
 {
-    Kernel const kernel; // whose guard takes the hooks away
+    Kernel const kernel; // its guard removes the hooks
     int asked = 0;
     auto const open = [&asked](char const*, char const*) -> FILE* {
         ++asked;

@@ -64,7 +64,7 @@ TEST_F(InstallDate, IsTheReleaseFilesLastStatusChange)
     EXPECT_EQ(commands_.modes, std::vector<std::string>{"r"});
 }
 
-TEST_F(InstallDate, IsReadAsLocalTimeWhateverTheZoneOffsetSays)
+TEST_F(InstallDate, IsReadAsLocalTimeWhateverTheZoneOffset)
 {
     setenv("TZ", "CET-1CEST,M3.5.0,M10.5.0/3", 1);
     EXPECT_EQ(dateOf("Change: 2010-05-12 10:23:45.999999999 +0900\n"), may2010 - 2 * hour);
@@ -91,7 +91,7 @@ TEST_F(InstallDate, ComesFromTheCommandOfTheFirstFileThereIs)
     EXPECT_EQ(date(), 0);
 }
 
-TEST_F(InstallDate, TakesNoNoticeOfOtherReleaseFiles)
+TEST_F(InstallDate, IgnoresOtherReleaseFiles)
 {
     files_.write("/etc/release", "a line\n");
     files_.write("/etc/vmware-release", "a line\n");
@@ -124,7 +124,7 @@ TEST_F(InstallDate, IsZeroWhenTheLineHoldsNoDate)
     EXPECT_EQ(log.remarks(), std::vector<std::string>{"Invalid YY: YY = 0"});
 }
 
-TEST_F(InstallDate, TakesWhatALineLacksForZero)
+TEST_F(InstallDate, TreatsMissingFieldsAsZero)
 {
     constexpr long midnight = may2010 - 10 * hour - 23 * 60 - 45;
     EXPECT_EQ(dateOf("Change: 2010-05-12 10:23\n"), may2010 - 45);
@@ -140,9 +140,9 @@ TEST_F(InstallDate, NeedsTheLineToBeginWithChange)
     EXPECT_EQ(dateOf("Changed: 2010-05-12 10:23:45\n"), 0);
 }
 
-TEST_F(InstallDate, LeavesTheLinesFirstCharacterAsItIs)
+TEST_F(InstallDate, KeepsTheLinesFirstCharacter)
 {
-    // A hyphen in front stays one, so the line does not begin with the word.
+    // A leading hyphen stays, so the line does not begin with the word.
     EXPECT_EQ(dateOf("-Change: 2010-05-12 10:23:45\n"), 0);
     Recording const log;
     dateOf("Change: 2010-05-12 10:23:45\n");
@@ -172,7 +172,7 @@ TEST_F(InstallDate, ClosesTheCommandsStream)
     EXPECT_EQ(commands_.open, 0);
 }
 
-TEST_F(InstallDate, HoldsTheReleaseFileOpenUntilTheCommandRuns)
+TEST_F(InstallDate, KeepsTheReleaseFileOpenUntilTheCommandRuns)
 {
     files_.write("/etc/redhat-release", "a line\n");
     LastOpened const probe;

@@ -129,7 +129,7 @@ TEST_P(OsInfoLog, GoesOnceToEachOfTheTwoLogsInTheFactsCategory)
     EXPECT_EQ(records.front().function, GetParam().function);
 }
 
-TEST(OsInfo, HoldsNothingAndIsSilentWhenItComesAndGoes)
+TEST(OsInfo, HasNoMembersAndLogsNoConstruction)
 {
     EXPECT_TRUE(std::is_empty_v<OsInfo>);
     EXPECT_FALSE(std::is_polymorphic_v<OsInfo>);
@@ -140,7 +140,7 @@ TEST(OsInfo, HoldsNothingAndIsSilentWhenItComesAndGoes)
     EXPECT_TRUE(log.records().empty());
 }
 
-TEST_P(OsInfoLog, SaysNothingOfAFailureButThatMemoryIsUnknown)
+TEST_P(OsInfoLog, HasNoFailuresExceptThoseOfMemory)
 {
     libc::hooks().sysinfo = [](struct sysinfo*) { return -1; };
     std::map<std::string, std::string> const remarks = {
@@ -156,7 +156,7 @@ TEST_P(OsInfoLog, SaysNothingOfAFailureButThatMemoryIsUnknown)
     EXPECT_EQ(log.remarks(), expected);
 }
 
-TEST_P(OsInfoLog, TakesNoLockButThatOfTheAccountsForTheUserCount)
+TEST_P(OsInfoLog, TakesNoLockExceptForTheUserCount)
 {
     int mutexes = 0;
     int accounts = 0;

@@ -68,7 +68,7 @@ TEST_P(OsInfoPower, ClosesThePipeAndReadsNeitherOutputNorStatus)
     EXPECT_EQ(commands_.open, 0);
 }
 
-TEST_P(OsInfoPower, TakesNothingOutOfTheCommandsPipe)
+TEST_P(OsInfoPower, ReadsNothingFromTheCommandsPipe)
 {
     FILE* const output = std::tmpfile();
     std::fputs("shutdown: Permission denied\n", output);

@@ -27,7 +27,7 @@ constexpr char const* suseCommand =
     "echo $(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 9)."
     "$(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 12) | tr -d [:space:]";
 
-/** A machine with release files of its own, and commands with given output. */
+/** A machine with its own release files, and commands with given output. */
 class ReleaseFiles : public testing::Test
 {
 protected:
@@ -38,7 +38,7 @@ protected:
         return out;
     }
 
-    /** The version, or "none" where there is none and the caller's text stayed. */
+    /** The version; "none" if there is none, which also leaves the caller's text unchanged. */
     std::string version()
     {
         std::string out = "before";
@@ -65,7 +65,7 @@ protected:
     }
 };
 
-TEST_F(OSReleaseName, IsTheFirstLineAsItIs)
+TEST_F(OSReleaseName, IsTheFirstLineUnchanged)
 {
     EXPECT_EQ(of("  Kesto Linux 10.2 \t\r\nsecond\n"), "  Kesto Linux 10.2 \t\r");
     EXPECT_EQ(of("Kesto Linux"), "Kesto Linux");
@@ -77,7 +77,7 @@ TEST_F(OSReleaseName, IsEmptyForAnEmptyFirstLine)
     EXPECT_EQ(of("\nsecond\n"), "");
 }
 
-TEST_F(OSReleaseName, FailsAndLeavesTheCallersTextWithoutALine)
+TEST_F(OSReleaseName, FailsAndKeepsTheCallersTextWithoutALine)
 {
     std::string out = "before";
     EXPECT_FALSE(OsInfo().getOSReleaseName("/etc/release", out));
@@ -109,14 +109,14 @@ TEST_F(OSName, ComesFromTheFirstReleaseFileThereIs)
     EXPECT_EQ(name(), "Linux");
 }
 
-TEST_F(OSName, PassesOverAReleaseFileWithoutALine)
+TEST_F(OSName, SkipsAReleaseFileWithoutALine)
 {
     files_.write("/etc/release", "");
     files_.write("/etc/SuSE-release", "SUSE Linux\n");
     EXPECT_EQ(name(), "SUSE Linux");
 }
 
-TEST_F(OSName, IsEmptyWhenTheFirstLineIs)
+TEST_F(OSName, IsEmptyIfTheFirstLineIs)
 {
     files_.write("/etc/release", "\n");
     EXPECT_EQ(name(), "");
@@ -125,7 +125,7 @@ TEST_F(OSName, IsEmptyWhenTheFirstLineIs)
 class KestoVersion : public ReleaseFiles
 {
 protected:
-    /** The version, or "none" where there is none and the caller's text stayed. */
+    /** The version; "none" if there is none, which also leaves the caller's text unchanged. */
     std::string of(std::string const& text)
     {
         files_.write("/etc/release", text);
@@ -137,13 +137,13 @@ protected:
     }
 };
 
-TEST_F(KestoVersion, JoinsTheSecondLinesAndTheThirdLinesNumber)
+TEST_F(KestoVersion, JoinsTheNumbersOfTheSecondAndThirdLine)
 {
     EXPECT_EQ(of("Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2\n"), "10.2");
     EXPECT_EQ(of("Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2"), "10.2");
 }
 
-TEST_F(KestoVersion, TakesNoNoticeOfTheFirstLine)
+TEST_F(KestoVersion, IgnoresTheFirstLine)
 {
     EXPECT_EQ(of("\nVERSION = 10\nPATCHLEVEL = 2\n"), "10.2");
     EXPECT_EQ(of("VERSION = 9\nVERSION = 10\nPATCHLEVEL = 2\nVERSION = 11\n"), "10.2");
@@ -166,7 +166,7 @@ TEST_F(KestoVersion, CutsAtTheLastEqualsSign)
     EXPECT_EQ(of("Kesto\nVERSION = 9 = 10\nPATCHLEVEL = 1 = 2\n"), "10.2");
 }
 
-TEST_F(KestoVersion, TakesAWholeLineWithoutAnEqualsSign)
+TEST_F(KestoVersion, UsesAWholeLineWithoutAnEqualsSign)
 {
     EXPECT_EQ(of("Kesto\n VERSION: 10 \n PATCHLEVEL: 2 \n"), "VERSION: 10.PATCHLEVEL: 2");
 }
@@ -215,7 +215,7 @@ TEST_F(OSVersion, FailsWithoutAReleaseFile)
     EXPECT_EQ(unameCalls_, 0);
 }
 
-TEST_F(OSVersion, IsThatOfTheKeyValueFileFirstOfAll)
+TEST_F(OSVersion, ComesFromTheKeyValueFileFirst)
 {
     files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
     writeCommandFiles();
@@ -245,7 +245,7 @@ TEST_F(OSVersion, ClosesTheUnitedLinuxFileInAnyCase)
     }
 }
 
-TEST_F(OSVersion, FailsOnUnitedLinuxWhenTheKernelDoesNotAnswer)
+TEST_F(OSVersion, FailsOnUnitedLinuxIfUnameFails)
 {
     files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
     writeCommandFiles();
@@ -255,7 +255,7 @@ TEST_F(OSVersion, FailsOnUnitedLinuxWhenTheKernelDoesNotAnswer)
     EXPECT_TRUE(commands_.ran.empty());
 }
 
-TEST_F(OSVersion, GoesOnToTheOtherFilesWhenAKeyValueLineIsTooShort)
+TEST_F(OSVersion, TriesTheOtherFilesIfAKeyValueLineIsTooShort)
 {
     files_.write("/etc/release", "Kesto Linux\nVERSION = 10\nPATCHLEVEL=2\n");
     files_.write("/etc/SuSE-release", "SUSE Linux Enterprise Server 11 (x86_64)\n");
@@ -341,7 +341,7 @@ protected:
     int pcloseCalls_ = 0;
 };
 
-TEST_F(OSVersionStream, StartsOnceTheReleaseFileIsClosed)
+TEST_F(OSVersionStream, StartsAfterTheReleaseFileIsClosed)
 {
     answer("5.4");
     EXPECT_EQ(version(), "5.4");
@@ -358,7 +358,7 @@ TEST_F(OSVersionStream, IsClosedAsAFileAndNotAsACommand)
     EXPECT_EQ(pcloseCalls_, 0);
 }
 
-TEST_F(OSVersionStream, IsLeftOpenWhenNothingCanBeRead)
+TEST_F(OSVersionStream, IsLeftOpenIfNothingCanBeRead)
 {
     answer("");
     EXPECT_EQ(version(), "none");
@@ -367,7 +367,7 @@ TEST_F(OSVersionStream, IsLeftOpenWhenNothingCanBeRead)
     close(pipe_);
 }
 
-/** Runs the real commands, turned to the files written here. */
+/** Runs the real commands, redirected to the files written here. */
 class OSVersionCommand : public ReleaseFiles
 {
 protected:
@@ -386,7 +386,7 @@ protected:
     }
 };
 
-TEST_F(OSVersionCommand, LeavesTheDigitsAndPointsOfAVmwareFile)
+TEST_F(OSVersionCommand, KeepsDigitsDotsAndHyphensOfAVmwareFile)
 {
     files_.write("/etc/vmware-release", "VMware ESX Server 3.5 (Dali)\n");
     EXPECT_EQ(version(), "3.5");
@@ -394,7 +394,7 @@ TEST_F(OSVersionCommand, LeavesTheDigitsAndPointsOfAVmwareFile)
     EXPECT_EQ(version(), "3.0.1-320");
 }
 
-TEST_F(OSVersionCommand, LeavesTheDigitsAndPointsOfARedhatFile)
+TEST_F(OSVersionCommand, KeepsDigitsAndDotsOfARedhatFile)
 {
     files_.write("/etc/redhat-release", "Red Hat Enterprise Linux Server release 5.4 (Tikanga)\n");
     EXPECT_EQ(version(), "5.4");

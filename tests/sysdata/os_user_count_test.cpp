@@ -21,7 +21,7 @@ using NQ::OsInfo;
 
 constexpr char const* ranges = "UID_MIN 500\nUID_MAX 60000\nGID_MIN 500\nGID_MAX 60000\n";
 
-/** A machine with its own accounts and a lock that only takes notes. */
+/** A machine with its own accounts, whose account lock only records its calls. */
 class UserCount : public testing::Test
 {
 protected:
@@ -71,7 +71,7 @@ TEST_F(UserCount, CountsRootAndTheUsersInTheRangeButNoSystemAccount)
     EXPECT_EQ(countOf(account("root", 0) + account("daemon", 2) + account("jdoe", 1000)), 2U);
 }
 
-TEST_F(UserCount, TakesBothEndsOfTheRangeIn)
+TEST_F(UserCount, IncludesBothEndsOfTheRange)
 {
     EXPECT_EQ(countOf(account("below", 499) + account("first", 500)), 1U);
     EXPECT_EQ(countOf(account("last", 60000) + account("above", 60001)), 1U);
@@ -88,7 +88,7 @@ TEST_F(UserCount, CountsNobodyWithoutAnAccountFile)
     EXPECT_EQ(steps_, (std::vector<std::string>{"lock", "setpwent", "unlock"}));
 }
 
-TEST_F(UserCount, OpensTheAccountFileInItsOwnMode)
+TEST_F(UserCount, OpensTheAccountFileInModeRo)
 {
     std::vector<std::string> opened;
     auto const below = libc::hooks().fopen.answer();
@@ -110,7 +110,7 @@ TEST_F(UserCount, HoldsTheLockForTheWholeScan)
               (std::vector<std::string>{"lock", "setpwent", "read", "read", "read", "unlock"}));
 }
 
-TEST_F(UserCount, GoesOnWithoutTheLock)
+TEST_F(UserCount, ContinuesWithoutTheLock)
 {
     lockResult_ = -1;
     EXPECT_EQ(countOf(account("root", 0)), 1U);
@@ -164,7 +164,7 @@ TEST_F(UserCount, ClosesTheAccountFileBeforeItReleasesTheLock)
     EXPECT_FALSE(openAtRelease);
 }
 
-TEST_F(UserCount, CountsAgainFromTheFileEachTime)
+TEST_F(UserCount, ReadsTheFileEachTime)
 {
     EXPECT_EQ(countOf(account("root", 0)), 1U);
     EXPECT_EQ(countOf(account("root", 0) + account("jdoe", 1000)), 2U);

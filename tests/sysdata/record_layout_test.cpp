@@ -1,4 +1,4 @@
-// The records that exported operations take and return: their fields, in order, and nothing else.
+// The layout of the records that exported operations take and return: only these fields, in order.
 
 #include "sysdata/ParamInfo.h"
 #include "sysdata/driverInfo_linux.h"
@@ -26,7 +26,7 @@ using NQ::userInfo;
 
 template <class Record> using Changes = std::vector<std::function<void(Record& record)>>;
 
-/** Where the first byte stands that each of the changes changes in an empty record. */
+/** The offset of the first byte that each change modifies in an empty record. */
 template <class Record> std::vector<std::ptrdiff_t> places(Changes<Record> const& changes)
 {
     std::vector<std::ptrdiff_t> found;
@@ -42,7 +42,7 @@ template <class Record> std::vector<std::ptrdiff_t> places(Changes<Record> const
     return found;
 }
 
-template <class Record> bool standInOrder(Changes<Record> const& changes)
+template <class Record> bool areInOrder(Changes<Record> const& changes)
 {
     static_assert(!std::is_polymorphic_v<Record>);
     std::vector<std::ptrdiff_t> const found = places(changes);
@@ -60,8 +60,8 @@ TEST(RecordLayout, OfAParameterIsNameTypeAndValue)
 
 TEST(RecordLayout, OfAUserIsSevenTextsTwoFlagsAndEightNumbers)
 {
-    // The flag that nothing sets stands between its neighbours, which leave room for it alone.
-    EXPECT_TRUE(standInOrder<userInfo>({
+    // The flag that nothing sets is between its neighbours, which leave room only for it.
+    EXPECT_TRUE(areInOrder<userInfo>({
         [](userInfo& user) { user = userInfo("x"); },
         [](userInfo& user) { user.setUserFullName("x"); },
         [](userInfo& user) { user.setUserHomeDir("x"); },
@@ -85,7 +85,7 @@ TEST(RecordLayout, OfAUserIsSevenTextsTwoFlagsAndEightNumbers)
 TEST(RecordLayout, OfAGroupIsItsNameItsMembersAndItsId)
 {
     FakeFiles const noAccounts;
-    EXPECT_TRUE(standInOrder<groupInfo>({
+    EXPECT_TRUE(areInOrder<groupInfo>({
         [](groupInfo& group) { group = groupInfo("x"); },
         [](groupInfo& group) {
             char member[] = "x";
@@ -99,7 +99,7 @@ TEST(RecordLayout, OfAGroupIsItsNameItsMembersAndItsId)
 
 TEST(RecordLayout, OfADriverIsFiveTexts)
 {
-    EXPECT_TRUE(standInOrder<driverInfo>({
+    EXPECT_TRUE(areInOrder<driverInfo>({
         [](driverInfo& driver) { driver.setName("x"); },
         [](driverInfo& driver) { driver.setVersion("x"); },
         [](driverInfo& driver) { driver.setDescription("x"); },

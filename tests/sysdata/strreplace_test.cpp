@@ -13,7 +13,7 @@ std::string replaced(std::string text, char from, char to)
     return text;
 }
 
-TEST(Strreplace, LeavesTheFirstCharacterAsItIs)
+TEST(Strreplace, KeepsTheFirstCharacter)
 {
     EXPECT_EQ(replaced("-a-b", '-', ' '), "-a b");
 }
@@ -32,7 +32,7 @@ TEST(Strreplace, StopsAtTheFirstReplacementByNul)
     EXPECT_EQ(std::string(text, 5), std::string("a\0cbd", 5));
 }
 
-TEST(Strreplace, LeavesAnEmptyTextAlone)
+TEST(Strreplace, KeepsAnEmptyText)
 {
     char text[] = {'\0', '-', '\0'};
     NQ::OsInfo().strreplace(text, '-', ' ');

@@ -19,18 +19,18 @@ TEST(TrimString, StripsBlanksFromBothEnds)
     EXPECT_EQ(trimmed("10"), "10");
 }
 
-TEST(TrimString, LeavesBlanksInsideAlone)
+TEST(TrimString, KeepsInnerBlanks)
 {
     EXPECT_EQ(trimmed(" a  b "), "a  b");
 }
 
-TEST(TrimString, TakesOneBlankFromATextOfBlanks)
+TEST(TrimString, RemovesOneBlankFromATextOfBlanks)
 {
     EXPECT_EQ(trimmed("   "), "  ");
     EXPECT_EQ(trimmed(" "), "");
 }
 
-TEST(TrimString, LeavesAnEmptyTextEmpty)
+TEST(TrimString, KeepsAnEmptyText)
 {
     EXPECT_EQ(trimmed(""), "");
 }

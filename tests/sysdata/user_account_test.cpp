@@ -18,7 +18,7 @@ namespace user_account_test
 
 using NQ::userInfo;
 
-/** Account operations, with the commands that they run only noted. */
+/** Account operations; the commands that they run are only recorded. */
 class AccountOperation : public testing::Test
 {
 protected:
@@ -67,7 +67,7 @@ TEST_F(UserDeletion, RunsALineThatFillsItsBufferOf1024Bytes)
     EXPECT_EQ(commands_.ran, Lines{line});
 }
 
-TEST_F(UserDeletion, RunsNothingWhereTheLineDoesNotFit)
+TEST_F(UserDeletion, RunsNothingIfTheLineDoesNotFit)
 {
     EXPECT_EQ(userInfo().setDelete(std::string(1024 - 11, 'x')), 1);
     EXPECT_EQ(commands_.ran, Lines{});
@@ -104,7 +104,7 @@ protected:
     }
 };
 
-TEST_P(AgeingOperation, SetsTheDaysFromWhatChageListsToTheDate)
+TEST_P(AgeingOperation, SetsTheDaysFromTheListedDateToTheGivenOne)
 {
     answerListing("Jan 01, 2008");
     commands_.answers[ageLine("10")] = "";
@@ -129,7 +129,7 @@ TEST_P(AgeingOperation, ReadsOnlyItsOwnLabel)
     EXPECT_EQ(commands_.ran.back(), ageLine("13889"));
 }
 
-TEST_P(AgeingOperation, Sets99999WhereTheDateLiesBefore)
+TEST_P(AgeingOperation, Sets99999IfTheDateIsEarlier)
 {
     answerListing("Feb 01, 2008");
     set("2008-01-11 00:00:00");
@@ -137,7 +137,7 @@ TEST_P(AgeingOperation, Sets99999WhereTheDateLiesBefore)
     EXPECT_EQ(errors().front(), "new_day < last_day");
 }
 
-TEST_P(AgeingOperation, Sets99999WhereChageCannotList)
+TEST_P(AgeingOperation, Sets99999IfChageCannotList)
 {
     commands_.answers[ageLine("99999")] = "";
     EXPECT_TRUE(set("2008-01-11 00:00:00"));
@@ -145,7 +145,7 @@ TEST_P(AgeingOperation, Sets99999WhereChageCannotList)
     EXPECT_EQ(errors(), Lines{"Cannot open process: command = chage -l jdoe"});
 }
 
-TEST_P(AgeingOperation, FailsWhereChageCannotBeStartedForTheChange)
+TEST_P(AgeingOperation, FailsIfTheChangeCannotBeStarted)
 {
     answerListing("Jan 01, 2008");
     EXPECT_FALSE(set("2008-01-11 00:00:00"));
@@ -163,7 +163,7 @@ TEST_P(AgeingOperation, SucceedsWhateverChagePrints)
     EXPECT_TRUE(set("2008-01-11 00:00:00"));
 }
 
-TEST_P(AgeingOperation, TakesTheDateForLocalTime)
+TEST_P(AgeingOperation, ReadsTheDateAsLocalTime)
 {
     // Two days over the change to summer time are one hour short of two days.
     useZone("CET-1CEST,M3.5.0,M10.5.0/3");
@@ -172,7 +172,7 @@ TEST_P(AgeingOperation, TakesTheDateForLocalTime)
     EXPECT_EQ(commands_.ran.back(), ageLine("1"));
 }
 
-TEST_P(AgeingOperation, TakesTheVeryBeginningOfTheDay)
+TEST_P(AgeingOperation, CountsFromTheFirstSecondOfTheDay)
 {
     // Over the change to a summer time that is one second ahead, two days lack that second.
     useZone("AAA0BBB-0:00:01,M3.5.0,M10.5.0");
@@ -181,7 +181,7 @@ TEST_P(AgeingOperation, TakesTheVeryBeginningOfTheDay)
     EXPECT_EQ(commands_.ran.back(), ageLine("1"));
 }
 
-TEST_P(AgeingOperation, CountsATextThatIsNoDateAs1970)
+TEST_P(AgeingOperation, TreatsATextThatIsNotADateAs1970)
 {
     answerListing("Jan 01, 2008");
     set("tomorrow");
@@ -203,7 +203,7 @@ TEST_P(AgeingOperation, ReadsTwoDigitsOfMonthAndDay)
     EXPECT_EQ(commands_.ran.back(), ageLine("10"));
     set("2008-123-1"); // December, and no day: the last of November
     EXPECT_EQ(commands_.ran.back(), ageLine("334"));
-    set("20081-01-1"); // the year 2008 alone: no month counts as January, no day as the day before
+    set("20081-01-1"); // only the year 2008: no month is January, no day is the day before
     EXPECT_EQ(commands_.ran.back(), ageLine("99999"));
 }
 
@@ -231,7 +231,7 @@ TEST_P(AgeingOperation, RunsAChangeThatFillsItsBuffer)
     EXPECT_TRUE(set("2008-01-11 00:00:00", user));
 }
 
-TEST_P(AgeingOperation, ConvertsTheDateFirstAndThenAsksForTheDays)
+TEST_P(AgeingOperation, ConvertsTheDateBeforeItCountsTheDays)
 {
     answerListing("Jan 01, 2008");
     commands_.answers[ageLine("10")] = "";
@@ -252,12 +252,12 @@ INSTANTIATE_TEST_SUITE_P(
                            "Last password change", "-M", "Cannot open process: chage -M"}),
     [](auto const& of) { return of.param.function; });
 
-/** Runs "tool" with arguments; the program slot of the list is not looked at. */
 struct Outcome {
     bool result;
     std::string output;
 };
 
+/** Runs "tool" with arguments; the first entry of the list, the program, is not used. */
 Outcome runTool(std::vector<char const*> args, std::string command = "/usr/bin/tool")
 {
     std::vector<char> output(20000, '#');
@@ -285,7 +285,7 @@ TEST_F(CommandRunner, EndsTheArgumentsAtTheFirstEmptyOne)
     EXPECT_EQ(commands_.ran, Lines{"/usr/bin/tool a 2>&1"});
 }
 
-TEST_F(CommandRunner, TakesACommandWithoutArguments)
+TEST_F(CommandRunner, RunsACommandWithoutArguments)
 {
     runTool({"ignored"});
     EXPECT_EQ(commands_.ran, Lines{"/usr/bin/tool 2>&1"});
@@ -324,7 +324,7 @@ TEST_F(CommandRunner, IsFalseForACommandThatCannotBeStarted)
     EXPECT_EQ(errors(), Lines{"Cannot open process: /usr/bin/tool"});
 }
 
-TEST_F(CommandRunner, DoesNotLookAtHowTheCommandEnded)
+TEST_F(CommandRunner, IgnoresTheExitStatusOfTheCommand)
 {
     libc::hooks().pclose = [](FILE* stream) {
         std::fclose(stream);
@@ -336,7 +336,7 @@ TEST_F(CommandRunner, DoesNotLookAtHowTheCommandEnded)
     EXPECT_FALSE(runTool({"ignored"}).result);
 }
 
-TEST_F(CommandRunner, CopiesAllOfTheOutputHoweverLong)
+TEST_F(CommandRunner, CopiesOutputOfAnyLength)
 {
     std::string const output(15000, 'o');
     commands_.answers["/usr/bin/tool 2>&1"] = output;
@@ -350,7 +350,7 @@ TEST_F(CommandRunner, RunsALineThatFillsItsBufferOf5000Bytes)
     EXPECT_EQ(commands_.ran, Lines{"/usr/bin/tool " + argument + " 2>&1"});
 }
 
-TEST_F(CommandRunner, RunsNothingWhereTheLineDoesNotFit)
+TEST_F(CommandRunner, RunsNothingIfTheLineDoesNotFit)
 {
     std::string const argument(5000 - 13 - 1 - 5, 'x');
     EXPECT_FALSE(runTool({"ignored", argument.c_str()}).result);
@@ -358,7 +358,7 @@ TEST_F(CommandRunner, RunsNothingWhereTheLineDoesNotFit)
     EXPECT_EQ(errors(), Lines{"Command does not fit: /usr/bin/tool"});
 }
 
-/** Asks for the lock of jdoe, with passwd's answer given. */
+/** Queries whether jdoe is locked, with a given answer of passwd. */
 class AccountLock : public AccountOperation
 {
 protected:
@@ -372,7 +372,7 @@ protected:
     FakeFiles const files_;
 };
 
-TEST_F(AccountLock, IsAskedOfPasswd)
+TEST_F(AccountLock, IsReadFromPasswd)
 {
     locked("jdoe PS");
     EXPECT_EQ(commands_.ran, Lines{"/usr/bin/passwd -S jdoe 2>&1"});
@@ -380,7 +380,7 @@ TEST_F(AccountLock, IsAskedOfPasswd)
                                    "executeLinCommand: exit", "findIsAcctDisabled: exit"}));
 }
 
-TEST_F(AccountLock, StandsInWordsAnywhereInTheOutput)
+TEST_F(AccountLock, IsFoundAsWordsAnywhereInTheOutput)
 {
     EXPECT_TRUE(locked("jdoe LK 2008-01-01 (Password locked.)\n"));
     EXPECT_TRUE(locked("Locked password.\n"));
@@ -389,7 +389,7 @@ TEST_F(AccountLock, StandsInWordsAnywhereInTheOutput)
     EXPECT_FALSE(locked("password locked"));
 }
 
-TEST_F(AccountLock, StandsBehindTheNameOnASuseSystem)
+TEST_F(AccountLock, IsFoundAfterTheNameOnASuseSystem)
 {
     for (char const* release : {"/etc/SuSE-release", "/etc/UnitedLinux-release"}) {
         files_.write(release, "");
@@ -404,7 +404,7 @@ TEST_F(AccountLock, StandsBehindTheNameOnASuseSystem)
     }
 }
 
-TEST_F(AccountLock, IsOffWhereThereIsNoOutput)
+TEST_F(AccountLock, IsFalseWithoutOutput)
 {
     EXPECT_FALSE(locked(""));
     commands_.answers.clear();
@@ -437,7 +437,7 @@ TEST_F(AccountLock, LooksForTheSecondReleaseFileOnlyWithoutTheFirst)
     EXPECT_EQ(opened, Lines{"/etc/SuSE-release"});
 }
 
-TEST_F(AccountOperation, LeavesTheRecordAsItIs)
+TEST_F(AccountOperation, DoesNotChangeTheRecord)
 {
     userInfo user("jdoe");
     user.setUserPassword("secret");
@@ -454,7 +454,7 @@ TEST_F(AccountOperation, LeavesTheRecordAsItIs)
     EXPECT_FALSE(user.IsDelete());
 }
 
-TEST_P(AgeingOperation, SucceedsHoweverChageEnds)
+TEST_P(AgeingOperation, IgnoresTheExitStatusOfChage)
 {
     libc::hooks().pclose = [](FILE* stream) {
         std::fclose(stream);

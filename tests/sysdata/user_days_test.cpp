@@ -77,19 +77,19 @@ TEST_F(LabelledDays, AreNoneOnTheDayItself)
     EXPECT_EQ(errors(), Lines{});
 }
 
-TEST_F(LabelledDays, Are99999WhereTheDateLiesAfterTheReference)
+TEST_F(LabelledDays, Are99999IfTheDateIsAfterTheReference)
 {
     EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 - 31 * day), 99999);
     EXPECT_EQ(errors(), Lines{"new_day < last_day"});
 }
 
-TEST_F(LabelledDays, Are99999OneSecondAfterTheReference)
+TEST_F(LabelledDays, Are99999IfTheDateIsOneSecondAfterTheReference)
 {
     EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 - 1), 99999);
     EXPECT_EQ(errors(), Lines{"new_day < last_day"});
 }
 
-TEST_F(LabelledDays, Are99999WhereTheCommandCannotBeStarted)
+TEST_F(LabelledDays, Are99999IfTheCommandCannotBeStarted)
 {
     char command[] = "chage -l nobody";
     char label[] = "Password expires";
@@ -100,7 +100,7 @@ TEST_F(LabelledDays, Are99999WhereTheCommandCannotBeStarted)
     EXPECT_EQ(errors(), Lines{"Cannot open process: command = chage -l nobody"});
 }
 
-TEST_F(LabelledDays, TakeTheDateAsLocalTime)
+TEST_F(LabelledDays, ReadTheDateAsLocalTime)
 {
     setZone("CET-1");
     EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 - 3600), 0);
@@ -124,25 +124,25 @@ TEST_F(LabelledDays, AreCountedFromTheLastLineWithTheLabel)
               10);
 }
 
-TEST_F(LabelledDays, AreCountedSince1970WhereNoLineHasTheLabel)
+TEST_F(LabelledDays, AreCountedSince1970IfNoLineHasTheLabel)
 {
     EXPECT_EQ(days("nothing of the kind\n", firstOf2008), 13879);
     EXPECT_EQ(errors(), Lines{"Invalid YY: YY = 0"});
 }
 
-TEST_F(LabelledDays, AreCountedSince1970WhereThereIsNoOutput)
+TEST_F(LabelledDays, AreCountedSince1970WithoutOutput)
 {
     EXPECT_EQ(days("", firstOf2008), 13879);
 }
 
-TEST_F(LabelledDays, TakeTheWordNeverForAnInvalidDate)
+TEST_F(LabelledDays, TreatTheWordNeverAsAnInvalidDate)
 {
     EXPECT_EQ(days("Password expires\t: never\n", firstOf2008), 13879);
     EXPECT_EQ(errors(), (Lines{"Invalid format: buffer = Password expires\t: never\n",
                                "Invalid YY: YY = 0"}));
 }
 
-TEST_F(LabelledDays, KeepDayAndYearWhenAnInvalidLineFollows)
+TEST_F(LabelledDays, KeepDayAndYearIfAnInvalidLineFollows)
 {
     // The month is then none of the twelve, which counts as January.
     EXPECT_EQ(
@@ -151,14 +151,14 @@ TEST_F(LabelledDays, KeepDayAndYearWhenAnInvalidLineFollows)
     EXPECT_EQ(errors(), Lines{"Invalid format: buffer = Password expires : never\n"});
 }
 
-TEST_F(LabelledDays, GoOnToTheNextLineAfterAnInvalidOne)
+TEST_F(LabelledDays, ContinueAfterAnInvalidLine)
 {
     EXPECT_EQ(
         days("Password expires : never\nPassword expires : Jan 01, 2008\n", firstOf2008 + 10 * day),
         10);
 }
 
-TEST_F(LabelledDays, CountTo19January2038WhereADateFollowsNever)
+TEST_F(LabelledDays, CountTo19January2038IfADateFollowsNever)
 {
     EXPECT_EQ(days("Password expires : never 01, 2008\n", 2147472000), 0);
     EXPECT_EQ(days("Password expires : never 01, 2008\n", 2147472000 - 1), 99999);

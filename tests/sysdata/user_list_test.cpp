@@ -27,7 +27,7 @@ namespace user_list_test
 
 using NQ::userInfo;
 
-/** A machine with its own accounts; every step of a listing is noted. */
+/** A machine with its own accounts; every step of a listing is recorded. */
 class UserListing : public testing::Test
 {
 protected:
@@ -150,7 +150,7 @@ TEST_F(UserListing, ReleasesTheLockBeforeItClosesTheFiles)
         EXPECT_FALSE(isOpen(descriptor));
 }
 
-TEST_F(UserListing, GoesOnWithoutTheLock)
+TEST_F(UserListing, ContinuesWithoutTheLock)
 {
     lockResult_ = -1;
     files_.write("/etc/passwd", account("root", 0));
@@ -230,7 +230,7 @@ TEST_F(UserListing, SearchesTheShadowFileFromTheLastEntryOn)
     EXPECT_EQ(passwordsOf(list()), (Lines{"A", "B", "C", ""}));
 }
 
-TEST_F(UserListing, TakesNoShadowFactsForAnyUserAfterAMissingOne)
+TEST_F(UserListing, HasNoShadowFactsAfterAMissingUser)
 {
     files_.write("/etc/passwd", account("a", 1000) + account("b", 1001) + account("c", 1002));
     files_.write("/etc/shadow", shadow("a", "A") + shadow("c", "C"));
@@ -252,7 +252,7 @@ TEST_F(UserListing, LooksUpNoShadowEntryOfOmittedAccounts)
     EXPECT_EQ(passwordsOf(list()), Lines{"A"});
 }
 
-TEST_F(UserListing, TakesEachShadowFieldForItsOwnFact)
+TEST_F(UserListing, ReadsEachShadowFieldAsItsOwnFact)
 {
     files_.write("/etc/passwd", account("jdoe", 1000));
     files_.write("/etc/shadow", "jdoe:secret:10:20:30:40:50:60:\n");
@@ -299,7 +299,7 @@ TEST_F(UserListing, WritesIdsInPlainDecimalWhateverTheHostsLocale)
     EXPECT_EQ(users.front().getGroupId(), "4294967294");
 }
 
-TEST_F(UserListing, SetsAllFactsOfAUserInItsOwnOrder)
+TEST_F(UserListing, SetsAllFactsOfAUserInAFixedOrder)
 {
     files_.write("/etc/passwd", account("jdoe", 1000));
     files_.write("/etc/shadow", shadow("jdoe", "secret"));
@@ -346,7 +346,7 @@ TEST_F(UserListing, LogsAnUnparsableRuleUnderItsOwnNameAsAnError)
     }
 }
 
-TEST_F(UserListing, AllowsNoFailuresWhereTheRulesDoNotSayHowMany)
+TEST_F(UserListing, HasZeroFailuresIfTheRulesNameNoNumber)
 {
     files_.write("/etc/passwd", account("jdoe", 1000));
     for (char const* rules : {"", "auth required pam_unix.so\n", "deny=x\n"}) {
@@ -416,7 +416,7 @@ TEST_F(UserListing, SeesAChangeOfTheFilesTheNextTime)
     EXPECT_EQ(names(), (Lines{"jdoe", "new"}));
 }
 
-TEST_F(UserListing, HandsTheShadowReaderABufferOf4096Bytes)
+TEST_F(UserListing, PassesTheShadowReaderABufferOf4096Bytes)
 {
     files_.write("/etc/passwd", account("a", 1000));
     files_.write("/etc/shadow", shadow("a", "A"));

@@ -115,7 +115,7 @@ TEST(UserMachine, ListsUsersWithoutAReadableShadowFile)
     EXPECT_EQ(ageingOn("users-without-shadow"), (Lines{"root  0 0 0 0 0 0", "anna  0 0 0 0 0 0"}));
 }
 
-TEST(UserMachine, WithEmptyAgeingFieldsHasTheSystemsValues)
+TEST(UserMachine, WithEmptyAgeingFieldsHasTheSystemsDefaults)
 {
     std::string const lastChange = std::to_string(static_cast<unsigned long>(371085174288000ULL));
     EXPECT_EQ(ageingOn("users-empty-ageing"),
@@ -145,14 +145,14 @@ TEST(UserMachine, OmitsMalformedLines)
     EXPECT_EQ(namesOn("users-malformed-line"), (Lines{"root", "ben"}));
 }
 
-TEST(UserMachine, WithoutAnAccountFileHasNoUsersAndSaysNothing)
+TEST(UserMachine, WithoutAnAccountFileHasNoUsersAndNoErrors)
 {
     Recording const log;
     EXPECT_EQ(namesOn("users-without-passwd"), Lines{});
     EXPECT_EQ(log.texts(), (Lines{"getUserInfo: entry", "getUserInfo: exit"}));
 }
 
-TEST(UserMachine, WithoutLoginDefsListsRootAlone)
+TEST(UserMachine, WithoutLoginDefsListsOnlyRoot)
 {
     EXPECT_EQ(namesOn("users-without-login-defs"), Lines{"root"});
 }
@@ -170,12 +170,12 @@ TEST(UserMachine, WithOneDenyGivesItToEveryUser)
     EXPECT_EQ(loginFailuresOn("users-deny-once"), (std::vector<long>{3, 3}));
 }
 
-TEST(UserMachine, WithSeveralDenysTakesTheLast)
+TEST(UserMachine, WithSeveralDenysUsesTheLast)
 {
     EXPECT_EQ(loginFailuresOn("users-deny-several"), (std::vector<long>{5, 5}));
 }
 
-TEST(UserMachine, WithADenyInACommentTakesThatToo)
+TEST(UserMachine, WithADenyInACommentUsesThatToo)
 {
     EXPECT_EQ(loginFailuresOn("users-deny-commented"), (std::vector<long>{8, 8}));
 }

@@ -36,7 +36,7 @@ void expectDenied(std::string const& line, Scan scan, long number)
     EXPECT_EQ(found.number, number) << line;
 }
 
-TEST(LoginRule, GivesTheNumberBehindDeny)
+TEST(LoginRule, GivesTheNumberAfterDeny)
 {
     expectDenied("auth required pam_tally2.so deny=3 unlock_time=600", Scan::valid, 3);
     expectDenied("deny=0", Scan::valid, 0);
@@ -104,7 +104,7 @@ TEST(LoginRules, MayBeNone)
 
 constexpr char const* label = "Password expires";
 
-TEST(LabelledDate, IsReadBehindItsLabelAndAColon)
+TEST(LabelledDate, IsReadAfterItsLabelAndAColon)
 {
     LabelledDate date;
     EXPECT_EQ(scanLabelledDate("Password expires\t\t\t\t\t: Feb 03, 2008\n", label, date),
@@ -123,7 +123,7 @@ TEST(LabelledDate, IsReplacedByALaterOne)
     EXPECT_EQ(date.year, 2010);
 }
 
-TEST(LabelledDate, IsLeftAloneByALineWithoutTheLabel)
+TEST(LabelledDate, IsKeptByALineWithoutTheLabel)
 {
     LabelledDate date{"Feb", 3, 2008};
     EXPECT_EQ(scanLabelledDate("Account expires : Dec 31, 2010", label, date), Scan::absent);
@@ -132,7 +132,7 @@ TEST(LabelledDate, IsLeftAloneByALineWithoutTheLabel)
     EXPECT_EQ(date.year, 2008);
 }
 
-TEST(LabelledDate, IsInvalidWhereTheLabelIsNotTheLinesStart)
+TEST(LabelledDate, IsInvalidIfTheLabelIsNotAtTheStart)
 {
     LabelledDate date{"Feb", 3, 2008};
     EXPECT_EQ(scanLabelledDate("x Password expires : Dec 31, 2010", label, date), Scan::invalid);
@@ -141,7 +141,7 @@ TEST(LabelledDate, IsInvalidWhereTheLabelIsNotTheLinesStart)
     EXPECT_EQ(date.year, 2008);
 }
 
-TEST(LabelledDate, TakesNeverAsTheMonthOfAnInvalidDate)
+TEST(LabelledDate, ReadsNeverAsTheMonthOfAnInvalidDate)
 {
     LabelledDate date{"Feb", 3, 2008};
     EXPECT_EQ(scanLabelledDate("Password expires : never\n", label, date), Scan::invalid);
@@ -150,7 +150,7 @@ TEST(LabelledDate, TakesNeverAsTheMonthOfAnInvalidDate)
     EXPECT_EQ(date.year, 2008);
 }
 
-TEST(LabelledDate, Is19January2038WhereADayAndAYearFollowNever)
+TEST(LabelledDate, Is19January2038IfADayAndAYearFollowNever)
 {
     LabelledDate date;
     EXPECT_EQ(scanLabelledDate("Password expires : never 01, 2008", label, date), Scan::valid);
@@ -200,7 +200,7 @@ TEST(WrittenDate, IsReadAsYearMonthAndDay)
     expectDay("2010-5-7 12:30:00", 2010, 5, 7);
 }
 
-TEST(WrittenDate, HasZerosWhereItCannotBeRead)
+TEST(WrittenDate, HasZerosForUnreadableFields)
 {
     expectDay("", 0, 0, 0);
     expectDay("tomorrow", 0, 0, 0);

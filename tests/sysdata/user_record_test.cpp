@@ -17,14 +17,14 @@ namespace user_record_test
 using NQ::userInfo;
 using NQ::USER_INFO::never;
 
-// What an empty shadow field holds where a long is wider than 32 bits.
+// The value of an empty shadow field if a long is wider than 32 bits.
 constexpr unsigned long allBitsSet = ~0UL;
 
 constexpr char const* east = "CET-1";
 constexpr char const* west = "EST5";
 constexpr char const* south = "AEST-10AEDT,M10.1.0,M4.1.0/3"; // has summer time in January
 
-TEST(UserRecord, KnowsTheMarkOfAnEmptyAgeingField)
+TEST(UserRecord, MarksAnEmptyAgeingFieldWith32SetBits)
 {
     EXPECT_EQ(never, 0xFFFFFFFFUL);
 }
@@ -119,7 +119,7 @@ TEST(UserRecord, IsCopiedMemberByMember)
     EXPECT_EQ(copy.getPwdMaxDays(), 90U);
 }
 
-TEST(UserRecord, PutsTheSystemsValuesInPlaceOfEmptyAgeingFields)
+TEST(UserRecord, ReplacesEmptyAgeingFieldsByDefaults)
 {
     for (unsigned long const empty : {never, allBitsSet}) {
         userInfo user("jdoe");
@@ -163,7 +163,7 @@ unsigned long lastChange(unsigned long days)
     return user.getLstPwdChg();
 }
 
-TEST(UserInactiveTime, Is19January2038WhereTheFieldIsEmptyOr99999)
+TEST(UserInactiveTime, Is19January2038IfTheFieldIsEmptyOr99999)
 {
     for (unsigned long const days : {99999UL, never, allBitsSet}) {
         useZone("UTC0");
@@ -187,14 +187,14 @@ TEST(UserInactiveTime, CountsFromLocalMidnightOf1January1970)
     EXPECT_EQ(inactiveTime(14000), 1209600000U + 5 * 3600);
 }
 
-TEST(UserInactiveTime, IsInSummerTimeWhereJanuaryIs)
+TEST(UserInactiveTime, IsInSummerTimeIfJanuaryIs)
 {
     useZone(south);
     EXPECT_EQ(inactiveTime(99999), 2147472000U - 11 * 3600);
     EXPECT_EQ(inactiveTime(14000), 1209600000U - 11 * 3600);
 }
 
-TEST(UserLastChange, IsInSummerTimeWhereJanuaryIs)
+TEST(UserLastChange, IsInSummerTimeIfJanuaryIs)
 {
     useZone(south);
     EXPECT_EQ(lastChange(13879), 1199145600U - 11 * 3600);
@@ -300,7 +300,7 @@ TEST(UserRecord, ConvertsItsDatesByMonthNameAndByMonthNumber)
                                                      "ito_time_t: exit", "setLstPwdChg: exit"}));
 }
 
-TEST(UserRecord, IsMadeCopiedAndDestroyedInSilence)
+TEST(UserRecord, LogsNoConstructionCopyOrDestruction)
 {
     Recording const log;
     {

@@ -1,6 +1,6 @@
 // A busy host: threads that read whatever the tree holds while one refreshes it and another
-// administers the machine. script/concurrency lets it run for minutes; says most when it is built
-// with the thread sanitizer.
+// administers the machine. script/concurrency lets it run for minutes. Most useful when built with
+// the thread sanitizer.
 
 #include "TestPaths.h"
 #include "host/Properties.h"
@@ -28,7 +28,7 @@ namespace concurrent_host_test
 constexpr unsigned int writesEach = 20;
 constexpr unsigned int readers = 3;
 
-/** What the machine's commands print; unlike FakeCommands it keeps no notes that threads share. */
+/** The output of the machine's commands. Unlike FakeCommands, it records nothing to share. */
 char const* outputOf(char const* command)
 {
     struct Answer {
@@ -46,7 +46,7 @@ char const* outputOf(char const* command)
     for (auto const& [beginning, output] : answers)
         if (std::strncmp(command, beginning, std::strlen(beginning)) == 0)
             return output;
-    return ""; // what tools print that succeed
+    return ""; // tools that succeed print nothing
 }
 
 FILE* answer(char const* command, char const*)
@@ -78,8 +78,7 @@ class ConcurrentHost : public testing::Test
 protected:
     ConcurrentHost()
     {
-        // Without it libc looks its zone up again and again, under a lock that the sanitizer
-        // cannot see.
+        // Without a zone, libc looks it up each time, under a lock that the sanitizer cannot see.
         useZone("UTC0");
         libc::hooks().popen = answer;
         libc::hooks().pclose = [](FILE* stream) { return std::fclose(stream); };

@@ -1,5 +1,5 @@
-// Users and groups refreshed from several threads while others read. Says most when it is built
-// with the thread sanitizer.
+// Users and groups refreshed from several threads while others read. Most useful when built with
+// the thread sanitizer.
 
 #include "TestPaths.h"
 #include "host/Properties.h"
@@ -32,8 +32,7 @@ class ConcurrentRefresh : public testing::Test
 protected:
     ConcurrentRefresh()
     {
-        // Without it libc looks its zone up again and again, under a lock that the sanitizer
-        // cannot see.
+        // Without a zone, libc looks it up each time, under a lock that the sanitizer cannot see.
         useZone("UTC0");
         plugin.initialize();
     }

@@ -55,7 +55,7 @@ TEST(ToTimeT, KnowsTheTwelveMonthsByName)
         EXPECT_EQ(named(2009, month.name, 1, 0, 0, 0), month.firstOf2009) << month.name;
 }
 
-TEST(ToTimeT, TakesAnyOtherMonthNameForJanuaryWithoutAMessage)
+TEST(ToTimeT, TreatsOtherMonthNamesAsJanuaryWithoutAMessage)
 {
     useZone(utc);
     Recording const log;
@@ -106,7 +106,7 @@ TEST(ToTimeT, CarriesFieldsOutOfRangeOver)
     EXPECT_EQ(named(2009, "Feb", 1, 0, 0, -1), february - 1);
 }
 
-TEST(ToTimeT, TakesNoNoticeOfTheWeekday)
+TEST(ToTimeT, IgnoresTheWeekday)
 {
     useZone(utc);
     char month[] = "May";
@@ -164,11 +164,11 @@ TEST(ItoTimeT, EqualsTheConversionByName)
 TEST(ItoTimeT, PassesTheOtherArgumentsOnInTheirOrder)
 {
     useZone(utc);
-    // 3 February 2009 05:06:07; the 4 is a Thursday that the date is not.
+    // 3 February 2009 05:06:07; 4 would be a Thursday, but the date is a Tuesday.
     EXPECT_EQ(NQ::ito_time_t(2009, 2, 3, 4, 5, 6, 7, 0), 1233637567);
 }
 
-TEST(ItoTimeT, TakesAnyOtherMonthNumberForAnUnmatchedName)
+TEST(ItoTimeT, TreatsOtherMonthNumbersAsJanuary)
 {
     useZone(utc);
     for (int const month : {0, -1, 13, INT_MAX, INT_MIN})
@@ -189,7 +189,7 @@ TEST(ItoTimeT, LogsAroundTheConversionByName)
     }
 }
 
-TEST(ToTimeT, AsksNothingOfTheSystemForYearsUpTo1900)
+TEST(ToTimeT, DoesNotCallMktimeForYearsUpTo1900)
 {
     useZone("AAA0");
     setenv("TZ", "BBB0", 1); // which mktime would notice

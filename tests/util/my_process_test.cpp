@@ -52,7 +52,7 @@ private:
     libc::HookGuard const guard_;
 };
 
-TEST(MyProcess, ClosesItsPipeWhenItGoes)
+TEST(MyProcess, ClosesItsPipeWhenDestroyed)
 {
     Pipes pipes;
     {
@@ -132,7 +132,7 @@ TEST(MyProcess, RunsTwoCommandsAtOnceInTwoObjects)
     EXPECT_EQ(pipes.closed, (std::vector<FILE*>{pipes.opened.at(1), pipes.opened.at(0)}));
 }
 
-TEST(MyProcess, IgnoresHowTheCommandEndedAndSaysNothing)
+TEST(MyProcess, IgnoresTheExitStatusAndLogsNothing)
 {
     Recording const log;
     Pipes pipes;
@@ -172,7 +172,7 @@ TEST(MyProcess, CannotBeCopied)
     EXPECT_FALSE(std::is_copy_assignable_v<MyProcess>);
 }
 
-TEST(MyProcess, HoldsOneStreamAndNothingElse)
+TEST(MyProcess, HasTheSizeOfOneStream)
 {
     EXPECT_EQ(sizeof(MyProcess), sizeof(FILE*));
 }

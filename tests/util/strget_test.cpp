@@ -9,7 +9,7 @@
 namespace strget_test
 {
 
-/** The value part of a line, and the line's bytes as they stand afterwards. */
+/** The value part of a line, and the line's bytes afterwards. */
 struct Value {
     Value(std::string line, char c) : bytes(std::move(line))
     {
@@ -47,14 +47,14 @@ TEST(Strget, YieldsNothingForABlankLine)
     EXPECT_EQ(value.offset, 1);
 }
 
-TEST(Strget, YieldsAnEmptyTextItself)
+TEST(Strget, YieldsAnEmptyTextForAnEmptyText)
 {
     Value const value("", ' ');
     EXPECT_EQ(value.text, "");
     EXPECT_EQ(value.offset, 0);
 }
 
-TEST(Strget, StopsAtTheEndOfALineOfNothingButTheCharacter)
+TEST(Strget, StopsAtTheEndOfALineOfOnlyTheCharacter)
 {
     Value const value("    ", ' ');
     EXPECT_EQ(value.text, "");
@@ -72,7 +72,7 @@ TEST(Strget, KeepsTrailingBlanksAndCarriageReturns)
     EXPECT_EQ(Value(" value  \r\n", ' ').text, "value  \r");
 }
 
-TEST(Strget, LeavesNewlinesAmongTheSkippedCharactersAlone)
+TEST(Strget, KeepsNewlinesAmongTheSkippedCharacters)
 {
     Value const value("\n\nvalue\n", '\n');
     EXPECT_EQ(value.text, "value");

@@ -20,7 +20,7 @@ TEST(PrintIntoABuffer, RefusesATextOneByteTooLong)
     EXPECT_EQ(std::string(buffer), "abcd-");
 }
 
-TEST(PrintIntoABuffer, TakesAnEmptyText)
+TEST(PrintIntoABuffer, AcceptsAnEmptyText)
 {
     char buffer[] = "abc";
     EXPECT_TRUE(NQ::text::print(buffer, sizeof buffer, "%s", ""));

@@ -17,7 +17,7 @@ using NQ::Mutex;
 
 constexpr unsigned long withoutLimit = 0xFFFFFFFF;
 
-/** Another thread, which tries to take the lock and gives it back. */
+/** Another thread, which tries to lock the mutex and then unlocks it. */
 class Other
 {
 public:
@@ -32,7 +32,7 @@ public:
     {
     }
 
-    /** Returns once the thread sleeps, or has gone past the lock. */
+    /** Waits until the thread sleeps or has finished. @return whether it sleeps */
     bool waits() const
     {
         while (!finished_)
@@ -63,7 +63,7 @@ private:
     std::thread thread_;
 };
 
-TEST(Mutex, IsTakenAndGivenBack)
+TEST(Mutex, IsLockedAndUnlocked)
 {
     Mutex mutex;
     EXPECT_EQ(mutex.lock(withoutLimit), 0);
@@ -72,7 +72,7 @@ TEST(Mutex, IsTakenAndGivenBack)
     EXPECT_EQ(mutex.unlock(), 0);
 }
 
-TEST(Mutex, IsNotTakenWhenTheTimeRunsOut)
+TEST(Mutex, IsNotLockedIfTheTimeRunsOut)
 {
     Mutex mutex;
     ASSERT_EQ(mutex.lock(withoutLimit), 0);
@@ -94,7 +94,7 @@ TEST(Mutex, IsWaitedForWithoutLimitWhenAllBitsAreSet)
     }
 }
 
-TEST(Mutex, IsTakenWithinTheTimeWhenItIsGivenBack)
+TEST(Mutex, IsLockedInTimeAfterAnUnlock)
 {
     Mutex mutex;
     ASSERT_EQ(mutex.lock(withoutLimit), 0);

@@ -150,7 +150,7 @@ class Accounts(ChangeTest):
         self.browser.open('users')
         self.browser.click('#user-add')
         self.browser.click('#preview-run')
-        self.browser.see('#preview', 'This is needed.')
+        self.browser.see('#preview', 'Enter a value.')
         self.fill(**{'user': 'dora', 'full-name': 'Dora D', 'shell': '/bin/sh'})
         self.preview()
         self.assertNotIn('dora', cockpit.accounts_file('passwd'))

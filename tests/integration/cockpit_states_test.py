@@ -56,7 +56,7 @@ class States(PageTest):
     def test_killed_in_the_middle(self):
         cockpit.install_mihost(KILLED)
         self.browser.open()
-        self.state('killed', 'was ended before it had answered')
+        self.state('killed', 'was stopped before it had answered')
         self.assertEqual(self.browser.find('#tree [role=treeitem]'), [])
         self.try_again()
         self.browser.gone('#state [data-state=killed]')

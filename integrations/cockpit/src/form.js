@@ -4,10 +4,10 @@ import { el, replace } from "./dom.js";
 
 const types = { number: "text", day: "date", password: "password" };
 const reasons = {
-    missing: () => _("This is needed."),
-    number: () => _("This has to be a number."),
+    missing: () => _("Enter a value."),
+    number: () => _("Enter a number."),
     different: () => _("The passwords differ."),
-    line: () => _("This has to be a single line."),
+    line: () => _("Enter a single line."),
 };
 
 export class Form {

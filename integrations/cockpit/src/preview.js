@@ -128,7 +128,7 @@ export class Preview {
         if (!answer)
             return;
         if (edits !== this.edits) {
-            replace(this.result, alert("info", _("The form was changed meanwhile; ask again what would happen")));
+            replace(this.result, alert("info", _("The form was changed; preview the change again")));
             return;
         }
         replace(this.result, outcome(answer, { preview: true }));
@@ -180,7 +180,7 @@ export class Preview {
         if (!failure.kind)
             throw failure;
         const titles = {
-            killed: _("mihost was ended before it had answered"),
+            killed: _("mihost was stopped before it had answered"),
             missing: _("mihost is not installed on this machine"),
             cancelled: _("This was stopped"),
         };

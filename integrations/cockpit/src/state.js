@@ -26,11 +26,11 @@ const conditions = { // the most severe first
     },
     "killed": {
         look: "danger",
-        title: () => _("mihost was ended before it had answered"),
+        title: () => _("mihost was stopped before it had answered"),
     },
     "garbled": {
         look: "danger",
-        title: () => _("mihost gave an answer that this page cannot read"),
+        title: () => _("This page cannot read the answer of mihost"),
     },
     "slow": {
         look: "warning",

@@ -61,7 +61,7 @@ export class Table {
         });
         this.table.setAttribute("aria-rowcount", this.rows.length + 1);
         replace(this.count, this.all.length === 0 ? this.none
-            : this.rows.length === this.all.length ? format(_("$0 in all"), this.all.length)
+            : this.rows.length === this.all.length ? format(_("$0 in total"), this.all.length)
                 : format(_("$0 of $1"), this.rows.length, this.all.length));
         this.virtual.setCount(this.rows.length);
     }

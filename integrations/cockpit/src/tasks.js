@@ -7,20 +7,20 @@ const userName = { name: "user", label: () => _("User name"), parameter: "UserNa
 const groupName = { name: "group", label: () => _("Group name"), parameter: "GroupName", required: true };
 const ageing = [
     {
-        name: "min-days", option: "--min-days", kind: "number", label: () => _("Keep password for (days)"),
+        name: "min-days", option: "--min-days", kind: "number", label: () => _("Minimum password age (days)"),
         parameter: "daysMustKeepPassword",
     },
     {
-        name: "max-days", option: "--max-days", kind: "number", label: () => _("Password is valid for (days)"),
+        name: "max-days", option: "--max-days", kind: "number", label: () => _("Maximum password age (days)"),
         parameter: "daysMustChangePasswordAfter",
     },
     {
-        name: "warn-days", option: "--warn-days", kind: "number", label: () => _("Warn before that (days)"),
+        name: "warn-days", option: "--warn-days", kind: "number", label: () => _("Warning before expiry (days)"),
         parameter: "daysWarnBeforePasswordExpire",
     },
     {
-        name: "inactive-days", option: "--inactive-days", kind: "number", label: () => _("Inactive after that (days)"),
-        parameter: "daysExpireAfter",
+        name: "inactive-days", option: "--inactive-days", kind: "number",
+        label: () => _("Inactive after expiry (days)"), parameter: "daysExpireAfter",
     },
 ];
 const password = {
@@ -70,7 +70,7 @@ export const tasks = {
         fields: [userName, password],
     },
     userExpire: {
-        title: () => _("Set day of expiry"),
+        title: () => _("Set expiry date"),
         words: ["user", "expire"],
         method: "UserSetAttrib",
         fields: [userName, {

@@ -22,7 +22,7 @@ options:
     required: true
   state:
     description:
-      - Whether the group exists.
+      - Whether the group should exist.
     type: str
     choices: [present, absent]
     default: present

@@ -22,7 +22,7 @@ options:
     required: true
   state:
     description:
-      - Whether the account exists. The home directory of a deleted account is kept.
+      - Whether the account should exist. The home directory of a deleted account is kept.
     type: str
     choices: [present, absent]
     default: present
@@ -33,8 +33,8 @@ options:
   home:
     description:
       - The home directory, created with a new account, otherwise moved with its files.
-      - A new account without this option gets the default one, which is only created if the target is
-        configured so.
+      - Without this option a new account has the target's default home directory, which is only created
+        if the target is configured so.
     type: str
   shell:
     description:
@@ -59,7 +59,7 @@ options:
     type: int
   inactive_days:
     description:
-      - How many days after that the account stays active, 99999 for no limit.
+      - How many days after the password's expiry the account stays active, 99999 for no limit.
     type: int
   expires:
     description:

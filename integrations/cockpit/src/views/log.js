@@ -22,7 +22,7 @@ export class LogView {
         });
         this.follow = el("input", {
             id: "log-follow", type: "checkbox", role: "switch", class: "pf-v6-c-switch__input", checked: true,
-            "aria-label": _("Show new lines as they come"), on: { change: () => this.show() },
+            "aria-label": _("Show new lines as they arrive"), on: { change: () => this.show() },
         });
         this.lines = el("div", {
             id: "log-lines", class: "mi-log", role: "log", "aria-live": "off", tabindex: "0", "aria-label": _("Log"),

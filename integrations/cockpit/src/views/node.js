@@ -29,7 +29,7 @@ export class NodeDetail {
     constructor({ state, go }) {
         this.go = go;
         this.body = el("div", {});
-        this.element = el("section", { id: "detail", class: "mi-card", "aria-label": _("Chosen node") }, this.body);
+        this.element = el("section", { id: "detail", class: "mi-card", "aria-label": _("Selected node") }, this.body);
         this.loader = new Loader(this.body, state);
         this.live = null;
     }

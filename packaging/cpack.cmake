@@ -46,7 +46,7 @@ function(mi_rpm_name component name)
     set(${name} ${result} PARENT_SCOPE)
 endfunction()
 
-# What packages require beside each other and the libraries that rpm finds.
+# What packages require besides each other and the libraries that rpm finds.
 set(requires_libzorvvxicosswmi1 kmod shadow-utils)
 if(MI_RPM_FAMILY STREQUAL opensuse)
     set(requires_libzorvvxicosswmi1 kmod shadow)

@@ -47,7 +47,7 @@ TEST(Bootstrap, NamesOpensusesPackagesThatAreMissing)
                            "nlohmann_json-devel shadow')\n");
 }
 
-TEST(Bootstrap, KnowsAFamilyByItsKin)
+TEST(Bootstrap, RecognisesAFamilyByIdLike)
 {
     makeMachine("ID=\"rocky\"\nID_LIKE=\"rhel centos fedora\"\n", "fmt-devel");
     EXPECT_EQ(run("bootstrap").err,
@@ -61,7 +61,7 @@ TEST(Bootstrap, NamesAPackageOnce)
               "bootstrap: packages are missing (as root, run 'dnf install clang-tools-extra')\n");
 }
 
-TEST(Bootstrap, GoesOnIfNoPackageIsMissing)
+TEST(Bootstrap, SucceedsIfNoPackageIsMissing)
 {
     for (char const* release : {fedora, opensuse}) {
         makeMachine(release, "none");
@@ -74,7 +74,7 @@ TEST(Bootstrap, GoesOnIfNoPackageIsMissing)
     EXPECT_FALSE(std::filesystem::exists("/run/debian-tools"));
 }
 
-TEST(Bootstrap, GoesOnWhereItKnowsNoNames)
+TEST(Bootstrap, ContinuesIfItKnowsNoPackageNames)
 {
     makeMachine("ID=arch\n", "*");
     Outcome const outcome = run("bootstrap");
@@ -84,7 +84,7 @@ TEST(Bootstrap, GoesOnWhereItKnowsNoNames)
     EXPECT_FALSE(std::filesystem::exists("/run/debian-tools"));
 }
 
-TEST(Bootstrap, EndsRunAndTestBeforeTheyBuild)
+TEST(Bootstrap, StopsRunAndTestBeforeTheyBuild)
 {
     makeMachine(fedora, "cmake");
     machine::fake("/usr/bin/cmake", "echo built >>/run/built\n");

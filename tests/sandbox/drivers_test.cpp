@@ -60,7 +60,7 @@ protected:
         return found;
     }
 
-    /** The command lines that have to do with modules. */
+    /** The command lines of lsmod and modinfo. */
     static Lines ran()
     {
         Lines found;
@@ -73,7 +73,7 @@ protected:
     Plugin plugin;
 };
 
-TEST_F(Drivers, AreShownAsOddAsTheyMayBe)
+TEST_F(Drivers, AreShownForModulesOfEveryOddForm)
 {
     machine::lay("odd-modules");
     EXPECT_EQ(shown(),
@@ -87,7 +87,7 @@ TEST_F(Drivers, AreShownAsOddAsTheyMayBe)
                                    {"wide", "3", std::string(495, 'd')}}));
 }
 
-TEST_F(Drivers, TakeOneLsmodAndOneModinfoForEachModule)
+TEST_F(Drivers, RunOneLsmodAndOneModinfoForEachModule)
 {
     machine::lay("odd-modules");
     machine::recordShell();
@@ -97,7 +97,7 @@ TEST_F(Drivers, TakeOneLsmodAndOneModinfoForEachModule)
                      "modinfo blank", "modinfo tight", "modinfo ghost", "modinfo wide"}));
 }
 
-TEST_F(Drivers, AreFourHundredWhereTheKernelHasThatMany)
+TEST_F(Drivers, AreFourHundredForAsManyModules)
 {
     machine::fake("/usr/sbin/lsmod", "echo Module Size Used by\nseq -f 'module%g 4096 0' 400\n");
     machine::fake("/usr/sbin/modinfo", "echo \"version: of $1\"\n");
@@ -124,13 +124,13 @@ TEST_F(Drivers, AreDescribedByTheModulesThemselves)
     std::filesystem::create_directories(folder);
     std::filesystem::copy_file(MODULE_FILE, folder + "/mi_disk.ko");
     ASSERT_EQ(std::system("depmod -a 2>/dev/null"), 0);
-    // A kernel of our making, as far as lsmod looks.
+    // An invented list of modules, which lsmod reads.
     ASSERT_EQ(mount("none", "/proc", "tmpfs", 0, nullptr), 0);
     machine::write("/proc/modules", "mi_disk 16384 1 - Live 0x0000000000000000\n"
                                     "mi_ghost 4096 0 - Live 0x0000000000000000\n");
     EXPECT_EQ(shown(), (std::vector<Driver>{{"mi_disk", "1.4.2", "A disk of memory"},
                                             {"mi_ghost", "", "Driver"}}));
-    umount2("/proc", MNT_DETACH); // sanitizers look at the real one in the end
+    umount2("/proc", MNT_DETACH); // sanitizers read the real one at the end
 }
 
 TEST_F(Drivers, AreNoneOnAMachineWithoutLsmod)
@@ -138,11 +138,11 @@ TEST_F(Drivers, AreNoneOnAMachineWithoutLsmod)
     machine::remove("/usr/sbin/lsmod");
     Recording const recording;
     EXPECT_TRUE(shown().empty());
-    // The shell starts and finds nothing, which is not told from no modules.
+    // The shell starts and does not find lsmod, which looks like no modules.
     EXPECT_FALSE(recording.has("Cannot open process: lsmod", 3000));
 }
 
-TEST_F(Drivers, AreBareOnAMachineWithoutModinfo)
+TEST_F(Drivers, HaveOnlyNamesOnAMachineWithoutModinfo)
 {
     machine::lay("odd-modules");
     machine::remove("/usr/sbin/modinfo");
@@ -152,7 +152,7 @@ TEST_F(Drivers, AreBareOnAMachineWithoutModinfo)
         EXPECT_EQ(driver, (Driver{driver.name, "", "Driver"}));
 }
 
-TEST_F(Drivers, AreNoneWhereLsmodCannotBeStarted)
+TEST_F(Drivers, AreNoneIfLsmodCannotBeStarted)
 {
     machine::lay("odd-modules");
     libc::refuse("lsmod");
@@ -161,7 +161,7 @@ TEST_F(Drivers, AreNoneWhereLsmodCannotBeStarted)
     EXPECT_TRUE(recording.has("Cannot open process: lsmod", 3000));
 }
 
-TEST_F(Drivers, LackTheOneThatModinfoCannotBeStartedFor)
+TEST_F(Drivers, OmitAModuleIfModinfoCannotBeStarted)
 {
     machine::lay("odd-modules");
     libc::refuse("modinfo ext4");
@@ -170,7 +170,7 @@ TEST_F(Drivers, LackTheOneThatModinfoCannotBeStartedFor)
     EXPECT_TRUE(recording.has("Cannot open process: modinfo", 3000));
 }
 
-TEST_F(Drivers, SurviveGarbageInPlaceOfEveryOutput)
+TEST_F(Drivers, SurviveGarbageFromEveryCommand)
 {
     machine::fake("/usr/sbin/lsmod", "head -c 3000 /dev/zero; echo; echo loop 1\n"
                                      "printf '\\377\\001\\n   \\n'; head -c 2000 /dev/zero\n");

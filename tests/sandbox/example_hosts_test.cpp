@@ -16,7 +16,7 @@ Outcome call(std::string const& text)
     return runToEnd({programs / "example_method_call", PLUGIN_FILE, text});
 }
 
-TEST(MethodCallHost, AddsAGroupAndSaysWhyItCannotAddItAgain)
+TEST(MethodCallHost, AddsAGroupAndShowsWhyItCannotAddItAgain)
 {
     machine::lay("redhat");
     Outcome const added = call("LocalGroupAdd,GroupName:CMPI_string:builders");

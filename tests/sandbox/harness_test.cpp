@@ -1,4 +1,4 @@
-// The helpers that the other tests of this tier stand on.
+// The helpers that the other tests of this tier use.
 
 #include "host/Properties.h"
 #include "mihost/sandbox/Sandbox.h"
@@ -13,7 +13,7 @@
 namespace harness_test
 {
 
-TEST(ShellRecorder, NotesCommandLinesExactlyAndRunsThem)
+TEST(ShellRecorder, RecordsCommandLinesExactlyAndRunsThem)
 {
     machine::recordShell();
     std::system("printf '%s' 'a  \"b\"' >/tmp/said; # end\n");
@@ -28,7 +28,7 @@ TEST(ShellRecorder, PassesTheExitStatusOn)
     EXPECT_EQ(WEXITSTATUS(std::system("exit 3")), 3);
 }
 
-TEST(ShellRecorder, LeavesOutScripts)
+TEST(ShellRecorder, DoesNotRecordTheShellsOfScripts)
 {
     machine::fake("/usr/local/bin/script", "echo \"$1\" >/tmp/said\n");
     machine::recordShell();
@@ -46,7 +46,7 @@ TEST(ShellRecorder, ForgetsOnRequest)
     EXPECT_EQ(machine::ran(), Lines{"false"});
 }
 
-TEST(ToolRecorder, NotesEachArgumentAsTheToolGotIt)
+TEST(ToolRecorder, RecordsEachArgumentUnchanged)
 {
     machine::record("/usr/bin/printf");
     std::system("/usr/bin/printf '' a\\ b \"\" >/dev/null");
@@ -71,7 +71,7 @@ TEST(Machine, FindsAccountRecordsByTheirWholeName)
     EXPECT_EQ(machine::entry("/etc/group", "sta"), Lines());
 }
 
-TEST(Machine, ChangesOfRealToolsShowInTheAccountFiles)
+TEST(Machine, ShowsChangesOfRealToolsInTheAccountFiles)
 {
     ASSERT_EQ(std::system("/usr/sbin/useradd -M -s /bin/false jdoe"), 0);
     EXPECT_EQ(machine::entry("/etc/passwd", "jdoe").at(6), "/bin/false");

@@ -1,5 +1,5 @@
 // A machine at its limits: no descriptors, processes or disk space left, and tools that print
-// without measure or die halfway. The plug-in must survive and leak nothing.
+// megabytes or die halfway. The plug-in must survive and leak nothing.
 
 #include "host/Properties.h"
 #include "tests/support/Machine.h"
@@ -24,7 +24,7 @@
 namespace limits_test
 {
 
-/** Nobody else on this machine has it, so only the test's own processes count for it. */
+/** No other process on this machine has this id, so only the test's own count for its limit. */
 constexpr uid_t lonelyUser = 54321;
 
 std::set<std::string> openDescriptors()
@@ -35,7 +35,7 @@ std::set<std::string> openDescriptors()
     return open; // with one for the listing itself, each time
 }
 
-/** With a limit so low, no descriptor can be had. */
+/** The lowest free descriptor; with this as the limit, none can be opened. */
 rlim_t lowestFree()
 {
     int const free = dup(STDIN_FILENO);
@@ -48,7 +48,7 @@ bool hasChildren()
     return waitpid(-1, nullptr, WNOHANG) != -1 || errno != ECHILD;
 }
 
-/** A limit of this process for as long as it lives; the hard limit stays. */
+/** Lowers a limit of this process while the object exists; the hard limit is unchanged. */
 class Limit
 {
 public:
@@ -72,7 +72,7 @@ private:
     rlimit before_{};
 };
 
-/** An ordinary user for as long as it lives: limits on processes do not hold for root. */
+/** Runs as an ordinary user while the object exists: limits on processes exclude root. */
 class Ordinary
 {
 public:
@@ -131,10 +131,10 @@ protected:
         write(IC::nodeType::operatingSystem, IC::property::clearLog, nine);
         write(IC::nodeType::user, IC::property::inactiveTime, {"2030-01-01 00:00:00", true});
         plugin.unload();
-        endpwent(); // kept: counting users leaves libc's own cursor open, once in a process
+        endpwent(); // Contract: counting users leaves libc's own cursor open
     }
 
-    /** As live, and nothing is left of it. */
+    /** Like live, and expects that nothing is left open or running. */
     void liveAndLeaveNothing()
     {
         std::set<std::string> const before = openDescriptors();
@@ -165,7 +165,7 @@ protected:
     }
 };
 
-TEST_F(DescriptorLimits, AreReachedAnywhereAndNothingStaysOpen)
+TEST_F(DescriptorLimits, LeaveNothingOpenWhereverTheyAreReached)
 {
     rlim_t const used = lowestFree();
     for (rlim_t spare = 0; spare <= 6; ++spare) {
@@ -195,7 +195,7 @@ TEST_F(DescriptorLimits, AreReportedAsCommandsThatCannotBeStarted)
     EXPECT_TRUE(plugin.nodes(IC::nodeType::logEntry).empty());
 }
 
-TEST_F(Limits, OfProcessesAreReachedAnywhereAndNoneIsLeft)
+TEST_F(Limits, OfProcessesLeaveNoneWhereverTheyAreReached)
 {
     for (rlim_t most = 0; most <= 4; ++most) {
         SCOPED_TRACE(std::to_string(most) + " processes at most");
@@ -216,7 +216,7 @@ TEST_F(Limits, OfProcessesAreReportedAsCommandsThatCannotBeStarted)
     EXPECT_TRUE(recording.has("Cannot open process: wc -l /var/log/messages", 6000));
 }
 
-TEST_F(Limits, OfTheDiskLeaveThePasswordAsItWas)
+TEST_F(Limits, OfTheDiskDoNotChangeThePassword)
 {
     ASSERT_EQ(mount("disk", "/mnt", "tmpfs", 0, "size=4k"), 0);
     std::filesystem::current_path("/mnt");
@@ -253,7 +253,7 @@ constexpr Output outputs[] = {
     {"NothingAndDie", "kill -SEGV $$\n"},
 };
 
-/** Every tool of the machine does the same wrong. */
+/** Every tool of the machine fails in the same way. */
 class Tools : public Limits, public testing::WithParamInterface<Output>
 {
 protected:
@@ -269,12 +269,12 @@ protected:
     }
 };
 
-TEST_P(Tools, PrintAndThePluginLives)
+TEST_P(Tools, DoNotEndThePlugin)
 {
     liveAndLeaveNothing();
 }
 
-TEST_P(Tools, PrintAndNoLogEntriesAreMadeOfIt)
+TEST_P(Tools, YieldNoLogEntries)
 {
     Recording const recording;
     plugin.initialize();
@@ -282,8 +282,8 @@ TEST_P(Tools, PrintAndNoLogEntriesAreMadeOfIt)
     EXPECT_FALSE(recording.texts(6000).empty());
 }
 
-// Also one that dies without a word: the shell has one to say about it.
-TEST_P(Tools, PrintAndTheMethodFails)
+// Also if a tool dies without output: the shell then prints a message.
+TEST_P(Tools, MakeTheMethodFail)
 {
     plugin.initialize();
     IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
@@ -292,14 +292,14 @@ TEST_P(Tools, PrintAndTheMethodFails)
         EXPECT_EQ(os.setProperty(IC::property::createUser, {call, true}).getStatus(), 1U) << call;
 }
 
-TEST_F(Limits, AreNoneForModulesInOneEndlessLineOfBlanks)
+TEST_F(Limits, DoNotApplyToALineOfMegabytesOfBlanks)
 {
     machine::write("/run/line", std::string(3000000, ' '));
     machine::fake("/usr/sbin/lsmod", "/usr/bin/head -c 3000000 /run/line\n");
     liveAndLeaveNothing();
 }
 
-TEST_F(Limits, LeaveTheModulesThatWereListedBeforeLsmodDied)
+TEST_F(Limits, KeepTheModulesListedBeforeLsmodDied)
 {
     machine::fake("/usr/sbin/lsmod",
                   "echo Module Size Used by; echo loop 1 0; printf 'xf'; kill -9 $$\n");

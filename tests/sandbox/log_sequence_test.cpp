@@ -47,7 +47,7 @@ bool areTheSame(LogRecord const& one, LogRecord const& other)
            one.category == other.category && one.level == other.level && one.text == other.text;
 }
 
-/** What a whole run said, each call once, its two operations having agreed. */
+/** The messages of a whole run, once each; expects that both operations agree. */
 std::vector<std::string> saidByAWholeRun()
 {
     Recording recording;
@@ -76,7 +76,7 @@ std::vector<std::string> saidByAWholeRun()
     return lines;
 }
 
-TEST(LogSequence, OfAWholeRunIsExactlyTheExpectedOne)
+TEST(LogSequence, OfAWholeRunIsTheExpectedOne)
 {
     machine::lay("suse");
     EXPECT_EQ(saidByAWholeRun(), linesOf(machine::read(expectedFile)));

@@ -38,7 +38,7 @@ protected:
         say("Sat Nov 21 03:15:30 UTC 2026");
     }
 
-    /** Lets date say this; wc and sed are the real ones in every test. */
+    /** Lets date print this; wc and sed are the real ones in every test. */
     static void say(std::string const& date)
     {
         machine::fake("/usr/bin/date", "echo '" + date + "'\n");
@@ -136,7 +136,7 @@ TEST_F(Log, IsReadByTheCommandsOfEachReadInOrder)
     EXPECT_EQ(machine::ran(), Lines{});
 }
 
-TEST_F(Log, TakesNineCommandsForEachEntryAtTheStart)
+TEST_F(Log, RunsNineCommandsForEachEntryAtTheStart)
 {
     machine::write(path, lines(2));
     machine::recordShell();
@@ -155,7 +155,7 @@ TEST_F(Log, ShowsTheTimeOfEachEntry)
 {
     startOn("Nov  2 01:02:03 host one\nJan 31 23:59:59 host two\nFeb 29 12:00:00 host three\n");
     ASSERT_EQ(entries().size(), 3U);
-    // February has 28 days in 2026; the day after is meant.
+    // February has 28 days in 2026, so this is the day after.
     EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "2026-03-01 12:00:00");
     EXPECT_EQ(text(*entries()[1], IC::property::creationTime), "2026-01-31 23:59:59");
     EXPECT_EQ(text(*entries()[2], IC::property::creationTime), "2026-11-02 01:02:03");
@@ -202,7 +202,7 @@ TEST_F(Log, ShowsLinesWithAnotherStampWithoutATime)
     EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "(status 1)");
 }
 
-TEST_F(Log, LeavesOutALastLineThatHasNoEndYet)
+TEST_F(Log, OmitsALastLineWithoutALineEnd)
 {
     startOn(lines(2) + "Nov 20 10:11:59 half a line");
     EXPECT_EQ(messages(), newest(2, 2));
@@ -226,7 +226,7 @@ TEST_F(Log, SurvivesBinaryGarbage)
     EXPECT_EQ(messages()[1], "**");
 }
 
-TEST_F(Log, MovesUnderItsEntriesAsItGrows)
+TEST_F(Log, ShiftsItsEntriesAsItGrows)
 {
     startOn(lines(3));
     append("Nov 20 10:11:30 news\n");
@@ -251,7 +251,7 @@ TEST_F(Log, FailsTheReadsOfEntriesThatItHasLost)
                                             "Invalid index: getMaxLine()=1, logIndex=3"}));
 }
 
-TEST_F(Log, HasNoEntriesWhereItIsMissing)
+TEST_F(Log, HasNoEntriesIfItIsMissing)
 {
     machine::remove(path);
     Recording const recording;
@@ -270,7 +270,7 @@ TEST_F(Log, FailsTheReadsOfEntriesOnceItIsMissing)
     EXPECT_EQ(text(*entries()[1], IC::property::message), "(status 1)");
 }
 
-TEST_F(Log, HasNoEntriesForWhoMayNotReadIt)
+TEST_F(Log, HasNoEntriesWithoutReadPermission)
 {
     machine::write(path, lines(3), 0600);
     ASSERT_EQ(setgroups(0, nullptr), 0);
@@ -282,7 +282,7 @@ TEST_F(Log, HasNoEntriesForWhoMayNotReadIt)
     EXPECT_TRUE(recording.has("Invalid format: buffer = ", 6000));
 }
 
-TEST_F(Log, HasNoEntriesWhereWcCannotBeStarted)
+TEST_F(Log, HasNoEntriesIfWcCannotBeStarted)
 {
     libc::refuse(wc);
     Recording const recording;
@@ -291,7 +291,7 @@ TEST_F(Log, HasNoEntriesWhereWcCannotBeStarted)
     EXPECT_TRUE(recording.has("Cannot open process: wc -l /var/log/messages", 6000));
 }
 
-TEST_F(Log, HasAnEmptyEntryWhereSedCannotBeStarted)
+TEST_F(Log, HasAnEmptyEntryIfSedCannotBeStarted)
 {
     libc::refuse(sed(2));
     Recording const recording;
@@ -301,7 +301,7 @@ TEST_F(Log, HasAnEmptyEntryWhereSedCannotBeStarted)
     EXPECT_TRUE(recording.has("sed -n '%dp' /var/log/messages", 6000));
 }
 
-TEST_F(Log, IsOfTheYear1970WhereDateCannotBeStarted)
+TEST_F(Log, IsOfTheYear1970IfDateCannotBeStarted)
 {
     libc::refuse("date");
     Recording const recording;
@@ -310,7 +310,7 @@ TEST_F(Log, IsOfTheYear1970WhereDateCannotBeStarted)
     EXPECT_TRUE(recording.has("Cannot opne process: date", 6000));
 }
 
-TEST_F(Log, IsWithoutTimesWhereDateSpeaksAnotherForm)
+TEST_F(Log, HasNoTimesIfDatePrintsAnotherForm)
 {
     say("2026-11-21");
     Recording const recording;
@@ -321,13 +321,13 @@ TEST_F(Log, IsWithoutTimesWhereDateSpeaksAnotherForm)
 }
 
 /** Counts the nodes of which the host is informed. */
-struct Told : mihost::NodeObserver {
-    Told()
+struct NodeCounter : mihost::NodeObserver {
+    NodeCounter()
     {
         mihost::setNodeObserver(this);
     }
 
-    ~Told() override
+    ~NodeCounter() override
     {
         mihost::setNodeObserver(nullptr);
     }
@@ -351,18 +351,18 @@ TEST_F(Log, LosesItsEntriesThroughTheHostWhenItIsCleared)
     machine::write(path, lines(3), 0640);
     plugin.initialize();
     IC::MutableNode const* const log = &plugin.node(IC::nodeType::log);
-    Told const told;
+    NodeCounter const counted;
     plugin.node(IC::nodeType::operatingSystem)
         .setProperty(IC::property::clearLog, {IC::Number(9U), true});
-    EXPECT_EQ(told.deleted, 3);
-    EXPECT_EQ(told.added, 0);
+    EXPECT_EQ(counted.deleted, 3);
+    EXPECT_EQ(counted.added, 0);
     EXPECT_TRUE(entries().empty());
     EXPECT_EQ(&plugin.node(IC::nodeType::log), log);
     EXPECT_EQ(machine::read(path), "");
     EXPECT_EQ(std::filesystem::status(path).permissions(), std::filesystem::perms(0640));
 }
 
-TEST_F(Log, GetsNewEntriesForLinesThatCameDuringTheClearing)
+TEST_F(Log, GetsEntriesForLinesWrittenDuringTheClearing)
 {
     startOn(lines(2));
     // A logger that writes between the clearing and the count.
@@ -371,29 +371,29 @@ TEST_F(Log, GetsNewEntriesForLinesThatCameDuringTheClearing)
                    "echo 'Nov 20 10:11:40 news' >/var/log/messages\n"
                    "exec /usr/bin/wc \"$@\"\n",
                    0755);
-    Told const told;
+    NodeCounter const counted;
     plugin.node(IC::nodeType::operatingSystem)
         .setProperty(IC::property::clearLog, {IC::Number(9U), true});
-    EXPECT_EQ(told.deleted, 2);
-    EXPECT_EQ(told.added, 1);
+    EXPECT_EQ(counted.deleted, 2);
+    EXPECT_EQ(counted.added, 1);
     EXPECT_EQ(messages(), Lines{"*news*"});
 }
 
-TEST_F(Log, KeepsLinesAndEntriesWhereItMayNotBeCleared)
+TEST_F(Log, KeepsLinesAndEntriesIfItCannotBeCleared)
 {
     startOn(lines(2));
     ASSERT_EQ(setgroups(0, nullptr), 0);
     ASSERT_EQ(setresgid(65534, 65534, 65534), 0);
     ASSERT_EQ(setresuid(65534, 65534, 65534), 0);
-    Told const told;
+    NodeCounter const counted;
     plugin.node(IC::nodeType::operatingSystem)
         .setProperty(IC::property::clearLog, {IC::Number(9U), true});
     EXPECT_EQ(machine::read(path), lines(2));
     EXPECT_EQ(messages(), newest(2, 2));
-    EXPECT_EQ(told.deleted + told.added, 0);
+    EXPECT_EQ(counted.deleted + counted.added, 0);
 }
 
-TEST_F(Log, StaysAsItIsWhenAnEntryIsWritten)
+TEST_F(Log, IsUnchangedWhenAnEntryIsWritten)
 {
     startOn(lines(1));
     entries().at(0)->setProperty(IC::property::message, IC::PropertyValue("mine", true));

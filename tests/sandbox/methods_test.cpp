@@ -1,5 +1,5 @@
-// Administration from the host's write to the account files and to the nodes that the host is
-// handed, with the real tools.
+// Administration with the real tools: from the host's write to the account files, and to the nodes
+// that the host receives.
 
 #include "host/Properties.h"
 #include "mihost/sandbox/Sandbox.h"
@@ -32,7 +32,7 @@ public:
         machine::recordShell();
     }
 
-    /** Writes a method-call text as the host does. */
+    /** Writes a method-call text as a host does. */
     IC::Error call(std::string const& text)
     {
         return write(IC::property::createUser, IC::PropertyValue(text, true));
@@ -40,7 +40,7 @@ public:
 
     IC::Error write(unsigned int id, IC::PropertyValue const& value)
     {
-        handed.clear();
+        received.clear();
         machine::forget();
         return os().setProperty(id, value);
     }
@@ -61,10 +61,10 @@ public:
         return lines;
     }
 
-    bool wasHanded(unsigned int type, std::string const& name) const
+    bool hasReceived(unsigned int type, std::string const& name) const
     {
-        return std::find(handed.begin(), handed.end(), std::to_string(type) + " " + name) !=
-               handed.end();
+        return std::find(received.begin(), received.end(), std::to_string(type) + " " + name) !=
+               received.end();
     }
 
     Plugin const& plugin() const
@@ -72,22 +72,22 @@ public:
         return plugin_;
     }
 
-    Lines handed; // the nodes since the last write, such as "46 jdoe"
+    Lines received; // the nodes since the last write, such as "46 jdoe"
 
 private:
     static IC::Error noteNode(IC::Node* const& node, void const* context)
     {
         auto const& added = dynamic_cast<IC::MutableNode const&>(*node);
         auto* const self = static_cast<HostedMachine*>(const_cast<void*>(context));
-        self->handed.push_back(std::to_string(added.getNodeType()) + " " +
-                               text(added, IC::property::name));
+        self->received.push_back(std::to_string(added.getNodeType()) + " " +
+                                 text(added, IC::property::name));
         return {0, IC::Number(0U), ""};
     }
 
     Plugin plugin_;
 };
 
-/** Whether a command prints nothing about an option that it does not know. */
+/** Whether a shell command succeeds; its output is dropped. */
 bool succeeds(char const* command)
 {
     return std::system((std::string(command) + " >/dev/null 2>&1").c_str()) == 0;
@@ -96,7 +96,7 @@ bool succeeds(char const* command)
 struct Account {
     char const* machine;
     std::string user;
-    std::string groups; // as id lists them, each in quotes, after the unquoted primary one
+    std::string groups; // as id lists them, in quotes, after the unquoted primary one
 };
 
 void PrintTo(Account const& account, std::ostream* out)
@@ -139,16 +139,16 @@ TEST_P(Methods, UserDelRemovesTheAccountAndItsNode)
     EXPECT_EQ(passwd(), Lines());
     EXPECT_EQ(shadow(), Lines());
     EXPECT_EQ(host_.plugin().find(IC::nodeType::user, account_.user), nullptr);
-    EXPECT_FALSE(host_.wasHanded(IC::nodeType::user, account_.user));
-    EXPECT_TRUE(host_.wasHanded(IC::nodeType::user, "root"));
+    EXPECT_FALSE(host_.hasReceived(IC::nodeType::user, account_.user));
+    EXPECT_TRUE(host_.hasReceived(IC::nodeType::user, "root"));
     EXPECT_EQ(text(host_.os(), IC::property::createUser), "UserDel," + userName());
 }
 
-TEST_P(Methods, UserDelOfNobodyFailsAndHandsOutNothing)
+TEST_P(Methods, UserDelOfNobodyFailsAndPublishesNothing)
 {
     EXPECT_EQ(host_.call("UserDel,UserName:CMPI_string:nosuch").getStatus(), 1);
     EXPECT_EQ(host_.ran(), Lines{"/usr/sbin/userdel nosuch 2>&1"});
-    EXPECT_EQ(host_.handed, Lines());
+    EXPECT_EQ(host_.received, Lines());
     EXPECT_EQ(text(host_.os(), IC::property::createUser), "");
 }
 
@@ -173,7 +173,7 @@ TEST_P(Methods, UserSetAttribSetsTheAgeing)
     EXPECT_EQ(text(node, IC::property::pwdWarnDays), "5");
 }
 
-TEST_P(Methods, UserSetAttribRemovesAnExpiryThatIsNotAskedFor)
+TEST_P(Methods, UserSetAttribRemovesAnExpiryThatIsNotGiven)
 {
     ASSERT_EQ(std::system(("/usr/bin/chage -E 2030-12-31 " + account_.user).c_str()), 0);
     ASSERT_EQ(shadow().at(7), "22279");
@@ -209,7 +209,7 @@ TEST_P(Methods, UserSetScriptPathSetsTheLoginShell)
         "/bin/false");
 }
 
-TEST_P(Methods, UserSetHomeDirMovesTheFolder)
+TEST_P(Methods, UserSetHomeDirMovesTheDirectory)
 {
     machine::write("/home/" + account_.user + "/letter", "kept");
     EXPECT_EQ(
@@ -221,7 +221,7 @@ TEST_P(Methods, UserSetHomeDirMovesTheFolder)
     EXPECT_FALSE(std::filesystem::exists("/home/" + account_.user));
 }
 
-TEST_P(Methods, UserSetHomeDirFailsWhereThereIsNoFolderToMove)
+TEST_P(Methods, UserSetHomeDirFailsWithoutADirectoryToMove)
 {
     ASSERT_FALSE(std::filesystem::exists("/home/" + account_.user));
     EXPECT_EQ(
@@ -230,7 +230,7 @@ TEST_P(Methods, UserSetHomeDirFailsWhereThereIsNoFolderToMove)
     // usermod warns about the folder after it has changed the account.
     EXPECT_EQ(passwd().at(5), "/home/j2");
     EXPECT_EQ(text(host_.os(), IC::property::createUser), "");
-    EXPECT_EQ(host_.handed, Lines());
+    EXPECT_EQ(host_.received, Lines());
 }
 
 TEST_P(Methods, UserDelOfRootIsLeftToUserdel)
@@ -240,7 +240,7 @@ TEST_P(Methods, UserDelOfRootIsLeftToUserdel)
     EXPECT_NE(machine::entry("/etc/passwd", "root"), Lines()); // its processes keep it
 }
 
-TEST_P(Methods, UserSetPasswordGivesUsermodThePasswordAsItIs)
+TEST_P(Methods, UserSetPasswordPassesThePasswordUnchanged)
 {
     bool const readsStandardInput = succeeds("/usr/bin/passwd --help | grep -e --stdin");
     Recording const log;
@@ -250,7 +250,7 @@ TEST_P(Methods, UserSetPasswordGivesUsermodThePasswordAsItIs)
     EXPECT_EQ(host_.ran(),
               (Lines{"/usr/sbin/usermod -p Zq7Wx9 " + account_.user + " 2>&1",
                      "echo Zq7Wx9 | /usr/bin/passwd " + account_.user + " --stdin 2>&1"}));
-    // A passwd that lacks --stdin only complains, and nobody looks at that.
+    // A passwd without --stdin only prints an error, which is ignored.
     if (readsStandardInput)
         EXPECT_NE(shadow().at(1), "Zq7Wx9");
     else
@@ -264,7 +264,7 @@ TEST_P(Methods, LocalGroupAddAndDelMakeAndRemoveAGroupAndItsNode)
     EXPECT_EQ(host_.call("LocalGroupAdd,GroupName:CMPI_string:crew").getStatus(), 0);
     EXPECT_EQ(host_.ran(), Lines{"/usr/sbin/groupadd crew 2>&1"});
     EXPECT_EQ(machine::entry("/etc/group", "crew").size(), 4U);
-    EXPECT_TRUE(host_.wasHanded(IC::nodeType::group, "crew"));
+    EXPECT_TRUE(host_.hasReceived(IC::nodeType::group, "crew"));
 
     EXPECT_EQ(host_.call("LocalGroupDel,GroupName:CMPI_string:crew").getStatus(), 0);
     EXPECT_EQ(host_.ran(), Lines{"/usr/sbin/groupdel crew 2>&1"});
@@ -307,10 +307,10 @@ TEST_P(Methods, GetShadowingRunsNothingAndSucceeds)
 {
     EXPECT_EQ(host_.call("GetShadowing").getStatus(), 0);
     EXPECT_EQ(host_.ran(), Lines());
-    EXPECT_TRUE(host_.wasHanded(IC::nodeType::user, "root"));
+    EXPECT_TRUE(host_.hasReceived(IC::nodeType::user, "root"));
 }
 
-TEST_P(Methods, TakeValuesForShellText)
+TEST_P(Methods, PassValuesAsShellText)
 {
     // Only the last command's errors are merged in, so the failure goes unnoticed, too.
     EXPECT_EQ(host_.call("UserDel,UserName:CMPI_string:nosuch;echo>/tmp/anything").getStatus(), 0);
@@ -340,8 +340,8 @@ protected:
         Lines const ageing = machine::entry("/etc/shadow", "jdoe");
         EXPECT_EQ(ageing.at(3), "2");
         EXPECT_EQ(ageing.at(7), "");
-        EXPECT_TRUE(host.wasHanded(IC::nodeType::user, "jdoe"));
-        EXPECT_TRUE(host.wasHanded(IC::nodeType::group, "root"));
+        EXPECT_TRUE(host.hasReceived(IC::nodeType::user, "jdoe"));
+        EXPECT_TRUE(host.hasReceived(IC::nodeType::group, "root"));
         EXPECT_EQ(text(host.plugin().node(IC::nodeType::user, "jdoe"), IC::property::pwdMinDays),
                   "2");
         EXPECT_EQ(text(host.os(), IC::property::createUser), call_);
@@ -354,7 +354,7 @@ std::string const UserAdd::call_ =
     "daysMustKeepPassword:CMPI_uint32:2";
 std::string const UserAdd::chageLine_ = "/usr/bin/chage -m 2 -E -1 jdoe 2>&1";
 
-TEST_F(UserAdd, MakesTheAccountAndHandsOutItsNode)
+TEST_F(UserAdd, MakesTheAccountAndPublishesItsNode)
 {
     HostedMachine host("plain");
     EXPECT_EQ(host.call(call_).getStatus(), 0);
@@ -362,18 +362,18 @@ TEST_F(UserAdd, MakesTheAccountAndHandsOutItsNode)
     expectAdded(host);
 }
 
-TEST_F(UserAdd, HandsOutUsersBeforeGroups)
+TEST_F(UserAdd, PublishesUsersBeforeGroups)
 {
     HostedMachine host("plain");
     EXPECT_EQ(host.call(call_).getStatus(), 0);
     std::string const group = std::to_string(IC::nodeType::group);
     auto const firstGroup =
-        std::find_if(host.handed.begin(), host.handed.end(),
+        std::find_if(host.received.begin(), host.received.end(),
                      [&](std::string const& node) { return node.rfind(group, 0) == 0; });
-    EXPECT_EQ(Lines(host.handed.begin(), firstGroup), (Lines{"46 root", "46 gerda", "46 jdoe"}));
+    EXPECT_EQ(Lines(host.received.begin(), firstGroup), (Lines{"46 root", "46 gerda", "46 jdoe"}));
 }
 
-TEST_F(UserAdd, SucceedsInSpiteOfAWarning)
+TEST_F(UserAdd, SucceedsDespiteAWarning)
 {
     HostedMachine host("plain");
     machine::write("/home/jdoe/letter", "kept");
@@ -386,13 +386,13 @@ TEST_F(UserAdd, SucceedsInSpiteOfAWarning)
     }));
 }
 
-TEST_F(UserAdd, OfAnAccountThatIsThereFailsAndKeepsIt)
+TEST_F(UserAdd, OfAnExistingAccountFailsAndKeepsIt)
 {
     HostedMachine host("plain");
     EXPECT_EQ(host.call("UserAdd,UserName:CMPI_string:gerda").getStatus(), 1);
     EXPECT_EQ(host.ran(), Lines{"/usr/sbin/useradd gerda 2>&1;echo rc=$? 2>&1"});
     EXPECT_EQ(machine::entry("/etc/passwd", "gerda").at(4), "Gerda Example,,,");
-    EXPECT_EQ(host.handed, Lines());
+    EXPECT_EQ(host.received, Lines());
     EXPECT_EQ(text(host.os(), IC::property::createUser), "");
 }
 
@@ -405,10 +405,10 @@ TEST_F(UserAdd, KeepsTheAccountIfChageRefusesTheExpiry)
     EXPECT_EQ(host.ran(), (Lines{"/usr/sbin/useradd jdoe 2>&1;echo rc=$? 2>&1",
                                  "/usr/bin/chage -I soon -E -1 jdoe 2>&1"}));
     EXPECT_NE(machine::entry("/etc/passwd", "jdoe"), Lines());
-    EXPECT_EQ(host.handed, Lines());
+    EXPECT_EQ(host.received, Lines());
 }
 
-TEST_F(UserAdd, MakesNoGroupOfTheUsersOwnOnARedhatMachine)
+TEST_F(UserAdd, MakesNoUserGroupOnARedhatMachine)
 {
     HostedMachine host("redhat");
     std::filesystem::rename("/usr/sbin/useradd", "/usr/sbin/useradd.real");
@@ -419,14 +419,14 @@ TEST_F(UserAdd, MakesNoGroupOfTheUsersOwnOnARedhatMachine)
     expectAdded(host);
 }
 
-TEST_F(UserAdd, ThereFailsWhereTheToolLacksThatOption)
+TEST_F(UserAdd, FailsOnARedhatMachineWithoutTheOption)
 {
     HostedMachine host("redhat");
     bool const known = succeeds("/usr/sbin/useradd -n -D");
     EXPECT_EQ(host.call(call_).getStatus(), known ? 0 : 1);
     EXPECT_EQ(host.ran().at(0), useraddLine("/usr/sbin/useradd -n"));
     EXPECT_EQ(machine::entry("/etc/passwd", "jdoe").empty(), !known);
-    EXPECT_EQ(host.handed.empty(), !known);
+    EXPECT_EQ(host.received.empty(), !known);
 }
 
 class Commands : public testing::Test
@@ -456,7 +456,7 @@ TEST_F(Commands, HaltTheMachine)
     EXPECT_EQ(text(host_.os(), IC::property::requestedState), "12");
 }
 
-TEST_F(Commands, ClearTheLogAndTakeItsEntriesAway)
+TEST_F(Commands, ClearTheLogAndRemoveItsEntries)
 {
     ASSERT_FALSE(host_.plugin().nodes(IC::nodeType::logEntry).empty());
     EXPECT_EQ(write(IC::property::clearLog, 9).getStatus(), 0);
@@ -464,13 +464,13 @@ TEST_F(Commands, ClearTheLogAndTakeItsEntriesAway)
     EXPECT_TRUE(host_.plugin().nodes(IC::nodeType::logEntry).empty());
 }
 
-TEST_F(Commands, RefreshUsersAndGroupsThatCameOtherwise)
+TEST_F(Commands, RefreshUsersAndGroupsAddedByOthers)
 {
     ASSERT_TRUE(succeeds("/usr/sbin/useradd jdoe && /usr/sbin/groupadd crew"));
     EXPECT_EQ(host_.plugin().find(IC::nodeType::user, "jdoe"), nullptr);
     EXPECT_EQ(write(IC::property::refresh, 0).getStatus(), 0);
-    EXPECT_TRUE(host_.wasHanded(IC::nodeType::user, "jdoe"));
-    EXPECT_TRUE(host_.wasHanded(IC::nodeType::group, "crew"));
+    EXPECT_TRUE(host_.hasReceived(IC::nodeType::user, "jdoe"));
+    EXPECT_TRUE(host_.hasReceived(IC::nodeType::group, "crew"));
     EXPECT_EQ(text(host_.os(), IC::property::refresh), "0");
 }
 

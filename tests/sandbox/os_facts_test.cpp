@@ -69,13 +69,13 @@ TEST_P(OsFacts, VersionComesFromTheReleaseFile)
     }
 }
 
-TEST_P(OsFacts, UserCountHoldsTheOrdinaryAccountsAndTheSuperusers)
+TEST_P(OsFacts, UserCountIncludesOrdinaryAccountsAndSuperusers)
 {
     ASSERT_TRUE(fact(IC::property::userCount));
     EXPECT_EQ(fact(IC::property::userCount)->getNumber(), GetParam().users);
 }
 
-TEST_P(OsFacts, InstallDateIsWhenTheReleaseFileLastChanged)
+TEST_P(OsFacts, InstallDateIsTheReleaseFilesLastChange)
 {
     long long expected = 0;
     if (GetParam().datedFile) {

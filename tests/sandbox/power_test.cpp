@@ -1,4 +1,4 @@
-// Halting and restarting, against a command that only notes it.
+// Halting and restarting, with a command that only records it.
 
 #include "host/Properties.h"
 #include "mihost/sandbox/Sandbox.h"
@@ -26,7 +26,7 @@ protected:
         EXPECT_EQ(mihost::refusedPowerCommands(), Lines{command});
     }
 
-    /** A member function of NQ::OsInfo that takes nothing; the object itself holds nothing. */
+    /** Calls a member function of NQ::OsInfo without arguments; the object has no members. */
     bool call(char const* function)
     {
         auto* const member = reinterpret_cast<bool (*)(void*)>(plugin.symbol(function));
@@ -98,7 +98,7 @@ TEST_F(PowerRequest, MayBeANumberOrAText)
     EXPECT_EQ(machine::ran(), (Lines{"/sbin/shutdown -h now", "/sbin/shutdown -r now"}));
 }
 
-TEST_F(PowerRequest, OfAnyOtherNumberIsStoredOnly)
+TEST_F(PowerRequest, OfAnyOtherNumberIsOnlyStored)
 {
     for (unsigned int const number : {0U, 1U, 5U, 8U, 10U, 11U, 13U, 4294967295U}) {
         EXPECT_EQ(request({IC::EnumValue(number), true}), 0);
@@ -109,7 +109,7 @@ TEST_F(PowerRequest, OfAnyOtherNumberIsStoredOnly)
     EXPECT_EQ(recording.texts(4000), Lines());
 }
 
-TEST_F(PowerRequest, IsStoredAlsoWhereThereIsNoShutdownCommand)
+TEST_F(PowerRequest, IsStoredEvenIfThereIsNoShutdownCommand)
 {
     machine::remove("/sbin/shutdown");
     EXPECT_EQ(request({IC::EnumValue(12U), true}), 0);

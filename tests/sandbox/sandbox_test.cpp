@@ -1,4 +1,4 @@
-// What a copy of the machine is like from inside.
+// A copy of the machine, seen from inside.
 
 #include "mihost/sandbox/Sandbox.h"
 #include "tests/support/Lines.h"
@@ -48,7 +48,7 @@ TEST(Copy, ShowsItsOwnProcessesOnly)
     EXPECT_EQ(processes, (std::set<std::string>{"1", std::to_string(getpid())}));
 }
 
-TEST(Copy, HasAnEmptyRunFolder)
+TEST(Copy, HasAnEmptyRunDirectory)
 {
     EXPECT_EQ(namesIn("/run"), std::set<std::string>());
 }
@@ -67,7 +67,7 @@ TEST(Copy, DoesNotChangeTheModeOfADevice)
     EXPECT_EQ(errno, EROFS);
 }
 
-TEST(Copy, GivesOutTerminalsOfItsOwn)
+TEST(Copy, HasItsOwnTerminals)
 {
     int const terminal = posix_openpt(O_RDWR | O_NOCTTY);
     ASSERT_GE(terminal, 0);
@@ -98,7 +98,7 @@ protected:
     }
 };
 
-TEST_P(Privilege, IsGoneFromEverySet)
+TEST_P(Privilege, IsMissingFromEverySet)
 {
     __user_cap_header_struct header{_LINUX_CAPABILITY_VERSION_3, 0};
     __user_cap_data_struct data[_LINUX_CAPABILITY_U32S_3]{};
@@ -145,7 +145,7 @@ TEST(Copy, LetsACommandBecomeAnotherUser)
     EXPECT_EQ(std::system("su -s /bin/sh -c 'test $(id -un) = nobody' nobody"), 0);
 }
 
-TEST(Copy, LetsRootAdministerItAllTheSame)
+TEST(Copy, LetsRootAdministerAccounts)
 {
     EXPECT_EQ(std::system("useradd -m jdoe && chage -M 90 jdoe && echo jdoe:pw | chpasswd && "
                           "printf 'pw\\npw\\n' | passwd jdoe && groupadd staffers && usermod -G "
@@ -163,7 +163,8 @@ TEST(Copy, ReapsProcessesWhoseParentIsGone)
     if (child == 0) {
         pid_t const orphan = fork();
         if (orphan == 0) {
-            // Ends once nobody else can write: when its parent has gone and the test lets it.
+            // Ends when no process can write any more: its parent has ended and the test closes its
+            // end.
             char end = 0;
             close(life[1]);
             _exit(read(life[0], &end, 1) == 0 ? 0 : 1);
@@ -174,7 +175,7 @@ TEST(Copy, ReapsProcessesWhoseParentIsGone)
     ASSERT_EQ(read(number[0], &orphan, sizeof orphan), static_cast<ssize_t>(sizeof orphan));
     waitpid(child, nullptr, 0);
     close(life[1]);
-    while (kill(orphan, 0) == 0) // a process that nobody reaps keeps its number for ever
+    while (kill(orphan, 0) == 0) // a process that is not reaped keeps its number
         sched_yield();
     EXPECT_EQ(errno, ESRCH);
 }
@@ -188,7 +189,7 @@ protected:
     }
 };
 
-TEST_P(PowerCommand, OnlySaysAndNotesWhatItWasAskedFor)
+TEST_P(PowerCommand, OnlyPrintsAndRecordsItsArguments)
 {
     std::string const path = GetParam();
     if (!isOnTheMachine())
@@ -205,7 +206,7 @@ INSTANTIATE_TEST_SUITE_P(All, PowerCommand,
                          testing::Values("/sbin/shutdown", "/usr/sbin/shutdown", "/sbin/reboot",
                                          "/sbin/halt", "/sbin/poweroff"));
 
-TEST(Copy, HasAShutdownCommandFoundByNameAlone)
+TEST(Copy, HasAShutdownCommandInPath)
 {
     std::system("shutdown -h now");
     ASSERT_EQ(mihost::refusedPowerCommands().size(), 1U);

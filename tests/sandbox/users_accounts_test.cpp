@@ -1,4 +1,4 @@
-// Users and groups as the real account tools make them, and what writes to user nodes really do.
+// Users and groups made by the real account tools, and the effects of writes to user nodes.
 
 #include "host/Properties.h"
 #include "tests/support/Lines.h"
@@ -65,7 +65,7 @@ protected:
         run("chage -d 2020-01-15 -m 1 -M 90 -W 14 -I 20 -E 2030-06-01 jdoe");
     }
 
-    /** Loads the plug-in and notes every command line from then on. */
+    /** Loads the plug-in and records every command line from then on. */
     void load()
     {
         plugin.initialize();
@@ -94,7 +94,7 @@ protected:
     Plugin plugin;
 };
 
-TEST_F(RealAccounts, StandInTheTreeAsUseraddAndChageMadeThem)
+TEST_F(RealAccounts, AreInTheTreeAsUseraddAndChageMadeThem)
 {
     load();
     IC::MutableNode const& node = jdoe();
@@ -136,7 +136,7 @@ TEST_F(RealAccounts, CountLiveWithoutARefresh)
     EXPECT_EQ(plugin.find(IC::nodeType::user, "newcomer"), nullptr);
 }
 
-TEST_F(RealAccounts, HaveNoShadowFactsForAProcessThatMayNotReadThem)
+TEST_F(RealAccounts, HaveNoShadowFactsWithoutReadPermission)
 {
     ASSERT_EQ(seteuid(65534), 0);
     plugin.initialize();
@@ -148,7 +148,7 @@ TEST_F(RealAccounts, HaveNoShadowFactsForAProcessThatMayNotReadThem)
     EXPECT_EQ(stored(jdoe(), IC::property::inactiveTime), "1970-01-01 00:00:00");
 }
 
-TEST_F(RealAccounts, GetANewPasswordThatIsWritten)
+TEST_F(RealAccounts, HaveANewPasswordAfterAWrite)
 {
     load();
     write(IC::property::password, written("$6$salt$newhash"));
@@ -157,7 +157,7 @@ TEST_F(RealAccounts, GetANewPasswordThatIsWritten)
     EXPECT_FALSE(std::filesystem::exists("usrandpwd"));
 }
 
-TEST_F(RealAccounts, KeepTheirPasswordWhereChpasswdFails)
+TEST_F(RealAccounts, KeepTheirPasswordIfChpasswdFails)
 {
     machine::fake("/usr/sbin/chpasswd", "exit 1\n");
     load();
@@ -189,7 +189,7 @@ TEST_F(RealAccounts, BecomeInactiveOnADateThatIsWrittenAsADate)
     }
 }
 
-TEST_F(RealAccounts, Get99999InactiveDaysForADateBeforeTheExpiry)
+TEST_F(RealAccounts, Have99999InactiveDaysForADateBeforeTheExpiry)
 {
     load();
     write(IC::property::inactiveTime, written("2020-04-13 00:00:00"));
@@ -213,7 +213,7 @@ TEST_F(RealAccounts, ExpireOnADateThatIsWrittenAsADate)
     EXPECT_EQ(listed("Password expires"), "Feb 15, 2020");
 }
 
-TEST_F(RealAccounts, CountFrom1970WhereThePasswordNeverExpires)
+TEST_F(RealAccounts, CountFrom1970IfThePasswordNeverExpires)
 {
     run("chage -M -1 jdoe");
     load();
@@ -221,7 +221,7 @@ TEST_F(RealAccounts, CountFrom1970WhereThePasswordNeverExpires)
     EXPECT_EQ(machine::ran(), (Lines{"chage -l jdoe", "chage -I 18396 jdoe"}));
 }
 
-TEST_F(RealAccounts, AreNotDeletedSinceUserdelIsGivenTheirUid)
+TEST_F(RealAccounts, AreNotDeletedBecauseUserdelReceivesTheUid)
 {
     load();
     write(IC::property::deleteUser, {IC::Number(1U), true});
@@ -230,7 +230,7 @@ TEST_F(RealAccounts, AreNotDeletedSinceUserdelIsGivenTheirUid)
     EXPECT_TRUE(std::filesystem::exists("/home/jdoe"));
 }
 
-TEST_F(RealAccounts, AreDeletedWithTheirHomeWhereTheUidIsTheName)
+TEST_F(RealAccounts, AreDeletedWithTheirHomeIfTheUidIsTheName)
 {
     run("useradd --badname -u 4712 -m 4712");
     load();
@@ -244,7 +244,7 @@ TEST_F(RealAccounts, AreDeletedWithTheirHomeWhereTheUidIsTheName)
     EXPECT_FALSE(std::filesystem::exists("/home/4712"));
 }
 
-TEST_F(RealAccounts, StandInTheirGroupsAsGroupaddAndUsermodMadeThem)
+TEST_F(RealAccounts, AreInTheirGroupsAsGroupaddAndUsermodMadeThem)
 {
     run("useradd -g jdoe -M anna");
     run("groupadd -g 4713 team");
@@ -291,7 +291,7 @@ TEST(LaidMachine, ShowsItsUsersAndGroupsInTheOrderOfItsFiles)
               (Lines{"root", "anna", "ben", "anna,ben,carl"}));
 }
 
-TEST(LaidMachine, ShowsAGroupOfTenThousandMembersWhole)
+TEST(LaidMachine, ShowsAllMembersOfAGroupOfTenThousand)
 {
     machine::lay("users-and-groups");
     std::string members = "user10000";

@@ -13,7 +13,7 @@ namespace
 constexpr int refused = 99;
 }
 
-int Caller::speaker = -1;
+int Caller::writer = -1;
 
 Caller::Caller(Inside inside, std::string const& overlay, std::function<void()> const& before)
     : process_(-1)
@@ -21,13 +21,13 @@ Caller::Caller(Inside inside, std::string const& overlay, std::function<void()> 
     int ends[2];
     if (pipe(ends) != 0)
         throw std::runtime_error("no pipe");
-    ear_ = mihost::Descriptor(ends[0]);
-    mihost::Descriptor mouth(ends[1]);
+    readEnd_ = mihost::Descriptor(ends[0]);
+    mihost::Descriptor writeEnd(ends[1]);
     process_ = fork();
     if (process_ != 0)
         return;
-    ear_.reset();
-    speaker = mouth.get();
+    readEnd_.reset();
+    writer = writeEnd.get();
     before();
     if (auto const reason = mihost::enterSandbox(overlay)) {
         say(*reason);
@@ -46,7 +46,7 @@ Caller::~Caller()
 
 void Caller::say(std::string const& text)
 {
-    if (::write(speaker, text.data(), text.size()) < 0)
+    if (::write(writer, text.data(), text.size()) < 0)
         _exit(refused);
 }
 
@@ -55,7 +55,7 @@ std::string Caller::hear(std::size_t length)
     std::string text(length, '\0');
     std::size_t got = 0;
     while (got < length) {
-        ssize_t const count = read(ear_.get(), text.data() + got, length - got);
+        ssize_t const count = read(readEnd_.get(), text.data() + got, length - got);
         if (count <= 0)
             break;
         got += static_cast<std::size_t>(count);

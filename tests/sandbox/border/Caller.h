@@ -12,8 +12,8 @@
 /**
  * A process that calls enterSandbox, seen from the machine itself.
  *
- * The code given runs inside the copy, which talks to the test through a pipe. The pipe's end is
- * seen once every process of the copy is gone.
+ * The code given runs inside the copy, which talks to the test through a pipe. The pipe ends when
+ * every process of the copy is gone.
  */
 class Caller
 {
@@ -22,7 +22,7 @@ public:
 
     /**
      * @param inside   what runs in the copy; its result is the exit code
-     * @param overlay  a folder to lay over the copy
+     * @param overlay  a directory to lay over the copy
      * @param before   what the calling process does first
      */
     explicit Caller(
@@ -35,10 +35,10 @@ public:
     /** Sends text to the test, from inside. */
     static void say(std::string const& text);
 
-    /** Waits until as many bytes were said; fewer where all that could speak have gone. */
+    /** Reads as many bytes; fewer if every process of the copy is gone before. */
     std::string hear(std::size_t length);
 
-    /** All that is said from now on until every process of the copy is gone. */
+    /** Reads until every process of the copy is gone. */
     std::string hearAll();
 
     void send(int signal) const;
@@ -47,16 +47,16 @@ public:
     int wait();
 
 private:
-    static int speaker;
+    static int writer;
 
-    mihost::Descriptor ear_;
+    mihost::Descriptor readEnd_;
     pid_t process_;
 };
 
 /** Whether anything is there, even a dangling link. */
 bool exists(std::string const& path);
 
-/** Skips its tests where no copy can be had, unless MI_SANDBOX_REQUIRED is 1. */
+/** Skips its tests if no copy can be made, unless MI_SANDBOX_REQUIRED is 1. */
 class BorderTest : public testing::Test
 {
 protected:

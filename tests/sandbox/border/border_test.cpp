@@ -36,14 +36,14 @@ std::string hostName()
     return system.nodename;
 }
 
-/** Writes and says whether the text is there then. */
+/** Writes a file. @return whether it then has the text */
 bool wrote(std::string const& path, std::string const& text)
 {
     std::ofstream(path) << text;
     return contentOf(path) == text;
 }
 
-/** From here on the calling process's mounts are its own; nobody else sees them. */
+/** Gives the calling process its own mounts, which no other process sees. */
 void ownMounts()
 {
     if (unshare(CLONE_NEWNS) != 0 ||
@@ -103,7 +103,7 @@ TEST_F(Border, AccountsMadeInsideDoNotShowOnTheMachine)
     EXPECT_EQ(contentOf("/etc/passwd"), before);
 }
 
-TEST_F(Border, MountsOfTheMachineStayAsTheyAreWhileACopyIsThere)
+TEST_F(Border, MountsOfTheMachineAreUnchangedDuringACopy)
 {
     std::string const before = mountTable();
     Caller caller([]() -> int {
@@ -132,7 +132,7 @@ TEST_F(Border, MountsMadeInsideDoNotShowOnTheMachine)
     caller.wait();
 }
 
-TEST_F(Border, ACrashInsideLeavesNothingAndShowsAsACrash)
+TEST_F(Border, ACrashInsideLeavesNothingAndIsReported)
 {
     std::string const mounts = mountTable();
     ScratchFolder const folder;
@@ -163,7 +163,7 @@ class ForwardedSignals : public BorderTest, public testing::WithParamInterface<i
 {
 };
 
-TEST_P(ForwardedSignals, EndTheSandboxedProcessAndTheCallerAlike)
+TEST_P(ForwardedSignals, EndTheSandboxedProcessAndTheCaller)
 {
     Caller caller([]() -> int {
         Caller::say(".");
@@ -217,7 +217,7 @@ TEST_F(Border, ATerminalsInterruptReachesTheSandboxedProcessOnce)
     char const interrupt = '\x03';
     ASSERT_EQ(write(terminal.get(), &interrupt, 1), 1);
     EXPECT_EQ(caller.hear(1), "i");
-    caller.send(SIGTERM); // comes after whatever the interrupt brought with it
+    caller.send(SIGTERM); // arrives after everything that the interrupt causes
     EXPECT_EQ(caller.hearAll(), "");
 }
 
@@ -235,13 +235,13 @@ TEST_F(Border, EverythingInsideDiesWithTheCaller)
     caller.wait();
 }
 
-TEST_F(Border, WorksWhereTheCallerWasStartedWithChildrenIgnored)
+TEST_F(Border, WorksIfTheCallerIgnoresItsChildren)
 {
     Caller caller([] { return 42; }, "", [] { std::signal(SIGCHLD, SIG_IGN); });
     EXPECT_EQ(WEXITSTATUS(caller.wait()), 42);
 }
 
-TEST_F(Border, TextKeptBackByTheCallerIsWrittenOnce)
+TEST_F(Border, BufferedTextOfTheCallerIsWrittenOnce)
 {
     ScratchFolder const folder;
     std::string const path = folder.path("out");
@@ -285,7 +285,7 @@ template <class Call> int abstractSocket(std::string const& name, Call call)
     return call(socket, reinterpret_cast<sockaddr const*>(&address), sizeof address);
 }
 
-TEST_F(Border, AbstractSocketsOfTheMachineAreNotInside)
+TEST_F(Border, AbstractSocketsOfTheMachineAreNotVisibleInside)
 {
     std::string const name = "oswmi-border-" + std::to_string(getpid());
     Caller caller(
@@ -297,7 +297,7 @@ TEST_F(Border, AbstractSocketsOfTheMachineAreNotInside)
     EXPECT_EQ(caller.wait(), 0);
 }
 
-TEST_F(Border, TheNetworkInsideIsItsOwnLoopbackAlone)
+TEST_F(Border, TheNetworkInsideIsOnlyItsOwnLoopback)
 {
     Caller caller([] {
         std::string said;
@@ -306,7 +306,7 @@ TEST_F(Border, TheNetworkInsideIsItsOwnLoopbackAlone)
             said += interface->if_name + std::string(" ");
         if_freenameindex(all);
         Caller::say(said);
-        // Something listens on the loopback, and something else gets through to it.
+        // A listener on the loopback can be reached.
         int const listener = socket(AF_INET, SOCK_STREAM, 0);
         sockaddr_in address{};
         address.sin_family = AF_INET;
@@ -334,7 +334,7 @@ TEST_F(Border, OtherFileSystemsAreCopiedOnWriteToo)
 {
     ScratchFolder const folder;
     std::string const file = folder.path("disk/sub folder,:\\/file");
-    // In a mount namespace of the caller's own, a second file system.
+    // A second file system, in the caller's own mount namespace.
     Caller caller(
         [&file] {
             Caller::say(contentOf(file));
@@ -349,7 +349,7 @@ TEST_F(Border, OtherFileSystemsAreCopiedOnWriteToo)
             folder.write("disk/sub folder,:\\/file", "outer");
             mount("tmpfs", (disk + "/sub folder,:\\").c_str(), "tmpfs", 0, "");
             folder.write("disk/sub folder,:\\/file", "before");
-            // The machine, from here on, is what this process sees; it looks once all is over.
+            // From here on, the machine is what this process sees; it checks it at the end.
             if (pid_t const child = fork()) {
                 int status = 0;
                 waitpid(child, &status, 0);
@@ -374,7 +374,7 @@ TEST_F(Border, ShowsAnUnsuitableFileSystemReadOnly)
         [&folder, &disk] {
             folder.write("disk/none", "");
             ownMounts();
-            // Overlays can stand on one another, but not any number of them.
+            // Overlays can be stacked, but only a few deep.
             if (mount("tmpfs", disk.c_str(), "tmpfs", 0, "") != 0 || chdir(disk.c_str()) != 0)
                 _exit(1);
             for (char const* part : {"0", "1", "2", "u1", "u2", "w1", "w2"})
@@ -434,7 +434,7 @@ TEST_F(Border, KeepsTheWorkingDirectory)
     EXPECT_EQ(caller.hearAll(), folder.name());
 }
 
-TEST_F(Border, GoesToTheRootWhereTheWorkingDirectoryIsNotInTheCopy)
+TEST_F(Border, GoesToTheRootIfTheCopyLacksTheWorkingDirectory)
 {
     Caller caller(
         [] {

@@ -1,4 +1,4 @@
-// What a copy of the machine says that was changed in it, where the machine's own files are below.
+// The changes that a copy of the machine reports, on top of the machine's own files.
 
 #include "mihost/sandbox/Changes.h"
 #include "tests/sandbox/border/Caller.h"
@@ -32,7 +32,7 @@ std::string shown(std::optional<FileState> const& state)
     return text + (state->target.empty() ? "" : ">" + state->target);
 }
 
-/** One line for each change: the path below the folder, the state before and the one after. */
+/** One line for each change: the path below the directory, the state before, the state after. */
 std::string shown(std::vector<PathChange> const& changes, std::string const& folder)
 {
     std::string text;
@@ -57,7 +57,7 @@ protected:
         fs::create_symlink("file", folder_.path("link"));
     }
 
-    /** What is said of what was done in a copy. */
+    /** The changes that a copy reports after an act in it. */
     std::string changesOf(
         std::function<void()> const& act, std::function<void()> const& earlier = [] {},
         std::function<void()> const& before = [] {}) const
@@ -80,13 +80,13 @@ protected:
     ScratchFolder const folder_;
 };
 
-TEST_F(Changes, AreNoneWhereNothingIsDone)
+TEST_F(Changes, AreNoneIfNothingIsDone)
 {
     EXPECT_EQ(changesOf([] {}), "");
     EXPECT_EQ(changesOf([] { contentOf("file"); }), "");
 }
 
-TEST_F(Changes, NameWhatCame)
+TEST_F(Changes, NameCreatedFiles)
 {
     EXPECT_EQ(changesOf([] {
                   fs::create_directories("new/deep");
@@ -101,7 +101,7 @@ TEST_F(Changes, NameWhatCame)
               "new/pipe - 10600:0:0\n");
 }
 
-TEST_F(Changes, NameEverythingThatWent)
+TEST_F(Changes, NameRemovedFiles)
 {
     EXPECT_EQ(changesOf([] {
                   fs::remove("file");
@@ -114,7 +114,7 @@ TEST_F(Changes, NameEverythingThatWent)
               "home/sub/two 100644:0:0 -\n");
 }
 
-TEST_F(Changes, NameWhatGotAnotherContentModeOrOwner)
+TEST_F(Changes, NameFilesWithNewContentModeOrOwner)
 {
     EXPECT_EQ(changesOf([] {
                   std::ofstream("file") << "Text"; // as long as before
@@ -129,7 +129,7 @@ TEST_F(Changes, NameWhatGotAnotherContentModeOrOwner)
               "link 120777:0:0>file 120777:0:0>home\n");
 }
 
-TEST_F(Changes, AreNotWhatIsWrittenAsItWas)
+TEST_F(Changes, ExcludeWritesOfTheSameContent)
 {
     EXPECT_EQ(changesOf([] {
                   std::ofstream("file") << "text";
@@ -142,7 +142,7 @@ TEST_F(Changes, AreNotWhatIsWrittenAsItWas)
               "");
 }
 
-TEST_F(Changes, AreNotWhatWasDoneEarlier)
+TEST_F(Changes, ExcludeEarlierChanges)
 {
     auto const earlier = [] {
         std::ofstream("file") << "earlier";
@@ -163,7 +163,7 @@ TEST_F(Changes, AreNotWhatWasDoneEarlier)
               "home/one - 100644:0:0\n");
 }
 
-TEST_F(Changes, SeeADirectoryThatWasMadeAgain)
+TEST_F(Changes, ShowADirectoryThatWasMadeAgain)
 {
     EXPECT_EQ(changesOf([] {
                   fs::remove_all("home");
@@ -176,7 +176,7 @@ TEST_F(Changes, SeeADirectoryThatWasMadeAgain)
               "home/three - 100644:0:0\n");
 }
 
-TEST_F(Changes, SeeADirectoryThatWasMoved)
+TEST_F(Changes, ShowADirectoryThatWasMoved)
 {
     EXPECT_EQ(changesOf([] { EXPECT_EQ(std::system("mv home house"), 0); }),
               "home 40755:0:0 -\n"
@@ -189,7 +189,7 @@ TEST_F(Changes, SeeADirectoryThatWasMoved)
               "house/sub/two - 100644:0:0\n");
 }
 
-TEST_F(Changes, SeeAFileInTheDirectorysPlace)
+TEST_F(Changes, ShowAFileThatReplacesADirectory)
 {
     EXPECT_EQ(changesOf([] {
                   fs::remove_all("home");
@@ -201,7 +201,7 @@ TEST_F(Changes, SeeAFileInTheDirectorysPlace)
               "home/sub/two 100644:0:0 -\n");
 }
 
-TEST_F(Changes, AreSeenOnEveryFileSystem)
+TEST_F(Changes, AreFoundOnEveryFileSystem)
 {
     fs::create_directory(folder_.path("disk"));
     auto const mountDisk = [this] {
@@ -223,7 +223,7 @@ TEST_F(Changes, AreSeenOnEveryFileSystem)
               "file 100644:0:0 -\n");
 }
 
-TEST_F(Changes, HoldTheTextOfFilesInEtc)
+TEST_F(Changes, IncludeTheTextOfFilesInEtc)
 {
     Caller caller([this] {
         std::ofstream("/etc/oswmi-old") << "one\n";
@@ -250,7 +250,7 @@ TEST_F(Changes, HoldTheTextOfFilesInEtc)
     EXPECT_EQ(caller.wait(), 0);
 }
 
-TEST_F(Changes, CannotReachTheMachineThroughWhatTheyAreReadFrom)
+TEST_F(Changes, LeaveNoDescriptorThatReachesTheMachine)
 {
     std::string const file = folder_.path("file");
     Caller caller([&file] {

@@ -56,7 +56,7 @@ TEST_F(Chroot, IsCopiedOnWrite)
     EXPECT_FALSE(exists(root_.path("sbin/shutdown")));
 }
 
-TEST_F(Chroot, IsCopiedWithWhatIsMountedInIt)
+TEST_F(Chroot, IsCopiedWithItsMounts)
 {
     std::filesystem::create_directory(root_.path("disk"));
     Caller caller(
@@ -73,7 +73,7 @@ TEST_F(Chroot, IsCopiedWithWhatIsMountedInIt)
                 _exit(1);
             root_.write("disk/file", "before");
             enter();
-            // The machine, from here on, is what this process sees; it looks once all is over.
+            // From here on, the machine is what this process sees; it checks it at the end.
             if (pid_t const child = fork()) {
                 int status = 0;
                 waitpid(child, &status, 0);
@@ -85,7 +85,7 @@ TEST_F(Chroot, IsCopiedWithWhatIsMountedInIt)
     EXPECT_EQ(caller.wait(), 0);
 }
 
-TEST_F(Chroot, LeavesTheMountsOfTheMachineAsTheyAre)
+TEST_F(Chroot, DoesNotChangeTheMountsOfTheMachine)
 {
     std::string const before = contentOf("/proc/self/mountinfo");
     Caller caller(
@@ -99,7 +99,7 @@ TEST_F(Chroot, LeavesTheMountsOfTheMachineAsTheyAre)
     EXPECT_EQ(contentOf("/proc/self/mountinfo"), before);
 }
 
-TEST_F(Chroot, IsNotLeftByTheCopy)
+TEST_F(Chroot, CannotBeLeftFromTheCopy)
 {
     // Nothing of the file system around the directory is in the copy, whichever way is tried.
     Caller caller(

@@ -1,4 +1,4 @@
-// The folder laid over a copy, and the calls for a copy that are refused.
+// The directory laid over a copy, and the reasons to refuse a copy.
 
 #include "tests/sandbox/border/Caller.h"
 #include "tests/support/Lines.h"
@@ -21,7 +21,7 @@ struct stat statusOf(std::string const& path)
     return status;
 }
 
-/** What is at these places, line by line: mode, owner, and the text or the link's target. */
+/** One line for each path: mode, owner, and the text or the link's target. */
 std::string describe(std::initializer_list<char const*> paths)
 {
     std::string lines;
@@ -59,7 +59,7 @@ protected:
         return said;
     }
 
-    /** Why no copy could be had with these options. */
+    /** The reason why no copy can be made with these options. */
     static std::string reason(
         std::string const& overlay, std::function<void()> const& before = [] {})
     {
@@ -87,14 +87,14 @@ TEST_F(Overlay, ReplacesFilesAndLinksOfTheMachine)
               "644 0:0 root:x:0:0::/root:/bin/sh\n\n644 0:0 none\n");
 }
 
-TEST_F(Overlay, KeepsSymbolicLinksAsTheyAre)
+TEST_F(Overlay, KeepsSymbolicLinks)
 {
     folder.write("etc/oswmi/file", "text");
     ASSERT_EQ(symlink("no/such/place", folder.path("etc/oswmi/link").c_str()), 0);
     EXPECT_EQ(laid({"/etc/oswmi/link"}), "777 0:0 no/such/place\n");
 }
 
-TEST_F(Overlay, NewFoldersKeepTheirModesAndOldOnesAreLeftAlone)
+TEST_F(Overlay, SetsTheModesOfNewDirectoriesOnly)
 {
     folder.write("tmp/oswmi-new/file", "");
     ASSERT_EQ(chmod(folder.path("tmp/oswmi-new").c_str(), 02750), 0);
@@ -102,40 +102,40 @@ TEST_F(Overlay, NewFoldersKeepTheirModesAndOldOnesAreLeftAlone)
     EXPECT_EQ(laid({"/tmp", "/tmp/oswmi-new"}), "1777 0:0 \n2750 0:0 \n");
 }
 
-TEST_F(Overlay, FollowsTheMachinesLinksToFolders)
+TEST_F(Overlay, FollowsTheMachinesLinksToDirectories)
 {
     ASSERT_EQ(statusOf("/bin").st_mode & S_IFMT, static_cast<unsigned int>(S_IFLNK));
     chmod(folder.write("bin/oswmi", "text").c_str(), 0755);
     EXPECT_EQ(laid({"/usr/bin/oswmi"}), "755 0:0 text\n");
 }
 
-TEST_F(Overlay, ShadowFilesThatEverybodyCouldReadBecomeRootsAlone)
+TEST_F(Overlay, MakesWorldReadableShadowFilesPrivate)
 {
     chmod(folder.write("etc/shadow", "").c_str(), 0644);
     chmod(folder.write("etc/gshadow", "").c_str(), 0604);
     EXPECT_EQ(laid({"/etc/shadow", "/etc/gshadow"}), "600 0:0 \n600 0:0 \n");
 }
 
-TEST_F(Overlay, ShadowFilesWithAModeOfTheirOwnKeepIt)
+TEST_F(Overlay, KeepsOtherModesOfShadowFiles)
 {
     chmod(folder.write("etc/shadow", "").c_str(), 0640);
     EXPECT_EQ(laid({"/etc/shadow"}), "640 0:0 \n");
 }
 
-TEST_F(Overlay, ReplacesFilesInTemporaryAndRunFolders)
+TEST_F(Overlay, ReplacesFilesInTemporaryAndRunDirectories)
 {
     folder.write("run/oswmi", "run");
     folder.write("dev/shm/oswmi", "shm");
     EXPECT_EQ(laid({"/run/oswmi", "/dev/shm/oswmi"}), "644 0:0 run\n644 0:0 shm\n");
 }
 
-TEST_F(Overlay, DoesNotBringBackThePowerCommands)
+TEST_F(Overlay, DoesNotRestoreThePowerCommands)
 {
     chmod(folder.write("sbin/shutdown", "the real one").c_str(), 0755);
     EXPECT_NE(laid({"/sbin/shutdown"}), "755 0:0 the real one\n");
 }
 
-TEST_F(Overlay, IsRefusedWithTheReasonWhereTheFolderIsMissing)
+TEST_F(Overlay, IsRefusedWithTheReasonIfItIsMissing)
 {
     EXPECT_EQ(reason(folder.path("missing")), "cannot open the directory " +
                                                   folder.path("missing") +
@@ -149,7 +149,7 @@ TEST_F(Overlay, IsRefusedWithTheReasonForAFile)
               "cannot open the directory " + folder.path("file") + ": Not a directory");
 }
 
-TEST_F(Overlay, RefusesWhatIsNeitherFileLinkNorFolder)
+TEST_F(Overlay, RefusesOtherThanFilesLinksAndDirectories)
 {
     folder.write("etc/file", "");
     ASSERT_EQ(mkfifo(folder.path("etc/pipe").c_str(), 0600), 0);
@@ -157,13 +157,13 @@ TEST_F(Overlay, RefusesWhatIsNeitherFileLinkNorFolder)
                                      "a directory: Invalid argument");
 }
 
-TEST_F(Overlay, IsRefusedWithTheReasonWhereAFileWouldReplaceAFolder)
+TEST_F(Overlay, IsRefusedIfAFileWouldReplaceADirectory)
 {
     folder.write("etc", "");
     EXPECT_EQ(reason(folder.name()), "cannot replace /etc: Directory not empty");
 }
 
-TEST_F(Overlay, ARefusalLeavesTheCallerWhereItWas)
+TEST_F(Overlay, ARefusalDoesNotMoveTheCaller)
 {
     ASSERT_EQ(mkfifo(folder.path("pipe").c_str(), 0600), 0);
     std::string const before = contentOf("/proc/self/mountinfo");

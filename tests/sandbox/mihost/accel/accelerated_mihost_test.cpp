@@ -1,4 +1,4 @@
-// mihost shows and logs with the accelerator what it does without.
+// mihost shows and logs the same with and without the accelerator.
 
 #include "TestPaths.h"
 #include "tests/support/KernelModules.h"
@@ -46,7 +46,7 @@ protected:
     }
 };
 
-/** Without the time of the run, and the one of the boot, which is counted back from it. */
+/** Without the time of the run, and that of the boot, which is computed from it. */
 Lines traceLines(std::string const& file)
 {
     static std::regex const moment(
@@ -57,7 +57,7 @@ Lines traceLines(std::string const& file)
     return lines;
 }
 
-TEST_F(MihostAccel, ShowsAndTracesLineByLineWhatMihostDoesWithoutIt)
+TEST_F(MihostAccel, ShowsAndTracesTheSameAsWithoutIt)
 {
     Outcome const plain =
         mihostRun({"--trace", "/tmp/plain", "--json", "--timing", "--no-accel", "list", "drivers"});
@@ -85,7 +85,7 @@ TEST_F(MihostAccel, ShowsWithTimingHowEachCommandWasAnswered)
     std::map<std::string, std::pair<int, int>> counts;
     for (Json const& row : answers)
         counts[row.at("command")] = {row.at("answered"), row.at("run")};
-    // Each of 50 entries has two properties that ask for the count three times.
+    // Each of 50 entries has two properties that count the lines three times.
     EXPECT_EQ(counts["wc"], std::pair(1 + 50 * 2 * 3, 0));
     EXPECT_EQ(counts["sed"], std::pair(100, 0));
     EXPECT_EQ(counts["date"].first + counts["date"].second, 48);

@@ -1,4 +1,4 @@
-// lsmod and modinfo, asked in both ways and compared byte by byte.
+// lsmod and modinfo, run and answered by the accelerator, and compared byte by byte.
 
 #include "tests/support/BothWays.h"
 #include "tests/support/KernelModules.h"
@@ -49,14 +49,14 @@ TEST(AccelLsmod, ListsHundredsOfModulesAsLsmodDoes)
     EXPECT_EQ(answered("lsmod"), real("lsmod"));
 }
 
-TEST(AccelLsmod, ListsNothingButTheHeadWhenNothingIsLoaded)
+TEST(AccelLsmod, ListsOnlyTheHeaderIfNothingIsLoaded)
 {
     kernelModules::load({});
     EXPECT_EQ(answered("lsmod"), "Module                  Size  Used by\n");
     EXPECT_EQ(answered("lsmod"), real("lsmod"));
 }
 
-TEST(AccelLsmod, StepsAsideWhereLsmodWouldComplain)
+TEST(AccelLsmod, GivesNoAnswerWhereLsmodPrintsErrors)
 {
     kernelModules::load({{"one", 1, 0, {}}});
     fs::remove("/sys/module/one/holders");
@@ -73,7 +73,7 @@ TEST(AccelLsmod, ListsTheModulesOfThisMachine)
     EXPECT_EQ(answered("lsmod"), real("lsmod"));
 }
 
-TEST(AccelModinfo, TellsWhatModinfoTells)
+TEST(AccelModinfo, AnswersAsModinfoDoes)
 {
     kernelModules::install({{"kernel/one.ko",
                              {"version=1.2.3", "description=One and only", "author=A", "author=B",
@@ -129,7 +129,11 @@ std::string randomModule(std::mt19937& random)
     return content;
 }
 
-/** An answer is modinfo's, and none is given where modinfo complains. @return whether one lacks */
+/**
+ * Expects that an answer is what modinfo prints, and that there is none if modinfo prints an error.
+ *
+ * @return whether there is no answer although modinfo prints no error
+ */
 bool isLeftOut(std::string const& name)
 {
     std::string const text = real("modinfo " + name);
@@ -140,7 +144,7 @@ bool isLeftOut(std::string const& name)
     return !own && !complained;
 }
 
-/** Both ways agree, and the accelerator steps aside exactly where modinfo complains. */
+/** Expects the output of modinfo, and an answer unless modinfo prints an error. */
 void expectAgreement(std::string const& name)
 {
     EXPECT_FALSE(isLeftOut(name)) << name;
@@ -203,7 +207,7 @@ TEST(AccelModinfo, AgreesWithModinfoOnAmbiguousNames)
         expectAgreement(name);
 }
 
-TEST(AccelModinfo, SeesWhatChangedSinceTheLastTime)
+TEST(AccelModinfo, NoticesChangesSinceTheLastAnswer)
 {
     for (char const* version : {"version=1", "version=2"}) {
         kernelModules::install({{"one.ko", {version}}});

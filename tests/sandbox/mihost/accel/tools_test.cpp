@@ -1,5 +1,5 @@
-// On a machine with other shells, tools, locales and zones, answers are those of the ones that are
-// there.
+// Machines with other shells, tools, locales and zones: there is no answer, or it is what the tool
+// of that machine prints.
 
 #include "TestPaths.h"
 #include "tests/support/ComparedLog.h"
@@ -88,7 +88,7 @@ INSTANTIATE_TEST_SUITE_P(
                     Change{"cp /bin/dash /bin/other && ln -sf other /bin/sh", "date", unknownShell},
                     Change{"ln -sf busybox /bin/sh", "lsmod", unknownShell}));
 
-TEST_F(AccelTools, AreAnsweredUnlessALinkLeadsToAFolderOfOthers)
+TEST_F(AccelTools, AreAnsweredUnlessALinkLeadsToAWritableDirectory)
 {
     run("mkdir /opt/tools && cp /usr/bin/wc /opt/tools && ln -sf /opt/tools/wc /usr/bin/wc");
     EXPECT_TRUE(answered(count));
@@ -111,7 +111,7 @@ TEST_F(AccelTools, AreAnsweredWhenTheShellIsBashOrBusybox)
     EXPECT_FALSE(answered(count));
 }
 
-/** A machine whose tools are those of busybox, as links or, hard to tell, as programs. */
+/** A machine whose tools are those of busybox, as symbolic or as hard links. */
 class AccelBusybox : public testing::TestWithParam<char const*>
 {
 protected:
@@ -124,7 +124,7 @@ protected:
 
 INSTANTIATE_TEST_SUITE_P(Kinds, AccelBusybox, testing::Values("ln -sf", "ln -f"));
 
-TEST_P(AccelBusybox, ReadsALogAsIsAnsweredWhateverHappensToIt)
+TEST_P(AccelBusybox, ReadsALogLikeItsAnswersWhateverHappensToIt)
 {
     EXPECT_NE(real("sed --help").find("BusyBox"), std::string::npos);
     EXPECT_GT(percentOfSedsAnswered(8, 100), 50U);
@@ -143,7 +143,7 @@ TEST_P(AccelBusybox, PrintsTheDateThatIsAnsweredInEveryZone)
     EXPECT_GE(bothways::countOf("date").answered, 5U);
 }
 
-TEST_P(AccelBusybox, IsRunForADateInALocaleThatItDoesNotFollow)
+TEST_P(AccelBusybox, IsRunForADateInALocaleThatItIgnores)
 {
     run("localedef -i de_DE -f UTF-8 de_DE.UTF-8");
     setenv("LC_ALL", "de_DE.UTF-8", 1);
@@ -160,8 +160,8 @@ INSTANTIATE_TEST_SUITE_P(Languages, AccelLocale,
                          testing::Values("ar_SA", "de_DE", "en_GB", "en_US", "fa_IR", "ja_JP",
                                          "ru_RU", "th_TH"));
 
-/** In a fresh process, whose locale is that of its beginning. date runs first, then is answered. */
-TEST_P(AccelLocale, GivesTheDateThatDateGives)
+/** In a new process, which has its locale from the start. date is run first, then answered. */
+TEST_P(AccelLocale, GivesTheDateThatDatePrints)
 {
     std::string const name = GetParam();
     run("localedef -i " + name + " -f UTF-8 " + name + ".UTF-8 2>/dev/null || test $? = 1");

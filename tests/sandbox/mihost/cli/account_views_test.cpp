@@ -42,7 +42,7 @@ bool holds(std::string const& text, std::string const& part)
     return text.find(part) != std::string::npos;
 }
 
-TEST_F(AccountViews, TellAboutOneUserWhatAPersonWantsToKnow)
+TEST_F(AccountViews, ShowOneUserAsText)
 {
     Outcome const outcome = mihostRun({"user", "jdoe"});
     EXPECT_EQ(outcome.code, 0);
@@ -102,7 +102,7 @@ TEST_F(AccountViews, SayWhyAnAccountHasNoNode)
     EXPECT_TRUE(user["must-change-password"].is_null());
 }
 
-TEST_F(AccountViews, TellAboutOneGroupWhatAPersonWantsToKnow)
+TEST_F(AccountViews, ShowOneGroupAsTextAndAsJson)
 {
     Outcome const outcome = mihostRun({"group", "crew"});
     EXPECT_EQ(outcome.out, "Group             crew\n"
@@ -116,7 +116,7 @@ TEST_F(AccountViews, TellAboutOneGroupWhatAPersonWantsToKnow)
     EXPECT_EQ(group["other-members"], Json::array());
 }
 
-TEST_F(AccountViews, EndWith4ForANameThatNobodyHas)
+TEST_F(AccountViews, ExitWith4ForAnUnknownName)
 {
     Outcome const user = mihostRun({"user", "jdeo"});
     EXPECT_EQ(user.code, 4);
@@ -135,7 +135,7 @@ TEST_F(AccountViews, ShowNoControlCharactersAtATerminal)
     EXPECT_TRUE(holds(run.output(), "UID                   65534\r\n")) << run.output();
 }
 
-TEST_F(AccountViews, SayWhatOnlyRootCanSee)
+TEST_F(AccountViews, SayWhatOnlyRootCanRead)
 {
     Outcome const outcome = runToEnd(
         {"/usr/bin/setpriv", "--reuid=65534", "--clear-groups", MIHOST_FILE, "user", "jdoe"});

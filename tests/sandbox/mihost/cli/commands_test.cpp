@@ -41,7 +41,7 @@ void makeMachine()
     machine::write("/var/log/messages", "Jan  2 03:04:05 first line\nJan  2 03:04:06 second\n");
 }
 
-TEST(MihostTree, IsWhatItShowsWithoutACommand)
+TEST(MihostTree, IsShownWithoutACommand)
 {
     makeMachine();
     EXPECT_EQ(mihostRun({}).out, mihostRun({"tree"}).out);
@@ -101,7 +101,7 @@ TEST(MihostTree, AsJsonIsAnArrayInTheOrderOfTheNodeList)
                             "log-entry"}));
 }
 
-TEST(MihostTree, AsJsonHoldsWhatAnswersOnlyLive)
+TEST(MihostTree, AsJsonIncludesLiveProperties)
 {
     makeMachine();
     Json const os = mihostJson({"tree"})[3];
@@ -134,7 +134,7 @@ TEST(MihostTree, HasValuesOfTheKindsThatTheCatalogueNames)
         }
 }
 
-TEST(MihostGet, ReadsLiveWhatTheNodeAnswersLive)
+TEST(MihostGet, ReadsLivePropertiesLive)
 {
     makeMachine();
     EXPECT_EQ(mihostRun({"get", "log:1", "message"}).out, " 81 message  *second*\n");
@@ -166,7 +166,7 @@ TEST(MihostGet, ExitsWith4ForAnUnknownNodeOrProperty)
     }
 }
 
-TEST(MihostGet, SaysSoWhereANodeHasNoProperties)
+TEST(MihostGet, ReportsANodeWithoutProperties)
 {
     Outcome const outcome = mihostRun({"get", "root"});
     EXPECT_EQ(outcome.code, 0);
@@ -174,7 +174,7 @@ TEST(MihostGet, SaysSoWhereANodeHasNoProperties)
     EXPECT_EQ(outcome.err, "mihost: node 'root' has no properties\n");
 }
 
-TEST(MihostGet, ExitsWith1WhereThePluginAnswersWithANonZeroStatus)
+TEST(MihostGet, ExitsWith1IfThePluginReturnsANonZeroStatus)
 {
     machine::lay("plain"); // no release file there, so no version is stored
     Outcome const outcome = mihostRun({"get", "os", "os-version"});
@@ -191,7 +191,7 @@ TEST(MihostList, IsATableOfOneKind)
                                                   "xfs          1.0             Driver of xfs\n");
 }
 
-TEST(MihostList, ShowsTheColumnsAskedFor)
+TEST(MihostList, ShowsTheRequestedColumns)
 {
     makeMachine();
     EXPECT_EQ(mihostRun({"list", "log", "--columns", "index,81"}).out, "index  message\n"
@@ -203,7 +203,7 @@ TEST(MihostList, ShowsTheColumnsAskedFor)
     EXPECT_EQ(list[0]["properties"]["message"]["value"], "*second*");
 }
 
-TEST(MihostList, PointsToTheDoctorWhereThereIsNothingOfTheKind)
+TEST(MihostList, PointsToTheDoctorIfThereIsNothingToList)
 {
     makeMachine();
     machine::write("/var/log/messages", "");
@@ -214,7 +214,7 @@ TEST(MihostList, PointsToTheDoctorWhereThereIsNothingOfTheKind)
     EXPECT_EQ(mihostRun({"--json", "list", "log"}).err, "");
 }
 
-TEST(MihostList, RefusesAKindThatIsNone)
+TEST(MihostList, RefusesAnUnknownKind)
 {
     EXPECT_EQ(mihostRun({"list", "things"}).code, 2);
 }
@@ -256,7 +256,7 @@ TEST(MihostTrace, IsJsonLinesInCallOrderWithBothLoggerOperations)
     EXPECT_EQ(lines[0].substr(0, 26), R"({"op":"log","function":"in)");
 }
 
-TEST(MihostTrace, GoesToStandardErrorWhenItIsADash)
+TEST(MihostTrace, GoesToStandardErrorForADash)
 {
     makeMachine();
     Outcome const outcome = mihostRun({"--trace", "-", "get", "os", "108"});
@@ -264,7 +264,7 @@ TEST(MihostTrace, GoesToStandardErrorWhenItIsADash)
     EXPECT_EQ(Json::parse(linesOf(outcome.err).at(0))["message"], "initialize: entry");
 }
 
-TEST(MihostTrace, ThatCannotBeWrittenIsToldAndExitsWith2)
+TEST(MihostTrace, ThatCannotBeWrittenIsReportedWithExitCode2)
 {
     makeMachine();
     Outcome const full = mihostRun({"--trace", "/dev/full", "get", "os", "108"});
@@ -343,7 +343,7 @@ TEST(MihostUsage, ExitsWith2AndOneLineForWrongArguments)
     }
 }
 
-TEST(MihostUsage, TellsWhatWasMeantOrWhereToReadOn)
+TEST(MihostUsage, SuggestsACorrectionOrTheHelp)
 {
     std::vector<std::pair<Lines, std::string>> const refusals = {
         {{"tre"}, "no command 'tre' (did you mean tree?)"},
@@ -389,7 +389,7 @@ TEST(MihostUsage, TakesOptionsBeforeAndAfterTheCommand)
               mihostRun({"--json", "get", "os", "108"}).out);
 }
 
-TEST(MihostDangers, NeedYesWhereThereIsNoTerminalToAsk)
+TEST(MihostDangers, NeedYesWithoutATerminal)
 {
     makeMachine();
     for (Lines const& arguments :
@@ -405,7 +405,7 @@ TEST(MihostDangers, NeedYesWhereThereIsNoTerminalToAsk)
     EXPECT_FALSE(machine::read("/var/log/messages").empty());
 }
 
-TEST(MihostPluginRun, LeavesNothingBehind)
+TEST(MihostPluginRun, LeavesNoFiles)
 {
     makeMachine();
     std::filesystem::create_directory("/tmp/private");
@@ -414,7 +414,7 @@ TEST(MihostPluginRun, LeavesNothingBehind)
     EXPECT_TRUE(std::filesystem::is_empty("/tmp/private"));
 }
 
-TEST(MihostPluginRun, GivesCommandsAPrivateFolderAndNoInput)
+TEST(MihostPluginRun, GivesCommandsAPrivateDirectoryAndNoInput)
 {
     makeMachine();
     machine::fake("/usr/sbin/lsmod",
@@ -433,7 +433,7 @@ TEST(MihostPluginRun, GivesCommandsAPrivateFolderAndNoInput)
     EXPECT_EQ(said[3], "700");
 }
 
-TEST(MihostPluginRun, TakesTheCodeSetOfTheLocaleWithoutLang)
+TEST(MihostPluginRun, UsesTheCodeSetOfTheLocaleWithoutLang)
 {
     makeMachine();
     unsetenv("LANG");

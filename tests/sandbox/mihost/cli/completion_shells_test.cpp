@@ -1,5 +1,4 @@
-// Completion as a person at a shell uses it: what Tab inserts is what mihost gets, and nothing
-// runs.
+// Completion in real shells: mihost receives what Tab inserts, and no other command runs.
 
 #include "TestPaths.h"
 #include "tests/support/Machine.h"
@@ -38,7 +37,7 @@ std::vector<Shell> const shells = {
      "source " + scripts + "mihost.fish; function fish_prompt; printf 're''ady> '; end\n"},
 };
 
-/** Names of accounts that a shell would act on if they were inserted as they are. */
+/** Names of accounts that a shell would interpret if they were inserted unquoted. */
 constexpr char const* hostile[] = {
     "ev`id>x`", "bl ank", "se;id>x", "do$(id>x)", "qu'o\"te", "ba\\ck",  "am&id>x",
     "st*r",     "ti~l",   "ex!cl",   "ha#sh",     "co[m]",    "br{a,b}", "pl+a@i=n",
@@ -118,7 +117,7 @@ TEST_P(ShellCompletion, InsertsNamesIntoOpenQuotes)
         }
 }
 
-TEST_P(ShellCompletion, GoesOnBehindAQuotedCharacter)
+TEST_P(ShellCompletion, ContinuesAfterAQuotedCharacter)
 {
     start();
     EXPECT_EQ(got("mihost get user:ev\\`id\\>\t\n"), "get\nuser:ev`id>x`\n");

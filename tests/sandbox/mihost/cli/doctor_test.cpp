@@ -68,7 +68,7 @@ protected:
         EXPECT_EQ(mihostRun({"doctor"}).code, 1) << name;
     }
 
-    /** That this is all that is missing, and nothing here fixes it. */
+    /** Expects that only this is missing, and that it cannot be fixed here. */
     static void expectNoFix(std::string const& name, std::string const& problem,
                             std::string const& why)
     {
@@ -95,7 +95,7 @@ protected:
     }
 };
 
-TEST_F(Doctor, FindsNothingMissingOnAWholeMachine)
+TEST_F(Doctor, FindsNothingMissingOnACompleteMachine)
 {
     Outcome const outcome = mihostRun({"doctor"});
     EXPECT_EQ(outcome.code, 0);
@@ -120,16 +120,16 @@ TEST_F(Doctor, ShowsWhatIsMissingLastWithItsEffectAndFix)
     machine::remove("/usr/sbin/lsmod");
     machine::remove("/usr/bin/lsmod");
     std::string const out = mihostRun({"doctor"}).out;
-    std::string const told = "missing  command lsmod: not found in PATH\n"
-                             "           effect   all drivers\n"
-                             "           Debian   apt-get install kmod\n"
-                             "           Red Hat  dnf install kmod\n"
-                             "1 of ";
-    EXPECT_NE(out.find(told), std::string::npos) << out;
-    EXPECT_GT(out.find(told), out.rfind("\nok  "));
+    std::string const paragraph = "missing  command lsmod: not found in PATH\n"
+                                  "           effect   all drivers\n"
+                                  "           Debian   apt-get install kmod\n"
+                                  "           Red Hat  dnf install kmod\n"
+                                  "1 of ";
+    EXPECT_NE(out.find(paragraph), std::string::npos) << out;
+    EXPECT_GT(out.find(paragraph), out.rfind("\nok  "));
 }
 
-TEST_F(Doctor, MissesEachCommandThatThePluginRuns)
+TEST_F(Doctor, ChecksEachCommandThatThePluginRuns)
 {
     for (std::string const command : {"lsmod",
                                       "modinfo",
@@ -161,7 +161,7 @@ TEST_F(Doctor, MissesEachCommandThatThePluginRuns)
                   "the method LocalGroupDel");
 }
 
-TEST_F(Doctor, TellsACommandThatIsThereFromAPathThatIsTooShort)
+TEST_F(Doctor, TellsAMissingCommandFromATooShortPath)
 {
     setenv("PATH", "/usr/bin:/bin", 1);
     expectMissing("command chpasswd", "not found in PATH", "writing password of users");
@@ -169,7 +169,7 @@ TEST_F(Doctor, TellsACommandThatIsThereFromAPathThatIsTooShort)
     EXPECT_EQ(need("command chpasswd")["red-hat"], "PATH=$PATH:/usr/sbin mihost");
 }
 
-TEST_F(Doctor, MissesAPasswdThatTakesPasswordsFromAPipe)
+TEST_F(Doctor, ReportsAPasswdWithoutStdin)
 {
     machine::fake("/usr/bin/passwd", "echo 'nothing of the kind'\n");
     expectNoFix("passwd --stdin", "not supported by passwd",
@@ -179,7 +179,7 @@ TEST_F(Doctor, MissesAPasswdThatTakesPasswordsFromAPipe)
                   "Password in methods: mihost passes a hash, other hosts store the plain text");
 }
 
-TEST_F(Doctor, MissesAUseraddThatKnowsTheOptionOfItsFamily)
+TEST_F(Doctor, ReportsAUseraddWithoutTheOptionOfItsFamily)
 {
     machine::fake("/usr/sbin/useradd",
                   "[ \"$*\" = -n ] && echo \"useradd: invalid option -- 'n'\"\n");
@@ -189,7 +189,7 @@ TEST_F(Doctor, MissesAUseraddThatKnowsTheOptionOfItsFamily)
     EXPECT_EQ(need("useradd -n"), nullptr);
 }
 
-TEST_F(Doctor, ExitsWith1WhereOneThingOfTwoCanBeFixed)
+TEST_F(Doctor, ExitsWith1IfOneOfTwoProblemsCanBeFixed)
 {
     machine::fake("/usr/bin/passwd", "echo 'nothing of the kind'\n");
     machine::remove("/usr/sbin/groupdel");
@@ -214,13 +214,13 @@ TEST_F(Doctor, NamesTheCapabilityThatRootLacks)
                                                 "--overlay"});
 }
 
-TEST_F(Doctor, MissesALocale)
+TEST_F(Doctor, ReportsAMissingLocale)
 {
     unsetenv("LANG");
     expectMissing("locale in LANG", "LANG is not set", "language-edition and code-set of os");
 }
 
-TEST_F(Doctor, MissesIdRangesAndWhatTheyName)
+TEST_F(Doctor, ReportsMissingIdRanges)
 {
     machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\n");
     expectMissing("id ranges in /etc/login.defs", "no line begins with GID_MAX and a number",
@@ -230,7 +230,7 @@ TEST_F(Doctor, MissesIdRangesAndWhatTheyName)
                   "ordinary users, ordinary groups");
 }
 
-TEST_F(Doctor, MissesAccountFilesAndTheirForm)
+TEST_F(Doctor, ReportsMissingOrMalformedAccountFiles)
 {
     machine::write("/etc/group", "root:x:0:\nstaff:x:fifty:\n");
     expectMissing("format of /etc/group", "line 2 is malformed", "that group");
@@ -247,7 +247,7 @@ TEST_F(Doctor, MissesAccountFilesAndTheirForm)
                   "max-login-failures of users");
 }
 
-TEST_F(Doctor, MissesShadowEntriesInTheirOrderAndKnowsHowToSortThem)
+TEST_F(Doctor, ReportsUnsortedShadowEntriesAndAFixThatWorks)
 {
     std::string const effect = "passwords and ageing of that user and all later ones";
     machine::write("/etc/shadow",
@@ -264,7 +264,7 @@ TEST_F(Doctor, MissesShadowEntriesInTheirOrderAndKnowsHowToSortThem)
     EXPECT_EQ(need("order of /etc/shadow"), nullptr);
 }
 
-TEST_F(Doctor, MissesAReleaseFileAndKnowsHowToWriteOne)
+TEST_F(Doctor, ReportsAMissingReleaseFileAndAFixThatWorks)
 {
     machine::remove("/etc/redhat-release");
     machine::write("/etc/os-release", "PRETTY_NAME=\"Some System 12\"\nVERSION_ID=\"12\"\n");
@@ -283,7 +283,7 @@ TEST_F(Doctor, MissesAReleaseFileAndKnowsHowToWriteOne)
                   "os-version of os");
 }
 
-TEST_F(Doctor, MissesALogWithClassicStamps)
+TEST_F(Doctor, ReportsALogWithoutTraditionalTimeStamps)
 {
     machine::write("/var/log/messages", "2026-01-02T03:04:05.678901+00:00 host x: y\n");
     expectMissing("traditional time stamps in the system log",
@@ -296,7 +296,7 @@ TEST_F(Doctor, MissesALogWithClassicStamps)
     EXPECT_EQ(need("traditional time stamps in the system log"), nullptr);
 }
 
-TEST_F(Doctor, LooksAtTheNewestLinesOfALongLogOnly)
+TEST_F(Doctor, ReadsOnlyTheNewestLinesOfALongLog)
 {
     std::string log = "2025-01-02T03:04:05 before the change\n";
     for (int line = 0; line < 20000; ++line)
@@ -307,7 +307,7 @@ TEST_F(Doctor, LooksAtTheNewestLinesOfALongLogOnly)
     EXPECT_EQ(need("traditional time stamps in the system log")["ok"], false);
 }
 
-TEST_F(Doctor, NeverObeysWhatALogLineHolds)
+TEST_F(Doctor, PrintsNoControlCharactersOfALogLine)
 {
     machine::write("/var/log/messages", "\x1b[2J\xff\n");
     std::string const out = mihostRun({"doctor"}).out;
@@ -315,7 +315,7 @@ TEST_F(Doctor, NeverObeysWhatALogLineHolds)
     EXPECT_FALSE(need("traditional time stamps in the system log").is_null());
 }
 
-TEST_F(Doctor, MissesLoadedModulesAndAKernelThatHasAny)
+TEST_F(Doctor, ReportsMissingModulesOrKernelSupport)
 {
     machine::fake("/usr/sbin/lsmod", "echo 'Error: no list' >&2\nexit 1\n");
     expectNoFix("loaded kernel modules", "this kernel has no /proc/modules",
@@ -326,11 +326,11 @@ TEST_F(Doctor, MissesLoadedModulesAndAKernelThatHasAny)
     EXPECT_EQ(need("loaded kernel modules")["debian"], "modprobe MODULE");
 }
 
-TEST_F(Doctor, MissesRootsPrivilegesWhereItHasNone)
+TEST_F(Doctor, ReportsMissingPrivilegesOfRoot)
 {
     using std::filesystem::perms;
     for (auto folder = std::filesystem::path(MIHOST_FILE).parent_path(); folder != "/";
-         folder = folder.parent_path()) // it may stand where only root may go
+         folder = folder.parent_path()) // it may be in a directory of root only
         permissions(folder, perms::group_exec | perms::others_exec,
                     std::filesystem::perm_options::add);
     Outcome const outcome = runToEnd(

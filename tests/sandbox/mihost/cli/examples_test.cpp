@@ -13,7 +13,7 @@
 namespace examples_test
 {
 
-/** The lines that a help text shows as examples, without what they mean. */
+/** The lines that a help text shows as examples, without their explanations. */
 Lines examplesIn(std::string const& help)
 {
     Lines examples;
@@ -55,8 +55,7 @@ std::vector<std::pair<Lines, std::string>> allHelp(Lines const& command)
     return all;
 }
 
-/** A machine with what the examples name, and mihost and its sandbox as an administrator has them.
- */
+/** A machine with the accounts, files and program that the examples name. */
 void makeMachineOfTheExamples()
 {
     machine::lay("plain");

@@ -1,4 +1,4 @@
-// Every command on machines laid out as Fedora and openSUSE lay them out today.
+// Every command on machines that are laid out as Fedora and openSUSE are today.
 
 #include "TestPaths.h"
 #include "mihost/cli/commands/CommandRows.h"
@@ -14,7 +14,7 @@
 namespace families_test
 {
 
-/** A command, what it ends with and a text that it says; each sees what those before it changed. */
+/** A command, its exit code and a text that it prints. Each sees the changes of earlier ones. */
 struct Row {
     Lines arguments;
     int code;
@@ -57,7 +57,7 @@ bool opens(std::string const& account, std::string const& password)
     return again && !hash.empty() && hash == again;
 }
 
-TEST(Fedora, TakesEveryCommand)
+TEST(Fedora, AcceptsEveryCommand)
 {
     setenv("LANG", "C.UTF-8", 1);
     machine::lay("fedora");
@@ -100,7 +100,7 @@ TEST(Fedora, TakesEveryCommand)
     EXPECT_EQ(machine::read("/var/log/messages"), "");
 }
 
-TEST(Opensuse, TakesEveryCommand)
+TEST(Opensuse, AcceptsEveryCommand)
 {
     setenv("LANG", "C.UTF-8", 1);
     machine::lay("opensuse");

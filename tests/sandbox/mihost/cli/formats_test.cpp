@@ -107,7 +107,7 @@ TEST_F(MihostFormats, ChoosesAndOrdersRows)
               R"({"user-name":{"id":108,"kind":"text","flag":true,"value":"anna"}})");
 }
 
-TEST_F(MihostFormats, RefusesConditionsAndColumnsThatMakeNoSense)
+TEST_F(MihostFormats, RefusesMalformedConditionsAndUnknownColumns)
 {
     EXPECT_EQ(mihostRun({"list", "users", "--where", "user-name"}).code, 2);
     EXPECT_EQ(mihostRun({"list", "users", "--where", "none=1"}).code, 4);
@@ -123,7 +123,7 @@ TEST_F(MihostFormats, MarksEmptyCells)
     EXPECT_EQ(outOf({"get", "user:ben", "full-name"}), "312 full-name  -\n");
 }
 
-TEST_F(MihostFormats, ComesInEveryFormatThatTheCommandHas)
+TEST_F(MihostFormats, AreAvailableForEveryCommandThatPrints)
 {
     for (Lines const& command : {Lines{"tree"}, Lines{"list", "users"}, Lines{"get", "os"},
                                  Lines{"version"}, Lines{"properties"}, Lines{"properties", "user"},
@@ -138,7 +138,7 @@ TEST_F(MihostFormats, ComesInEveryFormatThatTheCommandHas)
         }
 }
 
-TEST_F(MihostFormats, RefusesRowsOfACommandThatHasNoneBeforeItRuns)
+TEST_F(MihostFormats, RefusesRowFormatsOfAChangeBeforeItRuns)
 {
     for (Lines const& command :
          {Lines{"call", "UserDel", "UserName=anna"}, Lines{"set", "user:anna", "full-name", "x"},
@@ -167,7 +167,7 @@ TEST_F(MihostFormats, ReportsChangesInEveryDocumentFormat)
     }
 }
 
-TEST_F(MihostFormats, HoldsForEachLineOfTheShell)
+TEST_F(MihostFormats, AppliesToOneLineOfTheShell)
 {
     Outcome const outcome =
         mihostRun({"shell"}, "get user:ben user-id -o value\nget user:ben user-id\n");
@@ -198,7 +198,7 @@ TEST_F(MihostFormats, ColoursWarningsAndErrorsAtATerminal)
     EXPECT_NE(failed.output().find("\x1b[31mmihost: no node 'none'"), std::string::npos);
 }
 
-TEST_F(MihostFormats, BecomesRecordsOnANarrowTerminal)
+TEST_F(MihostFormats, PrintsRecordsOnANarrowTerminal)
 {
     TerminalRun run({"--color=never", "-q", "list", "users", "--where", "user-name=anna"}, 40);
     EXPECT_EQ(run.end(), 0);

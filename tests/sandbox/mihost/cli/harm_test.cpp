@@ -1,5 +1,5 @@
-// Writes that would reach another account or group than the one meant are refused before anything
-// runs.
+// Writes that would change an account or group other than the intended one are refused before any
+// command runs.
 
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
@@ -19,7 +19,7 @@ bool stands(std::string const& text, std::string const& part)
     return text.find(part) != std::string::npos;
 }
 
-/** Whether a command line that begins so reached the shell. */
+/** Whether a command line with this beginning reached the shell. */
 bool ran(std::string const& start)
 {
     Lines const lines = machine::ran();
@@ -44,11 +44,11 @@ protected:
     }
 };
 
-TEST_F(MihostHarm, DeletesNoOtherAccountThatIsNamedLikeTheUid)
+TEST_F(MihostHarm, DoesNotDeleteAnotherAccountNamedLikeTheUid)
 {
     addAccount("-m -u 1500 jdoe");
     addAccount("-m -u 1077 the1500th");
-    // As the tools of some machines let it be named.
+    // Some useradd tools allow this name.
     ASSERT_EQ(std::system("sed -i 's/^the1500th:/1500:/' /etc/passwd /etc/shadow"), 0);
     Outcome const outcome = mihostRun({"--yes", "set", "user:jdoe", "delete", "true"});
     EXPECT_EQ(outcome.code, 2);
@@ -63,10 +63,11 @@ TEST_F(MihostHarm, DeletesNoOtherAccountThatIsNamedLikeTheUid)
     EXPECT_TRUE(std::filesystem::exists("/home/the1500th"));
 }
 
-TEST_F(MihostHarm, RunsNoUserdelThatWouldFindNobody)
+TEST_F(MihostHarm, RunsNoUserdelThatWouldFindNoAccount)
 {
     addAccount("-M -u 1500 jdoe");
-    Outcome const outcome = mihostRun({"set", "user:jdoe", "delete", "true"}); // asks for nothing
+    Outcome const outcome =
+        mihostRun({"set", "user:jdoe", "delete", "true"}); // refused without a prompt
     EXPECT_EQ(outcome.code, 2);
     EXPECT_TRUE(stands(outcome.err, "accepts only names (use 'mihost user delete jdoe'"))
         << outcome.err;
@@ -75,7 +76,7 @@ TEST_F(MihostHarm, RunsNoUserdelThatWouldFindNobody)
     EXPECT_TRUE(machine::entry("/etc/passwd", "jdoe").empty());
 }
 
-TEST_F(MihostHarm, WritesNothingForTwoAccountsOfOneNameOrUid)
+TEST_F(MihostHarm, WritesNothingForANodeThatNamesAnotherUid)
 {
     addAccount("-M -u 1500 jdoe");
     addAccount("-M -u 1501 ann");
@@ -95,7 +96,7 @@ TEST_F(MihostHarm, WritesNothingForTwoAccountsOfOneNameOrUid)
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), hash);
 }
 
-TEST_F(MihostHarm, MakesNoAccountOrGroupWhoseNameIsANumber)
+TEST_F(MihostHarm, AddsNoAccountOrGroupWhoseNameIsANumber)
 {
     for (Lines const& arguments :
          {Lines{"call", "UserAdd", "UserName=1001"}, Lines{"call", "UserAdd", "UserName=+1"},
@@ -117,7 +118,7 @@ protected:
         EXPECT_EQ(std::system("groupadd crew"), 0);
     }
 
-    /** Adds jdoe to a group of this name, whatever groupadd would say to it. */
+    /** Adds jdoe to a new group of this name, even if groupadd would refuse the name. */
     static void addToGroup(std::string const& name)
     {
         machine::write("/etc/group", machine::read("/etc/group") + name + ":x:1700:jdoe\n");
@@ -141,14 +142,14 @@ protected:
     }
 };
 
-TEST_F(MihostMembership, IsNotChangedIfAGroupIsNamedLikeACommand)
+TEST_F(MihostMembership, IsNotChangedIfAGroupNameHoldsACommand)
 {
     addToGroup("x`touch${IFS}/root/PWNED`");
     expectRefusal("its group 'x`touch${IFS}/root/PWNED`' contains the shell metacharacter '`'");
     EXPECT_FALSE(std::filesystem::exists("/root/PWNED"));
 }
 
-TEST_F(MihostMembership, IsNotChangedIfAGroupNameLooksLikeTwo)
+TEST_F(MihostMembership, IsNotChangedIfAGroupNameLooksLikeTwoGroups)
 {
     addToGroup("x)(root");
     expectRefusal(
@@ -163,7 +164,7 @@ TEST_F(MihostMembership, IsNotChangedIfAGroupNameIsANumber)
     expectRefusal("its group '0' has a name that usermod reads as a GID");
 }
 
-TEST_F(MihostMembership, IsNotChangedIfAGroupNameIsTakenTwice)
+TEST_F(MihostMembership, IsNotChangedIfTwoGroupsHaveOneName)
 {
     addToGroup("root");
     expectRefusal("its group 'root' has GID 1700, but usermod finds GID 0");
@@ -185,7 +186,7 @@ TEST_F(MihostMembership, IsChangedForHarmlessGroups)
     EXPECT_EQ(machine::entry("/etc/group", "staff-2").at(3), "jdoe");
 }
 
-TEST_F(MihostMembership, OfNobodyIsLeftToThePlugin)
+TEST_F(MihostMembership, OfAnUnknownAccountIsLeftToThePlugin)
 {
     Outcome const outcome =
         mihostRun({"call", "LocalGroupAddUser", "LocalGroupName=crew", "DomainAndMember=no-such"});

@@ -1,5 +1,5 @@
-// The whole program with a recorder for what reaches the shell: hostile arguments of every command
-// and hostile names on the machine run nothing.
+// The whole program, with a recorder in place of the shell: hostile arguments of every command and
+// hostile names on the machine run nothing.
 
 #include "mihost/cli/catalogue/Catalogue.h"
 #include "mihost/cli/input/Command.h"
@@ -30,7 +30,7 @@ std::string quoted(std::string const& word)
     return text + "'";
 }
 
-/** No line of the shell mode can hold a line end; a test of its own has those. */
+/** Without line ends, which a line of the shell mode cannot hold: another test has those. */
 Lines hostileWords()
 {
     Lines words = {
@@ -41,7 +41,7 @@ Lines hostileWords()
     return words;
 }
 
-/** One byte each, but letters and digits of which one will do, and the line end. */
+/** One special byte each: no letter, digit or line end. */
 Lines hostileBytes()
 {
     Lines words;
@@ -51,7 +51,7 @@ Lines hostileBytes()
     return words;
 }
 
-/** Every command with {} where each of its arguments and option values stands. */
+/** Every command, with {} in place of each of its arguments and option values. */
 Lines commandLines()
 {
     Lines lines = {"{}",
@@ -174,7 +174,7 @@ protected:
         machine::recordShell();
     }
 
-    /** What reaches the shell from a script that runs no command of its own. */
+    /** The command lines of a script without commands. */
     static Lines startLines()
     {
         EXPECT_EQ(mihostRun({"shell"}).code, 0);
@@ -196,7 +196,7 @@ TEST_F(InjectionInto, AnyArgumentOfAnyCommandReachesNoShell)
         if (line.find("UserDel UserName={}") != std::string::npos || line == "get {}")
             all.insert(all.end(), bytes.begin(), bytes.end());
         for (std::string const& word : all) {
-            // A name may hold these.
+            // A name can hold these.
             if (word.size() == 3 && isPartOfSafeNames(static_cast<unsigned char>(word[1])))
                 continue;
             script += filled(line, word) + "\n";

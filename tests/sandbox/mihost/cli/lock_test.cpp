@@ -31,7 +31,7 @@ protected:
         EXPECT_EQ(std::system("/usr/sbin/useradd -M jdoe"), 0);
     }
 
-    /** As another mihost that is in the middle of a change. */
+    /** Holds the lock like another mihost during a change. */
     static ChangeLock lock()
     {
         return {mihost::changeLockFile, atOnce};
@@ -62,7 +62,7 @@ TEST_F(MihostLock, IsNeededByEveryChange)
     EXPECT_EQ(machine::read("/var/log/messages"), log);
 }
 
-TEST_F(MihostLock, IsNotNeededForReadingOrForThisTreeAlone)
+TEST_F(MihostLock, IsNotNeededForReadsOrChangesInMemory)
 {
     ChangeLock const other = lock();
     for (Lines arguments :
@@ -116,7 +116,7 @@ TEST_F(MihostLock, KeepsEveryMembershipThatIsAddedAtTheSameTime)
         EXPECT_EQ(machine::entry("/etc/group", group).at(3), "jdoe") << group;
 }
 
-TEST_F(MihostLock, CannotBeTakenWithoutRootAndSaysSo)
+TEST_F(MihostLock, ReportsThatItNeedsRoot)
 {
     auto const asNobody = [](Lines arguments) {
         arguments.insert(arguments.begin(), {"/usr/bin/setpriv", "--reuid=65534", "--regid=65534",

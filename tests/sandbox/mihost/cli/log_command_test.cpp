@@ -76,14 +76,14 @@ TEST_F(MihostLog, ShowsMessagesWithoutTheAsterisksOfThePlugin)
     EXPECT_TRUE(holds(outcome.out, "2026-06-03 03:00:00  box sshd[8]: third\n")) << outcome.out;
 }
 
-TEST_F(MihostLog, ShowsTheNewestEntriesOnly)
+TEST_F(MihostLog, ShowsOnlyTheNewestEntries)
 {
     EXPECT_EQ(shown({"-n", "2"}), (Lines{"box sshd[8]: third", ": line"}));
     EXPECT_EQ(shown({"--lines=100"}).size(), 4U);
     EXPECT_EQ(shown({"-n", "0"}), Lines());
 }
 
-TEST_F(MihostLog, ShowsEntriesOfATimeOnly)
+TEST_F(MihostLog, ShowsOnlyEntriesOfAPeriod)
 {
     setYearTo2026();
     EXPECT_EQ(shown({"--since", "2026-06-02"}),
@@ -94,7 +94,7 @@ TEST_F(MihostLog, ShowsEntriesOfATimeOnly)
               Lines{"box sshd[7]: second"});
 }
 
-TEST_F(MihostLog, ShowsMatchingEntriesOnlyAndCountsThose)
+TEST_F(MihostLog, ShowsOnlyMatchingEntriesAndCountsThem)
 {
     EXPECT_EQ(shown({"--grep", "sshd\\[[0-9]\\]"}),
               (Lines{"box sshd[8]: third", "box sshd[7]: second"}));
@@ -102,7 +102,7 @@ TEST_F(MihostLog, ShowsMatchingEntriesOnlyAndCountsThose)
     EXPECT_EQ(shown({"--grep", "\\*"}), Lines()); // asterisks are not part of a message
 }
 
-TEST_F(MihostLog, PrintsTheChosenNodesAsJsonAsThePluginHasThem)
+TEST_F(MihostLog, PrintsTheChosenNodesAsJsonUnchanged)
 {
     Json const nodes = Json::parse(mihostRun({"--json", "list", "log", "--grep", "third"}).out);
     ASSERT_EQ(nodes.size(), 1U);
@@ -153,7 +153,7 @@ TEST_F(MihostLog, IsFollowedAcrossRotation)
     EXPECT_FALSE(holds(run.output(), "second"));
 }
 
-TEST_F(MihostLog, IsFollowedInAPipeUntilItsReaderGoes)
+TEST_F(MihostLog, IsFollowedInAPipeUntilItsReaderEnds)
 {
     Outcome const outcome =
         runToEnd({"/bin/bash", "-c",
@@ -167,7 +167,7 @@ TEST_F(MihostLog, IsFollowedInAPipeUntilItsReaderGoes)
     EXPECT_EQ(outcome.err, "");
 }
 
-TEST_F(MihostLog, IsFollowedWithTheTextsThatThePluginShows)
+TEST_F(MihostLog, IsFollowedWithTheSameTextsAsThePlugins)
 {
     std::string const stamp = "Jun  1 01:00:00 ";
     machine::write(logFile, "   " + stamp + "blanks before\n" + stamp + std::string(600, 'x') +
@@ -181,7 +181,7 @@ TEST_F(MihostLog, IsFollowedWithTheTextsThatThePluginShows)
         EXPECT_TRUE(holds(run.output(), "  " + message + "\r\n")) << message << run.output();
 }
 
-TEST_F(MihostLog, CannotBeFollowedIfThereIsNone)
+TEST_F(MihostLog, CannotBeFollowedIfItIsMissing)
 {
     machine::remove(logFile);
     Outcome const outcome = mihostRun({"list", "log", "--follow"});

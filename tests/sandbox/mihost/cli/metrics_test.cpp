@@ -17,7 +17,7 @@ namespace metrics_test
 
 using Json = nlohmann::ordered_json;
 
-/** Days since 1970, so many days from today. */
+/** Days since 1970 of the day that is this many days after today. */
 long dayFromToday(long days)
 {
     std::time_t const now = std::time(nullptr);
@@ -79,10 +79,10 @@ protected:
     }
 };
 
-TEST_F(Metrics, AreTheTreesValues)
+TEST_F(Metrics, HaveTheValuesOfTheTree)
 {
     auto const all = lines();
-    // Each run derives it from the time of day and the uptime, which are of whole seconds.
+    // Each run computes it from the time and the uptime, both in whole seconds.
     EXPECT_NEAR(std::stod(valueOf("mi_boot_time_seconds", all)),
                 std::stod(treeValue("os", "last-boot-time")), 1);
     std::string const kib = treeValue("os", "physical-memory-size");
@@ -113,7 +113,7 @@ TEST_F(Metrics, CountAccountsByTheirState)
     EXPECT_EQ(valueOf("mi_accounts_password_never_changed", all), "1");
 }
 
-TEST_F(Metrics, NameNoAccountUnlessAsked)
+TEST_F(Metrics, NameNoAccountUnlessRequested)
 {
     for (std::string const& line : lines())
         EXPECT_EQ(line.find("user1"), std::string::npos) << line;
@@ -126,13 +126,13 @@ TEST_F(Metrics, NameNoAccountUnlessAsked)
     EXPECT_EQ(valueOf(R"(mi_account_expiry_time_seconds{user="user1004"})", all), "");
 }
 
-TEST_F(Metrics, NeverHoldAHash)
+TEST_F(Metrics, NeverContainAHash)
 {
     for (std::string const& line : lines({"--show-secrets", "metrics", "--accounts"}))
         EXPECT_EQ(line.find("$6$"), std::string::npos) << line;
 }
 
-TEST_F(Metrics, LeaveOutAccountsThatCannotBeRead)
+TEST_F(Metrics, OmitAccountStatesThatCannotBeRead)
 {
     machine::remove("/etc/shadow");
     auto const all = lines();
@@ -142,7 +142,7 @@ TEST_F(Metrics, LeaveOutAccountsThatCannotBeRead)
     EXPECT_EQ(valueOf(R"(mi_doctor_ok{need="passwords in /etc/shadow"})", all), "0");
 }
 
-TEST_F(Metrics, HaveTheDoctorsFindingsOnTheMachineAlone)
+TEST_F(Metrics, IncludeTheDoctorsFindingsAboutTheMachine)
 {
     machine::remove("/usr/sbin/userdel");
     auto const all = lines();
@@ -153,7 +153,7 @@ TEST_F(Metrics, HaveTheDoctorsFindingsOnTheMachineAlone)
     EXPECT_EQ(valueOf("mi_doctor_ok{need=\"root's privileges\"}", all), "");
 }
 
-TEST_F(Metrics, GoIntoAFileAsAWhole)
+TEST_F(Metrics, AreWrittenToAFile)
 {
     std::filesystem::current_path("/tmp");
     Outcome const outcome = mihostRun({"metrics", "--output", "mi.prom"});
@@ -162,7 +162,7 @@ TEST_F(Metrics, GoIntoAFileAsAWhole)
     EXPECT_EQ(valueOf("mi_users", mihost::linesOf(mihost::contentOf("/tmp/mi.prom"))), "6");
 }
 
-TEST_F(Metrics, SayThatTheTreeCouldNotBeRead)
+TEST_F(Metrics, ReportATreeThatCannotBeRead)
 {
     Outcome const outcome = mihostRun({"--plugin", "/none", "metrics", "--output", "/tmp/mi.prom"});
     EXPECT_EQ(outcome.code, 3);
@@ -172,7 +172,7 @@ TEST_F(Metrics, SayThatTheTreeCouldNotBeRead)
     EXPECT_EQ(valueOf("mi_users", all), "");
 }
 
-TEST_F(Metrics, CannotGoWhereNothingCanBeWritten)
+TEST_F(Metrics, ReportAFileThatCannotBeWritten)
 {
     Outcome const outcome = mihostRun({"metrics", "--output", "/none/mi.prom"});
     EXPECT_EQ(outcome.code, 2);
@@ -180,7 +180,7 @@ TEST_F(Metrics, CannotGoWhereNothingCanBeWritten)
               "mihost: writing the metrics '/none/mi.prom': No such file or directory\n");
 }
 
-TEST_F(Metrics, AreAListInJson)
+TEST_F(Metrics, AreAnArrayInJson)
 {
     Json const all = Json::parse(mihostRun({"--json", "metrics"}).out);
     Json const expected = {

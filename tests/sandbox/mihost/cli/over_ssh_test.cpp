@@ -68,7 +68,7 @@ protected:
                                           "jdoe:x:1000:1000:J. Doe:/home/jdoe:/bin/sh\n");
     }
 
-    /** In its place, a program there that prints its arguments, one a line, each in brackets. */
+    /** Replaces the remote mihost by a program that prints each argument in brackets on a line. */
     static void printArgumentsThere()
     {
         fs::remove("/usr/local/bin/mihost");
@@ -82,7 +82,7 @@ protected:
     }
 };
 
-TEST_F(MihostRemote, PrintsWhatTheCommandPrintsThere)
+TEST_F(MihostRemote, PrintsWhatTheRemoteCommandPrints)
 {
     for (Lines const& command : {Lines{"get", "os", "os-name"}, Lines{"list", "users"},
                                  Lines{"--json", "get", "user:jdoe"}}) {
@@ -103,7 +103,7 @@ TEST_F(MihostRemote, PassesErrorsAndTheExitStatusOn)
     EXPECT_EQ(outcome.err, mihostRun({"get", "user:jdeo"}).err);
 }
 
-TEST_F(MihostRemote, PassesEveryArgumentOnAsItIs)
+TEST_F(MihostRemote, PassesEveryArgumentOnUnchanged)
 {
     printArgumentsThere();
     std::string bytes;
@@ -153,7 +153,7 @@ TEST_F(MihostRemote, AsksAtTheTerminal)
     EXPECT_FALSE(holds(run.output(), "Connection to")) << run.output();
 }
 
-TEST_F(MihostRemote, ShowsNoPasswordThatIsTyped)
+TEST_F(MihostRemote, DoesNotEchoATypedPassword)
 {
     TerminalRun run({"--host", "box", "call", "UserSetPassword", "UserName=jdoe", "Password=-"});
     run.waitFor("Password: ");
@@ -181,14 +181,14 @@ TEST_F(MihostRemote, EndsOnCtrlC)
     EXPECT_EQ(run.end(), 0);
 }
 
-TEST_F(MihostRemote, EndsWith255IfSshCannotConnect)
+TEST_F(MihostRemote, ExitsWith255IfSshCannotConnect)
 {
     Outcome const outcome = mihostRun({"--host", "nowhere.invalid", "get", "os"});
     EXPECT_EQ(outcome.code, 255);
     EXPECT_TRUE(holds(outcome.err, "nowhere.invalid")) << outcome.err;
 }
 
-TEST_F(MihostRemote, SaysThatThereIsNoMihostThere)
+TEST_F(MihostRemote, ReportsAMissingRemoteMihost)
 {
     fs::remove("/usr/local/bin/mihost");
     if (fs::exists("/usr/bin/mihost"))
@@ -207,7 +207,7 @@ TEST_F(MihostRemote, NeedsSsh)
                            "openssh-client)\n");
 }
 
-TEST_F(MihostRemote, LooksAtTheCommandBeforeItConnects)
+TEST_F(MihostRemote, ChecksTheCommandBeforeItConnects)
 {
     machine::record("/usr/bin/ssh");
     for (Lines const& words :
@@ -218,7 +218,7 @@ TEST_F(MihostRemote, LooksAtTheCommandBeforeItConnects)
     EXPECT_FALSE(fs::exists("/tmp/run"));
 }
 
-TEST_F(MihostRemote, IsNotForTheShellsLines)
+TEST_F(MihostRemote, IsRefusedInTheShell)
 {
     EXPECT_EQ(mihostRun({"shell"}, "--host box get os\n").code, 2);
 }

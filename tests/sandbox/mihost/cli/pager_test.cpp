@@ -49,7 +49,7 @@ bool stands(std::string const& text, std::string const& part)
     return text.find(part) != std::string::npos;
 }
 
-TEST_F(MihostPager, ShowsWhatTheTerminalDoesNotHold)
+TEST_F(MihostPager, ShowsOutputThatDoesNotFitTheTerminal)
 {
     TerminalRun run({"list", "users"});
     EXPECT_EQ(run.end(), 0);
@@ -64,7 +64,7 @@ TEST_F(MihostPager, ShowsColoursOfTheTerminal)
     EXPECT_TRUE(stands(machine::read("/tmp/paged"), "\x1b[32muser:u1029\x1b[0m"));
 }
 
-TEST_F(MihostPager, IsNotUsedWhereAllFitsOrNothingIsToBePaged)
+TEST_F(MihostPager, IsNotUsedIfOutputFitsOrIsNotForPeople)
 {
     for (Lines const& arguments :
          {Lines{"list", "users", "--no-pager"}, Lines{"list", "users", "-o", "csv"},
@@ -94,7 +94,7 @@ TEST_F(MihostPager, CountsTheLinesThatTheTerminalWraps)
     EXPECT_TRUE(wasPaged());
 }
 
-TEST_F(MihostPager, IsThatOfPagerUnlessThereIsOneForMihost)
+TEST_F(MihostPager, ComesFromPagerUnlessMihostPagerIsSet)
 {
     setenv("PAGER", "cat >/tmp/other", 1);
     TerminalRun own({"list", "users"});
@@ -107,7 +107,7 @@ TEST_F(MihostPager, IsThatOfPagerUnlessThereIsOneForMihost)
     EXPECT_TRUE(stands(machine::read("/tmp/other"), "u1029"));
 }
 
-TEST_F(MihostPager, GetsTheUsersLocaleAndOptionsForLess)
+TEST_F(MihostPager, ReceivesTheUsersLocaleAndOptionsForLess)
 {
     setenv("MIHOST_PAGER", "echo \"$LC_ALL $LESS ${LESSSECURE-none}\" >/tmp/seen; cat >/dev/null",
            1);
@@ -121,7 +121,7 @@ TEST_F(MihostPager, GetsTheUsersLocaleAndOptionsForLess)
     EXPECT_EQ(machine::read("/tmp/seen"), "C.UTF-8 S 1\n");
 }
 
-TEST_F(MihostPager, MayEndBeforeItHasReadEverything)
+TEST_F(MihostPager, MayEndBeforeItReadsEverything)
 {
     writeAccounts(5000);
     setenv("MIHOST_PAGER", "head -n 1", 1);
@@ -131,7 +131,7 @@ TEST_F(MihostPager, MayEndBeforeItHasReadEverything)
     EXPECT_FALSE(stands(run.output(), "u1000"));
 }
 
-TEST_F(MihostPager, IsLessAndLeavesTheTerminalAsItWas)
+TEST_F(MihostPager, CanBeLessAndRestoresTheTerminal)
 {
     setenv("MIHOST_PAGER", "less", 1);
     writeAccounts(300);
@@ -144,7 +144,7 @@ TEST_F(MihostPager, IsLessAndLeavesTheTerminalAsItWas)
     EXPECT_TRUE(run.showsInput());
 }
 
-TEST_F(MihostPager, AloneGetsCtrlC)
+TEST_F(MihostPager, IsTheOnlyOneToReceiveCtrlC)
 {
     setenv("MIHOST_PAGER",
            "trap '' INT; cat >/dev/null; echo ready; read word </dev/tty; echo got $word", 1);
@@ -157,7 +157,7 @@ TEST_F(MihostPager, AloneGetsCtrlC)
     EXPECT_EQ(run.end(), 0);
 }
 
-TEST_F(MihostPager, LeavesTheTerminalAsItWasWhenItIsKilled)
+TEST_F(MihostPager, RestoresTheTerminalWhenItIsKilled)
 {
     setenv("MIHOST_PAGER", "stty -echo -icanon </dev/tty; kill -9 $$", 1);
     TerminalRun run({"list", "users"});

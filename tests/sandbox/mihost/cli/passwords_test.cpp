@@ -1,4 +1,4 @@
-// A password that was set opens the account, whatever passwd here can do, and shows nowhere.
+// A password that was set opens the account, whatever this passwd supports, and is shown nowhere.
 
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
@@ -19,7 +19,7 @@ bool holds(std::string const& text, std::string const& part)
     return text.find(part) != std::string::npos;
 }
 
-/** As a login does it. */
+/** Whether a login with the password succeeds. */
 bool opens(std::string const& account)
 {
     std::string const hash = machine::entry("/etc/shadow", account).at(1);
@@ -36,7 +36,7 @@ protected:
         EXPECT_EQ(std::system("/usr/sbin/useradd -M -s /bin/sh -c 'J. Doe' jdoe"), 0);
     }
 
-    /** A passwd that knows nothing of pipes, as Debian's. */
+    /** A passwd without --stdin, such as Debian's. */
     static void makePasswdPlain()
     {
         machine::fake("/usr/bin/passwd", "[ \"$1\" = --help ] && { echo Usage: passwd; exit 0; }\n"
@@ -45,7 +45,7 @@ protected:
                                          "exit 6\n");
     }
 
-    /** One that takes passwords from a pipe, as Red Hat's. */
+    /** A passwd with --stdin, such as Red Hat's. */
     static void makePasswdReadStdin()
     {
         machine::fake("/usr/bin/passwd", "[ \"$1\" = --help ] && { echo '  --stdin'; exit 0; }\n"
@@ -61,7 +61,7 @@ protected:
     }
 };
 
-TEST_F(Passwords, OpenTheAccountWherePasswdTakesNone)
+TEST_F(Passwords, OpenTheAccountIfPasswdReadsNone)
 {
     makePasswdPlain();
     struct Row {
@@ -82,14 +82,14 @@ TEST_F(Passwords, OpenTheAccountWherePasswdTakesNone)
     }
 }
 
-TEST_F(Passwords, OpenANewAccountWherePasswdTakesNone)
+TEST_F(Passwords, OpenANewAccountIfPasswdReadsNone)
 {
     makePasswdPlain();
     EXPECT_EQ(mihostRun({"call", "UserAdd", "UserName=new", "Password=geheim42"}).code, 0);
     EXPECT_TRUE(opens("new"));
 }
 
-TEST_F(Passwords, OpenTheAccountWhereTheCallIsGivenAsText)
+TEST_F(Passwords, OpenTheAccountIfTheCallIsWrittenAsText)
 {
     makePasswdPlain();
     Outcome const outcome =
@@ -105,7 +105,7 @@ TEST_F(Passwords, OpenTheAccountWithThisMachinesOwnPasswd)
     EXPECT_TRUE(opens("jdoe"));
 }
 
-TEST_F(Passwords, ArePassedAsTheyAreWherePasswdTakesThem)
+TEST_F(Passwords, ArePassedUnchangedIfPasswdReadsThem)
 {
     makePasswdReadStdin();
     machine::recordShell();
@@ -129,7 +129,7 @@ TEST_F(Passwords, ThatPasswdDropsAreReported)
                            "given one\n");
 }
 
-TEST_F(Passwords, ShowInNoOutputTraceOrMessage)
+TEST_F(Passwords, AreInNoOutputTraceOrMessage)
 {
     makePasswdPlain();
     // A tool that repeats what it was given, which fails the call.
@@ -146,7 +146,7 @@ TEST_F(Passwords, ShowInNoOutputTraceOrMessage)
     }
 }
 
-TEST_F(Passwords, AreRefusedIfStandardInputHoldsNone)
+TEST_F(Passwords, AreRefusedIfStandardInputIsEmpty)
 {
     Outcome const outcome =
         mihostRun({"call", "UserSetPassword", "UserName=jdoe", "Password=-"}, "");

@@ -1,4 +1,4 @@
-// The directory that mihost works in, which may hold a password hash: that nothing of it stays.
+// The directory that mihost works in may hold a password hash, so nothing of it may stay.
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -60,7 +60,7 @@ protected:
         return paths;
     }
 
-    /** A directory as a start of the program makes it, its process gone. */
+    /** A directory that a start of the program left, whose process has ended. */
     static std::string makeLeft(std::string const& name, fs::perms mode = fs::perms::owner_all)
     {
         std::string const path = std::string(parent) + "/" + name;
@@ -91,7 +91,7 @@ TEST_F(MihostPrivateDirectory, OfAKilledStartIsRemovedByTheNext)
     EXPECT_EQ(found().size(), 0U);
 }
 
-TEST_F(MihostPrivateDirectory, OfARunningStartStays)
+TEST_F(MihostPrivateDirectory, OfARunningStartIsKept)
 {
     Outcome const outcome = bash("coproc $mihost shell\n"
                                  "echo get os 108 >&${COPROC[1]}; read -u ${COPROC[0]}\n"
@@ -115,7 +115,7 @@ TEST_F(MihostPrivateDirectory, IsRemovedWithWhateverFilesAreInIt)
     EXPECT_EQ(machine::read("/etc/victim"), "precious");
 }
 
-TEST_F(MihostPrivateDirectory, IsNotWhatOnlyLooksLikeIt)
+TEST_F(MihostPrivateDirectory, IsNotAnythingThatOnlyLooksLikeIt)
 {
     std::string const open =
         makeLeft("mihost-open00", fs::perms::owner_all | fs::perms::group_exec);
@@ -130,7 +130,7 @@ TEST_F(MihostPrivateDirectory, IsNotWhatOnlyLooksLikeIt)
         EXPECT_TRUE(fs::exists(path + "/usrandpwd")) << path;
 }
 
-TEST_F(MihostPrivateDirectory, IsRemovedWhereAFileGrowsTooLong)
+TEST_F(MihostPrivateDirectory, IsRemovedIfAFileGrowsTooLong)
 {
 #ifdef __SANITIZE_THREAD__
     GTEST_SKIP() << "this sanitizer makes files of its own before the program starts";
@@ -153,7 +153,7 @@ TEST_F(MihostPrivateDirectory, LeavesTheFileSizeSignalToTheCommands)
     EXPECT_EQ(std::stoull(mask, nullptr, 16) & (1ULL << (SIGXFSZ - 1)), 0U) << mask;
 }
 
-TEST_F(MihostPrivateDirectory, IsRemovedWhereDescriptorsRunOut)
+TEST_F(MihostPrivateDirectory, IsRemovedIfDescriptorsRunOut)
 {
 #if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
     GTEST_SKIP() << "a sanitizer needs descriptors for itself, and ends the program without them";

@@ -1,4 +1,4 @@
-// mihost among other programs: before and after them in a pipe, and as a source of JSON.
+// mihost with other programs: on either side of a pipe, and as a source of JSON.
 
 #include "TestPaths.h"
 #include "tests/support/Machine.h"
@@ -16,7 +16,7 @@ Outcome bash(std::string const& line)
         {"/bin/bash", "-c", "mihost=$1; set -o pipefail; " + line, "bash", MIHOST_FILE});
 }
 
-/** A machine with texts of any bytes but separators. */
+/** A machine whose texts have control characters, invalid UTF-8 and quotes. */
 void makeMachineOfOddTexts(int users = 3)
 {
     machine::lay("plain");
@@ -33,7 +33,7 @@ void makeMachineOfOddTexts(int users = 3)
     machine::write("/var/log/messages", "Jan  2 03:04:05 \x80 \"\x7f\" \xc0\xaf\x1b]0;x\x07\n");
 }
 
-TEST(MihostInAPipe, EndsQuietlyWhenItsReaderGoes)
+TEST(MihostInAPipe, EndsQuietlyWhenItsReaderEnds)
 {
     makeMachineOfOddTexts(1200); // more lines than fit into a pipe
     for (char const* arguments :
@@ -47,18 +47,18 @@ TEST(MihostInAPipe, EndsQuietlyWhenItsReaderGoes)
     }
 }
 
-TEST(MihostInAPipe, EndsQuietlyWhenTheReaderOfItsMessagesGoes)
+TEST(MihostInAPipe, EndsQuietlyWhenTheReaderOfItsMessagesEnds)
 {
     makeMachineOfOddTexts();
     for (char const* arguments : {"--trace - tree", "--timing tree", "--trace - shell <<<tree"})
         EXPECT_EQ(
             bash("{ $mihost " + std::string(arguments) + " 2>&1 >/dev/null; } | head -c 1").code, 0)
             << arguments;
-    // An error stays one where nobody reads of it.
+    // The exit code of an error is kept if its message cannot be written.
     EXPECT_EQ(bash("$mihost get nothing 2> >(true); exit $?").code, 4);
 }
 
-TEST(MihostInAPipe, TellsThatItsOutputCannotBeWritten)
+TEST(MihostInAPipe, ReportsThatItsOutputCannotBeWritten)
 {
     makeMachineOfOddTexts();
     for (char const* arguments : {"tree", "--json list users", "get os 108", "--help", "--version",
@@ -71,7 +71,7 @@ TEST(MihostInAPipe, TellsThatItsOutputCannotBeWritten)
     }
 }
 
-TEST(MihostOnAFullDisk, TellsThatTheTraceWasCutShort)
+TEST(MihostOnAFullDisk, ReportsThatTheTraceWasCutShort)
 {
     makeMachineOfOddTexts();
     Outcome const outcome =
@@ -84,7 +84,7 @@ TEST(MihostOnAFullDisk, TellsThatTheTraceWasCutShort)
     EXPECT_EQ(bash("test $(stat -c %s /tmp/small/trace) -gt 8000").code, 0);
 }
 
-TEST(MihostJson, IsReadByJqWhateverTheSystemsTextsHold)
+TEST(MihostJson, IsValidForJqWhateverTheSystemsTextsHold)
 {
     makeMachineOfOddTexts();
     struct Reading {

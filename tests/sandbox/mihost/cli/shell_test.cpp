@@ -33,7 +33,7 @@ TEST_F(MihostScript, RunsItsLinesOnOneLoadedPlugin)
     EXPECT_EQ(machine::read("/tmp/asked"), "asked\n");
 }
 
-TEST_F(MihostScript, ShowsInEachLineWhatTheOnesBeforeChanged)
+TEST_F(MihostScript, ShowsInEachLineTheChangesOfEarlierOnes)
 {
     Outcome const outcome = mihostRun({"shell"}, "call UserAdd UserName=jdoe 'Comment=J. Doe'\n"
                                                  "get user:jdoe full-name\n"
@@ -71,7 +71,7 @@ TEST_F(MihostScript, EndsAtTheFirstLineThatFailsAndNamesIt)
     }
 }
 
-TEST_F(MihostScript, GoesOnBehindFailuresWhereItIsToldTo)
+TEST_F(MihostScript, ContinuesAfterFailuresOnRequest)
 {
     Outcome const outcome =
         mihostRun({"shell", "--keep-going"},
@@ -114,7 +114,7 @@ TEST_F(MihostScript, PrintsOneJsonLineForEachCommand)
     EXPECT_EQ(Json::parse(lines[9])["status"], 1);
 }
 
-TEST_F(MihostScript, TakesOptionsForOneLineOnly)
+TEST_F(MihostScript, AppliesOptionsToOneLineOnly)
 {
     Outcome const outcome = mihostRun({"shell"}, "--json get os 108\nget os 108\n");
     Lines const lines = linesOf(outcome.out);
@@ -139,7 +139,7 @@ TEST_F(MihostScript, MayBeEmpty)
     EXPECT_EQ(mihostRun({"shell"}, "\n\n# nothing\n").out, "");
 }
 
-TEST_F(MihostScript, DoesNotStartWhereThePluginCannotBeLoaded)
+TEST_F(MihostScript, DoesNotStartIfThePluginCannotBeLoaded)
 {
     Outcome const outcome = mihostRun({"--plugin", "/none.so", "shell"}, "get os 108\n");
     EXPECT_EQ(outcome.code, 3);

@@ -1,4 +1,4 @@
-// mihost started with standard files missing: what it opens itself must not become one of them.
+// mihost started without some standard streams: files that it opens must not take their places.
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -25,7 +25,7 @@ void expectJsonLinesOnly(std::string const& path)
 
 constexpr char badOutput[] = "mihost: cannot write the output: Bad file descriptor\n";
 
-TEST(MihostStandardFiles, FailWithoutOutputAndSpareTheTrace)
+TEST(MihostStandardFiles, FailWithoutOutputAndKeepTheTrace)
 {
     machine::lay("plain");
     Outcome const traced = bash("$mihost --trace /tmp/trace tree >&-");
@@ -67,7 +67,7 @@ TEST(MihostStandardFiles, WithoutInputAPasswordIsRefused)
     EXPECT_NE(outcome.err.find("standard input is empty"), std::string::npos) << outcome.err;
 }
 
-TEST(MihostStandardFiles, WithoutAnyTheTraceIsStillWhole)
+TEST(MihostStandardFiles, WithoutAnyTheTraceIsComplete)
 {
     machine::lay("plain");
     EXPECT_EQ(bash("$mihost --trace /tmp/trace tree <&- >&- 2>&-").code, 2);

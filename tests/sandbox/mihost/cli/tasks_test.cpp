@@ -1,4 +1,4 @@
-// mihost user and mihost group: tasks under names of their own, in a pipe and at a terminal.
+// mihost user and mihost group: tasks with their own names, in a pipe and at a terminal.
 
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
@@ -90,7 +90,7 @@ TEST_F(Tasks, RunTheCommandsOfTheirMethods)
     }
 }
 
-TEST_F(Tasks, AddAnAccountWithAllThatIsGiven)
+TEST_F(Tasks, AddAnAccountWithEveryOption)
 {
     Outcome const outcome = mihostRun({"user", "add", "asmith", "--full-name", "A. Smith", "--home",
                                        "/srv/asmith", "--shell", "/bin/sh", "--max-days", "90",
@@ -106,7 +106,7 @@ TEST_F(Tasks, AddAnAccountWithAllThatIsGiven)
     EXPECT_TRUE(opens("asmith", "Secret-1"));
 }
 
-TEST_F(Tasks, AddAnAccountThatNoPasswordOpens)
+TEST_F(Tasks, AddAnAccountWithALockedPassword)
 {
     EXPECT_EQ(mihostRun({"user", "add", "asmith"}).code, 0);
     EXPECT_EQ(machine::entry("/etc/shadow", "asmith").at(1), "!");
@@ -122,14 +122,14 @@ TEST_F(Tasks, AddAndRemoveMembers)
     EXPECT_EQ(machine::entry("/etc/group", "crew").at(3), "jdoe");
 }
 
-TEST_F(Tasks, SayWhatNeverMeansIfThereIsNoExpiry)
+TEST_F(Tasks, ReportThatThereIsNoExpiryToRemove)
 {
     Outcome const outcome = mihostRun({"user", "expire", "jdoe", "never"});
     EXPECT_EQ(outcome.code, 0);
     EXPECT_EQ(outcome.err, "mihost: nothing changed: account expiry of jdoe is already never\n");
 }
 
-TEST_F(Tasks, RefuseToLoseAnExpiryThatIsNoDay)
+TEST_F(Tasks, RefuseToLoseAnExpiryThatIsNotADay)
 {
     ASSERT_EQ(std::system("sed -i '/^jdoe:/s/[^:]*:$/99999999:/' /etc/shadow"), 0);
     std::string const shadow = machine::read("/etc/shadow");
@@ -141,7 +141,7 @@ TEST_F(Tasks, RefuseToLoseAnExpiryThatIsNoDay)
     EXPECT_EQ(machine::read("/etc/shadow"), shadow);
 }
 
-TEST_F(Tasks, RefuseWhatIsNotThereAndSuggestTheNearest)
+TEST_F(Tasks, RefuseUnknownNamesAndSuggestTheNearest)
 {
     machine::recordShell();
     expectUnchanged(mihostRun({"user", "delete", "jdo", "-y"}), 4,
@@ -172,7 +172,7 @@ TEST_F(Tasks, RefuseWrongValuesByTheNameOfTheOption)
                     "group add: NAME consists of digits only, so tools would read it as an id");
 }
 
-TEST_F(Tasks, RefuseWordsThatDoNotFit)
+TEST_F(Tasks, RefuseWrongUsage)
 {
     struct Row {
         Lines arguments;
@@ -211,7 +211,7 @@ TEST_F(Tasks, PrintTheirChangesAsJson)
     EXPECT_EQ(report["changes"][0]["file"], "/etc/group");
 }
 
-TEST_F(Tasks, NeedYesToDeleteIfNobodyCanBeAsked)
+TEST_F(Tasks, NeedYesToDeleteWithoutATerminal)
 {
     machine::recordShell();
     expectUnchanged(mihostRun({"user", "delete", "jdoe"}), 2,
@@ -246,7 +246,7 @@ TEST_F(Tasks, AskForANewPasswordTwice)
     EXPECT_TRUE(opens("jdoe", "Secret-1"));
 }
 
-TEST_F(Tasks, SetNoPasswordThatWasTypedInTwoWays)
+TEST_F(Tasks, SetNoPasswordThatWasTypedDifferently)
 {
     std::string const before = machine::read("/etc/shadow");
     TerminalRun run({"user", "set-password", "jdoe"});

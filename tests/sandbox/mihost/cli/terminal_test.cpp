@@ -1,4 +1,4 @@
-// The program at a terminal: what a person sees, types and interrupts.
+// The program at a terminal: output, input and interrupts.
 
 #include "mihost/cli/output/DisplayWidth.h"
 #include "mihost/sandbox/Sandbox.h"
@@ -60,7 +60,7 @@ bool stands(std::string const& text, std::string const& part)
     return text.find(part) != std::string::npos;
 }
 
-/** The lines of a terminal's stream, without what moves the cursor or sets colours. */
+/** The lines of a terminal's stream, without sequences for cursor and colours. */
 Lines plainLines(std::string const& text)
 {
     Lines lines(1);
@@ -93,7 +93,7 @@ TEST_F(MihostTerminal, ShowsThePhaseOfTheStartAndHowFarItIs)
          {"starting: operating system", "starting: drivers", "drivers 1", "drivers 2",
           "starting: users", "users 2", "groups 2/2", "log entries 1/1"})
         run.waitFor(step);
-    run.waitFor("\r\x1b[K"); // and takes it away
+    run.waitFor("\r\x1b[K"); // and clears it
     run.waitFor("108 os-name  Linux");
     EXPECT_EQ(run.end(), 0);
     EXPECT_EQ(machine::read("/tmp/lsmod"), "ran\n"); // by the plug-in alone
@@ -107,7 +107,7 @@ TEST_F(MihostTerminal, ShowsNoProgressOnADumbOne)
     EXPECT_EQ(run.output(), "108 os-name  Linux\r\n");
 }
 
-TEST_F(MihostTerminal, HasColoursUnlessTheyAreUnwanted)
+TEST_F(MihostTerminal, HasColoursUnlessTheyAreTurnedOff)
 {
     TerminalRun coloured({"tree"});
     coloured.end();
@@ -151,13 +151,13 @@ TEST_F(MihostTerminal, WrapsTextAtItsWidthAndLosesNothing)
     EXPECT_TRUE(stands(mihostRun({"list", "users"}).out, "李明李明李明李明李明李明李明李明"));
 }
 
-TEST_F(MihostTerminal, DrawsWithPlainSignsInAPlainCodeSet)
+TEST_F(MihostTerminal, DrawsWithAsciiInAnAsciiLocale)
 {
     setenv("LC_ALL", "C", 1);
     EXPECT_TRUE(stands(mihostRun({"tree"}).out, "\n`-root #2 "));
 }
 
-TEST_F(MihostTerminal, NeverObeysWhatTheSystemsTextsHold)
+TEST_F(MihostTerminal, ShowsNoControlCharactersOfTheSystemsTexts)
 {
     machine::write("/etc/passwd", "root:x:0:0:\x1b]0;title\x07\x1b[2J:/:/bin/sh\n");
     machine::write("/var/log/messages", "Jan  2 03:04:05 \x1b[31mred\x9b"
@@ -173,7 +173,7 @@ TEST_F(MihostTerminal, NeverObeysWhatTheSystemsTextsHold)
     }
 }
 
-TEST_F(MihostTerminal, AsksBeforeWhatIsDangerousAndTakesNoForNo)
+TEST_F(MihostTerminal, AsksBeforeDangerousCommandsAndAcceptsNo)
 {
     for (char const* answer : {"\n", "n\n", "no\n", "x\n"}) {
         TerminalRun run({"power", "halt"});
@@ -190,7 +190,7 @@ TEST_F(MihostTerminal, AsksBeforeWhatIsDangerousAndTakesNoForNo)
     EXPECT_EQ(mihost::refusedPowerCommands(), Lines{"/sbin/shutdown -h now"});
 }
 
-TEST_F(MihostTerminal, DoesNotShowAPasswordThatIsTyped)
+TEST_F(MihostTerminal, DoesNotEchoATypedPassword)
 {
     machine::fake("/usr/bin/passwd", "exit 1\n");
     TerminalRun run({"call", "UserSetPassword", "UserName=jdoe", "Password=-"});
@@ -203,7 +203,7 @@ TEST_F(MihostTerminal, DoesNotShowAPasswordThatIsTyped)
     EXPECT_EQ(hash, crypt("geheim42", hash.c_str()));
 }
 
-TEST_F(MihostTerminal, IsAsItWasAfterCtrlCAtAPasswordPrompt)
+TEST_F(MihostTerminal, IsRestoredAfterCtrlCAtAPasswordPrompt)
 {
     TerminalRun run({"call", "UserSetPassword", "UserName=jdoe", "Password=-"});
     run.waitFor("Password: ");
@@ -213,7 +213,7 @@ TEST_F(MihostTerminal, IsAsItWasAfterCtrlCAtAPasswordPrompt)
     EXPECT_TRUE(nothingIsLeft());
 }
 
-TEST_F(MihostTerminal, IsLeftCleanByCtrlCDuringTheStart)
+TEST_F(MihostTerminal, IsRestoredAfterCtrlCDuringTheStart)
 {
     machine::fake("/usr/sbin/modinfo", "echo asked >/dev/tty; exec sleep 1000\n");
     for (Lines const& arguments : {Lines{"tree"}, Lines{"--sandbox", "tree"}}) {
@@ -361,7 +361,7 @@ TEST_F(MihostTerminal, DropsAShellsLineOnCtrlC)
     EXPECT_EQ(run.end(), 0);
 }
 
-TEST_F(MihostTerminal, ComesBackToTheShellWhenCtrlCStopsAWatch)
+TEST_F(MihostTerminal, ReturnsToTheShellWhenCtrlCStopsAWatch)
 {
     TerminalRun run({"shell"});
     run.waitFor(prompt);
@@ -432,7 +432,7 @@ TEST_F(MihostTerminal, KeepsTheShellsLinesButNoPasswords)
     EXPECT_EQ(run.end(), 0);
 }
 
-TEST_F(MihostTerminal, GoesBySizesThatChangeWhileTheShellRuns)
+TEST_F(MihostTerminal, FollowsChangesOfItsSizeInTheShell)
 {
     machine::write("/var/log/messages", "Jan  2 03:04:05 " + std::string(150, 'x') + "end\n");
     TerminalRun run({"shell"});
@@ -447,7 +447,7 @@ TEST_F(MihostTerminal, GoesBySizesThatChangeWhileTheShellRuns)
     EXPECT_EQ(run.end(), 0);
 }
 
-TEST_F(MihostTerminal, SaysInTheShellsPromptThatItIsASandbox)
+TEST_F(MihostTerminal, NamesTheSandboxInTheShellsPrompt)
 {
     TerminalRun run({"--sandbox", "shell"});
     run.waitFor("mihost (sandbox)> ");

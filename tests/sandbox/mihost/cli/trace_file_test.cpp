@@ -1,4 +1,4 @@
-// The file that --trace writes: who can read it, and what it never replaces.
+// The file that --trace writes: who can read it, and which files it does not replace.
 
 #include "TestPaths.h"
 #include "mihost/sandbox/Descriptor.h"
@@ -61,7 +61,7 @@ void expectRefused(std::string const& reason)
     EXPECT_EQ(outcome.err, "mihost: cannot write the trace '/tmp/trace': " + reason + "\n");
 }
 
-TEST(MihostTraceFile, IsReadByItsOwnerAlone)
+TEST(MihostTraceFile, IsReadableByItsOwnerOnly)
 {
     layMachineWithoutTraces();
     EXPECT_EQ(bash("$mihost --trace /tmp/trace get os 108").code, 0);
@@ -69,7 +69,7 @@ TEST(MihostTraceFile, IsReadByItsOwnerAlone)
     EXPECT_TRUE(isTrace(machine::read(file)));
 }
 
-TEST(MihostTraceFile, IsANewOneWhereOthersMayHaveTheOldOneOpen)
+TEST(MihostTraceFile, IsANewOneIfOthersMayHaveTheOldOneOpen)
 {
     layMachineWithoutTraces();
     machine::write(file, "old");
@@ -81,7 +81,7 @@ TEST(MihostTraceFile, IsANewOneWhereOthersMayHaveTheOldOneOpen)
     EXPECT_EQ(read(reader.get(), text, sizeof text), 3);
 }
 
-TEST(MihostTraceFile, IsEmptiedFirstWhereItIsTheOwnersAlone)
+TEST(MihostTraceFile, IsTruncatedIfOnlyItsOwnerCanReadIt)
 {
     layMachineWithoutTraces();
     machine::write(file, std::string(1 << 20, 'x'), 0600);
@@ -125,7 +125,7 @@ TEST(MihostTraceFile, IsWhereTheOwnersLinkLeads)
     EXPECT_EQ(modeOf("/var/tmp/real"), 0600U);
 }
 
-TEST(MihostTraceFile, LeavesAFileWithAnotherNameAlone)
+TEST(MihostTraceFile, DoesNotChangeAFileWithAnotherName)
 {
     layMachineWithoutTraces();
     machine::write("/etc/victim", "precious", 0600);
@@ -148,7 +148,7 @@ TEST(MihostTraceFile, MayBeAPipeOrAStream)
     EXPECT_EQ(modeOf("/dev/null"), 0666U);
 }
 
-TEST(MihostTraceFile, GoesOnWhereAStandardStreamStands)
+TEST(MihostTraceFile, AppendsToAStandardStream)
 {
     layMachineWithoutTraces();
     machine::write("/tmp/log", "first line\n");
@@ -156,7 +156,7 @@ TEST(MihostTraceFile, GoesOnWhereAStandardStreamStands)
     std::string const log = machine::read("/tmp/log");
     EXPECT_EQ(log.rfind("first line\n{", 0), 0U);
     EXPECT_TRUE(isTrace(log));
-    EXPECT_EQ(modeOf("/tmp/log"), 0644U); // whose it is was settled by who opened it
+    EXPECT_EQ(modeOf("/tmp/log"), 0644U); // unchanged: the caller opened it
 }
 
 } // namespace trace_file_test

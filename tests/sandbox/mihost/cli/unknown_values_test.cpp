@@ -1,4 +1,4 @@
-// What the plug-in could not read is shown as unknown, not as zero.
+// Values that the plug-in cannot read are shown as unknown, not as zero.
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
@@ -68,7 +68,7 @@ protected:
 constexpr char warning[] = "mihost: reading passwords and ageing: /etc/shadow cannot be read: "
                            "Permission denied, so some values are unknown (see 'mihost doctor')\n";
 
-TEST_F(UnknownValues, ShowAsADashWithOneWarning)
+TEST_F(UnknownValues, AreShownAsADashWithOneWarning)
 {
     Outcome const outcome = runAsUser(
         {"get", "user:anna", "password-max-days", "password", "last-password-change", "user-name"});
@@ -83,14 +83,14 @@ TEST_F(UnknownValues, ShowAsADashWithOneWarning)
         EXPECT_EQ(runAsUser(words).err, warning) << words[0];
 }
 
-TEST_F(UnknownValues, AreWarnedOfOnlyIfTheyShow)
+TEST_F(UnknownValues, AreReportedOnlyIfTheyAreShown)
 {
     for (Lines const& words : {Lines{"tree"}, Lines{"list", "users"},
                                Lines{"get", "user:anna", "user-name"}, Lines{"get", "os"}})
         EXPECT_EQ(runAsUser(words).err, "") << words[0];
 }
 
-TEST_F(UnknownValues, AreWarnedOfForEachLineOfAScript)
+TEST_F(UnknownValues, AreReportedForEachLineOfAScript)
 {
     Outcome const outcome =
         runAsUser({"shell"}, "get user:anna 163\nget os 108\nget user:anna 163\n");
@@ -119,7 +119,7 @@ TEST_F(UnknownValues, BeginAtTheUserWithoutAShadowEntry)
               all_);
 }
 
-TEST_F(UnknownValues, AreNoZerosThatTheShadowFileHolds)
+TEST_F(UnknownValues, AreNotZerosThatTheShadowFileHolds)
 {
     writeShadow("root:*:0:0:0:0:0:0:\nanna:!:19001:0:0:0::21919:\nben:!:19002:0:99999:7:::\n");
     for (char const* user : {"user:root", "user:anna", "user:ben"}) {

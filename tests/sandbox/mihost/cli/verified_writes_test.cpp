@@ -1,4 +1,4 @@
-// The program reads back what a change did, and reports what differs from the request.
+// The program verifies each change, and reports what differs from the request.
 
 #include "TestPaths.h"
 #include "mihost/sandbox/Sandbox.h"
@@ -31,12 +31,12 @@ protected:
                               "chage -d 2020-01-01 -m 0 -M 99999 -W 7 jdoe && "
                               "groupadd crew && groupadd staff2 && usermod -aG crew jdoe"),
                   0);
-        // The only kind of account whose UID userdel takes for its name.
+        // The only kind of account that userdel finds by its UID.
         machine::write("/etc/passwd",
                        machine::read("/etc/passwd") + "1500:x:1500:100::/:/bin/sh\n");
     }
 
-    /** Tools that say nothing and do nothing. */
+    /** Tools that print nothing and do nothing. */
     static void makeToolsIdle()
     {
         for (char const* tool :
@@ -46,7 +46,7 @@ protected:
             machine::fake(std::string("/usr/bin/") + tool, silent);
     }
 
-    /** As a user without privileges, who may run the program wherever it was built. */
+    /** Runs as a user without privileges, with access to the build directory. */
     static Outcome runAsUser(Lines arguments)
     {
         using std::filesystem::perms;
@@ -66,7 +66,7 @@ struct Idle {
     char const* problem;
 };
 
-TEST_F(VerifiedWrite, FailsWhereTheToolsDidNothing)
+TEST_F(VerifiedWrite, FailsIfTheToolsDidNothing)
 {
     makeToolsIdle();
     for (Idle const& row : std::initializer_list<Idle>{
@@ -136,7 +136,7 @@ TEST_F(VerifiedWrite, FailsWhereTheToolsDidNothing)
     }
 }
 
-TEST_F(VerifiedWrite, FailsWhereAUserNodesWriteDidNothing)
+TEST_F(VerifiedWrite, FailsIfAUserNodesWriteDidNothing)
 {
     makeToolsIdle();
     Outcome const deletion = mihostRun({"--yes", "set", "user:1500", "delete", "true"});
@@ -152,7 +152,7 @@ TEST_F(VerifiedWrite, FailsWhereAUserNodesWriteDidNothing)
               "mihost: set inactive-time: inactivity of jdoe is never, not 2030-01-01");
 }
 
-TEST_F(VerifiedWrite, SucceedsWhereEverythingIsAsAskedFor)
+TEST_F(VerifiedWrite, SucceedsIfEverythingIsAsRequested)
 {
     for (Lines const& words : std::initializer_list<Lines>{
              {"call", "UserAdd", "UserName=new", "Comment=A B", "HomeDir=/home/new/",
@@ -181,7 +181,7 @@ TEST_F(VerifiedWrite, SucceedsWhereEverythingIsAsAskedFor)
     }
 }
 
-TEST_F(VerifiedWrite, SaysThatNothingChangedWhereAllWasAsAskedFor)
+TEST_F(VerifiedWrite, ReportsThatEverythingWasAsRequestedAlready)
 {
     ASSERT_EQ(std::system(("usermod -p '" + std::string(hash) + "' jdoe").c_str()), 0);
     ASSERT_EQ(std::system("chage -d \"$(date +%F)\" jdoe"), 0); // as chpasswd writes it
@@ -213,9 +213,9 @@ TEST_F(VerifiedWrite, SaysThatNothingChangedWhereAllWasAsAskedFor)
     }
 }
 
-TEST_F(VerifiedWrite, SaysThatAMembershipIsThereAlready)
+TEST_F(VerifiedWrite, ReportsThatAMembershipExistsAlready)
 {
-    // Twice: the first call also adds what the plug-in adds by itself, the primary group.
+    // Twice, since the plug-in also adds the primary group in the first call.
     Lines const words = {"call", "LocalGroupAddUser", "LocalGroupName=crew",
                          "DomainAndMember=jdoe"};
     EXPECT_EQ(mihostRun(words).code, 0);
@@ -234,14 +234,14 @@ TEST_F(VerifiedWrite, FailsToEndAMembershipOfThePrimaryGroup)
     EXPECT_NE(outcome.err.find("membership of jdoe in crew is "), std::string::npos) << outcome.err;
 }
 
-TEST_F(VerifiedWrite, FailsForWhatCannotBeMadeTwice)
+TEST_F(VerifiedWrite, FailsForWhatCannotBeAddedOrRemovedTwice)
 {
     EXPECT_EQ(mihostRun({"call", "UserAdd", "UserName=jdoe"}).code, 1);
     EXPECT_EQ(mihostRun({"call", "LocalGroupAdd", "GroupName=crew"}).code, 1);
     EXPECT_EQ(mihostRun({"call", "LocalGroupDel", "GroupName=none"}).code, 1);
 }
 
-TEST_F(VerifiedWrite, FailsWithTheToolsWordsWhereAToolComplains)
+TEST_F(VerifiedWrite, FailsWithTheErrorMessageOfATool)
 {
     machine::fake("/usr/bin/chage",
                   "echo 'chage: cannot open file' >&2\necho second >&2\nexit 1\n");
@@ -255,7 +255,7 @@ TEST_F(VerifiedWrite, FailsWithTheToolsWordsWhereAToolComplains)
     EXPECT_EQ(answer["warnings"].back(), "a command printed: second");
 }
 
-TEST_F(VerifiedWrite, FailsWhereAToolFailsThoughTheChangeIsThere)
+TEST_F(VerifiedWrite, FailsIfAToolFailsAlthoughTheChangeIsThere)
 {
     machine::fake("/usr/sbin/userdel",
                   "sed -i /^1500:/d /etc/passwd\necho 'userdel: no home' >&2\nexit 12\n");
@@ -269,7 +269,7 @@ TEST_F(VerifiedWrite, FailsWhereAToolFailsThoughTheChangeIsThere)
         << answer;
 }
 
-TEST_F(VerifiedWrite, PassesOnWhatASuccessfulToolSays)
+TEST_F(VerifiedWrite, ReportsTheOutputOfASuccessfulTool)
 {
     machine::fake("/usr/sbin/userdel", "sed -i /^1500:/d /etc/passwd\necho 'no mail' >&2\n");
     Outcome const outcome = mihostRun({"--yes", "--json", "set", "user:1500", "delete", "true"});
@@ -278,7 +278,7 @@ TEST_F(VerifiedWrite, PassesOnWhatASuccessfulToolSays)
     EXPECT_EQ(outcome.err, "mihost: a command printed: no mail\n");
 }
 
-TEST_F(VerifiedWrite, PassesOnWhatUseraddSaysOfASuccess)
+TEST_F(VerifiedWrite, ReportsAWarningOfASuccessfulUseradd)
 {
     machine::fake("/usr/sbin/useradd", "echo 'new:x:1600:100::/:/bin/sh' >>/etc/passwd\n"
                                        "echo 'new:!:20000:0:99999:7:::' >>/etc/shadow\n"
@@ -288,7 +288,7 @@ TEST_F(VerifiedWrite, PassesOnWhatUseraddSaysOfASuccess)
     EXPECT_EQ(outcome.err, "mihost: a command printed: useradd: warning: home exists\n");
 }
 
-TEST_F(VerifiedWrite, FailsWhereTheLogCannotBeEmptied)
+TEST_F(VerifiedWrite, FailsIfTheLogCannotBeEmptied)
 {
     machine::write("/var/log/messages", "Jan  2 03:04:05 line\n");
     ASSERT_EQ(chown("/var/log/messages", 65534, 65534), 0);
@@ -312,7 +312,7 @@ TEST_F(VerifiedWrite, FailsWithoutPrivilege)
     EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
 }
 
-TEST_F(VerifiedWrite, FailsWhereTheMachineRefusesToHalt)
+TEST_F(VerifiedWrite, FailsIfTheMachineRefusesToHalt)
 {
     machine::fake("/sbin/shutdown", "echo 'must be root' >&2\nexit 1\n");
     Outcome const refused = mihostRun({"--yes", "--json", "power", "halt"});
@@ -327,7 +327,7 @@ TEST_F(VerifiedWrite, FailsWhereTheMachineRefusesToHalt)
         << missing.err;
 }
 
-TEST_F(VerifiedWrite, FailsWhereARefreshMissesAnAccount)
+TEST_F(VerifiedWrite, FailsIfARefreshMissesAnAccount)
 {
     // The plug-in reads no account after a line that is too long.
     machine::write("/etc/passwd", machine::read("/etc/passwd") +

@@ -1,4 +1,4 @@
-// What a write does beside what its name says is said first, and its worst is prevented.
+// Side effects of a write are announced, and the worst of them are prevented.
 
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
@@ -44,7 +44,7 @@ TEST_F(WriteWarnings, UserSetAttribKeepsTheAccountsExpiry)
     EXPECT_EQ(Json::parse(outcome.out)["warnings"], Json::array({warning}));
 }
 
-TEST_F(WriteWarnings, UserSetAttribErasesTheExpiryAfterAYes)
+TEST_F(WriteWarnings, UserSetAttribErasesTheExpiryWithYes)
 {
     Outcome const outcome =
         mihostRun({"--yes", "call", "UserSetAttrib", "UserName=jdoe", "daysMustKeepPassword=3"});
@@ -53,7 +53,7 @@ TEST_F(WriteWarnings, UserSetAttribErasesTheExpiryAfterAYes)
     EXPECT_EQ(outcome.err, "mihost: UserSetAttrib erases the account's expiry 2030-01-05\n");
 }
 
-TEST_F(WriteWarnings, UserSetAttribTakesANewExpiryWithoutAWarning)
+TEST_F(WriteWarnings, UserSetAttribSetsANewExpiryWithoutAWarning)
 {
     Outcome const outcome =
         mihostRun({"call", "UserSetAttrib", "UserName=jdoe", "passwordExpirationDate=2030-01-06"});

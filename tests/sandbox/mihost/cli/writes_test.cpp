@@ -1,4 +1,4 @@
-// What the program writes really happens, and nothing that it refuses does.
+// Writes of the program change the machine, and those that it refuses do not.
 
 #include "mihost/sandbox/Sandbox.h"
 #include "tests/support/Lines.h"
@@ -29,7 +29,7 @@ bool stands(std::string const& text, std::string const& part)
     return text.find(part) != std::string::npos;
 }
 
-TEST(MihostCall, RunsTheMethodAndAnswersAsJson)
+TEST(MihostCall, RunsTheMethodAndReportsAsJson)
 {
     machine::lay("plain");
     machine::recordShell();
@@ -49,7 +49,7 @@ TEST(MihostCall, RunsTheMethodAndAnswersAsJson)
               ran.end());
 }
 
-TEST(MihostCall, ExitsWith1AndTellsWhatTheCommandSaidWhereItFails)
+TEST(MihostCall, ExitsWith1AndShowsTheOutputOfAFailedCommand)
 {
     machine::lay("plain");
     Outcome const outcome = mihostRun({"--json", "call", "UserDel", "UserName=nobody-here"});
@@ -62,7 +62,7 @@ TEST(MihostCall, ExitsWith1AndTellsWhatTheCommandSaidWhereItFails)
     EXPECT_EQ(outcome.err, "mihost: call UserDel: " + error + "\n");
 }
 
-TEST(MihostCall, RefusesWhatAShellWouldActOnBeforeThePluginSeesIt)
+TEST(MihostCall, RefusesShellMetacharactersBeforeThePlugin)
 {
     machine::lay("plain");
     machine::recordShell();
@@ -75,7 +75,7 @@ TEST(MihostCall, RefusesWhatAShellWouldActOnBeforeThePluginSeesIt)
     EXPECT_EQ(machine::ran(), Lines());
 }
 
-TEST(MihostCall, DeletesRootOnlyWhenTold)
+TEST(MihostCall, DeletesRootOnlyWithYes)
 {
     machine::lay("plain");
     machine::fake("/usr/sbin/userdel", "echo \"$@\" >/tmp/deleted\n");
@@ -86,7 +86,7 @@ TEST(MihostCall, DeletesRootOnlyWhenTold)
     EXPECT_EQ(machine::read("/tmp/deleted"), "root\n");
 }
 
-TEST(MihostSecrets, AreHiddenUnlessAskedFor)
+TEST(MihostSecrets, AreHiddenUnlessRequested)
 {
     makeMachineWithJdoe();
     ASSERT_EQ(std::system(("usermod -p '" + std::string(hash) + "' jdoe").c_str()), 0);
@@ -124,7 +124,7 @@ TEST(MihostSet, SetsAPasswordHashFromStandardInput)
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), hash);
 }
 
-TEST(MihostSet, TakesNoPlainPasswordForAHash)
+TEST(MihostSet, RefusesAPlainPasswordInPlaceOfAHash)
 {
     makeMachineWithJdoe();
     Outcome const outcome = mihostRun({"set", "user:jdoe", "password", "-"}, "geheim42\n");
@@ -133,7 +133,7 @@ TEST(MihostSet, TakesNoPlainPasswordForAHash)
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), "!");
 }
 
-TEST(MihostSet, WritesADayThatThePasswordExpiresOn)
+TEST(MihostSet, WritesTheDayOnWhichThePasswordExpires)
 {
     makeMachineWithJdoe();
     ASSERT_EQ(std::system("chage -d 2020-01-01 -M 99999 jdoe"), 0);
@@ -141,7 +141,7 @@ TEST(MihostSet, WritesADayThatThePasswordExpiresOn)
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(4), "30");
 }
 
-TEST(MihostSet, RefusesADateThatIsNoneWithTheFormThatIsRight)
+TEST(MihostSet, RefusesAMalformedDateAndShowsTheForm)
 {
     makeMachineWithJdoe();
     Outcome const outcome = mihostRun({"set", "user:jdoe", "password-expiration", "31.01.2020"});
@@ -149,10 +149,10 @@ TEST(MihostSet, RefusesADateThatIsNoneWithTheFormThatIsRight)
     EXPECT_TRUE(stands(outcome.err, "YYYY-MM-DD")) << outcome.err;
 }
 
-TEST(MihostSet, DeletesAnAccountOnlyWhenTold)
+TEST(MihostSet, DeletesAnAccountOnlyWithYes)
 {
     makeMachineWithJdoe();
-    // The only kind of account whose UID userdel takes for its name.
+    // The only kind of account that userdel finds by its UID.
     machine::write("/etc/passwd", machine::read("/etc/passwd") + "1500:x:1500:1500::/:/bin/sh\n");
     machine::fake("/usr/sbin/userdel", "echo \"$@\" >/tmp/deleted\n"
                                        "sed -i /^1500:/d /etc/passwd\n");
@@ -167,7 +167,7 @@ TEST(MihostSet, DeletesAnAccountOnlyWhenTold)
     EXPECT_EQ(machine::read("/tmp/deleted"), "-r 1500\n");
 }
 
-TEST(MihostSet, RunsNothingForAnAccountWhoseNameAShellWouldActOn)
+TEST(MihostSet, RunsNothingForANameWithShellMetacharacters)
 {
     makeMachineWithJdoe();
     machine::write("/etc/passwd",
@@ -181,14 +181,14 @@ TEST(MihostSet, RunsNothingForAnAccountWhoseNameAShellWouldActOn)
     EXPECT_FALSE(std::filesystem::exists("/tmp/ran"));
 }
 
-TEST(MihostSet, RefusesANameForANodeThatAShellWouldActOn)
+TEST(MihostSet, RefusesANameWithShellMetacharacters)
 {
     makeMachineWithJdoe();
     EXPECT_EQ(mihostRun({"set", "user:jdoe", "user-name", "a;reboot"}).code, 2);
     EXPECT_EQ(mihostRun({"set", "user:jdoe", "108", "other"}).code, 0);
 }
 
-TEST(MihostSet, TakesAMethodCallApart)
+TEST(MihostSet, ChecksTheParametersOfAMethodCall)
 {
     makeMachineWithJdoe();
     Outcome const bad =
@@ -200,7 +200,7 @@ TEST(MihostSet, TakesAMethodCallApart)
     EXPECT_EQ(machine::entry("/etc/group", "crew").at(0), "crew");
 }
 
-TEST(MihostRefresh, BuildsUserAndGroupNodesAnew)
+TEST(MihostRefresh, RebuildsUserAndGroupNodes)
 {
     machine::lay("plain");
     machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
@@ -220,7 +220,7 @@ TEST(MihostRefresh, BuildsUserAndGroupNodesAnew)
                            "node-added group", "node-added group"}));
 }
 
-TEST(MihostClearLog, EmptiesTheLogWhenTold)
+TEST(MihostClearLog, EmptiesTheLogWithYes)
 {
     makeMachineWithJdoe();
     machine::write("/var/log/messages", "Jan  2 03:04:05 line\n");
@@ -228,7 +228,7 @@ TEST(MihostClearLog, EmptiesTheLogWhenTold)
     EXPECT_EQ(machine::read("/var/log/messages"), "");
 }
 
-TEST(MihostPower, AsksTheMachineToRestartOrHaltWhenTold)
+TEST(MihostPower, RestartsAndHaltsTheMachineWithYes)
 {
     makeMachineWithJdoe();
     Json const answer = Json::parse(mihostRun({"--json", "--yes", "power", "restart"}).out);

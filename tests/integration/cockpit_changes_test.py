@@ -102,7 +102,7 @@ class Accounts(ChangeTest):
         self.addCleanup(cockpit.install_mihost)
         self.start_shell_change()
         self.browser.click('#preview-run')
-        self.browser.see('#preview', 'ended before it had answered')
+        self.browser.see('#preview', 'stopped before it had answered')
         self.assertFalse(self.can_apply())
         self.assert_unchanged('passwd', 'shadow', 'group')
 

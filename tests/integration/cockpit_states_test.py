@@ -65,7 +65,7 @@ class States(PageTest):
         self.browser.open()
         self.browser.see('#detail [data-property=process-count]', 'processes')
         cockpit.kill_mihost('watch')
-        self.browser.see('body', 'was ended')
+        self.browser.see('body', 'was stopped')
 
     def test_gives_something_else(self):
         cockpit.install_mihost(GARBLED)

@@ -231,13 +231,20 @@ protected:
         std::filesystem::current_path("/");
     }
 
-    /** Runs the scenario; call number at fails. @return how many of the calls were made */
-    static unsigned long runWithFault(Scenario const& scenario, AnyCall& call, unsigned long at)
+    /**
+     * Runs the scenario; call number at fails. The start before it shows that the previous run left
+     * nothing.
+     *
+     * @return how many of the calls were made
+     */
+    unsigned long runWithFault(Scenario const& scenario, AnyCall& call, unsigned long at) const
     {
         FakeMachine machine;
         long const descriptors = openDescriptors();
-        if (!scenario.startsByItself)
+        if (!scenario.startsByItself) {
             start();
+            EXPECT_EQ(treeTexts(), whole_);
+        }
         call.failAt(at);
         try {
             scenario.run();
@@ -265,14 +272,14 @@ protected:
         return texts;
     }
 
-private:
     ScratchFolder const folder_;
+    std::vector<std::string> whole_;
 };
 
 TEST_P(FailingCall, LeavesNothingOpenOrLocked)
 {
     auto const& [scenario, call] = GetParam();
-    std::vector<std::string> const whole = treeOfAWholeStart();
+    whole_ = treeOfAWholeStart();
     unsigned long const calls = runWithFault(scenario, *call, 0);
     if (scenario.startsByItself) {
         EXPECT_GT(calls, 0U) << "a start makes every call";
@@ -281,7 +288,9 @@ TEST_P(FailingCall, LeavesNothingOpenOrLocked)
         SCOPED_TRACE(call->name() + std::string(" number ") + std::to_string(at) + " of " +
                      std::to_string(calls));
         runWithFault(scenario, *call, at);
-        EXPECT_EQ(treeOfAWholeStart(), whole);
+        if (scenario.startsByItself || at == calls) {
+            EXPECT_EQ(treeOfAWholeStart(), whole_);
+        }
     }
 }
 

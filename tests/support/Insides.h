@@ -2,12 +2,13 @@
 #define TESTS_SUPPORT_INSIDES_H
 
 #include "frame/OsSwMI.h"
+#include "sysdata/logInfo_linux.h"
 
 /**
  * The protected members of the interface object, open to tests.
  *
  * Contract: host and plug-in both work on them, each compiled by itself, so their order, types and
- * meaning are fixed. No test opens the members of another class.
+ * meaning are fixed. No test opens the members of a class that is not in this file.
  */
 class OpenFramework : public IC::ManagementInterface
 {
@@ -43,5 +44,16 @@ public:
     using OsSwMI::rootNode_;
     using OsSwMI::userNodes_;
 };
+
+/**
+ * The only member of a log reader.
+ *
+ * Contract: hosts know the size of the object. Its text is empty, and nothing reads or writes it.
+ */
+inline std::string& onlyMember(NQ::logInfo& log)
+{
+    static_assert(sizeof log == sizeof(std::string));
+    return reinterpret_cast<std::string&>(log);
+}
 
 #endif

@@ -2,6 +2,7 @@
 #include "tests/interpose/Libc.h"
 #include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
+#include "tests/support/Insides.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
@@ -664,7 +665,7 @@ TEST_F(LogReader, LogsTheExitOfEveryReadOfATime)
 
 TEST_F(LogReader, NeitherReadsNorWritesItsString)
 {
-    auto& member = reinterpret_cast<std::string&>(log);
+    std::string& member = onlyMember(log);
     EXPECT_EQ(member, "");
     for (std::string const content : {"", "something else"}) {
         member = content;

@@ -514,6 +514,26 @@ TEST_F(Lifecycle, TheFrameLogsUnderItsOwnCategoryAndFile)
     EXPECT_EQ(count, (builders.size() + 2) * 4);
 }
 
+/** The instance of the id ranges, which the library names and makes. */
+void* idRanges(Plugin const& plugin)
+{
+    auto* const instance = reinterpret_cast<void* (*)()>(plugin.symbol("NQ::minMaxId::Instance()"));
+    void* const ranges = instance();
+    EXPECT_EQ(ranges, *static_cast<void**>(plugin.symbol("NQ::minMaxId::pinstance")));
+    return ranges;
+}
+
+/** The bounds in an instance, which need not be the library's own. */
+Ids boundsOf(void* ranges, Plugin const& plugin)
+{
+    Ids bounds;
+    for (std::string const getter :
+         {"getMinUserId", "getMinGroupId", "getMaxUserId", "getMaxGroupId"})
+        bounds.push_back(reinterpret_cast<unsigned int (*)(void*)>(
+            plugin.symbol("NQ::minMaxId::" + getter + "()"))(ranges));
+    return bounds;
+}
+
 TEST_F(Library, LeavesTheIdRangesOnTheHeapWhenItIsClosed)
 {
     freshHost();
@@ -521,30 +541,25 @@ TEST_F(Library, LeavesTheIdRangesOnTheHeapWhenItIsClosed)
     FakeCommands const commands;
     auto plugin = std::make_unique<Plugin>();
     plugin->initialize();
-    auto const* const ranges =
-        *static_cast<unsigned int const* const*>(plugin->symbol("NQ::minMaxId::pinstance"));
-    auto* const ask =
-        reinterpret_cast<void const* (*)()>(plugin->symbol("NQ::minMaxId::Instance()"));
-    EXPECT_EQ(ask(), ranges);
+    void* const ranges = idRanges(*plugin);
     Dl_info info{};
     EXPECT_EQ(dladdr(ranges, &info), 0); // part of no loaded file
     plugin.reset();
-    EXPECT_EQ(Ids(ranges, ranges + 4), (Ids{500, 500, 60000, 60000}));
+    EXPECT_EQ(boundsOf(ranges, Plugin()), (Ids{500, 500, 60000, 60000}));
 }
 
 TEST_F(Library, ReadsTheIdRangesAgainWhenItIsLoadedAgain)
 {
     freshHost();
     FakeCommands const commands;
-    Ids lowest;
+    std::vector<Ids> bounds;
     for (char const* machine : {MACHINES_DIR "/redhat", MACHINES_DIR "/suse"}) {
         FileRoot const files{machine};
         Plugin plugin;
         plugin.initialize();
-        lowest.push_back(
-            **static_cast<unsigned int const* const*>(plugin.symbol("NQ::minMaxId::pinstance")));
+        bounds.push_back(boundsOf(idRanges(plugin), plugin));
     }
-    EXPECT_EQ(lowest, (Ids{500, 1000}));
+    EXPECT_EQ(bounds, (std::vector<Ids>{{500, 500, 60000, 60000}, {1000, 1000, 60000, 60000}}));
 }
 
 TEST_F(Lifecycle, SetsTheFlagOnlyWhileAUserNodeIsSetUp)

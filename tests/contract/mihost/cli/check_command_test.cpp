@@ -135,7 +135,6 @@ Broken const ways[] = {
     {"early-unload", "killed by SIGUSR1", {"early-unload.unload"}},
     {"hidden-failure", "status 0 rather than 42", {"failing-start.answer"}},
     {"no-tree", "0 nodes of the kind log rather than 1", {"failing-start.tree"}},
-    {"hang", "not done after 20 s", {"failing-start.answer"}},
     {"abort",
      "killed by SIGABRT: the plug-in gives up",
      {"refresh.answer", "refusal.build", "method.success", "rounds.life"}},
@@ -257,6 +256,14 @@ TEST_F(Check, RefusesAFileThatCannotBeLoaded)
     EXPECT_EQ(outcome.out, "");
     EXPECT_NE(outcome.err.find("it has no entry point OpenMI"), std::string::npos) << outcome.err;
     EXPECT_EQ(checkRun("/nonexistent").code, 3);
+}
+
+TEST_F(Check, StopsAGroupThatHangs)
+{
+    setenv("BROKEN", "hang", 1);
+    Json const results =
+        Json::parse(checkRun(BROKEN_PLUGIN, {"--json", "--rounds", "1", "--time-limit", "1"}).out);
+    EXPECT_EQ(findingsOf(results, "failing-start.answer"), Json({"not done after 1 s"}));
 }
 
 TEST_F(Check, PrintsTapForHarnesses)

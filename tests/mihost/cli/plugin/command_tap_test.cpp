@@ -2,11 +2,13 @@
 
 #include "mihost/cli/plugin/CommandTap.h"
 #include "mihost/cli/system/BoundedText.h"
+#include "mihost/sandbox/Descriptor.h"
 
 #include <array>
 #include <csignal>
 #include <gtest/gtest.h>
 #include <sys/wait.h>
+#include <unistd.h>
 
 namespace command_tap_test
 {
@@ -105,13 +107,16 @@ TEST_F(CommandTap, KeepsTheBeginningOfWhatCommandsComplain)
 
 TEST_F(CommandTap, DoesNotWaitForACommandThatGoesOnComplaining)
 {
-    std::FILE* const stream = tap::open("yes >&2 & echo $!", "r");
+    std::FILE* const stream = tap::open("yes 3>&1 >&2 & echo $!", "r");
     std::array<char, 64> line{};
     ASSERT_TRUE(std::fgets(line.data(), line.size(), stream));
+    mihost::Descriptor const untilItEnds(dup(fileno(stream)));
     tap::close(stream);
     tap::takeStandardError();
     EXPECT_LE(tap::takeStandardError().size(), BoundedText::limit + 64);
     kill(std::stoi(line.data()), SIGKILL);
+    EXPECT_EQ(read(untilItEnds.get(), line.data(), line.size()), 0);
+    tap::takeStandardError(); // the rest, which the next test would find
 }
 
 TEST_F(CommandTap, KeepsTheBeginningOfWhatItsOwnCommandsPrint)

@@ -90,6 +90,11 @@ std::optional<std::string> objectionToGroup(Group const& group, Form form,
         return because("has a name that usermod reads as a GID");
     if (auto const reason = objection(form, group.name))
         return because(*reason);
+    if (group.name.find(misjudgedWord) != std::string::npos)
+        return because(
+            fmt::format("contains '{}', so the plug-in would report the change as failed "
+                        "even if it succeeds",
+                        misjudgedWord));
     auto const found = findGroup(group.name);
     if (!found)
         return because("is not found by usermod");

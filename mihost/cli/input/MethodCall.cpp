@@ -49,6 +49,19 @@ void checkWhole(MethodCall const& call)
     }
 }
 
+/** The first command of UserAdd has all of its values, the second one only the name. */
+void checkJudging(Method const& method, Assignment const& assignment)
+{
+    bool const isOfFirstCommand =
+        std::string_view(method.name) == IC::method::userAdd &&
+        std::string_view(assignment.parameter->name) != IC::parameter::userName;
+    if (!isOfFirstCommand && assignment.value.find(misjudgedWord) != std::string::npos)
+        throw Failure(BadUsage,
+                      fmt::format("{} contains '{}', so the plug-in would report {} as failed even "
+                                  "if it succeeds (use the account tools themselves)",
+                                  assignment.label, misjudgedWord, method.name));
+}
+
 std::string toTextForm(Parameter const& parameter, std::string const& value)
 {
     if (parameter.form != Form::Day)
@@ -91,6 +104,7 @@ MethodCall::Argument argumentOf(Method const& method, std::string const& item)
         throw Failure(BadUsage, fmt::format("{} has the type {}, not '{}'", known.name, known.type,
                                             parts[1]));
     checkTextForm(known, parts[2]);
+    checkJudging(method, {&known, known.name, parts[2]});
     return {&known, parts[2]};
 }
 
@@ -135,6 +149,7 @@ MethodCall makeCall(Method const& method, std::vector<Assignment> const& assignm
     MethodCall call{&method, {}};
     for (Assignment const& assignment : assignments) {
         checkAssignment(assignment);
+        checkJudging(method, assignment);
         Parameter const& parameter = *assignment.parameter;
         call.arguments.push_back({&parameter, toTextForm(parameter, assignment.value)});
     }

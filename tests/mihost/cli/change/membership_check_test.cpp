@@ -121,6 +121,14 @@ TEST(MembershipChange, IsRefusedIfUsermodFindsAnotherGroup)
               "its group 'x' is not found by usermod");
 }
 
+TEST(MembershipChange, IsRefusedForAGroupWithTheWordUseradd)
+{
+    EXPECT_EQ(
+        objectionTo("uid=1000(jdoe) gid=1000(jdoe) groups=1000(jdoe),1502(useradders)\n"),
+        "its group 'useradders' contains 'useradd', so the plug-in would report the change as "
+        "failed even if it succeeds");
+}
+
 TEST(MembershipChange, IsRefusedIfIdReadsTheMemberAsAUid)
 {
     EXPECT_EQ(objectionTo(plain, "1000"), "id reads it as a UID, that of the account 'jdoe'");

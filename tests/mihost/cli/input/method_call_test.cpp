@@ -84,6 +84,33 @@ TEST(MethodCall, IsRefusedForMissingOrDoubleParameters)
     EXPECT_EQ(refusal([] { textFor("UserDel", {"UserName="}); }), "UserName is empty");
 }
 
+// The plug-in has the shell print the exit status of any line with this word.
+TEST(MethodCall, IsRefusedWhereTheWordUseraddWouldFailIt)
+{
+    EXPECT_EQ(
+        refusal([] { textFor("UserDel", {"UserName=useraddbot"}); }),
+        "UserName contains 'useradd', so the plug-in would report UserDel as failed even if it "
+        "succeeds (use the account tools themselves)");
+    for (char const* text : {"UserAdd,UserName:CMPI_string:a.useradd",
+                             "LocalGroupAdd,GroupName:CMPI_string:useradders",
+                             "LocalGroupAddUser,LocalGroupName:CMPI_string:useradders,"
+                             "DomainAndMember:CMPI_string:jdoe",
+                             "UserSetPassword,UserName:CMPI_string:jdoe,"
+                             "Password:CMPI_string:useradd1",
+                             "UserSetHomeDir,UserName:CMPI_string:jdoe,"
+                             "HomeDir:CMPI_string:/home/useradd"})
+        EXPECT_NE(refusal([text] { takeApart(text); }), "accepted") << text;
+}
+
+TEST(MethodCall, MayContainTheWordUseraddWhereItIsExpected)
+{
+    for (char const* text :
+         {"UserAdd,UserName:CMPI_string:jdoe,Comment:CMPI_string:made by useradd",
+          "UserAdd,UserName:CMPI_string:jdoe,Password:CMPI_string:useradd1",
+          "UserSetFullName,UserName:CMPI_string:jdoe,FullName:CMPI_string:User Add"})
+        EXPECT_EQ(refusal([text] { takeApart(text); }), "accepted") << text;
+}
+
 TEST(MethodCallText, IsTakenApartAndPutTogetherAgain)
 {
     for (char const* text : {"UserDel,UserName:CMPI_string:jdoe", "GetShadowing",

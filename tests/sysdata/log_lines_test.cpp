@@ -107,6 +107,13 @@ TEST(LogToday, AcceptsADayOfOneDigitAndMoreWords)
     EXPECT_EQ(today.year, 2026);
 }
 
+TEST(LogToday, MayHaveAYearOfAnyLength)
+{
+    Today today;
+    ASSERT_TRUE(findToday("Sat Nov 21 03:15:30 UTC 12026\n", today));
+    EXPECT_EQ(today.year, 12026);
+}
+
 TEST(LogToday, IsNotFoundWithoutSpaces)
 {
     Today today;

@@ -168,6 +168,15 @@ TEST(LabelledDate, KeepsWhatWasReadOfAnInvalidDate)
     EXPECT_EQ(date.year, 2008);
 }
 
+TEST(LabelledDate, IsValidWithADayThatNoMonthHas)
+{
+    LabelledDate date;
+    EXPECT_EQ(scanLabelledDate("Password expires : Feb 0, 2008", label, date), Scan::valid);
+    EXPECT_EQ(date.day, 0);
+    EXPECT_EQ(scanLabelledDate("Password expires : Feb 99, 2008", label, date), Scan::valid);
+    EXPECT_EQ(date.day, 99);
+}
+
 TEST(LabelledDate, ReadsTwoDigitsOfTheDayAndFourOfTheYear)
 {
     LabelledDate date;

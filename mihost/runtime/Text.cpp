@@ -34,7 +34,8 @@ bool isTreacherous(char32_t character)
     };
     static constexpr Range ranges[] = {
         {0x00, 0x1F},       {0x7F, 0x9F},     // control characters
-        {0x61C, 0x61C},     {0x200B, 0x200F}, // invisible and direction marks
+        {0xAD, 0xAD},       {0x61C, 0x61C},   // soft hyphen, direction mark
+        {0x200B, 0x200F},                     // invisible and direction marks
         {0x2028, 0x202E},   {0x2060, 0x206F}, // line breaks, direction overrides
         {0xFEFF, 0xFEFF},   {0xFFF9, 0xFFFB}, // byte-order mark, annotations
         {0xE0000, 0xE0FFF},                   // tags

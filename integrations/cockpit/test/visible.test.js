@@ -10,6 +10,10 @@ test("visible escapes what reorders or hides text", () => {
     assert.equal(visible("a\u202eb\u200bc\u2066d\ufeff"), "a\\u202eb\\u200bc\\u2066d\\ufeff");
 });
 
+test("visible escapes what mihost escapes", () => {
+    assert.equal(visible("a\u206fb\ufff9c\u{e0041}d"), "a\\u206fb\\ufff9c\\U000e0041d");
+});
+
 test("visible leaves text, markup, tabs and line ends alone", () => {
     const text = "<b>Zoë</b>\tpäth\nline — 日本";
     assert.equal(visible(text), text);

@@ -36,6 +36,11 @@ TEST(Printable, WritesCharactersThatTurnTheLineAroundAsEscapes)
     EXPECT_EQ(printable("\U000E0041"), "\\U000e0041");
 }
 
+TEST(Printable, WritesInvisibleCharactersAsEscapes)
+{
+    EXPECT_EQ(printable("r\u00ADo\u200Bo\uFEFFt"), "r\\u00ado\\u200bo\\ufefft");
+}
+
 TEST(Printable, WritesEachByteThatIsNoUtf8InHex)
 {
     EXPECT_EQ(printable("J\xFCrgen\xFF"), "J\\xfcrgen\\xff");

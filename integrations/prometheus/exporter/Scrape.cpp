@@ -33,8 +33,12 @@ public:
         posix_spawn_file_actions_adddup2(&actions, output, STDOUT_FILENO);
         posix_spawnattr_t attributes;
         posix_spawnattr_init(&attributes);
-        // Its own process group, so that its commands are killed with it.
-        posix_spawnattr_setflags(&attributes, POSIX_SPAWN_SETPGROUP);
+        // Its own process group, so that its commands are killed with it. It does not inherit
+        // blocked signals, so that systemd can end it.
+        sigset_t none;
+        sigemptyset(&none);
+        posix_spawnattr_setsigmask(&attributes, &none);
+        posix_spawnattr_setflags(&attributes, POSIX_SPAWN_SETPGROUP | POSIX_SPAWN_SETSIGMASK);
         if (posix_spawn(&pid_, arguments[0], &actions, &attributes, arguments.data(), environ) != 0)
             pid_ = -1;
         posix_spawnattr_destroy(&attributes);

@@ -4,6 +4,7 @@
 #include "mihost/sandbox/Descriptor.h"
 #include "tests/support/ScratchFolder.h"
 
+#include <csignal>
 #include <fcntl.h>
 #include <gtest/gtest.h>
 #include <sys/stat.h>
@@ -43,6 +44,17 @@ TEST(Scrape, IsNothingWithoutAText)
 {
     EXPECT_EQ(shell("true"), std::nullopt);
     EXPECT_EQ(scrape({"/no/such/program"}, longEnough), std::nullopt);
+}
+
+TEST(Scrape, EndsWithAProgramThatIsTerminated)
+{
+    sigset_t endings;
+    sigset_t before;
+    sigemptyset(&endings);
+    sigaddset(&endings, SIGTERM);
+    pthread_sigmask(SIG_BLOCK, &endings, &before); // as the exporter does
+    EXPECT_EQ(shell("kill -TERM $$; echo late"), std::nullopt);
+    pthread_sigmask(SIG_SETMASK, &before, nullptr);
 }
 
 /** What its writers wrote by the time that the last of them has ended. */

@@ -11,7 +11,7 @@ constexpr char const* wc = "wc -l @";
 constexpr char const* sed = "sed -n '#p' @";
 constexpr char const* modinfo = "modinfo ~";
 
-TEST(AccelCommand, KnowsTheCommandsOfThePlugIn)
+TEST(AccelCommand, KnowsTheCommandsOfThePlugin)
 {
     EXPECT_EQ(operandsOf(wc, "wc -l /var/log/messages").value().name, "/var/log/messages");
     EXPECT_EQ(operandsOf(sed, "sed -n '120p' /var/log/messages").value().name, "/var/log/messages");
@@ -25,7 +25,7 @@ TEST(AccelCommand, LeavesEverythingElseToTheShell)
 {
     for (char const* line :
          {"", " ", "echo hi", "/usr/bin/date", "./date", "Date", "datex", " date", "date ",
-          // what a shell makes something of
+          // characters with a meaning in a shell
           "date;", "date&", "date|cat", "date>x", "date #", "date\n", "wc -l $HOME", "wc -l \"f\"",
           "wc -l ~", "wc -l f*", "wc -l f?", "wc -l [f]", "wc -l {f,g}", "wc -l `f`", "wc -l f\\",
           "wc -l 'f", "wc -l 'f g'", "wc -l f'g'", "wc -l a=b", "wc -l a%b", "wc -l a!b",
@@ -38,7 +38,7 @@ TEST(AccelCommand, LeavesEverythingElseToTheShell)
           "sed -n '1p' f g", "sed -n '1p' -", "sed -n '1p' -i", "sed -n '1d' f", "sed -n 'p' f",
           "sed -n '' f", "sed -n '$p' f", "sed -n '1,2p' f", "sed -n '1q' f", "sed -n '1pp' f",
           "sed -n '+1p' f", "sed -n '-1p' f", "sed -n '1000000000000000000p' f",
-          // refused by some seds
+          // some versions of sed refuse these
           "sed -n '0p' f", "sed -n '00p' f", "sed -n '01p' f"})
         for (char const* form : {wc, sed, "date", modinfo})
             EXPECT_FALSE(operandsOf(form, line)) << line;

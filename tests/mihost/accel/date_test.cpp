@@ -1,4 +1,4 @@
-// date, asked in both ways and compared byte by byte.
+// date, run and answered by the accelerator, compared byte by byte.
 
 #include "mihost/accel/Answers.h"
 #include "tests/support/BothWays.h"
@@ -17,7 +17,7 @@ using bothways::real;
 
 constexpr std::time_t day = 24 * 60 * 60;
 
-/** All through some years, at every hour of the day, and the ends of what fits. */
+/** @return seconds since 1970: all through three years, and some before 1970 and after 2038 */
 std::vector<std::time_t> instants()
 {
     std::vector<std::time_t> times{-3000000000, -1, 0, 1, 2147483647, 2147483648, 4102444800};
@@ -51,7 +51,7 @@ protected:
     std::string const command_ = "date -f " + folder_.path("times");
 };
 
-TEST_F(AccelDates, AreThoseOfDateInEveryTimeZoneThereIs)
+TEST_F(AccelDates, AreThoseOfDateInEveryTimeZone)
 {
     setenv("LC_ALL", "C", 1);
     Lines const zones = linesOf(
@@ -85,7 +85,7 @@ TEST_F(AccelDates, AreThoseOfDateForZonesOfEveryForm)
     EXPECT_EQ(own(), real(command_));
 }
 
-TEST_F(AccelDates, AreThoseOfDateInLocalesThatAreThereOrMissing)
+TEST_F(AccelDates, AreThoseOfDateInPresentAndMissingLocales)
 {
     char const* const variables[] = {"LC_ALL", "LC_TIME", "LANG", "LC_COLLATE"};
     for (char const* locale : {"C", "POSIX", "C.UTF-8", "xx_YY.UTF-8", "", "/tmp", "../x"})
@@ -98,7 +98,7 @@ TEST_F(AccelDates, AreThoseOfDateInLocalesThatAreThereOrMissing)
         }
 }
 
-/** How often date runs to be answered once. */
+/** @return how many times date is run to answer it once */
 unsigned long runsOfDate()
 {
     unsigned long const before = countOf("date").handed_on;
@@ -106,7 +106,7 @@ unsigned long runsOfDate()
     return countOf("date").handed_on - before;
 }
 
-/** Until the test ends, this process has another time than the commands that it runs. */
+/** Until the test ends, gives this process another time than the commands that it runs. */
 void shiftClock(std::time_t seconds)
 {
     libc::hooks().clock_gettime = [seconds](clockid_t clock, timespec* now) {

@@ -37,7 +37,7 @@ protected:
         return now;
     }
 
-    /** @return how many bytes it reads for that */
+    /** @return how many bytes the update read */
     std::size_t update()
     {
         ReadCounter const counter;
@@ -52,7 +52,7 @@ protected:
         auto const lines = std::count(text.begin(), text.end(), '\n');
         ASSERT_EQ(index_.lineEnds(), static_cast<std::uint64_t>(lines));
         ASSERT_EQ(index_.hasNul(), text.find('\0') != std::string::npos);
-        std::uint64_t const step = 1 + index_.lineEnds() / 500; // of many lines not all are sought
+        std::uint64_t const step = 1 + index_.lineEnds() / 500; // not every one of many lines
         std::size_t begin = 0;
         for (std::uint64_t line = 1; line <= index_.lineEnds() + 1; ++line) {
             if (line % step == 0 || line > index_.lineEnds()) {
@@ -68,7 +68,7 @@ protected:
     LineIndex index_;
 };
 
-TEST_F(AccelLineIndex, FindsEveryLineWhereverItsBlocksEnd)
+TEST_F(AccelLineIndex, FindsEveryLineWhereverBlocksEnd)
 {
     std::mt19937 random(1);
     for (std::size_t const longest : {3U, 300U, 70'000U, 200'000U}) {
@@ -82,7 +82,7 @@ TEST_F(AccelLineIndex, FindsEveryLineWhereverItsBlocksEnd)
         expectIndexOf(std::string(size, '\n'));
 }
 
-TEST_F(AccelLineIndex, ReadsOnlyEdgesAndWhatIsNew)
+TEST_F(AccelLineIndex, ReadsOnlyTheEdgesAndNewBytes)
 {
     write(std::string(4'000'000, '\n'));
     EXPECT_EQ(update(), 4'000'000 + 2 * edge);
@@ -115,7 +115,7 @@ TEST_F(AccelLineIndex, NoticesOtherEdgesOfAGrownFile)
     }
 }
 
-TEST_F(AccelLineIndex, NoticesWritesAtItsEdgesOrByTheTime)
+TEST_F(AccelLineIndex, NoticesWritesByTheEdgesOrTheTime)
 {
     write(std::string(textSize, 'a'));
     struct stat taken = state();
@@ -123,7 +123,7 @@ TEST_F(AccelLineIndex, NoticesWritesAtItsEdgesOrByTheTime)
     std::uint64_t lineEnds = 0;
     for (std::size_t const changed : endsOfEdges) {
         writeLineEnd(changed);
-        ASSERT_TRUE(index_.update(file_.get(), taken)); // with the time of before
+        ASSERT_TRUE(index_.update(file_.get(), taken)); // with the earlier time
         EXPECT_EQ(index_.lineEnds(), ++lineEnds);
     }
     writeLineEnd(textSize / 2);

@@ -1,4 +1,4 @@
-// wc and sed, asked in both ways and compared byte by byte.
+// wc and sed, run and answered by the accelerator, compared byte by byte.
 
 #include "tests/support/ComparedLog.h"
 #include "tests/support/ReadCounter.h"
@@ -32,7 +32,7 @@ protected:
     std::string const wc_ = "wc -l " + log_;
 };
 
-TEST(AccelLogs, AreReadAsTheCommandsReadThemWhateverHappens)
+TEST(AccelLogs, AreReadAsTheCommandsReadThem)
 {
     EXPECT_GT(percentOfSedsAnswered(7, 100), 50U);
 }
@@ -57,7 +57,7 @@ TEST_F(AccelLog, IsIndexedOnceForBothCommands)
     EXPECT_LT(counter.bytes(), size + size / 10);
 }
 
-TEST_F(AccelLog, IsReadByWhateverNameItHas)
+TEST_F(AccelLog, IsReadUnderAnyName)
 {
     std::filesystem::create_symlink("log", folder_.path("link"));
     EXPECT_EQ(answered("wc -l " + folder_.path("link")), "3 " + folder_.path("link") + "\n");
@@ -105,7 +105,7 @@ TEST_F(AccelLog, CountsNeitherBackwardsNorAheadWhileItGrows)
     writer.join();
 }
 
-TEST_F(AccelLog, StaysWithItsReaderWhenItIsCutMeanwhile)
+TEST_F(AccelLog, KeepsAnOpenAnswerWhenTheLogIsCut)
 {
     std::string const line = std::string(1024 * 1024, 'a') + '\n';
     folder_.write("log", line);

@@ -8,7 +8,7 @@ namespace stream_test
 
 using miaccel::openStream;
 
-TEST(AccelStream, GivesItsTextWholeWithNulBytes)
+TEST(AccelStream, GivesItsWholeTextWithNulBytes)
 {
     for (std::string const& text : {std::string(), std::string(3 * 1024 * 1024, '\0') + "\nend"}) {
         FILE* const stream = openStream(text);

@@ -17,7 +17,7 @@ using bothways::reasonOf;
 
 namespace fs = std::filesystem;
 
-/** A file whose lines are counted in both ways. */
+/** A file whose lines wc counts, run or answered by the accelerator. */
 class AccelTrust : public testing::Test
 {
 protected:
@@ -57,7 +57,7 @@ TEST_F(AccelTrust, EndsWhenPathFindsTheToolElsewhereFirst)
     EXPECT_FALSE(answered(wc_));
 }
 
-TEST_F(AccelTrust, EndsForAPathThatIsNotPlainlyAbsolute)
+TEST_F(AccelTrust, EndsForARelativeOrOddPath)
 {
     for (char const* path : {"PATH=", "PATH=:", "PATH=:/usr/bin", "PATH=.:/usr/bin",
                              "PATH=bin:/usr/bin", "PATH=~/bin:/usr/bin", "PATH=/nonexistent",
@@ -116,7 +116,7 @@ TEST_F(AccelTrust, IsCountedForEachCommandWithItsReason)
     EXPECT_EQ(countOf("other").handed_on, other.handed_on + 1);
 }
 
-TEST(AccelCounts, AreInAFixedOrderAndAsManyAsThereIsRoomFor)
+TEST(AccelCounts, HaveAFixedOrderAndStopAtTheCallersLimit)
 {
     EXPECT_EQ(miaccel_counts(nullptr, 0), 6U);
     miaccel_count counts[6] = {};

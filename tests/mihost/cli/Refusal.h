@@ -6,7 +6,7 @@
 #include <gtest/gtest.h>
 #include <string>
 
-/** Why mihost refuses to do the step as wrong usage; "accepted" where it does it. */
+/** @return why mihost refuses the step as wrong usage; "accepted" if it does not */
 template <class Step> std::string refusal(Step step)
 {
     try {

@@ -16,7 +16,7 @@ namespace messages_test
 
 namespace fs = std::filesystem;
 
-/** A string literal; adjacent ones are one. */
+/** A string literal; adjacent ones count as one. */
 struct Literal {
     std::size_t start; // in the code
     std::size_t end;
@@ -85,7 +85,7 @@ bool isSentence(std::string const& text)
     return std::count(text.begin(), text.end(), ' ') >= 2;
 }
 
-/** What is said in statements that fail, warn or give a reason. */
+/** @return the messages in statements that fail, warn or give a reason */
 std::vector<std::string> messagesOf(Source const& source)
 {
     static std::regex const start(
@@ -106,7 +106,7 @@ std::vector<std::string> messagesOf(Source const& source)
     return messages;
 }
 
-/** Names such as UserSetAttrib, LANG or $6$ are written as they are. */
+/** Names such as UserSetAttrib, LANG or $6$ keep their capital letters. */
 bool isName(std::string const& word)
 {
     return std::any_of(word.begin() + 1, word.end(), [](unsigned char each) {
@@ -114,7 +114,7 @@ bool isName(std::string const& word)
     });
 }
 
-/** What is wrong with the form of a message. */
+/** @return what is wrong with the form of a message; nothing if it is right */
 std::optional<std::string> flawOf(std::string const& message)
 {
     constexpr std::size_t longest = 160; // characters, values not counted

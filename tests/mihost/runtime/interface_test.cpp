@@ -28,13 +28,15 @@ using Nodes = std::vector<Node*>;
 
 using Interface = OpenFramework;
 
-/** A node that says when it goes. */
-class Mortal : public MutableNode
+/** A node that records when it is deleted. */
+class ObservedNode : public MutableNode
 {
 public:
-    Mortal(unsigned int id, Events& events) : MutableNode(id, 0, {1}, 46, 0), events_(events) {}
+    ObservedNode(unsigned int id, Events& events) : MutableNode(id, 0, {1}, 46, 0), events_(events)
+    {
+    }
 
-    ~Mortal() override
+    ~ObservedNode() override
     {
         events_.push_back("gone " + std::to_string(getNodeId()));
     }
@@ -43,7 +45,7 @@ private:
     Events& events_;
 };
 
-/** Records the host's notifications, and whether the node is listed then. */
+/** Records the host's notifications, and whether the node is listed at that time. */
 class Host : public mihost::NodeObserver
 {
 public:
@@ -92,7 +94,7 @@ protected:
 
     Node* add(unsigned int id)
     {
-        Node* node = new Mortal(id, events_);
+        Node* node = new ObservedNode(id, events_);
         EXPECT_EQ(interface_.addNewNode(node).getStatus(), 0U);
         return node;
     }
@@ -123,7 +125,7 @@ TEST_F(RuntimeInterface, CountsNodeIdsFromItsOwnIdOn)
     EXPECT_EQ(static_cast<std::string>(interface_), "management interface 7");
 }
 
-TEST_F(RuntimeInterface, StartsItsIdListAfresh)
+TEST_F(RuntimeInterface, ListsItsIdsInPlaceOfEarlierOnes)
 {
     interface_.miIds_ = {3, 4};
     interface_.initialize(7, Number(0U), Number(0U));
@@ -142,11 +144,11 @@ TEST_F(RuntimeInterface, CopiesTheNodeListInPlaceOfWhatTheCallerHad)
 
 TEST_F(RuntimeInterface, ListsNodesThatTheInterfaceAppendedItself)
 {
-    interface_.nodes_.push_back(new Mortal(2, events_));
+    interface_.nodes_.push_back(new ObservedNode(2, events_));
     EXPECT_EQ(listed(), Ids{2});
 }
 
-TEST_F(RuntimeInterface, ListsANewNodeAndTellsTheHost)
+TEST_F(RuntimeInterface, ListsANewNodeAndInformsTheHost)
 {
     Host const host(interface_, events_);
     add(2);
@@ -164,7 +166,7 @@ TEST_F(RuntimeInterface, NeverListsANodeTwice)
     EXPECT_EQ(events_, Events{"added listed 2"});
 }
 
-TEST_F(RuntimeInterface, RefusesNoNodeAtAll)
+TEST_F(RuntimeInterface, RefusesANullPointer)
 {
     Host const host(interface_, events_);
     Node* none = nullptr;
@@ -190,7 +192,7 @@ Error lookUp(std::string const&, Node**)
     return {0, Number(0U), ""};
 }
 
-TEST_F(RuntimeInterface, RemembersTheCallBacksAndCallsNeither)
+TEST_F(RuntimeInterface, KeepsTheCallBacksAndCallsNeither)
 {
     Load seen;
     interface_.setLoadCallBack(load, &seen, lookUp);
@@ -200,7 +202,7 @@ TEST_F(RuntimeInterface, RemembersTheCallBacksAndCallsNeither)
     EXPECT_TRUE(seen.nodes.empty());
 }
 
-TEST_F(RuntimeInterface, HandsANewNodeToTheLoadCallBack)
+TEST_F(RuntimeInterface, PassesANewNodeToTheLoadCallBack)
 {
     Load seen;
     interface_.setLoadCallBack(load, &seen, nullptr);
@@ -216,7 +218,7 @@ TEST_F(RuntimeInterface, ReturnsTheHostsAnswerAndKeepsARefusedNode)
     Load seen;
     seen.answer = 5;
     interface_.setLoadCallBack(load, &seen, nullptr);
-    Node* node = new Mortal(2, events_);
+    Node* node = new ObservedNode(2, events_);
     Error const error = interface_.addNewNode(node);
     EXPECT_EQ(error.getStatus(), 5U);
     EXPECT_EQ(static_cast<std::string>(error), "status 5: from the host");
@@ -224,7 +226,7 @@ TEST_F(RuntimeInterface, ReturnsTheHostsAnswerAndKeepsARefusedNode)
     EXPECT_TRUE(events_.empty());
 }
 
-TEST_F(RuntimeInterface, UnlistsANodeTellsTheHostAndDeletesIt)
+TEST_F(RuntimeInterface, RemovesANodeInformsTheHostAndDeletesIt)
 {
     Node* const node = add(2);
     add(3);
@@ -237,7 +239,7 @@ TEST_F(RuntimeInterface, UnlistsANodeTellsTheHostAndDeletesIt)
 TEST_F(RuntimeInterface, AnswersStatus1ForANodeThatItDoesNotList)
 {
     add(2);
-    Mortal stranger(9, events_);
+    ObservedNode stranger(9, events_);
     Host const host(interface_, events_);
     EXPECT_EQ(interface_.deleteNode(&stranger).getStatus(), 1U);
     EXPECT_EQ(interface_.deleteNode(nullptr).getStatus(), 1U);
@@ -247,7 +249,7 @@ TEST_F(RuntimeInterface, AnswersStatus1ForANodeThatItDoesNotList)
 
 TEST_F(RuntimeInterface, AnswersStatus1WhenItListsNothing)
 {
-    Mortal stranger(9, events_);
+    ObservedNode stranger(9, events_);
     EXPECT_EQ(interface_.deleteNode(&stranger).getStatus(), 1U);
 }
 
@@ -277,7 +279,7 @@ TEST_F(RuntimeInterface, DeletesNodesInAnyOrder)
     }
 }
 
-TEST_F(RuntimeInterface, KeepsTheOrderWhenManyNodesGoAtOnce)
+TEST_F(RuntimeInterface, KeepsTheOrderWhenManyNodesAreRemoved)
 {
     std::mt19937 random(18);
     for (int round = 0; round < 50; ++round) {
@@ -296,7 +298,7 @@ TEST_F(RuntimeInterface, KeepsTheOrderWhenManyNodesGoAtOnce)
             EXPECT_EQ(interface_.deleteNode(nullptr).getStatus(), 1U);
             left.erase(std::find(left.begin(), left.end(), id));
         }
-        interface_.nodes_.push_back(new Mortal(20, events_));
+        interface_.nodes_.push_back(new ObservedNode(20, events_));
         left.push_back(20);
         add(21);
         left.push_back(21);
@@ -311,7 +313,7 @@ TEST_F(RuntimeInterface, KeepsTheOrderThroughAdditionsAndDeletions)
     std::mt19937 random(19);
     std::vector<std::pair<unsigned int, Node*>> left;
     for (unsigned int id = 0; id < 500; ++id) {
-        Node* appended = new Mortal(id, events_);
+        Node* appended = new ObservedNode(id, events_);
         if (id % 2 == 0)
             interface_.nodes_.push_back(appended);
         EXPECT_EQ(interface_.addNewNode(appended).getStatus(), 0U);
@@ -362,7 +364,7 @@ TEST_F(RuntimeInterface, FindsAndUnloadsNodesAfterDeletedOnes)
 TEST_F(RuntimeInterface, DeletesEveryNodeWhenItIsUnloaded)
 {
     add(2);
-    interface_.nodes_.push_back(new Mortal(3, events_));
+    interface_.nodes_.push_back(new ObservedNode(3, events_));
     interface_.unload();
     EXPECT_EQ(events_, (Events{"gone 2", "gone 3"}));
     EXPECT_TRUE(listed().empty());
@@ -392,7 +394,7 @@ TEST_F(RuntimeInterface, AnswersStatus1ForAnIdThatNoNodeHas)
     }
 }
 
-TEST_F(RuntimeInterface, TakesAndDropsAListenerForAlerts)
+TEST_F(RuntimeInterface, AddsAndRemovesAListenerForAlerts)
 {
     auto const listener = [](std::vector<IC::Alert> const&, void const*) -> Error {
         return {0, Number(0U), ""};

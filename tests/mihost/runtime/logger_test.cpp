@@ -14,7 +14,7 @@ namespace logger_test
 
 using VXLog::VXLogger;
 
-TEST(Logger, HandsBothOperationsToTheSinkWithEveryArgument)
+TEST(Logger, PassesEveryArgumentOfBothCallsToTheSink)
 {
     Recording const log;
     char extra[] = "extra";

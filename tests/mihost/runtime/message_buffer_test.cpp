@@ -22,7 +22,7 @@ std::string thereAndBack(std::string const& text)
     return make_string(make_wstring(text));
 }
 
-/** UTF-8 as its definition has it. */
+/** @return the UTF-8 of the code point, after its definition */
 std::string utf8(char32_t code)
 {
     auto const byte = [](char32_t bits) { return static_cast<char>(bits); };
@@ -75,7 +75,7 @@ TEST(MakeWstring, DecodesAndEncodesEveryCodePoint)
     EXPECT_TRUE(make_string(wide) == narrow);
 }
 
-TEST(MakeWstring, LetsEveryByteSurviveTheWayThereAndBack)
+TEST(MakeWstring, KeepsEveryByteThereAndBack)
 {
     for (int first = 0; first <= 0xFF; ++first) {
         std::string const one(1, static_cast<char>(first));
@@ -87,10 +87,10 @@ TEST(MakeWstring, LetsEveryByteSurviveTheWayThereAndBack)
     }
 }
 
-TEST(MakeWstring, LetsAnyBytesSurviveTheWayThereAndBack)
+TEST(MakeWstring, KeepsAnyBytesThereAndBack)
 {
     std::mt19937 random(20100512);
-    // Bytes that begin and go on in sequences are likelier, so that half sequences come about.
+    // Mostly bytes that begin or continue a sequence, so that incomplete sequences occur.
     std::string const alphabet = "a\x80\xBF\xC2\xDF\xE0\xED\xEF\xF0\xF4\xF8\xFF";
     for (int round = 0; round < 20000; ++round) {
         std::string text(random() % 24, ' ');
@@ -101,7 +101,7 @@ TEST(MakeWstring, LetsAnyBytesSurviveTheWayThereAndBack)
     }
 }
 
-TEST(MakeWstring, LetsRandomUtf8SurviveTheWayThereAndBack)
+TEST(MakeWstring, KeepsRandomUtf8ThereAndBack)
 {
     std::mt19937 random(20081231);
     for (int round = 0; round < 5000; ++round) {
@@ -119,7 +119,7 @@ TEST(MakeWstring, LetsRandomUtf8SurviveTheWayThereAndBack)
     }
 }
 
-TEST(MakeWstring, TakesBytesThatAreNoUtf8OneByOne)
+TEST(MakeWstring, DecodesBytesThatAreNotUtf8OneByOne)
 {
     struct {
         char const* what;
@@ -146,7 +146,7 @@ TEST(MakeWstring, TakesBytesThatAreNoUtf8OneByOne)
     }
 }
 
-TEST(MakeWstring, GoesOnBehindAByteThatIsNoUtf8)
+TEST(MakeWstring, ContinuesAfterAByteThatIsNotUtf8)
 {
     EXPECT_EQ(make_wstring("\xC3(\xC3\xB6"), (std::wstring{0xDCC3, L'(', 0xF6}));
 }
@@ -175,21 +175,21 @@ TEST(MessageBuffer, WritesNumbersInDecimal)
     EXPECT_EQ(other.str(other << UINT_MAX), "4294967295");
 }
 
-TEST(MessageBuffer, TakesAnythingThatAStreamTakesBehindANumber)
+TEST(MessageBuffer, AcceptsAfterANumberAllThatAStreamAccepts)
 {
     VXMessageBuffer buffer;
     EXPECT_EQ(buffer.str(buffer << "YY = " << 1900 << ", " << 7U << std::string(" end") << 'x'),
               "YY = 1900, 7 endx");
 }
 
-TEST(MessageBuffer, GoesOnWithTextsAfterAStreamWasUsed)
+TEST(MessageBuffer, AcceptsTextsAfterAStreamWasUsed)
 {
     VXMessageBuffer buffer;
     buffer << "a" << 1 << "b";
     EXPECT_EQ(buffer.str(buffer << "c" << 2), "a1bc2");
 }
 
-TEST(MessageBuffer, WritesPlainDigitsWhateverTheHostsLocale)
+TEST(MessageBuffer, WritesPlainDigitsInAnyLocale)
 {
     struct Grouped : std::numpunct<char> {
         std::string do_grouping() const override

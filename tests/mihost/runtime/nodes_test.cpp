@@ -18,7 +18,7 @@ using IC::PropertyValue;
 class NodeStore : public testing::Test
 {
 protected:
-    /** The text of a property, or "none" where the read fails and the caller's value stays. */
+    /** @return the text of a property, or "none" if the read fails and keeps the caller's value */
     std::string text(unsigned int id)
     {
         PropertyValue value("before", false);
@@ -31,7 +31,7 @@ protected:
     MutableNode node_{5, 4, {1, 2}, 46, 3};
 };
 
-TEST_F(NodeStore, KeepsWhatANodeIsMadeOf)
+TEST_F(NodeStore, KeepsItsIdsTypeAndIndex)
 {
     EXPECT_EQ(node_.getNodeId(), 5U);
     EXPECT_EQ(node_.getLinkedId(), 4U);
@@ -59,7 +59,7 @@ TEST_F(NodeStore, KeepsStatusAndDescription)
     EXPECT_EQ(static_cast<std::string>(base), "User Account");
 }
 
-TEST_F(NodeStore, TakesAPathAndAParent)
+TEST_F(NodeStore, KeepsAPathAndAParent)
 {
     EXPECT_EQ(node_.setPath("/os/users").getStatus(), 0U);
     EXPECT_EQ(node_.setParent("os").getStatus(), 0U);
@@ -94,7 +94,7 @@ TEST_F(NodeStore, KeepsPropertiesApart)
     EXPECT_EQ(text(1), "none");
 }
 
-TEST_F(NodeStore, HandsOutACopyOfItsProperties)
+TEST_F(NodeStore, ReturnsACopyOfItsProperties)
 {
     node_.setProperty(108, PropertyValue("first", true));
     auto properties = node_.getProperties();
@@ -102,7 +102,7 @@ TEST_F(NodeStore, HandsOutACopyOfItsProperties)
     EXPECT_EQ(text(108), "first");
 }
 
-TEST_F(NodeStore, AddsAnInterfaceOnceAndTakesItAway)
+TEST_F(NodeStore, AddsAnInterfaceOnceAndRemovesIt)
 {
     node_.addMI(9);
     node_.addMI(9);

@@ -26,7 +26,7 @@ protected:
         std::fclose(stream_);
     }
 
-    /** Through both of the logger's operations, as a plug-in hands a message over. */
+    /** Logs the text with both of the logger's operations, as a plug-in does. */
     static void say(std::string const& text)
     {
         VXLogger::logLevelMessage("function", "file", 12, "a.b", 3000, nullptr, 0, 0, text);
@@ -66,7 +66,7 @@ TEST_F(LogSinks, ForProgramsWriteEachCallAsAnObject)
     EXPECT_EQ(written(), (Lines{R"({"op":"log")" + rest, R"({"op":"trace")" + rest}));
 }
 
-TEST(LineWriter, KeepsTheFirstFailureAndWritesNothingBehindIt)
+TEST(LineWriter, KeepsTheFirstFailureAndWritesNothingMore)
 {
     std::FILE* const full = std::fopen("/dev/full", "w");
     ASSERT_NE(full, nullptr);
@@ -80,7 +80,7 @@ TEST(LineWriter, KeepsTheFirstFailureAndWritesNothingBehindIt)
     std::fclose(full);
 }
 
-TEST(LineWriter, TellsOfAFailureThatComesToLightAtTheEnd)
+TEST(LineWriter, ReportsAFailureThatShowsOnlyAtTheEnd)
 {
     std::FILE* const full = std::fopen("/dev/full", "w");
     ASSERT_NE(full, nullptr);

@@ -1,4 +1,4 @@
-// The runtime's text helpers, which mihost prints with; some are judged by mihost's JSON parser.
+// The runtime's text functions, with which mihost prints; its JSON parser checks some of them.
 
 #include "mihost/runtime/Text.h"
 
@@ -12,7 +12,7 @@ using mihost::jsonString;
 using mihost::printable;
 using mihost::validUtf8;
 
-TEST(Printable, LeavesOrdinaryTextInAnyScriptAlone)
+TEST(Printable, KeepsOrdinaryTextInAnyScript)
 {
     EXPECT_EQ(printable("Jürgen 李 ~ \\ \""), "Jürgen 李 ~ \\ \"");
 }
@@ -30,7 +30,7 @@ TEST(Printable, WritesControlCharactersBeyondAsciiAsEscapes)
               "\\u009b31m");
 }
 
-TEST(Printable, WritesCharactersThatTurnTheLineAroundAsEscapes)
+TEST(Printable, WritesTextDirectionCharactersAsEscapes)
 {
     EXPECT_EQ(printable("a\u202Eb\u2066c\u2028d\u200Ee"), "a\\u202eb\\u2066c\\u2028d\\u200ee");
     EXPECT_EQ(printable("\U000E0041"), "\\U000e0041");
@@ -41,12 +41,12 @@ TEST(Printable, WritesInvisibleCharactersAsEscapes)
     EXPECT_EQ(printable("r\u00ADo\u200Bo\uFEFFt"), "r\\u00ado\\u200bo\\ufefft");
 }
 
-TEST(Printable, WritesEachByteThatIsNoUtf8InHex)
+TEST(Printable, WritesEachByteThatIsNotUtf8InHex)
 {
     EXPECT_EQ(printable("J\xFCrgen\xFF"), "J\\xfcrgen\\xff");
 }
 
-TEST(ValidUtf8, LeavesControlCharactersAlone)
+TEST(ValidUtf8, KeepsControlCharacters)
 {
     EXPECT_EQ(validUtf8("a\n\x1b"), "a\n\x1b");
 }
@@ -60,13 +60,13 @@ TEST(ValidUtf8, RefusesOverlongFormsSurrogatesAndBeyond)
     EXPECT_EQ(validUtf8("\xF4\x8F\xBF\xBF"), "\xF4\x8F\xBF\xBF");
 }
 
-TEST(ValidUtf8, TakesNoSequenceThatIsCutShort)
+TEST(ValidUtf8, RefusesAnIncompleteSequence)
 {
     EXPECT_EQ(validUtf8("\xE6\x9D"), "\\xe6\\x9d");
     EXPECT_EQ(validUtf8("\xE6\x9Dx"), "\\xe6\\x9dx");
 }
 
-TEST(JsonString, ReadsBackAsTheTextWhateverBytesItHolds)
+TEST(JsonString, ReadsBackAsTheTextForAnyBytes)
 {
     std::string all;
     for (int byte = 0; byte < 256; ++byte)
@@ -74,7 +74,7 @@ TEST(JsonString, ReadsBackAsTheTextWhateverBytesItHolds)
     EXPECT_EQ(nlohmann::json::parse(jsonString(all)).get<std::string>(), validUtf8(all));
 }
 
-TEST(JsonString, EscapesWhatStandsBetweenPlainRunsAndAtTheEnds)
+TEST(JsonString, EscapesBetweenPlainTextsAndAtBothEnds)
 {
     EXPECT_EQ(jsonString(""), "\"\"");
     EXPECT_EQ(jsonString("plain ~"), "\"plain ~\"");
@@ -82,7 +82,7 @@ TEST(JsonString, EscapesWhatStandsBetweenPlainRunsAndAtTheEnds)
     EXPECT_EQ(jsonString("\x7f\xC3\xA4\xFFz"), "\"\x7f\xC3\xA4\\\\xffz\"");
 }
 
-TEST(JsonString, IsAppendedBehindWhatStandsThere)
+TEST(JsonString, IsAppendedToTheText)
 {
     std::string text = "\"key\":";
     mihost::appendJsonString(text, "a\tb");

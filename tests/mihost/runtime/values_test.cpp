@@ -245,7 +245,7 @@ TEST(PropertyValue, KeepsItsFlag)
     }
 }
 
-TEST(PropertyValue, TakesTheSecondsOfADateForANumberWhereTheyFit)
+TEST(PropertyValue, BecomesANumberOfADatesSecondsIfTheyFit)
 {
     EXPECT_EQ(asUnsigned(date(86400)), 86400U);
     EXPECT_EQ(date(86400).getKind(), PropertyValue::DateKind);
@@ -284,7 +284,7 @@ TEST(PropertyValue, GivesADateInLocalTime)
     EXPECT_EQ(asText(date(1263291825)), "2010-01-12 11:23:45");
 }
 
-TEST(PropertyValue, GivesADateBackInTheFormThatIsScannedForADay)
+TEST(PropertyValue, WritesADateInTheFormThatIsScannedForADay)
 {
     useZone("CET-1CEST,M3.5.0,M10.5.0/3");
     for (int month = 1; month <= 12; ++month) {

@@ -28,7 +28,7 @@ TEST(MountTable, ListsOtherDisksParentsFirstAndEachOnce)
               (Paths{"/home", "/var", "/var/log"}));
 }
 
-TEST(MountTable, LeavesOutWhatTheCopyHasItsOwnOf)
+TEST(MountTable, LeavesOutFileSystemsThatTheCopyHasItself)
 {
     EXPECT_EQ(mountsIn("2 1 0:2 / /proc rw - proc proc rw\n"
                        "3 2 0:3 / /proc/sys/fs/binfmt_misc rw - tmpfs none rw\n"
@@ -58,7 +58,7 @@ TEST(MountTable, ReadsEscapedCharacters)
               Paths{"/a b\tc\nd\\e"});
 }
 
-TEST(MountTable, LeavesABackslashAloneThatEscapesNothing)
+TEST(MountTable, KeepsABackslashThatEscapesNothing)
 {
     EXPECT_EQ(mountsIn("2 1 8:2 / /a\\9\\1 rw - ext4 /dev/x rw\n"), Paths{"/a\\9\\1"});
 }
@@ -68,7 +68,7 @@ TEST(MountTable, LeavesOutLinesThatEndEarly)
     EXPECT_EQ(mountsIn("2 1 8:2 / /home rw shared:1\n\n2 1 8:2\n"), Paths());
 }
 
-TEST(MountTable, IsNotTakenForEmptyWhenItCannotBeRead)
+TEST(MountTable, IsNotTreatedAsEmptyIfItCannotBeRead)
 {
     EXPECT_THROW(mihost::mountsToCopy("/nonexistent/mountinfo"), std::runtime_error);
 }

@@ -30,7 +30,7 @@ TEST(LoginDefs, KnowsTheKeysWithoutANumber)
               (Lines{"UID_MIN", "UID_MAX", "GID_MIN"}));
 }
 
-TEST(LoginDefs, TakesTheLastNumberUntilEveryKeyWasThere)
+TEST(LoginDefs, TakesTheLastNumberUntilEveryKeyWasFound)
 {
     LoginDefs const defs("UID_MIN 1\nUID_MIN 2\nUID_MIN none\nUID_MAX 9\nGID_MIN 3\n"
                          "GID_MAX 4\nGID_MAX 5\n");
@@ -54,7 +54,7 @@ TEST(LoginDefs, ReadsTheNumbersThatThePluginReads)
     }
 }
 
-TEST(LoginDefs, HasTheEncryptMethodWhereverItStandsInItsLine)
+TEST(LoginDefs, FindsTheEncryptMethodAnywhereInItsLine)
 {
     EXPECT_EQ(LoginDefs(usual).encryptMethod(), "");
     EXPECT_EQ(LoginDefs("#ENCRYPT_METHOD MD5\n").encryptMethod(), "");

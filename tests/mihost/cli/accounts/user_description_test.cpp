@@ -11,7 +11,7 @@ using namespace mihost;
 
 constexpr long today = 20000;
 
-/** A machine with one ordinary account, jdoe, and this shadow record. */
+/** A machine with one ordinary account, jdoe, which has this shadow record. */
 AccountData machineWith(std::string const& shadow)
 {
     return {{{accountFile,
@@ -119,7 +119,7 @@ TEST(UserDescription, KnowsWhatIsStoredForAPassword)
             << each.stored;
 }
 
-TEST(UserDescription, TakesAPasswordFromTheAccountFile)
+TEST(UserDescription, ReadsAPasswordFromTheAccountFile)
 {
     UserDescription const user = describeUser(machineWith(""), "nobody").value();
     EXPECT_EQ(user.password, PasswordState::Unusable);

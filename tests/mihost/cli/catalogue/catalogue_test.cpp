@@ -9,7 +9,7 @@ namespace catalogue_test
 using mihost::methods;
 using mihost::nodeKinds;
 
-TEST(Catalogue, GivesEachPropertyOfAKindAnIdAndANameOfItsOwn)
+TEST(Catalogue, GivesEachPropertyOfAKindItsOwnIdAndName)
 {
     for (auto const& kind : nodeKinds()) {
         std::set<unsigned int> ids;
@@ -22,7 +22,7 @@ TEST(Catalogue, GivesEachPropertyOfAKindAnIdAndANameOfItsOwn)
     }
 }
 
-TEST(Catalogue, HasNamesThatAreNoIds)
+TEST(Catalogue, HasNoNameThatLooksLikeAnId)
 {
     for (auto const& kind : nodeKinds())
         for (auto const& property : kind.properties)

@@ -10,7 +10,7 @@ using mihost::AccountFiles;
 using mihost::changesBetween;
 using mihost::Secrets;
 
-TEST(AccountFileChanges, AreTheLinesThatWentAndCame)
+TEST(AccountFileChanges, AreTheRemovedAndTheAddedLines)
 {
     AccountFiles const before = {{"/etc/passwd", {"root:x:0:0::/root:/bin/sh", "a:x:1:1::/:/x"}},
                                  {"/etc/group", {"root:x:0:"}}};
@@ -23,7 +23,7 @@ TEST(AccountFileChanges, AreTheLinesThatWentAndCame)
     EXPECT_EQ(changes[0].added, Lines{"b:x:2:2::/:/x"});
 }
 
-TEST(AccountFileChanges, HideHashesUntilTheyAreAskedFor)
+TEST(AccountFileChanges, HideHashesUnlessAskedForThem)
 {
     AccountFiles const before = {{"/etc/shadow", {"jdoe:!:19000::::::"}}};
     AccountFiles const after = {{"/etc/shadow", {"jdoe:$6$salt$hash:19000::::::"}}};

@@ -41,7 +41,7 @@ protected:
     std::string const file = folder.path("lock");
 };
 
-/** Standard error into a pipe for as long as it lives. */
+/** Redirects standard error into a pipe while it exists, and reads it. */
 class ReadStandardError
 {
 public:
@@ -86,7 +86,7 @@ TEST_F(TheChangeLock, GivesUpAtTheLimitAndSaysWhatToDo)
                              file + "' shows the process)");
 }
 
-TEST_F(TheChangeLock, SaysWhatItWaitsForAndGoesOnOnceItIsFree)
+TEST_F(TheChangeLock, SaysWhatItWaitsForUntilItIsFree)
 {
     std::optional<ChangeLock> first(std::in_place, file, none);
     ReadStandardError const standardError;
@@ -102,7 +102,7 @@ TEST_F(TheChangeLock, SaysWhatItWaitsForAndGoesOnOnceItIsFree)
     EXPECT_TRUE(isLocked);
 }
 
-TEST_F(TheChangeLock, CanBeOpenedByItsOwnerAlone)
+TEST_F(TheChangeLock, CanBeOpenedOnlyByItsOwner)
 {
     ChangeLock const lock(file, none);
     struct stat status {

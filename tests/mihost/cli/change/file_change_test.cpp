@@ -1,4 +1,4 @@
-// Changed files as they are shown.
+// How changed files are shown.
 
 #include "mihost/cli/change/FileChange.h"
 #include "mihost/cli/change/SandboxChanges.h"
@@ -52,7 +52,7 @@ TEST(MissingLines, AreCountedAndInOrder)
     EXPECT_EQ(mihost::missingIn({}, {"a"}), Lines());
 }
 
-TEST(HideHash, LeavesWhatIsNoPassword)
+TEST(HideHash, KeepsWhatIsNotAPassword)
 {
     struct Case {
         char const* record;
@@ -74,7 +74,7 @@ TEST(HideHash, LeavesWhatIsNoPassword)
     }
 }
 
-TEST(ShownChanges, SayWhatCameWentAndChanged)
+TEST(ShownChanges, SayWhatWasAddedRemovedAndChanged)
 {
     EXPECT_EQ(shown(std::vector<PathChange>{
                   {"/home/new", {}, state(S_IFDIR | 0700, 1, 2), {}, {}},
@@ -92,7 +92,7 @@ TEST(ShownChanges, SayWhatCameWentAndChanged)
               "changed /home/bytes\n");
 }
 
-TEST(ShownChanges, SayThatAnotherKindOfFileCame)
+TEST(ShownChanges, SayThatTheKindOfFileChanged)
 {
     EXPECT_EQ(shown(std::vector<PathChange>{{"/etc/x",
                                              state(file | 0644),
@@ -133,7 +133,7 @@ TEST(ShownChanges, HideLinesOfOtherUnreadableFiles)
     PathChange const change = texts("/etc/shadowy.conf", "", "key\n", 0640);
     EXPECT_EQ(shown({change}), "changed /etc/shadowy.conf\n");
     EXPECT_EQ(shown({change}, Secrets::Show), "changed /etc/shadowy.conf\n  + key\n");
-    // Nor those of one that only now may be read by everybody.
+    // Nor the lines of a file that everybody may read only since the change.
     EXPECT_EQ(shown(std::vector<PathChange>{
                   {"/etc/key", state(file | 0600), state(file | 0644), "key\n", ""}}),
               "changed /etc/key (mode 0600 -> 0644)\n");
@@ -149,7 +149,7 @@ TEST(ShownChanges, CountTheLinesOfBackups)
               R"(["b"])");
 }
 
-TEST(ShownChanges, LeaveOutLockFilesAndTheProgramsOwn)
+TEST(ShownChanges, LeaveOutLockFilesAndTheProgramsOwnFiles)
 {
     std::vector<PathChange> changes;
     for (char const* path : {"/etc/.pwd.lock", "/etc/passwd.lock", "/tmp/own/usrandpwd"})

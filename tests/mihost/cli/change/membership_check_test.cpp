@@ -42,7 +42,7 @@ TEST(Identity, IsReadWithIdsAndNames)
     EXPECT_EQ(identity->groups[2].name, "crew");
 }
 
-TEST(Identity, MayHaveGroupsThatNobodyNamed)
+TEST(Identity, MayHaveGroupsWithoutAName)
 {
     auto const identity = parseIdentity("id: cannot find name for group ID 1700\n"
                                         "uid=1000(jdoe) gid=1700 groups=1700,27(sudo)\n");
@@ -51,7 +51,7 @@ TEST(Identity, MayHaveGroupsThatNobodyNamed)
     EXPECT_EQ(identity->groups.at(1).name, "sudo");
 }
 
-TEST(Identity, IsNothingOfAnyOtherForm)
+TEST(Identity, IsNotReadFromAnyOtherForm)
 {
     for (char const* text : {"", "id: 'jdoe': no such user\n", "uid=1000(jdoe) gid=1000(jdoe)\n",
                              "uid=1000(jdoe) gid=1000(jdoe) groups=1000(jdoe)",
@@ -78,7 +78,7 @@ TEST(MembershipChange, KeepsTheGroupsThatThePluginReads)
     EXPECT_EQ(objectionTo(plain), "none");
 }
 
-TEST(MembershipChange, IsRefusedForAGroupNameThatAShellWouldActOn)
+TEST(MembershipChange, IsRefusedForAGroupNameUnsafeInAShell)
 {
     EXPECT_EQ(objectionTo("uid=1000(jdoe) gid=1000(jdoe) "
                           "groups=1000(jdoe),1500(x`touch${IFS}/root/PWNED`)\n"),

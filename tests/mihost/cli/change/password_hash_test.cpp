@@ -8,7 +8,7 @@ using mihost::escapedForShell;
 using mihost::fits;
 using mihost::hashOf;
 
-TEST(PasswordHash, FitsItsPasswordAndNoOther)
+TEST(PasswordHash, FitsOnlyItsOwnPassword)
 {
     std::string const hash = hashOf("geheim42");
     EXPECT_TRUE(fits("geheim42", hash));

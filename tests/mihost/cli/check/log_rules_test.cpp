@@ -31,7 +31,7 @@ Findings nesting(std::vector<std::string> const& texts)
     return wrongNesting(calls);
 }
 
-TEST(CheckOfTheLog, WantsEachMessageLoggedAndThenTraced)
+TEST(CheckOfTheLog, RequiresEachMessageLoggedAndThenTraced)
 {
     EXPECT_EQ(wrongRepeats({logged("a"), traced("a"), logged("b"), traced("b")}), Findings());
     EXPECT_EQ(wrongRepeats({}), Findings{"nothing was logged"});
@@ -61,7 +61,7 @@ TEST(CheckOfTheLog, ComparesEveryArgumentOfTheTwo)
     EXPECT_TRUE(change([](LoggedCall& call) { call.text = "g"; }));
 }
 
-TEST(CheckOfTheLog, WantsFunctionUnitAndLineThenNullAndZeros)
+TEST(CheckOfTheLog, RequiresFunctionUnitLineNullAndZeros)
 {
     auto const isWrong = [](auto const& edit) {
         LoggedCall call = logged("a");
@@ -103,7 +103,7 @@ TEST(CheckOfTheLog, FollowsEntriesAndExits)
               (Findings{"b: entry without an exit before that of a", "b: exit without an entry"}));
 }
 
-TEST(CheckOfTheLog, LetsSomeEntriesStandAlone)
+TEST(CheckOfTheLog, AllowsSomeEntriesWithoutAnExit)
 {
     EXPECT_EQ(nesting({"a: entry", "OsNode::OsNode: entry", "UserNode::~UserNode: entry",
                        "PropertyType::CreateUser: entry", "a: exit"}),

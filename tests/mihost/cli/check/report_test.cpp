@@ -42,7 +42,7 @@ TEST(CheckReport, ShowsFindingsNotesAndReasonsBelowTheLine)
                     "1 of 4 checks failed, 1 skipped\n");
 }
 
-TEST(CheckReport, SpeaksTap)
+TEST(CheckReport, WritesTap)
 {
     EXPECT_EQ(tapText(results), "TAP version 14\n"
                                 "1..4\n"
@@ -114,7 +114,7 @@ TEST(CheckOfSymbols, KnowsTheHostsNames)
         EXPECT_FALSE(isHostName(name)) << name;
 }
 
-/** Without parameters, and without what only a compiler names. */
+/** The names without parameters, and without those that only a compiler makes. */
 std::set<std::string> listedNames()
 {
     std::set<std::string> names;
@@ -132,7 +132,7 @@ TEST(CheckOfSymbols, HasThePublicNamesOfThePlugin)
     EXPECT_EQ(names.size(), listedNames().size());
 }
 
-TEST(CheckOfSymbols, MissesNamesThatAreNotDefined)
+TEST(CheckOfSymbols, ReportsNamesThatAreNotDefined)
 {
     std::vector<Symbol> symbols = {{"OpenMI", true, false, false},
                                    {"_ZN2IC7pOsSwMIE", false, false, false}};

@@ -14,7 +14,7 @@ using namespace mihost::checks;
 
 constexpr unsigned int ownId = 50;
 
-/** The smallest whole tree: the single nodes, and two groups. */
+/** The smallest complete tree: the single nodes and two groups. */
 class CheckOfTheTree : public testing::Test
 {
 protected:
@@ -72,7 +72,7 @@ protected:
     Nodes nodes_;
 };
 
-TEST_F(CheckOfTheTree, FindsNothingWrongWithAWholeOne)
+TEST_F(CheckOfTheTree, FindsNothingWrongWithACompleteOne)
 {
     EXPECT_EQ(wrongTypeOrder(nodes_), Findings());
     EXPECT_EQ(wrongIds(nodes_, ownId), Findings());
@@ -87,7 +87,7 @@ TEST_F(CheckOfTheTree, FindsNothingWrongWithAWholeOne)
     EXPECT_EQ(wrongValues(nodes_), Findings());
 }
 
-TEST_F(CheckOfTheTree, MissesSingleNodesAndNamesUnknownOnes)
+TEST_F(CheckOfTheTree, ReportsMissingSingleNodesAndUnknownOnes)
 {
     nodes_.pop_back();
     add(99, 0, 0, "Other");
@@ -127,7 +127,7 @@ TEST_F(CheckOfTheTree, NamesWrongDescriptions)
     EXPECT_EQ(wrongDescriptions(nodes_).back(), "driver #57: no description");
 }
 
-TEST_F(CheckOfTheTree, MissesPropertiesAndNamesUnknownOnes)
+TEST_F(CheckOfTheTree, ReportsMissingPropertiesAndUnknownOnes)
 {
     at(IC::nodeType::root).setProperty(7, IC::values::number(1));
     add(IC::nodeType::driver, 53, 1, "one");
@@ -149,7 +149,7 @@ TEST_F(CheckOfTheTree, NamesWrongKindsAndFlags)
                         "os #53: requested-state (123): flag true rather than false"}));
 }
 
-TEST_F(CheckOfTheTree, LetsAFigureThatCouldNotBeReadStayEmpty)
+TEST_F(CheckOfTheTree, AcceptsAnEmptyFigureThatCouldNotBeRead)
 {
     IC::MutableNode& os = at(IC::nodeType::operatingSystem);
     os.setProperty(IC::property::processCount, IC::values::emptyValue());
@@ -166,7 +166,7 @@ TEST_F(CheckOfTheTree, NamesWrongValuesLengthsAndCounts)
                                              "log #56: log-number (37): '1' rather than '0'"}));
 }
 
-/** Answers what the real nodes do not. */
+/** Answers every property, also those that the real nodes do not answer. */
 class AnswersAll : public IC::MutableNode
 {
 public:

@@ -17,7 +17,7 @@ TEST(ProblemOfRanges, IsAKeyWithoutALineOrANumber)
               "no line begins with GID_MAX and a number");
 }
 
-TEST(ProblemOfAccounts, IsALineThatLibcDoesNotTake)
+TEST(ProblemOfAccounts, IsALineThatLibcDoesNotAccept)
 {
     std::string const good = "root:x:0:0:root:/root:/bin/sh\n\n# comment\n  \n+::::::\n";
     EXPECT_EQ(problemOfAccounts(good), std::nullopt);
@@ -37,7 +37,7 @@ TEST(ProblemOfAccounts, IsALineThatFillsThePluginsBuffer)
     EXPECT_EQ(problemOfAccounts(ofLength(4094)), "line 1 is too long");
 }
 
-TEST(ProblemOfGroups, IsALineThatLibcDoesNotTakeButNeverItsLength)
+TEST(ProblemOfGroups, IsALineThatLibcDoesNotAcceptNotItsLength)
 {
     std::string many = "many:x:100:";
     for (int member = 0; member < 2000; ++member)
@@ -46,7 +46,7 @@ TEST(ProblemOfGroups, IsALineThatLibcDoesNotTakeButNeverItsLength)
     EXPECT_EQ(problemOfGroups("root:x:0:\nstaff:x:fifty:\n"), "line 2 is malformed");
 }
 
-TEST(ProblemOfShadow, IsTheFirstAccountThatIsNotFoundGoingForward)
+TEST(ProblemOfShadow, IsTheFirstAccountMissingAtItsPlace)
 {
     std::string const shadow = "root:*:1:0:99999:7:::\nbin:*:1:0:99999:7:::\nanna:!:1::::::\n"
                                "ben:!:1::::::\n";
@@ -57,7 +57,7 @@ TEST(ProblemOfShadow, IsTheFirstAccountThatIsNotFoundGoingForward)
               "no entry for 'carl' at its place in the order of /etc/passwd");
 }
 
-TEST(ProblemOfShadow, IsAnEntryThatLibcDoesNotTake)
+TEST(ProblemOfShadow, IsAnEntryThatLibcDoesNotAccept)
 {
     EXPECT_EQ(problemOfShadow({"root", "ben"}, "root:*:never:0:99999:7:::\nben:!:1::::::\n"),
               "no entry for 'root' at its place in the order of /etc/passwd");
@@ -65,7 +65,7 @@ TEST(ProblemOfShadow, IsAnEntryThatLibcDoesNotTake)
               "no entry for 'ben' at its place in the order of /etc/passwd");
 }
 
-TEST(ProblemOfRelease, IsALackOfTheTwoLinesBehindTheFirst)
+TEST(ProblemOfRelease, IsThatTheTwoLinesAfterTheFirstAreMissing)
 {
     EXPECT_EQ(problemOfRelease("Name\nVERSION = 4\nPATCHLEVEL = 0\n"), std::nullopt);
     char const* const problem = "no lines like 'VERSION = 1' and 'PATCHLEVEL = 0' after the first";

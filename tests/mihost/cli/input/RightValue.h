@@ -5,7 +5,7 @@
 
 #include <string>
 
-/** A value of the form that is accepted. */
+/** @return a value of the form that is accepted */
 inline std::string rightValue(mihost::Form form)
 {
     switch (form) {

@@ -9,7 +9,7 @@ namespace address_test
 
 using mihost::Failure;
 
-/** A tree with one node of several kinds. */
+/** A tree with one node of each of several kinds. */
 class Addresses : public testing::Test
 {
 protected:
@@ -84,7 +84,7 @@ TEST_F(Addresses, FindRepeatedNodesByKindAndName)
     EXPECT_EQ(find("log:1"), 10U);
 }
 
-TEST_F(Addresses, TakeEverythingBehindTheFirstColonAsTheName)
+TEST_F(Addresses, TakeEverythingAfterTheFirstColonAsTheName)
 {
     EXPECT_EQ(find("user:a:b"), 6U);
 }
@@ -103,14 +103,14 @@ TEST_F(Addresses, ThatAreInvalidAreRefusedWithAnExample)
     }
 }
 
-TEST_F(Addresses, ThatNameAKindOfNodeAreToldHowToListIt)
+TEST_F(Addresses, NamingAKindOfNodeSuggestTheListCommand)
 {
     EXPECT_EQ(refusalOf("group"), "no node 'group' (write group:NAME; see 'mihost list groups')");
     EXPECT_EQ(refusalOf("drivers"),
               "no node 'drivers' (write driver:NAME; see 'mihost list drivers')");
 }
 
-TEST_F(Addresses, ThatNearlyNameANodeOfTheirKindAreToldItsName)
+TEST_F(Addresses, NearlyNamingANodeSuggestItsName)
 {
     EXPECT_EQ(refusalOf("user:jdoo"), "no node 'user:jdoo' in the tree (did you mean user:jdoe?)");
     for (char const* address : {"user:ext4", "user:", "log:2", "3"})

@@ -13,7 +13,7 @@ using mihost::ChoiceTable;
 class ChoiceTableTest : public testing::Test
 {
 protected:
-    /** What is wrong with the word; empty if it is accepted. */
+    /** @return what is wrong with the word; empty if it is accepted */
     std::string objectionTo(std::string const& word)
     {
         try {
@@ -30,7 +30,7 @@ protected:
     ChoiceTable table_;
 };
 
-TEST_F(ChoiceTableTest, LetsAnOptionTakeItsWordsOnly)
+TEST_F(ChoiceTableTest, AcceptsOnlyTheWordsOfAnOption)
 {
     table_.restrict(option_, {"restart", "halt"});
     EXPECT_EQ(objectionTo("halt"), "");

@@ -19,7 +19,7 @@ TEST(DayNumber, CountsFrom1970)
     EXPECT_EQ(dayNumber({2038, 1, 19}), 24855);
 }
 
-TEST(DayNumber, IsTheWayBackToTheDay)
+TEST(DayNumber, BecomesTheSameDayAgain)
 {
     for (long number = dayNumber({1901, 1, 1}); number <= dayNumber({2110, 12, 31}); ++number) {
         auto const day = dayOfNumber(number);
@@ -29,7 +29,7 @@ TEST(DayNumber, IsTheWayBackToTheDay)
     }
 }
 
-TEST(DayNumber, HasNoDayBeyondTheYearsThatCanBeWritten)
+TEST(DayNumber, HasNoDayOutsideTheYearsThatCanBeWritten)
 {
     EXPECT_EQ(dayText(*dayOfNumber(dayNumber({9999, 12, 31}))), "9999-12-31");
     EXPECT_FALSE(dayOfNumber(dayNumber({9999, 12, 31}) + 1));

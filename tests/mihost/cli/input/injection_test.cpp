@@ -1,4 +1,4 @@
-// Every byte in every place of every argument: what mihost lets through reaches the shell as it is.
+// Every byte in every place of every argument: what mihost accepts reaches the shell unchanged.
 
 #include "mihost/cli/input/MethodCall.h"
 #include "mihost/cli/input/ValueText.h"
@@ -15,7 +15,7 @@ namespace injection_test
 
 using mihost::Form;
 
-/** Texts that a shell would act on in more ways than one byte can. */
+/** Longer texts with a meaning in a shell. */
 constexpr char const* attacks[] = {
     "x;reboot",    "x|reboot", "x&reboot", "x`reboot`", "x$(reboot)", "x${IFS}y", "x\nreboot",
     "x\r\nreboot", "x>/tmp/x", "x</tmp/x", "x'y",       "x\"y",       "x\\",      "x\\;reboot",
@@ -25,8 +25,7 @@ constexpr char const* attacks[] = {
     "x\" \"y",     "x 2>&1",   "--help",
 };
 
-/** The text with each byte from 1 to 255 at its start, in its middle and at its end, and attacks.
- */
+/** @return the attacks, and the text with each byte from 1 to 255 at its start, middle and end */
 std::vector<std::string> variantsOf(std::string const& right)
 {
     std::vector<std::string> variants(std::begin(attacks), std::end(attacks));
@@ -38,7 +37,7 @@ std::vector<std::string> variantsOf(std::string const& right)
     return variants;
 }
 
-/** The call with one value replaced; nothing if mihost refuses it. */
+/** @return the call with one value replaced; nothing if mihost refuses it */
 std::optional<std::string> callText(mihost::Method const& method, mihost::Parameter const& replaced,
                                     std::string const& value)
 {
@@ -63,7 +62,7 @@ std::string escaped(std::string const& value)
     return text;
 }
 
-/** The lines of a harmless call with its one value replaced. */
+/** @return the lines of a harmless call with its one value replaced */
 std::vector<std::string> replaceIn(std::vector<std::string> lines, std::string const& old,
                                    std::string const& now)
 {
@@ -91,7 +90,7 @@ TEST_F(Injection, IntoAnyParameterOfAnyMethodRunsNothingElse)
     for (mihost::Method const& method : mihost::methods())
         for (mihost::Parameter const& parameter : method.parameters) {
             bool const isText = parameter.form != Form::Digits && parameter.form != Form::Day;
-            // A value that no other text in the lines is like.
+            // A value that occurs nowhere else in the lines.
             std::string const marker = parameter.form == Form::Path ? "/marker" : "marker";
             auto const harmless = isText ? callText(method, parameter, marker) : std::nullopt;
             for (std::string const& value : variantsOf(rightValue(parameter.form))) {
@@ -131,7 +130,7 @@ TEST_F(Injection, IntoAMethodCallTextIsRefusedOrHarmless)
     std::string const right = "UserAdd,UserName:CMPI_string:jdoe,HomeDir:CMPI_string:/home/j,"
                               "passwordExpirationDate:CMPI_dateTime:20301231000000.000000+000";
     for (unsigned int byte = 1; byte < 256; ++byte)
-        for (std::size_t at = byte % 3; at <= right.size(); at += 3) { // three times as fast as all
+        for (std::size_t at = byte % 3; at <= right.size(); at += 3) { // a third of the places
             std::string text = right;
             text.insert(at, 1, static_cast<char>(byte));
             try {

@@ -13,7 +13,10 @@ using mihost::Form;
 using mihost::objection;
 using mihost::parseCall;
 
-/** Every method with all its parameters, the value of one of them replaced. */
+/** Calls look(method, parameter, words) for every parameter of every method.
+ *
+ * words(value) returns all parameters of the method as NAME=VALUE, this one with that value.
+ */
 void forEachParameter(
     std::function<void(mihost::Method const&, mihost::Parameter const&,
                        std::function<std::vector<std::string>(std::string const&)> const&)> const&
@@ -84,13 +87,13 @@ TEST(MethodCallTexts, AreRefusedForEachForbiddenByte)
     });
 }
 
-TEST(MethodCallValues, MayHoldAnyLettersAndHarmlessSigns)
+TEST(MethodCallValues, MayHoldAnyLettersAndHarmlessCharacters)
 {
     for (Form const form : {Form::AccountName, Form::Words, Form::Password})
         EXPECT_EQ(objection(form, "aZ09@+-./_Jürgen李"), std::nullopt);
 }
 
-TEST(MethodCallValues, MayHoldBlanksWhereTheyAreEscaped)
+TEST(MethodCallValues, MayHoldBlanksIfTheyAreEscaped)
 {
     EXPECT_EQ(objection(Form::Words, "John Smith"), std::nullopt);
     EXPECT_EQ(objection(Form::Path, "/home/john smith"), std::nullopt);
@@ -110,7 +113,7 @@ TEST(Names, AreRefusedIfToolsWouldReadThemAsIdsOrPaths)
 {
     EXPECT_EQ(objection(Form::PlainName, "1001"),
               "consists of digits only, so tools would read it as an id");
-    EXPECT_EQ(objection(Form::AccountName, "1001"), std::nullopt); // such an account may be there
+    EXPECT_EQ(objection(Form::AccountName, "1001"), std::nullopt); // such an account may exist
     for (Form const form : {Form::AccountName, Form::PlainName})
         EXPECT_EQ(objection(form, "+1"), "begins with '+', so tools would read it as an id");
     for (char const* path : {"/", "a/b", ".", ".."})
@@ -119,7 +122,7 @@ TEST(Names, AreRefusedIfToolsWouldReadThemAsIdsOrPaths)
         EXPECT_EQ(objection(Form::PlainName, right), std::nullopt) << right;
 }
 
-TEST(Names, OfDigitsAloneMakeNoAccountAndNoGroupAndLeadToNoGroup)
+TEST(Names, OfDigitsOnlyAreRefusedForNewAccountsAndGroups)
 {
     for (auto const& [method, words] :
          std::initializer_list<std::pair<char const*, std::vector<std::string>>>{
@@ -135,7 +138,7 @@ TEST(Names, OfDigitsAloneMakeNoAccountAndNoGroupAndLeadToNoGroup)
     EXPECT_EQ(refusal([] { parseCall("UserDel", {"UserName=1001"}, noSecret); }), "accepted");
 }
 
-TEST(MethodCallValues, AreRefusedWhereTheyAreEmpty)
+TEST(MethodCallValues, AreRefusedIfTheyAreEmpty)
 {
     for (Form const form :
          {Form::AccountName, Form::Words, Form::Password, Form::Path, Form::Digits, Form::Day})
@@ -185,14 +188,14 @@ TEST(Objections, NameTheCharacterButNeverOneOfAPassword)
     EXPECT_EQ(reason.find(';', 0), reason.find("; letters"));
 }
 
-TEST(PasswordHashes, AreTakenAsTheShadowFileHoldsThem)
+TEST(PasswordHashes, AreAcceptedAsTheShadowFileHasThem)
 {
     for (char const* right : {"$6$salt$hashhash/.", "$y$j9T$abc./$def", "$1$ab$cd", "abJnggxhB/yWI",
                               "!", "!!", "*", "!$6$salt$hash"})
         EXPECT_EQ(mihost::objectionToHash(right), std::nullopt) << right;
 }
 
-TEST(PasswordHashes, AreNoPlainPasswordsAndNothingThatBreaksALine)
+TEST(PasswordHashes, AreNeitherPlainPasswordsNorBreakALine)
 {
     for (char const* wrong : {"", "secret", "$6$salt$ha:sh", "$6$salt$ha\nsh", "$6", "x y",
                               "$6$sa lt$hash", "abJnggxhB/yW:"})

@@ -37,7 +37,7 @@ TEST(MethodCall, WritesDaysAsDateTimes)
               "passwordExpirationDate:CMPI_dateTime:20101231000000.000000+000");
 }
 
-TEST(MethodCall, AsksForAPasswordThatIsADash)
+TEST(MethodCall, AsksForAPasswordGivenAsADash)
 {
     std::string asked;
     auto const call =
@@ -50,7 +50,7 @@ TEST(MethodCall, AsksForAPasswordThatIsADash)
               "UserSetPassword,UserName:CMPI_string:jdoe,Password:CMPI_string:geheim");
 }
 
-TEST(MethodCall, IsRefusedWithTheNamesThatWouldBeRight)
+TEST(MethodCall, IsRefusedWithTheValidNames)
 {
     EXPECT_EQ(refusal([] { textFor("Useradd", {}); }),
               "no method 'Useradd' (did you mean UserAdd?)");
@@ -59,7 +59,7 @@ TEST(MethodCall, IsRefusedWithTheNamesThatWouldBeRight)
               "LocalGroupAdd has no parameter 'Name' (it has GroupName)");
 }
 
-TEST(MethodCall, IsRefusedWhereAParameterHasNoName)
+TEST(MethodCall, IsRefusedIfAParameterHasNoName)
 {
     EXPECT_EQ(refusal([] { textFor("LocalGroupAddUser", {"jdoe"}); }),
               "'jdoe' is not NAME=VALUE (LocalGroupAddUser takes LocalGroupName, DomainAndMember)");
@@ -85,7 +85,7 @@ TEST(MethodCall, IsRefusedForMissingOrDoubleParameters)
 }
 
 // The plug-in has the shell print the exit status of any line with this word.
-TEST(MethodCall, IsRefusedWhereTheWordUseraddWouldFailIt)
+TEST(MethodCall, IsRefusedIfTheWordUseraddWouldMakeItFail)
 {
     EXPECT_EQ(
         refusal([] { textFor("UserDel", {"UserName=useraddbot"}); }),
@@ -111,7 +111,7 @@ TEST(MethodCall, MayContainTheWordUseraddWhereItIsExpected)
         EXPECT_EQ(refusal([text] { takeApart(text); }), "accepted") << text;
 }
 
-TEST(MethodCallText, IsTakenApartAndPutTogetherAgain)
+TEST(MethodCallText, IsParsedAndComposedAgain)
 {
     for (char const* text : {"UserDel,UserName:CMPI_string:jdoe", "GetShadowing",
                              "UserAdd,UserName:CMPI_string:jdoe,Comment:CMPI_string:John Smith",
@@ -122,10 +122,10 @@ TEST(MethodCallText, IsTakenApartAndPutTogetherAgain)
 
 TEST(MethodCallText, IsRefusedIfThePluginWouldReadLessOfIt)
 {
-    // a blank value ends the plug-in's parsing quietly
+    // at a blank value the plug-in stops parsing without an error
     EXPECT_NE(refusal([] { takeApart("UserDel,UserName:CMPI_string:"); }), "accepted");
     EXPECT_NE(refusal([] { takeApart("UserDel,UserName"); }), "accepted");
-    // the plug-in would keep 12 of this
+    // the plug-in would read 12 of this
     EXPECT_NE(
         refusal([] { takeApart("UserAdd,UserName:CMPI_string:jdoe,Comment:CMPI_string:12:30"); }),
         "accepted");
@@ -150,7 +150,7 @@ TEST(MethodCallText, IsRefusedWithADateTimeOfAnotherForm)
             << value;
 }
 
-TEST(MethodCall, IsDangerousWhereItDeletesRoot)
+TEST(MethodCall, IsDangerousIfItDeletesRoot)
 {
     EXPECT_EQ(dangerOf(takeApart("UserDel,UserName:CMPI_string:root")), "delete the account root");
     EXPECT_EQ(dangerOf(takeApart("UserDel,UserName:CMPI_string:jdoe")), "");

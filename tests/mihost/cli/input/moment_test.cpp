@@ -9,7 +9,7 @@ namespace moment_test
 
 using namespace mihost;
 
-/** The moment as it is shown, if now is noon on a day in June. */
+/** @return the moment as it is shown, if it is now noon on a day in June */
 std::string moment(std::string const& text)
 {
     auto const seconds = parseMoment(text, parseTime("2026-06-10 12:00:00").value());
@@ -39,7 +39,7 @@ TEST(Moment, IsSomeTimeAgo)
     EXPECT_EQ(parseMoment("1000000 weeks ago", 1), 0); // and not before 1970
 }
 
-TEST(Moment, IsNothingElse)
+TEST(Moment, HasNoOtherForm)
 {
     for (char const* text :
          {"", "soon", "tomorrow", "1 hour", "hour ago", "-1 hours ago", "1 month ago",

@@ -10,7 +10,7 @@ namespace remote_test
 using namespace mihost;
 using Words = std::vector<std::string>;
 
-TEST(QuotedForShell, LeavesPlainWordsAsTheyAre)
+TEST(QuotedForShell, LeavesPlainWordsUnchanged)
 {
     for (char const* word : {"get", "os", "user:jdoe", "--json", "/a/b.c", "x,y", "a@b"})
         EXPECT_EQ(quotedForShell(word), word);
@@ -57,7 +57,7 @@ TEST(WithoutHost, RefusesAHostWithinAnotherWord)
               "--host: it is part of another argument (write --host HOST separately)");
 }
 
-TEST(ExpectHost, RefusesWhatSshWouldTakeForSomethingElse)
+TEST(ExpectHost, RefusesWhatSshWouldReadAsSomethingElse)
 {
     for (char const* host : {"", "-oProxyCommand=x", "a b", "a\nb"})
         EXPECT_EQ(refusal([host] { expectHost(host); }),
@@ -66,7 +66,7 @@ TEST(ExpectHost, RefusesWhatSshWouldTakeForSomethingElse)
         EXPECT_EQ(refusal([host] { expectHost(host); }), "accepted") << host;
 }
 
-TEST(RemoteCommand, GivesSshOneLineForTheShellThere)
+TEST(RemoteCommand, GivesSshOneLineForTheRemoteShell)
 {
     EXPECT_EQ(remoteCommand("root@box", {"set", "os", "74", "a b"}, RemoteTerminal::None),
               (Words{"ssh", "-T", "--", "root@box", "exec mihost set os 74 'a b'"}));

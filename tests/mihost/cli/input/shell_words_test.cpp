@@ -43,7 +43,7 @@ TEST(WordsOfALine, AreNotExpanded)
               (Words{"$HOME", "~", "*.c", "`x`", "a;b", "a|b", ">f"}));
 }
 
-TEST(WordsOfALine, MustHaveTheirQuotesEnd)
+TEST(WordsOfALine, AreRefusedIfAQuoteIsNotClosed)
 {
     for (char const* line : {"get 'os", "get \"os", "get os\\", "get 'os\"", "\"a\\"})
         EXPECT_EQ(refusal([line] { splitWords(line); }).find("nothing follows the last "), 0U)
@@ -58,7 +58,7 @@ TEST(WordsBeingTyped, EndWithTheOneAtTheCursor)
     EXPECT_EQ(wordsBeingTyped("get 'user:j d"), (Words{"get", "user:j d"}));
 }
 
-TEST(ALineForTheHistory, HoldsAPasswordWhereACallOrAWriteHasOne)
+TEST(ALineForTheHistory, HoldsAPasswordIfACallOrAWriteHasOne)
 {
     for (char const* line :
          {"call UserSetPassword UserName=jdoe Password=x", "call UserAdd UserName=j Password=x",
@@ -70,7 +70,7 @@ TEST(ALineForTheHistory, HoldsAPasswordWhereACallOrAWriteHasOne)
         EXPECT_TRUE(holdsPassword(line)) << line;
 }
 
-TEST(ALineForTheHistory, HoldsNoneElsewhere)
+TEST(ALineForTheHistory, HoldsNoPasswordOtherwise)
 {
     for (char const* line :
          {"", "get user:jdoe", "get user:jdoe password", "list users", "set user:jdoe full-name x",

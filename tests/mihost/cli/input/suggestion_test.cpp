@@ -25,7 +25,7 @@ TEST(Suggestion, IsTheNameThatDiffersByOneLetter)
     EXPECT_EQ(nearest("lits", names), "list");
 }
 
-TEST(Suggestion, MayBeTwoSlipsAwayOnlyFromALongWord)
+TEST(Suggestion, MayDifferByTwoLettersOnlyFromALongWord)
 {
     EXPECT_EQ(nearest("osname1", names), "os-name");
     EXPECT_EQ(nearest("lit1", names), "");
@@ -37,7 +37,7 @@ TEST(Suggestion, IsTheNearestOfSeveral)
     EXPECT_EQ(nearest("UserDd", {"UserDel", "UserAdd"}), "UserAdd");
 }
 
-TEST(Suggestion, IsNoneForALetterAPageOrAnotherWord)
+TEST(Suggestion, IsNotMadeForALetterAPageOrAnotherWord)
 {
     EXPECT_EQ(nearest("g", names), "");
     EXPECT_EQ(nearest("", names), "");
@@ -45,14 +45,14 @@ TEST(Suggestion, IsNoneForALetterAPageOrAnotherWord)
     EXPECT_EQ(nearest("reboot", names), "");
 }
 
-TEST(Suggestion, AsksForANameThatIsNearAndListsAllOtherwise)
+TEST(Suggestion, AsksForASimilarNameOrListsAll)
 {
     EXPECT_EQ(suggestion("gte", {"get", "set"}, "use"), "did you mean get?");
     EXPECT_EQ(suggestion("refresh", {"get", "set"}, "use"), "use get, set");
     EXPECT_EQ(suggestion("refresh", {}, "it has"), "it has none");
 }
 
-TEST(Suggestion, ListsAsManyNamesAsFitIntoAMessage)
+TEST(Suggestion, ListsAsManyNamesAsAMessageHasRoomFor)
 {
     std::string const half(44, 'x');
     EXPECT_EQ(suggestion("refresh", {half, half}, "use"), "use " + half + ", " + half);

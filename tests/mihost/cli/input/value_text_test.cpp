@@ -57,7 +57,7 @@ TEST(ValueText, OfADayIsItsLocalMidnight)
     EXPECT_EQ(parsed(user, 118, "2030-07-01").getNumber(), 1909087200);
 }
 
-TEST(ValueText, OfADateIsRefusedWithTheFormThatIsRight)
+TEST(ValueText, OfADateIsRefusedWithTheRightForm)
 {
     for (char const* wrong : {"tomorrow", "2030-02-30", "1.7.2030", "2030-07-01 24:00:00", "",
                               "2030-07-01T12:30:00", "2030-07-01 12:30"})
@@ -67,7 +67,7 @@ TEST(ValueText, OfADateIsRefusedWithTheFormThatIsRight)
             << wrong;
 }
 
-TEST(ValueText, OfANumberIsRefusedWhereItIsNoneOrTooLarge)
+TEST(ValueText, OfANumberIsRefusedIfItIsNotOneOrTooLarge)
 {
     for (char const* wrong : {"", "-1", "x", "4294967296", "1.0", " 1"})
         EXPECT_EQ(refusal(os, 75, wrong),
@@ -86,7 +86,7 @@ TEST(ValueText, OfATruthValueIsAFewWords)
     EXPECT_EQ(refusal(user, 138, "2"), "delete is a boolean: write true or false");
 }
 
-TEST(ValueText, OfAnAccountsNameIsRefusedWhereAShellWouldActOnIt)
+TEST(ValueText, OfAnAccountsNameIsRefusedIfUnsafeInAShell)
 {
     EXPECT_EQ(refusal(user, 108, "a;reboot"), "user-name: contains the shell metacharacter ';'");
     EXPECT_NE(refusal(user, 89, "0 -f"), "accepted");
@@ -100,14 +100,14 @@ TEST(ValueText, OfAPasswordIsAHash)
     EXPECT_EQ(refusal(user, 117, "geheim").find("geheim"), std::string::npos);
 }
 
-TEST(ValueText, OfAMethodCallIsTakenApart)
+TEST(ValueText, OfAMethodCallIsParsed)
 {
     EXPECT_EQ(refusal(os, 74, "UserDel,UserName:CMPI_string:jdoe"), "accepted");
     EXPECT_EQ(refusal(os, 74, "UserDel,UserName:CMPI_string:a;b"),
               "UserName contains the shell metacharacter ';'");
 }
 
-TEST(ValueText, OfAMethodCallMayBeWhatDoesNothing)
+TEST(ValueText, OfAMethodCallMayBeEmptyOrDummy)
 {
     EXPECT_EQ(refusal(os, 74, ""), "accepted");
     EXPECT_EQ(refusal(os, 74, "dummy"), "accepted");

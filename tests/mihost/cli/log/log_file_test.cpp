@@ -34,7 +34,7 @@ TEST_F(LogFileTest, BeginsWithTheNewestLines)
     EXPECT_EQ(LogFile(path).newestLines(0), Lines());
 }
 
-TEST_F(LogFileTest, GoesOnWithLinesThatAreAppended)
+TEST_F(LogFileTest, ContinuesWithAppendedLines)
 {
     LogFile log(path);
     log.newestLines(1);
@@ -110,7 +110,7 @@ TEST_F(LogFileTest, KeepsTheStartOfALineWithoutEnd)
     EXPECT_EQ(lines[0], std::string(65536, 'x'));
 }
 
-TEST_F(LogFileTest, CannotBeReadIfThereIsNone)
+TEST_F(LogFileTest, CannotBeReadIfItIsMissing)
 {
     EXPECT_THROW(LogFile(folder.path("none")), std::system_error);
 }

@@ -11,7 +11,7 @@ namespace log_line_test
 
 using namespace mihost;
 
-/** The first of a month. */
+/** @return the first day of a month */
 std::tm dayIn(int year, int month)
 {
     std::tm today{};
@@ -50,7 +50,7 @@ TEST(LogLine, HasNoTimeWithoutAStamp)
     EXPECT_EQ(logLineOf("exactly 16 bytes", dayIn(2026, 6)).message, "");
 }
 
-TEST(LogLine, LosesLeadingBlanksAndWhatThePluginDoesNotRead)
+TEST(LogLine, LosesLeadingBlanksAndWhatThePluginSkips)
 {
     EXPECT_EQ(logLineOf("   Jan  2 03:04:05 text", dayIn(2026, 6)).message, "text");
     std::string const stamp = "Jan  2 03:04:05 ";
@@ -81,7 +81,7 @@ TEST(LogFilter, ShowsEverythingAtFirst)
     EXPECT_TRUE(LogFilter().shows({5, "text"}));
 }
 
-TEST(LogFilter, HoldsTimesToItsBoundsAndDropsEntriesWithoutOne)
+TEST(LogFilter, KeepsTimesWithinItsBoundsAndDropsOthers)
 {
     LogFilter filter;
     filter.setSince(10);
@@ -106,7 +106,7 @@ TEST(LogFilter, MatchesMessagesByAnExtendedRegularExpression)
     EXPECT_FALSE(filter.shows({1, "x sshd[12]: Failed password"}));
 }
 
-TEST(LogFilter, RefusesAPatternThatIsNone)
+TEST(LogFilter, RefusesAnInvalidPattern)
 {
     LogFilter filter;
     std::string const reason = refusal([&filter] { filter.setPattern("a("); });

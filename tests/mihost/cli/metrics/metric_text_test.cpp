@@ -19,7 +19,7 @@ TEST(MetricText, HasHelpTypeUnitAndSamples)
               "# EOF\n");
 }
 
-TEST(MetricText, JoinsLabelsAndLeavesOutAMissingUnit)
+TEST(MetricText, JoinsLabelsAndOmitsAMissingUnit)
 {
     EXPECT_EQ(
         metricText({{"mi_x", "", "X.", {{{{"a", "1"}, {"b", ""}}, 0.25}, {{{"a", "2"}}, 2}}}}),
@@ -30,7 +30,7 @@ TEST(MetricText, JoinsLabelsAndLeavesOutAMissingUnit)
         "# EOF\n");
 }
 
-TEST(MetricText, EscapesWhatWouldEndALabel)
+TEST(MetricText, EscapesCharactersThatWouldEndALabel)
 {
     std::string const text = metricText({{"x", "", "X.", {{{{"n", "a\"b\\c\nd\xff"}}, 1}}}});
     // A byte that is not UTF-8 becomes \xff, whose backslash is escaped in turn.

@@ -33,7 +33,7 @@ TEST(DisplayWidth, CountsTheColumnsOfATerminal)
         EXPECT_EQ(displayWidth(styled(style, "abc")), 3U);
 }
 
-TEST(WrappedText, BreaksAtBlanksAndLosesOnlyThose)
+TEST(WrappedText, BreaksAtBlanksAndDropsOnlyThose)
 {
     EXPECT_EQ(wrapped(fox, 10), (Lines{"the quick", "brown fox", "jumps over", "the lazy", "dog"}));
     EXPECT_EQ(wrapped(fox, 100), Lines{fox});
@@ -45,7 +45,7 @@ TEST(WrappedText, BreaksLongWordsBetweenCharacters)
     EXPECT_EQ(wrapped("abcdefgh", 3), (Lines{"abc", "def", "gh"}));
     EXPECT_EQ(wrapped("李明李明", 3), (Lines{"李", "明", "李", "明"}));
     EXPECT_EQ(wrapped("e\u0301e\u0301e\u0301", 2), (Lines{"e\u0301e\u0301", "e\u0301"}));
-    EXPECT_EQ(wrapped("李", 0), Lines{"李"}); // no width is too small to come to an end
+    EXPECT_EQ(wrapped("李", 0), Lines{"李"}); // ends at any width
 }
 
 Table people()
@@ -63,7 +63,7 @@ TEST(TableLayout, AlignsWideCharactersAndMarksEmptyCells)
     EXPECT_EQ(layOut(people(), {})[2], "Jürgen  22  -");
 }
 
-TEST(TableLayout, LeavesHeadingsOutOnDemand)
+TEST(TableLayout, OmitsHeadingsOnRequest)
 {
     EXPECT_EQ(layOut(people(), {}, false)[0], std::string("李明     1  ") + fox);
 }
@@ -75,7 +75,7 @@ TEST(TableLayout, HasItsHeadingsAlsoWithoutRows)
     EXPECT_EQ(layOut(table, {}, false), Lines());
 }
 
-TEST(TableLayout, WrapsTheLastTextColumnAlone)
+TEST(TableLayout, WrapsOnlyTheLastTextColumn)
 {
     Lines const lines = layOut(people(), {35});
     EXPECT_EQ(lines[1], "李明     1  the quick brown fox");
@@ -91,7 +91,7 @@ TEST(TableLayout, WrapsATextColumnBeforeNumbers)
               (Lines{"the quick brown fox jumps  5", "over the lazy dog"}));
 }
 
-TEST(TableLayout, BecomesRecordsWhereTooLittleRoomIsLeft)
+TEST(TableLayout, BecomesRecordsInANarrowTerminal)
 {
     Lines lines = layOut(people(), {31});
     for (std::string& line : lines)
@@ -101,7 +101,7 @@ TEST(TableLayout, BecomesRecordsWhereTooLittleRoomIsLeft)
                             "id       22", "comment  -"}));
 }
 
-TEST(TableLayout, EscapesWhatATerminalWouldObey)
+TEST(TableLayout, EscapesTerminalControls)
 {
     Table table({{"text"}});
     table.add({"\x1b[2J\u2066"});
@@ -138,7 +138,7 @@ TEST(TreeLayout, WrapsTextsAndDrawsItsBranchesBesideThem)
     EXPECT_EQ(lines[3], "│ └─grandchild #3");
 }
 
-TEST(TreeLayout, HasTextsAfterTheNamesWhereTooLittleRoomIsLeft)
+TEST(TreeLayout, HasTextsAfterTheNamesInANarrowTerminal)
 {
     Lines const lines = layOut(family(), {30});
     EXPECT_EQ(lines[1], "├─child #2  the quick brown");

@@ -65,7 +65,7 @@ TEST(NodeAsJson, WritesEachKindOfValueAsItsOwnJsonType)
               R"("8":{"id":8,"kind":"empty","flag":true,"value":null}})");
 }
 
-TEST(NodeAsJson, WritesBytesThatAreNoUtf8InHex)
+TEST(NodeAsJson, WritesBytesThatAreNotUtf8InHex)
 {
     IC::MutableNode node(4, 3, {1}, 99, 0);
     node.setDescription("J\xFCrgen");
@@ -75,7 +75,7 @@ TEST(NodeAsJson, WritesBytesThatAreNoUtf8InHex)
     EXPECT_EQ(json["properties"]["1"]["value"], "\\xff");
 }
 
-TEST(NodeAsJson, HidesPasswordHashesUntilTheyAreAskedFor)
+TEST(NodeAsJson, HidesPasswordHashesUnlessAskedForThem)
 {
     IC::MutableNode node(5, 4, {1}, 46, 1);
     node.setProperty(117, PropertyValue("$6$hash", true));

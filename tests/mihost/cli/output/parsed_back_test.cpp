@@ -18,7 +18,7 @@ bool hasPython(char const* module)
     return runToEnd({"/usr/bin/env", "python3", "-c", std::string("import ") + module}).code == 0;
 }
 
-/** Reads standard input with the program and prints it as JSON. */
+/** @return the text as JSON, as the Python program reads it from its standard input */
 std::string readBack(std::string const& program, std::string const& text)
 {
     Outcome const outcome =
@@ -30,7 +30,7 @@ std::string readBack(std::string const& program, std::string const& text)
     return outcome.out;
 }
 
-/** Texts of whatever a reader might trip over. */
+/** Texts that a reader might read wrongly. */
 class Texts
 {
 public:

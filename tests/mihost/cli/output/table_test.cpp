@@ -45,7 +45,7 @@ TEST(TableSelection, ShowsTheUsualColumnsUnlessOthersAreChosen)
     EXPECT_EQ(chosen({{"id", "name"}, "", {}}), "0\troot\n1000\tjdoe\n999\tanna\n");
 }
 
-TEST(TableSelection, TakesAColumnByItsOtherName)
+TEST(TableSelection, FindsAColumnByItsOtherName)
 {
     EXPECT_EQ(chosen({{"311"}, "-311", {"311~0"}}), "1000\n0\n");
 }
@@ -88,7 +88,7 @@ TEST(TableSelection, KeepsRowsThatMeetAllConditions)
     EXPECT_EQ(chosen({{"name"}, "", {"shell~bin", "id=0"}}), "root\n");
 }
 
-TEST(TableSelection, TakesTheFirstSignAsThatOfTheCondition)
+TEST(TableSelection, TakesTheFirstOperatorAsTheConditions)
 {
     Table table({{"text"}});
     table.add({"a=b"});
@@ -124,7 +124,7 @@ TEST(TableAsJson, HasValuesInTheirOwnTypes)
               R"([{"id":0,"shell":"/bin/sh"}])");
 }
 
-TEST(TableAsCsv, QuotesWhatAReaderWouldTakeApart)
+TEST(TableAsCsv, QuotesTextsThatAReaderWouldSplit)
 {
     Table table({{"a"}, {"b,c"}});
     table.add({"x,y", "say \"yes\""});
@@ -140,7 +140,7 @@ TEST(TableAsCsv, WritesAnEmptyOnlyFieldInQuotes)
     EXPECT_EQ(csvText(table, false), "\"\"\n");
 }
 
-TEST(TableAsCsvOrValues, HasARowOnEachLineWhateverTheTextsHold)
+TEST(TableAsCsvOrValues, HasARowOnEachLineForAnyTexts)
 {
     Table table({{"a"}, {"b"}});
     table.add({"1\n2\r", "3\t4\x1b\xFF"});

@@ -32,13 +32,13 @@ TEST(Yaml, ShowsNestedListsAndObjectsAsBlocks)
                                   "none: []\n");
 }
 
-TEST(Yaml, StartsADocumentWhateverItIs)
+TEST(Yaml, StartsEveryDocument)
 {
     EXPECT_EQ(yamlText(Json::array()), "--- []\n");
     EXPECT_EQ(yamlText("text"), "--- text\n");
 }
 
-TEST(Yaml, QuotesTextsThatAReaderWouldTakeForSomethingElse)
+TEST(Yaml, QuotesTextsThatWouldBeReadAsSomethingElse)
 {
     struct Row {
         char const* text;

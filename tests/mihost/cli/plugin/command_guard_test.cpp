@@ -38,7 +38,7 @@ TEST(CommandGuard, PassesTheCommandLinesOfThePlugin)
         EXPECT_EQ(objectionToCommand(line), std::nullopt) << line;
 }
 
-TEST(CommandGuard, RefusesEachByteThatAShellWouldActOn)
+TEST(CommandGuard, RefusesEachByteWithAMeaningInAShell)
 {
     struct Line {
         std::string before;
@@ -73,7 +73,7 @@ TEST(CommandGuard, RefusesEachByteThatAShellWouldActOn)
         }
 }
 
-TEST(CommandGuard, RefusesWhatLooksLikeTwoOfThePluginsCommands)
+TEST(CommandGuard, RefusesLinesThatFitTwoOfThePluginsCommands)
 {
     for (char const* line :
          {"lsmod; reboot", "lsmod\nreboot", "chage -l a 2>&1;echo rc=$? 2>&1;reboot",

@@ -1,4 +1,4 @@
-// What the program keeps of the commands that pass through it, and what the plug-in reads of them.
+// What the program records of the commands that it runs, and what the plug-in reads of them.
 
 #include "mihost/cli/plugin/CommandTap.h"
 #include "mihost/cli/system/BoundedText.h"
@@ -20,7 +20,7 @@ constexpr std::size_t many = 5 * BoundedText::limit;
 constexpr char marker[] = "... (4194304 more bytes)\n";
 static_assert(many - BoundedText::limit == 4194304);
 
-/** A command that writes that many bytes. */
+/** @return a command that writes that many bytes */
 std::string writing(std::size_t bytes)
 {
     return "head -c " + std::to_string(bytes) + " /dev/zero";
@@ -44,7 +44,7 @@ protected:
     }
 };
 
-TEST_F(CommandTap, HandsOnWhatACommandWritesAndNotesIt)
+TEST_F(CommandTap, PassesOnAndRecordsWhatACommandWrites)
 {
     tap::Recording const recording;
     std::FILE* const stream = tap::open("echo one; echo two; exit 3", "r");
@@ -81,7 +81,7 @@ TEST_F(CommandTap, LetsACommandFinishWhoseOutputIsNotRead)
     EXPECT_EQ(kept.substr(BoundedText::limit + 1), marker);
 }
 
-TEST_F(CommandTap, NotesCommandsInTheOrderOfTheirStart)
+TEST_F(CommandTap, RecordsCommandsInTheOrderOfTheirStart)
 {
     tap::Recording const recording;
     std::FILE* const outer = tap::open("echo outer", "r");
@@ -95,7 +95,7 @@ TEST_F(CommandTap, NotesCommandsInTheOrderOfTheirStart)
     EXPECT_EQ(recording.commands()[1].output, "inner\n");
 }
 
-TEST_F(CommandTap, KeepsTheBeginningOfWhatCommandsComplain)
+TEST_F(CommandTap, KeepsTheBeginningOfStandardError)
 {
     tap::takeStandardError();
     std::string const line = writing(many) + " >&2";
@@ -105,7 +105,7 @@ TEST_F(CommandTap, KeepsTheBeginningOfWhatCommandsComplain)
     EXPECT_EQ(tap::takeStandardError(), "");
 }
 
-TEST_F(CommandTap, DoesNotWaitForACommandThatGoesOnComplaining)
+TEST_F(CommandTap, DoesNotWaitForTheEndOfStandardError)
 {
     std::FILE* const stream = tap::open("yes 3>&1 >&2 & echo $!", "r");
     std::array<char, 64> line{};

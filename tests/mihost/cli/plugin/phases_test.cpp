@@ -32,7 +32,7 @@ public:
     std::vector<std::string> heard;
 };
 
-TEST(PhaseSink, HearsABuildersEntryAndExitOnceEach)
+TEST(PhaseSink, SeesABuildersEntryAndExitOnceEach)
 {
     Notes notes;
     mihost::PhaseSink sink({&notes});
@@ -86,7 +86,7 @@ public:
     int count = 0;
 };
 
-TEST(SinkGroup, HandsEachMessageToAllThatAreInIt)
+TEST(SinkGroup, PassesEachMessageToAllOfItsSinks)
 {
     Counter first, second;
     mihost::SinkGroup group;
@@ -99,7 +99,7 @@ TEST(SinkGroup, HandsEachMessageToAllThatAreInIt)
     EXPECT_EQ(second.count, 2);
 }
 
-TEST(SinkGroup, IsTheLogsSinkUntilItGoes)
+TEST(SinkGroup, IsTheLogsSinkUntilItIsDestroyed)
 {
     auto const log = [] {
         VXLog::VXLogger::logLevelMessage("f", "unit", 1, "category", 3000, nullptr, 0, 0, "text");

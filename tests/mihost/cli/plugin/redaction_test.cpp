@@ -24,7 +24,7 @@ TEST(WithoutSecrets, ReplacesEachOfSeveral)
               "-p (hidden) (hidden) (hidden)");
 }
 
-TEST(WithoutSecrets, LeavesTextAloneIfThereIsNone)
+TEST(WithoutSecrets, KeepsTheTextIfThereAreNoSecrets)
 {
     EXPECT_EQ(withoutSecrets("a  b\n\nc ", {}), "a  b\n\nc ");
     EXPECT_EQ(withoutSecrets("a  b\n\nc ", {"x"}), "a  b\n\nc ");

@@ -42,12 +42,12 @@ TEST(BashCompletionText, IsQuotedByBackslashesOrForTheOpenQuote)
     EXPECT_EQ(inBash("mihost get \"user\":ev"), "words\nev\\`id\\>x\\`\n");
 }
 
-TEST(BashCompletionText, HasNoNameThatIsNotPlainText)
+TEST(BashCompletionText, OmitsNamesThatAreNotPlainText)
 {
     EXPECT_EQ(inBash("mihost get user:"), "words\nev\\`id\\>x\\`\njdoe\nJürgen\n");
 }
 
-TEST(BashCompletionText, IsEmptyWhileTheProgramIsTyped)
+TEST(BashCompletionText, IsEmptyWhileTheProgramsNameIsTyped)
 {
     for (char const* line : {"", "mihost", "/home/jdoe=x:y/mihost", "'mih"})
         EXPECT_EQ(inBash(line), "words\n") << line;

@@ -75,7 +75,7 @@ TEST(Completion, KnowsThatAHostFollows)
     }
 }
 
-TEST(Completion, LeavesFilesAndFoldersToTheShell)
+TEST(Completion, LeavesFilesAndDirectoriesToTheShell)
 {
     EXPECT_EQ(complete({"--plugin", ""}, namesOf, mihost::commandTable()).what,
               Completion::What::Files);
@@ -95,7 +95,7 @@ TEST(Completion, OffersFilesAndFormsToCheck)
     EXPECT_EQ(after({"check", "--r"}), Words{"--rounds"});
 }
 
-TEST(Completion, GoesOnAfterAnOptionWithItsValue)
+TEST(Completion, ContinuesAfterAnOptionWithItsValue)
 {
     EXPECT_EQ(after({"--plugin", "file", "ge"}), Words{"get"});
     EXPECT_EQ(after({"--plugin=file", "ge"}), Words{"get"});
@@ -162,13 +162,13 @@ TEST(Completion, OffersTheAccountsThatAParameterNames)
     EXPECT_EQ(after({"call", "LocalGroupDel", "GroupName="}), Words{"GroupName=staff"});
 }
 
-TEST(Completion, OffersNoAccountsForOneToBeMade)
+TEST(Completion, OffersNoNamesForANewAccountOrGroup)
 {
     EXPECT_EQ(after({"call", "UserAdd", "UserName="}), Words());
     EXPECT_EQ(after({"call", "LocalGroupAdd", "GroupName="}), Words());
 }
 
-TEST(Completion, OffersTheFewWordsThatAnArgumentTakes)
+TEST(Completion, OffersTheWordsThatAnArgumentAccepts)
 {
     EXPECT_EQ(after({"power", ""}), (Words{"restart", "halt"}));
     EXPECT_EQ(after({"list", "u"}), Words{"users"});
@@ -237,7 +237,7 @@ TEST(Completion, OffersColumnsOneAfterTheOther)
     EXPECT_EQ(after({"list", "--columns", "full"}), Words());
 }
 
-TEST(Completion, TakesWhatFollowsTwoDashesForArguments)
+TEST(Completion, TreatsWhatFollowsTwoDashesAsArguments)
 {
     EXPECT_EQ(after({"get", "--", "o"}), Words{"os"});
     EXPECT_EQ(after({"get", "--", "--js"}), Words());

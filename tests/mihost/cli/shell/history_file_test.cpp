@@ -74,7 +74,7 @@ TEST_F(HistoryFileTest, ReadsTheEndOfAFileThatIsTooLong)
     EXPECT_EQ(HistoryFile(path).lines(), Lines());
 }
 
-TEST_F(HistoryFileTest, LeavesOutALineThatNobodyTyped)
+TEST_F(HistoryFileTest, LeavesOutAnOverlongLine)
 {
     HistoryFile(path).add(std::string(4097, 'x'));
     EXPECT_EQ(HistoryFile(path).lines(), Lines());
@@ -91,7 +91,7 @@ TEST_F(HistoryFileTest, FollowsNoLinkAndOpensNoPipe)
     EXPECT_EQ(mihost::contentOf(target), "untouched\n");
     fs::remove(path);
     ASSERT_EQ(mkfifo(path.c_str(), 0600), 0);
-    history.add("get os"); // and waits for nobody
+    history.add("get os"); // does not wait for a reader
     EXPECT_EQ(history.lines(), Lines());
 }
 

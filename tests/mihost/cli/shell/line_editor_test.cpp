@@ -18,20 +18,20 @@ TEST(CommonStart, IsWhatAllCandidatesBeginWith)
     EXPECT_EQ(commonStart({"get", "set"}), "");
 }
 
-TEST(WordsInColumns, StandBelowEachOther)
+TEST(WordsInColumns, AreBelowEachOther)
 {
     EXPECT_EQ(inColumns({"tree", "list", "get", "doctor", "set"}, 24), "tree    list    get\n"
                                                                        "doctor  set\n");
     EXPECT_EQ(inColumns({"李明", "ab"}, 80), "李明  ab\n");
 }
 
-TEST(WordsInColumns, HaveALineEachWhereTheTerminalIsNarrow)
+TEST(WordsInColumns, HaveALineEachInANarrowTerminal)
 {
     EXPECT_EQ(inColumns({"tree", "list"}, 3), "tree\nlist\n");
     EXPECT_EQ(inColumns({"tree", "list"}, 0), "tree\nlist\n");
 }
 
-TEST(WordsInColumns, AreNotMoreThanAPersonReads)
+TEST(WordsInColumns, AreLimitedAndTheRestIsCounted)
 {
     std::string const text = inColumns(Words(3000, "user:jdoe"), 80);
     EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 200 / 7 + 2);

@@ -25,7 +25,7 @@ TEST(BoundedText, CountsWhatItDrops)
     EXPECT_EQ(text.text(), std::string(BoundedText::limit - 1, 'x') + "y\n... (5 more bytes)\n");
 }
 
-TEST(BoundedText, PutsTheCountOnALineOfItsOwn)
+TEST(BoundedText, PutsTheCountOnItsOwnLine)
 {
     BoundedText text;
     text.append(std::string(BoundedText::limit - 1, 'x') + "\n");

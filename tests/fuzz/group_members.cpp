@@ -5,7 +5,7 @@
 namespace
 {
 
-/** The members field, built by searching it for each name. */
+/** @return the members field, built by searching it for each name */
 std::string plain(std::string field, std::vector<std::string> const& members)
 {
     for (std::string const& name : members)

@@ -13,7 +13,7 @@ extern "C" int LLVMFuzzerTestOneInput(std::uint8_t const* data, std::size_t size
     std::string const left =
         NQ::os::supplementaryGroups(identity, group, NQ::os::Membership::remove);
     fuzz::require(left.empty() || identity.find('(') != std::string::npos);
-    // A name with a quote of its own may look like another one.
+    // A name that contains a quote may look like another name.
     fuzz::require(identity.find('"') != std::string::npos ||
                   ("," + left + ",").find("," + group + ",") == std::string::npos);
     return 0;

@@ -7,7 +7,7 @@ namespace
 
 constexpr char const* secret = "s3cr3tMark";
 
-/** Nobody may read the password. */
+/** Checks that no message contains the password. */
 class Log : public mihost::LogSink
 {
 public:
@@ -54,7 +54,7 @@ extern "C" int LLVMFuzzerTestOneInput(std::uint8_t const* data, std::size_t size
     NQ::OsInfo().setCreateUser(texts[0]);
 
     if (fuzz::text(data, size).find(secret) != std::string::npos)
-        return 0; // a coincidence that the fuzzer brings about
+        return 0; // the fuzzer can produce such a coincidence
     // Without an item before it, the password's would be the method, whose name is logged.
     bool const hasMethod = texts[0].find_first_not_of(',') != std::string::npos;
     std::string const call = hasMethod ? texts[0] : "UserSetPassword";

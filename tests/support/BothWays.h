@@ -11,7 +11,7 @@
 #include <string>
 #include <utility>
 
-/** What one command prints, asked in both ways. For the tiers that hold the accelerator's parts. */
+/** Runs a command and asks the accelerator, to compare both. For programs that contain it. */
 namespace bothways
 {
 
@@ -24,7 +24,7 @@ inline std::string readAll(FILE* stream)
     return text;
 }
 
-/** By a real shell. What it writes to standard error is added to the text. */
+/** @return what the command prints in a real shell, standard output and standard error */
 inline std::string real(std::string const& command)
 {
     FILE* const stream = interpose::real(popen)(("{ " + command + "; } 2>&1").c_str(), "r");
@@ -33,7 +33,7 @@ inline std::string real(std::string const& command)
     return text;
 }
 
-/** By the accelerator; nothing if it leaves the command to the real popen. */
+/** @return the accelerator's answer; nothing if it leaves the command to the real popen */
 inline std::optional<std::string> answered(std::string const& command)
 {
     FILE* const stream = miaccel::openAnswer(command.c_str(), "r");
@@ -44,7 +44,7 @@ inline std::optional<std::string> answered(std::string const& command)
     return text;
 }
 
-/** What date prints and what is answered for it, both in the same second. */
+/** @return what date prints and the accelerator's answer to it, both of the same second */
 inline std::pair<std::string, std::optional<std::string>> dates()
 {
     for (;;) {
@@ -55,7 +55,7 @@ inline std::pair<std::string, std::optional<std::string>> dates()
     }
 }
 
-/** The counts of one command, by its row in the table. */
+/** @return the counts of one command */
 inline miaccel_count countOf(std::string const& command)
 {
     std::array<miaccel_count, 16> counts{};
@@ -66,7 +66,7 @@ inline miaccel_count countOf(std::string const& command)
     return {};
 }
 
-/** Why the command was last run. */
+/** @return why the command was last run rather than answered */
 inline std::string reasonOf(std::string const& command)
 {
     char const* const reason = countOf(command).reason;

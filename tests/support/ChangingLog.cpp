@@ -51,7 +51,7 @@ void ChangingLog::overwriteMapped()
 
 void ChangingLog::change()
 {
-    folder_.append("log", ""); // it is there from now on
+    folder_.append("log", ""); // from now on it exists
     auto const size = static_cast<std::size_t>(fs::file_size(path()));
     switch (choose(12)) {
     case 0:
@@ -68,7 +68,7 @@ void ChangingLog::change()
     case 3:
         fs::resize_file(path(), size / 2);
         break;
-    case 4: { // the same size, another content
+    case 4: { // the same size with other content
         std::string other = text();
         other.resize(size, '\n');
         folder_.write("log", other);

@@ -6,7 +6,7 @@
 #include <random>
 #include <string>
 
-/** A log of its own folder, to which everything happens that happens to logs. */
+/** A log in its own directory, which is changed in every way that logs are changed. */
 class ChangingLog
 {
 public:
@@ -18,13 +18,13 @@ public:
     }
 
     /**
-     * Appends, truncates, rotates, replaces or overwrites it, with or without a change of its
-     * times. What is in it are lines of every kind: without an end, empty, with NUL bytes, of 2 MB,
-     * with carriage returns.
+     * Appends to the log, truncates, rotates, replaces or overwrites it, with or without a change
+     * of its times. Its lines are of every kind: empty, without an end, of 2 MB, with NUL bytes or
+     * carriage returns.
      */
     void change();
 
-    /** A number from 0 to one less than the limit. */
+    /** @return a random number from 0 to limit - 1 */
     unsigned long choose(unsigned long limit)
     {
         return random_() % limit;

@@ -14,10 +14,10 @@ inline std::string sedCommand(std::uint64_t line, std::string const& path)
 }
 
 /**
- * Changes a log again and again and compares what wc and sed print of it with what is answered.
- * Only sed may be left to the real one: wherever there are NUL bytes, or a line has no end.
+ * Changes a log again and again and compares what wc and sed print with the accelerator's answers.
+ * It may leave only sed to the real command, for lines with NUL bytes or without an end.
  *
- * @return how many of the seds were answered, in percent
+ * @return the percentage of sed commands that were answered
  */
 inline unsigned long percentOfSedsAnswered(unsigned int seed, int rounds)
 {

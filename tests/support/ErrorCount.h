@@ -6,7 +6,7 @@
 
 #include <atomic>
 
-/** Counts the errors that are logged; all else costs as little as it can. */
+/** Counts the errors that are logged and does nothing else, so that it costs little time. */
 class ErrorCount : public mihost::LogSink
 {
 public:

@@ -10,7 +10,7 @@
 #include <vector>
 
 /**
- * Answers commands with recorded output for as long as it lives, and notes every command it gets.
+ * Answers commands with given output while it exists, and records every command.
  *
  * A command that has no answer cannot be started: popen yields null.
  */
@@ -24,10 +24,10 @@ public:
 
     std::map<std::string, std::string> answers;
 
-    /** Answers for the first runs of a command, in turn; later ones get that of answers. */
+    /** Answers for the first runs of a command, in order; later runs get the one in answers. */
     std::map<std::string, std::deque<std::string>> first;
 
-    /** What commands without an answer of their own print. */
+    /** What commands print that have no answer. */
     std::optional<std::string> otherwise;
 
     std::vector<std::string> ran;

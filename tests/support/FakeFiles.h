@@ -7,7 +7,7 @@
 #include <string>
 
 /**
- * For as long as it lives, /etc and /var/log hold nothing but the files written here.
+ * While it exists, /etc and /var/log contain only the files written here.
  *
  * The files are in their own directory, which the destructor removes.
  */
@@ -24,7 +24,7 @@ public:
 
     void remove(std::string const& path) const;
 
-    /** Where the file really stands. */
+    /** @return where the file really is */
     std::string realPath(std::string const& path) const;
 
 private:

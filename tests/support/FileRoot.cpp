@@ -12,7 +12,7 @@ FILE* reallyOpen(char const* path, char const* mode)
     return open(path, mode);
 }
 
-/** A group database that is one file; read from its start after a rewind. */
+/** A group database of one file, read again from its start after a rewind. */
 class GroupFile
 {
 public:

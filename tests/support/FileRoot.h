@@ -6,9 +6,9 @@
 #include <string>
 
 /**
- * Lays files over the machine's own for as long as it lives: opening any path below /etc or
- * /var/log opens it below the root folder instead, and the group database is the root folder's
- * /etc/group. The machine's account lock is not taken.
+ * Replaces the machine's files while it exists: opening any path below /etc or /var/log opens it
+ * below the root directory given here, and the group database is the /etc/group there. The
+ * machine's account lock is not taken.
  */
 class FileRoot
 {

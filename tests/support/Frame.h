@@ -11,8 +11,8 @@
 /**
  * The interface object for tests that are linked to the plug-in's objects.
  *
- * Its own id is 7 and the builders have not run; an operating-system node, with the id 8, stands
- * for what they would find.
+ * Its own id is 7. The builders have not run; an operating-system node with the id 8 is all that
+ * there is of a tree.
  */
 class Frame : public OpenInterface
 {
@@ -47,7 +47,7 @@ public:
         return OsSwMI::deleteNode(node);
     }
 
-    /** The nodes of one kind, in the order of the framework's list. */
+    /** @return the nodes of one node type, in the order of the framework's list */
     std::vector<IC::MutableNode*> ofType(unsigned int type) const
     {
         std::vector<IC::MutableNode*> found;
@@ -59,12 +59,12 @@ public:
         return found;
     }
 
-    /** The nodes that went through publication, and those whose deletion was requested. */
+    /** The nodes that were published, and those whose deletion was requested. */
     std::vector<IC::Node*> published;
     std::vector<IC::Node*> deleted;
 };
 
-/** A node that has another id each time it is asked: 101, 102 and so on. */
+/** A node that returns another id at each call: 101, 102 and so on. */
 class Counter : public IC::MutableNode
 {
 public:
@@ -79,7 +79,7 @@ private:
     mutable unsigned int id_ = 100;
 };
 
-/** A stored property as shown() writes it; "unset" where there is none. */
+/** @return a stored property as shown() writes it; "unset" if there is none */
 inline std::string storedValue(IC::Node const& node, unsigned int id)
 {
     auto const properties = node.getProperties();

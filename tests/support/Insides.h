@@ -22,7 +22,7 @@ public:
     using ManagementInterface::nodes_;
 };
 
-/** The same of the plug-in's own class. */
+/** The same members, open in the plug-in's own class. */
 class OpenInterface : public IC::OsSwMI
 {
 public:

@@ -142,13 +142,13 @@ void index()
 
 void load(std::vector<Loaded> const& modules)
 {
-    // Neither of the two accepts new files. The rest of /proc is linked.
+    // Neither /proc nor /sys accepts new files. The rest of /proc is linked.
     bind("/proc", "/run/processes");
     mountEmptyFolder("/proc");
     for (auto const& entry : std::filesystem::directory_iterator("/run/processes"))
         if (entry.path().filename() != "modules")
             std::filesystem::create_symlink(entry.path(), "/proc" / entry.path().filename());
-    // The leak checker of a process that starts from now on would not find it there.
+    // In processes that start from now on, the leak checker could not read /proc.
     setenv("ASAN_OPTIONS", "detect_leaks=0", 1);
     mountEmptyFolder("/sys/module");
     std::string list;

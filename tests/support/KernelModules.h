@@ -5,30 +5,30 @@
 #include <utility>
 #include <vector>
 
-/** Kernel modules of our own making, for the copy of the machine that a test runs in. */
+/** Invented kernel modules, for the copy of the machine that a test runs in. */
 namespace kernelModules
 {
 
-/** The folder where the running kernel's modules are looked for. */
+/** @return the directory where programs look for the running kernel's modules */
 std::string folder();
 
 /**
- * A module's file as compilers make it, with nothing in it but its facts.
+ * Makes a module's file as compilers do, with nothing in it but its facts.
  *
  * @param facts  "key=value" each
  */
 std::string file(std::vector<std::string> const& facts);
 
-/** What is put at a module's end when it is signed; the signer may hold any bytes. */
+/** @return what signing appends to a module; the signer may contain any bytes */
 std::string signature(std::string const& signer);
 
-/** Puts a module into the folder. */
+/** Puts a module into the directory. */
 void write(std::string const& fileName, std::string const& content);
 
-/** Puts modules of these file names and facts into the folder, and indexes it. */
+/** Puts modules of these file names and facts into the directory, and indexes it. */
 void install(std::vector<std::pair<std::string, std::vector<std::string>>> const& modules);
 
-/** Has depmod index what is in the folder. */
+/** Runs depmod to index the directory. */
 void index();
 
 /** A loaded module, as the kernel describes it. */
@@ -39,7 +39,7 @@ struct Loaded {
     std::vector<std::string> holders;
 };
 
-/** From now on these modules are loaded, for all that reads /proc/modules and /sys/module. */
+/** Makes /proc/modules and /sys/module show these modules as loaded from now on. */
 void load(std::vector<Loaded> const& modules);
 
 } // namespace kernelModules

@@ -10,7 +10,7 @@ inline bool isOpen(int descriptor)
     return fcntl(descriptor, F_GETFD) != -1;
 }
 
-/** The file that fopen opened last. For use after FakeFiles, whose answers it passes on. */
+/** The file that fopen opened last. Make it after FakeFiles, whose files it opens too. */
 class LastOpened
 {
 public:

@@ -23,7 +23,7 @@ void LiveNodes::nodeDeleted(IC::Node const& node)
     std::unique_lock held(lock_);
     auto const found = nodes_.find(&dynamic_cast<IC::MutableNode const&>(node));
     std::shared_ptr<std::mutex> const inUse = found->second;
-    nodes_.erase(found); // nobody begins to use it from here on
+    nodes_.erase(found); // no thread can begin to use it from here on
     held.unlock();
     std::lock_guard const waited(*inUse);
 }

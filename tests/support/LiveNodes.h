@@ -11,25 +11,25 @@
 #include <vector>
 
 /**
- * A host's view of the nodes that are alive: no node goes while one of its threads is using it.
+ * The nodes that exist, for a host with several threads: no node is deleted while one of them uses
+ * it.
  *
- * Told of new and deleted nodes for as long as it lives.
+ * It is informed of new and deleted nodes while it exists.
  */
 class LiveNodes : public mihost::NodeObserver
 {
 public:
-    /** @param nodes  those that are alive already */
+    /** @param nodes  those that exist already */
     explicit LiveNodes(std::vector<IC::MutableNode*> const& nodes);
     ~LiveNodes() override;
 
     void nodeAdded(IC::Node const& node) override;
     void nodeDeleted(IC::Node const& node) override;
 
-    /** Uses some node of the type that nobody else is using; false where there is none now. */
+    /** Uses a node of the type that no other thread uses. @return false if there is none now */
     bool use(unsigned int type, std::function<void(IC::MutableNode const& node)> const& with);
 
-    /** Uses all nodes that are alive, one after the other; waits for those that others are using.
-     */
+    /** Uses all nodes, one after the other; waits for those that other threads use. */
     void useEach(std::function<void(IC::MutableNode const& node)> const& with);
 
     std::vector<IC::MutableNode const*> ofType(unsigned int type) const;

@@ -62,7 +62,7 @@ std::vector<Call> recorded(std::string const& program)
 
 void lay(std::string const& name)
 {
-    // What tells one distribution from another is the file that is there and those that are not.
+    // A distribution is recognised by which of these files exist.
     for (char const* release : {"/etc/release", "/etc/vmware-release", "/etc/redhat-release",
                                 "/etc/SuSE-release", "/etc/UnitedLinux-release"})
         remove(release);

@@ -6,48 +6,48 @@
 #include <vector>
 
 /**
- * The machine that a test finds itself on: a fresh copy of this one, to be changed at will.
+ * The machine that a test runs on: a new copy of this one, which it may change.
  *
- * For tests that run in the sandbox; whatever changes something throws elsewhere.
+ * For tests that run in the sandbox; outside it, functions that change something throw.
  */
 namespace machine
 {
 
 /**
- * Lays the files of tests/machines/NAME over the copy, all owned by root. Release files that are
- * not among them are removed; everything else of this machine stays.
+ * Puts the files of tests/machines/NAME over those of the copy, all owned by root. Release files
+ * that are not among them are removed; everything else of this machine stays.
  */
 void lay(std::string const& name);
 
-/** Notes every command line given to /bin/sh from now on; each is then run by the real shell. */
+/** Records every command line given to /bin/sh from now on; the real shell then runs it. */
 void recordShell();
 
-/** Notes every call of one program from now on, such as "/usr/sbin/useradd", and runs it. */
+/** Records every call of one program, such as "/usr/sbin/useradd", from now on, and runs it. */
 void record(std::string const& program);
 
-/** The command lines given to the shell since recordShell, in order, exactly. */
+/** @return the command lines given to the shell since recordShell, in order, unchanged */
 std::vector<std::string> ran();
 
-/** The argument lists of one recorded program's calls, in order, without its own name. */
+/** @return the arguments of each call of one recorded program, in order, without its name */
 std::vector<std::vector<std::string>> calls(std::string const& program);
 
 /** Forgets what was recorded so far. */
 void forget();
 
-/** Replaces a file, and makes the folders that lead to it. */
+/** Replaces a file, and makes the directories that lead to it. */
 void write(std::string const& path, std::string const& text, mode_t mode = 0644);
 
-/** Replaces a program by a shell script; what is given is all but the first line. */
+/** Replaces a program by a shell script, given without its first line. */
 void fake(std::string const& program, std::string const& script);
 
-/** Removes a file; one that is not there is fine. */
+/** Removes a file if it exists. */
 void remove(std::string const& path);
 
 std::string read(std::string const& path);
 
 /**
- * One record of a file of records whose fields are separated by colons: /etc/passwd, /etc/shadow,
- * /etc/group. Empty where no record has this first field.
+ * @return the fields of the record with this first field in a file whose fields are separated by
+ *         colons: /etc/passwd, /etc/shadow or /etc/group; empty if there is none
  */
 std::vector<std::string> entry(std::string const& file, std::string const& name);
 

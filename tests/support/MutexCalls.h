@@ -6,9 +6,9 @@
 #include <functional>
 
 /**
- * Looks on while mutexes are locked and unlocked, for as long as it lives.
+ * Observes the locking and unlocking of mutexes while it exists.
  *
- * The calls themselves go on to the host's mutex.
+ * The calls themselves are passed on to the host's mutex.
  */
 class MutexCalls
 {
@@ -21,7 +21,7 @@ public:
     /** Called before a mutex is waited for. */
     std::function<void(NQ::Mutex const& mutex, unsigned long timeout)> onLock;
 
-    /** Called before a mutex is unlocked. @return what the unlocking is to return */
+    /** Called before a mutex is unlocked. @return what unlock returns to its caller */
     std::function<int(NQ::Mutex const& mutex)> onUnlock;
 };
 

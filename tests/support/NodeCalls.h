@@ -7,7 +7,7 @@
 #include <vector>
 
 /**
- * Notes what is asked of the framework's node setters, in order, for as long as it lives.
+ * Records the calls of the framework's node setters, in order, while it exists.
  *
  * Each call is a text such as "setStatus(1)", "setDescription(Driver)" or "setProperty(108)".
  */

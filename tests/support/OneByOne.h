@@ -4,9 +4,9 @@
 #include <functional>
 
 /**
- * Runs every test that is selected in a process of its own, forked from this one, and prints the
- * output of those that fail or are skipped. Filters, shards, repetitions and shuffling are
- * GoogleTest's. A test that is selected alone runs in this process.
+ * Runs every selected test in its own process, forked from this one, and prints the output of those
+ * that fail or are skipped. Filters, shards, repetitions and shuffling are GoogleTest's. If only
+ * one test is selected, it runs in this process.
  *
  * @param runTests  prepares the process and runs the tests; returns its exit status
  * @return the program's exit status

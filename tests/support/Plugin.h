@@ -35,25 +35,25 @@ public:
     void unload();
 
     /**
-     * The address of one of the library's own symbols, null if it has none of this name.
+     * @return the address of one of the library's own symbols, null if it has none of this name
      *
-     * @param name  as C++ writes it, such as "IC::OsSwMI::createUserNodes(bool)", or as the linker
+     * @param name  as in C++, such as "IC::OsSwMI::createUserNodes(bool)", or the linker's name
      */
     void* symbol(std::string const& name) const;
 
-    /** All nodes in the order of the framework's list. */
+    /** @return all nodes, in the order of the framework's list */
     std::vector<IC::MutableNode*> nodes() const;
 
     /** Those of one node type, see host/Properties.h. */
     std::vector<IC::MutableNode*> nodes(unsigned int type) const;
 
-    /** @throws std::runtime_error where there is not exactly one of this type */
+    /** @throws std::runtime_error unless there is exactly one of this type */
     IC::MutableNode& node(unsigned int type) const;
 
-    /** The first of this type whose property 108 has this text, null where there is none. */
+    /** @return the first of this type whose property 108 is this text; null if there is none */
     IC::MutableNode* find(unsigned int type, std::string const& name) const;
 
-    /** As find. @throws std::runtime_error where there is none */
+    /** As find. @throws std::runtime_error if there is none */
     IC::MutableNode& node(unsigned int type, std::string const& name) const;
 
 private:
@@ -63,13 +63,13 @@ private:
     bool initialized_ = false;
 };
 
-/** What a node answers now; nothing where the status is not 0. */
+/** @return what a node answers now; nothing if the status is not 0 */
 std::optional<IC::PropertyValue> property(IC::MutableNode const& node, unsigned int id);
 
-/** What a node answers now, as text; "(status 1)" and the like where it is not 0. */
+/** @return what a node answers now, as text; "(status 1)" for example if it is not 0 */
 std::string text(IC::MutableNode const& node, unsigned int id);
 
-/** What a node holds, as text, past its own getProperty; "(unset)" where it holds nothing. */
+/** @return what a node stores, not what its getProperty answers; "(unset)" if nothing */
 std::string stored(IC::MutableNode const& node, unsigned int id);
 
 #endif

@@ -29,7 +29,7 @@ std::vector<std::string> currentEnvironment()
     return entries;
 }
 
-/** Contract: read once per process. Null where the program does not contain the plug-in. */
+/** Contract: read once per process. @return null if the program does not contain the plug-in */
 void** idRanges()
 {
     return static_cast<void**>(dlsym(RTLD_DEFAULT, "_ZN2NQ8minMaxId9pinstanceE"));

@@ -19,7 +19,7 @@ struct CloseFile {
     }
 };
 
-// Files rather than pipes: nobody waits for the other whatever is written in whatever order.
+// Files rather than pipes, so that neither side waits for the other.
 using File = std::unique_ptr<std::FILE, CloseFile>;
 
 File fileOf(std::string const& text)

@@ -19,7 +19,7 @@ struct Outcome {
  */
 Outcome runToEnd(std::vector<std::string> const& arguments, std::string const& input = "");
 
-/** Runs mihost with the plug-in that was built beside it. */
+/** Runs mihost with the plug-in of the same build. */
 Outcome mihostRun(std::vector<std::string> arguments, std::string const& input = "");
 
 #endif

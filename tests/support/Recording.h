@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-/** One logger call, kept. */
+/** One call of the logger. */
 struct LogRecord {
     bool trace; // false for the level log, true for the trace log
     std::string function;
@@ -21,7 +21,7 @@ struct LogRecord {
     std::string text;
 };
 
-/** Keeps every logger call of the process for as long as it lives. */
+/** Records every logger call of the process while it exists. */
 class Recording : public mihost::LogSink
 {
 public:
@@ -32,10 +32,10 @@ public:
 
     std::vector<LogRecord> records() const;
 
-    /** The texts of the level log, in order; with a level given, only those of that level. */
+    /** @return the texts of the level log, in order; if level is not 0, only those of that level */
     std::vector<std::string> texts(int level = 0) const;
 
-    /** Texts other than entry and exit lines. */
+    /** @return the texts other than entry and exit lines */
     std::vector<std::string> remarks() const;
 
     bool has(std::string const& text, int level) const;

@@ -34,7 +34,7 @@ bool sandboxIsRequired()
 
 int runTestsInSandbox(int argc, char* argv[])
 {
-    // Commands and their language do not depend on the caller.
+    // So that commands and their language do not depend on the caller.
     setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
     setenv("LC_ALL", "C", 1);
     testing::InitGoogleTest(&argc, argv);

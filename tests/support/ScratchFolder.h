@@ -3,7 +3,7 @@
 
 #include <string>
 
-/** An empty folder below the temporary one, which goes with all that is in it. */
+/** A new empty temporary directory, which the destructor removes with all its files. */
 class ScratchFolder
 {
 public:
@@ -14,11 +14,11 @@ public:
 
     std::string const& name() const;
 
-    /** The full path of a name in it. */
+    /** @return the full path of a name in the directory */
     std::string path(std::string const& name) const;
 
     /**
-     * Gives a file this content, keeping the file where there is one, and makes the folders that
+     * Gives a file this content, keeping the same file if it exists, and makes the directories that
      * lead to it.
      *
      * @return its full path

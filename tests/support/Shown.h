@@ -5,7 +5,7 @@
 
 #include <string>
 
-/** Kind, value and flag of a value, such as "text abc true" or "numbers 0,1,24 true". */
+/** @return kind, value and flag, such as "text abc true" or "numbers 0,1,24 true" */
 std::string shown(IC::PropertyValue const& value);
 
 #endif

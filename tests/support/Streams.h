@@ -4,7 +4,7 @@
 #include <cstdio>
 #include <string>
 
-/** The text as a stream; unlike an in-memory stream it holds NUL bytes and emptiness well. */
+/** @return the text as a stream; unlike fmemopen, this also works with NUL bytes and no text */
 FILE* streamOf(std::string const& text);
 
 #endif

@@ -34,7 +34,7 @@ struct SymbolTable {
         }
     }
 
-    /** One after the last symbol. The hash table has chains of those that are defined, in order. */
+    /** @return one after the last defined symbol: the hash table lists these, the last one last */
     std::uint32_t end() const
     {
         if (!hashes)
@@ -55,7 +55,7 @@ struct SymbolTable {
     }
 };
 
-/** Without the mark that GCC adds to names which involve the newer std::string. */
+/** @return the name without the tag that GCC adds if it involves the newer std::string */
 std::string readable(char const* symbol)
 {
     int status = 0;

@@ -4,10 +4,10 @@
 #include <string>
 
 /**
- * The address of one of a loaded library's own symbols, null if it has none of this name.
+ * @return the address of one of a loaded library's own symbols, null if it has none of this name
  *
  * @param library  from dlopen
- * @param name     as C++ writes it, such as "IC::OsSwMI::createUserNodes(bool)" or "OpenMI"
+ * @param name     as in C++, such as "IC::OsSwMI::createUserNodes(bool)" or "OpenMI"
  */
 void* findSymbol(void* library, std::string const& name);
 

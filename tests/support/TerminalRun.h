@@ -9,8 +9,8 @@
 #include <vector>
 
 /**
- * mihost, or another program, run at a terminal as a person sees it. What it writes and shows comes
- * as one stream, and nothing is paged unless MIHOST_PAGER is set.
+ * Runs mihost, or another program, at a terminal. Standard output, standard error and what the
+ * terminal echoes come as one text, and nothing is paged unless MIHOST_PAGER is set.
  */
 class TerminalRun
 {
@@ -29,18 +29,18 @@ public:
     /**
      * Reads until the text appears after what was read before.
      *
-     * @param limit  how long at most; a failing test must end, a slow machine must not fail one
+     * @param limit  how long at most: long enough for a slow machine, and a failing test ends
      * @return what was read, up to the end of the text
-     * @throws std::runtime_error if the program ends before, or the time does
+     * @throws std::runtime_error if the program ends before, or the time is over
      */
     std::string waitFor(std::string const& text, std::chrono::milliseconds limit = usualLimit);
 
     void resize(unsigned short columns) const;
 
-    /** Keeps the kernel from dropping what is on its way to the terminal when Ctrl-C is typed. */
+    /** Keeps the kernel from dropping output that is not read yet when Ctrl-C is typed. */
     void dropNothingWithCtrlC() const;
 
-    /** Whether the terminal shows what is typed. */
+    /** @return whether the terminal echoes what is typed */
     bool showsInput() const;
 
     /**
@@ -57,7 +57,7 @@ public:
     /** Waits until no process that the program started is left. */
     void waitForDescendants() const;
 
-    /** Everything that was read so far. */
+    /** @return everything that was read so far */
     std::string const& output() const
     {
         return output_;
@@ -75,7 +75,7 @@ private:
 
     pid_t child_ = -1;
     int master_ = -1;
-    int descendants_ = -1; // a pipe that each of them has open
+    int descendants_ = -1; // a pipe that every descendant has open
     std::string output_;
     std::size_t seen_ = 0;
 };

@@ -4,7 +4,7 @@
 #include <cstdlib>
 #include <ctime>
 
-/** From now on local time is that of the zone, which is best given by its rules: "UTC0". */
+/** Makes local time that of the zone from now on, best given by its rules, such as "UTC0". */
 inline void useZone(char const* zone)
 {
     setenv("TZ", zone, 1);

@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-/** Notes every text that the host's conversions turn into another kind, while it lives. */
+/** Records every text that the host's conversions convert while it exists. */
 class WideTexts
 {
 public:
@@ -16,7 +16,7 @@ public:
     std::vector<std::string> widened;
     std::vector<std::string> narrowed;
 
-    /** C strings that were made into texts. */
+    /** C strings that were converted into texts. */
     std::vector<std::string> made;
 };
 

@@ -24,7 +24,7 @@ FILE* streamOf(std::string const& text)
     return *open.insert(fdopen(descriptor, "r")).first;
 }
 
-/** The fuzzer itself opens files elsewhere. */
+/** @return whether the plug-in opens the file; the fuzzer itself opens others */
 bool isMachines(std::string const& path)
 {
     return path.rfind("/etc/", 0) == 0 || path.rfind("/var/log/", 0) == 0;

@@ -13,8 +13,9 @@ namespace fuzz
 {
 
 /**
- * The machine as the plug-in sees it for as long as it lives: below /etc and /var/log only these
- * files exist, and only these commands. Streams that the plug-in leaves open are closed at the end.
+ * The machine as the plug-in sees it: while the object exists, only these files exist below /etc
+ * and /var/log, and only these commands. The destructor closes the streams that the plug-in left
+ * open.
  */
 class System
 {
@@ -37,10 +38,10 @@ private:
 
 std::string text(std::uint8_t const* data, std::size_t size);
 
-/** The requested number of texts: the input cut at lines "%%", the rest empty. */
+/** @return as many texts as requested: the input split at lines "%%", the others empty */
 std::vector<std::string> sections(std::uint8_t const* data, std::size_t size, std::size_t count);
 
-/** Ends the program, and so the run, where something that must hold does not. */
+/** Aborts the program, and so the run, if the condition is false. */
 void require(bool holds);
 
 } // namespace fuzz

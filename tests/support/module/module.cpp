@@ -1,4 +1,4 @@
-// What modinfo reads of a kernel module, and nothing else of one.
+// A kernel module with only what modinfo reads.
 
 asm(".section .modinfo, \"a\"\n"
     ".asciz \"description=A disk of memory\"\n"

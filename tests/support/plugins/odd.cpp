@@ -1,5 +1,5 @@
-// A plug-in with one node of an unknown kind. In what the environment variable ODD says it behaves
-// as the real one never does.
+// A plug-in with one node of an unknown kind. The environment variable ODD selects a behaviour that
+// the real plug-in never has.
 
 #include "host/MutableNode.h"
 #include "host/OpenMI.h"
@@ -30,7 +30,7 @@ public:
         return {static_cast<unsigned char>(isOddIn("start") ? 5 : 0), IC::Number(0U), "no reason"};
     }
 
-    /** With "rebuild" the group "crew" is built again each time, with the count as its GID. */
+    /** With "rebuild", builds the group "crew" again at each call, its GID the number of calls. */
     IC::Error getMap(std::vector<IC::Node*>& nodes) override
     {
         if (isOddIn("rebuild") || isOddIn("vanish"))

@@ -1,4 +1,4 @@
-// A plug-in that wants something of its host which no host of this contract has.
+// A plug-in that needs a function of its host which no host of this contract has.
 
 extern "C" int hostOperationFromTheFuture();
 

@@ -1,4 +1,4 @@
-// A plug-in that wants a function of the reference program's, which other hosts do not have.
+// A plug-in that needs a function of the reference program, which other hosts do not have.
 
 #include "host/OpenMI.h"
 #include "mihost/runtime/Runtime.h"

@@ -1,5 +1,5 @@
-// Runs commands as a host's plug-in does. Prints what they print; on standard error, a line with
-// each one's status and, where the accelerator is there, a line with each of its counts.
+// Runs commands as a host's plug-in does. Prints their output; on standard error, a line with the
+// status of each and, if the accelerator is loaded, a line with each of its counts.
 
 #include "mihost/accel/Accel.h"
 

@@ -14,7 +14,7 @@ int main(int argc, char* argv[])
         return 127;
 
     // The program, the number of arguments and the arguments, a NUL after each; written at once,
-    // so that programs that run at the same time do not mix their notes.
+    // so that programs that run at the same time do not mix their records.
     std::string note = self;
     note.push_back('\0');
     note += std::to_string(argc);

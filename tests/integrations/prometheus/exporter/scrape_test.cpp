@@ -57,7 +57,7 @@ TEST(Scrape, EndsWithAProgramThatIsTerminated)
     pthread_sigmask(SIG_SETMASK, &before, nullptr);
 }
 
-/** What its writers wrote by the time that the last of them has ended. */
+/** @return all that is written to the pipe until its last writer has ended */
 std::string readToEnd(int pipe)
 {
     fcntl(pipe, F_SETFL, 0); // blocking from here on

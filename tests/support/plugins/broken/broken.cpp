@@ -1,6 +1,6 @@
-// The plug-in's own objects, with a layer between them and the host that breaks the contract in the
-// one way that the environment variable BROKEN names; in none without it. The linker leads the
-// calls here (--wrap), so nothing of the plug-in is written twice.
+// The plug-in's own objects and a layer between them and the host that breaks the contract in the
+// way that the environment variable BROKEN names; in no way if it is not set. The linker redirects
+// the calls to this layer (--wrap), so no code of the plug-in is repeated here.
 
 #include "frame/OsSwMI.h"
 #include "host/OpenMI.h"
@@ -34,7 +34,7 @@ bool initialized = false;
 bool initializeFailed = false;
 bool methodCalled = false;
 
-// Kept by the library although the host unloaded it.
+// What the library still keeps after the host has unloaded it.
 auto& lost = *new std::vector<std::string>;
 
 struct Message {

@@ -42,12 +42,14 @@ Table tableOf(std::vector<Need> const& needs)
                  {"effect"},
                  {"debian"},
                  {"red-hat"},
+                 {"opensuse"},
                  {"no-fix"}});
     for (Need const& need : needs)
         table.add({need.what, truth(isMet(need)),
                    isMet(need) ? Cell(nullptr, "") : truth(!isBeyondFixing(need)),
                    isMet(need) ? Cell(nullptr, "") : Cell(*need.problem), need.effect,
-                   orNull(need.debian), orNull(need.redHat), orNull(need.noFix)});
+                   orNull(need.fix.debian), orNull(need.fix.redHat), orNull(need.fix.opensuse),
+                   orNull(need.noFix)});
     return table;
 }
 
@@ -62,9 +64,10 @@ void writeUnmet(Need const& need, Output& out)
     std::string const state =
         isBeyond ? styled(Style::Yellow, "no fix ") : styled(Style::Red, "missing");
     out.line(fmt::format("{}  {}: {}", state, need.what, printable(*need.problem)));
+    Fix const fix = isBeyond ? Fix{} : need.fix;
     for (Row const& row :
          {Row{"effect", need.effect}, Row{"no fix", isBeyond ? need.noFix : ""},
-          Row{"Debian", isBeyond ? "" : need.debian}, Row{"Red Hat", isBeyond ? "" : need.redHat}})
+          Row{"Debian", fix.debian}, Row{"Red Hat", fix.redHat}, Row{"openSUSE", fix.opensuse}})
         if (!row.text.empty())
             out.line(fmt::format("           {:<8} {}", row.heading, row.text));
 }

@@ -43,43 +43,52 @@ bool isThere(std::string const& path)
     return !accessProblem(path);
 }
 
+/** The same command on every system. */
+Fix everywhere(std::string const& command)
+{
+    return {command, command, command};
+}
+
 // Commands.
 
 struct CommandNeed {
     char const* command;
     char const* effect;
-    char const* debian; // package
-    char const* redHat; // package
+    // The packages that have it.
+    char const* debian;
+    char const* redHat;
+    char const* opensuse;
 };
 
 constexpr CommandNeed commandNeeds[] = {
-    {"/bin/sh", "everything read or changed by a command", "dash", "bash"},
-    {"lsmod", "all drivers", "kmod", "kmod"},
-    {"modinfo", "versions and descriptions of drivers", "kmod", "kmod"},
-    {"wc", "all log entries", "coreutils", "coreutils"},
-    {"sed", "messages and times of log entries", "sed", "sed"},
-    {"date", "times of log entries", "coreutils", "coreutils"},
-    {"stat", "install-date of os", "coreutils", "coreutils"},
-    {"grep", "install-date of os", "grep", "grep"},
-    {"cat", "os-version of os", "coreutils", "coreutils"},
-    {"tr", "os-version of os", "coreutils", "coreutils"},
-    {"cut", "os-version of os", "coreutils", "coreutils"},
-    {"chage", "writing inactive-time and password-expiration of users", "passwd", "shadow-utils"},
-    {"chpasswd", "writing password of users", "passwd", "shadow-utils"},
+    {"/bin/sh", "everything read or changed by a command", "dash", "bash", "bash"},
+    {"lsmod", "all drivers", "kmod", "kmod", "kmod"},
+    {"modinfo", "versions and descriptions of drivers", "kmod", "kmod", "kmod"},
+    {"wc", "all log entries", "coreutils", "coreutils", "coreutils"},
+    {"sed", "messages and times of log entries", "sed", "sed", "sed"},
+    {"date", "times of log entries", "coreutils", "coreutils", "coreutils"},
+    {"stat", "install-date of os", "coreutils", "coreutils", "coreutils"},
+    {"grep", "install-date of os", "grep", "grep", "grep"},
+    {"cat", "os-version of os", "coreutils", "coreutils", "coreutils"},
+    {"tr", "os-version of os", "coreutils", "coreutils", "coreutils"},
+    {"cut", "os-version of os", "coreutils", "coreutils", "coreutils"},
+    {"chage", "writing inactive-time and password-expiration of users", "passwd", "shadow-utils",
+     "shadow"},
+    {"chpasswd", "writing password of users", "passwd", "shadow-utils", "shadow"},
     {"rm", "writing password of users: the file with the hash is not removed", "coreutils",
+     "coreutils", "coreutils"},
+    {"userdel", "writing delete of users", "passwd", "shadow-utils", "shadow"},
+    {"/usr/sbin/useradd", "the method UserAdd", "passwd", "shadow-utils", "shadow"},
+    {"/usr/sbin/userdel", "the method UserDel", "passwd", "shadow-utils", "shadow"},
+    {"/usr/sbin/usermod", "the methods that change users and memberships", "passwd", "shadow-utils",
+     "shadow"},
+    {"/usr/sbin/groupadd", "the method LocalGroupAdd", "passwd", "shadow-utils", "shadow"},
+    {"/usr/sbin/groupdel", "the method LocalGroupDel", "passwd", "shadow-utils", "shadow"},
+    {"/usr/bin/chage", "the methods UserAdd and UserSetAttrib", "passwd", "shadow-utils", "shadow"},
+    {"/usr/bin/passwd", "passwords in methods", "passwd", "passwd", "shadow"},
+    {"/usr/bin/id", "the methods LocalGroupAddUser and LocalGroupDelUser", "coreutils", "coreutils",
      "coreutils"},
-    {"userdel", "writing delete of users", "passwd", "shadow-utils"},
-    {"/usr/sbin/useradd", "the method UserAdd", "passwd", "shadow-utils"},
-    {"/usr/sbin/userdel", "the method UserDel", "passwd", "shadow-utils"},
-    {"/usr/sbin/usermod", "the methods that change users and memberships", "passwd",
-     "shadow-utils"},
-    {"/usr/sbin/groupadd", "the method LocalGroupAdd", "passwd", "shadow-utils"},
-    {"/usr/sbin/groupdel", "the method LocalGroupDel", "passwd", "shadow-utils"},
-    {"/usr/bin/chage", "the methods UserAdd and UserSetAttrib", "passwd", "shadow-utils"},
-    {"/usr/bin/passwd", "passwords in methods", "passwd", "passwd"},
-    {"/usr/bin/id", "the methods LocalGroupAddUser and LocalGroupDelUser", "coreutils",
-     "coreutils"},
-    {"/sbin/shutdown", "restart and halt", "systemd-sysv", "systemd"},
+    {"/sbin/shutdown", "restart and halt", "systemd-sysv", "systemd", "systemd-sysvinit"},
 };
 
 /** The first of the directories that has the command; empty for none. */
@@ -101,7 +110,7 @@ Need needOfPath(CommandNeed const& row, Need need)
         return need;
     need.problem = "not found in PATH";
     if (std::string const folder = folderOf(row.command, usual); !folder.empty())
-        need.debian = need.redHat = fmt::format("PATH=$PATH:{} mihost", folder);
+        need.fix = everywhere(fmt::format("PATH=$PATH:{} mihost", folder));
     return need;
 }
 
@@ -110,8 +119,9 @@ Need needOf(CommandNeed const& row)
     Need need{fmt::format("command {}", row.command),
               std::nullopt,
               row.effect,
-              fmt::format("apt-get install {}", row.debian),
-              fmt::format("dnf install {}", row.redHat),
+              {fmt::format("apt-get install {}", row.debian),
+               fmt::format("dnf install {}", row.redHat),
+               fmt::format("zypper install {}", row.opensuse)},
               ""};
     if (row.command[0] != '/')
         return needOfPath(row, need);
@@ -129,7 +139,7 @@ bool hasRedHatPackages()
 Need redHatNeed(std::string const& what, Problem const& problem, std::string const& effect,
                 std::string const& redHat, std::string const& noFix)
 {
-    return {what, problem, effect, "", redHat, hasRedHatPackages() ? "" : noFix};
+    return {what, problem, effect, {"", redHat, ""}, hasRedHatPackages() ? "" : noFix};
 }
 
 /** If this file exists, UserAdd passes an option that newer versions of useradd lack. */
@@ -139,8 +149,10 @@ std::vector<Need> groupOption()
         return {};
     std::string const said = commandTap::outputOf("LC_ALL=C /usr/sbin/useradd -n 2>&1");
     bool const isUnknown = said.find("invalid option") != std::string::npos;
-    return {{"useradd -n", isUnknown ? Problem("not supported by useradd") : std::nullopt,
-             "the method UserAdd", "", "",
+    return {{"useradd -n",
+             isUnknown ? Problem("not supported by useradd") : std::nullopt,
+             "the method UserAdd",
+             {},
              "the useradd of this system has no such option: add accounts with useradd itself"}};
 }
 
@@ -165,8 +177,9 @@ std::vector<Need> capabilities()
     for (CapabilityNeed const& row : capabilityNeeds)
         needs.push_back(
             {fmt::format("capability {}", row.name),
-             hasCapability(row.capability) ? std::nullopt : Problem("root lacks it"), row.effect,
-             "", "",
+             hasCapability(row.capability) ? std::nullopt : Problem("root lacks it"),
+             row.effect,
+             {},
              "no process can gain it: grant it where this container or service is started"});
     return needs;
 }
@@ -175,16 +188,19 @@ std::vector<Need> surroundings()
 {
     char const* const language = std::getenv("LANG");
     bool const isRoot = geteuid() == 0;
+    std::string const localectl = "localectl set-locale LANG=C.UTF-8";
     std::vector<Need> needs = {
         {"root's privileges", isRoot ? std::nullopt : Problem("not run as root"),
-         "passwords and ageing of users, every change", "sudo mihost", "sudo mihost", ""},
-        {"locale in LANG", language && *language ? std::nullopt : Problem("LANG is not set"),
-         "language-edition and code-set of os", "update-locale LANG=C.UTF-8",
-         "localectl set-locale LANG=C.UTF-8", ""},
+         "passwords and ageing of users, every change", everywhere("sudo mihost"), ""},
+        {"locale in LANG",
+         language && *language ? std::nullopt : Problem("LANG is not set"),
+         "language-edition and code-set of os",
+         {"update-locale LANG=C.UTF-8", localectl, localectl},
+         ""},
     };
     if (isThere(systemLog))
         needs.push_back({"permission to empty the system log", accessProblem(systemLog, W_OK),
-                         "clear-log", "sudo mihost", "sudo mihost", ""});
+                         "clear-log", everywhere("sudo mihost"), ""});
     if (isRoot) {
         std::vector<Need> const ofRoot = capabilities();
         needs.insert(needs.end(), ofRoot.begin(), ofRoot.end());
@@ -217,29 +233,42 @@ std::vector<Need> accounts()
         {"id ranges in /etc/login.defs",
          isThere(loginDefsFile) ? problemOfRanges(contentOf(loginDefsFile))
                                 : accessProblem(loginDefsFile),
-         "ordinary users, ordinary groups", missingConfiguration, "dnf reinstall shadow-utils", ""},
-        {"accounts in /etc/passwd", accessProblem(accountFile), "all users",
-         "cp /usr/share/base-passwd/passwd.master /etc/passwd", "dnf reinstall setup", ""},
-        {"groups in /etc/group", accessProblem(groupFile), "all groups",
-         "cp /usr/share/base-passwd/group.master /etc/group", "dnf reinstall setup", ""},
-        {"login failures in /etc/pam.d/login", accessProblem("/etc/pam.d/login"),
-         "max-login-failures of users", missingConfiguration, "dnf reinstall util-linux", ""},
+         "ordinary users, ordinary groups",
+         {missingConfiguration, "dnf reinstall shadow-utils", "cp /usr/etc/login.defs /etc"},
+         ""},
+        {"accounts in /etc/passwd",
+         accessProblem(accountFile),
+         "all users",
+         {"cp /usr/share/base-passwd/passwd.master /etc/passwd", "dnf reinstall setup",
+          "systemd-sysusers"},
+         ""},
+        {"groups in /etc/group",
+         accessProblem(groupFile),
+         "all groups",
+         {"cp /usr/share/base-passwd/group.master /etc/group", "dnf reinstall setup",
+          "systemd-sysusers"},
+         ""},
+        {"login failures in /etc/pam.d/login",
+         accessProblem("/etc/pam.d/login"),
+         "max-login-failures of users",
+         {missingConfiguration, "dnf reinstall util-linux", "cp /usr/lib/pam.d/login /etc/pam.d"},
+         ""},
         {"passwords in /etc/shadow", accessProblem(shadowFile), "passwords and ageing of users",
-         "sudo mihost, or pwconv", "sudo mihost, or pwconv", ""},
+         everywhere("sudo mihost, or pwconv"), ""},
     };
     if (isThere(accountFile))
         needs.push_back({"format of /etc/passwd", problemOfAccounts(contentOf(accountFile)),
-                         "that user; after a line that is too long, all users", "vipw", "vipw",
+                         "that user; after a line that is too long, all users", everywhere("vipw"),
                          ""});
     if (isThere(groupFile))
         needs.push_back({"format of /etc/group", problemOfGroups(contentOf(groupFile)),
-                         "that group", "vigr", "vigr", ""});
+                         "that group", everywhere("vigr"), ""});
     if (isThere(accountFile) && isThere(shadowFile))
         needs.push_back(
             {"order of /etc/shadow",
              problemOfShadow(localNames(*findKind(IC::nodeType::user)), contentOf(shadowFile)),
-             "passwords and ageing of that user and all later ones", "pwconv; pwck -s",
-             "pwconv; pwck -s", ""});
+             "passwords and ageing of that user and all later ones", everywhere("pwconv; pwck -s"),
+             ""});
     return needs;
 }
 
@@ -267,8 +296,12 @@ std::vector<Need> release()
         "\"$VERSION_ID\") >/etc/release";
     std::string const install = "dnf install system-release";
     return {
-        {"name in a release file", noneOf(named), "os-name is just \"Linux\"", write, install, ""},
-        {"version in a release file", version, "os-version of os", write, install, ""},
+        {"name in a release file",
+         noneOf(named),
+         "os-name is just \"Linux\"",
+         {write, install, write},
+         ""},
+        {"version in a release file", version, "os-version of os", {write, install, write}, ""},
         redHatNeed("date of a release file", noneOf(dated), "install-date of os", install,
                    "such a file would make this another distribution"),
     };
@@ -291,16 +324,18 @@ std::vector<Need> modules()
     bool const takesModules = isThere(file);
     std::string const advice = takesModules ? "modprobe MODULE" : "";
     std::vector<Need> needs = {{"loaded kernel modules", emptyModuleList(file), "all drivers",
-                                advice, advice,
+                                everywhere(advice),
                                 takesModules ? "" : "this kernel has no loadable modules"}};
     utsname system{};
     if (linesOf(contentOf(file)).empty() || uname(&system) != 0)
         return needs;
-    needs.push_back({"module files of the kernel",
-                     accessProblem(fmt::format("/lib/modules/{}", system.release)),
-                     "versions and descriptions of drivers",
-                     "apt-get install linux-image-$(uname -r)",
-                     "dnf install kernel-modules-$(uname -r)", ""});
+    needs.push_back(
+        {"module files of the kernel",
+         accessProblem(fmt::format("/lib/modules/{}", system.release)),
+         "versions and descriptions of drivers",
+         {"apt-get install linux-image-$(uname -r)", "dnf install kernel-modules-$(uname -r)",
+          "zypper install --force kernel-default"},
+         ""});
     return needs;
 }
 
@@ -310,15 +345,19 @@ std::vector<Need> log()
         "echo '$ActionFileDefaultTemplate RSYSLOG_TraditionalFileFormat' "
         ">/etc/rsyslog.d/00-stamp.conf; systemctl restart rsyslog";
     std::vector<Need> needs = {
-        {"system log in /var/log/messages", accessProblem(systemLog), "all log entries",
-         "apt-get install rsyslog; echo '*.info;authpriv.none -/var/log/messages;"
-         "RSYSLOG_TraditionalFileFormat' >/etc/rsyslog.d/messages.conf; systemctl restart rsyslog",
-         "dnf install rsyslog; systemctl enable --now rsyslog", ""}};
+        {"system log in /var/log/messages",
+         accessProblem(systemLog),
+         "all log entries",
+         {"apt-get install rsyslog; echo '*.info;authpriv.none -/var/log/messages;"
+          "RSYSLOG_TraditionalFileFormat' >/etc/rsyslog.d/messages.conf; systemctl restart rsyslog",
+          "dnf install rsyslog; systemctl enable --now rsyslog",
+          "zypper install rsyslog; systemctl enable --now rsyslog"},
+         ""}};
     if (!isThere(systemLog))
         return needs;
     needs.push_back({"traditional time stamps in the system log",
                      problemOfStamps(LogFile(systemLog).newestLines(mostLogEntries)),
-                     "messages and times of log entries", traditional, traditional, ""});
+                     "messages and times of log entries", everywhere(traditional), ""});
     return needs;
 }
 

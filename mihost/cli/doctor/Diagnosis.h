@@ -8,14 +8,20 @@
 namespace mihost
 {
 
+/** The command that fixes something on each family of systems; empty if there is none. */
+struct Fix {
+    std::string debian;
+    std::string redHat;
+    std::string opensuse;
+};
+
 /** One thing that a full tree, or a change, needs. */
 struct Need {
     std::string what;
     std::optional<std::string> problem; // nothing if all is well
     std::string effect;                 // what suffers without it
-    std::string debian;                 // the fix on Debian and similar systems; empty for none
-    std::string redHat;                 // and on Red Hat and similar systems
-    std::string noFix;                  // why nothing on this machine fixes it; empty if it can be
+    Fix fix;
+    std::string noFix; // why nothing on this machine fixes it; empty if it can be
 };
 
 /**

@@ -15,6 +15,7 @@ const outcomes = {
 const fixes = [
     { field: "debian", label: () => _("On Debian") },
     { field: "red-hat", label: () => _("On Red Hat") },
+    { field: "opensuse", label: () => _("On openSUSE") },
 ];
 
 function outcomeOf({ ok, fixable }) {

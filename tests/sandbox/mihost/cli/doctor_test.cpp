@@ -124,6 +124,7 @@ TEST_F(Doctor, ShowsWhatIsMissingLastWithItsEffectAndFix)
                                   "           effect   all drivers\n"
                                   "           Debian   apt-get install kmod\n"
                                   "           Red Hat  dnf install kmod\n"
+                                  "           openSUSE zypper install kmod\n"
                                   "1 of ";
     EXPECT_NE(out.find(paragraph), std::string::npos) << out;
     EXPECT_GT(out.find(paragraph), out.rfind("\nok  "));

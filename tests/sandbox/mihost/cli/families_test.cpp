@@ -9,6 +9,8 @@
 #include <crypt.h>
 #include <cstdlib>
 #include <gtest/gtest.h>
+#include <map>
+#include <nlohmann/json.hpp>
 #include <set>
 
 namespace families_test
@@ -158,6 +160,42 @@ TEST(Opensuse, HasNoOrdinaryAccountsIfLoginDefsIsBelowUsrOnly)
         {{"user", "paula"}, 0, "login.defs"},
         {{"doctor"}, 1, "id ranges in /etc/login.defs"},
     });
+}
+
+/** @return how openSUSE fixes each thing that its machine lacks, by name */
+std::map<std::string, std::string> advice()
+{
+    std::map<std::string, std::string> fixes;
+    for (auto const& need : nlohmann::json::parse(mihostRun({"--json", "doctor"}).out))
+        if (need["ok"] == false && need["fixable"] == true)
+            fixes[need["need"]] = need["opensuse"].is_string() ? need["opensuse"] : "";
+    return fixes;
+}
+
+TEST(Opensuse, GetsAdviceForItsOwnTools)
+{
+    setenv("LANG", "C.UTF-8", 1);
+    machine::lay("opensuse");
+    for (char const* file : {"/usr/sbin/groupdel", "/usr/sbin/lsmod", "/usr/bin/lsmod",
+                             "/etc/login.defs", "/etc/pam.d/login", "/var/log/messages"})
+        machine::remove(file);
+    std::map<std::string, std::string> fixes = advice();
+    EXPECT_EQ(fixes["command /usr/sbin/groupdel"], "zypper install shadow");
+    EXPECT_EQ(fixes["command lsmod"], "zypper install kmod");
+    EXPECT_EQ(fixes["system log in /var/log/messages"],
+              "zypper install rsyslog; systemctl enable --now rsyslog");
+    for (auto const& [need, fix] : fixes)
+        EXPECT_TRUE(!fix.empty() && fix.find("dnf") == std::string::npos &&
+                    fix.find("apt-get") == std::string::npos)
+            << need << ": " << fix;
+    EXPECT_NE(mihostRun({"doctor"}).out.find("           openSUSE zypper install kmod\n"),
+              std::string::npos);
+
+    for (char const* need : {"id ranges in /etc/login.defs", "login failures in /etc/pam.d/login"})
+        EXPECT_EQ(std::system(fixes[need].c_str()), 0) << need << ": " << fixes[need];
+    fixes = advice();
+    EXPECT_EQ(fixes.count("id ranges in /etc/login.defs"), 0U);
+    EXPECT_EQ(fixes.count("login failures in /etc/pam.d/login"), 0U);
 }
 
 } // namespace families_test

@@ -8,6 +8,7 @@
 
 #include <crypt.h>
 #include <cstdlib>
+#include <filesystem>
 #include <gtest/gtest.h>
 #include <map>
 #include <nlohmann/json.hpp>
@@ -100,6 +101,31 @@ TEST(Fedora, AcceptsEveryCommand)
     EXPECT_EQ(machine::entry("/etc/group", "crew").at(3), "olaf");
     EXPECT_TRUE(machine::entry("/etc/group", "everyone").empty());
     EXPECT_EQ(machine::read("/var/log/messages"), "");
+}
+
+TEST(Fedora, AddsAnAccountIfUseraddTakesN)
+{
+    setenv("LANG", "C.UTF-8", 1);
+    machine::lay("fedora");
+    std::filesystem::rename("/usr/sbin/useradd", "/usr/sbin/useradd.debian");
+    machine::fake("/usr/sbin/useradd", "for argument; do\n" // Fedora's: -n is as -N
+                                       "    shift\n"
+                                       "    [ \"$argument\" != -n ] || argument=-N\n"
+                                       "    set -- \"$@\" \"$argument\"\n"
+                                       "done\n"
+                                       "exec /usr/sbin/useradd.debian \"$@\"\n");
+    machine::record("/usr/sbin/useradd");
+    runAll({
+        {{"user", "add", "jdoe", "--full-name", "J. Doe"}, 0, ""},
+        {{"user", "jdoe"}, 0, "users (100)"},
+        {{"get", "user:jdoe", "full-name", "-o", "value"}, 0, "J. Doe\n"},
+        {{"doctor"}, 0, "ok       useradd -n\n"},
+        {{"user", "delete", "jdoe"}, 0, ""},
+    });
+    std::vector<Lines> const calls = machine::calls("/usr/sbin/useradd");
+    ASSERT_FALSE(calls.empty());
+    EXPECT_EQ(calls[0].front(), "-n");
+    EXPECT_TRUE(machine::entry("/etc/passwd", "jdoe").empty());
 }
 
 TEST(Opensuse, AcceptsEveryCommand)

@@ -59,6 +59,9 @@ TEST(Bootstrap, NamesAPackageOnce)
     makeMachine(fedora, "clang-tools-extra"); // where Debian has two packages
     EXPECT_EQ(run("bootstrap", "check").err,
               "bootstrap: packages are missing (as root, run 'dnf install clang-tools-extra')\n");
+    makeMachine(opensuse, "clang"); // where Debian has three
+    EXPECT_EQ(run("bootstrap", "check").err,
+              "bootstrap: packages are missing (as root, run 'zypper install clang')\n");
 }
 
 TEST(Bootstrap, SucceedsIfNoPackageIsMissing)

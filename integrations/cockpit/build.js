@@ -24,12 +24,12 @@ const { outputFiles } = await build({
     logLevel: "warning",
     outdir: out,
 });
-// Cockpit serves a file that only is there compressed as what it is compressed from.
+// Cockpit serves a file that exists only compressed under its uncompressed name.
 for (const { path, contents } of outputFiles)
     await writeFile(`${path}.gz`, gzipSync(contents, { level: 9 }));
 await copyFile(join(here, "src/index.html"), join(out, "index.html"));
 await copyFile(join(here, "manifest.json"), join(out, "manifest.json"));
-// Browsers whose language there is no translation for get an empty one.
+// Browsers in a language without a translation get an empty one.
 await writeFile(join(out, "po.js"), "");
 for (const file of await readdir(join(here, "po")))
     if (file.endsWith(".po"))

@@ -3,7 +3,7 @@ import gettext from "gettext-parser";
 
 const rightToLeft = ["ar", "fa", "he", "ur"];
 
-/** The script for the text of a .po file. What is not translated is left out. */
+/** Returns the script for the text of a .po file, without the texts that are not translated. */
 export function compile(po) {
     const { headers, translations } = gettext.po.parse(po);
     const language = headers?.Language;

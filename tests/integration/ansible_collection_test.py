@@ -1,4 +1,4 @@
-"""The collection as it is built, installed, documented and checked by Ansible's own tools."""
+"""Ansible's own tools build, install and check the collection and its documentation."""
 
 import glob
 import json
@@ -12,7 +12,7 @@ from support.ansible import COLLECTION, Controller
 
 MODULES = ['mi_call', 'mi_group', 'mi_info', 'mi_set', 'mi_user']
 
-# Of ansible-test's, those that need nothing from a network.
+# The tests of ansible-test that need no network.
 SANITY = '''
     action-plugin-docs compile empty-init future-import-boilerplate ignores line-endings
     metaclass-boilerplate no-assert no-basestring no-dict-iteritems no-dict-iterkeys no-dict-itervalues

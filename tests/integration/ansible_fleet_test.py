@@ -1,11 +1,11 @@
-"""Three machines: a change previewed, applied, applied again, with one of them failing."""
+"""Three machines: a change is previewed, made, and made again; one of them fails."""
 
 import unittest
 
 from support import environment
 from support.ansible import Controller, task
 
-# Its three accounts have all the UIDs there are.
+# On this machine three accounts have all the UIDs that may be given.
 FULL = "sed -i 's/^UID_MAX.*/UID_MAX 1002/' /etc/login.defs"
 
 
@@ -25,11 +25,11 @@ class Fleet(unittest.TestCase):
         return {host: (each[-1]['outcome'], each[-1].get('changed', False)) for host, each in results.items()}
 
     def accounts(self, name):
-        """The machines that have the account."""
+        """Returns the machines that have the account."""
         command = f'grep -c ^{name}: /etc/passwd || true'
         return [machine.name for machine in self.machines if machine.run(command) == '1\n']
 
-    def test_previewed_applied_and_applied_again(self):
+    def test_previews_a_change_and_makes_it_once(self):
         change = [task('mi_user', name='jdoe', full_name='J. Doe', shell='/bin/bash')]
         expected = {'one': ('ok', True), 'two': ('ok', True), 'three': ('failed', False)}
 

@@ -22,11 +22,11 @@ class Modules(unittest.TestCase):
         cls.machine = cls.controller.start('one', SETUP)
 
     def play(self, *tasks, options=()):
-        """The results on the one machine."""
+        """Returns the results on the one machine."""
         return self.controller.play(list(tasks), *options)['one']
 
     def record(self, file, name):
-        """The fields of an account's or a group's line."""
+        """Returns the fields of an account's or a group's line."""
         return self.machine.run(f"grep '^{name}:' {file}").strip().split(':')
 
 
@@ -89,7 +89,7 @@ class CallAndSet(Modules):
         self.assertFalse(result['changed'])
         self.assertIn('login-shell changed in memory only', ' '.join(result['warnings']))
 
-    def test_failure_has_the_tools_words(self):
+    def test_failure_has_the_tools_message(self):
         result = self.play(task('mi_call', method='UserAdd', parameters={'UserName': 'anna'}))[0]
         self.assertEqual((result['outcome'], result['rc'], result['reason']), ('failed', 1, 'failed'))
         self.assertIn("useradd: user 'anna' already exists", result['msg'])
@@ -115,7 +115,7 @@ class CallAndSet(Modules):
         result = self.play(task('mi_set', node='--yes', property='clear-log', value='9'))[0]
         self.assertEqual(result['rc'], 4)
 
-    def test_passwords_show_nowhere(self):
+    def test_passwords_are_shown_nowhere(self):
         parameters = {'UserName': 'ben'}
         result = self.play(
             task('mi_call', method='UserSetPassword', parameters=parameters, password='xkcd-936-secret'),
@@ -126,7 +126,7 @@ class CallAndSet(Modules):
         self.assertNotIn('xkcd-936-secret', self.controller.output)
         self.assertNotIn('xkcd-936-secret', self.machine.log())
 
-    def test_secrets_belong_into_their_options(self):
+    def test_secrets_are_accepted_only_in_their_options(self):
         results = self.play(
             {**task('mi_call', method='UserSetPassword', parameters={'UserName': 'ben', 'Password': 'x'}),
              'ignore_errors': True},
@@ -146,7 +146,7 @@ class User(Modules):
         expires='2030-12-31',
     )
 
-    def test_made_adapted_and_deleted_once(self):
+    def test_adds_changes_and_deletes_only_once(self):
         adapted = dict(
             self.FULL, full_name='Jane Doe', home='/home/jane', shell='/bin/sh', password='!',
             password_max_days=90, expires='2031-01-02',
@@ -172,7 +172,7 @@ class User(Modules):
         self.assertEqual([ageing[1]] + ageing[3:], ['!', '1', '90', '9', '5', '22281', ''])
         self.assertEqual(self.machine.run('ls -d /home/jane').strip(), '/home/jane')
 
-    def test_options_that_are_not_given_are_left_alone(self):
+    def test_omitted_options_change_nothing(self):
         before = self.record('/etc/shadow', 'carl')
         result = self.play(task('mi_user', name='carl', password_max_days=80))[0]
         self.assertTrue(result['changed'])
@@ -180,20 +180,20 @@ class User(Modules):
         self.assertEqual(self.record('/etc/shadow', 'carl'), before)
         self.assertNotIn('warnings', result)
 
-    def test_never_erases_the_expiry_once(self):
+    def test_expires_never_removes_the_expiry_once(self):
         never = task('mi_user', name='anna', expires='never')
         first, second = self.play(never, never)
         self.assertEqual((first['changed'], second['changed']), (True, False))
         self.assertEqual(self.record('/etc/shadow', 'anna')[7], '')
 
-    def test_days_hold_in_every_time_zone(self):
+    def test_days_are_the_same_in_every_time_zone(self):
         for zone in ('Pacific/Auckland', 'America/Los_Angeles'):
             result = self.controller.play(
                 [{**task('mi_user', name='ben', expires='2011-01-26'), 'environment': {'TZ': zone}}]
             )['one'][0]
             self.assertFalse(result['changed'], zone)
 
-    def test_accounts_of_the_system_are_left_alone(self):
+    def test_system_accounts_are_refused(self):
         results = self.play(
             {**task('mi_user', name='daemon', state='absent'), 'ignore_errors': True},
             {**task('mi_user', name='daemon', shell='/bin/sh'), 'ignore_errors': True},
@@ -201,7 +201,7 @@ class User(Modules):
         self.assertEqual([result['reason'] for result in results], ['refused'] * 2)
         self.assertEqual(self.record('/etc/passwd', 'daemon')[6], '/usr/sbin/nologin')
 
-    def test_failure_says_what_was_changed_before_it(self):
+    def test_failure_says_whether_something_changed(self):
         result = self.play(task('mi_user', name='ben', shell='/bin/sh', full_name='a;b'))[0]
         self.assertEqual((result['outcome'], result['reason']), ('failed', 'refused'))
         self.assertFalse(result['changed'])
@@ -218,7 +218,7 @@ class User(Modules):
 
 
 class Group(Modules):
-    def test_made_adapted_and_deleted_once(self):
+    def test_adds_changes_and_deletes_only_once(self):
         steps = [
             dict(name='crew', members=['anna', 'ben']),
             dict(name='crew', members=['carl'], append=True),
@@ -238,11 +238,11 @@ class Group(Modules):
         members = [each['stdout'].rpartition(':')[2] for each in results[2::3]]
         self.assertEqual(members, ['anna,ben', 'anna,ben,carl', 'carl', 'carl', '', ''])
 
-    def test_members_by_their_primary_group_stay(self):
+    def test_primary_members_are_kept(self):
         result = self.play(task('mi_group', name='anna', members=[]))[0]
         self.assertEqual((result['outcome'], result['changed']), ('ok', False))
 
-    def test_groups_of_the_system_are_left_alone(self):
+    def test_system_groups_are_refused(self):
         result = self.play(task('mi_group', name='daemon', state='absent'))[0]
         self.assertEqual(result['reason'], 'refused')
 

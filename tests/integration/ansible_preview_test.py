@@ -1,4 +1,4 @@
-"""Check mode on machines where the change would fail: it fails there, too, and nothing is changed."""
+"""Check mode on machines where the change would fail: it fails too, and changes nothing."""
 
 import unittest
 
@@ -6,7 +6,7 @@ from support import environment
 from support.ansible import Controller, task
 
 # name, how the machine gets into that state, whether the account has a home directory, a part of the
-# real failure, and of the predicted one
+# real error message, and of the predicted one
 MACHINES = (
     (
         'ids-in-use',
@@ -57,7 +57,7 @@ class Preview(unittest.TestCase):
         cls.machines = {row[0]: cls.controller.start(row[0], row[1]) for row in MACHINES}
 
     def results(self, module, name, *options):
-        """The result of making an account of that name on each machine."""
+        """Adds an account of that name on each machine and returns the results."""
         accounts = {
             row[0]: dict(name=name, **(dict(home=f'/home/{name}') if row[2] else {}))
             for row in MACHINES

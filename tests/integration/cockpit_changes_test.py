@@ -1,4 +1,4 @@
-"""Changes from the page: what would happen, what happens then, and what is asked before."""
+"""Changes from the page: the preview, the change itself, and the questions before it."""
 
 import socket
 import subprocess
@@ -29,13 +29,13 @@ class ChangeTest(PageTest):
         self.browser.see('#preview', 'Commands that would run')
 
     def apply(self):
-        """Until the dialog is gone, which stays where something fails."""
+        """Applies the change and waits until the dialog closes; if something fails it stays open."""
         self.browser.click('#preview-apply')
         self.browser.gone('#preview')
         self.browser.see('#notice', 'Done: ')
 
     def changes(self):
-        """The calls that changed the machine itself."""
+        """Returns the calls that changed the machine itself."""
         return [call for call in cockpit.calls() if '--yes' in call and '--sandbox' not in call]
 
     def assert_unchanged(self, *names):
@@ -80,7 +80,7 @@ class Accounts(ChangeTest):
         self.browser.gone('#preview')
         self.assert_unchanged('passwd', 'shadow', 'group')
 
-    def test_a_further_edit_needs_a_further_preview(self):
+    def test_a_later_edit_needs_a_new_preview(self):
         self.start_shell_change()
         self.preview()
         self.fill(shell='/bin/dash')
@@ -97,7 +97,7 @@ class Accounts(ChangeTest):
         self.assertFalse(self.can_apply())
         self.assert_unchanged('passwd', 'shadow', 'group')
 
-    def test_mihost_killed_in_a_preview(self):
+    def test_cannot_apply_if_mihost_is_killed_in_the_preview(self):
         cockpit.install_mihost(cockpit.DIES_IN_PREVIEW)
         self.addCleanup(cockpit.install_mihost)
         self.start_shell_change()
@@ -106,7 +106,7 @@ class Accounts(ChangeTest):
         self.assertFalse(self.can_apply())
         self.assert_unchanged('passwd', 'shadow', 'group')
 
-    def test_changes_with_the_keyboard_alone(self):
+    def test_changes_with_only_the_keyboard(self):
         self.browser.open('users')
         self.browser.see('#users-table', 'carl')
         self.browser.tab_to('#users-table tr[data-name=carl] button')
@@ -114,7 +114,7 @@ class Accounts(ChangeTest):
         self.browser.see('#account', '/home/carl')
         self.browser.tab_to('#user-shell')
         self.browser.press(Keys.ENTER)
-        self.browser.wait('return document.activeElement.id === "field-shell"')  # where one begins to type
+        self.browser.wait('return document.activeElement.id === "field-shell"')  # the field that is typed into
         self.browser.press(Keys.CONTROL, 'a')
         self.browser.press('/bin/bash', Keys.ENTER)
         self.browser.see('#preview', 'Commands that would run')
@@ -164,7 +164,7 @@ class Accounts(ChangeTest):
         self.assertEqual(cockpit.accounts_file('group')['team'], 'team:x:1500:anna,ben,carl,dora')
         self.browser.see('#account', 'team')
 
-    def test_deletes_only_who_is_named(self):
+    def test_deletes_only_if_the_name_is_typed(self):
         self.open_account('carl')
         self.browser.click('#user-delete')
         self.preview()
@@ -187,7 +187,7 @@ class Password(ChangeTest):
         self.browser.click('#user-password')
         self.fill(**{'password': PASSWORD, 'password-again': again})
 
-    def test_is_set_and_seen_nowhere(self):
+    def test_is_set_and_shown_nowhere(self):
         self.fill_in()
         self.preview()
         self.assert_seen_nowhere()
@@ -198,7 +198,7 @@ class Password(ChangeTest):
         self.assertEqual(subprocess.run(check, capture_output=True, text=True).stdout, secret)
 
     def assert_seen_nowhere(self):
-        """As an argument of any process, in the page, its address or what it keeps."""
+        """Neither as an argument of a process nor in the page, its address or its storage."""
         processes = cockpit.read(cockpit.PROCESSES)
         self.assertIn('cockpit-bridge', processes)
         self.assertIn('user set-password -- carl', '\n'.join(cockpit.calls()))
@@ -209,13 +209,13 @@ class Password(ChangeTest):
         ):
             self.assertNotIn(PASSWORD, text)
 
-    def test_has_to_be_typed_twice(self):
+    def test_must_be_typed_twice(self):
         self.fill_in(again='something else')
         self.browser.click('#preview-run')
         self.browser.see('#preview', 'The passwords differ.')
         self.assertFalse(self.can_apply())
 
-    def test_cannot_be_read_in_its_field(self):
+    def test_is_hidden_in_its_fields(self):
         self.fill_in()
         for name in ('password', 'password-again'):
             self.assertEqual(self.browser.find(f'#field-{name}')[0].get_attribute('type'), 'password')
@@ -223,7 +223,7 @@ class Password(ChangeTest):
 
 class Machine(ChangeTest):
     def refuse_then_confirm(self):
-        """Another name than that of the machine, and then its own."""
+        """Types another name than that of the machine, and then its own."""
         self.preview()
         self.browser.see('#preview', 'Type the name of this machine')
         self.assertFalse(self.can_apply())
@@ -233,7 +233,7 @@ class Machine(ChangeTest):
         self.browser.type('#confirm-name', socket.gethostname())
         self.apply()
 
-    def test_clears_its_log_if_it_is_named(self):
+    def test_clears_its_log_only_if_its_name_is_typed(self):
         self.browser.open('log')
         self.browser.see('#log-lines', 'three')
         self.browser.click('#log-clear')
@@ -241,13 +241,13 @@ class Machine(ChangeTest):
         self.assertEqual(cockpit.read('/var/log/messages'), '')
         self.browser.not_seen('#log-lines', 'three')
 
-    def test_restarts_if_it_is_named(self):
+    def test_restarts_only_if_its_name_is_typed(self):
         self.browser.open('host')
         self.browser.click('#host-restart')
         self.refuse_then_confirm()
         self.assertEqual(self.changes(), ['--json --yes power restart'])
 
-    def test_halts_if_it_is_named(self):
+    def test_halts_only_if_its_name_is_typed(self):
         self.browser.open('host')
         self.browser.click('#host-halt')
         self.refuse_then_confirm()
@@ -281,7 +281,7 @@ class Groups(ChangeTest):
 class Unprivileged(ChangeTest):
     ACCOUNT = 'ben'
 
-    def test_can_change_nothing_and_is_told_why(self):
+    def test_can_change_nothing_and_sees_why(self):
         self.browser.open('users')
         self.browser.see('#state', 'Limited access', 'nothing can be previewed or changed')
         self.browser.button('carl', '#users-table')

@@ -1,4 +1,4 @@
-"""Texts of the machine that look like markup or scripts, and what the page's policy permits."""
+"""Texts of the machine that look like markup or scripts, and the page's content security policy."""
 
 import re
 import urllib.request
@@ -84,7 +84,7 @@ class Hostile(PageTest):
         self.assertNotRegex(shown, '[\x00-\x1f\x7f\u202e]')
         self.assert_only_text()
 
-    def test_text_that_is_typed_is_no_markup_either(self):
+    def test_typed_text_is_not_markup_either(self):
         self.browser.type('#tree-search', MARKUP)
         self.browser.see('#tree', 'anna')
         self.browser.not_seen('#tree', 'carl')
@@ -92,7 +92,7 @@ class Hostile(PageTest):
 
 
 class Policy(PageTest):
-    def test_permits_nothing_inline_and_no_other_place(self):
+    def test_forbids_inline_code_and_other_origins(self):
         with urllib.request.urlopen(f'{cockpit.ADDRESS}/cockpit/@localhost/mihost/index.html') as answer:
             policy = answer.headers['Content-Security-Policy']
             content = answer.read().decode()
@@ -103,8 +103,8 @@ class Policy(PageTest):
         self.assertEqual(rules['script-src'].split()[0], "'self'")
         self.assertEqual(re.findall(r'<script>|<style|style=|\son\w+=|https?:', content), [])
 
-    def test_refuses_what_is_inline(self):
-        """The browser heeds it, so that the other tests can see a violation."""
+    def test_browser_refuses_inline_code(self):
+        """So the other tests would see a violation."""
         self.browser.open()
         self.browser.see('#tree', 'anna')
         self.browser.run(

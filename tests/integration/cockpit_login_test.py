@@ -1,4 +1,4 @@
-"""The page as those find it who log in to Cockpit: real accounts and passwords, the menu, the frame."""
+"""The page after a login to Cockpit: real accounts and passwords, the menu, the frame."""
 
 import shutil
 import subprocess
@@ -45,7 +45,7 @@ class Login(cockpit.PageTest):
         self.browser.shown('#preview-apply:enabled')
         self.browser.picture('cockpit')  # see script/cockpit-picture
 
-    def test_who_may_read_little_is_told_so(self):
+    def test_limited_access_is_shown(self):
         self.log_in('anna')
         self.browser.see('#tree', 'anna')
         self.browser.see('#state', 'Limited access')

@@ -1,9 +1,9 @@
-"""Each view in light and dark: what axe-core finds, how narrow it may be, pictures of it."""
+"""Each view in light and dark: what axe-core finds, at which widths it fits, pictures of it."""
 
 from support import cockpit
 from support.cockpit import PageTest
 
-# By name the path in the page's address and what is there once the view is complete.
+# Keyed by name: the path in the page's address, and an element that exists once the view is complete.
 VIEWS = {
     'tree': ('tree/user%3Acarl', '#detail [data-property=login-shell]'),
     'users': ('users', '#users-table tr[data-name=carl]'),
@@ -16,7 +16,7 @@ VIEWS = {
     'host': ('host', '.mi-chart polyline'),
 }
 
-# Controls that are cut off: outside of the page, and in nothing that scrolls sideways.
+# Returns the controls that are cut off: outside the page and in nothing that scrolls sideways.
 CUT_OFF = '''
 const scrolls = element => element && element !== document.body &&
     (/auto|scroll/.test(getComputedStyle(element).overflowX) || scrolls(element.parentElement));
@@ -41,7 +41,7 @@ class Looks(PageTest):
         self.browser.shown(complete)
 
     def open_dialog(self, button, **fields):
-        """What would happen if the account of the view were changed."""
+        """Opens the preview of a change of the view's account."""
         self.view('account')
         self.browser.click(button)
         for name, text in fields.items():
@@ -57,7 +57,7 @@ class Looks(PageTest):
         self.browser.picture(name)
         self.assertEqual(self.browser.axe(), [])
 
-    def nothing_serious_found(self, scheme):
+    def assert_nothing_serious_found(self, scheme):
         self.browser.scheme(scheme)
         for name in VIEWS:
             with self.subTest(name):
@@ -70,11 +70,11 @@ class Looks(PageTest):
         self.assert_nothing_found(f'delete-{scheme}')
         self.close_dialog()
 
-    def test_nothing_serious_found_in_light(self):
-        self.nothing_serious_found('light')
+    def test_axe_finds_nothing_serious_in_light(self):
+        self.assert_nothing_serious_found('light')
 
-    def test_nothing_serious_found_in_dark(self):
-        self.nothing_serious_found('dark')
+    def test_axe_finds_nothing_serious_in_dark(self):
+        self.assert_nothing_serious_found('dark')
 
     def assert_fits_every_width(self, name):
         for width in (2000, 800, 400):
@@ -92,7 +92,7 @@ class Looks(PageTest):
         self.assert_fits_every_width('delete')
         self.close_dialog()
 
-    def test_shows_the_chosen_tab_where_there_is_little_room(self):
+    def test_shows_the_chosen_tab_in_a_narrow_window(self):
         self.browser.size(400, 900)
         for name in ('doctor', 'tree'):
             self.view(name)
@@ -100,7 +100,7 @@ class Looks(PageTest):
             self.assertGreaterEqual(tab['left'], 0, name)
             self.assertLessEqual(tab['right'], 400, name)
 
-    def test_keeps_to_its_policy(self):
+    def test_violates_no_policy(self):
         for name in VIEWS:
             self.view(name)
         self.assertEqual(self.browser.refused(), [])

@@ -24,7 +24,7 @@ class Many(PageTest):
                 log.write(cockpit.log_lines(f'line {number}' for number in range(first, first + 1000)))
 
     def few(self, css):
-        """Far fewer elements than there are things to show."""
+        """Expects far fewer elements than there are users or lines."""
         self.assertLess(len(self.browser.find(css)), 200)
 
     def scroll(self, css, share):
@@ -32,7 +32,7 @@ class Many(PageTest):
             'const e = document.querySelector(arguments[0]); e.scrollTop = e.scrollHeight * arguments[1]', css, share,
         )
 
-    def test_tree_has_the_rows_in_sight_only(self):
+    def test_tree_has_only_the_visible_rows(self):
         self.browser.open()
         self.browser.see('#tree', 'user00000')
         self.few('#tree [role=treeitem]')
@@ -43,7 +43,7 @@ class Many(PageTest):
         self.browser.see('#tree', 'Number 7777')
         self.browser.not_seen('#tree', 'user04990')
 
-    def test_users_have_the_rows_in_sight_only(self):
+    def test_users_have_only_the_visible_rows(self):
         self.browser.open('users')
         self.browser.see('#users-table', 'user00000')
         self.few('#users-table tr')

@@ -1,4 +1,4 @@
-"""What the page shows when mihost is missing, too old, slow, killed or not what it should be."""
+"""What the page shows when mihost is missing, too old, slow, killed or prints something else."""
 
 import os
 
@@ -36,7 +36,7 @@ class States(PageTest):
         self.browser.see('#state', *texts)
 
     def try_again(self):
-        """With a mihost that works."""
+        """Installs a mihost that works and tries again."""
         cockpit.install_mihost()
         self.browser.button('Try again', '#state')
         self.browser.see('#tree', 'anna')
@@ -53,7 +53,7 @@ class States(PageTest):
         self.browser.open()
         self.state('too-old', 'too old', 'mihost 0.0.9')
 
-    def test_killed_in_the_middle(self):
+    def test_killed_while_the_page_is_read(self):
         cockpit.install_mihost(KILLED)
         self.browser.open()
         self.state('killed', 'was stopped before it had answered')
@@ -67,7 +67,7 @@ class States(PageTest):
         cockpit.kill_mihost('watch')
         self.browser.see('body', 'was stopped')
 
-    def test_gives_something_else(self):
+    def test_prints_something_else(self):
         cockpit.install_mihost(GARBLED)
         self.browser.open()
         self.state('garbled', 'cannot read')

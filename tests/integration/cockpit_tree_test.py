@@ -1,4 +1,4 @@
-"""The tree in the page: every node, search, kinds, properties and what changes meanwhile."""
+"""The tree in the page: every node, search, kinds, properties, and values that change."""
 
 import csv
 import io
@@ -9,7 +9,7 @@ from support.cockpit import Keys, PageTest
 
 
 def rows(*arguments):
-    """The rows that mihost itself prints."""
+    """Returns the rows that mihost itself prints."""
     done = subprocess.run(
         [environment.MIHOST, '-o', 'csv', *arguments], check=True, capture_output=True, text=True
     )
@@ -48,7 +48,7 @@ class Tree(PageTest):
         self.listed()
         self.browser.see('#panel-tree', 'No node matches.')
 
-    def test_kind_keeps_the_nodes_of_one(self):
+    def test_kind_filter_keeps_the_nodes_of_one_kind(self):
         self.browser.click('#kind-filter option[value=group]')
         cockpit.until(lambda: 'user:anna' not in self.addresses(), 'users stay')
         groups = [each for each in self.addresses() if each.startswith('group:')]
@@ -82,7 +82,7 @@ class Tree(PageTest):
                 process.wait()
         self.assertTrue(row.is_displayed())  # the same element
 
-    def test_keyboard_goes_through_the_nodes(self):
+    def test_keyboard_moves_through_the_nodes(self):
         self.browser.tab_to('#tree')
         self.browser.press(Keys.HOME, Keys.ARROW_DOWN, Keys.ARROW_DOWN)
         self.browser.press(Keys.ENTER)

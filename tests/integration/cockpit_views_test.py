@@ -9,7 +9,7 @@ from support.cockpit import PageTest
 
 class Views(PageTest):
     def names(self, table):
-        """The names in the first column, from top to bottom."""
+        """Returns the names in the first column, from top to bottom."""
         return self.browser.attributes(f'{table} tr[data-name]', 'data-name')
 
     def listed(self, table, *names):
@@ -53,7 +53,7 @@ class Views(PageTest):
         self.browser.button('All users', '#account')
         self.listed('#users-table', 'anna', 'ben', 'carl', 'root')
 
-    def test_account_with_a_group_that_is_gone_has_its_id(self):
+    def test_account_has_the_id_of_a_missing_group(self):
         self.browser.open('users')
         self.browser.button('carl', '#users-table')
         self.browser.see('#account .mi-names', '100', 'primary', 'team')
@@ -120,7 +120,7 @@ class Log(PageTest):
         self.browser.see('#log-lines', 'four')
         self.assertEqual(self.shown(), ['one', 'two', 'three', 'four'])
 
-    def test_follows_only_while_asked_to(self):
+    def test_follows_only_while_switched_on(self):
         self.browser.click('#panel-log .pf-v6-c-switch')
         self.browser.wait('return document.querySelector("#panel-log [aria-busy]")?.ariaBusy !== "true"')
         cockpit.until(lambda: self.shown() == ['one', 'two', 'three'], 'the lines are not read again')
@@ -129,7 +129,7 @@ class Log(PageTest):
         self.browser.click('#panel-log .pf-v6-c-switch')
         self.browser.see('#log-lines', 'four')
 
-    def test_filter_holds_for_new_lines(self):
+    def test_filter_applies_to_new_lines(self):
         self.browser.type('#log-filter', 'three')
         self.add('four', 'three-and-a-half')
         self.browser.see('#log-lines', 'three-and-a-half')

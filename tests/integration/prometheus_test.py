@@ -52,7 +52,7 @@ def prepare_machine():
 
 
 def get(port, path, method='GET'):
-    """Status, content type and body of an answer."""
+    """Returns the status, content type and body of the answer."""
     request = urllib.request.Request(f'http://127.0.0.1:{port}{path}', method=method)
     try:
         with urllib.request.urlopen(request, timeout=30) as answer:
@@ -63,7 +63,7 @@ def get(port, path, method='GET'):
 
 
 def until(condition, what):
-    """Waits until the condition is true. Only what never comes ends by the clock."""
+    """Waits until the condition is true and returns it; fails only after two minutes."""
     deadline = time.monotonic() + 120
     while True:
         try:
@@ -78,7 +78,7 @@ def until(condition, what):
 
 
 def query(expression):
-    """The samples that an expression gives in Prometheus."""
+    """Returns the samples of an expression in Prometheus."""
     path = '/api/v1/query?' + urllib.parse.urlencode({'query': expression})
     answer = json.loads(get(PROMETHEUS_PORT, path)[2])
     if answer['status'] != 'success':
@@ -91,7 +91,7 @@ def mihost(*arguments):
 
 
 def series(text):
-    """Each series of a metrics text with its value."""
+    """Returns the series of a metrics text, each with its value."""
     lines = [line.rpartition(' ') for line in text.splitlines() if not line.startswith('#')]
     return {name: float(value) for name, _, value in lines}
 
@@ -108,7 +108,7 @@ class Daemons(unittest.TestCase):
 
     @classmethod
     def start_exporter(cls, port, *command):
-        """By systemd's own activation of a socket."""
+        """Starts the exporter as systemd does, with a socket."""
         return cls.start('systemd-socket-activate', '-l', f'127.0.0.1:{port}', EXPORTER, *command)
 
 
@@ -119,7 +119,7 @@ class Exporter(Daemons):
 
     def tearDown(self):
         self.process.terminate()
-        self.assertEqual(self.process.wait(), 0)  # it ends when systemd asks
+        self.assertEqual(self.process.wait(), 0)  # it ends when systemd stops it
 
     def test_answers_with_metrics(self):
         status, kind, body = get(EXPORTER_PORT, '/metrics')
@@ -158,7 +158,7 @@ class ExporterAlone(Daemons):
         self.assertEqual(subprocess.run([EXPORTER], capture_output=True).returncode, 2)
 
     def test_needs_no_more_than_the_units_privileges(self):
-        """As the service has them: not root, and one capability."""
+        """Runs it as the service does: not as root, with one capability."""
         read = '+dac_read_search'
         done = subprocess.run(
             ['setpriv', '--reuid=65534', '--regid=65534', '--clear-groups', '--no-new-privs',
@@ -176,7 +176,7 @@ class Units(unittest.TestCase):
     UNITS = ('mihost-exporter.service', 'mihost-exporter.socket', 'mihost-metrics.service', 'mihost-metrics.timer')
 
     def setUp(self):
-        """The units with the programs of this build."""
+        """Writes the units, with the programs of this build."""
         self.folder = tempfile.mkdtemp()
         self.addCleanup(shutil.rmtree, self.folder)
         values = {
@@ -195,7 +195,7 @@ class Units(unittest.TestCase):
     def path(self, unit):
         return os.path.join(self.folder, unit)
 
-    def test_systemd_takes_them(self):
+    def test_systemd_accepts_them(self):
         done = subprocess.run(
             ['systemd-analyze', 'verify', '--man=no', *map(self.path, self.UNITS)], capture_output=True, text=True
         )
@@ -239,7 +239,7 @@ class Scraped(Daemons):
         self.assertEqual(len(samples), 1, expression)
         return float(samples[0]['value'][1])
 
-    def test_both_ways_have_the_trees_values(self):
+    def test_both_sources_have_the_trees_values(self):
         system = {
             entry.get('name', name): entry['value']
             for name, entry in json.loads(mihost('--json', 'get', 'os'))['properties'].items()
@@ -249,7 +249,7 @@ class Scraped(Daemons):
             with self.subTest(job):
                 label = f'{{job="{job}"}}'
                 self.assertEqual(self.value(f'mi_memory_size_bytes{label}'), system['physical-memory-size'] * 1024)
-                # Each run derives it from the time of day and the uptime, of whole seconds.
+                # Each run computes it from the time of day and the uptime, both in whole seconds.
                 self.assertAlmostEqual(self.value(f'mi_boot_time_seconds{label}'), system['last-boot-time'], delta=1)
                 self.assertEqual(self.value(f'mi_users{label}'), users)
                 self.assertEqual(self.value(f'mi_groups{label}'), 4)
@@ -257,7 +257,7 @@ class Scraped(Daemons):
                 self.assertEqual(self.value(f'mi_accounts_expired{label}'), 3)
                 self.assertEqual(self.value(f'mi_driver_info{{job="{job}",driver="two",version="1.two"}}'), 1)
 
-    def test_both_ways_have_every_series(self):
+    def test_both_sources_have_every_series(self):
         expected = len(series(mihost('metrics')))
         self.assertEqual(self.value('count({__name__=~"mi_.*", job="direct"})'), expected)
         with_accounts = len(series(mihost('metrics', '--accounts')))

@@ -2,7 +2,7 @@ import assert from "node:assert/strict";
 import { test } from "node:test";
 import { countNames, dayText, daysText, expiryText, factText } from "../src/account-rows.js";
 
-test("expiryText takes the last day of time for never", () => {
+test("expiryText shows the last possible day as never", () => {
     assert.equal(expiryText("2038-01-19 00:00:00", "never"), "never");
     assert.equal(expiryText("2030-02-01 00:00:00", "never"), "2030-02-01");
     assert.equal(expiryText("-", "never"), "-");
@@ -12,7 +12,7 @@ test("dayText leaves the time of day out", () => {
     assert.equal(dayText("2030-02-01 00:00:00"), "2030-02-01");
 });
 
-test("daysText takes 99999 days for no end", () => {
+test("daysText shows 99999 days as no limit", () => {
     assert.equal(daysText("99999", "for ever"), "for ever");
     assert.equal(daysText("90", "for ever"), "90");
     assert.equal(daysText("-", "for ever"), "-");
@@ -24,7 +24,7 @@ test("countNames counts members", () => {
 
 const words = { yes: "yes", no: "no", unknown: "unknown" };
 
-test("factText has a word for what is not there", () => {
+test("factText has a word for missing values", () => {
     assert.equal(factText({ day: "2030-01-01" }, "day", "never", words), "2030-01-01");
     assert.equal(factText({ day: null }, "day", "never", words), "never");
     assert.equal(factText({ days: 0 }, "days", "none", words), 0);

@@ -1,4 +1,4 @@
-// Runs all tests in one process; one for each file takes many times as long.
+// Runs all tests in one process; one process for each file takes much longer.
 import { readdirSync } from "node:fs";
 
 for (const file of readdirSync(new URL(".", import.meta.url)).sort())

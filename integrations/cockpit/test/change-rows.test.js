@@ -2,14 +2,14 @@ import assert from "node:assert/strict";
 import { test } from "node:test";
 import { differenceOf, sortChanges } from "../src/change-rows.js";
 
-test("sortChanges sets the account tools' backups apart", () => {
+test("sortChanges separates the account tools' backups", () => {
     const files = ["/etc/passwd", "/etc/passwd-", "/home/x-", "/etc/a-"].map(file => ({ file }));
     const sorted = sortChanges(files);
     assert.deepEqual(sorted.files.map(change => change.file), ["/etc/passwd", "/home/x-", "/etc/a-"]);
     assert.deepEqual(sorted.backups.map(change => change.file), ["/etc/passwd-"]);
 });
 
-test("differenceOf shows attributes, then lines that go and come", () => {
+test("differenceOf shows attributes, then removed and added lines", () => {
     assert.deepEqual(differenceOf({
         removed: ["a"], added: ["b", "c"],
         mode: { before: "0644", after: "0600" }, owner: { before: null, after: "0:0" },

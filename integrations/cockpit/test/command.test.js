@@ -22,7 +22,7 @@ test("commandOf passes a password on standard input only", () => {
     }
 });
 
-test("commandOf sets no password where none is given", () => {
+test("commandOf sets no password if none is given", () => {
     assert.deepEqual(commandOf(tasks.userAdd, { user: "jdoe", password: "" }),
         { words: ["user", "add", "--", "jdoe"], input: "" });
 });
@@ -42,11 +42,11 @@ test("commandOf names the group before its member", () => {
         ["group", "add-member", "--", "crew", "jdoe"]);
 });
 
-test("commandOf has only its words for a task without fields", () => {
+test("commandOf has only the task's words if it has no fields", () => {
     assert.deepEqual(commandOf(tasks.restart, {}), { words: ["power", "restart"], input: "" });
 });
 
-test("faultsOf wants required values and equal passwords", () => {
+test("faultsOf requires necessary values and equal passwords", () => {
     const values = { "user": "", "max-days": "9o", "password": "a", "password-again": "b" };
     assert.deepEqual(faultsOf(tasks.userAdd, values), [
         { name: "user", reason: "missing" },
@@ -56,7 +56,7 @@ test("faultsOf wants required values and equal passwords", () => {
     assert.deepEqual(faultsOf(tasks.userAdd, { user: "jdoe" }), []);
 });
 
-test("faultsOf wants a password that is set to be there", () => {
+test("faultsOf requires a password if one is to be set", () => {
     assert.deepEqual(faultsOf(tasks.userSetPassword, { user: "jdoe", password: "" }),
         [{ name: "password", reason: "missing" }]);
 });
@@ -66,7 +66,7 @@ test("faultsOf refuses a line end", () => {
         [{ name: "full-name", reason: "line" }]);
 });
 
-test("every dangerous task wants a typed name", () => {
+test("every dangerous task requires a typed name", () => {
     const dangerous = Object.values(tasks).filter(task => /delete|power|clear-log/.test(task.words.join(" ")));
     assert.equal(dangerous.length, 5);
     for (const task of dangerous) {

@@ -19,7 +19,7 @@ test("parseCsv has no rows for headings alone or nothing", () => {
     assert.deepEqual(parseCsv(""), []);
 });
 
-test("parseCsv leaves markup as it is", () => {
+test("parseCsv leaves markup unchanged", () => {
     assert.deepEqual(parseCsv("a\n<b>x</b>\n"), [{ a: "<b>x</b>" }]);
 });
 

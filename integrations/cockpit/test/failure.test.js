@@ -14,7 +14,7 @@ const cases = [
 ];
 
 for (const [what, exception, kind] of cases)
-    test(`failureOf takes ${what} for ${kind}`, () => {
+    test(`failureOf treats ${what} as ${kind}`, () => {
         assert.equal(failureOf({ exit_status: null, exit_signal: null, problem: null, ...exception }).kind, kind);
     });
 

@@ -1,4 +1,4 @@
-// A cockpit library whose processes the tests drive. Import it before the modules under test.
+// Stands in for the cockpit library; the tests control its processes. Import it before the tested modules.
 export const spawned = []; // each with its words, options, input, and ways to end it
 
 function process(words, options) {

@@ -10,7 +10,7 @@ test("logLines has the oldest first, without asterisks", () => {
     ]), [{ time: null, message: "" }, { time: null, message: "no stamp" }, { time: 2, message: "a * b" }]);
 });
 
-test("lineMatches wants every word in any case", () => {
+test("lineMatches requires every word in any case", () => {
     assert.ok(lineMatches("sshd: Failed password", "failed SSHD"));
     assert.ok(!lineMatches("sshd: Failed password", "failed cron"));
     assert.ok(lineMatches("anything", ""));

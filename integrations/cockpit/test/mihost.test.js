@@ -11,14 +11,14 @@ test("mihost runs without a shell, with superuser try", () => {
     assert.equal(last().options.superuser, "try");
 });
 
-test("rows answers with the rows that mihost prints", async () => {
+test("rows returns the rows that mihost prints", async () => {
     const { answer } = mihost.rows(["tree"]);
     last().succeed("id,kind\n1,mi\n");
     assert.deepEqual(last().words, ["mihost", "-o", "csv", "tree"]);
     assert.deepEqual(await answer, [{ id: "1", kind: "mi" }]);
 });
 
-test("json takes exit statuses that the caller accepts", async () => {
+test("json accepts exit statuses that the caller allows", async () => {
     const { answer } = mihost.json(["doctor"], { accepted: [0, 1] });
     last().fail({ exit_status: 1, message: "" }, "[1]");
     assert.deepEqual(await answer, [1]);
@@ -75,7 +75,7 @@ test("change passes its input to mihost's standard input", () => {
     assert.ok(!last().words.join(" ").includes("Geheim"));
 });
 
-test("change answers a refusal by its message", async () => {
+test("change returns the message of a refusal", async () => {
     const { answer } = mihost.change(["user", "add", "--", "x;y"], { preview: true });
     last().fail({ exit_status: 2, message: "mihost: user add: NAME contains ';'" });
     assert.deepEqual(await answer, {
@@ -83,7 +83,7 @@ test("change answers a refusal by its message", async () => {
     });
 });
 
-test("change answers a failure with mihost's document", async () => {
+test("change returns mihost's document of a failure", async () => {
     const { answer } = mihost.change(["group", "add", "--", "x"], { preview: true });
     last().fail({ exit_status: 1, message: "mihost: ..." }, "{\"status\":1,\"error\":\"no\",\"changes\":[]}");
     assert.deepEqual(await answer, { exit: 1, status: 1, error: "no", changes: [] });

@@ -6,7 +6,7 @@ const source = new URL("../src/", import.meta.url);
 const modules = readdirSync(source, { recursive: true }).map(String).filter(name => name.endsWith(".js"));
 const texts = new Map(modules.map(name => [name, readFileSync(new URL(name, source), "utf8")]));
 
-test("no module makes markup of text, or code of it", () => {
+test("no module turns text into markup or code", () => {
     assert.ok(texts.size > 20);
     const traps = /innerHTML|outerHTML|insertAdjacentHTML|document\.write|DOMParser|\beval\(|new Function/;
     for (const [name, text] of texts)

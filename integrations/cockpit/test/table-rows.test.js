@@ -11,13 +11,13 @@ const rows = [
 const columns = [{ text: row => row.name }, { text: row => row.uid }];
 const names = list => list.map(row => row.name);
 
-test("filterRows wants every word, in any column and case", () => {
+test("filterRows requires every word, in any column and case", () => {
     assert.deepEqual(names(filterRows(rows, columns, "9 CARL")), ["carl"]);
     assert.deepEqual(names(filterRows(rows, columns, "zoe")), []);
     assert.deepEqual(filterRows(rows, columns, "  "), rows);
 });
 
-test("filterRows never joins two columns to a match", () => {
+test("filterRows never matches across two columns", () => {
     assert.deepEqual(filterRows(rows, columns, "carl9"), []);
 });
 
@@ -30,7 +30,7 @@ test("sortRows keeps the order of equal rows when descending", () => {
     assert.deepEqual(names(sortRows(rows, { property: "uid", order: "number" }, true)).slice(2), ["carl", "dora"]);
 });
 
-test("sortRows sorts text, and leaves the rows themselves alone", () => {
+test("sortRows sorts text without changing its input", () => {
     const before = names(rows);
     assert.deepEqual(names(sortRows(rows, { property: "name" }, true)), ["dora", "carl", "ben", "anna"]);
     assert.deepEqual(names(rows), before);

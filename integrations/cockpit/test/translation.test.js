@@ -13,7 +13,7 @@ function located(script) {
     return texts;
 }
 
-test("compile makes a script that hands the texts to Cockpit", () => {
+test("compile makes a script that passes the texts to Cockpit", () => {
     const texts = located(compile(`${header}msgid "Apply"\nmsgstr "Übernehmen \\"jetzt\\""\n`));
     assert.deepEqual(texts, {
         "": { "language": "de", "language-direction": "ltr" },
@@ -26,7 +26,7 @@ test("compile leaves out what is not translated, or only guessed", () => {
     assert.deepEqual(Object.keys(texts), [""]);
 });
 
-test("compile refuses a translation into no language", () => {
+test("compile refuses a translation without a language", () => {
     assert.throws(() => compile("msgid \"Apply\"\nmsgstr \"x\"\n"), /language/);
 });
 

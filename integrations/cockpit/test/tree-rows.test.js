@@ -14,24 +14,24 @@ const { nodes, roots } = buildTree(rows);
 const shown = options => visibleRows(roots, { expanded: new Set(), ...options })
     .map(({ node, level, open }) => `${level} ${node.address} ${open}`);
 
-test("buildTree hangs nodes below their parents", () => {
+test("buildTree puts nodes below their parents", () => {
     assert.deepEqual(roots.map(node => node.id), ["1"]);
     assert.deepEqual(nodes.get("2").children.map(node => node.id), ["3", "4", "5"]);
 });
 
-test("visibleRows shows what expanded nodes hold", () => {
+test("visibleRows shows the children of expanded nodes", () => {
     assert.deepEqual(shown({}), ["1 mi false"]);
     assert.deepEqual(shown({ expanded: new Set(["mi", "os"]) }),
         ["1 mi true", "2 os true", "3 user:anna null", "3 group:anna null", "3 log false"]);
 });
 
-test("visibleRows shows matches of a search and the way there", () => {
+test("visibleRows shows matches of a search and their parents", () => {
     assert.deepEqual(shown({ search: " ANNA b " }), []);
     assert.deepEqual(shown({ search: "first" }), ["1 mi true", "2 os true", "3 log true", "4 log:1 null"]);
     assert.deepEqual(shown({ search: "<b>" }), ["1 mi true", "2 os true", "3 user:anna null"]);
 });
 
-test("visibleRows shows one kind only, and the way there", () => {
+test("visibleRows shows only one kind and its parents", () => {
     assert.deepEqual(shown({ kind: "group" }), ["1 mi true", "2 os true", "3 group:anna null"]);
     assert.deepEqual(shown({ kind: "group", search: "first" }), []);
 });
@@ -41,12 +41,12 @@ test("visibleRows says where a row is among its siblings", () => {
     assert.deepEqual([row.position, row.siblings], [1, 3]);
 });
 
-test("nameOf leaves the kind out, and nothing more", () => {
+test("nameOf leaves out only the kind", () => {
     assert.equal(nameOf({ address: "user:a:b" }), "a:b");
     assert.equal(nameOf({ address: "os" }), "os");
 });
 
-test("kindOf tells the log from its entries", () => {
+test("kindOf distinguishes the log from its entries", () => {
     assert.deepEqual(["os", "user:a:b", "log", "log:1"].map(kindOf), ["os", "user", "log", "log-entry"]);
 });
 

@@ -3,7 +3,7 @@ import { readFileSync } from "node:fs";
 import { test } from "node:test";
 import { isRecent, oldestMihost } from "../src/version.js";
 
-test("isRecent takes the version itself and newer ones", () => {
+test("isRecent accepts the version itself and newer ones", () => {
     for (const version of ["1.2.3", "1.2.4", "1.3.0", "2.0.0", "1.10.0"])
         assert.ok(isRecent(`mihost ${version}\n`, "1.2.3"), version);
 });

@@ -4,7 +4,7 @@ import { windowOf } from "../src/virtual.js";
 
 const view = { height: 400, rowHeight: 40, count: 10000, margin: 2 };
 
-test("windowOf has the rows in sight and a margin", () => {
+test("windowOf has the visible rows and a margin", () => {
     assert.deepEqual(windowOf({ ...view, scrollTop: 0 }), { first: 0, last: 12 });
     assert.deepEqual(windowOf({ ...view, scrollTop: 4010 }), { first: 98, last: 113 });
 });

@@ -1,4 +1,4 @@
-"""Runs the real Ansible, with nothing of this machine's configuration and nothing left on it."""
+"""Runs the real Ansible without this machine's configuration, and leaves nothing on it."""
 
 import json
 import os
@@ -12,7 +12,7 @@ CALLBACKS = os.path.join(os.path.dirname(__file__), 'callbacks')
 
 
 def task(module, **options):
-    """A task of a play, with a module of the collection."""
+    """Returns a task of a play, with a module of the collection."""
     return {f'mi.host.{module}': options}
 
 
@@ -63,14 +63,14 @@ class Controller:
         return target
 
     def run(self, *command, **variables):
-        """A program of Ansible's, to its end."""
+        """Runs a program of Ansible's to its end."""
         return subprocess.run(
             command, cwd=self.folder, env={**self.environment, **variables},
             stdin=subprocess.DEVNULL, capture_output=True, text=True,
         )
 
     def play(self, tasks, *options):
-        """The results of the tasks, keyed by host and in the order of the tasks."""
+        """Returns the results of the tasks, keyed by host and in the order of the tasks."""
         book = [{'hosts': 'all', 'gather_facts': False, 'tasks': tasks}]
         with open(self.path('play.yml'), 'w') as file:
             json.dump(book, file)  # which is YAML, too

@@ -47,14 +47,14 @@ MIHOST = '/usr/local/bin/mihost'
 CALLS = '/run/mihost-calls'
 PROCESSES = '/run/mihost-processes'
 
-# What Cockpit starts instead of the program itself, so that each call and what every process of the
-# machine was called with at that time is known afterwards.
+# Cockpit starts this instead of the program. It records each call, and the arguments of every process of
+# the machine at that time.
 RECORDER = f'''#!/bin/sh
 echo "$$ $*" >>{CALLS}
 cat /proc/[0-9]*/cmdline 2>/dev/null | tr '\\0' ' ' >>{PROCESSES}
 exec {environment.MIHOST} "$@"
 '''
-# Dies of a preview, and does the rest.
+# Is killed in a preview, and does everything else.
 DIES_IN_PREVIEW = RECORDER.replace('exec', '[ "$1" != --sandbox ] || kill -9 $$\nexec')
 
 CHROMIUM = (
@@ -63,7 +63,7 @@ CHROMIUM = (
     '--disable-dev-shm-usage', '--hide-scrollbars', '--force-color-profile=srgb', '--lang=en',
 )
 
-# Notes what the page's content security policy refuses.
+# Records what the page's content security policy refuses.
 WATCH_POLICY = '''
 window.refused = [];
 document.addEventListener('securitypolicyviolation', event => {
@@ -90,7 +90,7 @@ def read(path):
 
 
 def install_mihost(script=RECORDER):
-    """Puts a program where the page finds mihost."""
+    """Puts a program where the page looks for mihost."""
     write(MIHOST, script, 0o755)
 
 
@@ -126,7 +126,7 @@ def log_lines(messages):
 
 
 def accounts_file(name):
-    """The lines of an account file, by the name that they begin with."""
+    """Returns the lines of an account file, keyed by the name that they begin with."""
     return {line.split(':')[0]: line for line in read(f'/etc/{name}').splitlines()}
 
 
@@ -136,23 +136,23 @@ def forget_calls():
 
 
 def calls():
-    """The arguments that mihost was called with since the page was opened."""
+    """Returns the arguments of each call of mihost since the page was opened."""
     return [line.partition(' ')[2] for line in read(CALLS).splitlines()]
 
 
 def running(arguments):
-    """The ids of those mihosts with such arguments that still run."""
+    """Returns the process ids of the running mihosts with such arguments."""
     called = [line.split()[0] for line in read(CALLS).splitlines() if arguments in line]
     return [int(process) for process in called if os.path.exists(f'/proc/{process}')]
 
 
 def kill_mihost(arguments):
-    """Kills the mihost with such arguments, once it runs."""
+    """Kills the mihost with such arguments, as soon as it runs."""
     os.kill(until(lambda: running(arguments), f'no mihost {arguments}')[-1], signal.SIGKILL)
 
 
 def until(condition, what, seconds=60):
-    """Waits until the condition is true. Only what never comes ends by the clock."""
+    """Waits until the condition is true and returns it; gives up after the limit."""
     deadline = time.monotonic() + seconds
     while True:
         result = condition()
@@ -169,7 +169,7 @@ def listening():
 
 
 def session_of(account):
-    """The command of a session of an account, which nobody has to log in for."""
+    """Returns the command that starts a session of an account without a login."""
     if account == 'root':
         return '/usr/bin/cockpit-bridge'
     identity = pwd.getpwnam(account)
@@ -182,7 +182,7 @@ exec setpriv --reuid={identity.pw_uid} --regid={identity.pw_gid} --clear-groups 
 
 
 class Cockpit:
-    """A running cockpit-ws, to log in at or with the session of an account."""
+    """A running cockpit-ws, to log in to or with the session of an account."""
 
     def __init__(self, account=None):
         session = [f'--local-session={session_of(account)}'] if account else []
@@ -199,7 +199,7 @@ class Cockpit:
 
 
 class Browser:
-    """A Chromium with a profile of its own, and the page in it."""
+    """A Chromium with its own profile, and the page in it."""
 
     def __init__(self):
         self.profile = tempfile.TemporaryDirectory(prefix='mi-chromium-', ignore_cleanup_errors=True)
@@ -218,20 +218,20 @@ class Browser:
         self.profile.cleanup()
 
     def size(self, width, height):
-        """The size of the page itself, in CSS pixels."""
+        """Sets the size of the page itself, in CSS pixels."""
         self.driver.execute_cdp_cmd('Emulation.setDeviceMetricsOverride', {
             'width': width, 'height': height, 'deviceScaleFactor': 1, 'mobile': False,
         })
 
     def scheme(self, name):
-        """Light or dark, as the desktop would have it; nothing moves, so that what is seen is final."""
+        """Sets the colour scheme, light or dark; animations are off, so that a picture is final."""
         self.driver.execute_cdp_cmd('Emulation.setEmulatedMedia', {'features': [
             {'name': 'prefers-color-scheme', 'value': name},
             {'name': 'prefers-reduced-motion', 'value': 'reduce'},
         ]})
 
     def open(self, tab=None):
-        """The page from the start, with a tab of it chosen; earlier calls of mihost are forgotten."""
+        """Loads the page again with a tab of it chosen; the earlier calls of mihost are forgotten."""
         self.driver.get('about:blank')
         forget_calls()
         self.driver.get(f'{ADDRESS}/cockpit/@localhost/mihost/index.html')
@@ -239,17 +239,17 @@ class Browser:
             self.click(f'#tab-{tab}')
 
     def leave(self):
-        """Forgets everything, the session included."""
+        """Leaves the page and deletes its cookies, the session included."""
         self.driver.switch_to.default_content()
         self.driver.delete_all_cookies()
         self.driver.get('about:blank')
 
     def enter(self, css):
-        """Goes on inside a frame."""
+        """Enters a frame: elements are looked for in it from now on."""
         self.driver.switch_to.frame(self.shown(css))
 
     def run(self, script, *arguments):
-        """What a piece of JavaScript returns."""
+        """Returns what a piece of JavaScript returns."""
         return self.driver.execute_script(script, *arguments)
 
     def wait(self, script, *arguments, what=None):
@@ -266,7 +266,7 @@ class Browser:
         return self.driver.find_elements(By.CSS_SELECTOR, css)
 
     def shown(self, css):
-        """The first element that matches and is displayed; waits for one."""
+        """Returns the first displayed element that matches; waits for one."""
         def first():
             try:
                 return next((each for each in self.find(css) if each.is_displayed()), None)
@@ -278,7 +278,7 @@ class Browser:
         self.wait('return ![...document.querySelectorAll(arguments[0])].some(e => e.checkVisibility())', css)
 
     def act(self, css, action):
-        """Does something with an element, as soon as it is enabled and in its place."""
+        """Does something with an element, as soon as it is enabled and does not move."""
         def attempt():
             try:
                 element = self.shown(css)
@@ -308,7 +308,7 @@ class Browser:
         self.driver.switch_to.active_element.send_keys(*keys)
 
     def tab_to(self, css):
-        """Presses the tabulator until an element has the focus, which it must reach."""
+        """Presses the tab key until the element has the focus; fails if it never has."""
         for _ in range(100):
             if self.run('return document.activeElement?.matches(arguments[0])', css):
                 return
@@ -316,17 +316,17 @@ class Browser:
         raise AssertionError(f'no way to {css} with the keyboard')
 
     def text(self, css):
-        """The text that is shown in an element."""
+        """Returns the text that an element shows."""
         return self.run('return document.querySelector(arguments[0])?.innerText ?? ""', css)
 
     def attributes(self, css, name):
-        """An attribute of all elements that match."""
+        """Returns an attribute of all elements that match."""
         return self.run(
             'return [...document.querySelectorAll(arguments[0])].map(e => e.getAttribute(arguments[1]))', css, name,
         )
 
     def texts(self, css):
-        """The texts of all elements that match and are displayed."""
+        """Returns the texts of all displayed elements that match."""
         return self.run(
             'return [...document.querySelectorAll(arguments[0])]'
             '.filter(e => e.checkVisibility()).map(e => e.innerText)', css,
@@ -347,7 +347,7 @@ class Browser:
         )
 
     def button(self, name, within='body'):
-        """Clicks what has this name for those who cannot see it."""
+        """Clicks the button with this accessible name."""
         def attempt():
             found = self.run(FIND_BUTTON, within, name)
             try:
@@ -359,11 +359,11 @@ class Browser:
         until(attempt, lambda: f'no button {name!r}: {self.body()[:2000]}')
 
     def settle(self):
-        """Waits until nothing moves or fades any more."""
+        """Waits until all animations have ended."""
         self.wait('return document.getAnimations().every(each => each.playState === "finished")')
 
     def axe(self):
-        """What axe-core finds serious or worse in what is shown: rule and element."""
+        """Returns what axe-core finds serious or worse in the page: rule and element."""
         self.settle()
         self.run(read(AXE))
         found = self.driver.execute_async_script(
@@ -376,16 +376,16 @@ class Browser:
         ]
 
     def refused(self):
-        """What the content security policy refused since the page was opened."""
+        """Returns what the content security policy refused since the page was opened."""
         return self.run('return window.refused')
 
     def complaints(self):
-        """The problems in the browser's console since the last call."""
+        """Returns the problems in the browser's console since the last call."""
         return [entry['message'] for entry in self.driver.get_log('browser')
                 if entry['level'] in ('SEVERE', 'WARNING') and '/favicon.ico' not in entry['message']]
 
     def picture(self, name):
-        """Keeps a picture of the page in the build directory."""
+        """Saves a picture of the page in the build directory."""
         self.settle()
         content = self.driver.get_screenshot_as_png()
         entry = tarfile.TarInfo(name + '.png')
@@ -408,12 +408,12 @@ class PageTest(unittest.TestCase):
 
     @classmethod
     def prepare(cls):
-        """The machine as the tests of the class find it."""
+        """Prepares the machine for the tests of the class."""
         lay_machine()
 
 
 def send_pictures():
-    """Has a process outside of the copy, from where no file gets out, write the pictures."""
+    """Starts a process outside the copy that writes the pictures, as no file leaves the copy."""
     os.makedirs(PICTURES, exist_ok=True)
     reader, writer = os.pipe()
     subprocess.Popen(['tar', '-x', '-C', PICTURES], stdin=reader)

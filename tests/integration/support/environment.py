@@ -15,7 +15,7 @@ SKIPPED = 77
 
 
 def daemon(path):
-    """A program that script/bootstrap unpacked, or the one that is installed."""
+    """Returns a program that script/bootstrap unpacked, or the installed one."""
     unpacked = os.path.join(DAEMONS, path.lstrip('/'))
     return unpacked if os.path.exists(unpacked) else path
 
@@ -27,7 +27,7 @@ NODE_EXPORTER = daemon('/usr/bin/prometheus-node-exporter')
 
 
 def problem(tools):
-    """Why the tests cannot run here; None if they can."""
+    """Returns why the tests cannot run here; None if they can."""
     if os.geteuid() != 0:
         return 'only root can make copies of the machine'
     for tool in tools:
@@ -54,7 +54,7 @@ def main(*tools):
 
 
 def main_in_sandbox(*tools):
-    """As main, all of it in a copy of this machine that is gone afterwards."""
+    """As main, in a copy of this machine that is removed afterwards."""
     skip_or_fail_without(tools)
     inside = '--in-sandbox'
     if inside not in sys.argv:

@@ -19,7 +19,7 @@ PidFile none
 
 
 def prepare(machine, mihost, keys):
-    """Lays the invented machine over this copy and makes it one that sshd can serve."""
+    """Puts the files of the invented machine over this copy and prepares it for sshd."""
     shutil.copytree(machine, '/', dirs_exist_ok=True)
     os.chmod('/etc/shadow', 0o640)
     with open('/etc/passwd', 'a') as accounts:

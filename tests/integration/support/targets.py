@@ -1,4 +1,4 @@
-"""Machines to administer: each a copy of this one in a sandbox of its own, with a real sshd."""
+"""Machines to administer: each is a copy of this one in its own sandbox, with a real sshd."""
 
 import os
 import socket
@@ -12,7 +12,7 @@ SCRIPT = os.path.join(os.path.dirname(__file__), 'target.py')
 
 
 def make_keys(folder):
-    """Keys of the hosts and of the one who logs in."""
+    """Makes the keys of the hosts and of the user who logs in."""
     for name in ('host', 'user'):
         subprocess.run(
             ['ssh-keygen', '-q', '-t', 'ed25519', '-N', '', '-f', os.path.join(folder, name)],
@@ -48,11 +48,11 @@ class Target:
             return log.read()
 
     def round_trips(self):
-        """How many commands were run over ssh so far."""
+        """Returns how many commands were run over ssh so far."""
         return self.log().count('Starting session: ')
 
     def run(self, command):
-        """What a command prints on the machine."""
+        """Returns what a command prints on the machine."""
         ssh = [
             'ssh', '-F', 'none', '-i', self.key, '-p', str(self.port),
             '-o', 'StrictHostKeyChecking=no', '-o', 'UserKnownHostsFile=/dev/null',

@@ -3,12 +3,12 @@ import { cockpit } from "./cockpit.js";
 
 const permission = cockpit.permission({ admin: true });
 
-/** True, too, while Cockpit does not know yet. */
+/** Also true while Cockpit does not know yet. */
 export function allowed() {
     return permission.allowed !== false;
 }
 
-/** Calls back now and whenever that changes. Buttons that change the machine follow by themselves. */
+/** Calls back now and whenever the privilege changes. Buttons that change the machine need no call. */
 export function watchAccess(listener) {
     let last = null;
     const changed = () => {

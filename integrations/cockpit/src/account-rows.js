@@ -3,7 +3,7 @@
 const lastDay = "2038-01-19"; // an account that never expires
 const forEver = 99999; // days
 
-/** The day of a date, "never" for the one that means it, or the text itself for an unknown one. */
+/** Returns the day of a date, "never" for the last possible day, or the text itself if it is not a date. */
 export function expiryText(date, never) {
     return date.startsWith(lastDay) ? never : dayText(date);
 }
@@ -16,15 +16,15 @@ export function daysText(days, endless) {
     return Number(days) >= forEver ? endless : days;
 }
 
-/** How many names a list such as a group's members has. */
+/** Returns how many names a list has, such as a group's members. */
 export function countNames(names) {
     return names === "" || names === "-" ? 0 : names.split(",").length;
 }
 
-/** A fact of 'mihost user', with words for "yes", "no" and "unknown"; the absent text for one that is not there. */
+/** Returns a fact of 'mihost user' in words, also "yes", "no" and "unknown"; the absent text if it is missing. */
 export function factText(account, fact, absent, words) {
     const value = account[fact];
-    if (account.unknown && !value) // without the password's entry, "no" says nothing either
+    if (account.unknown && !value) // without the password's entry, "no" is not known either
         return words.unknown;
     if (typeof value === "boolean")
         return value ? words.yes : words.no;

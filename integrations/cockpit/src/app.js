@@ -25,7 +25,7 @@ const tabs = [
     { name: "doctor", title: () => _("Checks"), View: DoctorView },
 ];
 
-const monitorAfter = 5000; // milliseconds, for the first view to come first
+const monitorAfter = 5000; // milliseconds, so that the first view is read first
 
 export class App {
     constructor(body) {
@@ -116,7 +116,7 @@ export class App {
         this.buttons.get(tabs[index].name).focus();
     }
 
-    /** Opens the dialog of a change. After it the view is read again, or "then" leads to another one. */
+    /** Opens the dialog of a change. Afterwards the view is read again, or "then" opens another one. */
     preview(task, { fixed, values, then = () => this.show() } = {}) {
         new Preview(task, { fixed, values }, ({ title, answer }) => {
             this.views.get("tree")?.forget();
@@ -142,6 +142,6 @@ export class App {
                         },
                     },
                 });
-        }, () => {}); // the view's own run of mihost meets the same trouble, and shows it
+        }, () => {}); // the view's own run of mihost has the same problem, and shows it
     }
 }

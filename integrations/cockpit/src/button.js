@@ -9,8 +9,8 @@ const looks = {
 };
 
 /**
- * PatternFly's button. One that changes the machine is off while the page has no privilege for that;
- * one that submits the form of that id runs nothing itself.
+ * Returns PatternFly's button. If it changes the machine, it is disabled while the page lacks the
+ * privilege; if it submits a form, given by its id, it runs nothing itself.
  */
 export function button(label, run, options = {}) {
     const { look = "secondary", changes = false, id = null, name = null, submits = null } = options;

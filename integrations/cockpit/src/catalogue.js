@@ -1,4 +1,4 @@
-// mihost's own account of its properties and methods, read once.
+// What mihost says about its properties and methods, read once.
 import * as mihost from "./mihost.js";
 
 function once(words, index) {
@@ -12,13 +12,13 @@ function once(words, index) {
     };
 }
 
-/** For each kind of node its meaning and its properties by name. */
+/** Keyed by kind of node: its meaning, and its properties keyed by name. */
 export const properties = once(["properties"], kinds => new Map(kinds.map(kind => [kind.kind, {
     meaning: kind.meaning,
     properties: new Map(kind.properties.map(property => [property.name, property])),
 }])));
 
-/** For each method the parameters by name. */
+/** Keyed by method: its parameters, keyed by name. */
 export const methods = once(["methods"], list => new Map(list.map(method => [method.method, {
     meaning: method.meaning,
     parameters: new Map(method.parameters.map(parameter => [parameter.name, parameter])),

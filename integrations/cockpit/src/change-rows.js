@@ -1,6 +1,6 @@
 // What a change does to the machine's files, in the order in which it is shown.
 
-/** The files that change: those that matter first, the account tools' backups apart. */
+/** Returns the files that change and, separately, the account tools' backups. */
 export function sortChanges(changes) {
     const isBackup = change => /^\/etc\/(passwd|shadow|group|gshadow|subuid|subgid)-$/.test(change.file);
     return {
@@ -9,7 +9,7 @@ export function sortChanges(changes) {
     };
 }
 
-/** The lines of a changed file as a difference: what goes, then what comes. */
+/** Returns what changes in a file: attributes, then removed lines, then added ones. */
 export function differenceOf({ removed = [], added = [], mode = null, owner = null }) {
     const attributes = Object.entries({ mode, owner }).filter(([, value]) => value !== null);
     return [

@@ -1,6 +1,6 @@
 /**
- * The words of mihost for a task with these values, and what it reads from standard input. A password
- * is only ever read from there.
+ * Returns the arguments of mihost for a task with these values, and what it reads from standard input.
+ * A password is passed only there.
  */
 export function commandOf(task, values) {
     const options = [];
@@ -23,7 +23,7 @@ export function commandOf(task, values) {
     return { words: [...task.words, ...options, ...(places.length > 0 ? ["--", ...places] : [])], input };
 }
 
-/** The fields whose values are missing or wrong: for each its name and the reason. */
+/** Returns the name and the reason of each field whose value is missing or wrong. */
 export function faultsOf(task, values) {
     const faults = [];
     for (const { name, required, kind } of task.fields) {

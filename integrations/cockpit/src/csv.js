@@ -1,4 +1,4 @@
-/** The rows of comma-separated values as objects, with the fields of the first line as their names. */
+/** Returns the rows of comma-separated values as objects, keyed by the fields of the first line. */
 export function parseCsv(text) {
     const [names, ...rows] = cells(text);
     return rows.map(row => Object.fromEntries((names ?? []).map((name, i) => [name, row[i] ?? ""])));
@@ -7,7 +7,7 @@ export function parseCsv(text) {
 function cells(text) {
     const rows = [];
     let row = [];
-    // Each match is one field, quoted or bare, and what ends it.
+    // Each match is one field, quoted or not, and the character that ends it.
     const field = /(?:"((?:[^"]|"")*)"|([^",\r\n]*))(,|\r?\n|$)/gy;
     while (field.lastIndex < text.length) {
         const match = field.exec(text);

@@ -1,4 +1,4 @@
-// Elements made from plain values. Texts only ever become text nodes, so nothing from the machine is markup.
+// Makes elements from plain values. Texts always become text nodes, so nothing from the machine is markup.
 import { visible } from "./visible.js";
 
 const shownAttributes = ["title", "aria-label"];
@@ -19,7 +19,7 @@ function fill(element, properties, children) {
     return element;
 }
 
-/** Texts, numbers and elements; lists of them are flattened, and nothing is left out but null and false. */
+/** Appends texts, numbers, elements and lists of them; only null and false are left out. */
 export function append(element, ...children) {
     for (const child of children.flat(Infinity))
         if (child !== null && child !== undefined && child !== false)

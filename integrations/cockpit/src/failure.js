@@ -19,13 +19,13 @@ export class Failure extends Error {
     }
 }
 
-/** mihost's message without its own name; only the line of the error if warnings come first. */
+/** Returns mihost's message without the program's name; only the error if warnings come before it. */
 export function messageOf(stderr) {
     const lines = stderr.trim().split("\n");
     return lines[lines.length - 1].replace(/^mihost: /, "");
 }
 
-/** The failure that Cockpit's exception means, or null if mihost ran and ended by itself. */
+/** Returns the failure that Cockpit's exception means, or null if mihost ran and ended by itself. */
 export function failureOf(exception) {
     const message = String(exception.message ?? "");
     if (exception.exit_signal)

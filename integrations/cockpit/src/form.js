@@ -1,4 +1,4 @@
-// The form of a task: its fields with what mihost says about them.
+// The form of a task: its fields, each with mihost's explanation.
 import { _ } from "./cockpit.js";
 import { el, replace } from "./dom.js";
 
@@ -11,7 +11,7 @@ const reasons = {
 };
 
 export class Form {
-    /** Fixed values are shown and cannot be changed; others are where the fields start. */
+    /** Fixed values are shown and cannot be changed; the others are the first values of the fields. */
     constructor(task, { fixed, values, onInput }) {
         this.task = task;
         this.fixed = fixed;
@@ -55,7 +55,7 @@ export class Form {
                 el("div", { class: "mi-help" }, fault, meaning)));
     }
 
-    /** Describes each field as mihost describes its parameter. */
+    /** Shows below each field mihost's explanation of its parameter. */
     explain(parameters) {
         for (const { name, parameter } of this.task.fields)
             replace(this.meanings.get(name), parameters.get(parameter)?.meaning);

@@ -1,4 +1,4 @@
-/** Figures over a session. When there are too many, every other one is left out, and fewer are taken. */
+/** Figures over time. If there are too many, every second one is dropped, and fewer are kept from then on. */
 export class History {
     constructor(most = 600) {
         Object.assign(this, { most, samples: [], every: 1, taken: 0 });
@@ -17,7 +17,7 @@ export class History {
     }
 }
 
-/** The points of a line over the samples, as an SVG polyline has them. The last sample is at the right. */
+/** Returns the points of an SVG polyline through the samples. The last sample is at the right edge. */
 export function pointsOf(samples, name, { width, height, most }) {
     const known = samples.filter(sample => Number.isFinite(sample[name]));
     if (known.length === 0 || most <= 0)

@@ -1,4 +1,4 @@
-/** Cuts a stream of text into lines: the function takes pieces as they come and calls back with whole lines. */
+/** Splits text into lines: the function that it returns takes pieces and calls back with whole lines. */
 export function lineSplitter(onLine) {
     let rest = "";
     return piece => {

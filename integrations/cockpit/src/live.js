@@ -1,4 +1,4 @@
-// A run of mihost that goes on while the page is in sight.
+// A run of mihost that continues while the page is visible.
 import * as mihost from "./mihost.js";
 import { isVisible, onVisibility } from "./visibility.js";
 
@@ -8,8 +8,8 @@ onVisibility(visible => all.forEach(live => live.setVisible(visible)));
 
 export class Live {
     /**
-     * Calls back whenever mihost is started, with each document that it prints, and with a failure, or
-     * null, when it ends although it was not stopped. A silent one may print nothing for long.
+     * Calls back whenever mihost is started, with each document that it prints, and, if it ends without
+     * being stopped, with a failure or null. A silent run may print nothing for a long time.
      */
     constructor(words, { silent = false, onBegin = () => {}, onDocument, onEnd }) {
         Object.assign(this, { words, silent, onBegin, onDocument, onEnd, run: null });

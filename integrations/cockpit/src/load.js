@@ -1,4 +1,4 @@
-// Fills a view with what mihost answers; shows that it is waited for, and what went wrong.
+// Fills a view with what mihost prints; shows that the page is waiting, and what failed.
 import { _ } from "./cockpit.js";
 import { el, replace } from "./dom.js";
 import { State, alert } from "./state.js";
@@ -11,7 +11,7 @@ export function spinner() {
 }
 
 export class Loader {
-    /** Failures of the page as a whole go to its state, others into the element. */
+    /** Failures that concern the whole page are shown in its state, others in the element. */
     constructor(element, state) {
         Object.assign(this, { element, state, runs: [], turn: 0 });
     }
@@ -24,8 +24,8 @@ export class Loader {
     }
 
     /**
-     * Starts runs of mihost by calling begin, which returns a list of them, and renders their answers.
-     * A load that another one has overtaken renders nothing.
+     * Starts runs of mihost by calling begin, which returns a list of them, and renders their results.
+     * If another load begins before they end, this one renders nothing.
      */
     async load(begin, render) {
         this.stop();

@@ -1,4 +1,4 @@
-/** The lines of 'mihost --json list log', oldest first, as 'list log --follow' prints them. */
+/** Returns the lines of 'mihost --json list log', oldest first, as 'list log --follow' prints them. */
 export function logLines(nodes) {
     return nodes.map(({ properties: { time, message } }) => ({
         time: time?.value ?? null,
@@ -7,7 +7,7 @@ export function logLines(nodes) {
     })).reverse();
 }
 
-/** Whether a line's text has each word of the filter. */
+/** Returns whether a line's text contains each word of the filter. */
 export function lineMatches(text, filter) {
     const lower = text.toLowerCase();
     return filter.toLowerCase().split(/\s+/).every(word => lower.includes(word));

@@ -1,4 +1,4 @@
-// Runs mihost. This is the only place where the page reaches the machine.
+// Runs mihost. Nothing else in the page runs anything on the machine.
 import { cockpit } from "./cockpit.js";
 import { parseCsv } from "./csv.js";
 import { Failure, failureOf, messageOf } from "./failure.js";
@@ -20,9 +20,9 @@ export function stopSlow() {
 }
 
 /**
- * Starts mihost with these words. The answer is its output, messages and exit status, whatever that is;
- * it is a Failure if mihost could not be run or did not end by itself. A silent run may print nothing
- * for long without being slow.
+ * Starts mihost with these arguments. The answer is its output, messages and exit status, whatever that
+ * is; it fails with a Failure if mihost could not be run or did not end by itself. A silent run may print
+ * nothing for a long time without being slow.
  */
 function start(words, { input = "", onOutput = null, silent = false } = {}) {
     const process = cockpit.spawn(["mihost", ...words], { superuser: "try", err: "message" });
@@ -72,25 +72,25 @@ function parsed(output, parse) {
     }
 }
 
-/** A run whose answer is what mihost prints. */
+/** Starts a run; its answer is what mihost prints. */
 export function text(words) {
     const run = start(words);
     return { stop: run.stop, answer: run.answer.then(answer => checked(answer, [0])) };
 }
 
-/** A run whose answer is the rows that mihost prints. */
+/** Starts a run; its answer is the rows that mihost prints. */
 export function rows(words) {
     const run = start(["-o", "csv", ...words]);
     return { stop: run.stop, answer: run.answer.then(answer => parsed(checked(answer, [0]), parseCsv)) };
 }
 
-/** A run whose answer is the document that mihost prints. */
+/** Starts a run; its answer is the document that mihost prints. */
 export function json(words, { accepted = [0] } = {}) {
     const run = start(["--json", ...words]);
     return { stop: run.stop, answer: run.answer.then(answer => parsed(checked(answer, accepted), JSON.parse)) };
 }
 
-/** A run that goes on; each line that mihost prints is a document. Its answer comes when it ends. */
+/** Starts a run that calls back with a document for each line that mihost prints, until it ends. */
 export function stream(words, onDocument, { silent = false } = {}) {
     let garbled = null;
     const onLine = line => {
@@ -112,7 +112,7 @@ export function stream(words, onDocument, { silent = false } = {}) {
 
 /**
  * Changes the machine, or with preview a sandbox copy of it. Input is what mihost reads, such as a
- * password. The answer is mihost's account of the change; one of a refused change has its message as error.
+ * password. The answer is mihost's document about the change; if it was refused, error is the message.
  */
 export function change(words, { preview, input = "" }) {
     const run = start([...(preview ? ["--sandbox"] : []), "--json", "--yes", ...words], { input });

@@ -24,7 +24,7 @@ export class Monitor {
         });
     }
 
-    /** mihost only prints what changed. */
+    /** mihost prints only what changed. */
     sample({ time, properties: changed }) {
         for (const [name, { value }] of Object.entries(changed))
             this.figures[name] = value;

@@ -1,4 +1,4 @@
-// mihost's account of a change: warnings, commands with their output, and the lines that change.
+// What mihost prints of a change: warnings, commands with their output, and the lines that change.
 import { differenceOf, sortChanges } from "./change-rows.js";
 import { _, format } from "./cockpit.js";
 import { el } from "./dom.js";
@@ -11,7 +11,7 @@ const kinds = {
     removed: () => _("removed"),
 };
 
-/** What happened, or in a preview what would happen. */
+/** Shows what happened, or in a preview what would happen. */
 export function outcome(answer, { preview }) {
     const { files, backups } = sortChanges(answer.changes ?? []);
     const say = (would, did) => preview ? would : did;

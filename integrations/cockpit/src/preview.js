@@ -12,8 +12,8 @@ import { alert } from "./state.js";
 
 export class Preview {
     /**
-     * Opens the dialog. Fixed values belong to what the change is about, others are where the form
-     * starts; onDone is called with the task's title after a change.
+     * Makes the dialog. Fixed values name what is changed, others are the first values of the form;
+     * onDone is called with the task's title after a change.
      */
     constructor(task, { fixed = {}, values = {} } = {}, onDone) {
         Object.assign(this, { task, fixed, values, onDone, busy: false, machine: null, edits: 0 });
@@ -52,7 +52,7 @@ export class Preview {
         this.update();
     }
 
-    /** What the fields mean, and the machine's name, may come a moment later. */
+    /** Shows the dialog; the meaning of its fields and the machine's name may follow a moment later. */
     open() {
         document.body.append(this.element);
         this.element.showModal();
@@ -63,7 +63,7 @@ export class Preview {
                 const { meaning, parameters } = methods.get(task.method);
                 replace(this.meaning, meaning);
                 this.fields.explain(parameters);
-            }, () => {}); // the preview meets the same trouble, and shows it
+            }, () => {}); // the preview has the same problem, and shows it
         if (task.danger?.name === "machine")
             mihost.text(["-o", "value", "get", "computer", "computer-name"]).answer.then(name => {
                 this.machine = name.trim();
@@ -84,7 +84,7 @@ export class Preview {
         this.tryIt();
     }
 
-    /** What was previewed is not what the form says any more. */
+    /** Drops the preview, since the form has changed. */
     forget() {
         this.edits++;
         if (!this.previewed)
@@ -105,7 +105,7 @@ export class Preview {
         this.run.classList.toggle("pf-m-secondary", Boolean(this.previewed));
     }
 
-    /** The name to type before a dangerous change; none while it is not known. */
+    /** Returns the name to type before a dangerous change; none while it is not known. */
     wantedName() {
         const { danger } = this.task;
         if (!danger)
@@ -148,7 +148,7 @@ export class Preview {
         this.applying = true;
         const answer = await this.change(this.previewed, false);
         this.applying = false;
-        this.previewed = null; // whatever came of it, a further change has to be previewed again
+        this.previewed = null; // whether it failed or not, the next change needs a new preview
         this.update();
         if (!answer)
             return;

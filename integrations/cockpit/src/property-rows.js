@@ -1,4 +1,4 @@
-/** What is shown of each property: the row of 'mihost get' with what the catalogue knows about it. */
+/** Returns what is shown of each property: the row of 'mihost get' and the catalogue's entry. */
 export function propertyRows(rows, known) {
     return rows.map(row => {
         const property = known?.properties.get(row.name);
@@ -12,7 +12,7 @@ export function propertyRows(rows, known) {
     });
 }
 
-/** A live value as 'mihost get' shows it, or null for one that only mihost can show, such as a date. */
+/** Returns a live value as 'mihost get' shows it; null if only mihost can show it, such as a date. */
 export function liveText({ kind, value }) {
     if (kind === "date" || value === null)
         return null;

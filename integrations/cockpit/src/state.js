@@ -1,4 +1,4 @@
-// What holds for the page as a whole, shown above all views as alerts in #state.
+// Conditions of the whole page, shown as alerts above all views in #state.
 import { _ } from "./cockpit.js";
 import { el, replace } from "./dom.js";
 
@@ -45,7 +45,7 @@ const conditions = { // the most severe first
     },
 };
 
-const looks = { // of alerts: the mark, and the word for who cannot see it
+const looks = { // of alerts: the icon, and the word that screen readers say
     danger: { mark: "!", word: () => _("Danger") },
     warning: { mark: "!", word: () => _("Warning") },
     success: { mark: "✓", word: () => _("Success") },
@@ -60,8 +60,8 @@ export class State {
     }
 
     /**
-     * Shows a condition. A detail is a text of mihost. An action is what helps against it; one for
-     * each owner, such as the views that have to be read again. All of them run on a click.
+     * Shows a condition. The detail is a text of mihost. The action is what ends the condition; each
+     * owner, such as a view that must be read again, may have one. A click runs them all.
      */
     show(name, { detail = "", owner = null, action = null } = {}) {
         const actions = this.holding.get(name)?.actions ?? new Map();
@@ -76,7 +76,7 @@ export class State {
             this.draw();
     }
 
-    /** Whether a failure is one of the page as a whole. */
+    /** Returns whether a failure concerns the whole page. */
     static knows(failure) {
         return failure.kind in conditions;
     }

@@ -1,6 +1,6 @@
 // Which rows of a table are shown, and in which order.
 
-/** The rows in which a column's text contains each word of the filter. */
+/** Returns the rows that contain each word of the filter, each word within one column. */
 export function filterRows(rows, columns, filter) {
     const words = filter.toLowerCase().split(/\s+/).filter(Boolean);
     if (words.length === 0)
@@ -22,7 +22,7 @@ function compare(a, b, order) {
     return a < b ? -1 : a > b ? 1 : 0;
 }
 
-/** The rows in the order of a column; rows that are equal there stay in their order. */
+/** Returns the rows in the order of a column; rows that are equal there keep their order. */
 export function sortRows(rows, { property, order }, descending) {
     const sign = descending ? -1 : 1;
     return [...rows].sort((a, b) => sign * compare(a[property], b[property], order));

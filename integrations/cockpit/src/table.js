@@ -1,4 +1,4 @@
-// A table that sorts and filters, and only has those rows in the page that are in sight.
+// A table that sorts and filters. Only the visible rows are in the page.
 import { _, format } from "./cockpit.js";
 import { el, replace } from "./dom.js";
 import { filterRows, sortRows } from "./table-rows.js";
@@ -9,8 +9,8 @@ const rowHeight = 40; // pixels, as in index.css
 export class Table {
     /**
      * A column has the property that it sorts by, a title, the text of a row, and its order: "text" or
-     * "number". One with a link leads to the path that it gives for a row. Those with a width of
-     * "wide" are left out where there is little room.
+     * "number". A column's link returns the path that a click on a row opens. Columns with the width
+     * "wide" are left out in a narrow window.
      */
     constructor({ id, filterId, label, columns, none, go }) {
         Object.assign(this, { columns, none, go, all: [], rows: [], sorted: columns[0], descending: false });

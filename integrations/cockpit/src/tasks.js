@@ -1,5 +1,5 @@
-// The changes that the page offers, as tables. Each is one command of mihost; what its fields mean comes
-// from mihost's own account of the method that the command carries out.
+// The changes that the page offers, as tables. Each is one command of mihost; mihost explains its fields
+// as parameters of the method that the command calls.
 import { _ } from "./cockpit.js";
 
 // A field is an argument, or an option of that name. Its kind is "text", "number", "day" or "password".

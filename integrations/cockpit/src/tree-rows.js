@@ -1,6 +1,6 @@
-// The tree as the rows that are in sight; see views/tree.js.
+// The tree as a list of rows; see views/tree.js.
 
-/** The nodes of 'mihost tree' with their children and, for the search, their text in lower case. */
+/** Returns the nodes of 'mihost tree' with their children and, for the search, their text in lower case. */
 export function buildTree(rows) {
     const nodes = new Map();
     for (const row of rows)
@@ -11,13 +11,13 @@ export function buildTree(rows) {
     return { nodes, roots };
 }
 
-/** A node's own name: what follows the kind in its address. */
+/** Returns a node's name: what follows the kind in its address. */
 export function nameOf(node) {
     const colon = node.address.indexOf(":");
     return colon < 0 ? node.address : node.address.slice(colon + 1);
 }
 
-/** The kind of the node with this address. */
+/** Returns the kind of the node with this address. */
 export function kindOf(address) {
     const colon = address.indexOf(":");
     const kind = colon < 0 ? address : address.slice(0, colon);
@@ -25,8 +25,8 @@ export function kindOf(address) {
 }
 
 /**
- * The rows to show. With a search or a kind those are the nodes that match, and the way to them;
- * else what the expanded nodes hold.
+ * Returns the rows to show: with a search or a kind, the nodes that match and their parents; otherwise
+ * the children of expanded nodes.
  */
 export function visibleRows(roots, { expanded, search = "", kind = "" }) {
     const wanted = search.trim().toLowerCase();
@@ -34,7 +34,7 @@ export function visibleRows(roots, { expanded, search = "", kind = "" }) {
     const matches = node => node.text.includes(wanted) && (kind === "" || node.kind === kind);
     const result = [];
 
-    // Children come first, to know whether their parent leads to a match.
+    // Children come first, to know whether their parent has a match below it.
     function kept(siblings) {
         return siblings.map(node => ({ node, below: kept(node.children) }))
             .filter(({ node, below }) => below.length > 0 || matches(node));
@@ -54,7 +54,7 @@ export function visibleRows(roots, { expanded, search = "", kind = "" }) {
     return result;
 }
 
-/** The kinds of nodes that there are, in the order of the tree. */
+/** Returns the kinds of nodes, in the order of the tree. */
 export function kindsOf(nodes) {
     return [...new Set([...nodes.values()].map(node => node.kind))];
 }

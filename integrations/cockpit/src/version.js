@@ -1,7 +1,7 @@
 // The oldest mihost whose output this page reads.
 export const oldestMihost = "1.0.0";
 
-/** Whether the output of 'mihost --version' names a version that this page works with. */
+/** Returns whether the output of 'mihost --version' names a version that this page works with. */
 export function isRecent(output, oldest = oldestMihost) {
     const found = /(\d+)\.(\d+)\.(\d+)/.exec(output);
     if (!found)

@@ -1,4 +1,4 @@
-/** Which of so many rows are in sight, and some more on either side. */
+/** Returns which rows of a list are visible, with a margin of rows above and below. */
 export function windowOf({ scrollTop, height, rowHeight, count, margin = 8 }) {
     const first = Math.max(0, Math.min(count, Math.floor(scrollTop / rowHeight)) - margin);
     const last = Math.min(count, Math.ceil((scrollTop + height) / rowHeight) + margin);
@@ -6,8 +6,8 @@ export function windowOf({ scrollTop, height, rowHeight, count, margin = 8 }) {
 }
 
 /**
- * Shows only those rows of a long list that are in sight. The body's first and last elements are
- * spacers as high as the rows that are left out.
+ * Shows only the visible rows of a long list. The body's first and last elements are spacers as high as
+ * the rows that are left out.
  */
 export class VirtualRows {
     constructor({ scroller, body, makeSpacer, render, rowHeight }) {
@@ -19,7 +19,7 @@ export class VirtualRows {
         new ResizeObserver(() => this.draw()).observe(scroller);
     }
 
-    /** There are so many rows now, and those in sight are drawn again. */
+    /** Sets the number of rows and draws the visible ones again. */
     setCount(count) {
         this.count = count;
         this.rows.forEach(row => row.remove());
@@ -28,7 +28,7 @@ export class VirtualRows {
     }
 
     scrollTo(index) {
-        const head = this.body.offsetTop; // a heading that stays in sight
+        const head = this.body.offsetTop; // a heading that stays visible
         const top = index * this.rowHeight;
         const { scrollTop, clientHeight } = this.scroller;
         if (top < scrollTop)

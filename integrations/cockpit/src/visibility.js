@@ -1,4 +1,4 @@
-// Whether anybody can see the page: not while another page of Cockpit or another tab is shown.
+// Whether the page is visible: not while another page of Cockpit or another tab is shown.
 import { cockpit } from "./cockpit.js";
 
 const listeners = [];
@@ -7,7 +7,7 @@ export function isVisible() {
     return !cockpit.hidden && document.visibilityState === "visible";
 }
 
-/** Calls back whenever the page comes into sight or leaves it. */
+/** Calls back whenever the page becomes visible or hidden. */
 export function onVisibility(listener) {
     listeners.push(listener);
 }

@@ -1,4 +1,4 @@
-// One account: who it is, its groups, its password's dates, and what can be changed about it.
+// One account: its names and ids, its groups, its password's dates, and the changes to it.
 import { factText } from "../account-rows.js";
 import { button } from "../button.js";
 import { _, format } from "../cockpit.js";
@@ -8,7 +8,7 @@ import * as mihost from "../mihost.js";
 import { tasks } from "../tasks.js";
 import { facts } from "./facts.js";
 
-// An edit is the task that changes the fact, and what its form starts with.
+// An edit is the task that changes the fact, and the first values of its form.
 const edits = {
     name: account => [tasks.userSetName, { "full-name": account["full-name"] }],
     home: account => [tasks.userSetHome, { home: account["home-directory"] }],
@@ -110,7 +110,7 @@ export class AccountPage {
             }));
     }
 
-    /** A group that nothing names any more has no page. */
+    /** A group that no longer exists has no page. */
     group({ name, gid }) {
         return name === null ? `${gid}` : button(name, () => this.go(["groups", name]), { look: "link" });
     }

@@ -1,6 +1,6 @@
 import { el } from "../dom.js";
 
-/** A heading and below it facts as pairs of label and text; one that can be edited has a button. */
+/** Returns a heading and facts as pairs of label and text; one that can be edited has a button. */
 export function facts(heading, rows, subject, edit) {
     return el("div", {},
         el("h3", { class: "pf-v6-c-title pf-m-md" }, heading),

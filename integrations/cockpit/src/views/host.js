@@ -10,7 +10,7 @@ import { tasks } from "../tasks.js";
 const width = 300;
 const height = 80;
 
-// The most is another figure, or where there is none the greatest one so far.
+// The top of a chart is another figure or, if none is given, the greatest value so far.
 const charts = [
     { figure: "physical-memory-used", most: "physical-memory-size", title: () => _("Memory in use") },
     { figure: "swap-used", most: "swap-size", title: () => _("Swap in use") },
@@ -86,7 +86,7 @@ function area(points) {
         .map(({ x, y }) => `${x},${y}`).join(" ");
 }
 
-/** Memory in its usual unit; anything else as mihost has it. */
+/** Returns memory in its usual unit, anything else as mihost prints it. */
 function amount(number, unit) {
     return unit === "KiB" ? cockpit.format_bytes(number * 1024) : `${number} ${unit}`;
 }

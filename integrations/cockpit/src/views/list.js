@@ -5,7 +5,7 @@ import * as mihost from "../mihost.js";
 import { Table } from "../table.js";
 
 export class ListView {
-    /** The list is what 'mihost list' calls it; buttons are next to the filter. */
+    /** The list is named as in 'mihost list'; the buttons are next to the filter. */
     constructor({ state, go, list, table, buttons = [] }) {
         this.table = new Table({ go, ...table });
         this.list = list;

@@ -1,4 +1,4 @@
-// The newest lines of the system log, and new ones as they come.
+// The newest lines of the system log, and new ones as they are written.
 import { button } from "../button.js";
 import { _, cockpit } from "../cockpit.js";
 import { el, replace } from "../dom.js";

@@ -1,4 +1,4 @@
-// One node: its properties by name, with unit and meaning; live ones are read again and again.
+// One node: its properties by name, with unit and meaning; live ones are read repeatedly.
 import { button } from "../button.js";
 import * as catalogue from "../catalogue.js";
 import { _, format } from "../cockpit.js";
@@ -17,7 +17,7 @@ const marks = [
     { flag: "secret", text: () => _("secret"), look: "pf-m-purple" },
 ];
 
-// Where more can be seen and changed than here.
+// The views that show and change more than this one.
 const places = {
     user: { label: () => _("Open the account"), path: name => ["users", name] },
     group: { label: () => _("Open the group"), path: name => ["groups", name] },

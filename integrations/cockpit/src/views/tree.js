@@ -50,7 +50,7 @@ export class TreeView {
             this.detail.element);
     }
 
-    /** Shows the node with this address; the operating system where there is none. */
+    /** Shows the node with this address; the operating system if it does not exist. */
     show([address = "os"]) {
         this.address = address;
         if (this.tree.nodes.size === 0 || this.stale)
@@ -64,7 +64,7 @@ export class TreeView {
         this.forget();
     }
 
-    /** All is read again when it is shown next. */
+    /** Everything is read again when the view is shown next. */
     forget() {
         this.stale = true;
         this.detail.hide();

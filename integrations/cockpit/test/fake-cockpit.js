@@ -1,4 +1,4 @@
-// Stands in for the cockpit library; the tests control its processes. Import it before the tested modules.
+// A cockpit library whose processes the tests control. Import it before the tested modules.
 export const spawned = []; // each with its words, options, input, and ways to end it
 
 function process(words, options) {

@@ -24,31 +24,9 @@ Json valueOf(std::string const& text)
     return text.empty() ? Json() : Json(text);
 }
 
-Json toJson(FileChange::Attribute const& attribute)
+Json attributeToJson(FileChange::Attribute const& attribute)
 {
     return {{"before", valueOf(attribute.before)}, {"after", valueOf(attribute.after)}};
-}
-
-Json toJson(std::vector<std::string> const& lines)
-{
-    Json list = Json::array();
-    for (std::string const& line : lines)
-        list.push_back(mihost::toJson(line));
-    return list;
-}
-
-Json toJson(FileChange const& change)
-{
-    Json document{{"file", mihost::toJson(change.file)},
-                  {"change", change.change},
-                  {"kind", change.kind},
-                  {"removed", toJson(change.removed)},
-                  {"added", toJson(change.added)}};
-    if (differs(change.mode))
-        document["mode"] = toJson(change.mode);
-    if (differs(change.owner))
-        document["owner"] = toJson(change.owner);
-    return document;
 }
 
 /** Such as "mode 0640 -> 0600"; only the later one if the file is new. */
@@ -121,12 +99,18 @@ void hideHash(std::string& record, std::size_t field)
         record.replace(start, length, "(hidden)");
 }
 
-Json toJson(std::vector<FileChange> const& changes)
+Json toJson(FileChange const& change)
 {
-    Json list = Json::array();
-    for (FileChange const& change : changes)
-        list.push_back(toJson(change));
-    return list;
+    Json document{{"file", toJson(change.file)},
+                  {"change", change.change},
+                  {"kind", change.kind},
+                  {"removed", listToJson(change.removed)},
+                  {"added", listToJson(change.added)}};
+    if (differs(change.mode))
+        document["mode"] = attributeToJson(change.mode);
+    if (differs(change.owner))
+        document["owner"] = attributeToJson(change.owner);
+    return document;
 }
 
 void writeText(std::vector<FileChange> const& changes, Output& out)

@@ -34,7 +34,7 @@ std::vector<std::string> missingIn(std::vector<std::string> const& lines,
 /** Replaces a field of a record, the first being 0, unless it marks that there is none. */
 void hideHash(std::string& record, std::size_t field);
 
-Json toJson(std::vector<FileChange> const& changes);
+Json toJson(FileChange const& change);
 
 /** For people to read: of a backup, such as /etc/passwd-, the number of lines only. */
 void writeText(std::vector<FileChange> const& changes, Output& out);

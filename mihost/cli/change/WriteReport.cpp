@@ -13,20 +13,11 @@ namespace
 
 using commandTap::RunCommand;
 
-Json listOf(std::vector<std::string> const& lines)
-{
-    Json list = Json::array();
-    for (std::string const& line : lines)
-        list.push_back(toJson(line));
-    return list;
-}
-
-Json toJson(std::vector<RunCommand> const& commands)
+Json commandsToJson(std::vector<RunCommand> const& commands)
 {
     Json list = Json::array();
     for (RunCommand const& command : commands)
-        list.push_back({{"command", mihost::toJson(command.line)},
-                        {"output", mihost::toJson(command.output)}});
+        list.push_back({{"command", toJson(command.line)}, {"output", toJson(command.output)}});
     return list;
 }
 
@@ -47,12 +38,12 @@ Json toJson(WriteReport const& report)
     Json document;
     document["status"] = report.error.empty() ? static_cast<int>(Done) : PluginRefused;
     document["changed"] = report.changed;
-    document["changes"] = toJson(report.changes);
-    document["warnings"] = listOf(report.warnings);
+    document["changes"] = listToJson(report.changes);
+    document["warnings"] = listToJson(report.warnings);
     if (!report.error.empty())
         document["error"] = toJson(report.error);
     if (inSandbox())
-        document["commands"] = toJson(report.commands);
+        document["commands"] = commandsToJson(report.commands);
     return document;
 }
 

@@ -37,7 +37,7 @@ Verdict tree(Subject& subject)
     return {wrongTypeOrder(subject.nodes())};
 }
 
-Verdict unload(Subject& subject)
+Verdict unloadAfterFailure(Subject& subject)
 {
     subject.unload();
     return {};
@@ -51,7 +51,7 @@ Scenario failingStartScenario()
             {
                 {"answer", "a failure of the host's initialize is passed on", answer},
                 {"tree", "the tree is still built", tree},
-                {"unload", "the interface can be unloaded after that", unload},
+                {"unload", "the interface can be unloaded after that", unloadAfterFailure},
             }};
 }
 

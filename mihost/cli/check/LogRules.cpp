@@ -24,8 +24,8 @@ constexpr std::string_view categories[] = {
     "Veltrix.IC.MI.OsSwMI.LogInfo",
 };
 
-constexpr std::string_view entry = ": entry";
-constexpr std::string_view exit = ": exit";
+constexpr std::string_view entryMark = ": entry";
+constexpr std::string_view exitMark = ": exit";
 
 template <class Known, class Value> bool isAmong(Known const& known, Value const& value)
 {
@@ -171,9 +171,9 @@ Findings wrongNesting(LoggedCalls const& calls)
     for (LoggedCall const& call : calls) {
         if (!isLog(call))
             continue;
-        if (auto const name = nameBefore(entry, call.text))
+        if (auto const name = nameBefore(entryMark, call.text))
             open.enter(*name);
-        else if (auto const left = nameBefore(exit, call.text))
+        else if (auto const left = nameBefore(exitMark, call.text))
             open.leave(*left);
     }
     return open.finish();

@@ -96,9 +96,9 @@ bool isKind(Property const& property, IC::PropertyValue const& value)
            (property.has(Property::Live) && value.getKind() == ValueKind::EmptyKind);
 }
 
-std::string nameOf(IC::MutableNode const& node, Property const& property)
+std::string nameOfProperty(IC::MutableNode const& node, Property const& property)
 {
-    return fmt::format("{}: {} ({})", checks::nameOf(node), property.name, property.id);
+    return fmt::format("{}: {} ({})", nameOf(node), property.name, property.id);
 }
 
 /** Checks each stored value of a known property. */
@@ -127,8 +127,8 @@ void expectText(Findings& findings, IC::MutableNode const& node, unsigned int id
     Property const* const property = findProperty(*kind, id);
     std::string const found = textOf(node.getProperties(), id);
     if (found != expected)
-        findings.push_back(
-            fmt::format("{}: '{}' rather than '{}'", nameOf(node, *property), found, expected));
+        findings.push_back(fmt::format("{}: '{}' rather than '{}'", nameOfProperty(node, *property),
+                                       found, expected));
 }
 
 void checkRead(Findings& findings, IC::MutableNode const& node, Property const& property,
@@ -138,11 +138,11 @@ void checkRead(Findings& findings, IC::MutableNode const& node, Property const& 
     bool const answered = node.getProperty(property.id, value).getStatus() == 0;
     bool const expected = stored || property.has(Property::Unstored);
     if (expected && !answered)
-        findings.push_back(fmt::format("{}: cannot be read", nameOf(node, property)));
+        findings.push_back(fmt::format("{}: cannot be read", nameOfProperty(node, property)));
     else if (answered && !isKind(property, value))
-        findings.push_back(fmt::format("{}: reads as {} rather than {}", nameOf(node, property),
-                                       valueKindName(value.getKind()),
-                                       valueKindName(property.kind)));
+        findings.push_back(
+            fmt::format("{}: reads as {} rather than {}", nameOfProperty(node, property),
+                        valueKindName(value.getKind()), valueKindName(property.kind)));
 }
 
 } // namespace
@@ -157,11 +157,10 @@ Findings wrongPropertyIds(Nodes const& nodes)
         Values const values = node->getProperties();
         for (Property const& property : kind->properties)
             if (isRequired(*kind, property) && values.count(property.id) == 0)
-                findings.push_back(fmt::format("{}: not set", nameOf(*node, property)));
+                findings.push_back(fmt::format("{}: not set", nameOfProperty(*node, property)));
         for (auto const& [id, value] : values)
             if (!findProperty(*kind, id))
-                findings.push_back(
-                    fmt::format("{}: unknown property {}", checks::nameOf(*node), id));
+                findings.push_back(fmt::format("{}: unknown property {}", nameOf(*node), id));
     }
     return findings;
 }
@@ -172,7 +171,7 @@ Findings wrongKinds(Nodes const& nodes)
     forEachValue(nodes, [&findings](IC::MutableNode const& node, Property const& property,
                                     IC::PropertyValue const& value) {
         if (!isKind(property, value))
-            findings.push_back(fmt::format("{}: {} rather than {}", nameOf(node, property),
+            findings.push_back(fmt::format("{}: {} rather than {}", nameOfProperty(node, property),
                                            valueKindName(value.getKind()),
                                            valueKindName(property.kind)));
     });
@@ -188,8 +187,9 @@ Findings wrongFlags(Nodes const& nodes)
                             IC::PropertyValue const& value) {
         bool const expected = !(Place{node.getNodeType(), property.id} == withoutFlag);
         if (value.getFlag() != expected)
-            findings.push_back(fmt::format("{}: flag {} rather than {}", nameOf(node, property),
-                                           value.getFlag(), expected));
+            findings.push_back(fmt::format("{}: flag {} rather than {}",
+                                           nameOfProperty(node, property), value.getFlag(),
+                                           expected));
     });
     return findings;
 }
@@ -233,7 +233,7 @@ Findings wrongReads(Nodes const& nodes)
         IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
         if (node->getProperty(unknown, value).getStatus() == 0)
             findings.push_back(fmt::format("{}: returns a value for the unknown property {}",
-                                           checks::nameOf(*node), unknown));
+                                           nameOf(*node), unknown));
     }
     return findings;
 }

@@ -36,7 +36,7 @@ std::set<unsigned int> idsOf(std::vector<SeenNode> const& nodes)
     return ids;
 }
 
-Verdict answer(Subject& subject)
+Verdict refreshAnswer(Subject& subject)
 {
     subject.initialize();
     before().clear();
@@ -103,7 +103,7 @@ Verdict published(Subject& subject)
     return {findings};
 }
 
-Verdict tree(Subject& subject)
+Verdict sameTree(Subject& subject)
 {
     Nodes const nodes = subject.nodes();
     Findings findings;
@@ -123,11 +123,11 @@ Verdict tree(Subject& subject)
 Scenario refreshScenario()
 {
     std::vector<Check> checks = {
-        {"answer", "writing 0 to refresh returns 0 and stores the 0", answer},
+        {"answer", "writing 0 to refresh returns 0 and stores the 0", refreshAnswer},
         {"deleted", "each user and group node is deleted once, and no other", deleted},
         {"node-ids", "the new nodes have new ids", ids},
         {"published", "each new node is published once, and no other", published},
-        {"tree", "the new nodes are the same as at the start", tree},
+        {"tree", "the new nodes are the same as at the start", sameTree},
     };
     for (Check const& check : logChecks())
         checks.push_back(check);

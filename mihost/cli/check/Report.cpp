@@ -61,10 +61,7 @@ std::string xml(std::string const& text)
 
 Cell listCell(std::vector<std::string> const& texts)
 {
-    Json list = Json::array();
-    for (std::string const& text : texts)
-        list.push_back(mihost::toJson(text));
-    return {list, fmt::format("{}", fmt::join(texts, "; "))};
+    return {listToJson(texts), fmt::format("{}", fmt::join(texts, "; "))};
 }
 
 std::string scenarioOf(Result const& result)

@@ -17,7 +17,7 @@ namespace mihost
 namespace
 {
 
-constexpr char text[] = "text";
+constexpr char textFormat[] = "text";
 constexpr char tap[] = "tap";
 constexpr char junit[] = "junit";
 
@@ -31,7 +31,7 @@ public:
             ->type_name("FILE");
         choices_
             .restrict(app.add_option("--format", format_, "how to show the results"),
-                      {text, tap, junit})
+                      {textFormat, tap, junit})
             ->capture_default_str();
         app.add_option("--rounds", rounds_, "number of starts and stops when looking for leaks")
             ->check(between(1, 1000))
@@ -61,7 +61,7 @@ public:
 private:
     void refuseWhatDoesNotFit(Options const& options) const
     {
-        if (options.format != Format::TableText && format_ != text)
+        if (options.format != Format::TableText && format_ != textFormat)
             throw Failure(BadUsage, "check: --format and -o exclude each other");
         if (!options.trace.empty())
             throw Failure(BadUsage, "check: --trace is not supported (leave it out)");
@@ -96,7 +96,7 @@ private:
     }
 
     std::string plugin_;
-    std::string format_ = text;
+    std::string format_ = textFormat;
     unsigned int rounds_ = 5;
     unsigned int timeLimit_ = 120; // seconds
 };

@@ -23,7 +23,7 @@ bool isBeyondFixing(Need const& need)
     return !isMet(need) && !need.noFix.empty();
 }
 
-Cell orNull(std::string const& text)
+Cell cellOrNull(std::string const& text)
 {
     return text.empty() ? Cell(nullptr, "") : Cell(text);
 }
@@ -48,8 +48,8 @@ Table tableOf(std::vector<Need> const& needs)
         table.add({need.what, truth(isMet(need)),
                    isMet(need) ? Cell(nullptr, "") : truth(!isBeyondFixing(need)),
                    isMet(need) ? Cell(nullptr, "") : Cell(*need.problem), need.effect,
-                   orNull(need.fix.debian), orNull(need.fix.redHat), orNull(need.fix.opensuse),
-                   orNull(need.noFix)});
+                   cellOrNull(need.fix.debian), cellOrNull(need.fix.redHat),
+                   cellOrNull(need.fix.opensuse), cellOrNull(need.noFix)});
     return table;
 }
 

@@ -9,9 +9,9 @@ namespace
 {
 
 constexpr TaskValue localGroup = {"GROUP", "LocalGroupName", "", "the group's name"};
-constexpr TaskValue member = {"USER", "DomainAndMember", "", "login name of the member"};
+constexpr TaskValue memberOfGroup = {"USER", "DomainAndMember", "", "login name of the member"};
 
-std::vector<Task> const tasks = {
+std::vector<Task> const groupTasks = {
     {
         "add",
         "add a group",
@@ -37,7 +37,7 @@ std::vector<Task> const tasks = {
         "add-member",
         "add a user to a group",
         "LocalGroupAddUser",
-        {localGroup, member},
+        {localGroup, memberOfGroup},
         {
             {"mihost group add-member staff jdoe", "make jdoe a member of staff"},
             {"mihost --sandbox group add-member staff jdoe", "try it in a sandbox"},
@@ -47,7 +47,7 @@ std::vector<Task> const tasks = {
         "remove-member",
         "remove a user from a group",
         "LocalGroupDelUser",
-        {localGroup, member},
+        {localGroup, memberOfGroup},
         {
             {"mihost group remove-member crew jdoe", "remove jdoe from crew"},
             {"mihost --json group remove-member crew jdoe", "print what changed as JSON"},
@@ -55,10 +55,10 @@ std::vector<Task> const tasks = {
     },
 };
 
-class Group : public TaskCommand
+class GroupCommand : public TaskCommand
 {
 public:
-    Group() : TaskCommand({"group", "GROUP", "the group to show", tasks, showGroup}) {}
+    GroupCommand() : TaskCommand({"group", "GROUP", "the group to show", groupTasks, showGroup}) {}
 };
 
 } // namespace
@@ -66,7 +66,7 @@ public:
 CommandRow const commandRows::group{
     "group",
     "show or change a group",
-    newCommand<Group>,
+    newCommand<GroupCommand>,
     {
         {"mihost group crew", "its id and members"},
         {"mihost group add-member staff jdoe", "add a member"},

@@ -55,14 +55,14 @@ MachineState stateOf(Session& session)
     return state;
 }
 
-Json toJson(std::vector<Metric> const& metrics)
+Json metricsToJson(std::vector<Metric> const& metrics)
 {
     Json list = Json::array();
     for (Metric const& metric : metrics)
         for (Sample const& sample : metric.samples) {
             Json labels = Json::object();
             for (auto const& [name, value] : sample.labels)
-                labels[name] = mihost::toJson(value);
+                labels[name] = toJson(value);
             list.push_back({{"metric", metric.name}, {"labels", labels}, {"value", sample.value}});
         }
     return list;
@@ -106,7 +106,7 @@ private:
         if (!output_.empty())
             replaceFile(output_, metricText(metrics), "writing the metrics");
         else if (session.options().json)
-            session.out().json(toJson(metrics));
+            session.out().json(metricsToJson(metrics));
         else
             session.out().write(metricText(metrics));
     }

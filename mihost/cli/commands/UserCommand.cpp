@@ -8,7 +8,7 @@ namespace mihost
 namespace
 {
 
-constexpr TaskValue user = {"USER", "UserName", "", "login name"};
+constexpr TaskValue account = {"USER", "UserName", "", "login name"};
 constexpr TaskValue minDays = {"--min-days", "daysMustKeepPassword", "N",
                                "set the minimum password age in days"};
 constexpr TaskValue maxDays = {"--max-days", "daysMustChangePasswordAfter", "N",
@@ -18,7 +18,7 @@ constexpr TaskValue warnDays = {"--warn-days", "daysWarnBeforePasswordExpire", "
 constexpr TaskValue inactiveDays = {"--inactive-days", "daysExpireAfter", "N",
                                     "disable the account N days after the password expired"};
 
-std::vector<Task> const tasks = {
+std::vector<Task> const userTasks = {
     {
         "add",
         "add an account",
@@ -48,7 +48,7 @@ std::vector<Task> const tasks = {
         "delete",
         "delete an account, keeping its home directory and mail",
         "UserDel",
-        {user},
+        {account},
         {
             {"mihost user delete jdoe", "delete after a prompt"},
             {"mihost --sandbox user delete jdoe -y", "try it in a sandbox"},
@@ -59,7 +59,7 @@ std::vector<Task> const tasks = {
         "set-shell",
         "set an account's login shell",
         "UserSetScriptPath",
-        {user, {"SHELL", "ScriptPath", "FILE", "absolute path of the shell"}},
+        {account, {"SHELL", "ScriptPath", "FILE", "absolute path of the shell"}},
         {
             {"mihost user set-shell jdoe /bin/bash", "set the shell"},
             {"mihost user set-shell jdoe /usr/sbin/nologin", "refuse logins"},
@@ -69,7 +69,7 @@ std::vector<Task> const tasks = {
         "set-home",
         "move an account's home directory",
         "UserSetHomeDir",
-        {user, {"HOME", "HomeDir", "DIR", "absolute path; the files are moved there"}},
+        {account, {"HOME", "HomeDir", "DIR", "absolute path; the files are moved there"}},
         {
             {"mihost user set-home jdoe /srv/jdoe", "move the directory"},
             {"mihost --sandbox user set-home jdoe /srv/jdoe", "show which files would move"},
@@ -79,7 +79,7 @@ std::vector<Task> const tasks = {
         "set-name",
         "set an account's full name",
         "UserSetFullName",
-        {user, {"FULL-NAME", "FullName", "", "full name"}},
+        {account, {"FULL-NAME", "FullName", "", "full name"}},
         {
             {"mihost user set-name jdoe 'Jane Doe'", "set the full name"},
             {"mihost --json user set-name jdoe 'Jane Doe'", "print what changed as JSON"},
@@ -89,7 +89,7 @@ std::vector<Task> const tasks = {
         "set-password",
         "set an account's password, read from a prompt or standard input",
         "UserSetPassword",
-        {user, {"--password", "Password", "", ""}},
+        {account, {"--password", "Password", "", ""}},
         {
             {"mihost user set-password jdoe", "prompt for the password"},
             {"mihost user set-password jdoe --password-file /root/secret", "read it from a file"},
@@ -99,7 +99,7 @@ std::vector<Task> const tasks = {
         "expire",
         "set the day on which an account expires",
         "UserSetAttrib",
-        {user, {"DAY", "passwordExpirationDate", "", "YYYY-MM-DD or never"}},
+        {account, {"DAY", "passwordExpirationDate", "", "YYYY-MM-DD or never"}},
         {
             {"mihost user expire jdoe 2030-12-31", "expire the account on that day"},
             {"mihost user expire jdoe never", "remove the expiry date"},
@@ -109,7 +109,7 @@ std::vector<Task> const tasks = {
         "age",
         "set an account's password ageing",
         "UserSetAttrib",
-        {user, minDays, maxDays, warnDays, inactiveDays},
+        {account, minDays, maxDays, warnDays, inactiveDays},
         {
             {"mihost user age jdoe --max-days 90 --warn-days 14",
              "require a new password every 90 days"},
@@ -119,10 +119,10 @@ std::vector<Task> const tasks = {
         .needingAnOption(),
 };
 
-class User : public TaskCommand
+class UserCommand : public TaskCommand
 {
 public:
-    User() : TaskCommand({"user", "USER", "the account to show", tasks, showUser}) {}
+    UserCommand() : TaskCommand({"user", "USER", "the account to show", userTasks, showUser}) {}
 };
 
 } // namespace
@@ -130,7 +130,7 @@ public:
 CommandRow const commandRows::user{
     "user",
     "show or change an account",
-    newCommand<User>,
+    newCommand<UserCommand>,
     {
         {"mihost user jdoe", "ids, groups, state and password ageing"},
         {"mihost user set-shell jdoe /bin/sh", "set the login shell"},

@@ -22,12 +22,8 @@ Json valueToJson(IC::PropertyValue const& value)
             list.push_back(number.getValue());
         return list;
     }
-    case IC::PropertyValue::TextsKind: {
-        Json list = Json::array();
-        for (std::string const& text : value.getTexts())
-            list.push_back(toJson(text));
-        return list;
-    }
+    case IC::PropertyValue::TextsKind:
+        return listToJson(value.getTexts());
     case IC::PropertyValue::EmptyKind:
         break;
     }

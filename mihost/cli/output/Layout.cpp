@@ -23,7 +23,7 @@ namespace mihost
 namespace
 {
 
-constexpr char gap[] = "  ";
+constexpr char columnGap[] = "  ";
 constexpr std::size_t gapWidth = 2;
 constexpr std::size_t branchWidth = 2; // of each level of a tree
 constexpr std::size_t leastText = 20;  // columns in which wrapped text can still be read
@@ -85,7 +85,7 @@ public:
         scols_table_enable_noheadings(table_.get(), hasHeadings ? 0 : 1);
         scols_table_enable_noencoding(table_.get(), 1);
         scols_table_set_termforce(table_.get(), SCOLS_TERMFORCE_NEVER);
-        require(scols_table_set_column_separator(table_.get(), gap));
+        require(scols_table_set_column_separator(table_.get(), columnGap));
     }
 
     /**
@@ -230,7 +230,8 @@ std::string branchText(Branch const& branch, Room const& room)
 /** Name and text of a branch in one column, for a room that has none for two. */
 std::string wholeBranch(Branch const& branch, Room const& room, std::size_t indent)
 {
-    std::string const start = branch.text.empty() ? branch.name : branch.name + gap + branch.text;
+    std::string const start =
+        branch.text.empty() ? branch.name : branch.name + columnGap + branch.text;
     std::vector<std::string> lines = wrapped(start, std::max(room.columns, leastText));
     if (!branch.details.rows.empty())
         for (std::string const& line : layOut(branch.details, room.indented(branchWidth)))

@@ -20,7 +20,7 @@ Cell number(unsigned int value)
     return {value, std::to_string(value)};
 }
 
-constexpr Attribute attributes[] = {
+constexpr Attribute nodeAttributes[] = {
     {"id", [](IC::MutableNode const& node) { return number(node.getNodeId()); }},
     {"index", [](IC::MutableNode const& node) { return number(node.getIndex()); }},
     {"status", [](IC::MutableNode const& node) { return number(node.getStatus()); }},
@@ -33,7 +33,7 @@ std::vector<Column> columnsOf(NodeKind const& kind)
     std::vector<Column> columns;
     for (Property const& property : kind.properties)
         columns.push_back({property.name, Column::Align::Left, std::to_string(property.id)});
-    for (Attribute const& attribute : attributes)
+    for (Attribute const& attribute : nodeAttributes)
         columns.push_back({attribute.name, Column::Align::Left, ""});
     return columns;
 }
@@ -56,7 +56,7 @@ Table tableOf(NodeKind const& kind, std::vector<NodeView> const& views, Property
         std::vector<Cell> cells;
         for (Property const& property : kind.properties)
             cells.push_back(cellOf(view, property.id, style));
-        for (Attribute const& attribute : attributes)
+        for (Attribute const& attribute : nodeAttributes)
             cells.push_back(attribute.of(*view.node));
         table.add(std::move(cells));
     }

@@ -11,7 +11,7 @@ namespace mihost
 namespace
 {
 
-constexpr char variable[] = "LC_ALL";
+constexpr char localeVariable[] = "LC_ALL";
 
 /** What useCommandLocale() replaced. */
 struct Replaced {
@@ -30,10 +30,10 @@ Replaced& replaced()
 void useCommandLocale()
 {
     if (!replaced().isReplaced) {
-        char const* const value = std::getenv(variable);
+        char const* const value = std::getenv(localeVariable);
         replaced() = {true, value ? std::optional<std::string>(value) : std::nullopt};
     }
-    setenv(variable, "C", 1);
+    setenv(localeVariable, "C", 1);
 }
 
 std::vector<std::string> userEnvironment()
@@ -43,7 +43,7 @@ std::vector<std::string> userEnvironment()
         variables.emplace_back(*each);
     if (!replaced().isReplaced)
         return variables;
-    std::string const start = std::string(variable) + '=';
+    std::string const start = std::string(localeVariable) + '=';
     variables.erase(std::remove_if(variables.begin(), variables.end(),
                                    [&start](std::string const& each) {
                                        return each.compare(0, start.size(), start) == 0;

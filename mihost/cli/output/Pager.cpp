@@ -5,11 +5,13 @@
 #include "mihost/cli/system/Stderr.h"
 #include "mihost/sandbox/Descriptor.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <csignal>
 #include <cstdlib>
 #include <fcntl.h>
 #include <fmt/format.h>
+#include <iterator>
 #include <spawn.h>
 #include <sys/wait.h>
 #include <termios.h>
@@ -74,6 +76,14 @@ private:
     termios before_{};
 };
 
+/** Whether sudo, doas or pkexec started this program. */
+bool isRunForAnotherUser()
+{
+    constexpr char const* variables[] = {"SUDO_UID", "DOAS_USER", "PKEXEC_UID"};
+    return std::any_of(std::begin(variables), std::end(variables),
+                       [](char const* name) { return std::getenv(name) != nullptr; });
+}
+
 /** The variables of the pager: the user's, and some that pagers read unless the user set them. */
 std::vector<std::string> pagerEnvironment()
 {
@@ -84,7 +94,7 @@ std::vector<std::string> pagerEnvironment()
     };
     setUnlessSet("LESS", "FRX"); // leave if all fits, show colours, keep the screen
     setUnlessSet("LV", "-c");
-    if (std::getenv("SUDO_UID")) // permission to run this program is none to run a shell
+    if (isRunForAnotherUser()) // permission to run this program is none to run a shell
         setUnlessSet("LESSSECURE", "1");
     return variables;
 }

@@ -20,7 +20,8 @@ protected:
     {
         setenv("LC_ALL", "C.UTF-8", 1);
         setenv("TERM", "xterm", 1);
-        for (char const* name : {"PAGER", "LESS", "LESSSECURE", "SUDO_UID", "NO_COLOR"})
+        for (char const* name :
+             {"PAGER", "LESS", "LESSSECURE", "SUDO_UID", "DOAS_USER", "PKEXEC_UID", "NO_COLOR"})
             unsetenv(name);
         setenv("MIHOST_PAGER", "cat >/tmp/paged", 1);
         machine::lay("plain");
@@ -119,6 +120,19 @@ TEST_F(MihostPager, ReceivesTheUsersLocaleAndOptionsForLess)
     TerminalRun again({"list", "users"});
     again.end();
     EXPECT_EQ(machine::read("/tmp/seen"), "C.UTF-8 S 1\n");
+}
+
+TEST_F(MihostPager, StartsNoShellUnderDoasOrPkexecEither)
+{
+    setenv("MIHOST_PAGER", "echo \"${LESSSECURE-none}\" >/tmp/seen; cat >/dev/null", 1);
+    for (char const* caller : {"DOAS_USER", "PKEXEC_UID"}) {
+        setenv(caller, "1000", 1);
+        machine::remove("/tmp/seen");
+        TerminalRun run({"list", "users"});
+        run.end();
+        unsetenv(caller);
+        EXPECT_EQ(machine::read("/tmp/seen"), "1\n") << caller;
+    }
 }
 
 TEST_F(MihostPager, MayEndBeforeItReadsEverything)

@@ -4,6 +4,7 @@
 
 #include <fmt/format.h>
 #include <fmt/ranges.h>
+#include <set>
 
 namespace mihost
 {
@@ -43,8 +44,10 @@ std::string metricText(std::vector<Metric> const& metrics)
         text += fmt::format("# HELP {0} {1}\n# TYPE {0} gauge\n", metric.name, metric.help);
         if (*metric.unit)
             text += fmt::format("# UNIT {} {}\n", metric.name, metric.unit);
+        std::set<std::string> written;
         for (Sample const& sample : metric.samples)
-            text += fmt::format("{}{} {}\n", metric.name, labelText(sample), sample.value);
+            if (std::string const labels = labelText(sample); written.insert(labels).second)
+                text += fmt::format("{}{} {}\n", metric.name, labels, sample.value);
     }
     return text + "# EOF\n";
 }

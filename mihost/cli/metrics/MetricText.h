@@ -27,6 +27,9 @@ struct Metric {
  *
  * This is also valid in Prometheus' older text format, which node_exporter's textfile collector
  * reads: every metric is a gauge, and additions of OpenMetrics are comments there.
+ *
+ * Of samples with the same labels, such as those of accounts with the same name, only the first one
+ * is written: with both, node_exporter would answer no scrape at all.
  */
 std::string metricText(std::vector<Metric> const& metrics);
 

@@ -39,8 +39,19 @@ TEST(MetricText, EscapesCharactersThatWouldEndALabel)
 
 TEST(MetricText, WritesWholeNumbersInFull)
 {
-    std::string const text = metricText({{"x", "", "X.", {{{}, 1795276425}, {{}, 68719476736}}}});
-    EXPECT_NE(text.find("x 1795276425\nx 68719476736\n"), std::string::npos) << text;
+    std::string const text =
+        metricText({{"x", "", "X.", {{{}, 1795276425}, {{{"a", "1"}}, 68719476736}}}});
+    EXPECT_NE(text.find("x 1795276425\nx{a=\"1\"} 68719476736\n"), std::string::npos) << text;
+}
+
+// As for two accounts of the same name, or two names that read the same once they are escaped.
+TEST(MetricText, HasOnlyTheFirstOfSamplesWithTheSameLabels)
+{
+    std::string const text = metricText(
+        {{"x", "", "X.", {{{{"n", "\xff"}}, 1}, {{{"n", "\\xff"}}, 2}, {{{"n", "b"}}, 3}}},
+         {"y", "", "Y.", {{{{"n", "b"}}, 4}}}});
+    EXPECT_NE(text.find("x{n=\"\\\\xff\"} 1\nx{n=\"b\"} 3\n"), std::string::npos) << text;
+    EXPECT_NE(text.find("y{n=\"b\"} 4\n"), std::string::npos) << text;
 }
 
 } // namespace metric_text_test

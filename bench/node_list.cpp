@@ -1,7 +1,7 @@
-// How the runtime's node list copes with many nodes.
+// How fast the runtime's node list is with many nodes.
 //
-//   Alternate/N  one node deleted and a new one added, in a list of N nodes; shall not grow with N
-//   Rebuild/N    N nodes deleted and N added, as a refresh does it; shall grow with N
+//   Alternate/N  one node deleted and a new one added, in a list of N nodes; must not grow with N
+//   Rebuild/N    N nodes deleted and N added, as a refresh does it; may grow linearly with N
 
 #include "host/ManagementInterface.h"
 #include "host/MutableNode.h"
@@ -13,7 +13,7 @@
 namespace
 {
 
-/** A list of nodes that come and go as a plug-in's do. */
+/** A list of nodes that are added and deleted as a plug-in does. */
 class Nodes
 {
 public:

@@ -24,7 +24,7 @@ namespace
 
 constexpr char const* perCall = "allocations per call";
 
-/** Runs something again and again, and counts what it allocates. */
+/** Runs something repeatedly and counts its allocations. */
 void repeat(benchmark::State& state, std::function<void()> const& once)
 {
     unsigned long const before = allocations();
@@ -59,7 +59,7 @@ void addRejectedCall(IC::MutableNode& os)
         [&os, call] { benchmark::DoNotOptimize(os.setProperty(IC::property::createUser, call)); });
 }
 
-/** Keeps what each repetition took, in the order in which they were added. */
+/** Records the time of each repetition, in the order in which they were added. */
 class Keeper : public benchmark::BenchmarkReporter
 {
 public:

@@ -6,7 +6,7 @@
 //
 // The machine is made up: every user has a primary group of its own, and one group holds all
 // users. Files are real ones below a temporary folder; no command is run, nothing is logged.
-// After the runs each one's growth from 1,000 to 10,000 users is printed; it shall be at most 12.
+// After the runs each one's growth from 1,000 to 10,000 users is printed; it must be at most 12.
 
 #include "frame/OsSwMI.h"
 #include "host/Properties.h"
@@ -34,7 +34,7 @@ std::string nameOf(unsigned int user)
     return "user" + std::to_string(firstId + user);
 }
 
-/** Lays a machine with this many users under the program for as long as it lives. */
+/** Makes the program read the files of a machine with this many users while it exists. */
 class MadeUpMachine
 {
 public:
@@ -71,7 +71,7 @@ public:
     MadeUpMachine& operator=(MadeUpMachine const&) = delete;
 
 private:
-    /** As long as a distribution's own, with one rule that counts. */
+    /** As many rules as a distribution has, of which one matters. */
     static std::string loginRules()
     {
         std::string rules;
@@ -144,7 +144,7 @@ void Refresh(benchmark::State& state)
 BENCHMARK(StartUp)->Arg(100)->Arg(small)->Arg(large)->Unit(benchmark::kMillisecond);
 BENCHMARK(Refresh)->Arg(100)->Arg(small)->Arg(large)->Unit(benchmark::kMillisecond);
 
-/** Prints the runs as usual and keeps the median, or the only, time of each. */
+/** Prints the runs as usual and records the median, or the only, time of each. */
 class KeepingReporter : public benchmark::ConsoleReporter
 {
 public:

@@ -4,9 +4,9 @@
 #include "mihost/sandbox/Descriptor.h"
 
 /**
- * A network with nothing in it but its own loopback.
+ * A network with only a loopback interface.
  *
- * To be made before the copy of the machine is entered, which may not change networks.
+ * Make it before entering the copy of the machine, in which networks cannot be changed.
  */
 class Loopback
 {
@@ -14,7 +14,7 @@ public:
     /** Keeps the process in its present network. @throws std::system_error */
     Loopback();
 
-    /** Takes the process there; what it starts from now on reaches nobody outside. */
+    /** Moves the process there; what it starts from now on cannot reach other machines. */
     void enter() const;
 
 private:

@@ -36,13 +36,13 @@ struct Peer {
     char const* leavesOut; // of the plug-in's facts
 };
 
-/** Listens on the loopback alone, which by then is that of a network of its own. */
+/** @return the command of an agent that listens only on the loopback of its own network */
 std::string agent(std::string const& port)
 {
     return "snmpd -f -LF 0 /dev/null -C -r --rocommunity=public udp:127.0.0.1:" + port;
 }
 
-/** One part of the host resources: 1 the system, 2 its storage, 4 its processes. */
+/** @return the command to read one part of the host resources: 1 system, 2 storage, 4 processes */
 std::string walk(std::string const& port, std::string const& part)
 {
     return "snmpwalk -v2c -c public -r 0 -Oq 127.0.0.1:" + port + " .1.3.6.1.2.1.25." + part;
@@ -98,7 +98,7 @@ void install()
                                  "them");
 }
 
-/** snmpd, from when it answers for as long as the object lives. */
+/** Runs snmpd while it exists; the constructor returns when it answers. */
 class Agent
 {
 public:
@@ -149,7 +149,7 @@ void compare(std::vector<Peer> const& peers, int users, std::string const& scrip
         auto const run = [](std::string const& line) {
             return timed({"/bin/sh", "-c", "{ " + line + "; } >/dev/null"}).whole;
         };
-        run(peer.command); // what it keeps for the next time is there from now on
+        run(peer.command); // so that its cache is filled
         byTurns(quick ? quickRounds : rounds,
                 {[&] { found.its.push_back(run(peer.command)); },
                  [&] { found.mihost.push_back(run(mihostTelling("", script))); },

@@ -37,7 +37,7 @@ struct Figures {
 
 Figures figuresNow()
 {
-    malloc_trim(0); // what the allocator only keeps for later is not lost
+    malloc_trim(0); // so that memory which the allocator only keeps does not count
     long pages = 0;
     long resident = 0;
     std::ifstream("/proc/self/statm") >> pages >> resident;

@@ -1,7 +1,7 @@
 // startup_host PLUGIN [READS [LIST]]: starts the plug-in as a host does, without a log, and prints
 // the processor time that it took itself, in microseconds. Then reads the newest log entry's
 // message once and READS times more, and prints the mean time of each kind of read, in
-// microseconds. With a file given, notes there every command that the start runs, one a line.
+// microseconds. If a file is given, writes every command of the start to it, one a line.
 
 #include "host/MutableNode.h"
 #include "host/OpenMI.h"

@@ -4,10 +4,10 @@
 // In a copy of this machine with 120 kernel modules, 10 users and a log of 1,000, 100,000 and
 // 1,000,000 lines, run alternately
 //
-//   bare         startup_commands: passes the command lines of a start, in order, to popen and
-//   reads their output plug-in      startup_host: loads the plug-in and initialises it, from its
-//   start to its end accelerated  startup_host_fast: the same host, linked to the accelerator
-//   mihost       mihost get os: the first answer of the program, which uses the accelerator
+//   bare         startup_commands: runs the commands of a start, in order, with popen
+//   plug-in      startup_host: loads the plug-in and initialises it
+//   accelerated  startup_host_fast: the same host, linked to the accelerator
+//   mihost       mihost get os: the first answer of the program, with the accelerator
 //
 // Prints for each log the time of each, from its start to its end, and the processor time that
 // bare and plug-in take themselves, without that of their children; then what reading a log

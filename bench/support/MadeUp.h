@@ -3,7 +3,7 @@
 
 #include <string>
 
-/** What a made-up machine holds, laid over the copy that this process runs in. */
+/** Adds invented contents to the copy of the machine that this process runs in. */
 namespace madeUp
 {
 
@@ -13,10 +13,10 @@ namespace madeUp
  */
 void accounts(int users);
 
-/** So many loaded kernel modules, which the real lsmod and modinfo know. To be called once. */
+/** Makes lsmod and modinfo list that many loaded kernel modules. Call it once. */
 void modules(int count);
 
-/** A system log of so many lines. */
+/** Writes a system log of that many lines. */
 void systemLog(int lines);
 
 } // namespace madeUp

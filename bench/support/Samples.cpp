@@ -6,7 +6,7 @@
 namespace
 {
 
-/** The value that this share of all is not above; between two, a mixture of both. */
+/** @return the value that this share of all does not exceed, interpolated between two samples */
 double quantile(Samples samples, double share)
 {
     std::sort(samples.begin(), samples.end());

@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-/** What one thing was measured to be, each time. */
+/** The results of repeated measurements of one thing. */
 using Samples = std::vector<double>;
 
 /** Neither of them is empty. */
@@ -18,7 +18,7 @@ std::string shown(Samples const& samples, int digits = 0);
 /** The ratios of alternating measurements, pair by pair. */
 Samples ratios(Samples const& above, Samples const& below);
 
-/** Has everybody run once a round, in turning order. */
+/** Calls each function once per round, in turn forwards and backwards. */
 void byTurns(std::size_t rounds, std::vector<std::function<void()>> const& runs);
 
 std::string number(double value, int digits = 0);

@@ -4,10 +4,10 @@
 #include <string>
 #include <vector>
 
-/** Milliseconds on a clock that is never set. */
+/** @return milliseconds of a clock that is never set */
 double millisecondsNow();
 
-/** What a program's run took, in milliseconds, and what it printed. */
+/** The times of a program's run, in milliseconds, and what it printed. */
 struct Timed {
     double whole; // from its start to its end
     double cpu;   // user and system time, its children's included
@@ -20,7 +20,7 @@ Timed timed(std::vector<std::string> const& arguments);
 /** Enters a copy of this machine. @throws std::runtime_error if none can be created */
 void enterCopy();
 
-/** A program's main: errors go to standard error. Takes --quick. */
+/** A program's main: accepts --quick and writes errors to standard error. */
 int runBench(int argc, char* argv[], void (*measure)(bool quick));
 
 #endif

@@ -9,7 +9,7 @@
 namespace miaccel
 {
 
-/** Why a command was run rather than answered; a text that lives for good. Null: it was not. */
+/** Why a command was run rather than answered, a text that is never freed; null if it was not. */
 using Reason = char const*;
 
 /** What a command prints. Without a text, the command is left to the real popen. */
@@ -23,7 +23,7 @@ inline Answer declined(Reason reason)
     return {std::nullopt, reason};
 }
 
-/** What a command line names. */
+/** The operands of a command line. */
 struct Operands {
     std::string name; // of a file or a module
     std::uint64_t line = 0;

@@ -24,7 +24,7 @@ bool isOfFileName(char c)
     return isOfModuleName(c) || std::string_view("/.+,:@").find(c) != std::string_view::npos;
 }
 
-/** Takes the characters of a kind off the line's front. */
+/** Removes the characters of a kind from the beginning of the line. @return them */
 std::string take(std::string_view& line, bool (*isOfKind)(char))
 {
     auto const end = std::find_if_not(line.begin(), line.end(), isOfKind);

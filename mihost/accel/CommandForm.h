@@ -9,9 +9,9 @@ namespace miaccel
 {
 
 /**
- * The operands of a command line that has the given form, such as "sed -n '#p' @". A # is a line
- * number from 1 on, @ the name of a file and ~ that of a module, none of which a shell would expand
- * or a tool read as an option. Everything else must be as it is in the form.
+ * @return the operands of a command line that has the given form, such as "sed -n '#p' @"; nothing
+ *         if it has another one. In a form, # is a line number from 1 on, @ the name of a file and
+ *         ~ that of a module, none of which a shell would expand or a tool read as an option.
  */
 std::optional<Operands> operandsOf(std::string_view form, std::string_view line);
 

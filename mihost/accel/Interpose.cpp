@@ -1,4 +1,4 @@
-// What callers of the C library reach: popen and pclose in its place.
+// popen and pclose, which callers reach instead of those of the C library.
 
 #include "mihost/accel/Accel.h"
 #include "mihost/accel/Stream.h"

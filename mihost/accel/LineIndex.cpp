@@ -13,7 +13,7 @@ namespace
 
 using Buffer = std::array<char, LineIndex::block>;
 
-/** Counts in bytes, as many as cannot overflow one, which compilers turn into wide instructions. */
+/** Counts in blocks so small that a byte can count them: compilers vectorise such a loop. */
 std::uint64_t countLineEnds(char const* text, std::uint64_t length)
 {
     constexpr std::uint64_t stretch = 255;

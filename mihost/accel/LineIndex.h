@@ -26,8 +26,8 @@ public:
     static constexpr std::uint64_t edge = 16'384;
 
     /**
-     * Updates the index: reads what was appended, or everything if the file is another one or
-     * changed in another way.
+     * Updates the index: reads what was appended, or the whole file if it is another one or changed
+     * in another way.
      *
      * @param now  the file's state, which was taken before
      * @return false if the file cannot be read to its end at that time
@@ -48,7 +48,7 @@ public:
      * The offset at which a line begins: the end of the file past the last line.
      *
      * @param line  1 for the first
-     * @return nothing if another file has taken the place of the indexed one
+     * @return nothing if the file is not the indexed one
      */
     std::optional<std::uint64_t> find(int file, std::uint64_t line) const;
 

@@ -18,8 +18,8 @@ constexpr std::uint64_t longestLine = 16'777'216;
 constexpr Reason unsteady = "the file changes while it is read";
 
 /**
- * What other machines or programs keep, who may change files without a new time; what counts time
- * in seconds; what makes up its contents when read.
+ * File systems of other machines or programs, which may change files without a new time; those with
+ * times in whole seconds; those that generate the contents of a file when it is read.
  */
 constexpr unsigned int declinedFileSystems[] = {
     NFS_SUPER_MAGIC,   SMB_SUPER_MAGIC,   CIFS_SUPER_MAGIC,
@@ -51,7 +51,7 @@ Answer countText(int, LineIndex const& index, Operands const& operands)
 Answer lineText(int file, LineIndex const& index, Operands const& operands)
 {
     std::uint64_t const line = operands.line;
-    // busybox ends a line at NUL, and adds the end that the last line may lack.
+    // busybox ends a line at a NUL byte, and adds a missing line end to the last line.
     if (index.hasNul())
         return declined("the file has NUL bytes, which versions of sed treat differently");
     std::optional<std::uint64_t> const begin = index.find(file, line);
@@ -89,7 +89,7 @@ Answer withIndex(Operands const& operands,
     if (!index.update(file, before))
         return declined(unsteady);
     Answer answer = work(file, index, operands);
-    // A command that started earlier would not have seen later additions either.
+    // What is appended from here on would also be missing from a command that started earlier.
     struct stat after {
     };
     if (fstat(file, &after) != 0 || after.st_size < before.st_size)

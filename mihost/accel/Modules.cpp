@@ -28,7 +28,7 @@ using Module = std::unique_ptr<kmod_module, Release<kmod_module_unref>>;
 using Modules = std::unique_ptr<kmod_list, Release<kmod_module_unref_list>>;
 using Facts = std::unique_ptr<kmod_list, Release<kmod_module_info_free_list>>;
 
-/** libkmod for one query. What it would write to standard error is noted instead. */
+/** libkmod for one query. What it would write to standard error is recorded instead. */
 class Library
 {
 public:
@@ -92,7 +92,7 @@ std::string factLine(std::string_view key, std::string const& value)
     return line + value + '\n';
 }
 
-/** A module has the text and the type of a parameter apart, in any order. */
+/** In a module the text and the type of a parameter are separate entries, in any order. */
 struct Parameter {
     std::string name;
     std::optional<std::string> text = {};

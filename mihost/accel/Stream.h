@@ -9,12 +9,12 @@ namespace miaccel
 {
 
 /**
- * A stream with what the command prints, or null if that is left to the real popen. Counts which of
- * the two it was. Throws nothing.
+ * @return a stream with what the command prints, or null if the real popen must run it. Counts
+ *         which of the two it was. Throws nothing.
  */
 FILE* openAnswer(char const* command, char const* mode) noexcept;
 
-/** A stream without a descriptor that reads the text, which it owns; null if none can be made. */
+/** @return a stream without a descriptor that reads the text; null if none can be made */
 FILE* openStream(std::string text);
 
 /** The popen and pclose that this library interposes. */

@@ -25,7 +25,7 @@ struct Disturbing {
 };
 
 /**
- * What makes a shell run something else than the tool, or the tool something else than its own.
+ * Variables that make a shell run another program than the tool, or that change what the tool does.
  * Not listed: POSIXLY_CORRECT, which changes nothing of what these tools print here; TZ and the
  * variables of locales, which date() takes into account; KMOD_LOG, which makes libkmod complain
  * in this process as well.
@@ -59,7 +59,7 @@ Reason disturbance(std::string const& variable)
 
 Reason disturbance()
 {
-    // A shell gives up one of two identities, and may then not be able to read a file.
+    // A shell drops one of two identities, and may then be unable to read a file.
     if (getuid() != geteuid() || getgid() != getegid())
         return "the real and the effective user or group differ";
     for (char** variable = environ; variable && *variable; ++variable)

@@ -9,7 +9,7 @@ namespace miaccel
 /** Which program a command must be: any of its name, or a link to the program kmod. */
 enum class Tool { Any, Kmod };
 
-/** Why a shell might run something else than the tool of this name; null if it would not. */
+/** @return why a shell might run something other than the usual tool of this name; null if not */
 Reason distrust(char const* name, Tool tool);
 
 } // namespace miaccel

@@ -8,7 +8,7 @@
 namespace hostcheck
 {
 
-/** One promise of a host's framework. */
+/** One requirement of a host's framework. */
 struct Check {
     char const* operation; // as declared in host/
     char const* promise;   // what it does

@@ -1,4 +1,4 @@
-// A plug-in that does nothing to the system: it checks its host, and its tree is what it found.
+// A plug-in that changes nothing: it checks its host, and its tree shows the findings.
 
 #include "host/OpenMI.h"
 

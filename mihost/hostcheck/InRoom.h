@@ -47,7 +47,7 @@ public:
     }
 
 private:
-    /** Another byte for each object: a copy of another object's room is noticed, too. */
+    /** @return another byte for each object, so that a copy of another object's room is noticed */
     static unsigned char nextFill()
     {
         static unsigned char fill = 0xA0;

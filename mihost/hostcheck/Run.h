@@ -22,8 +22,8 @@ public:
     Run();
 
     /**
-     * Checks what everything else rests on: layouts, virtual operations, type information. Stops at
-     * the first that is wrong, since calls of such a host go astray.
+     * Checks what everything else needs: layouts, virtual operations, type information. Stops at
+     * the first failure, since calls of such a host would reach wrong functions.
      */
     bool checkGround();
 

@@ -24,7 +24,7 @@ struct Slot {
     char const* symbol; // null if hosts need not export one
 };
 
-// A destructor takes two slots: for objects in place and for those made with new.
+// A destructor has two slots: for destruction in place and for delete.
 
 constexpr Slot interfaceSlots[] = {
     {"getMap", "_ZN2IC19ManagementInterface6getMapERSt6vectorIPNS_4NodeESaIS3_EE"},
@@ -86,7 +86,7 @@ std::string nameOf(void* code)
     return known ? demangled(info.dli_sname) : "something without a name";
 }
 
-/** How many slots the linker says there are; the expected number if it does not say. */
+/** @return the number of slots by the symbol table; the expected number if it is unknown */
 std::size_t slotCount(void* const* table, std::size_t expected)
 {
     Dl_info info{};

@@ -26,14 +26,14 @@ public:
 
     bool holds(List const& list, IC::Node const* node);
 
-    /** Takes a node out of the list. @return false if the list does not hold it */
+    /** Removes a node from the list. @return false if it is not in the list */
     bool remove(List & list, IC::Node const* node);
 
     /** Forgets all positions: the list was emptied. */
     void reset();
 
 private:
-    /** Notes the positions of what the interface appended since the last call. */
+    /** Records the positions of what the interface appended since the last call. */
     void catchUp(List const& list);
     void closeGaps(List & list);
 

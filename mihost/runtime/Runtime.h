@@ -36,7 +36,7 @@ public:
     virtual void write(LogMessage const& message) = 0;
 };
 
-/** Informed of nodes that come and go after the start; the node is alive during the call. */
+/** Informed of nodes added and deleted after the start; the node exists during the call. */
 class NodeObserver
 {
 public:
@@ -57,9 +57,9 @@ void setNodeObserver(NodeObserver* observer);
 NodeObserver* nodeObserver();
 
 /**
- * Sets what the framework's initialize answers from now on, null for success. The interface is
- * prepared all the same, so a plug-in can be seen to build its tree after a failure. The answer
- * stays the caller's and must outlive its use.
+ * Sets what the framework's initialize returns from now on, null for success. The interface is
+ * prepared in any case, which shows whether a plug-in builds its tree after a failure. The caller
+ * owns the answer, which must outlive its use.
  */
 void setInitializeAnswer(IC::Error const* answer);
 

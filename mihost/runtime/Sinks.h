@@ -13,7 +13,7 @@ namespace mihost
 /**
  * Writes whole lines to a stream, from any thread.
  *
- * The stream stays the caller's. The first failure is kept, and nothing is written after it.
+ * The caller owns the stream. The first failure is kept, and nothing is written after it.
  */
 class LineWriter
 {

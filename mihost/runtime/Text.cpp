@@ -25,7 +25,7 @@ constexpr Lead leads[] = {
     {0xF8, 0xF0, 4, 0x10000},
 };
 
-/** Characters that a terminal obeys or that make a line look other than it is. */
+/** Characters that control a terminal or make a line look different from what it is. */
 bool isTreacherous(char32_t character)
 {
     struct Range {
@@ -77,7 +77,7 @@ bool isPlain(char byte)
     return byte >= 0x20 && byte < 0x7F;
 }
 
-/** Moves the run that a text begins with to the end of another. */
+/** Moves the characters of a kind from the beginning of a text to the end of another. */
 template <class Belongs>
 void moveRun(std::string_view& from, std::string& to, Belongs const& belongs)
 {

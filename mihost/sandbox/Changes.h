@@ -18,7 +18,7 @@ struct FileState {
     std::string target; // of a symbolic link
 };
 
-/** What became of one path. */
+/** How one path changed. */
 struct PathChange {
     std::string path;
     std::optional<FileState> before; // none: it was not there
@@ -33,7 +33,7 @@ struct PathChange {
 class CopyState
 {
 public:
-    /** As it is now; nothing outside of a copy. @throws std::system_error */
+    /** Reads the present state; empty outside a copy. @throws std::system_error */
     static CopyState read();
 
     /**

@@ -12,7 +12,7 @@ namespace mihost
 /**
  * The names in an open folder, in no order.
  *
- * @param path  what the directory is called in an error
+ * @param path  the directory's name in an error message
  * @throws std::system_error
  */
 std::vector<std::string> namesIn(Descriptor const& folder, std::string const& path);

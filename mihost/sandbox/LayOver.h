@@ -8,10 +8,10 @@
 namespace mihost
 {
 
-/** Opens a folder to lay over later, by when its path may lead elsewhere. */
+/** Opens a directory for layOver, since its path may lead elsewhere by then. */
 Descriptor openFolder(std::string const& path);
 
-/** Lays the open folder's files over /; see layOver. */
+/** Replaces files below / by those of the open directory; see layOver in Sandbox.h. */
 void layOver(Descriptor const& folder);
 
 } // namespace mihost

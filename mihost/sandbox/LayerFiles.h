@@ -15,13 +15,13 @@
 namespace mihost::layerFiles
 {
 
-/** None if nothing is there. */
+/** @return nothing if there is no file */
 std::optional<struct stat> statusOf(Descriptor const& root, std::string const& path);
 
-/** What a symbolic link leads to. */
+/** @return the target of a symbolic link */
 std::string targetOf(Descriptor const& root, std::string const& path);
 
-/** None for a file that holds a zero byte or is longer than 8 MiB. */
+/** @return nothing for a file that contains a NUL byte or is longer than 8 MiB */
 std::optional<std::string> textOf(Descriptor const& root, std::string const& path);
 
 /** Whether the file at the path holds the same bytes below both directories. */

@@ -95,7 +95,7 @@ void copyFile(std::string const& path, struct stat const& status)
     check(fchmod(to.get(), status.st_mode & 07777), "cannot copy " + path);
 }
 
-/** What cannot be copied can be seen but not written; what cannot even be bound stays away. */
+/** Mounts that cannot be copied are read-only; those that cannot even be bound are left out. */
 void addMount(std::string const& path, Overlays& overlays)
 {
     struct stat status {
@@ -125,7 +125,7 @@ void addDevices()
         Descriptor const file(check(open(place.c_str(), O_CREAT | O_WRONLY | O_CLOEXEC, 0600),
                                     "cannot create " + place));
         bind(device, place);
-        makeReadOnly(place); // the device still takes writes, its owner and mode do not change
+        makeReadOnly(place); // the device can be written, its owner and mode cannot change
     }
     struct Link {
         char const* name;

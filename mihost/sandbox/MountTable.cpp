@@ -53,7 +53,7 @@ bool hasItsOwnInTheCopy(std::string const& path)
 
 bool isKernelsOwn(std::string const& type)
 {
-    // Looking into an autofs would mount things on the real machine.
+    // Reading an autofs would mount file systems on the real machine.
     static std::set<std::string> const types = {
         "autofs", "binfmt_misc", "bpf",        "cgroup",    "cgroup2", "configfs", "debugfs",
         "devpts", "efivarfs",    "fusectl",    "hugetlbfs", "mqueue",  "proc",     "rpc_pipefs",

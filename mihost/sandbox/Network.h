@@ -5,8 +5,8 @@ namespace mihost
 {
 
 /**
- * Turns on the only interface of a new network namespace, so that its processes can reach each
- * other. It stays off without CAP_NET_ADMIN, as in a copy inside another.
+ * Enables the only interface of a new network namespace, so that its processes can reach each
+ * other. Does nothing without CAP_NET_ADMIN, as in a copy inside another.
  */
 void startLoopback();
 

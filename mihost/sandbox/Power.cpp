@@ -24,7 +24,7 @@ char const* const standIn = "#!/bin/sh\n"
 
 void replace(std::string const& path)
 {
-    // A link would lead to something that does more than power off.
+    // A link leads to a program that has other uses than to power off.
     if (unlink(path.c_str()) != 0 && errno != ENOENT)
         failed("cannot replace " + path);
     Descriptor const file(check(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0700),

@@ -4,14 +4,14 @@
 namespace mihost
 {
 
-/** Drops for good the privileges that reach from the copy to the machine itself. */
+/** Drops permanently the privileges that affect the machine itself from within the copy. */
 void dropMachinePrivileges();
 
 /**
- * Closes the kernel's log and its audit records to the process and its children. To them the kernel
- * looks like one without auditing: account tools that cannot write a record otherwise fail.
+ * Denies the kernel's log and its audit records to the process and its children. The kernel looks
+ * to them like one without auditing, since account tools fail if they cannot write a record.
  *
- * To be called while CAP_SYS_ADMIN is there.
+ * Call it while the process has CAP_SYS_ADMIN.
  */
 void refuseKernelsRecords();
 

@@ -46,7 +46,7 @@ int relayTo(pid_t child)
                 if (ended == child)
                     return status;
         } else if (signal > 0 && info.si_code != SI_KERNEL) {
-            // What a terminal sends, the child got itself.
+            // The terminal has sent its signals to the child, too.
             kill(child, signal);
         }
     }

@@ -7,7 +7,7 @@
 namespace mihost
 {
 
-/** Keeps back the signals that relayTo passes on, and SIGCHLD, for as long as it lives. */
+/** Blocks the signals that relayTo passes on, and SIGCHLD, while it exists. */
 class HeldSignals
 {
 public:
@@ -21,14 +21,14 @@ private:
 };
 
 /**
- * Passes signals on to the child and reaps every child that ends until this one has. To be called
- * while signals are held.
+ * Passes signals on to the child and reaps every child that ends, until this one has ended. Call it
+ * while a HeldSignals exists.
  *
  * @return its wait status
  */
 int relayTo(pid_t child);
 
-/** Ends the process as one with this wait status ended, by the exit code or by the signal. */
+/** Ends the process with the exit code, or by the signal, of this wait status. */
 [[noreturn]] void endLike(int waitStatus);
 
 } // namespace mihost

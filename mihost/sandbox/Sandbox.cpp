@@ -93,7 +93,7 @@ void makeSandbox(Descriptor const& overlay)
     dropMachinePrivileges();
 }
 
-/** Returns in the sandboxed process; the copy's first process stays here and looks after it. */
+/** Returns only in the sandboxed process; the copy's first process stays here and waits for it. */
 void runAsFirstProcess(Descriptor overlay, Descriptor report)
 {
     pid_t child = -1;
@@ -129,7 +129,7 @@ std::string runAsCaller(pid_t child, Descriptor report)
         count = read(report.get(), &first, 1);
     } while (count < 0 && errno == EINTR);
     if (count == 1 && first == ready) {
-        int end = relayTo(child); // that of the first process; used if it was killed
+        int end = relayTo(child); // the first process's wait status; used if it was killed
         std::string const status = readToEnd(report);
         if (status.size() == sizeof end)
             status.copy(reinterpret_cast<char*>(&end), sizeof end);

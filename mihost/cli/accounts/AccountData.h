@@ -10,7 +10,7 @@
 namespace mihost
 {
 
-/** Everything on this machine that describes its local accounts and groups. */
+/** The contents of this machine's files about local accounts and groups. */
 struct AccountData {
     AccountFiles files;
     LoginDefs loginDefs;

@@ -10,7 +10,7 @@
 namespace mihost
 {
 
-/** A local group as the account files have it. */
+/** A local group as the account files describe it. */
 struct GroupDescription {
     struct Member {
         std::string name;

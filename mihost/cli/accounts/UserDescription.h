@@ -23,7 +23,7 @@ enum class PasswordState {
     None      // no password is needed
 };
 
-/** Days are counted from 1970. A day that does not come is missing. */
+/** Days are counted from 1970. A day that will never come is missing. */
 struct PasswordAgeing {
     std::optional<long> changed;
     bool mustChange = false; // at the next login
@@ -33,7 +33,7 @@ struct PasswordAgeing {
     std::optional<long> lastActive; // the next day the account is inactive
 };
 
-/** A local account as the account files have it. */
+/** A local account as the account files describe it. */
 struct UserDescription {
     std::string name;
     unsigned int id;

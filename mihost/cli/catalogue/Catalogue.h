@@ -105,10 +105,10 @@ Property const* findProperty(NodeKind const& kind, std::string_view name);
 Method const* findMethod(std::string_view name);
 Parameter const* findParameter(Method const& method, std::string_view name);
 
-/** The name of a node's kind as in JSON; "unknown" for a type that no kind has. */
+/** @return the name of a node's kind as in JSON; "unknown" for a type that no kind has */
 char const* kindName(unsigned int nodeType);
 
-/** The name of a value's kind, such as "text". */
+/** @return the name of a value's kind, such as "text" */
 char const* valueKindName(ValueKind kind);
 
 } // namespace mihost

@@ -12,7 +12,7 @@ namespace mihost
 /** Only root can create and open this file, so nobody else can hold the lock. */
 constexpr char changeLockFile[] = "/run/mihost.lock";
 
-/** Lets one mihost at a time change the machine. Released with the process at the latest. */
+/** Lets one mihost at a time change the machine. Released at the latest when the process ends. */
 class ChangeLock
 {
 public:

@@ -10,12 +10,12 @@
 namespace mihost
 {
 
-/** Throws Failure if the machine, as it is now, would make something else of a change. */
+/** Throws Failure if, on the machine as it is now, a change would do something else. */
 using MachineCheck = std::function<void()>;
 
 /**
  * Clears one change: checks it, asks for the user's consent if it is dangerous, and keeps other
- * mihosts from changing the machine while the result lives.
+ * mihosts from changing the machine while the result exists.
  *
  * The check runs under the lock; for a dangerous change also before the prompt.
  *

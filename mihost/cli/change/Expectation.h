@@ -21,10 +21,10 @@ struct Expectation {
 /** The results of a method call in the account files. */
 std::vector<Expectation> expectationsOf(MethodCall const& call);
 
-/** That the account's shadow record holds this hash. */
+/** That the account's shadow record has this hash. */
 Expectation passwordHash(std::string const& user, std::string const& hash);
 
-/** The account does not exist. */
+/** That the account does not exist. */
 Expectation deletedAccount(std::string const& user);
 
 /** That the account never expires. */
@@ -36,7 +36,7 @@ Expectation passwordExpiryDay(std::string const& user, std::string const& day);
 /** That the account becomes inactive on this day, some days after its password expired. */
 Expectation inactivityDay(std::string const& user, std::string const& day);
 
-/** That the system log has lost what it holds now. */
+/** That the system log has lost its present contents. */
 Expectation emptiedLog();
 
 } // namespace mihost

@@ -10,9 +10,9 @@
 namespace mihost
 {
 
-/** What became of one file. */
+/** How one file changed. */
 struct FileChange {
-    /** Both empty unless they differ; one is empty for a file that came or went. */
+    /** Both are empty unless they differ; one is empty for a created or removed file. */
     struct Attribute {
         std::string before;
         std::string after;

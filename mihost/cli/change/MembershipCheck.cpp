@@ -18,7 +18,7 @@ namespace mihost
 namespace
 {
 
-/** Reads a text from its beginning; every step takes its part away if it is there. */
+/** Reads a text from its beginning; each step removes its part if the text has it. */
 class Reader
 {
 public:
@@ -60,7 +60,7 @@ private:
     std::string_view rest_;
 };
 
-/** Without what id says about groups that have no name, which the plug-in passes over. */
+/** @return the text without id's warnings about groups without a name, which the plug-in skips */
 std::string_view withoutWarnings(std::string_view text)
 {
     constexpr std::string_view warning = "id: cannot find name for group ID ";

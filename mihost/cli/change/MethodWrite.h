@@ -10,7 +10,7 @@ namespace mihost
 /** What happens to an account's expiry that UserSetAttrib would erase because none is given. */
 enum class Expiry {
     Keep,      // it is passed along
-    KeepAloud, // it is passed along, with a warning
+    KeepAloud, // it is passed along with a warning
     Erase,     // it is erased, which is verified
     EraseAloud // it is erased, with a warning
 };

@@ -7,8 +7,9 @@ namespace mihost
 {
 
 /**
- * Whether passwd here takes a password from a pipe. The plug-in sets passwords that way and leaves
- * the plain text in the shadow file otherwise. Runs "passwd --help", once in a process.
+ * @return whether passwd on this machine reads a password from a pipe. The plug-in sets passwords
+ *         that way; if passwd does not, the plain text remains in the shadow file. Runs
+ *         "passwd --help" once per process.
  */
 bool passwdReadsStdin();
 
@@ -22,7 +23,7 @@ std::string hashOf(std::string const& password);
 /** Whether the password is the one of this hash. */
 bool fits(std::string const& password, std::string const& hash);
 
-/** The hash such that a shell reads it as it was, outside of quotes. */
+/** @return the hash with backslashes, so that a shell reads it unchanged outside quotes */
 std::string escapedForShell(std::string const& hash);
 
 } // namespace mihost

@@ -14,7 +14,7 @@ namespace mihost
 namespace
 {
 
-// Account tools make them for the moment; the first one stays.
+// Account tools create them temporarily; the first one stays.
 constexpr std::string_view lockFiles[] = {
     "/etc/.pwd.lock",    "/etc/passwd.lock", "/etc/shadow.lock", "/etc/group.lock",
     "/etc/gshadow.lock", "/etc/subuid.lock", "/etc/subgid.lock",
@@ -123,7 +123,7 @@ FileChange shownOf(PathChange const& change, Secrets secrets)
     return shown;
 }
 
-/** Another kind of file in the place of one: that one went and this one came. */
+/** @return whether a file was replaced by one of another kind: shown as removed and created */
 bool isReplaced(PathChange const& change)
 {
     return change.before && change.after &&

@@ -8,13 +8,13 @@
 #include <vector>
 
 /**
- * Checks a write to a user node against the machine. The plug-in gives the account's name or UID to
- * account tools as the node has them, even if another account has that name by now.
+ * Checks a write to a user node against the machine. The plug-in passes the node's name or UID to
+ * account tools, even if another account has that name or UID by now.
  */
 namespace mihost
 {
 
-/** An account as a user node holds it, properties 108 and 89, or as /etc/passwd does. */
+/** An account as a user node stores it, in properties 108 and 89, or as /etc/passwd does. */
 struct Account {
     std::string name;
     std::string id; // in decimal

@@ -73,7 +73,7 @@ Result perform(Write const& write, Secrets secrets)
 
 constexpr std::string_view statusMark = "rc="; // the plug-in has useradd's exit status printed so
 
-/** The words of a command, without the status line. */
+/** @return what a command printed, without the status line */
 std::vector<std::string> wordsOf(RunCommand const& command)
 {
     std::vector<std::string> lines = linesOf(command.output);
@@ -115,7 +115,7 @@ bool isAnswer(RunCommand const& command)
     return isPasswordOffer(command) || (isQuery && command.status == 0);
 }
 
-/** What useradd prints about a success. The plug-in fails a call for a word of any other tool. */
+/** @return what useradd printed although it succeeded; any other tool's output fails a call */
 std::vector<std::string> remarksOf(Result const& result)
 {
     std::vector<std::string> remarks;
@@ -126,7 +126,7 @@ std::vector<std::string> remarksOf(Result const& result)
     return remarks;
 }
 
-/** What the last command that complained said first: mostly why it failed. Empty for nothing. */
+/** @return the first line of the last command that printed an error, usually why it failed */
 std::string lastWords(Result const& result)
 {
     for (auto command = result.commands.rbegin(); command != result.commands.rend(); ++command)
@@ -176,12 +176,12 @@ bool isChanged(Write const& write, Result const& result, bool hasFailed)
     return write.acts && (result.accountsDiffer || result.before != result.after || isToolsChange);
 }
 
-/** Why the write failed, without the commands' words; empty if it did not. */
+/** @return why the write failed, without the commands' output; empty if it did not */
 std::string problemOf(Write const& write, Result const& result)
 {
     std::string failed = failedCommand(result);
     std::string missed = unmet(write, result);
-    // The plug-in also fails what an account tool comments on, such as "no changes".
+    // The plug-in also fails a call if an account tool prints a remark, such as "no changes".
     bool const isAsAsked = !write.expectations.empty() && missed.empty() && failed.empty() &&
                            !result.commands.empty() && !isChanged(write, result, false);
     if (result.error.getStatus() != 0)

@@ -10,7 +10,7 @@
 namespace mihost
 {
 
-/** What came of a write. */
+/** The result of a write. */
 struct WriteReport {
     std::string error;               // why it failed; empty if it did not
     bool changed;                    // the machine, in any way

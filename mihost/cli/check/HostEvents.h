@@ -16,7 +16,7 @@ struct SeenNode {
     unsigned int type;
 };
 
-/** Notes the nodes that an interface publishes and deletes, and answers the load callback. */
+/** Records the nodes that an interface publishes and deletes, and answers the load callback. */
 class HostEvents : public NodeObserver
 {
 public:
@@ -25,7 +25,7 @@ public:
     HostEvents(HostEvents const&) = delete;
     HostEvents& operator=(HostEvents const&) = delete;
 
-    /** The interface's load callback comes here from now on. */
+    /** Makes this object the interface's load callback from now on. */
     void listenTo(IC::ManagementInterface& interface);
 
     /** Refuses every node from now on. */

@@ -10,7 +10,7 @@
 namespace mihost::checks
 {
 
-/** A logger call, kept. */
+/** One call of the logger. */
 struct LoggedCall {
     LogMessage::Operation operation;
     std::string function; // empty for a null pointer
@@ -24,7 +24,7 @@ struct LoggedCall {
     std::string text;
 };
 
-/** Keeps every logger call, from its making to its end. */
+/** Records every call of the logger while it exists. */
 class LogRecord : public LogSink
 {
 public:

@@ -89,7 +89,7 @@ bool isRequired(NodeKind const& kind, Property const& property)
                      Place{kind.type, property.id}) == std::end(mayBeMissing);
 }
 
-/** A figure that could not be read when the tree was built holds the value before it, or none. */
+/** A figure that could not be read while the tree was built has the previous value, or none. */
 bool isKind(Property const& property, IC::PropertyValue const& value)
 {
     return value.getKind() == property.kind ||

@@ -11,7 +11,7 @@ struct Resources {
     std::size_t descriptors; // open
     std::size_t threads;
     std::size_t heap; // bytes allocated; 0 if the allocator does not say
-    bool children;    // there are some, running, or ended and not waited for
+    bool children;    // whether there are any, running, or ended and not waited for
 };
 
 Resources resourcesInUse();

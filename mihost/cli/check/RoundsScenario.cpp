@@ -12,7 +12,7 @@ namespace mihost::checks
 namespace
 {
 
-// The first rounds fill what the host and libc keep: buffers, a pipe, the caches of name services.
+// The first rounds allocate what the host and libc keep: buffers, a pipe, caches of name services.
 constexpr unsigned int warmUpRounds = 2;
 
 // The record of id ranges is never freed, and the loader keeps some bytes for a closed library.

@@ -20,7 +20,7 @@ namespace mihost::checks
 namespace
 {
 
-/** A library that is loaded already, held for a look at it. */
+/** A library that is already loaded, kept loaded while it is examined. */
 class LoadedLibrary
 {
 public:
@@ -47,7 +47,7 @@ public:
         return nullptr;
     }
 
-    /** What one of its undefined names means: in the libraries that it brings, else in the host. */
+    /** @return what one of its undefined names refers to: in its libraries, else in the host */
     void const* find(std::string const& symbol) const
     {
         // A host or a sanitizer may interpose a library's function.

@@ -14,7 +14,7 @@ class Subject;
 /** The findings, one line each; empty if there are none. */
 using Findings = std::vector<std::string>;
 
-/** What a check has to say. */
+/** The result of a check. */
 struct Verdict {
     Findings findings;
     std::vector<std::string> notes = {};               // worth knowing, but not wrong

@@ -26,7 +26,7 @@ std::uint64_t linesOfLog()
         std::count(std::istreambuf_iterator<char>(log), std::istreambuf_iterator<char>(), '\n'));
 }
 
-/** What the metrics need of a node. Each user and group would count all of them, live. */
+/** What the metrics need of a node: no live values of users and groups, which each count all. */
 NodeView viewOf(IC::MutableNode const& node)
 {
     std::string_view const kind = kindName(node.getNodeType());
@@ -90,7 +90,7 @@ public:
             metrics = machineMetrics(stateOf(session),
                                      accounts_ ? AccountSeries::Make : AccountSeries::Leave);
         } catch (Failure const& failure) {
-            problem = failure; // which is a metric, too
+            problem = failure; // the failure is a metric, too
         }
         std::chrono::duration<double> const taken = std::chrono::steady_clock::now() - start;
         for (Metric const& metric : collectionMetrics(!problem, taken.count()))

@@ -9,8 +9,7 @@ namespace mihost
 {
 
 /**
- * Reads a password that is to be set: from a file or from standard input, with two prompts at a
- * terminal.
+ * Reads a new password from a file or from standard input, at a terminal with two prompts.
  *
  * @param file  empty or "-" for standard input
  * @throws Failure (BadUsage) if there is none, or if the two differ

@@ -47,7 +47,7 @@ RemoteTerminal remoteTerminal()
     return isatty(STDOUT_FILENO) == 1 ? RemoteTerminal::Use : RemoteTerminal::Ignore;
 }
 
-/** ssh takes this program's place, with its streams; its exit status becomes this one's. */
+/** Replaces this program by ssh, with the same streams; its exit status becomes this one's. */
 void runRemotely(std::string const& host, std::vector<std::string> const& words)
 {
     auto const rest = withoutHost(words, host);

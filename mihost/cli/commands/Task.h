@@ -17,7 +17,7 @@ struct TaskValue {
     char const* meaning;
 };
 
-/** A command such as "user add": a method of the operating-system node as people call it. */
+/** A command such as "user add", which calls a method of the operating-system node. */
 struct Task {
     char const* name;
     char const* summary;

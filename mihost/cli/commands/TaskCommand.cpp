@@ -23,7 +23,7 @@ namespace
 
 constexpr std::string_view neverExpires = "never"; // in place of a day
 
-/** An argument that names something that must be there. */
+/** An argument that names something that must exist. */
 struct Existing {
     std::string_view argument;
     char const* file;

@@ -10,7 +10,7 @@ namespace mihost
 namespace
 {
 
-/** The node and everything below it; the list has parents before their children. */
+/** @return the node and all nodes below it; parents come before their children */
 std::vector<IC::MutableNode*> branchOf(std::vector<IC::MutableNode*> const& nodes,
                                        IC::MutableNode const& top)
 {

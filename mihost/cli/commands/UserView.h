@@ -9,8 +9,7 @@ namespace mihost
 class Session;
 
 /**
- * Shows one local account as its administrator reads it, whether the plug-in has a node for it or
- * not.
+ * Shows one local account in words, even if the plug-in has no node for it.
  *
  * @throws Failure (NotFound) if there is none of this name
  */

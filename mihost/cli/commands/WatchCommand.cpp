@@ -56,7 +56,7 @@ public:
             if (reading == 1)
                 Session::warnOfUnknown();
             else
-                takeUnknownWarning(); // it was given
+                takeUnknownWarning(); // the warning was given already
             if (reading == count_ || !waitForNextRound(session.out(), signals, interval_))
                 return;
         }

@@ -30,7 +30,7 @@ namespace
 
 constexpr char releaseFile[] = "/etc/release";
 
-/** By the effective rights of this process, not those of its user. */
+/** Checks the effective rights of this process, not those of its user. */
 Problem accessProblem(std::string const& path, int mode = R_OK)
 {
     if (faccessat(AT_FDCWD, path.c_str(), mode, AT_EACCESS) == 0)

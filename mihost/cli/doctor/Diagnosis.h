@@ -19,7 +19,7 @@ struct Fix {
 struct Need {
     std::string what;
     std::optional<std::string> problem; // nothing if all is well
-    std::string effect;                 // what suffers without it
+    std::string effect;                 // what fails without it
     Fix fix;
     std::string noFix; // why nothing on this machine fixes it; empty if it can be
 };

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-/** Problems in files that keep the plug-in from reading them; nothing if there are none. */
+/** Problems that keep the plug-in from reading files; nothing if there are none. */
 namespace mihost
 {
 
@@ -21,7 +21,7 @@ Problem problemOfAccounts(std::string const& text);
 Problem problemOfGroups(std::string const& text);
 
 /**
- * Shadow entries are matched going forward only, so one that is missing, malformed or out of order
+ * The plug-in reads shadow entries only forward, so one that is missing, malformed or out of order
  * hides those of all later accounts.
  *
  * @param accounts  names of the accounts that are shown, in the order of /etc/passwd

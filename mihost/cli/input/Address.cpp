@@ -25,7 +25,7 @@ bool matches(Address const& address, IC::MutableNode const& node)
     return address.kind->single || storedText(node, address.kind->nameProperty) == address.name;
 }
 
-/** The name of another node of that kind that is nearly the one in the address; empty for none. */
+/** @return the name of a node of that kind that is similar to the address's; empty for none */
 std::string nameMeant(std::vector<IC::MutableNode*> const& nodes, Address const& address)
 {
     if (!address.kind || address.kind->single || parseDecimal(address.name))

@@ -12,7 +12,7 @@ namespace mihost
 
 class Session;
 
-/** One of the program's commands: it declares what it takes, is filled in, and runs. */
+/** One of the program's commands: it declares its arguments, receives their values, and runs. */
 class Command
 {
 public:

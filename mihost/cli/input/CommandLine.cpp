@@ -91,7 +91,7 @@ std::string excessOf(CLI::App const& app, std::string const& help)
     return fmt::format("unexpected argument '{}' (see '{}')", word, help);
 }
 
-/** The message, with the command that it is about first and a way on last. */
+/** @return the message, with its command before it and a hint after it */
 std::string explained(CLI::App const& app, std::string const& message, std::string const& help)
 {
     std::vector<CLI::App const*> commands = givenCommands(app);
@@ -102,7 +102,7 @@ std::string explained(CLI::App const& app, std::string const& message, std::stri
                        hasWayOn ? "" : fmt::format(" (see '{}')", help));
 }
 
-/** The type of an argument says nothing that its name does not say. */
+/** Leaves out the types of arguments, since their names say the same. */
 void hideTypesOfArguments(CLI::App& command)
 {
     for (CLI::Option* option : command.get_options())

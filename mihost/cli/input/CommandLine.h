@@ -11,14 +11,14 @@ namespace mihost
 class CommandLine
 {
 public:
-    /** In the shell the options that settle how the plug-in is loaded are out of reach. */
+    /** The shell does not offer the options that determine how the plug-in is loaded. */
     enum class Place { Program, Shell };
 
     /** @param table  the commands to know; must outlive this */
     explicit CommandLine(CommandTable const& table, Place place = Place::Program,
                          Options const& defaults = {});
 
-    /** Adds all options and commands. What the application is given then ends up here. */
+    /** Adds all options and commands, bound to this object. */
     void declare(CLI::App& app);
 
     /** The words that a declared option or argument takes; null if it takes any. */

@@ -9,7 +9,7 @@ namespace mihost
 namespace
 {
 
-constexpr int firstYear = 1901; // years before it the plug-in takes for none
+constexpr int firstYear = 1901; // the plug-in treats years before it as none
 constexpr int lastYear = 9999;
 constexpr std::size_t dayLength = 10;
 constexpr long secondsPerDay = 24L * 60 * 60;
@@ -61,7 +61,7 @@ std::optional<Day> dayOfCalendar(std::string const& digits)
     if (!fields)
         return std::nullopt;
     Day const day = dayOf(*fields);
-    // strptime takes February 31.
+    // strptime accepts February 31.
     auto const same = dayOfNumber(dayNumber(day));
     return same && isSame(*same, day) ? same : std::nullopt;
 }

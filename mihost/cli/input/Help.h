@@ -10,7 +10,7 @@
 namespace mihost
 {
 
-/** Names the sections and marks of the help for this and all commands that are added later. */
+/** Sets the headings of the help for this command and all that are added later. */
 void setHelpLabels(CLI::App& app);
 
 /** Shows the examples at the end of the command's help. */

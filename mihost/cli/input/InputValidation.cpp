@@ -63,7 +63,7 @@ bool isDecimal(std::string_view text)
     return !text.empty() && text.find_first_not_of("0123456789") == std::string_view::npos;
 }
 
-/** Tools would make another account's id, or a folder, out of such a name. */
+/** Tools would read such a name as another account's id or as a path. */
 std::optional<std::string> objectionToPlainName(std::string_view text)
 {
     if (auto reason = objectionToName(text))

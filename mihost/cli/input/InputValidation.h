@@ -8,16 +8,16 @@
 #include <string_view>
 
 /**
- * Decides what may be passed to the plug-in, which puts texts into shell lines unchanged and runs
- * these as root. There is no other protection.
+ * Decides what may be passed to the plug-in, which puts texts unchanged into command lines that a
+ * shell runs as root. Only this protects the machine.
  */
 namespace mihost
 {
 
-/** Bytes that mean something to a shell, one way or another. */
+/** Bytes with a meaning in a shell. */
 constexpr std::string_view shellMetacharacters = "|&;<>()$`\\\"'*?[]#~=%!{}^";
 
-/** A command's argument may be this long, blanks escaped. */
+/** The longest argument of a command, in bytes, with escaped blanks. */
 constexpr std::size_t longestArgument = 254;
 
 /**

@@ -49,7 +49,7 @@ void checkWhole(MethodCall const& call)
     }
 }
 
-/** The first command of UserAdd has all of its values, the second one only the name. */
+/** In UserAdd the first command contains all values, the second one only the name. */
 void checkJudging(Method const& method, Assignment const& assignment)
 {
     bool const isOfFirstCommand =
@@ -69,7 +69,7 @@ std::string toTextForm(Parameter const& parameter, std::string const& value)
     return dateTimeText(*parseDay(value));
 }
 
-/** The pieces between separators, empty ones left out, as the plug-in splits. */
+/** @return the pieces between separators without empty ones, as the plug-in splits */
 std::vector<std::string> split(std::string const& text, char separator)
 {
     std::vector<std::string> pieces;

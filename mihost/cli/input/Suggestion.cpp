@@ -31,7 +31,7 @@ std::string listed(std::vector<std::string> const& names)
     return list;
 }
 
-/** How many letters must be added, dropped, replaced or swapped to make one of the other. */
+/** @return how many letters to add, remove, replace or swap to turn one into the other */
 std::size_t slipsBetween(std::string_view one, std::string_view other)
 {
     std::vector<std::vector<std::size_t>> slips(one.size() + 1,

@@ -10,7 +10,7 @@ namespace mihost
 {
 
 /**
- * A value of the property's kind, from what a person writes.
+ * @return a value of the property's kind, from the user's text
  *
  * @throws Failure (BadUsage) with the right form, or what it must not contain
  */

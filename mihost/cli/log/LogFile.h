@@ -23,8 +23,9 @@ public:
     std::vector<std::string> newestLines(std::size_t count);
 
     /**
-     * The lines that came since the last call. If another file has the path by now and something
-     * is in it, the rest of the old one comes first. An emptied file is read from its beginning.
+     * @return the lines added since the last call. If the path leads to another file by now, and it
+     *         is not empty, the rest of the old file comes first. An emptied file is read from its
+     *         beginning.
      */
     std::vector<std::string> newLines();
 

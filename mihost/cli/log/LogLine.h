@@ -11,7 +11,7 @@ namespace mihost
 
 constexpr char systemLog[] = "/var/log/messages";
 
-/** The log entries of the plug-in's tree are so many at most. */
+/** The most log entries that the plug-in's tree has. */
 constexpr unsigned int mostLogEntries = 50;
 
 /** A line of the system log as the plug-in shows it. */

@@ -219,7 +219,7 @@ void addAccounts(MachineState const& state, AccountSeries series, std::vector<Me
     for (NodeView const* const user : users) {
         auto const account = accountOf(*user);
         if (!account)
-            return; // a wrong count is worse than none
+            return; // no count is better than a wrong one
         accounts.push_back(*account);
     }
     addAccountCounts(accounts, state.now, to);

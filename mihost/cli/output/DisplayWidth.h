@@ -9,7 +9,7 @@
 namespace mihost
 {
 
-/** While it lives, this thread uses UTF-8 instead of the user's code set. */
+/** While it exists, this thread uses UTF-8 instead of the user's code set. */
 class UnicodeCharacters
 {
 public:

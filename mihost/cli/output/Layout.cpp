@@ -26,7 +26,7 @@ namespace
 constexpr char columnGap[] = "  ";
 constexpr std::size_t gapWidth = 2;
 constexpr std::size_t branchWidth = 2; // of each level of a tree
-constexpr std::size_t leastText = 20;  // columns in which wrapped text can still be read
+constexpr std::size_t leastText = 20;  // columns; in fewer, wrapped text is hard to read
 
 /** Owns what the library made. Its calls fail only for lack of memory. */
 struct Unref {
@@ -170,7 +170,7 @@ Grid headingsAlone(Grid const& grid)
     return headings;
 }
 
-/** What the wrapping column gets of the room; nothing if all fits. */
+/** @return the width left for the wrapping column; nothing if everything fits */
 std::optional<std::size_t> widthToWrap(Grid const& grid, Room const& room)
 {
     std::vector<std::size_t> const widths = widthsOf(grid);
@@ -227,7 +227,7 @@ std::string branchText(Branch const& branch, Room const& room)
     return joined(lines);
 }
 
-/** Name and text of a branch in one column, for a room that has none for two. */
+/** @return name and text of a branch in one column, for lines too narrow for two */
 std::string wholeBranch(Branch const& branch, Room const& room, std::size_t indent)
 {
     std::string const start =

@@ -11,7 +11,7 @@
 namespace mihost
 {
 
-/** What lines may take, and how they are drawn. */
+/** The width of lines, and how they are drawn. */
 struct Room {
     static constexpr std::size_t unlimited = std::numeric_limits<std::size_t>::max();
 

@@ -27,7 +27,7 @@ constexpr Attribute nodeAttributes[] = {
     {"description", [](IC::MutableNode const& node) { return Cell(node.getDescription()); }},
 };
 
-/** Properties first: an index that is read comes before the attribute of that name. */
+/** Properties come first: a property named index hides the attribute of that name. */
 std::vector<Column> columnsOf(NodeKind const& kind)
 {
     std::vector<Column> columns;

@@ -16,7 +16,7 @@ namespace mihost
 namespace
 {
 
-/** The most telling value of a node besides its description; empty for none. */
+/** @return the most useful value of a node besides its description; empty for none */
 std::string headlineOf(IC::MutableNode const& node)
 {
     NodeKind const* const kind = findKind(node.getNodeType());

@@ -66,7 +66,7 @@ public:
     /** @throws as write */
     void flush();
 
-    /** How much was written so far. */
+    /** @return how many bytes were written so far */
     std::size_t size() const
     {
         return size_;

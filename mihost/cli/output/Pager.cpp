@@ -28,7 +28,7 @@ namespace
 constexpr int cannotRun = 126;
 constexpr int cannotFind = 127;
 
-/** While it lives, Ctrl-C and Ctrl-\ are for the pager alone. */
+/** While it exists, only the pager gets Ctrl-C and Ctrl-\. */
 class SignalsForPager
 {
 public:
@@ -55,7 +55,7 @@ private:
     };
 };
 
-/** Puts the terminal back as it was, also if the pager or this program is killed. */
+/** Restores the terminal's settings, even if the pager or this program is killed. */
 class TerminalSettings
 {
 public:
@@ -94,7 +94,7 @@ std::vector<std::string> pagerEnvironment()
     };
     setUnlessSet("LESS", "FRX"); // leave if all fits, show colours, keep the screen
     setUnlessSet("LV", "-c");
-    if (isRunForAnotherUser()) // permission to run this program is none to run a shell
+    if (isRunForAnotherUser()) // who may not be permitted to run a shell
         setUnlessSet("LESSSECURE", "1");
     return variables;
 }

@@ -10,7 +10,7 @@ namespace mihost
 /** The properties for people: id and name, value with its unit. */
 Grid propertyGrid(std::vector<PropertyView> const& properties);
 
-/** The properties as rows with all that is known of them. */
+/** @return the properties as rows with everything that is known about them */
 Table propertyTable(std::vector<PropertyView> const& properties);
 
 /** @param lead  what each line begins with */

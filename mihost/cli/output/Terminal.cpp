@@ -29,7 +29,7 @@ std::optional<std::string> readLine()
 {
     std::string line;
     for (;;) {
-        // Waited for here: under the thread sanitizer a waiting read holds signals back.
+        // poll waits, since under the thread sanitizer a waiting read delays signals.
         pollfd input{STDIN_FILENO, POLLIN, 0};
         poll(&input, 1, -1);
         char byte = 0;

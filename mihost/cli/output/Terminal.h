@@ -14,10 +14,10 @@ unsigned int width(int descriptor);
 /** Whether the terminal shows all of the printable text above its last line. */
 bool fits(int descriptor, std::string_view text);
 
-/** Whether the user's code set has the signs that lines and cuts are drawn with. */
+/** @return whether the user's code set has the characters for lines and ellipses */
 bool hasUnicode();
 
-/** Whether prompts are possible: standard input is a terminal. */
+/** @return whether prompts are possible: standard input is a terminal */
 bool canAsk();
 
 /** Asks on standard error. @return whether the answer was yes */

@@ -9,7 +9,7 @@ namespace mihost
 namespace
 {
 
-/** Why values are unknown, for the warning that is still to be given. */
+/** Why values are unknown, for the next warning. */
 std::string& pendingReason()
 {
     static std::string reason;

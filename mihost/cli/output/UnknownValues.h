@@ -6,7 +6,7 @@
 namespace mihost
 {
 
-/** Notes that an unknown value is shown. @param reason  empty if it is known */
+/** Records that an unknown value is shown. @param reason  empty if it is known */
 void noteUnknown(std::string const& reason);
 
 /** The warning for all unknown values shown since the last call; empty for none. */

@@ -12,7 +12,7 @@ namespace mihost
 namespace
 {
 
-/** Words that a reader of some version of YAML does not take for texts. */
+/** Words that some version of YAML does not read as texts. */
 bool isReserved(std::string word)
 {
     static constexpr std::string_view reserved[] = {
@@ -35,7 +35,7 @@ bool isPlain(std::string const& text)
            });
 }
 
-/** In double quotes, with everything escaped that is not simply shown. */
+/** @return the text in double quotes, with escapes for all characters that need one */
 std::string inQuotes(std::string_view text)
 {
     std::string result = "\"";

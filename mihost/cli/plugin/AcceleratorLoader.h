@@ -10,8 +10,8 @@ namespace mihost
 {
 
 /**
- * From its making to the end of the process, commands are answered by the accelerator if it can.
- * Without its library, which is loaded only now, every command is run.
+ * Loads the accelerator, which answers commands, if it can, until the process ends. If its library
+ * is missing, every command is run.
  */
 class Accelerator
 {

@@ -17,7 +17,7 @@ constexpr std::string_view suseVersionLine =
     "echo $(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 9)."
     "$(cat /etc/SuSE-release | tr '\\n' ' ' | cut -d ' ' -f 12) | tr -d [:space:]";
 
-/** Command lines of the plug-in that use the shell themselves and hold no text of anybody's. */
+/** Command lines of the plug-in that use the shell's syntax and contain no text from outside. */
 constexpr std::string_view fixedLines[] = {
     "chpasswd -e < usrandpwd ; rm -f usrandpwd",
     "stat /etc/SuSE-release | grep Change",

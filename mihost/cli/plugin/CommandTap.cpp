@@ -46,7 +46,7 @@ State& state()
     return tapped;
 }
 
-/** Puts another file in a descriptor's place for as long as it lives. */
+/** Makes a descriptor refer to another file while it exists. */
 class Redirection
 {
 public:
@@ -71,7 +71,7 @@ private:
     Descriptor before_;
 };
 
-/** Negative without a pipe: commands then share this program's standard error. */
+/** @return negative if there is no pipe: commands then share this program's standard error */
 int standardErrorEnd()
 {
     try {

@@ -6,11 +6,11 @@
 #include <vector>
 
 /**
- * The program's own popen and pclose interpose libc's (see popen.cpp). Commands that the
- * plug-in starts therefore pass through here. They run unchanged, but without standard input, so
- * that none reads input meant for this program, and with a separate standard error.
+ * The program's own popen and pclose interpose libc's (see popen.cpp), so commands that the plug-in
+ * starts are started here. They run unchanged, but without standard input, so that none reads input
+ * meant for this program, and with a separate standard error.
  *
- * All state is the process's, as popen itself is. One thread at a time.
+ * The process has one such state, and one thread at a time may use it.
  */
 namespace mihost::commandTap
 {
@@ -22,7 +22,7 @@ struct RunCommand {
     int status; // as from wait; 0 while the plug-in has its stream open
 };
 
-/** What runs the commands that pass through; libc's own two from the start. */
+/** The functions that run the commands; at first those of libc. */
 struct Runner {
     using Open = std::FILE*(char const* line, char const* mode);
     using Close = int(std::FILE* stream);
@@ -43,8 +43,8 @@ void setGuard(Guard* guard);
 unsigned int count();
 
 /**
- * Notes every command, and its output as the plug-in reads it. What the plug-in leaves unread is
- * read when it closes the stream, so each command runs to its end.
+ * Records every command, and its output as the plug-in reads it. Output that the plug-in does not
+ * read is read when it closes the stream, so each command runs to its end.
  */
 class Recording
 {
@@ -57,7 +57,7 @@ public:
     std::vector<RunCommand> commands() const;
 };
 
-/** The beginning of what commands wrote to their standard error since the last call. */
+/** @return the beginning of what commands wrote to standard error since the last call */
 std::string takeStandardError();
 
 /**

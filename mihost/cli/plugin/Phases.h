@@ -8,7 +8,7 @@
 namespace mihost
 {
 
-/** What the plug-in is busy with while it starts. */
+/** One phase of the plug-in's start. */
 struct Phase {
     char const* function; // of the plug-in; it logs its entry and its exit
     char const* name;
@@ -28,7 +28,7 @@ public:
 class PhaseSink : public LogSink
 {
 public:
-    /** @param listeners  stay the caller's */
+    /** @param listeners  owned by the caller */
     explicit PhaseSink(std::vector<PhaseListener*> listeners);
 
     void write(LogMessage const& message) override;

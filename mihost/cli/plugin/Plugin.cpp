@@ -18,7 +18,7 @@ namespace
 constexpr char plainName[] = "libzorvvxicosswmi.so.1";
 constexpr unsigned int ownMiId = 1;
 
-/** What the loader said last, without the file's name in front of it. */
+/** @return the loader's last message, without the file's name before it */
 std::string loaderReason(std::string const& file)
 {
     char const* const said = dlerror();

@@ -11,7 +11,7 @@ namespace mihost
 /** The named plug-in file, or the one next to this program, or its plain name. */
 std::string pluginFile(std::string const& named);
 
-/** A loaded plug-in; going away, it unloads what it started and then the library. */
+/** A loaded plug-in. The destructor unloads the plug-in if it was started, then the library. */
 class Plugin
 {
 public:

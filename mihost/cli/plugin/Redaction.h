@@ -18,7 +18,7 @@ class RedactingSink : public LogSink
 public:
     explicit RedactingSink(LogSink& to) : to_(to) {}
 
-    /** Secrets are removed for as long as this lives. */
+    /** Secrets are removed while it exists. */
     class Hiding
     {
     public:

@@ -48,7 +48,8 @@ Session::Session(Options const& options) : out_(stdout), pluginFile_(pluginFile(
         traceSink_ = std::make_unique<RedactingSink>(trace_->sink());
         sinks_.add(*traceSink_);
     }
-    // The trace stays the machine's own: it is open by now. The plug-in's file has its full path.
+    // The trace is already open, so it is written on the real machine. The plug-in's path is
+    // absolute.
     if (options_.sandbox)
         goIntoSandbox(options_.overlay);
 }

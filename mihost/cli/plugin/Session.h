@@ -41,7 +41,7 @@ public:
         return options_;
     }
 
-    /** For one line of the shell. How the plug-in was loaded stays as it was. */
+    /** For one line of the shell. Does not change how the plug-in was loaded. */
     void setOptions(Options const& options)
     {
         options_ = options;
@@ -49,7 +49,7 @@ public:
         setMessageStyle(options.colours, options.quiet);
     }
 
-    /** What the program exits with although nothing failed; the first one that was set. */
+    /** Sets the exit code although nothing failed. The first one that was set counts. */
     void endWith(ExitCode code);
     ExitCode exitCode() const
     {
@@ -95,7 +95,7 @@ public:
      */
     void confirm(std::string const& what) const;
 
-    /** Gives one warning if values were shown as unknown since it was last called. */
+    /** Prints one warning if unknown values were shown since the last call. */
     static void warnOfUnknown();
 
 private:
@@ -113,7 +113,7 @@ private:
     std::unique_ptr<Accelerator> accelerator_;
     std::unique_ptr<PrivateDirectory> directory_;
     std::unique_ptr<Plugin> plugin_;
-    SinkGroup sinks_; // the last, so that no message comes in while the others go
+    SinkGroup sinks_; // the last member, so that no message arrives while the others are destroyed
 };
 
 } // namespace mihost

@@ -9,7 +9,7 @@
 namespace mihost
 {
 
-/** The --trace file. Notes nodes that come and go for as long as it lives. */
+/** The --trace file. Records added and deleted nodes while it exists. */
 class Trace
 {
 public:
@@ -22,7 +22,7 @@ public:
     Trace(Trace const&) = delete;
     Trace& operator=(Trace const&) = delete;
 
-    /** Takes the log messages. */
+    /** @return the sink for the log messages */
     LogSink& sink()
     {
         return lines_;

@@ -14,7 +14,7 @@ namespace mihost
 namespace
 {
 
-// Not truncated: first it is seen what it is.
+// Not truncated yet: first the kind of file is checked.
 constexpr int writing = O_WRONLY | O_CLOEXEC | O_NOCTTY;
 constexpr mode_t ownersOnly = S_IRUSR | S_IWUSR;
 
@@ -28,7 +28,7 @@ struct Opened {
     bool byLink;
 };
 
-/** Another user's link in a directory for everybody could lead to any file of the caller's. */
+/** Another user's link in a directory such as /tmp could lead to any file of the caller's. */
 void expectOwnLink(std::string const& path)
 {
     struct stat link {

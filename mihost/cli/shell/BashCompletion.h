@@ -10,9 +10,9 @@ namespace mihost
 {
 
 /**
- * What bash's completion script reads: a line that says words, files or folders, then a line for
- * each text that may replace what readline replaces of the word being typed. bash inserts them as
- * they are, so they are quoted.
+ * @return what bash's completion script reads: a line that says words, files or folders, then a
+ * line for each text that may replace the part of the typed word that readline replaces. bash
+ *         inserts them unchanged, so they are quoted.
  *
  * @param line    the command line up to the cursor, the program's name included
  * @param breaks  bash's COMP_WORDBREAKS

@@ -25,7 +25,7 @@ bool isOwn(struct stat const& status)
     return status.st_uid == geteuid();
 }
 
-/** A directory of the user's own, made if it is missing. */
+/** Opens a directory that belongs to the user; creates it if it is missing. */
 Descriptor ownDirectory(fs::path const& path)
 {
     std::error_code problem;
@@ -45,7 +45,7 @@ Descriptor ownDirectory(fs::path const& path)
     return isSafe ? std::move(directory) : Descriptor();
 }
 
-/** The end of a file; not more than a history needs. */
+/** @return the end of a file, at most mostRead bytes */
 std::string endOf(int file)
 {
     off_t const size = lseek(file, 0, SEEK_END);

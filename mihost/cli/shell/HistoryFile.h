@@ -32,7 +32,8 @@ public:
     /** The newest lines, at most historyLimit. If the file has more, it is cut to these. */
     std::vector<std::string> lines() const;
 
-    /** Appends a line at once, so that no way to end loses it. Several shells may do so. */
+    /** Appends a line at once, so that it is kept however the shell ends. Several shells may do so.
+     */
     void add(std::string const& line) const;
 
 private:

@@ -72,7 +72,7 @@ char* LineEditor::promptOf(EditLine* editor)
     return of(editor).prompt_.data();
 }
 
-/** Reads one character itself, so that signals end or redraw the line as they should. */
+/** Reads one character, since the library would not end or redraw the line on signals. */
 int LineEditor::getCharacter(EditLine* editor, wchar_t* character)
 {
     LineEditor& self = of(editor);

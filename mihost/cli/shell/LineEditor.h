@@ -75,10 +75,10 @@ private:
     std::unique_ptr<EditLine, EndEditor> editor_;
 };
 
-/** Words side by side, with line ends; of very many only the first, and how many there are more. */
+/** @return the words in columns, with line ends; of very many the first, and how many are left */
 std::string inColumns(std::vector<std::string> const& words, std::size_t width);
 
-/** What all candidates begin with. */
+/** @return the longest text that all candidates begin with */
 std::string commonStart(std::vector<std::string> const& candidates);
 
 } // namespace mihost

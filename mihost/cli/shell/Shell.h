@@ -17,7 +17,7 @@ public:
     /** @param table  the commands that lines may name; must outlive this */
     Shell(Session& session, CommandTable const& table);
 
-    /** What a person types, until the end of input. */
+    /** Runs the lines that the user types, until the end of input. */
     void runInteractively();
 
     /**

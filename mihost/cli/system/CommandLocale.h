@@ -8,7 +8,8 @@ namespace mihost
 {
 
 /**
- * From now on commands speak English, which the plug-in scans. LANG, which it reads itself, stays.
+ * Makes commands print English from now on, which the plug-in scans. LANG, which the plug-in reads,
+ * stays.
  */
 void useCommandLocale();
 

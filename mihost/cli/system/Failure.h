@@ -16,7 +16,7 @@ enum ExitCode {
     NotFound = 4  // no such node or property
 };
 
-/** Ends a command: what went wrong, on one line, and what the program then exits with. */
+/** Ends a command: the reason on one line, and the exit code of the program. */
 class Failure : public std::runtime_error
 {
 public:

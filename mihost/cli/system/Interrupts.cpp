@@ -45,7 +45,7 @@ void handle(int signal)
     int const before = errno;
     if (char const* const words = lastWords)
         if (write(screen, words, std::strlen(words)) < 0)
-            errno = 0; // there is no reader left
+            errno = 0; // the reader is gone
     if (termios const* const settings = terminal)
         tcsetattr(STDIN_FILENO, TCSANOW, settings);
     if (char const* const path = folder)

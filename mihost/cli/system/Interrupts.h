@@ -4,8 +4,8 @@
 #include <termios.h>
 
 /**
- * What happens on Ctrl-C and its kin. By default the program tidies up and ends as the signal would
- * have ended it.
+ * What happens on Ctrl-C and similar signals. By default the program cleans up and ends as the
+ * signal would have ended it.
  */
 namespace mihost::interrupts
 {

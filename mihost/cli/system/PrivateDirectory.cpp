@@ -48,7 +48,7 @@ void removeIfLeft(Descriptor const& parent, std::string const& name)
         openat(parent.get(), name.c_str(), O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
     if (!directory || !isOwn(directory))
         return;
-    // One that another directory of the caller's was renamed to has no lock file.
+    // Another directory of the caller's that was renamed to this name has no lock file.
     Descriptor const lock(openat(directory.get(), privateDirectoryLock,
                                  O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
     if (!lock || flock(lock.get(), LOCK_EX | LOCK_NB) != 0)
@@ -56,7 +56,7 @@ void removeIfLeft(Descriptor const& parent, std::string const& name)
     for (std::string const& file : namesIn(directory, name))
         if (file != privateDirectoryLock)
             unlinkat(directory.get(), file.c_str(), 0);
-    // The last one: without it there would be no further try.
+    // Removed last: without it no other process would try again.
     unlinkat(directory.get(), privateDirectoryLock, 0);
     unlinkat(parent.get(), name.c_str(), AT_REMOVEDIR);
 }
@@ -86,7 +86,7 @@ Failure cannotMakeIn(std::string const& parent)
 PrivateDirectory::PrivateDirectory()
 {
     std::string const parent = parentDirectory();
-    SignalBlock const held; // no signal between making it and knowing of it
+    SignalBlock const held; // no signal between creating it and recording it
     removeWhatWasLeft(parent);
     while (!make(parent)) {
     }
@@ -102,7 +102,7 @@ PrivateDirectory::PrivateDirectory()
 
 PrivateDirectory::~PrivateDirectory()
 {
-    // If the way back is gone, use the root: a working directory cannot be removed.
+    // If the previous directory is gone, use the root, to be able to remove this one.
     if (fchdir(previous_.get()) != 0 && chdir("/") != 0)
         std::perror("mihost: chdir");
     remove();

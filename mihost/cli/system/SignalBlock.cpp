@@ -21,7 +21,7 @@ SignalBlock::SignalBlock()
     struct sigaction ignored {
     };
     ignored.sa_handler = SIG_IGN;
-    // One that comes while it is blocked waits, ignored or not: to unblock it is to get it.
+    // A blocked signal stays pending, ignored or not, and would arrive when it is unblocked.
     for (std::size_t at = 0; at < std::size(terminalSignals); ++at)
         sigaction(terminalSignals[at], &ignored, &actionsBefore_[at]);
 }

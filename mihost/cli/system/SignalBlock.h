@@ -7,9 +7,9 @@ namespace mihost
 {
 
 /**
- * Holds signals back for as long as it lives: a change to the system that has begun is finished. A
- * terminal sends its signals to the commands as well, and a shell undoes a mask, so commands
- * started meanwhile ignore them.
+ * Holds signals back while it exists, so that a change to the system that has begun is finished. A
+ * terminal sends its signals to the commands, too, and a shell resets the mask, so commands started
+ * meanwhile ignore them.
  */
 class SignalBlock
 {

@@ -10,8 +10,8 @@ namespace mihost
 {
 
 /**
- * For as long as it lives, SIGINT and the other signals named do nothing and come only in wait: so
- * none slips in between asking whether it came and waiting for it.
+ * While it exists, SIGINT and the other given signals do nothing and arrive only in wait, so that
+ * none is lost between checking for it and waiting for it.
  */
 class SignalWaiter
 {
@@ -29,7 +29,7 @@ public:
      */
     Event wait(pollfd file, double seconds);
 
-    /** The one that the last wait ended by. */
+    /** @return the signal that ended the last wait */
     int signal() const
     {
         return signal_;

@@ -12,7 +12,7 @@ bool fillMissingStandardFiles()
     for (int const file : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO}) {
         if (fcntl(file, F_GETFD) >= 0)
             continue;
-        // Opened the wrong way round on purpose, so that writes to a missing output fail.
+        // Deliberately opened for the other direction, so that writes to a missing output fail.
         int const mode = file == STDIN_FILENO ? O_WRONLY : O_RDONLY;
         if (open("/dev/null", mode) != file)
             return false;

@@ -11,7 +11,7 @@ namespace mihost
 /** Writes to standard error; errors are ignored. */
 void writeStderr(std::string const& text);
 
-/** How messages are shown from now on, for the whole program. @param isQuiet  drops warnings */
+/** Sets how the whole program shows messages from now on. @param isQuiet  drops warnings */
 void setMessageStyle(Colours colours, bool isQuiet);
 
 /** Writes a warning on one line, after the program's name. */

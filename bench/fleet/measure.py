@@ -4,7 +4,7 @@ import statistics
 
 
 def alternating(subjects, rounds):
-    """The results of each subject: round by round, so that what slows the machine slows all."""
+    """Returns the results of each subject, run round by round, so that other load slows all subjects."""
     results = {name: [] for name in subjects}
     for _ in range(rounds):
         for name, run in subjects.items():
@@ -13,7 +13,7 @@ def alternating(subjects, rounds):
 
 
 def cell(values, digits=2):
-    """The median and, in brackets, the two quartiles."""
+    """Returns the median and, in brackets, the two quartiles."""
     low, middle, high = statistics.quantiles(values, n=4, method='inclusive')
     return f'{middle:.{digits}f} ({low:.{digits}f}-{high:.{digits}f})'
 

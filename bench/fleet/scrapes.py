@@ -1,4 +1,4 @@
-"""scrapes.py [ROUNDS]: the cost of a scrape of mihost in both ways, compared with node_exporter's own collectors.
+"""scrapes.py [ROUNDS]: the cost of a scrape of mihost, compared with node_exporter's own collectors.
 
 Runs in a copy of this machine, which it starts.
 """
@@ -37,7 +37,7 @@ def wait_for(port):
 
 
 def processor_seconds(pid):
-    """Of the process and the children that it waited for."""
+    """Returns the processor time of the process and the children that it waited for, in seconds."""
     with open(f'/proc/{pid}/stat') as stat:
         fields = stat.read().rpartition(')')[2].split()
     return sum(int(field) for field in fields[11:15]) / TICKS

@@ -10,6 +10,7 @@
 #include "sysdata/userInfo_linux.h"
 #include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
+#include "tests/support/SystemLog.h"
 
 #include <gtest/gtest.h>
 
@@ -78,13 +79,12 @@ TEST_F(CommandRunner, RunsTheCommandsOfTheDriverInventory)
 
 TEST_F(CommandRunner, RunsTheCommandsOfTheLogReader)
 {
-    std::string const wc = "wc -l /var/log/messages";
-    commands_.answers[wc] = "1 /var/log/messages\n";
-    commands_.answers["sed -n '1p' /var/log/messages"] = "Nov 20 10:11:12 host\n";
+    std::string const wc = systemLog::count;
+    commands_.answers = systemLog::answers({"Nov 20 10:11:12 host"});
     long time = 0;
     NQ::logInfo().getCreationTime(time, 1);
-    EXPECT_EQ(throughTheRunner(), (Commands{wc + "|r", wc + "|r", wc + "|r",
-                                            "sed -n '1p' /var/log/messages|r", "date|r"}));
+    EXPECT_EQ(throughTheRunner(),
+              (Commands{wc + "|r", wc + "|r", wc + "|r", systemLog::line(1) + "|r", "date|r"}));
 }
 
 TEST_F(CommandRunner, RunsTheOperationsOnAnAccount)

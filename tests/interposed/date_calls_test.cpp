@@ -8,6 +8,7 @@
 #include "tests/interposed/StandIns.h"
 #include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
+#include "tests/support/SystemLog.h"
 
 #include <gtest/gtest.h>
 
@@ -88,9 +89,7 @@ TEST_F(DateCalls, OfTheInstallDateLeaveSummerTimeToTheSystem)
 
 TEST_F(DateCalls, OfALogEntryLeaveSummerTimeToTheSystem)
 {
-    commands_.answers = {{"wc -l /var/log/messages", "1 /var/log/messages\n"},
-                         {"sed -n '1p' /var/log/messages", "Nov 20 10:11:12 host\n"},
-                         {"date", "Sat Nov 21 03:15:30 UTC 2026\n"}};
+    commands_.answers = systemLog::answers({"Nov 20 10:11:12 host"});
     long time = 0;
     EXPECT_TRUE(NQ::logInfo().getCreationTime(time, 1));
     EXPECT_EQ(conversions(), Calls{"by name 2026 Nov 20 0 10 11 12 -1"});

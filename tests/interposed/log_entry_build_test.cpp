@@ -8,6 +8,7 @@
 #include "tests/support/Frame.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Shown.h"
+#include "tests/support/SystemLog.h"
 #include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
@@ -58,9 +59,7 @@ protected:
     LogEntryBuild()
     {
         useZone("UTC0");
-        commands.answers = {{"wc -l /var/log/messages", "1 f\n"},
-                            {"sed -n '1p' /var/log/messages", "Nov 20 10:11:12 host\n"},
-                            {"date", "Sat Nov 21 03:15:30 UTC 2026\n"}};
+        commands.answers = systemLog::answers({"Nov 20 10:11:12 host"});
         frame.createLogNodes();
         standIns() = {};
         asked() = {};

@@ -2,7 +2,6 @@
 #include "nodes/GroupNode.h"
 
 #include "nodes/nodeValues.h"
-#include "sysdata/minMaxId.h"
 #include "tests/interpose/Libc.h"
 #include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
@@ -16,14 +15,10 @@
 #include <grp.h>
 #include <new>
 #include <string>
-#include <typeinfo>
-#include <utility>
 #include <vector>
 
 namespace group_nodes_test
 {
-
-using Ids = std::vector<unsigned int>;
 
 /** A machine with two groups to report, one of them empty, and one that is not reported. */
 class GroupNodes : public testing::Test
@@ -41,45 +36,10 @@ protected:
         return frame.ofType(51);
     }
 
-    std::vector<IC::Node*> inOrder() const
-    {
-        std::vector<IC::MutableNode*> const nodes = groups();
-        return {nodes.begin(), nodes.end()};
-    }
-
     FakeFiles const files;
     libc::HookGuard const guard;
     Frame frame;
 };
-
-TEST_F(GroupNodes, HaveTheOrderOfTheDatabase)
-{
-    frame.nextNodeId_ = 30;
-    frame.createGroupNodes(false);
-    ASSERT_EQ(groups().size(), 2U);
-    for (unsigned int i = 0; i < 2; ++i) {
-        IC::MutableNode const& node = *groups()[i];
-        EXPECT_EQ(node.getNodeId(), 30 + i);
-        EXPECT_EQ(node.getIndex(), i + 1);
-        EXPECT_EQ(node.getLinkedId(), frame.osNode_->getNodeId());
-        EXPECT_EQ(node.getMIIds(), Ids{7});
-        EXPECT_EQ(node.getStatus(), 1U);
-        EXPECT_EQ(node.getDescription(), "Group");
-        EXPECT_TRUE(typeid(node) == typeid(IC::GroupNode));
-    }
-    EXPECT_EQ(frame.nextNodeId_, 32U);
-    EXPECT_EQ(frame.currentNode_, groups().back());
-    EXPECT_EQ(frame.groupNodes_, inOrder());
-}
-
-TEST_F(GroupNodes, KeepTheInterfaceIdsTheyWereMadeWith)
-{
-    frame.miIds_ = {7, 9};
-    frame.createGroupNodes(false);
-    frame.miIds_.push_back(11);
-    for (IC::MutableNode const* node : groups())
-        EXPECT_EQ(node->getMIIds(), (Ids{7, 9}));
-}
 
 TEST_F(GroupNodes, HoldFourProperties)
 {
@@ -108,76 +68,6 @@ TEST_F(GroupNodes, AreSetUpInTheOrderThatHostsSee)
     frame.createGroupNodes(false);
     EXPECT_EQ(calls.calls, (Lines{"setStatus(1)", "setDescription(Group)", "setProperty(108)",
                                   "setProperty(89)", "setProperty(165)", "setProperty(51)"}));
-}
-
-TEST_F(GroupNodes, NoteTheirIdsAndAreNotPublishedAtTheStart)
-{
-    frame.nextNodeId_ = 30;
-    frame.createGroupNodes(false);
-    EXPECT_EQ(*frame.nodeIds_, (Ids{30, 31}));
-    EXPECT_TRUE(frame.published.empty());
-    EXPECT_TRUE(frame.deleted.empty());
-}
-
-TEST_F(GroupNodes, ArePublishedOnARefreshAndTheirIdsNotNoted)
-{
-    frame.createGroupNodes(false);
-    Ids const noted = *frame.nodeIds_;
-    unsigned int const next = frame.nextNodeId_;
-    frame.createGroupNodes(true);
-    EXPECT_EQ(*frame.nodeIds_, noted);
-    ASSERT_EQ(groups().size(), 2U);
-    EXPECT_EQ(frame.published, inOrder());
-    for (unsigned int i = 0; i < 2; ++i) {
-        EXPECT_EQ(groups()[i]->getNodeId(), next + i);
-        EXPECT_EQ(groups()[i]->getIndex(), i + 1);
-    }
-}
-
-TEST_F(GroupNodes, ArePublishedAsSoonAsEachIsComplete)
-{
-    struct Publications {
-        Frame const& frame;
-        Lines seen;
-    } publications{frame, {}};
-    frame.setLoadCallBack(
-        [](IC::Node* const& node, void const* context) {
-            auto& to = *static_cast<Publications*>(const_cast<void*>(context));
-            to.seen.push_back("node " + std::to_string(to.frame.ofType(51).size()) + " with " +
-                              std::to_string(node->getProperties().size()) + " properties");
-            return IC::values::success();
-        },
-        &publications, nullptr);
-    frame.createGroupNodes(true);
-    EXPECT_EQ(publications.seen, (Lines{"node 1 with 4 properties", "node 2 with 4 properties"}));
-}
-
-TEST_F(GroupNodes, AreAllDeletedOnARefreshBeforeANewOneIsMade)
-{
-    frame.createGroupNodes(false);
-    std::vector<IC::Node*> const before = frame.groupNodes_;
-    Recording const log;
-    frame.createGroupNodes(true);
-    EXPECT_EQ(frame.deleted, before);
-    Lines const texts = log.texts(3000);
-    EXPECT_EQ(Lines(texts.begin(), texts.begin() + 6),
-              (Lines{"createGroupNodes: entry", "Delete a group entry: Group",
-                     "GroupNode::~GroupNode: entry", "Delete a group entry: Group",
-                     "GroupNode::~GroupNode: entry", "getGroupInfo: entry"}));
-    LogRecord const announcement = log.records().at(2);
-    EXPECT_EQ(announcement.text, "Delete a group entry: Group");
-    EXPECT_EQ(announcement.function, "createGroupNodes");
-    EXPECT_EQ(announcement.file, "OsSwMI");
-}
-
-TEST_F(GroupNodes, AreNotDeletedWhenBuiltWithoutARefresh)
-{
-    frame.createGroupNodes(false);
-    frame.createGroupNodes(false);
-    EXPECT_TRUE(frame.deleted.empty());
-    EXPECT_EQ(groups().size(), 4U);
-    EXPECT_EQ(frame.groupNodes_.size(), 2U);
-    EXPECT_EQ(groups()[2]->getIndex(), 1U);
 }
 
 TEST_F(GroupNodes, LogTheirNumberAndEachNameAndId)
@@ -270,16 +160,6 @@ TEST_F(GroupNodes, AreNoneOnAnEmptyDatabase)
     EXPECT_TRUE(log.has("groups.size() = 0", 3000));
 }
 
-TEST_F(GroupNodes, AnswerTheirCountLive)
-{
-    frame.createGroupNodes(false);
-    files.write("/etc/group", "root:x:0:\nteam:x:500:\nnew:x:501:\n");
-    IC::PropertyValue value = IC::values::emptyValue();
-    EXPECT_EQ(static_cast<std::string>(groups()[0]->getProperty(51, value)), "status 0");
-    EXPECT_EQ(shown(value), "number 3 true");
-    EXPECT_EQ(storedValue(*groups()[0], 51), "number 2 true");
-}
-
 TEST_F(GroupNodes, AnswerTheirCountWithoutALock)
 {
     frame.createGroupNodes(false);
@@ -291,18 +171,6 @@ TEST_F(GroupNodes, AnswerTheirCountWithoutALock)
     IC::PropertyValue value = IC::values::emptyValue();
     groups()[0]->getProperty(51, value);
     EXPECT_EQ(locked, Lines{"the listing's"});
-}
-
-TEST_F(GroupNodes, AnswerAllElseFromWhatIsStored)
-{
-    frame.createGroupNodes(false);
-    files.write("/etc/group", "");
-    IC::PropertyValue value = IC::values::emptyValue();
-    EXPECT_EQ(groups()[1]->getProperty(108, value).getStatus(), 0);
-    EXPECT_EQ(shown(value), "text team true");
-    IC::PropertyValue untouched = IC::values::text("untouched");
-    EXPECT_EQ(groups()[1]->getProperty(4711, untouched).getStatus(), 1);
-    EXPECT_EQ(shown(untouched), "text untouched true");
 }
 
 TEST_F(GroupNodes, OnlyStoreWhatIsWrittenToThem)
@@ -351,15 +219,6 @@ TEST_F(GroupNodes, LogEveryReadUnderTheFramesName)
     }
 }
 
-TEST_F(GroupNodes, AreAnnouncedByTheirDescriptionWhenDeleted)
-{
-    frame.createGroupNodes(false);
-    groups()[1]->setDescription("Renamed");
-    Recording const log;
-    frame.createGroupNodes(true);
-    EXPECT_TRUE(log.has("Delete a group entry: Renamed", 3000));
-}
-
 TEST_F(GroupNodes, DoNotChangeTheUserBuildersFlag)
 {
     IC::OSSWMI::MI_call = true;
@@ -384,17 +243,6 @@ TEST_F(GroupNodes, LogTheSourceLineOfEachMessage)
                     << record.text << " from line " << record.line;
             }
     EXPECT_EQ(found, 2 * (1 + 2 + 2)); // both operations; two groups
-}
-
-TEST_F(GroupNodes, QueryTheirParentsIdOnceEach)
-{
-    Counter parent;
-    IC::MutableNode* const real = std::exchange(frame.osNode_, &parent);
-    frame.createGroupNodes(false);
-    frame.osNode_ = real;
-    ASSERT_EQ(groups().size(), 2U);
-    EXPECT_EQ(groups()[0]->getLinkedId(), 101U);
-    EXPECT_EQ(groups()[1]->getLinkedId(), 102U);
 }
 
 } // namespace group_nodes_test

@@ -3,6 +3,7 @@
 #include "tests/support/Frame.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
+#include "tests/support/SystemLog.h"
 #include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
@@ -17,8 +18,6 @@ namespace log_nodes_test
 
 using Ids = std::vector<unsigned int>;
 
-constexpr char wc[] = "wc -l /var/log/messages";
-
 // 2026-11-20 10:11:00 UTC, the minute of all the log lines below.
 constexpr long firstStamp = 1795169460;
 
@@ -28,24 +27,13 @@ protected:
     LogNodes()
     {
         useZone("UTC0");
-        commands.answers["date"] = "Sat Nov 21 03:15:30 UTC 2026\n";
         haveLines(0);
     }
 
     /** Line n of the log says "message n", the seconds of its stamp being n modulo 60. */
-    void haveLines(int count)
+    void haveLines(unsigned int count)
     {
-        commands.answers[wc] = std::to_string(count) + " /var/log/messages\n";
-        for (int line = 1; line <= count; ++line) {
-            char stamp[32];
-            std::snprintf(stamp, sizeof stamp, "Nov 20 10:11:%02d ", line % 60);
-            haveLine(line, std::string(stamp) + "message " + std::to_string(line) + "\n");
-        }
-    }
-
-    void haveLine(int line, std::string const& text)
-    {
-        commands.answers["sed -n '" + std::to_string(line) + "p' /var/log/messages"] = text;
+        commands.answers = systemLog::answers(systemLog::messages(count));
     }
 
     void build()
@@ -176,7 +164,8 @@ TEST_F(LogNodes, RunTheCommandsOfAnEntryInOrder)
     haveLines(1);
     frame.createLogNodes();
     frame.createLogEntryNodes(false);
-    std::string const sed = "sed -n '1p' /var/log/messages";
+    std::string const wc = systemLog::count;
+    std::string const sed = systemLog::line(1);
     EXPECT_EQ(commands.ran, (Lines{wc, wc, wc, wc, sed, wc, wc, wc, sed, "date"}));
 }
 
@@ -213,7 +202,7 @@ TEST_F(LogNodes, LogTheStepsOfAnEntryInOrder)
 TEST_F(LogNodes, HaveAsManyEntriesAsLinesUpToFifty)
 {
     struct Case {
-        int lines;
+        unsigned int lines;
         std::size_t nodes;
     };
     for (Case const& example :
@@ -241,10 +230,10 @@ TEST_F(LogNodes, ShowTheLastFiftyOfALongLog)
 
 TEST_F(LogNodes, HaveNoEntriesWhenTheLogCannotBeCounted)
 {
-    commands.answers[wc] = "";
+    commands.answers[systemLog::count] = "";
     build();
     EXPECT_TRUE(entries().empty());
-    commands.answers.erase(wc);
+    commands.answers.erase(systemLog::count);
     frame.createLogEntryNodes(false);
     EXPECT_TRUE(entries().empty());
 }
@@ -252,7 +241,7 @@ TEST_F(LogNodes, HaveNoEntriesWhenTheLogCannotBeCounted)
 TEST_F(LogNodes, LeaveTheTimeUnsetIfALineHasNone)
 {
     haveLines(2);
-    haveLine(2, "kernel: no stamp at all here\n");
+    commands.answers[systemLog::line(2)] = "kernel: no stamp at all here\n";
     build();
     ASSERT_EQ(entries().size(), 2U);
     EXPECT_EQ(storedValue(*entries()[0], 81), "text * at all here* true");
@@ -264,8 +253,8 @@ TEST_F(LogNodes, LeaveTheTimeUnsetIfALineHasNone)
 TEST_F(LogNodes, LeaveMessageAndTimeUnsetIfTheLogShrinks)
 {
     haveLines(0);
-    commands.first[wc] = {"2 f\n"};
-    haveLine(0, "");
+    commands.first[systemLog::count] = {"2 f\n"};
+    commands.answers[systemLog::line(0)] = "";
     build();
     ASSERT_EQ(entries().size(), 2U);
     EXPECT_EQ(storedValue(*entries()[0], 81), "text ** true"); // one past the oldest is accepted

@@ -13,18 +13,12 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
-#include <cstdlib>
 #include <new>
 #include <string>
-#include <typeinfo>
-#include <utility>
 #include <vector>
 
 namespace user_nodes_test
 {
-
-using Ids = std::vector<unsigned int>;
 
 /** A machine with three users. */
 class UserNodes : public testing::Test
@@ -43,47 +37,9 @@ protected:
         return frame.ofType(46);
     }
 
-    std::vector<IC::Node*> inOrder() const
-    {
-        std::vector<IC::MutableNode*> const nodes = users();
-        return {nodes.begin(), nodes.end()};
-    }
-
     FakeFiles const files;
     Frame frame;
 };
-
-TEST_F(UserNodes, HaveTheOrderOfTheAccountFile)
-{
-    frame.nextNodeId_ = 30;
-    frame.createUserNodes(false);
-    ASSERT_EQ(users().size(), 3U);
-    for (unsigned int i = 0; i < 3; ++i) {
-        IC::MutableNode const& node = *users()[i];
-        EXPECT_EQ(node.getNodeId(), 30 + i);
-        EXPECT_EQ(node.getIndex(), i + 1);
-        EXPECT_EQ(node.getLinkedId(), frame.osNode_->getNodeId());
-        EXPECT_EQ(node.getMIIds(), Ids{7});
-        EXPECT_EQ(node.getStatus(), 1U);
-        EXPECT_EQ(node.getDescription(), "User Account");
-        EXPECT_TRUE(typeid(node) == typeid(IC::UserNode));
-    }
-    EXPECT_EQ(storedValue(*users()[0], 108), "text root true");
-    EXPECT_EQ(storedValue(*users()[1], 108), "text anna true");
-    EXPECT_EQ(storedValue(*users()[2], 108), "text ben true");
-    EXPECT_EQ(frame.nextNodeId_, 33U);
-    EXPECT_EQ(frame.currentNode_, users().back());
-    EXPECT_EQ(frame.userNodes_, inOrder());
-}
-
-TEST_F(UserNodes, KeepTheInterfaceIdsTheyWereMadeWith)
-{
-    frame.miIds_ = {7, 9};
-    frame.createUserNodes(false);
-    frame.miIds_.push_back(11);
-    for (IC::MutableNode const* node : users())
-        EXPECT_EQ(node->getMIIds(), (Ids{7, 9}));
-}
 
 TEST_F(UserNodes, HoldTwentyFourProperties)
 {
@@ -160,70 +116,6 @@ TEST_F(UserNodes, AreSetUpInTheOrderThatHostsSee)
     EXPECT_EQ(calls.calls, setUp());
 }
 
-TEST_F(UserNodes, NoteTheirIdsAndAreNotPublishedAtTheStart)
-{
-    frame.nextNodeId_ = 30;
-    frame.createUserNodes(false);
-    EXPECT_EQ(*frame.nodeIds_, (Ids{30, 31, 32}));
-    EXPECT_TRUE(frame.published.empty());
-    EXPECT_TRUE(frame.deleted.empty());
-}
-
-TEST_F(UserNodes, ArePublishedOnARefreshAndTheirIdsNotNoted)
-{
-    frame.createUserNodes(false);
-    Ids const noted = *frame.nodeIds_;
-    unsigned int const next = frame.nextNodeId_;
-    frame.createUserNodes(true);
-    EXPECT_EQ(*frame.nodeIds_, noted);
-    ASSERT_EQ(users().size(), 3U);
-    EXPECT_EQ(frame.published, inOrder());
-    for (unsigned int i = 0; i < 3; ++i) {
-        EXPECT_EQ(users()[i]->getNodeId(), next + i);
-        EXPECT_EQ(users()[i]->getIndex(), i + 1);
-    }
-    EXPECT_EQ(frame.nextNodeId_, next + 3);
-}
-
-TEST_F(UserNodes, ArePublishedAsSoonAsEachIsComplete)
-{
-    struct Publications {
-        Frame const& frame;
-        Lines seen;
-    } publications{frame, {}};
-    frame.setLoadCallBack(
-        [](IC::Node* const& node, void const* context) {
-            auto& to = *static_cast<Publications*>(const_cast<void*>(context));
-            to.seen.push_back("node " + std::to_string(to.frame.ofType(46).size()) + " with " +
-                              std::to_string(node->getProperties().size()) + " properties");
-            return IC::values::success();
-        },
-        &publications, nullptr);
-    frame.createUserNodes(true);
-    EXPECT_EQ(publications.seen, (Lines{"node 1 with 24 properties", "node 2 with 24 properties",
-                                        "node 3 with 24 properties"}));
-}
-
-TEST_F(UserNodes, AreAllDeletedOnARefreshBeforeANewOneIsMade)
-{
-    frame.createUserNodes(false);
-    std::vector<IC::Node*> const before = frame.userNodes_;
-    Recording const log;
-    frame.createUserNodes(true);
-    EXPECT_EQ(frame.deleted, before);
-    Lines const texts = log.texts(3000);
-    Lines const beginning(texts.begin(), texts.begin() + 8);
-    EXPECT_EQ(beginning, (Lines{"createUserNodes: entry", "Delete a user entry: User Account",
-                                "UserNode::~UserNode: entry", "Delete a user entry: User Account",
-                                "UserNode::~UserNode: entry", "Delete a user entry: User Account",
-                                "UserNode::~UserNode: entry", "getUserInfo: entry"}));
-    LogRecord const announcement = log.records().at(2);
-    EXPECT_EQ(announcement.text, "Delete a user entry: User Account");
-    EXPECT_EQ(announcement.function, "createUserNodes");
-    EXPECT_EQ(announcement.file, "OsSwMI");
-    EXPECT_EQ(announcement.category, "Veltrix.IC.MI.OsSwMI");
-}
-
 TEST_F(UserNodes, ShowTheAccountsAsTheyAreAtTheRefresh)
 {
     frame.createUserNodes(false);
@@ -233,16 +125,6 @@ TEST_F(UserNodes, ShowTheAccountsAsTheyAreAtTheRefresh)
     EXPECT_EQ(storedValue(*users()[0], 108), "text ben true");
     EXPECT_EQ(storedValue(*users()[1], 108), "text new true");
     EXPECT_EQ(storedValue(*users()[1], 51), "number 2 true");
-}
-
-TEST_F(UserNodes, AreNotDeletedWhenBuiltWithoutARefresh)
-{
-    frame.createUserNodes(false);
-    frame.createUserNodes(false);
-    EXPECT_TRUE(frame.deleted.empty());
-    EXPECT_EQ(users().size(), 6U);
-    EXPECT_EQ(frame.userNodes_.size(), 3U);
-    EXPECT_EQ(users()[3]->getIndex(), 1U);
 }
 
 TEST_F(UserNodes, AreBuiltUnderTheSharedLockWithoutTimeLimit)
@@ -348,18 +230,6 @@ TEST_F(UserNodes, ReleaseFlagAndLockWhenAnExceptionPasses)
     EXPECT_EQ(unlocks, 1);
 }
 
-TEST_F(UserNodes, AnswerTheirCountLive)
-{
-    frame.createUserNodes(false);
-    files.write("/etc/passwd", account("root", 0) + account("anna", 1000) + account("ben", 1001) +
-                                   account("new", 1002));
-    IC::PropertyValue value = IC::values::emptyValue();
-    IC::Error const error = users()[0]->getProperty(51, value);
-    EXPECT_EQ(static_cast<std::string>(error), "status 0");
-    EXPECT_EQ(shown(value), "number 4 true");
-    EXPECT_EQ(storedValue(*users()[0], 51), "number 3 true");
-}
-
 TEST_F(UserNodes, AnswerTheirCountWithoutALock)
 {
     frame.createUserNodes(false);
@@ -369,27 +239,6 @@ TEST_F(UserNodes, AnswerTheirCountWithoutALock)
     IC::PropertyValue value = IC::values::emptyValue();
     users()[0]->getProperty(51, value);
     EXPECT_EQ(locks, 0);
-}
-
-TEST_F(UserNodes, AnswerTheirCountWhateverIsStoredUnderIt)
-{
-    frame.createUserNodes(false);
-    users()[0]->setProperty(51, IC::values::number(99));
-    IC::PropertyValue value = IC::values::emptyValue();
-    EXPECT_EQ(users()[0]->getProperty(51, value).getStatus(), 0);
-    EXPECT_EQ(shown(value), "number 3 true");
-}
-
-TEST_F(UserNodes, AnswerAllElseFromWhatIsStored)
-{
-    frame.createUserNodes(false);
-    files.write("/etc/passwd", "");
-    IC::PropertyValue value = IC::values::emptyValue();
-    EXPECT_EQ(users()[1]->getProperty(108, value).getStatus(), 0);
-    EXPECT_EQ(shown(value), "text anna true");
-    IC::PropertyValue untouched = IC::values::text("untouched");
-    EXPECT_EQ(users()[1]->getProperty(4711, untouched).getStatus(), 1);
-    EXPECT_EQ(shown(untouched), "text untouched true");
 }
 
 TEST_F(UserNodes, LogAReadUnderTheConstructorsName)
@@ -417,15 +266,6 @@ TEST_F(UserNodes, LogTheirConstructionAndDestruction)
     EXPECT_EQ(log.texts(), Lines{"UserNode::~UserNode: entry"});
 }
 
-TEST_F(UserNodes, AreAnnouncedByTheirDescriptionWhenDeleted)
-{
-    frame.createUserNodes(false);
-    users()[1]->setDescription("Renamed");
-    Recording const log;
-    frame.createUserNodes(true);
-    EXPECT_TRUE(log.has("Delete a user entry: Renamed", 3000));
-}
-
 TEST_F(UserNodes, LogAReadUnderTheFramesName)
 {
     frame.createUserNodes(false);
@@ -450,17 +290,6 @@ TEST_F(UserNodes, CountTheDigitsOfTheirIdApartFromTheirName)
     EXPECT_EQ(storedValue(*users()[0], 90), "number 4 true");
     EXPECT_EQ(storedValue(*users()[1], 109), "number 2 true");
     EXPECT_EQ(storedValue(*users()[1], 90), "number 5 true");
-}
-
-TEST_F(UserNodes, QueryTheirParentsIdOnceEach)
-{
-    Counter parent;
-    IC::MutableNode* const real = std::exchange(frame.osNode_, &parent);
-    frame.createUserNodes(false);
-    frame.osNode_ = real;
-    ASSERT_EQ(users().size(), 3U);
-    for (unsigned int i = 0; i < 3; ++i)
-        EXPECT_EQ(users()[i]->getLinkedId(), 101 + i);
 }
 
 } // namespace user_nodes_test

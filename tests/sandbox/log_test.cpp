@@ -7,6 +7,7 @@
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
+#include "tests/support/SystemLog.h"
 #include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
@@ -25,8 +26,9 @@
 namespace log_test
 {
 
-constexpr char path[] = "/var/log/messages";
-constexpr char wc[] = "wc -l /var/log/messages";
+using systemLog::path;
+constexpr auto& wc = systemLog::count;
+constexpr auto sed = systemLog::line;
 
 class Log : public testing::Test
 {
@@ -44,21 +46,12 @@ protected:
         machine::fake("/usr/bin/date", "echo '" + date + "'\n");
     }
 
-    /** "Nov 20 10:11:SS message N" for each line N from 1. */
-    static std::string lines(int count)
+    static std::string lines(unsigned int count)
     {
         std::string text;
-        for (int line = 1; line <= count; ++line) {
-            char stamp[32];
-            std::snprintf(stamp, sizeof stamp, "Nov 20 10:11:%02d ", line % 60);
-            text += std::string(stamp) + "message " + std::to_string(line) + "\n";
-        }
+        for (std::string const& line : systemLog::messages(count))
+            text += line + "\n";
         return text;
-    }
-
-    static std::string sed(int line)
-    {
-        return "sed -n '" + std::to_string(line) + "p' /var/log/messages";
     }
 
     static void append(std::string const& text)

@@ -5,6 +5,7 @@
 #include "tests/support/Insides.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
+#include "tests/support/SystemLog.h"
 #include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
@@ -24,12 +25,8 @@ namespace log_reader_test
 
 using NQ::logInfo;
 
-constexpr char wc[] = "wc -l /var/log/messages";
-
-std::string sed(int line)
-{
-    return "sed -n '" + std::to_string(line) + "p' /var/log/messages";
-}
+constexpr auto& wc = systemLog::count;
+constexpr auto sed = systemLog::line;
 
 /** Seconds since 1970 of a day in UTC. */
 long at(int year, int month, int day, int hour, int minute, int second)

@@ -5,6 +5,9 @@
 namespace method_members_test
 {
 
+std::string const groupsOfJdoe = "gid=1001(jdoe) groups=1001(jdoe),27(sudo),100(users)";
+std::string const identityOfJdoe = "uid=1001(jdoe) " + groupsOfJdoe + "\n";
+
 class GroupMemberChanges : public MethodTest
 {
 protected:
@@ -31,106 +34,105 @@ protected:
         return {idLine_, "/usr/sbin/usermod -G " + groups + " \"jdoe\" 2>&1"};
     }
 
+    /** The list that is set when jdoe, whom id shows in these groups, is added to another one. */
+    std::string added(std::string const& group, std::string const& groups = groupsOfJdoe)
+    {
+        identity("uid=1001(jdoe) " + groups + "\n");
+        EXPECT_EQ(add(group), 0);
+        return listSet();
+    }
+
+    /** The list that is set when jdoe is removed from a group. */
+    std::string removed(std::string const& group, std::string const& groups = groupsOfJdoe)
+    {
+        identity("uid=1001(jdoe) " + groups + "\n");
+        EXPECT_EQ(remove(group), 0);
+        return listSet();
+    }
+
     std::string const idLine_ = "/usr/bin/id \"jdoe\" 2>&1";
 
 private:
+    /** What usermod was run with, after id and nothing else. */
+    std::string listSet() const
+    {
+        if (commands_.ran.size() != 2)
+            return std::to_string(commands_.ran.size()) + " commands";
+        std::string const start = "/usr/sbin/usermod -G ";
+        std::string const end = " \"jdoe\" 2>&1";
+        std::string const& line = commands_.ran[1];
+        std::string const list = line.substr(0, line.size() - end.size()).substr(start.size());
+        EXPECT_EQ(commands_.ran, linesThatSet(list));
+        return list;
+    }
+
     static int change(char const* method, std::string const& group)
     {
         return execute(method, {text("LocalGroupName", group), text("DomainAndMember", "jdoe")});
     }
 };
 
-std::string const identityOfJdoe =
-    "uid=1001(jdoe) gid=1001(jdoe) groups=1001(jdoe),27(sudo),100(users)\n";
-
 TEST_F(GroupMemberChanges, AddTheGroupAfterThePresentOnes)
 {
-    identity(identityOfJdoe);
-    EXPECT_EQ(add("staff"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\""));
+    EXPECT_EQ(added("staff"), "jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\"");
 }
 
 TEST_F(GroupMemberChanges, RemoveTheGroupFromTheList)
 {
-    identity(identityOfJdoe);
-    EXPECT_EQ(remove("sudo"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"users\""));
+    EXPECT_EQ(removed("sudo"), "jdoe,\"jdoe\",\"users\"");
 }
 
 TEST_F(GroupMemberChanges, KeepThePrimaryGroupAsTheOnlyOne)
 {
-    identity("uid=1001(jdoe) gid=100(users) groups=27(sudo)\n");
-    EXPECT_EQ(remove("sudo"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("users"));
+    EXPECT_EQ(removed("sudo", "gid=100(users) groups=27(sudo)"), "users");
 }
 
 TEST_F(GroupMemberChanges, KeepGroupsWhoseNamesOnlyBeginAlike)
 {
-    identity("uid=1001(jdoe) gid=100(users) groups=100(users),27(sudo),28(sudoers),29(su)\n");
-    EXPECT_EQ(remove("sudo"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("users,\"users\",\"sudoers\",\"su\""));
+    EXPECT_EQ(removed("sudo", "gid=100(users) groups=100(users),27(sudo),28(sudoers),29(su)"),
+              "users,\"users\",\"sudoers\",\"su\"");
 }
 
 TEST_F(GroupMemberChanges, KeepThePrimaryGroupEvenIfItIsRemoved)
 {
-    identity(identityOfJdoe);
-    EXPECT_EQ(remove("jdoe"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"sudo\",\"users\""));
+    EXPECT_EQ(removed("jdoe"), "jdoe,\"sudo\",\"users\"");
 }
 
 TEST_F(GroupMemberChanges, LoseAPrimaryGroupThatComparesAsOneMore)
 {
     // The quoted group begins with a double quote, and "#" is the character after that.
-    identity("uid=1001(jdoe) gid=1001(#jdoe) groups=27(sudo),100(users)\n");
-    EXPECT_EQ(remove("sudo"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("\"users\""));
-    identity("uid=1001(jdoe) gid=1001($jdoe) groups=27(sudo),100(users)\n");
-    EXPECT_EQ(remove("sudo"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("$jdoe,\"users\""));
-    identity("uid=1001(jdoe) gid=1001(!jdoe) groups=27(sudo),100(users)\n");
-    EXPECT_EQ(remove("sudo"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("!jdoe,\"users\""));
-    identity("uid=1001(jdoe) gid=1001(\"t) groups=27(sudo),100(users)\n");
-    EXPECT_EQ(remove("sudo"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("\"users\""));
+    EXPECT_EQ(removed("sudo", "gid=1001(#jdoe) groups=27(sudo),100(users)"), "\"users\"");
+    EXPECT_EQ(removed("sudo", "gid=1001($jdoe) groups=27(sudo),100(users)"), "$jdoe,\"users\"");
+    EXPECT_EQ(removed("sudo", "gid=1001(!jdoe) groups=27(sudo),100(users)"), "!jdoe,\"users\"");
+    EXPECT_EQ(removed("sudo", "gid=1001(\"t) groups=27(sudo),100(users)"), "\"users\"");
 }
 
 TEST_F(GroupMemberChanges, KeepSuchAPrimaryGroupWhenAdded)
 {
-    identity("uid=1001(jdoe) gid=1001(#jdoe) groups=27(sudo)\n");
-    EXPECT_EQ(add("users"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("#jdoe,\"sudo\",\"users\""));
+    EXPECT_EQ(added("users", "gid=1001(#jdoe) groups=27(sudo)"), "#jdoe,\"sudo\",\"users\"");
 }
 
 TEST_F(GroupMemberChanges, FindTheListInOtherLanguages)
 {
-    identity("uid=1001(jdoe) gid=100(users) Gruppen=100(users),27(sudo)\n");
-    EXPECT_EQ(add("staff"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("users,\"users\",\"sudo\",\"staff\""));
+    EXPECT_EQ(added("staff", "gid=100(users) Gruppen=100(users),27(sudo)"),
+              "users,\"users\",\"sudo\",\"staff\"");
 }
 
 TEST_F(GroupMemberChanges, WorkForAMemberOfOnlyThePrimaryGroup)
 {
-    identity("uid=1001(jdoe) gid=100(users)\n");
-    EXPECT_EQ(add("staff"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("users,\"staff\""));
+    EXPECT_EQ(added("staff", "gid=100(users)"), "users,\"staff\"");
 }
 
 TEST_F(GroupMemberChanges, FindTheListAfterTheWordGroups)
 {
-    identity("uid=1001(jdoe) gid=100(users) egid=5(tty) groups=27(sudo)\n");
-    EXPECT_EQ(add("staff"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("users,\"sudo\",\"staff\""));
+    EXPECT_EQ(added("staff", "gid=100(users) egid=5(tty) groups=27(sudo)"),
+              "users,\"sudo\",\"staff\"");
 }
 
 TEST_F(GroupMemberChanges, WorkForAPrimaryGroupWithoutAName)
 {
-    identity("uid=1001(jdoe) gid=5000\n");
-    EXPECT_EQ(add("staff"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("\"staff\""));
-    identity("uid=1001(jdoe) gid=5000 groups=5000,27(sudo),100(users)\n");
-    EXPECT_EQ(remove("sudo"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("\"users\""));
+    EXPECT_EQ(added("staff", "gid=5000"), "\"staff\"");
+    EXPECT_EQ(removed("sudo", "gid=5000 groups=5000,27(sudo),100(users)"), "\"users\"");
 }
 
 TEST_F(GroupMemberChanges, KeepAUserInItsOnlyNamedGroup)
@@ -252,12 +254,8 @@ TEST_F(GroupMemberChanges, LogTheOutputOfTheTools)
 
 TEST_F(GroupMemberChanges, ListAGroupTwiceIfItIsAddedAgain)
 {
-    identity(identityOfJdoe);
-    EXPECT_EQ(add("sudo"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"sudo\""));
-    identity(identityOfJdoe);
-    EXPECT_EQ(remove("staff"), 0); // not a member
-    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\""));
+    EXPECT_EQ(added("sudo"), "jdoe,\"jdoe\",\"sudo\",\"users\",\"sudo\"");
+    EXPECT_EQ(removed("staff"), "jdoe,\"jdoe\",\"sudo\",\"users\""); // not a member
 }
 
 TEST_F(GroupMemberChanges, AreMadeWhateverTypesOtherParametersHave)

@@ -3,6 +3,7 @@
 
 #include <gtest/gtest.h>
 
+#include <map>
 #include <string>
 #include <vector>
 
@@ -104,86 +105,58 @@ TEST(LoginRules, MayBeNone)
 
 constexpr char const* label = "Password expires";
 
-TEST(LabelledDate, IsReadAfterItsLabelAndAColon)
+/** The outcome of scanning a line, and the date that was 3 February 2008 before. */
+std::string scanned(char const* line)
 {
-    LabelledDate date;
-    EXPECT_EQ(scanLabelledDate("Password expires\t\t\t\t\t: Feb 03, 2008\n", label, date),
-              Scan::valid);
-    EXPECT_EQ(date.month, "Feb");
-    EXPECT_EQ(date.day, 3);
-    EXPECT_EQ(date.year, 2008);
+    static std::map<Scan, std::string> const outcomes = {
+        {Scan::valid, "valid"}, {Scan::invalid, "invalid"}, {Scan::absent, "absent"}};
+    LabelledDate date{"Feb", 3, 2008};
+    Scan const scan = scanLabelledDate(line, label, date);
+    return outcomes.at(scan) + ' ' + date.month + ' ' + std::to_string(date.day) + ' ' +
+           std::to_string(date.year);
 }
 
-TEST(LabelledDate, IsReplacedByALaterOne)
+TEST(LabelledDate, IsReadAfterItsLabelAndAColon)
 {
-    LabelledDate date{"Feb", 3, 2008};
-    EXPECT_EQ(scanLabelledDate("Password expires : Dec 31, 2010", label, date), Scan::valid);
-    EXPECT_EQ(date.month, "Dec");
-    EXPECT_EQ(date.day, 31);
-    EXPECT_EQ(date.year, 2010);
+    EXPECT_EQ(scanned("Password expires\t\t\t\t\t: Dec 01, 2010\n"), "valid Dec 1 2010");
+    EXPECT_EQ(scanned("Password expires : Dec 31, 2010"), "valid Dec 31 2010");
 }
 
 TEST(LabelledDate, IsKeptByALineWithoutTheLabel)
 {
-    LabelledDate date{"Feb", 3, 2008};
-    EXPECT_EQ(scanLabelledDate("Account expires : Dec 31, 2010", label, date), Scan::absent);
-    EXPECT_EQ(date.month, "Feb");
-    EXPECT_EQ(date.day, 3);
-    EXPECT_EQ(date.year, 2008);
+    EXPECT_EQ(scanned("Account expires : Dec 31, 2010"), "absent Feb 3 2008");
 }
 
 TEST(LabelledDate, IsInvalidIfTheLabelIsNotAtTheStart)
 {
-    LabelledDate date{"Feb", 3, 2008};
-    EXPECT_EQ(scanLabelledDate("x Password expires : Dec 31, 2010", label, date), Scan::invalid);
-    EXPECT_EQ(date.month, "Feb");
-    EXPECT_EQ(date.day, 3);
-    EXPECT_EQ(date.year, 2008);
+    EXPECT_EQ(scanned("x Password expires : Dec 31, 2010"), "invalid Feb 3 2008");
 }
 
 TEST(LabelledDate, ReadsNeverAsTheMonthOfAnInvalidDate)
 {
-    LabelledDate date{"Feb", 3, 2008};
-    EXPECT_EQ(scanLabelledDate("Password expires : never\n", label, date), Scan::invalid);
-    EXPECT_EQ(date.month, "never");
-    EXPECT_EQ(date.day, 3);
-    EXPECT_EQ(date.year, 2008);
+    EXPECT_EQ(scanned("Password expires : never\n"), "invalid never 3 2008");
 }
 
 TEST(LabelledDate, Is19January2038IfADayAndAYearFollowNever)
 {
-    LabelledDate date;
-    EXPECT_EQ(scanLabelledDate("Password expires : never 01, 2008", label, date), Scan::valid);
-    EXPECT_EQ(date.month, "Jan");
-    EXPECT_EQ(date.day, 19);
-    EXPECT_EQ(date.year, 2038);
+    EXPECT_EQ(scanned("Password expires : never 01, 2008"), "valid Jan 19 2038");
 }
 
 TEST(LabelledDate, KeepsWhatWasReadOfAnInvalidDate)
 {
-    LabelledDate date{"Feb", 3, 2008};
-    EXPECT_EQ(scanLabelledDate("Password expires : Dec 31 2010", label, date), Scan::invalid);
-    EXPECT_EQ(date.month, "Dec");
-    EXPECT_EQ(date.day, 31);
-    EXPECT_EQ(date.year, 2008);
-}
-
-TEST(LabelledDate, IsValidWithADayThatNoMonthHas)
-{
-    LabelledDate date;
-    EXPECT_EQ(scanLabelledDate("Password expires : Feb 0, 2008", label, date), Scan::valid);
-    EXPECT_EQ(date.day, 0);
-    EXPECT_EQ(scanLabelledDate("Password expires : Feb 99, 2008", label, date), Scan::valid);
-    EXPECT_EQ(date.day, 99);
+    EXPECT_EQ(scanned("Password expires : Dec 31 2010"), "invalid Dec 31 2008");
 }
 
 TEST(LabelledDate, ReadsTwoDigitsOfTheDayAndFourOfTheYear)
 {
-    LabelledDate date;
-    EXPECT_EQ(scanLabelledDate("Password expires : Dec 31, 20109", label, date), Scan::valid);
-    EXPECT_EQ(date.year, 2010);
-    EXPECT_EQ(scanLabelledDate("Password expires : Dec 311, 2010", label, date), Scan::invalid);
-    EXPECT_EQ(date.day, 31);
+    EXPECT_EQ(scanned("Password expires : Dec 31, 20109"), "valid Dec 31 2010");
+    EXPECT_EQ(scanned("Password expires : Dec 311, 2010"), "invalid Dec 31 2008");
+}
+
+TEST(LabelledDate, IsValidWithADayThatNoMonthHas)
+{
+    EXPECT_EQ(scanned("Password expires : Feb 0, 2008"), "valid Feb 0 2008");
+    EXPECT_EQ(scanned("Password expires : Feb 99, 2008"), "valid Feb 99 2008");
 }
 
 TEST(LabelledDate, HoldsAMonthTextAsLongAsTheLine)

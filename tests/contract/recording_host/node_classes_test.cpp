@@ -1,6 +1,7 @@
 // What the four node classes add to a plain node: a few messages, no data.
 
 #include "tests/contract/recording_host/Loaded.h"
+#include "tests/support/SystemLog.h"
 
 #include <filesystem>
 #include <memory>
@@ -234,9 +235,7 @@ class LogEntryReads : public Loaded
 
 TEST_F(LogEntryReads, MakeOneSuccessStatusAndTakeNoLock)
 {
-    commands.answers = {{"wc -l /var/log/messages", "16 f\n"},
-                        {"sed -n '1p' /var/log/messages", "Nov 20 10:11:12 host\n"},
-                        {"date", "Sat Nov 21 03:15:30 UTC 2026\n"}};
+    commands.answers = systemLog::answers(systemLog::messages(16));
     std::unique_ptr<IC::MutableNode> const node(construct("LogEntryNode")); // its index is 16
     for (unsigned int const id : {81U, 79U}) {
         host.errors.clear();

@@ -4,7 +4,7 @@
 //   Refresh/N    deletes them all and builds them again
 //   peak memory  of the user nodes of the largest machine, start-up only, per node
 //
-// The machine is made up: every user has a primary group of its own, and one group holds all
+// The machine is made up: every user has its own primary group, and one group contains all
 // users. Files are real ones below a temporary folder; no command is run, nothing is logged.
 // After the runs each one's growth from 1,000 to 10,000 users is printed; it must be at most 12.
 

@@ -21,9 +21,9 @@ struct FileState {
 /** How one path changed. */
 struct PathChange {
     std::string path;
-    std::optional<FileState> before; // none: it was not there
+    std::optional<FileState> before; // none: it did not exist
     std::optional<FileState> after;
-    // Of a text file in /etc that is not too long, and empty for one that is not there. Both or
+    // Of a text file in /etc that is not too long, and empty for one that does not exist. Both or
     // none.
     std::optional<std::string> oldText;
     std::optional<std::string> newText;

@@ -58,7 +58,7 @@ TEST(HostCheck, PassesTheReferenceRuntime)
     expectAllPassed(checked({MINIMAL_HOST}));
 }
 
-TEST(HostCheck, PassesAHostWrittenFromTheHeadersAlone)
+TEST(HostCheck, PassesAHostWrittenOnlyFromTheHeaders)
 {
     expectAllPassed(checked({host("other_host")}));
 }

@@ -144,7 +144,7 @@ TEST_P(Methods, UserDelRemovesTheAccountAndItsNode)
     EXPECT_EQ(text(host_.os(), IC::property::createUser), "UserDel," + userName());
 }
 
-TEST_P(Methods, UserDelOfNobodyFailsAndPublishesNothing)
+TEST_P(Methods, UserDelOfAMissingUserFailsAndPublishesNothing)
 {
     EXPECT_EQ(host_.call("UserDel,UserName:CMPI_string:nosuch").getStatus(), 1);
     EXPECT_EQ(host_.ran(), Lines{"/usr/sbin/userdel nosuch 2>&1"});
@@ -293,7 +293,7 @@ TEST_P(Methods, ChangeOneMembershipAndKeepTheOthers)
     EXPECT_EQ(text(host_.plugin().node(IC::nodeType::group, "crew"), IC::property::members), "");
 }
 
-TEST_P(Methods, LocalGroupAddUserOfNobodyFails)
+TEST_P(Methods, LocalGroupAddUserOfAMissingUserFails)
 {
     EXPECT_EQ(host_
                   .call("LocalGroupAddUser,LocalGroupName:CMPI_string:" + account_.user +

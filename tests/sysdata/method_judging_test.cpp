@@ -180,7 +180,7 @@ TEST_F(SettingAPassword, IsDoneForAnyMethodWithAPassword)
     EXPECT_EQ(commands_.ran, (Lines{"/usr/sbin/usermod -c J -p secret jdoe 2>&1", passwdLine_}));
 }
 
-TEST_F(SettingAPassword, IsDoneForAnEmptyOneWhereTheLinesEnd)
+TEST_F(SettingAPassword, RunsIncompleteLinesForAnEmptyOne)
 {
     EXPECT_EQ(execute("UserSetPassword", {text("UserName", "jdoe"), text("Password", "")}), 0);
     EXPECT_EQ(commands_.ran, (Lines{"/usr/sbin/usermod -p 2>&1", "echo 2>&1"}));

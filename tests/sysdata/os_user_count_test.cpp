@@ -82,7 +82,7 @@ TEST_F(UserCount, CountsEveryAccountWithUidZero)
     EXPECT_EQ(countOf(account("root", 0) + account("toor", 0)), 2U);
 }
 
-TEST_F(UserCount, CountsNobodyWithoutAnAccountFile)
+TEST_F(UserCount, IsZeroWithoutAnAccountFile)
 {
     EXPECT_EQ(count(), 0U);
     EXPECT_EQ(steps_, (std::vector<std::string>{"lock", "setpwent", "unlock"}));

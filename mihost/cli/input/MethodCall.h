@@ -38,7 +38,7 @@ MethodCall parseCall(std::string const& method, std::vector<std::string> const& 
 
 /**
  * Contract: the plug-in has the shell print the exit status of every command line that contains
- * this word, and takes any output for a failure, except in the first command of UserAdd.
+ * this word, and treats any output as a failure, except in the first command of UserAdd.
  */
 constexpr std::string_view misjudgedWord = "useradd";
 

@@ -38,7 +38,7 @@ struct Column {
 
     std::string name; // heading, and key in documents
     Align align;
-    std::string otherName; // that --columns and its kin also take; empty for none
+    std::string otherName; // which --columns, --sort and --where accept, too; empty for none
 };
 
 /** Which columns and rows of a table are shown, and in which order. */

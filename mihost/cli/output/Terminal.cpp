@@ -85,7 +85,7 @@ bool fits(int descriptor, std::string_view text)
 {
     winsize size{};
     if (ioctl(descriptor, TIOCGWINSZ, &size) != 0 || size.ws_row == 0 || size.ws_col == 0)
-        return true; // nobody knows
+        return true; // unknown
     std::size_t rows = 1;
     while (!text.empty() && rows <= size.ws_row) {
         std::size_t const end = std::min(text.find('\n'), text.size());

@@ -12,7 +12,7 @@ namespace
 {
 
 constexpr char clearLine[] = "\r\x1b[K";
-constexpr unsigned int closely = 200; // beyond that many steps only every so many are shown
+constexpr unsigned int closely = 200; // with more steps, not every one is shown
 
 } // namespace
 

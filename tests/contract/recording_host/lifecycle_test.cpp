@@ -89,7 +89,7 @@ TEST_F(Library, DeletesNoNodeWhenItIsClosed)
                                   "~ManagementInterface(), category Veltrix.IC.MI.OsSwMI"}));
 }
 
-TEST_F(Library, IsGoneOnceItIsClosed)
+TEST_F(Library, IsUnloadedWhenItIsClosed)
 {
     std::make_unique<Plugin>().reset();
     EXPECT_EQ(dlopen(PLUGIN_FILE, RTLD_NOW | RTLD_NOLOAD), nullptr);

@@ -102,7 +102,7 @@ TEST(MethodCall, IsRefusedIfTheWordUseraddWouldMakeItFail)
         EXPECT_NE(refusal([text] { takeApart(text); }), "accepted") << text;
 }
 
-TEST(MethodCall, MayContainTheWordUseraddWhereItIsExpected)
+TEST(MethodCall, MayContainTheWordUseraddInUserAdd)
 {
     for (char const* text :
          {"UserAdd,UserName:CMPI_string:jdoe,Comment:CMPI_string:made by useradd",

@@ -56,7 +56,7 @@ TEST(AccelLsmod, ListsOnlyTheHeaderIfNothingIsLoaded)
     EXPECT_EQ(answered("lsmod"), real("lsmod"));
 }
 
-TEST(AccelLsmod, GivesNoAnswerWhereLsmodPrintsErrors)
+TEST(AccelLsmod, GivesNoAnswerIfLsmodPrintsErrors)
 {
     kernelModules::load({{"one", 1, 0, {}}});
     fs::remove("/sys/module/one/holders");

@@ -162,7 +162,7 @@ TEST_F(Doctor, ChecksEachCommandThatThePluginRuns)
                   "the method LocalGroupDel");
 }
 
-TEST_F(Doctor, TellsAMissingCommandFromATooShortPath)
+TEST_F(Doctor, DistinguishesAMissingCommandFromAShortPath)
 {
     setenv("PATH", "/usr/bin:/bin", 1);
     expectMissing("command chpasswd", "not found in PATH", "writing password of users");

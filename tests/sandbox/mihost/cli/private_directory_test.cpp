@@ -104,7 +104,7 @@ TEST_F(MihostPrivateDirectory, OfARunningStartIsKept)
     EXPECT_EQ(machine::read("/tmp/after"), machine::read("/tmp/before"));
 }
 
-TEST_F(MihostPrivateDirectory, IsRemovedWithWhateverFilesAreInIt)
+TEST_F(MihostPrivateDirectory, IsRemovedWithAllItsFiles)
 {
     std::string const path = makeLeft("mihost-aB3dE6");
     machine::write(path + "/core", "memory");

@@ -26,6 +26,20 @@ std::size_t hostWordsAt(std::vector<std::string> const& words, std::size_t at,
     return word == "--host=" + host || word == "-H" + host ? 1 : 0;
 }
 
+std::vector<std::string> terminalOptions(RemoteTerminal terminal)
+{
+    switch (terminal) {
+    case RemoteTerminal::Use:
+        // Or ssh would add "Connection to HOST closed." to what the command prints.
+        return {"-t", "-o", "LogLevel=ERROR"};
+    case RemoteTerminal::None:
+        return {"-T"};
+    case RemoteTerminal::Ignore:
+        return {"-T", "-n"};
+    }
+    return {};
+}
+
 } // namespace
 
 std::vector<std::string> withoutHost(std::vector<std::string> const& words, std::string const& host)
@@ -61,18 +75,8 @@ std::vector<std::string> remoteCommand(std::string const& host,
     for (std::string const& word : words)
         line += ' ' + quotedForShell(word);
     std::vector<std::string> command = {"ssh"};
-    switch (terminal) {
-    case RemoteTerminal::Use:
-        // Or ssh would add "Connection to HOST closed." to what the command prints.
-        command.insert(command.end(), {"-t", "-o", "LogLevel=ERROR"});
-        break;
-    case RemoteTerminal::None:
-        command.emplace_back("-T");
-        break;
-    case RemoteTerminal::Ignore:
-        command.insert(command.end(), {"-T", "-n"});
-        break;
-    }
+    std::vector<std::string> const options = terminalOptions(terminal);
+    command.insert(command.end(), options.begin(), options.end());
     command.insert(command.end(), {endOfOptions, host, line});
     return command;
 }

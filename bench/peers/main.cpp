@@ -134,7 +134,7 @@ struct Compared {
 
 std::string mihostTelling(std::string const& options, std::string const& script)
 {
-    return "printf '" + script + "' | " MIHOST_FILE " " + options + " shell";
+    return "printf '" + script + "' | " + MIHOST_FILE + ' ' + options + " shell";
 }
 
 /** @param script  the commands for mihost, one per line */

@@ -31,7 +31,8 @@ public:
     InstalledTree()
     {
         fs::create_directory(top_ / "work");
-        shell("cmake --install '" BUILD_DIR "' --prefix '" + (top_ / "first").string() + "'");
+        shell(std::string("cmake --install '") + BUILD_DIR + "' --prefix '" +
+              (top_ / "first").string() + "'");
         fs::rename(top_ / "first", prefix());
         fs::copy(prefix() / "share/doc/mihost/examples", work());
     }
@@ -120,8 +121,8 @@ protected:
     {
         setenv("PKG_CONFIG_PATH", (libraries() / "pkgconfig").c_str(), 1);
         setenv("LD_LIBRARY_PATH", libraries().c_str(), 1);
-        std::ofstream(work() / "g++")
-            << "#!/bin/sh\nexec '" HOST_COMPILER_PROGRAM "' " HOST_COMPILER_FLAGS " \"$@\"\n";
+        std::ofstream(work() / "g++") << "#!/bin/sh\nexec '" << HOST_COMPILER_PROGRAM << "' "
+                                      << HOST_COMPILER_FLAGS << " \"$@\"\n";
         fs::permissions(work() / "g++", fs::perms::owner_all);
     }
 

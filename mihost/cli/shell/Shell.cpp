@@ -131,8 +131,8 @@ std::vector<std::string> Shell::candidatesFor(std::string const& line)
     };
     std::vector<std::string> const words = wordsBeingTyped(line);
     std::vector<std::string> candidates;
-    for (Candidate const& candidate :
-         complete(words, namesOf, table_, CommandLine::Place::Shell).candidates)
+    Completion const completion = complete(words, namesOf, table_, CommandLine::Place::Shell);
+    for (Candidate const& candidate : completion.candidates)
         candidates.push_back(candidate.word);
     if (words.size() == 1)
         for (std::string const word : ownWords)

@@ -52,7 +52,8 @@ TEST(ReadmeSession, IsWhatTheProgramPrints)
         GTEST_SKIP() << sandbox.err;
     std::vector<Step> const steps = readSession();
     ASSERT_GT(steps.size(), 5U);
-    std::string before = "cd " DOCS_DIR "/..\nshopt -s expand_aliases\nexec 2>&1\n";
+    std::string before =
+        std::string("cd ") + DOCS_DIR + "/..\nshopt -s expand_aliases\nexec 2>&1\n";
     for (Step const& step : steps) {
         std::string command = step.command;
         std::string const program = "build/bin/mihost";

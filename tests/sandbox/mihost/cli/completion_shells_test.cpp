@@ -56,11 +56,12 @@ protected:
             accounts += std::string(name) + ":x:1501:1501::/:/bin/sh\n";
         machine::write("/etc/passwd", accounts);
         // Completes as usual, otherwise records its input.
-        machine::fake("/usr/local/bin/mihost", "case $1 in\n"
-                                               "__complete*) exec " MIHOST_FILE " \"$@\" ;;\n"
-                                               "esac\n"
-                                               "printf '%s\\n' \"$@\" >>/tmp/got\n"
-                                               "echo ran-mihost\n");
+        machine::fake("/usr/local/bin/mihost", std::string("case $1 in\n__complete*) exec ") +
+                                                   MIHOST_FILE +
+                                                   " \"$@\" ;;\n"
+                                                   "esac\n"
+                                                   "printf '%s\\n' \"$@\" >>/tmp/got\n"
+                                                   "echo ran-mihost\n");
         fs::create_directories("/tmp/here");
         fs::create_directories("/tmp/home");
         fs::current_path("/tmp/here");

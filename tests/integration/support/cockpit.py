@@ -191,7 +191,9 @@ class Cockpit:
             stdin=subprocess.DEVNULL, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL,
             env={'PATH': '/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin', 'LC_ALL': 'C.UTF-8', 'HOME': '/root'},
         )
-        until(listening, 'cockpit-ws does not listen')
+        until(lambda: self.process.poll() is not None or listening(), 'cockpit-ws does not listen')
+        if self.process.returncode is not None:
+            raise RuntimeError(f'cockpit-ws ended with {self.process.returncode} (run {WS})')
 
     def stop(self):
         self.process.kill()

@@ -19,8 +19,11 @@ class CallbackModule(CallbackBase):
 
     def _write(self, outcome, result):
         shown = json.loads(self._dump_results(result._result))
+        # Which _dump_results drops, the warnings since ansible-core 2.19, where they are objects.
         if 'diff' in result._result:
-            shown['diff'] = result._result['diff']  # which would be dropped
+            shown['diff'] = result._result['diff']
+        if 'warnings' in result._result:
+            shown['warnings'] = [str(warning) for warning in result._result['warnings']]
         line = dict(host=result._host.get_name(), outcome=outcome, result=shown)
         self._display.display(json.dumps(line))
 

@@ -67,6 +67,7 @@ void makeMachineOfTheExamples()
     for (char const* line : {"groupadd staff", "groupadd crew", "useradd -m -U -G crew jdoe"})
         ASSERT_EQ(runToEnd({"/bin/sh", "-c", line}).code, 0) << line;
     std::filesystem::path const directory = std::filesystem::path(MIHOST_FILE).parent_path();
+    setenv("LANG", "C.UTF-8", 1); // doctor misses it
     setenv("PATH", (directory.string() + ":" + getenv("PATH")).c_str(), 1);
 }
 

@@ -56,14 +56,4 @@ TEST(Packages, HoldEveryInstalledFileOnce)
     EXPECT_FALSE(packed.empty());
 }
 
-TEST(Packages, HaveTheVersionOfTheProject)
-{
-    std::string const key = "project(mihost VERSION ";
-    std::string const project = contentOf(packaging + "../CMakeLists.txt");
-    std::size_t const at = project.find(key) + key.size();
-    std::string const version = project.substr(at, project.find(' ', at) - at);
-    EXPECT_EQ(contentOf(packaging + "debian/changelog").rfind("mihost (" + version + "-", 0), 0U)
-        << version;
-}
-
 } // namespace packages_test

@@ -143,8 +143,8 @@ TEST(ShownChanges, CountTheLinesOfBackups)
 {
     EXPECT_EQ(shown({texts("/etc/passwd-", "a\nb\n", "b\nc\nd\n")}),
               "changed /etc/passwd- (1 line removed, 2 lines added)\n");
-    EXPECT_EQ(mihost::toJson(mihost::shownChanges({texts("/etc/passwd-", "a\n", "b\n")}, "",
-                                                  Secrets::Hide))[0]["added"]
+    EXPECT_EQ(mihost::listToJson(mihost::shownChanges({texts("/etc/passwd-", "a\n", "b\n")}, "",
+                                                      Secrets::Hide))[0]["added"]
                   .dump(),
               R"(["b"])");
 }

@@ -28,7 +28,8 @@ export function messageOf(stderr) {
 /** Returns the failure that Cockpit's exception means, or null if mihost ran and ended by itself. */
 export function failureOf(exception) {
     const message = String(exception.message ?? "");
-    if (exception.exit_signal)
+    // Newer versions of Cockpit report a signal as a negative exit status.
+    if (exception.exit_signal || exception.exit_status < 0)
         return new Failure("killed", message);
     if (exception.problem && exception.problem !== "")
         return new Failure(kinds[exception.problem] ?? "failed", message);

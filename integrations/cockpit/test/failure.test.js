@@ -7,6 +7,7 @@ const cases = [
     ["a shell that does not find it", { exit_status: 127, message: "sh: mihost: not found" }, "missing"],
     ["a refused program", { problem: "access-denied", message: "access-denied" }, "denied"],
     ["a signal", { exit_signal: "KILL", problem: "terminated", message: "" }, "killed"],
+    ["a signal in newer versions", { exit_status: -9, message: "" }, "killed"],
     ["a lost connection", { problem: "disconnected", message: "" }, "disconnected"],
     ["a run that the page stopped", { problem: "cancelled", message: "" }, "cancelled"],
     ["an unknown problem", { problem: "who-knows", message: "" }, "failed"],

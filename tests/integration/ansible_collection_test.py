@@ -12,7 +12,7 @@ from support.ansible import COLLECTION, Controller
 
 MODULES = ['mi_call', 'mi_group', 'mi_info', 'mi_set', 'mi_user']
 
-# The tests of ansible-test that need no network.
+# The tests of ansible-test that need no network. Newer versions lack some.
 SANITY = '''
     action-plugin-docs compile empty-init future-import-boilerplate ignores line-endings
     metaclass-boilerplate no-assert no-basestring no-dict-iteritems no-dict-iterkeys no-dict-itervalues
@@ -73,7 +73,12 @@ class Collection(unittest.TestCase):
         subprocess.run(['git', 'init', '-q', copy], check=True)
         version = subprocess.run([PYTHON, '--version'], capture_output=True, text=True).stdout
         major, minor = version.split()[1].split('.')[:2]
-        options = [word for test in SANITY for word in ('--test', test)]
+        listed = subprocess.run(
+            ['ansible-test', 'sanity', '--list-tests'],
+            cwd=copy, env=self.controller.environment, capture_output=True, text=True,
+        )
+        options = [word for test in SANITY if test in listed.stdout.split() for word in ('--test', test)]
+        self.assertTrue(options, listed.stderr)
         done = subprocess.run(
             ['ansible-test', 'sanity', '--python', f'{major}.{minor}', *options],
             cwd=copy, env=self.controller.environment, capture_output=True, text=True,
@@ -88,6 +93,8 @@ class Collection(unittest.TestCase):
             cwd=self.installed, env={**self.controller.environment, 'PYTHONPATH': VALIDATOR},
             capture_output=True, text=True,
         )
+        if 'ModuleNotFoundError' in done.stderr:
+            self.skipTest(done.stderr.splitlines()[-1])  # one that Debian 13 lacks
         findings = [
             (path, error['code'], error['msg'])
             for path, report in json.loads(done.stdout).items()

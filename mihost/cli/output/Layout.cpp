@@ -34,10 +34,6 @@ struct Unref {
     {
         scols_unref_table(table);
     }
-    void operator()(libscols_symbols* symbols) const
-    {
-        scols_unref_symbols(symbols);
-    }
     void operator()(char* text) const
     {
         std::free(text);
@@ -80,7 +76,7 @@ std::string measurable(std::string const& text)
 class Printer
 {
 public:
-    explicit Printer(bool hasHeadings) : table_(made(scols_new_table()))
+    explicit Printer(bool hasHeadings) : table_(made(scols_new_table())), hasHeadings_(hasHeadings)
     {
         scols_table_enable_noheadings(table_.get(), hasHeadings ? 0 : 1);
         scols_table_enable_noencoding(table_.get(), 1);
@@ -90,31 +86,22 @@ public:
 
     /**
      * libsmartcols would wrap in the middle of words, and cut columns other than the last; so texts
-     * come in lines that fit.
+     * come in lines that fit. Some versions make a column as wide as a heading that is not printed.
      */
     void addColumn(std::string const& heading, int flags)
     {
-        libscols_column* const column = made(scols_table_new_column(
-            table_.get(), measurable(heading).c_str(), 0, SCOLS_FL_WRAP | flags));
+        std::string const printed = hasHeadings_ ? measurable(heading) : "";
+        libscols_column* const column =
+            made(scols_table_new_column(table_.get(), printed.c_str(), 0, SCOLS_FL_WRAP | flags));
         require(scols_column_set_wrapfunc(column, scols_wrapnl_chunksize, scols_wrapnl_nextchunk,
                                           nullptr));
     }
 
-    void drawBranches(bool hasUnicode)
+    void addRow(std::vector<std::string> const& cells)
     {
-        Owned<libscols_symbols> const symbols(made(scols_new_symbols()));
-        require(scols_symbols_set_branch(symbols.get(), hasUnicode ? "├─" : "|-"));
-        require(scols_symbols_set_right(symbols.get(), hasUnicode ? "└─" : "`-"));
-        require(scols_symbols_set_vertical(symbols.get(), hasUnicode ? "│ " : "| "));
-        require(scols_table_set_symbols(table_.get(), symbols.get()));
-    }
-
-    libscols_line* addRow(std::vector<std::string> const& cells, libscols_line* parent = nullptr)
-    {
-        libscols_line* const line = made(scols_table_new_line(table_.get(), parent));
+        libscols_line* const line = made(scols_table_new_line(table_.get(), nullptr));
         for (std::size_t at = 0; at < cells.size(); ++at)
             require(scols_line_set_data(line, at, measurable(cells[at]).c_str()));
-        return line;
     }
 
     std::vector<std::string> lines() const
@@ -134,6 +121,7 @@ public:
 
 private:
     Owned<libscols_table> table_;
+    bool hasHeadings_;
 };
 
 std::string joined(std::vector<std::string> const& lines)
@@ -209,35 +197,82 @@ std::vector<std::string> recordLines(Grid const& rows, Room const& room)
     return layOut(records, room);
 }
 
-std::vector<std::size_t> depthsOf(std::vector<Branch> const& branches)
+/** A branch where it is drawn. */
+struct DrawnBranch {
+    Branch const* branch;
+    std::size_t depth;
+    std::string sign;  // before the name
+    std::string below; // before the branch's further lines
+    bool hasChildren;
+};
+
+/**
+ * Puts each branch after its parent and draws the lines between them. libsmartcols can do that too,
+ * but its versions draw the further lines of a branch differently.
+ */
+class TreeDrawing
 {
-    std::vector<std::size_t> depths;
-    for (std::size_t at = 0; at < branches.size(); ++at)
-        depths.push_back(branches[at].parent == at ? 0 : depths[branches[at].parent] + 1);
-    return depths;
-}
+public:
+    TreeDrawing(std::vector<Branch> const& branches, bool hasUnicode)
+        : branches_(branches), hasUnicode_(hasUnicode), children_(branches.size())
+    {
+        for (std::size_t at = 0; at < branches.size(); ++at)
+            if (branches[at].parent != at)
+                children_[branches[at].parent].push_back(at);
+        for (std::size_t at = 0; at < branches.size(); ++at)
+            if (branches[at].parent == at)
+                draw(at, 0, "", "");
+    }
+
+    std::vector<DrawnBranch> const& drawn() const
+    {
+        return drawn_;
+    }
+
+    char const* vertical() const
+    {
+        return hasUnicode_ ? "│ " : "| ";
+    }
+
+private:
+    void draw(std::size_t at, std::size_t depth, std::string const& sign, std::string const& below)
+    {
+        drawn_.push_back({&branches_[at], depth, sign, below, !children_[at].empty()});
+        for (std::size_t const child : children_[at])
+            if (child == children_[at].back())
+                draw(child, depth + 1, below + (hasUnicode_ ? "└─" : "`-"), below + "  ");
+            else
+                draw(child, depth + 1, below + (hasUnicode_ ? "├─" : "|-"), below + vertical());
+    }
+
+    std::vector<Branch> const& branches_;
+    bool hasUnicode_;
+    std::vector<std::vector<std::size_t>> children_;
+    std::vector<DrawnBranch> drawn_;
+};
 
 /** The text of a branch within its width, with its details below. */
-std::string branchText(Branch const& branch, Room const& room)
+std::vector<std::string> branchText(Branch const& branch, Room const& room)
 {
     std::vector<std::string> lines = wrapped(branch.text, room.columns);
     if (!branch.details.rows.empty())
         for (std::string const& line : layOut(branch.details, room))
             lines.push_back(line);
-    return joined(lines);
+    return lines;
 }
 
 /** @return name and text of a branch in one column, for lines too narrow for two */
-std::string wholeBranch(Branch const& branch, Room const& room, std::size_t indent)
+std::string wholeBranch(DrawnBranch const& drawn, Room const& room)
 {
+    Branch const& branch = *drawn.branch;
     std::string const start =
         branch.text.empty() ? branch.name : branch.name + columnGap + branch.text;
     std::vector<std::string> lines = wrapped(start, std::max(room.columns, leastText));
     if (!branch.details.rows.empty())
         for (std::string const& line : layOut(branch.details, room.indented(branchWidth)))
             lines.push_back(std::string(branchWidth, ' ') + line);
-    for (std::size_t at = 1; at < lines.size(); ++at) // libsmartcols draws no branches next to them
-        lines[at].insert(0, indent, ' ');
+    for (std::size_t at = 0; at < lines.size(); ++at)
+        lines[at].insert(0, at == 0 ? drawn.sign : drawn.below);
     return joined(lines);
 }
 
@@ -277,27 +312,29 @@ std::vector<std::string> layOutRecords(Table const& table, Room const& room)
 
 std::vector<std::string> layOut(std::vector<Branch> const& branches, Room const& room)
 {
-    std::vector<std::size_t> const depths = depthsOf(branches);
+    TreeDrawing const tree(branches, room.hasUnicode);
     std::size_t names = 0;
-    for (std::size_t at = 0; at < branches.size(); ++at)
-        names = std::max(names, branchWidth * depths[at] + displayWidth(branches[at].name));
+    for (DrawnBranch const& drawn : tree.drawn())
+        names = std::max(names, branchWidth * drawn.depth + displayWidth(drawn.branch->name));
     bool const areBeside = room.columns >= names + gapWidth + leastText;
 
     Printer printer(false);
-    printer.drawBranches(room.hasUnicode);
-    printer.addColumn("", SCOLS_FL_TREE);
+    printer.addColumn("", 0);
     if (areBeside)
         printer.addColumn("", 0);
-    std::vector<libscols_line*> lines;
-    for (std::size_t at = 0; at < branches.size(); ++at) {
-        Branch const& branch = branches[at];
-        std::size_t const indent = branchWidth * depths[at];
-        auto const cells =
-            areBeside
-                ? std::vector{branch.name, branchText(branch, room.indented(names + gapWidth))}
-                : std::vector{wholeBranch(branch, room.indented(indent), indent)};
-        lines.push_back(
-            printer.addRow(cells, branch.parent == at ? nullptr : lines[branch.parent]));
+    for (DrawnBranch const& drawn : tree.drawn()) {
+        if (!areBeside) {
+            printer.addRow({wholeBranch(drawn, room.indented(branchWidth * drawn.depth))});
+            continue;
+        }
+        std::vector<std::string> const text =
+            branchText(*drawn.branch, room.indented(names + gapWidth));
+        std::vector<std::string> signs = {drawn.sign + drawn.branch->name};
+        // libsmartcols would end the cell at an empty line.
+        if (std::string const below = drawn.below + (drawn.hasChildren ? tree.vertical() : "");
+            !below.empty())
+            signs.resize(text.size(), below);
+        printer.addRow({joined(signs), joined(text)});
     }
     return printer.lines();
 }

@@ -142,9 +142,20 @@ TEST(TreeLayout, HasTextsAfterTheNamesInANarrowTerminal)
 {
     Lines const lines = layOut(family(), {30});
     EXPECT_EQ(lines[1], "├─child #2  the quick brown");
-    EXPECT_EQ(lines[2], "  fox jumps over the lazy dog");
+    EXPECT_EQ(lines[2], "│ fox jumps over the lazy dog");
     for (std::string const& line : lines)
         EXPECT_LE(displayWidth(line), 30U) << line;
+}
+
+TEST(TreeLayout, HasEachBranchBelowItsParentInAnyOrder)
+{
+    std::vector<Branch> branches = family();
+    branches.push_back({2, "great-grandchild #5", "", {}});
+    branches.push_back({1, "late #6", "", {}});
+    EXPECT_EQ(layOut(branches, {}), (Lines{"top #1                     first",
+                                           std::string("├─child #2                 ") + fox,
+                                           "│ ├─grandchild #3", "│ │ └─great-grandchild #5",
+                                           "│ └─late #6", "└─other #4                 last"}));
 }
 
 TEST(TreeLayout, ShowsDetailsBelowTheText)

@@ -50,7 +50,7 @@ TEST_F(MihostFormats, PrintsTablesWithoutAnyUtf8Locale)
     std::filesystem::remove_all("/usr/lib/locale");
     setenv("LC_ALL", "C", 1);
     EXPECT_EQ(outOf({"list", "users", "--columns", "user-name,full-name", "--no-headers"}),
-              "root       Bj?rn\n");
+              "root  Bj?rn\n");
     EXPECT_NE(outOf({"tree"}).find("user:root"), std::string::npos);
     EXPECT_EQ(outOf({"get", "user:root", "full-name", "-o", "value"}), "Bj\u00F6rn\n");
 }

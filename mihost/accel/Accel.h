@@ -47,10 +47,10 @@ extern "C" {
 
 /** How often a command was started since the process began. */
 struct miaccel_count {
-    const char* command;     /**< "wc", "sed", "date", "lsmod", "modinfo", "other" */
-    unsigned long answered;  /**< answered in the process */
-    unsigned long handed_on; /**< run by the real popen */
-    const char* reason;      /**< why it last ran; null if it never did */
+    const char* command;    /**< "wc", "sed", "date", "lsmod", "modinfo", "other" */
+    unsigned long answered; /**< answered in the process */
+    unsigned long ran;      /**< run by the real popen */
+    const char* reason;     /**< why it last ran; null if it never did */
 };
 
 /**

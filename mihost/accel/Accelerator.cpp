@@ -23,7 +23,7 @@ struct Row {
     Tool tool;
     Answer (*answer)(Operands const& operands);
     std::atomic<unsigned long> answered{0};
-    std::atomic<unsigned long> handedOn{0};
+    std::atomic<unsigned long> ran{0};
     std::atomic<Reason> reason{nullptr};
 };
 
@@ -48,7 +48,7 @@ FILE* open(Row& row, Answer answer)
     if (stream && !answer.reason) {
         ++row.answered;
     } else {
-        ++row.handedOn;
+        ++row.ran;
         row.reason = answer.reason ? answer.reason : "no stream could be created";
     }
     return stream;
@@ -85,7 +85,7 @@ extern "C" std::size_t miaccel_counts(miaccel_count* counts, std::size_t room)
     using miaccel::rows;
     std::size_t const count = std::size(rows);
     std::transform(rows, rows + std::min(count, room), counts, [](auto const& row) {
-        return miaccel_count{row.command, row.answered, row.handedOn, row.reason};
+        return miaccel_count{row.command, row.answered, row.ran, row.reason};
     });
     return count;
 }

@@ -19,7 +19,7 @@ template <class Function> Function* find(void* library, char const* name)
 
 Accelerator::Row rowOf(miaccel_count const& count)
 {
-    return {count.command, count.answered, count.handed_on, count.reason ? count.reason : ""};
+    return {count.command, count.answered, count.ran, count.reason ? count.reason : ""};
 }
 
 } // namespace
@@ -42,7 +42,7 @@ std::vector<Accelerator::Row> Accelerator::rows() const
     counts(all.data(), all.size());
     std::vector<Row> rows;
     for (miaccel_count const& count : all)
-        if (count.answered + count.handed_on > 0)
+        if (count.answered + count.ran > 0)
             rows.push_back(rowOf(count));
     return rows;
 }

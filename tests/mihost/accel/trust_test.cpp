@@ -109,11 +109,11 @@ TEST_F(AccelTrust, IsCountedForEachCommandWithItsReason)
     answered("wc -l /nonexistent");
     answered("chage -l root");
     EXPECT_EQ(countOf("wc").answered, wc.answered + 2);
-    EXPECT_EQ(countOf("wc").handed_on, wc.handed_on + 1);
+    EXPECT_EQ(countOf("wc").ran, wc.ran + 1);
     EXPECT_EQ(reasonOf("wc"), "the file cannot be read");
     EXPECT_EQ(countOf("sed").answered, sed.answered);
-    EXPECT_EQ(countOf("sed").handed_on, sed.handed_on);
-    EXPECT_EQ(countOf("other").handed_on, other.handed_on + 1);
+    EXPECT_EQ(countOf("sed").ran, sed.ran);
+    EXPECT_EQ(countOf("other").ran, other.ran + 1);
 }
 
 TEST(AccelCounts, HaveAFixedOrderAndStopAtTheCallersLimit)
@@ -130,10 +130,10 @@ TEST(AccelCounts, HaveAFixedOrderAndStopAtTheCallersLimit)
 
 TEST_F(AccelTrust, IsNeitherUsedNorCountedWhileTurnedOff)
 {
-    unsigned long const before = countOf("wc").handed_on;
+    unsigned long const before = countOf("wc").ran;
     EXPECT_EQ(miaccel_enable(0), 1);
     EXPECT_FALSE(answered(wc_));
-    EXPECT_EQ(countOf("wc").handed_on, before);
+    EXPECT_EQ(countOf("wc").ran, before);
     EXPECT_EQ(miaccel_enable(1), 0);
     EXPECT_TRUE(answered(wc_));
 }

@@ -31,7 +31,7 @@ void printCounts()
     std::size_t const count = counts(rows, 16);
     for (std::size_t row = 0; row < count; ++row)
         std::fprintf(stderr, "%s %lu %lu\n", rows[row].command, rows[row].answered,
-                     rows[row].handed_on);
+                     rows[row].ran);
 }
 
 } // namespace

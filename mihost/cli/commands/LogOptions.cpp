@@ -4,11 +4,11 @@
 #include "mihost/cli/commands/Repetition.h"
 #include "mihost/cli/input/Day.h"
 #include "mihost/cli/input/Moment.h"
+#include "mihost/cli/input/Range.h"
 #include "mihost/cli/log/LogFile.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/runtime/Text.h"
 
-#include <algorithm>
 #include <ctime>
 #include <fmt/format.h>
 #include <system_error>
@@ -20,7 +20,8 @@ namespace
 {
 
 constexpr unsigned int usualFollowed = 10; // lines that --follow begins with
-constexpr double interval = 0.5;           // seconds between two looks at the log
+constexpr unsigned int mostLines = 1000000000;
+constexpr double interval = 0.5; // seconds between two looks at the log
 
 std::string objectionToMoment(std::string const& text)
 {
@@ -51,9 +52,10 @@ LogLine lineOf(IC::MutableNode const& entry)
 
 void LogOptions::declare(CLI::App& app)
 {
-    app.add_option(
-           "-n,--lines", count_,
-           fmt::format("log: show at most N entries; the tree has the newest {}", mostLogEntries))
+    app.add_option("-n,--lines", count_,
+                   fmt::format("log: show at most N entries; without --follow there are {}",
+                               mostLogEntries))
+        ->check(wholeBetween(0, mostLines))
         ->type_name("N");
     app.add_option("--since", since_, "log: show entries from this time on")
         ->type_name("TIME")
@@ -64,7 +66,7 @@ void LogOptions::declare(CLI::App& app)
     app.add_option("--grep", pattern_,
                    "log: show entries whose message matches this extended regular expression")
         ->type_name("PATTERN");
-    app.add_flag("--follow", follow_, "log: follow new lines as they arrive");
+    app.add_flag("--follow", follow_, "log: show new lines as they arrive");
     app.add_flag("--no-hostname", noHostName_, "log: omit the name of the host");
 }
 
@@ -86,10 +88,13 @@ void LogOptions::check(Options const& options)
 {
     isFull_ = options.full;
     if (follow_ && isRows(options.format))
-        throw Failure(BadUsage,
-                      "list log: --follow prints no rows (use table, json, jsonl or yaml)");
+        throw Failure(
+            BadUsage,
+            fmt::format("list log: -o {} is not supported with --follow (use table, json, jsonl or "
+                        "yaml)",
+                        nameOf(options.format)));
     if (follow_ && !until_.empty())
-        throw Failure(BadUsage, "list log: --follow and --until exclude each other");
+        throw Failure(BadUsage, "list log: --follow and --until cannot be combined");
 }
 
 LogFilter LogOptions::filter() const
@@ -134,7 +139,7 @@ std::string LogOptions::shownMessage(std::string const& message) const
 void LogOptions::print(Session& session, LogLine const& line) const
 {
     std::string const message = shownMessage("*" + line.message + "*");
-    if (session.options().json)
+    if (session.out().takesDocuments())
         session.out().json(
             {{"time", line.time ? Json(*line.time) : Json(nullptr)}, {"message", toJson(message)}});
     else
@@ -155,7 +160,7 @@ void LogOptions::follow(Session& session) const
     try {
         SignalWaiter signals;
         LogFile log(systemLog);
-        printThose(log.newestLines(std::min(count_.value_or(usualFollowed), mostLogEntries)));
+        printThose(log.newestLines(count_.value_or(usualFollowed)));
         while (waitForNextRound(session.out(), signals, interval))
             printThose(log.newLines());
     } catch (std::system_error const& error) {

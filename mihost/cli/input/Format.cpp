@@ -18,6 +18,11 @@ Format formatOf(std::string_view name)
     return static_cast<Format>(std::find(names.begin(), names.end(), name) - names.begin());
 }
 
+std::string const& nameOf(Format format)
+{
+    return formatNames()[static_cast<std::size_t>(format)];
+}
+
 bool isDocument(Format format)
 {
     return format == Format::JsonText || format == Format::JsonLines || format == Format::YamlText;

@@ -21,6 +21,9 @@ enum class Format {
 /** As on the command line, in the order of the enumeration. */
 std::vector<std::string> const& formatNames();
 
+/** One of formatNames(). */
+std::string const& nameOf(Format format);
+
 /** @param name  one of formatNames() */
 Format formatOf(std::string_view name);
 

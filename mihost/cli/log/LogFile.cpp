@@ -15,12 +15,27 @@ namespace mihost
 namespace
 {
 
-constexpr long long newestBytes = 1 << 18;   // hold the newest lines unless they are long
+constexpr std::size_t blockSize = 1 << 14;
 constexpr std::size_t longestKept = 1 << 16; // bytes of a line; more are never shown
 
 Descriptor openLog(std::string const& path)
 {
     return Descriptor(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK));
+}
+
+/** Where the newest lines that have ended begin. */
+long long startOfNewest(int file, std::size_t count)
+{
+    std::array<char, blockSize> block{};
+    for (long long end = lseek(file, 0, SEEK_END); end > 0;) {
+        long long const start = std::max(end - static_cast<long long>(block.size()), 0LL);
+        ssize_t at = pread(file, block.data(), static_cast<std::size_t>(end - start), start);
+        while (--at >= 0)
+            if (block[static_cast<std::size_t>(at)] == '\n' && count-- == 0)
+                return start + at + 1;
+        end = start;
+    }
+    return 0;
 }
 
 bool isSameFile(struct stat const& one, struct stat const& other)
@@ -38,16 +53,10 @@ LogFile::LogFile(std::string const& path) : path_(path), file_(openLog(path))
 
 std::vector<std::string> LogFile::newestLines(std::size_t count)
 {
-    long long const size = lseek(file_.get(), 0, SEEK_END);
-    position_ = std::max(size - newestBytes, 0LL);
-    bool const startsWithin = position_ > 0;
+    position_ = startOfNewest(file_.get(), count);
     unfinished_.clear();
     std::vector<std::string> lines;
     readTo(lines);
-    if (startsWithin && !lines.empty())
-        lines.erase(lines.begin()); // the end of one
-    if (lines.size() > count)
-        lines.erase(lines.begin(), lines.end() - static_cast<std::ptrdiff_t>(count));
     return lines;
 }
 
@@ -68,7 +77,7 @@ std::vector<std::string> LogFile::newLines()
 
 void LogFile::readTo(std::vector<std::string>& lines)
 {
-    std::array<char, 1 << 14> block{};
+    std::array<char, blockSize> block{};
     ssize_t length = 0;
     while ((length = pread(file_.get(), block.data(), block.size(), position_)) > 0) {
         position_ += length;

@@ -16,10 +16,7 @@ public:
     /** @throws std::system_error if the file cannot be opened */
     explicit LogFile(std::string const& path);
 
-    /**
-     * The newest lines, the newest last; newLines() continues after them. With lines of several KiB
-     * there may be fewer than requested.
-     */
+    /** The newest lines, the newest last; newLines() continues after them. */
     std::vector<std::string> newestLines(std::size_t count);
 
     /**

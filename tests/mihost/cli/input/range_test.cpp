@@ -19,4 +19,18 @@ TEST(Between, RefusesOtherNumbersAndWhatIsNotANumber)
         EXPECT_EQ(check(text), "'" + std::string(text) + "' is not a number from 1 to 86400");
 }
 
+TEST(WholeBetween, AcceptsTheWholeNumbersFromTheLeastToTheMost)
+{
+    auto const check = mihost::wholeBetween(0, 1000);
+    for (char const* number : {"0", "7", "1000"})
+        EXPECT_EQ(check(number), "") << number;
+}
+
+TEST(WholeBetween, RefusesOtherNumbersAndOtherForms)
+{
+    auto const check = mihost::wholeBetween(1, 1000);
+    for (char const* text : {"0", "1001", "-1", "+1", "1.5", "1e2", "010", "0x1f", "", " 1"})
+        EXPECT_EQ(check(text), "'" + std::string(text) + "' is not a whole number from 1 to 1000");
+}
+
 } // namespace range_test

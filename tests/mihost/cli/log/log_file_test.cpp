@@ -95,7 +95,22 @@ TEST_F(LogFileTest, ReadsAnEmptiedLogFromItsBeginning)
 TEST_F(LogFileTest, BeginsWithinALongLogAtAWholeLine)
 {
     append(std::string(300'000, 'x') + "\nlast\n");
-    EXPECT_EQ(LogFile(path).newestLines(50), Lines{"last"});
+    EXPECT_EQ(LogFile(path).newestLines(1), Lines{"last"});
+    Lines const lines = LogFile(path).newestLines(3);
+    ASSERT_EQ(lines.size(), 3U);
+    EXPECT_EQ(lines[0], "three");
+}
+
+TEST_F(LogFileTest, BeginsWithAsManyLinesAsRequested)
+{
+    std::string text;
+    for (int number = 0; number < 50'000; ++number)
+        text += "line " + std::to_string(number) + "\n";
+    append(text);
+    Lines const lines = LogFile(path).newestLines(40'000);
+    ASSERT_EQ(lines.size(), 40'000U);
+    EXPECT_EQ(lines.front(), "line 10000");
+    EXPECT_EQ(lines.back(), "line 49999");
 }
 
 TEST_F(LogFileTest, KeepsTheStartOfALineWithoutEnd)

@@ -124,8 +124,10 @@ TEST_F(MihostLog, RefusesWrongValuesAndItsOptionsForOtherLists)
              Case{{"log", "--since", "soon"}, "'soon' is not YYYY-MM-DD"},
              Case{{"log", "--until", "2026-02-30"}, "'2026-02-30' is not YYYY-MM-DD"},
              Case{{"log", "--grep", "a("}, "--grep: 'a(': "},
-             Case{{"log", "-n", "many"}, "many"},
-             Case{{"log", "--follow", "--until", "now"}, "exclude each other"},
+             Case{{"log", "-n", "many"}, "--lines: 'many' is not a whole number"},
+             Case{{"log", "--follow", "-o", "csv"},
+                  "list log: -o csv is not supported with --follow"},
+             Case{{"log", "--follow", "--until", "now"}, "cannot be combined"},
          }) {
         Lines arguments = {"list"};
         arguments.insert(arguments.end(), each.arguments.begin(), each.arguments.end());
@@ -179,6 +181,20 @@ TEST_F(MihostLog, IsFollowedWithTheSameTextsAsThePlugins)
     run.end();
     for (std::string const& message : shown({}))
         EXPECT_TRUE(holds(run.output(), "  " + message + "\r\n")) << message << run.output();
+}
+
+TEST_F(MihostLog, IsFollowedFromMoreLinesThanTheTreeHas)
+{
+    std::string text;
+    for (int number = 1; number <= 200; ++number)
+        text += "Jun  4 04:00:00 box su: number " + std::to_string(number) + ".\n";
+    append(text);
+    TerminalRun run({"list", "log", "--follow", "-n", "150"}, 200);
+    run.waitFor("number 200.\r\n");
+    run.type("\x03");
+    EXPECT_EQ(run.end(), 0);
+    EXPECT_TRUE(holds(run.output(), "number 51.")) << run.output();
+    EXPECT_FALSE(holds(run.output(), "number 50."));
 }
 
 TEST_F(MihostLog, CannotBeFollowedIfItIsMissing)

@@ -141,10 +141,13 @@ class Accounts(ChangeTest):
     def test_changes_ageing(self):
         self.open_account('carl')
         self.browser.click('#user-ageing')
+        self.browser.see('#preview', 'Change password ageing')
+        starts = [self.browser.attributes(f'#field-{name}-days', 'value') for name in ('min', 'max', 'warn', 'inactive')]
+        self.assertEqual(starts, [['1'], ['90'], ['14'], ['30']])
         self.fill(**{'max-days': '60', 'warn-days': '7'})
         self.preview()
         self.apply()
-        self.assertEqual(cockpit.accounts_file('shadow')['carl'].split(':')[4:6], ['60', '7'])
+        self.assertEqual(cockpit.accounts_file('shadow')['carl'].split(':')[3:7], ['1', '60', '7', '30'])
 
     def test_adds_an_account_with_a_group(self):
         self.browser.open('users')

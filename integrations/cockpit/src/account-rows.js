@@ -1,7 +1,7 @@
 // What the tables of accounts and groups show of the rows that mihost prints.
 
 const lastDay = "2038-01-19"; // an account that never expires
-const forEver = 99999; // days
+const unlimited = 99999; // days
 
 /** Returns the day of a date, "never" for the last possible day, or the text itself if it is not a date. */
 export function expiryText(date, never) {
@@ -13,7 +13,7 @@ export function dayText(date) {
 }
 
 export function daysText(days, endless) {
-    return Number(days) >= forEver ? endless : days;
+    return Number(days) >= unlimited ? endless : days;
 }
 
 /** Returns how many names a list has, such as a group's members. */

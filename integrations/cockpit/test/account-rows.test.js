@@ -13,9 +13,9 @@ test("dayText leaves the time of day out", () => {
 });
 
 test("daysText shows 99999 days as no limit", () => {
-    assert.equal(daysText("99999", "for ever"), "for ever");
-    assert.equal(daysText("90", "for ever"), "90");
-    assert.equal(daysText("-", "for ever"), "-");
+    assert.equal(daysText("99999", "no limit"), "no limit");
+    assert.equal(daysText("90", "no limit"), "90");
+    assert.equal(daysText("-", "no limit"), "-");
 });
 
 test("countNames counts members", () => {

@@ -49,14 +49,17 @@ PasswordAgeing ageingOf(Record const& shadow)
         ageing.mustChange = true;
         ageing.changed.reset();
     }
-    ageing.changeableFrom = sum(ageing.changed, field(shadowField::MinDays));
-    auto const maxDays = field(shadowField::MaxDays);
-    if (!maxDays || *maxDays >= neverExpires)
+    ageing.minDays = field(shadowField::MinDays);
+    ageing.maxDays = field(shadowField::MaxDays);
+    ageing.warnDays = field(shadowField::WarnDays);
+    ageing.inactiveDays = field(shadowField::Inactive);
+    ageing.changeableFrom = sum(ageing.changed, ageing.minDays);
+    if (!ageing.maxDays || *ageing.maxDays >= neverExpires)
         return ageing;
-    ageing.lastValid = sum(ageing.changed, maxDays);
-    if (auto const warnDays = field(shadowField::WarnDays); ageing.lastValid && warnDays)
-        ageing.warnsFrom = *ageing.lastValid - *warnDays;
-    ageing.lastActive = sum(ageing.lastValid, field(shadowField::Inactive));
+    ageing.lastValid = sum(ageing.changed, ageing.maxDays);
+    if (ageing.lastValid && ageing.warnDays)
+        ageing.warnsFrom = *ageing.lastValid - *ageing.warnDays;
+    ageing.lastActive = sum(ageing.lastValid, ageing.inactiveDays);
     return ageing;
 }
 

@@ -25,6 +25,10 @@ enum class PasswordState {
 
 /** Days are counted from 1970. A day that will never come is missing. */
 struct PasswordAgeing {
+    std::optional<long> minDays; // numbers of days, as stored; missing if there is no limit
+    std::optional<long> maxDays;
+    std::optional<long> warnDays;
+    std::optional<long> inactiveDays;
     std::optional<long> changed;
     bool mustChange = false; // at the next login
     std::optional<long> changeableFrom;

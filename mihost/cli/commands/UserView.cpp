@@ -86,8 +86,8 @@ std::vector<Fact> passwordFacts(UserDescription const& user)
          ageing.mustChange ? "to be changed at the next login" : dateOr(ageing.changed, "")},
         {"Change allowed", isKnown ? dateOr(changeDay, "at any time") : ""},
         {"Warned from", dateOr(ageing.warnsFrom, "")},
-        {"Password valid until", isKnown ? dateOr(ageing.lastValid, "for ever") : ""},
-        {"Active until", isKnown ? dateOr(ageing.lastActive, "for ever") : ""},
+        {"Password valid until", isKnown ? dateOr(ageing.lastValid, "no limit") : ""},
+        {"Active until", isKnown ? dateOr(ageing.lastActive, "no limit") : ""},
         {"Account expires", isKnown ? dateOr(user.expires, "never") : ""},
     };
 }
@@ -122,6 +122,11 @@ Json dayToJson(std::optional<long> const& day)
     return day ? Json(dateText(*day)) : Json(nullptr);
 }
 
+Json countToJson(std::optional<long> const& days)
+{
+    return days ? Json(*days) : Json(nullptr);
+}
+
 Json orNull(std::string const& text)
 {
     return text.empty() ? Json(nullptr) : toJson(text);
@@ -146,6 +151,10 @@ Json documentOf(UserDescription const& user)
         {"password", orNull(passwordText(user.password))},
         {"password-changed", dayToJson(ageing.changed)},
         {"must-change-password", user.unknown.empty() ? Json(ageing.mustChange) : Json(nullptr)},
+        {"min-days", countToJson(ageing.minDays)},
+        {"max-days", countToJson(ageing.maxDays)},
+        {"warn-days", countToJson(ageing.warnDays)},
+        {"inactive-days", countToJson(ageing.inactiveDays)},
         {"change-allowed-from", dayToJson(ageing.changeableFrom)},
         {"warned-from", dayToJson(ageing.warnsFrom)},
         {"password-valid-until", dayToJson(ageing.lastValid)},
@@ -169,7 +178,7 @@ void showUser(Session& session, std::string const& name)
     auto const user = describeUser(data, name);
     if (!user)
         failForNoAccount("user", name, namesIn(data, accountFile));
-    if (session.options().json)
+    if (session.out().takesDocuments())
         session.out().json(documentOf(*user));
     else
         writeFacts(factsOf(*user), session.out());

@@ -14,7 +14,7 @@ const edits = {
     home: account => [tasks.userSetHome, { home: account["home-directory"] }],
     shell: account => [tasks.userSetShell, { shell: account["login-shell"] }],
     password: () => [tasks.userSetPassword, {}],
-    ageing: () => [tasks.userAge, {}],
+    ageing: account => [tasks.userAge, account],
     expiry: account => [tasks.userExpire, { expires: account["account-expires"] ?? "" }],
 };
 
@@ -41,11 +41,11 @@ const passwordFacts = [
     { label: () => _("May be changed from"), text: account => known(account, "change-allowed-from", _("at any time")) },
     { label: () => _("Warned from"), text: account => known(account, "warned-from") },
     {
-        label: () => _("Valid until"), text: account => known(account, "password-valid-until", _("for ever")),
+        label: () => _("Valid until"), text: account => known(account, "password-valid-until", _("no limit")),
         edit: "ageing",
     },
     { label: () => _("Days left"), text: account => known(account, "password-days-left") },
-    { label: () => _("Account active until"), text: account => known(account, "active-until", _("for ever")) },
+    { label: () => _("Account active until"), text: account => known(account, "active-until", _("no limit")) },
     { label: () => _("Failed logins allowed"), text: account => account["login-failures-allowed"] ?? _("not limited") },
 ];
 

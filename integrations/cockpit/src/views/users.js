@@ -8,7 +8,7 @@ import { ListView } from "./list.js";
 import { Pair } from "./pair.js";
 
 function columns() {
-    const days = property => row => daysText(row[property], _("for ever"));
+    const days = property => row => daysText(row[property], _("no limit"));
     return [
         {
             property: "user-name", title: _("Name"), text: row => row["user-name"],

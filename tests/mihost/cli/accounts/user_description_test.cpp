@@ -92,6 +92,18 @@ TEST(UserDescription, CountsTheDaysOfAgeingFromTheLastChange)
     EXPECT_EQ(jdoe("jdoe:$y$hash:19990:1:30:7:5:20100:").expires, 20100);
 }
 
+TEST(UserDescription, HasTheStoredNumbersOfDays)
+{
+    PasswordAgeing const ageing = jdoe("jdoe:$y$hash:19990:1:99999:7:5:20100:").ageing;
+    EXPECT_EQ(ageing.minDays, 1);
+    EXPECT_EQ(ageing.maxDays, 99999);
+    EXPECT_EQ(ageing.warnDays, 7);
+    EXPECT_EQ(ageing.inactiveDays, 5);
+    PasswordAgeing const none = jdoe("jdoe:$y$hash:19990:::-1:x::").ageing;
+    for (auto const& days : {none.minDays, none.maxDays, none.warnDays, none.inactiveDays})
+        EXPECT_FALSE(days);
+}
+
 TEST(UserDescription, HasNoDaysWithoutALimitOrALastChange)
 {
     for (char const* shadow :

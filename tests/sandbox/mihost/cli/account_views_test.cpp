@@ -57,7 +57,7 @@ TEST_F(AccountViews, ShowOneUserAsText)
              "Login shell           /bin/sh\n",
              "State                 active; the password expires in 12 days\n",
              "Password              set\n",
-             "Active until          for ever\n",
+             "Active until          no limit\n",
              "Account expires       never\n",
              "Login failures        3 allowed\n",
              "Node                  user:jdoe\n",
@@ -77,6 +77,10 @@ TEST_F(AccountViews, ShowOneUserAsJson)
     EXPECT_EQ(user["state"], "active; the password expires in 12 days");
     EXPECT_EQ(user["password"], "set");
     EXPECT_EQ(user["password-days-left"], 12);
+    EXPECT_EQ(user["min-days"], 0);
+    EXPECT_EQ(user["max-days"], 22);
+    EXPECT_EQ(user["warn-days"], 14);
+    EXPECT_EQ(user["inactive-days"], nullptr);
     EXPECT_EQ(user["account-expires"], nullptr);
     EXPECT_EQ(user["login-failures-allowed"], 3);
     EXPECT_EQ(user["node"], "user:jdoe");

@@ -202,7 +202,7 @@ std::string memoryWarning(IC::MutableNode const& node, Property const& property)
     std::string text = fmt::format("{} changed in memory only", property.name);
     for (Instead const& each : instead)
         if (each.nodeType == node.getNodeType() && each.property == property.id)
-            text += fmt::format("; use '{}'", each.command);
+            text += fmt::format(" (use '{}')", each.command);
     return text;
 }
 

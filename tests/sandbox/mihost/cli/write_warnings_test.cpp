@@ -123,7 +123,7 @@ TEST_F(WriteWarnings, PropertiesThatOnlyChangeTheTreeNameTheCommand)
         Outcome const outcome = mihostRun({"--json", "set", "user:jdoe", row.property, row.value});
         EXPECT_EQ(outcome.code, 0) << row.property;
         std::string const warning =
-            std::string(row.property) + " changed in memory only; use '" + row.command + "'";
+            std::string(row.property) + " changed in memory only (use '" + row.command + "')";
         EXPECT_EQ(outcome.err, "mihost: " + warning + "\n");
         Json const answer = Json::parse(outcome.out);
         EXPECT_EQ(answer["changed"], false) << row.property;

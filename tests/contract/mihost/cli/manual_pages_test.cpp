@@ -57,11 +57,11 @@ TEST_P(ManualPage, PassesMandocsLint)
             ADD_FAILURE() << note;
 }
 
-char const* const pageNames[] = {"Mihost", "Plugin", "HostCheck", "Ansible", "Exporter"};
+char const* const pageNames[] = {"Mihost", "Plugin", "HostCheck", "Ansible", "Exporter", "Cockpit"};
 
 INSTANTIATE_TEST_SUITE_P(All, ManualPage,
                          testing::Values(MIHOST_PAGE, PLUGIN_PAGE, HOSTCHECK_PAGE, ANSIBLE_PAGE,
-                                         EXPORTER_PAGE),
+                                         EXPORTER_PAGE, COCKPIT_PAGE),
                          [](auto const& which) { return std::string(pageNames[which.index]); });
 
 TEST(ManualPageOfMihost, DescribesEveryOption)

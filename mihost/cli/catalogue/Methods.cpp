@@ -25,7 +25,6 @@ constexpr Parameter localGroup =
 constexpr Parameter member =
     required(parameter::domainAndMember, Form::AccountName, "login name of the member");
 constexpr Parameter fullName = required(parameter::fullName, Form::Words, "full name");
-constexpr char homeMeaning[] = "home directory; created, or moved with its files";
 
 std::vector<Parameter> const ageing = {
     optional(parameter::daysMustKeepPassword, Form::Digits, "minimum password age, in days"),
@@ -50,7 +49,7 @@ std::vector<Method> const allMethods = {
      withAgeing({
          newUserName,
          optional(parameter::comment, Form::Words, "the account's comment field"),
-         optional(parameter::homeDir, Form::Path, homeMeaning),
+         optional(parameter::homeDir, Form::Path, "home directory, to be created"),
          optional(parameter::scriptPath, Form::Path, "login shell"),
          optional(parameter::password, Form::Password, "plain password"),
      })},
@@ -62,7 +61,8 @@ std::vector<Method> const allMethods = {
      {userName, required(parameter::scriptPath, Form::Path, "login shell")}},
     {method::userSetHomeDir,
      "moves an account's home directory",
-     {userName, required(parameter::homeDir, Form::Path, homeMeaning)}},
+     {userName, required(parameter::homeDir, Form::Path,
+                         "new home directory, to which the files are moved")}},
     {method::userSetPassword,
      "sets an account's password",
      {userName, required(parameter::password, Form::Password, "plain password")}},

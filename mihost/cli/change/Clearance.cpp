@@ -10,11 +10,12 @@ constexpr std::chrono::milliseconds silence{500};
 
 } // namespace
 
-ChangeLock clearChange(Session const& session, std::string const& danger, MachineCheck const& check)
+ChangeLock clearChange(Session const& session, std::string const& command,
+                       std::string const& danger, MachineCheck const& check)
 {
     if (!danger.empty()) {
         check();
-        session.confirm(danger);
+        session.confirm(command, danger);
     }
     ChangeLock lock(changeLockFile, {silence, std::chrono::seconds(session.options().lockTimeout)});
     check();

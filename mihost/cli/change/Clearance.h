@@ -19,11 +19,13 @@ using MachineCheck = std::function<void()>;
  *
  * The check runs under the lock; for a dangerous change also before the prompt.
  *
- * @param danger  the question, such as "halt the machine"; empty for nothing
+ * @param command  as typed, such as "power halt"
+ * @param danger   the question, such as "halt the machine"; empty for nothing
  * @throws Failure
  */
 ChangeLock clearChange(
-    Session const& session, std::string const& danger, MachineCheck const& check = [] {});
+    Session const& session, std::string const& command, std::string const& danger,
+    MachineCheck const& check = [] {});
 
 } // namespace mihost
 

@@ -234,7 +234,7 @@ void carryOut(Session& session, Write const& write)
         warn(warning);
     Result const result = perform(write, session.secrets());
     WriteReport const report = judged(write, result);
-    if (session.options().json)
+    if (session.out().takesDocuments())
         session.out().json(toJson(report));
     else if (inSandbox())
         writeText(report, session.out());
@@ -244,7 +244,7 @@ void carryOut(Session& session, Write const& write)
     if (!report.error.empty())
         throw Failure(PluginRefused, fmt::format("{}: {}", write.what, report.error));
     bool const isUnchanged = write.acts && !report.changed && !write.expectations.empty();
-    if (isUnchanged && !session.options().json)
+    if (isUnchanged && !session.out().takesDocuments())
         tellUnchanged(write);
 }
 

@@ -23,9 +23,8 @@ public:
                 ->required();
         app.add_option(
             "PARAMETER", assignments_,
-            "NAME=VALUE; days as YYYY-MM-DD; Password=- reads it from a prompt or standard "
-            "input, but account tools still get the password or its hash as an "
-            "argument");
+            "NAME=VALUE, days as YYYY-MM-DD; Password=- reads the password from a prompt or "
+            "standard input");
         // When help is shown, the words given so far are known but not yet in name_.
         app.footer([this] {
             Method const* const known =
@@ -41,8 +40,8 @@ public:
             return session.askSecret(name);
         });
         IC::MutableNode& os = session.node("os");
-        ChangeLock const lock =
-            clearChange(session, dangerOf(call), [&call] { checkMembership(call); });
+        ChangeLock const lock = clearChange(session, "call " + name_, dangerOf(call),
+                                            [&call] { checkMembership(call); });
         carryOut(session, methodWrite(session, os, call));
     }
 

@@ -35,7 +35,7 @@ public:
     {
         choices_.restrict(app.add_option("KIND", kind_, "such as os or user; all kinds by default"),
                           rowNames(nodeKinds()));
-        app.add_flag("--markdown", markdown_, "as docs/properties.md");
+        app.add_flag("--markdown", markdown_, "print all as Markdown");
     }
 
     bool hasRows() const override
@@ -76,7 +76,7 @@ public:
         choices_.restrict(
             app.add_option("METHOD", method_, "such as UserAdd; a list of all by default"),
             rowNames(methods()));
-        app.add_flag("--markdown", markdown_, "as docs/methods.md");
+        app.add_flag("--markdown", markdown_, "print all as Markdown");
     }
 
     bool hasRows() const override

@@ -30,16 +30,17 @@ public:
                        "the file to check; by default the plug-in that mihost loads")
             ->type_name("FILE");
         choices_
-            .restrict(app.add_option("--format", format_, "how to show the results"),
+            .restrict(app.add_option("--format", format_, "print the results in this format"),
                       {textFormat, tap, junit})
             ->capture_default_str();
-        app.add_option("--rounds", rounds_, "number of starts and stops when looking for leaks")
-            ->check(between(1, 1000))
+        app.add_option("--rounds", rounds_,
+                       "start and stop the plug-in N times when looking for leaks")
+            ->type_name("N")
+            ->check(wholeBetween(1, 1000))
             ->capture_default_str();
-        app.add_option("--time-limit", timeLimit_,
-                       "stop each group of checks after this many seconds")
-            ->type_name("SECONDS")
-            ->check(between(1, 86400))
+        app.add_option("--time-limit", timeLimit_, "stop each group of checks after S seconds")
+            ->type_name("S")
+            ->check(wholeBetween(1, 86400))
             ->capture_default_str();
     }
 
@@ -62,7 +63,7 @@ private:
     void refuseWhatDoesNotFit(Options const& options) const
     {
         if (options.format != Format::TableText && format_ != textFormat)
-            throw Failure(BadUsage, "check: --format and -o exclude each other");
+            throw Failure(BadUsage, "check: --format and -o cannot be combined");
         if (!options.trace.empty())
             throw Failure(BadUsage, "check: --trace is not supported (leave it out)");
     }

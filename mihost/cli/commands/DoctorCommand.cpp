@@ -118,7 +118,7 @@ CommandRow const commandRows::doctor{
     "report what this machine lacks for a full tree",
     newCommand<Doctor>,
     {
-        {"mihost doctor", "what is missing, and how to install it"},
+        {"mihost doctor", "what is missing, and how to fix it"},
         {"mihost --json doctor", "the same as JSON"},
     },
 };

@@ -56,7 +56,7 @@ void showGroup(Session& session, std::string const& name)
     auto const group = describeGroup(data, name);
     if (!group)
         failForNoAccount("group", name, namesIn(data, groupFile));
-    if (session.options().json)
+    if (session.out().takesDocuments())
         session.out().json(documentOf(*group));
     else
         writeFacts(factsOf(*group), session.out());

@@ -73,8 +73,8 @@ class Metrics : public Command
 public:
     void declare(CLI::App& app) override
     {
-        app.add_option("--output", output_,
-                       "write the metrics to this file, replacing it atomically");
+        app.add_option("--output", output_, "write the metrics to FILE, replacing it atomically")
+            ->type_name("FILE");
         app.add_flag("--accounts", accounts_,
                      "add series for each account, with its name as a label");
     }
@@ -105,7 +105,7 @@ private:
     {
         if (!output_.empty())
             replaceFile(output_, metricText(metrics), "writing the metrics");
-        else if (session.options().json)
+        else if (session.out().takesDocuments())
             session.out().json(metricsToJson(metrics));
         else
             session.out().write(metricText(metrics));
@@ -123,7 +123,8 @@ CommandRow const commandRows::metrics{
     newCommand<Metrics>,
     {
         {"mihost metrics", "print the metrics"},
-        {"mihost metrics --output /tmp/mihost.prom", "replace a file that node_exporter reads"},
+        {"mihost metrics --output /var/lib/prometheus/node-exporter/mihost.prom",
+         "replace a file that node_exporter reads"},
     },
     CommandRow::NotInShell,
 };

@@ -41,7 +41,7 @@ public:
     {
         carryOut(session, osWrite(session, session.node("os"), "refresh", IC::property::refresh,
                                   number(IC::command::rebuild)));
-        if (session.options().json)
+        if (session.out().takesDocuments())
             return;
         auto const nodes = session.nodes();
         session.out().line(
@@ -58,10 +58,10 @@ public:
     void run(Session& session) override
     {
         IC::MutableNode& os = session.node("os");
-        ChangeLock const lock = clearChange(session, "empty the system log");
+        ChangeLock const lock = clearChange(session, "clear-log", "empty the system log");
         carryOut(session, osWrite(session, os, "clear-log", IC::property::clearLog,
                                   number(IC::command::emptyLog)));
-        if (session.options().json)
+        if (session.out().takesDocuments())
             return;
         session.out().line(
             counted(countOf(session.nodes(), IC::nodeType::logEntry), "log entry", "log entries"));
@@ -76,7 +76,9 @@ class Power : public Command
 public:
     void declare(CLI::App& app) override
     {
-        choices_.restrict(app.add_option("ACTION", action_, "restart or halt"), {restart, halt})
+        choices_
+            .restrict(app.add_option("ACTION", action_, "what to do with the machine"),
+                      {restart, halt})
             ->required();
     }
 
@@ -84,8 +86,9 @@ public:
     {
         unsigned int const state = action_ == restart ? IC::command::restart : IC::command::halt;
         IC::MutableNode& os = session.node("os");
-        ChangeLock const lock = clearChange(session, action_ + " the machine");
-        carryOut(session, osWrite(session, os, "power " + action_, IC::property::requestedState,
+        std::string const command = "power " + action_;
+        ChangeLock const lock = clearChange(session, command, action_ + " the machine");
+        carryOut(session, osWrite(session, os, command, IC::property::requestedState,
                                   IC::PropertyValue(IC::EnumValue(state), true)));
     }
 

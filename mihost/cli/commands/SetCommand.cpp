@@ -92,8 +92,8 @@ public:
         app.add_option("PROPERTY", name_, "an id or a name, see 'mihost properties'")->required();
         app.add_option(
                "VALUE", text_,
-               "a date as YYYY-MM-DD, true or false, lists with commas; - reads a password from "
-               "a prompt or standard input")
+               "dates as YYYY-MM-DD, booleans as true or false, lists separated by commas; - "
+               "reads a password hash from a prompt or standard input")
             ->required();
     }
 
@@ -114,7 +114,8 @@ public:
         IC::PropertyValue const value = parseValue(*property, text_);
         std::optional<ChangeLock> lock;
         if (changesMachine(*property))
-            lock = clearChange(session, dangerOf(node, *property, value),
+            lock = clearChange(session, fmt::format("set {}", property->name),
+                               dangerOf(node, *property, value),
                                [&] { checkMachine(node, *property, value); });
         carryOut(session, writeOf(session, node, *property, value));
     }

@@ -125,7 +125,7 @@ void TaskCommand::declarePassword(CLI::App& app, TaskValue const& value, bool is
 void TaskCommand::checkWords() const
 {
     if (!task_ && shown_.empty())
-        throw CLI::RequiredError(subject_.argument);
+        throw CLI::ValidationError(fmt::format("{} or a command is required", subject_.argument));
     if (task_ && !shown_.empty())
         throw CLI::ValidationError(fmt::format("unexpected argument '{}'", shown_));
 }
@@ -167,12 +167,14 @@ Write TaskCommand::writeOf(Session& session, MethodCall const& call) const
 void TaskCommand::carryOutTask(Session& session) const
 {
     MethodCall const call = callOf(session);
+    std::string const what = fmt::format("{} {}", subject_.command, task_->name);
     std::string const question =
         task_->question ? fmt::format(task_->question, given_.front().text) : "";
     session.node("os"); // built before others are kept from changing the machine
-    ChangeLock const lock = clearChange(session, question, [&call] { checkMembership(call); });
+    ChangeLock const lock =
+        clearChange(session, what, question, [&call] { checkMembership(call); });
     Write write = writeOf(session, call);
-    write.what = fmt::format("{} {}", subject_.command, task_->name);
+    write.what = what;
     carryOut(session, write);
 }
 

@@ -16,7 +16,7 @@ constexpr TaskValue maxDays = {"--max-days", "daysMustChangePasswordAfter", "N",
 constexpr TaskValue warnDays = {"--warn-days", "daysWarnBeforePasswordExpire", "N",
                                 "warn N days before the password expires"};
 constexpr TaskValue inactiveDays = {"--inactive-days", "daysExpireAfter", "N",
-                                    "disable the account N days after the password expired"};
+                                    "disable the account N days after the password expires"};
 
 std::vector<Task> const userTasks = {
     {
@@ -25,12 +25,12 @@ std::vector<Task> const userTasks = {
         "UserAdd",
         {
             {"NAME", "UserName", "", "login name of the new account"},
-            {"--full-name", "Comment", "TEXT", "set the full name"},
+            {"--full-name", "Comment", "FULL-NAME", "set the full name"},
             {"--home", "HomeDir", "DIR", "set the home directory"},
             {"--shell", "ScriptPath", "FILE", "set the login shell"},
             {"--password", "Password", "",
-             "set a password, read from a prompt or standard input; without one, no login by "
-             "password"},
+             "set a password, read from a prompt or standard input; without one, login by password "
+             "is disabled"},
             minDays,
             maxDays,
             warnDays,

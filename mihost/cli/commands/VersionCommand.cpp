@@ -30,7 +30,7 @@ public:
 
 CommandRow const commandRows::version{
     "version",
-    "show the versions of program, contract and plug-in",
+    "show the versions of the program, the contract and the plug-in",
     newCommand<Version>,
     {
         {"mihost version", "the versions and the plug-in's file"},

@@ -33,7 +33,7 @@ public:
             ->type_name("S")
             ->capture_default_str();
         app.add_option("-n,--count", count_, "stop after N reads; 0 means never")
-            ->check(between(0, 1000000000))
+            ->check(wholeBetween(0, 1000000000))
             ->type_name("N")
             ->capture_default_str();
     }
@@ -107,7 +107,7 @@ private:
         if (view.properties.empty())
             return;
         long const now = std::time(nullptr);
-        if (session.options().json) {
+        if (session.out().takesDocuments()) {
             Json document = {{"time", now}};
             document.update(toJson(view));
             session.out().json(document);

@@ -3,7 +3,7 @@
 #include "mihost/cli/input/Help.h"
 #include "mihost/cli/input/Range.h"
 #include "mihost/cli/input/Remote.h"
-#include "mihost/cli/input/Suggestion.h"
+#include "mihost/cli/input/UsageError.h"
 #include "mihost/cli/system/Failure.h"
 
 #include <CLI/Config.hpp>
@@ -17,46 +17,6 @@ namespace mihost
 namespace
 {
 
-/** The commands that were given, as they are typed. */
-std::string wordsOf(std::vector<CLI::App const*> const& commands)
-{
-    std::string words;
-    for (CLI::App const* command : commands)
-        words += (words.empty() ? "" : " ") + command->get_name();
-    return words;
-}
-
-/** What to type for the help that fits the words given. */
-std::string helpFor(CLI::App const& app, bool inShell)
-{
-    std::string const words = wordsOf(givenCommands(app));
-    if (!inShell)
-        return words + " --help";
-    return words.empty() ? "help" : "help " + words;
-}
-
-/** The options allowed at this place. */
-std::vector<std::string> optionNames(CLI::App const& app)
-{
-    std::vector<std::string> names;
-    for (CLI::App const* command : givenCommands(app))
-        for (CLI::Option const* option : command->get_options())
-            for (std::string const& name : option->get_lnames())
-                names.push_back("--" + name);
-    return names;
-}
-
-/** The argument in the place of a subcommand; empty for none. */
-std::string wordForCommand(CLI::App const& command)
-{
-    if (command.get_subcommands({}).empty())
-        return "";
-    for (CLI::Option const* option : command.get_options())
-        if (option->get_positional() && option->count() > 0)
-            return option->results().front();
-    return "";
-}
-
 Colours coloursOf(std::string const& name)
 {
     if (name == "auto")
@@ -68,38 +28,9 @@ Colours coloursOf(std::string const& name)
 void checkFormat(Format format, Command const& command, std::string const& name)
 {
     if (isRows(format) && !command.hasRows())
-        throw Failure(BadUsage, fmt::format("{}: -o {} needs rows (use table, json, jsonl or yaml)",
-                                            name, formatNames()[static_cast<std::size_t>(format)]));
-}
-
-/** The error for the first unexpected word. */
-std::string excessOf(CLI::App const& app, std::string const& help)
-{
-    std::string const word = app.remaining(true).front();
-    CLI::App const& command = *givenCommands(app).back();
-    if (word[0] == '-') {
-        std::string const meant = nearest(word.substr(0, word.find('=')), optionNames(app));
-        return meant.empty() ? fmt::format("no option '{}' (see '{}')", word, help)
-                             : fmt::format("no option '{}' (did you mean {}?)", word, meant);
-    }
-    if (&command == &app)
-        return fmt::format("no command '{}' ({})", word,
-                           suggestion(word, commandNames(app), "use"));
-    std::string const before = wordForCommand(command);
-    if (std::string const meant = nearest(before, commandNames(command)); !meant.empty())
-        return fmt::format("no command '{}' (did you mean {}?)", before, meant);
-    return fmt::format("unexpected argument '{}' (see '{}')", word, help);
-}
-
-/** @return the message, with its command before it and a hint after it */
-std::string explained(CLI::App const& app, std::string const& message, std::string const& help)
-{
-    std::vector<CLI::App const*> commands = givenCommands(app);
-    commands.erase(commands.begin());
-    std::string const what = wordsOf(commands);
-    bool const hasWayOn = !message.empty() && message.back() == ')';
-    return fmt::format("{}{}{}{}", what, what.empty() ? "" : ": ", message,
-                       hasWayOn ? "" : fmt::format(" (see '{}')", help));
+        throw Failure(BadUsage,
+                      fmt::format("{}: -o {} is not supported (use table, json, jsonl or yaml)",
+                                  name, nameOf(format)));
 }
 
 /** Leaves out the types of arguments, since their names say the same. */
@@ -146,10 +77,9 @@ void CommandLine::declareForProgram(CLI::App& app)
 void CommandLine::setFormat(Format format)
 {
     if (isFormatGiven_)
-        throw CLI::ValidationError("--json and -o exclude each other");
+        throw CLI::ValidationError("--json and -o cannot be combined");
     isFormatGiven_ = true;
     options_.format = format;
-    options_.json = isDocument(format);
 }
 
 void CommandLine::declareOutput(CLI::App& app)
@@ -183,11 +113,13 @@ void CommandLine::declare(CLI::App& app)
     app.add_flag("-y,--yes", options_.yes, "answer yes to all prompts");
     app.add_option("--lock-timeout", options_.lockTimeout,
                    "wait at most S seconds while another mihost changes this machine")
-        ->check(between(0, 86400))
+        ->check(wholeBetween(0, 86400))
         ->type_name("S")
         ->capture_default_str();
     app.require_subcommand(0, 1);
     declareCommands(app);
+    setExamples(app, {{"mihost get os", "the operating system's properties"},
+                      {"mihost --sandbox user add asmith", "try adding an account"}});
     hideTypesOfArguments(app);
 }
 
@@ -252,11 +184,8 @@ void CommandLine::parse(std::vector<std::string> words)
     } catch (CLI::CallForVersion const& version) {
         answer_ = fmt::format("{}\n", version.what());
         return;
-    } catch (CLI::ExtrasError const&) {
-        std::string const help = helpFor(app, inShell);
-        throw Failure(BadUsage, explained(app, excessOf(app, help), help));
     } catch (CLI::ParseError const& error) {
-        throw Failure(BadUsage, explained(app, error.what(), helpFor(app, inShell)));
+        throw usageFailure(app, error, inShell);
     }
     options_.sandbox = options_.sandbox || !options_.overlay.empty();
     auto const chosen = app.get_subcommands();

@@ -33,11 +33,32 @@ std::string lineOf(Example const& example, bool inShell)
     return std::string(line);
 }
 
+/** Shows a command that either takes its arguments or has a command below it with two usage lines.
+ */
+class HelpFormatter : public CLI::Formatter
+{
+public:
+    std::string make_usage(CLI::App const* app, std::string name) const override
+    {
+        auto const isArgument = [](CLI::Option const* option) { return option->get_positional(); };
+        auto const arguments = app->get_options(isArgument);
+        if (arguments.empty() || app->get_subcommands({}).empty())
+            return Formatter::make_usage(app, name);
+        std::string const start = fmt::format("{} [{}] ", name, get_label("OPTIONS"));
+        std::string usage = fmt::format("{}: {}", get_label("Usage"), start);
+        std::size_t const indent = usage.size() - start.size();
+        for (CLI::Option const* argument : arguments)
+            usage += argument->get_name();
+        return fmt::format("{}\n{:{}}{}{} ...\n", usage, "", indent, start,
+                           get_label("SUBCOMMAND"));
+    }
+};
+
 } // namespace
 
 void setHelpLabels(CLI::App& app)
 {
-    auto const formatter = std::make_shared<CLI::Formatter>();
+    auto const formatter = std::make_shared<HelpFormatter>();
     formatter->label("Positionals", "Arguments");
     formatter->label("REQUIRED", "(required)");
     formatter->label("SUBCOMMAND", "COMMAND");

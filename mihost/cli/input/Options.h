@@ -17,7 +17,6 @@ struct Options {
     std::string overlay; // a folder to lay over the sandbox; empty for none
     bool sandbox = false;
     Format format = Format::TableText;
-    bool json = false; // the format is a document
     Colours colours = Colours::Auto;
     bool noHeaders = false; // of tables and CSV
     bool full = false;      // nothing is wrapped to fit the terminal

@@ -114,7 +114,7 @@ struct Account {
     std::string name;
     std::optional<double> expiry; // nothing for never
     double passwordChange;        // 0 for never
-    bool disabled;                // no password opens it
+    bool disabled;                // it allows no login by password
 };
 
 /** Contract: the day that an account without an expiry reports. */
@@ -171,7 +171,7 @@ void addAccountCounts(Accounts const& accounts, std::time_t now, std::vector<Met
     to.push_back(
         {"mi_accounts_disabled",
          "",
-         "Accounts that no password opens.",
+         "Accounts that allow no login by password.",
          {{{}, countOf(accounts, [](Account const& account) { return account.disabled; })}}});
     to.push_back({"mi_accounts_password_never_changed",
                   "",
@@ -191,7 +191,8 @@ void addAccountSeries(Accounts const& accounts, std::vector<Metric>& to)
                   "seconds",
                   "When an account's password was last changed, 0 for never.",
                   {}};
-    Metric disabled{"mi_account_disabled", "", "Whether no password opens an account.", {}};
+    Metric disabled{
+        "mi_account_disabled", "", "Whether an account allows no login by password.", {}};
     for (Account const& account : accounts) {
         auto const sample = [&account](double value) {
             return Sample{{{"user", account.name}}, value};

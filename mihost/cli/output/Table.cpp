@@ -65,7 +65,9 @@ bool isBefore(Cell const& one, Cell const& other)
 
 void Selection::declare(CLI::App& app)
 {
-    app.add_option("--columns", columns, "columns to show, separated by commas")->delimiter(',');
+    app.add_option("--columns", columns, "show these columns, separated by commas")
+        ->type_name("COLUMN[,COLUMN]")
+        ->delimiter(',');
     app.add_option("--sort", sort, "sort the rows by this column; -COLUMN for descending order")
         ->type_name("[-]COLUMN");
     app.add_option("--where", where,

@@ -143,14 +143,14 @@ std::string Session::askSecret(std::string const& name) const
     return terminal::readSecret(name);
 }
 
-void Session::confirm(std::string const& what) const
+void Session::confirm(std::string const& command, std::string const& what) const
 {
     if (options_.yes)
         return;
     if (!terminal::canAsk())
-        throw Failure(BadUsage, fmt::format("not a terminal: add --yes to {}", what));
+        throw Failure(BadUsage, fmt::format("{}: not a terminal (add --yes to {})", command, what));
     if (!terminal::confirm(printable(fmt::format("Really {}?", what))))
-        throw Failure(BadUsage, fmt::format("not confirmed: did not {}", what));
+        throw Failure(BadUsage, fmt::format("{}: not confirmed, so nothing was changed", command));
 }
 
 void Session::warnOfUnknown()

@@ -90,10 +90,11 @@ public:
     /**
      * Returns only if the user agreed.
      *
-     * @param what  such as "delete the account jdoe"
+     * @param command  as typed, such as "user delete"
+     * @param what     such as "delete the account jdoe"
      * @throws Failure (BadUsage) if not, or without a terminal
      */
-    void confirm(std::string const& what) const;
+    void confirm(std::string const& command, std::string const& what) const;
 
     /** Prints one warning if unknown values were shown since the last call. */
     static void warnOfUnknown();

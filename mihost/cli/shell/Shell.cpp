@@ -52,7 +52,7 @@ bool Shell::runLine(std::string const& line)
         session_.setOptions(command.options());
         command.command()->run(session_);
         Session::warnOfUnknown();
-    } else if (command.options().json) {
+    } else if (isDocument(command.options().format)) {
         session_.out().json({{"text", command.answer()}});
     } else {
         session_.out().write(command.answer());
@@ -82,7 +82,7 @@ void Shell::runScript(std::istream& script, bool keepGoing)
             Failure const numbered(failure.code(),
                                    fmt::format("line {}: {}", number, failure.what()));
             // A command prints a line even without a result.
-            if (session_.options().json && session_.out().size() == before)
+            if (session_.out().takesDocuments() && session_.out().size() == before)
                 tellAsJson(numbered);
             if (!keepGoing)
                 throw numbered;

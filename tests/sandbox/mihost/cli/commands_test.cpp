@@ -399,7 +399,9 @@ TEST(MihostDangers, NeedYesWithoutATerminal)
           Lines{"set", "os", "74", "UserDel,UserName:CMPI_string:root"}}) {
         Outcome const outcome = mihostRun(arguments, "y\n");
         EXPECT_EQ(outcome.code, 2) << arguments[0];
-        EXPECT_NE(outcome.err.find("add --yes to"), std::string::npos) << outcome.err;
+        EXPECT_EQ(outcome.err.find("mihost: " + arguments[0]), 0U) << outcome.err;
+        EXPECT_NE(outcome.err.find(": not a terminal (add --yes to "), std::string::npos)
+            << outcome.err;
     }
     EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
     EXPECT_FALSE(machine::read("/var/log/messages").empty());

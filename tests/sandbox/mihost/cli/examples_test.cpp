@@ -63,6 +63,7 @@ void makeMachineOfTheExamples()
     machine::write("/etc/release", "Example Linux\nVERSION = 1\nPATCHLEVEL = 0\n");
     machine::write("/root/secret", "Secret-1\n", 0600);
     machine::write("/etc/shells", "/bin/sh\n/bin/bash\n");
+    std::filesystem::create_directories("/var/lib/prometheus/node-exporter");
     machine::write("/var/log/messages", "Jan  2 03:04:05 host line\n");
     for (char const* line : {"groupadd staff", "groupadd crew", "useradd -m -U -G crew jdoe"})
         ASSERT_EQ(runToEnd({"/bin/sh", "-c", line}).code, 0) << line;

@@ -149,7 +149,7 @@ TEST_F(MihostFormats, RefusesRowFormatsOfAChangeBeforeItRuns)
             Outcome const outcome = mihostRun(words);
             EXPECT_EQ(outcome.code, 2) << command[0];
             EXPECT_EQ(outcome.err, "mihost: " + command[0] + ": -o " + format +
-                                       " needs rows (use table, json, jsonl or yaml)\n");
+                                       " is not supported (use table, json, jsonl or yaml)\n");
         }
     EXPECT_EQ(machine::entry("/etc/passwd", "anna").at(0), "anna");
     EXPECT_EQ(mihostRun({"-o", "xml", "tree"}).code, 2);

@@ -61,7 +61,8 @@ TEST_F(MihostScript, EndsAtTheFirstLineThatFailsAndNamesIt)
              {"call UserDel UserName=a;b", 2,
               "mihost: line 2: UserName contains the shell metacharacter ';'"},
              {"call UserDel UserName=nobody-here", 1, "mihost: line 2: call UserDel: the plug-in"},
-             {"power halt", 2, "mihost: line 2: not a terminal: add --yes to halt the machine"}}) {
+             {"power halt", 2,
+              "mihost: line 2: power halt: not a terminal (add --yes to halt the machine)"}}) {
         Outcome const outcome =
             mihostRun({"shell"}, "get os 108\n" + std::string(script.line) + "\nget os 108\n");
         EXPECT_EQ(outcome.code, script.code) << script.line;

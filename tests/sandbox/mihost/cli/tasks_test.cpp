@@ -215,9 +215,9 @@ TEST_F(Tasks, NeedYesToDeleteWithoutATerminal)
 {
     machine::recordShell();
     expectUnchanged(mihostRun({"user", "delete", "jdoe"}), 2,
-                    "user delete: not a terminal: add --yes to delete the account jdoe");
+                    "user delete: not a terminal (add --yes to delete the account jdoe)");
     expectUnchanged(mihostRun({"group", "delete", "crew"}), 2,
-                    "group delete: not a terminal: add --yes to delete the group crew");
+                    "group delete: not a terminal (add --yes to delete the group crew)");
 }
 
 TEST_F(Tasks, AskAtATerminalBeforeTheyDelete)

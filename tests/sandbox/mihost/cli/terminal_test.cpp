@@ -179,7 +179,7 @@ TEST_F(MihostTerminal, AsksBeforeDangerousCommandsAndAcceptsNo)
         TerminalRun run({"power", "halt"});
         run.waitFor("Really halt the machine? [y/N] ");
         run.type(answer);
-        run.waitFor("mihost: not confirmed: did not halt the machine");
+        run.waitFor("mihost: power halt: not confirmed, so nothing was changed");
         EXPECT_EQ(run.end(), 2);
     }
     EXPECT_EQ(mihost::refusedPowerCommands(), Lines());

@@ -158,8 +158,9 @@ TEST(MihostSet, DeletesAnAccountOnlyWithYes)
                                        "sed -i /^1500:/d /etc/passwd\n");
     Outcome const outcome = mihostRun({"set", "user:1500", "delete", "true"});
     EXPECT_EQ(outcome.code, 2);
-    EXPECT_EQ(outcome.err, "mihost: not a terminal: add --yes to delete the account 1500 and its "
-                           "home directory\n");
+    EXPECT_EQ(outcome.err,
+              "mihost: set delete: not a terminal (add --yes to delete the account 1500 "
+              "and its home directory)\n");
     EXPECT_FALSE(std::filesystem::exists("/tmp/deleted"));
     EXPECT_EQ(mihostRun({"set", "user:1500", "delete", "false"}).code, 0);
     EXPECT_FALSE(std::filesystem::exists("/tmp/deleted"));

@@ -58,9 +58,9 @@ struct Figure {
 };
 
 constexpr Figure figures[] = {
-    {"physical-memory-size", bytesPerKib, "mi_memory_size_bytes", "bytes", "RAM."},
+    {"physical-memory-size", bytesPerKib, "mi_memory_size_bytes", "bytes", "Size of the RAM."},
     {"physical-memory-free", bytesPerKib, "mi_memory_free_bytes", "bytes", "Free RAM."},
-    {"process-count", 1, "mi_processes", "", "Processes."},
+    {"process-count", 1, "mi_processes", "", "Number of processes."},
     {"last-boot-time", 1, "mi_boot_time_seconds", "seconds", "When the machine was started."},
 };
 
@@ -231,7 +231,8 @@ void addAccounts(MachineState const& state, AccountSeries series, std::vector<Me
 void addNeeds(std::vector<Need> const& needs, std::vector<Metric>& to)
 {
     Metric ok{"mi_doctor_ok", "", "Whether the machine has what a full tree needs.", {}};
-    Metric fixable{"mi_doctor_fixable", "", "Whether this machine can have what is missing.", {}};
+    Metric fixable{
+        "mi_doctor_fixable", "", "Whether what is missing can be fixed on this machine.", {}};
     for (Need const& need : needs) {
         ok.samples.push_back({{{"need", need.what}}, need.problem ? 0.0 : 1.0});
         if (need.problem)
@@ -249,7 +250,7 @@ std::vector<Metric> machineMetrics(MachineState const& state, AccountSeries acco
         addFigures(*os, metrics);
     metrics.push_back({"mi_swap_size_bytes",
                        "bytes",
-                       "Swap space.",
+                       "Size of the swap space.",
                        {{{}, static_cast<double>(state.swapSize)}}});
     metrics.push_back({"mi_swap_free_bytes",
                        "bytes",

@@ -72,28 +72,38 @@ void makeMachineOfTheExamples()
     setenv("PATH", (directory.string() + ":" + getenv("PATH")).c_str(), 1);
 }
 
+/** Each runs in its own sandbox and answers yes; the input is for those that read a password. */
+void runExamples(std::string const& help, std::string const& input)
+{
+    Lines const examples = examplesIn(help);
+    EXPECT_EQ(examples.size(), 2U) << help;
+    for (std::string const& example : examples) {
+        std::size_t const at = example.find("mihost ");
+        ASSERT_NE(at, std::string::npos) << example;
+        std::string line = example;
+        line.insert(at + 7, "--sandbox --yes ");
+        Outcome const outcome = runToEnd({"/bin/sh", "-c", line}, input);
+        EXPECT_EQ(outcome.code, 0) << line << '\n' << outcome.out << outcome.err;
+    }
+}
+
 class Examples : public testing::TestWithParam<mihost::CommandRow const*>
 {
 };
+
+TEST(ExamplesOfTheProgram, Work)
+{
+    makeMachineOfTheExamples();
+    runExamples(mihostRun({"--help"}).out, "");
+}
 
 TEST_P(Examples, OfEachCommandWork)
 {
     makeMachineOfTheExamples();
     bool const isShell = GetParam() == &mihost::commandRows::shell;
     std::string const input = isShell ? "" : "Secret-1\n";
-    for (auto const& [command, help] : allHelp({GetParam()->name})) {
-        Lines const examples = examplesIn(help);
-        EXPECT_EQ(examples.size(), 2U) << help;
-        for (std::string const& example : examples) {
-            // Each runs in its own sandbox and answers yes; a password is there to be read.
-            std::size_t const at = example.find("mihost ");
-            ASSERT_NE(at, std::string::npos) << example;
-            std::string line = example;
-            line.insert(at + 7, "--sandbox --yes ");
-            Outcome const outcome = runToEnd({"/bin/sh", "-c", line}, input);
-            EXPECT_EQ(outcome.code, 0) << line << '\n' << outcome.out << outcome.err;
-        }
-    }
+    for (auto const& [command, help] : allHelp({GetParam()->name}))
+        runExamples(help, input);
 }
 
 INSTANTIATE_TEST_SUITE_P(All, Examples, testing::ValuesIn(mihost::commandTable()),

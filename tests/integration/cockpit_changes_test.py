@@ -142,8 +142,8 @@ class Accounts(ChangeTest):
         self.open_account('carl')
         self.browser.click('#user-ageing')
         self.browser.see('#preview', 'Change password ageing')
-        starts = [self.browser.attributes(f'#field-{name}-days', 'value') for name in ('min', 'max', 'warn', 'inactive')]
-        self.assertEqual(starts, [['1'], ['90'], ['14'], ['30']])
+        for name, days in (('min', '1'), ('max', '90'), ('warn', '14'), ('inactive', '30')):
+            self.assertEqual(self.browser.attributes(f'#field-{name}-days', 'value'), [days])
         self.fill(**{'max-days': '60', 'warn-days': '7'})
         self.preview()
         self.apply()

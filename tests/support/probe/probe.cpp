@@ -30,8 +30,7 @@ void printCounts()
     miaccel_count rows[16];
     std::size_t const count = counts(rows, 16);
     for (std::size_t row = 0; row < count; ++row)
-        std::fprintf(stderr, "%s %lu %lu\n", rows[row].command, rows[row].answered,
-                     rows[row].ran);
+        std::fprintf(stderr, "%s %lu %lu\n", rows[row].command, rows[row].answered, rows[row].ran);
 }
 
 } // namespace

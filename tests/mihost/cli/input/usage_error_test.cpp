@@ -65,7 +65,7 @@ TEST(UsageError, AsksForAnAccountOrATask)
 
 TEST(UsageError, SuggestsWhatWasMeant)
 {
-    EXPECT_EQ(refusalOf({"lsit"}), "no command 'lsit' (did you mean list?)");
+    EXPECT_EQ(refusalOf({"doctr"}), "no command 'doctr' (did you mean doctor?)");
     EXPECT_EQ(refusalOf({"tree", "--jsno"}), "tree: no option '--jsno' (did you mean --json?)");
     EXPECT_EQ(refusalOf({"user", "set-shel", "jdoe"}),
               "user: no command 'set-shel' (did you mean set-shell?)");

@@ -180,7 +180,7 @@ TEST_F(Tasks, RefuseWrongUsage)
     };
     machine::recordShell();
     for (Row const& row : {
-             Row{{"user"}, "user: USER is required (see 'mihost user --help')"},
+             Row{{"user"}, "user: USER or a command is required (see 'mihost user --help')"},
              Row{{"user", "ad", "asmith"}, "user: no command 'ad' (did you mean add?)"},
              Row{{"user", "jdoe", "delete", "jdoe"},
                  "user delete: unexpected argument 'jdoe' (see 'mihost user delete --help')"},

@@ -42,7 +42,7 @@ Answer ask(Row const& row, Operands const& operands)
     return reason ? declined(reason) : row.answer(operands);
 }
 
-FILE* open(Row& row, Answer answer)
+FILE* openAnswer(Row& row, Answer answer)
 {
     FILE* const stream = answer.text ? openStream(*std::move(answer.text)) : nullptr;
     if (stream && !answer.reason) {
@@ -60,8 +60,8 @@ FILE* openAnswerTo(std::string_view line, std::string_view mode)
     std::optional<Operands> operands;
     for (Row& row : rows)
         if (row.form && isPlainRead && (operands = operandsOf(row.form, line)))
-            return open(row, ask(row, *operands));
-    return open(*std::prev(std::end(rows)), declined("not an accelerated command"));
+            return openAnswer(row, ask(row, *operands));
+    return openAnswer(*std::prev(std::end(rows)), declined("not an accelerated command"));
 }
 
 } // namespace

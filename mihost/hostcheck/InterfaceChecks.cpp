@@ -259,7 +259,7 @@ std::string takesAlerts()
     return "";
 }
 
-std::string form()
+std::string interfaceForm()
 {
     TestInterface const interface;
     static_cast<void>(static_cast<std::string>(interface)); // any text will do
@@ -320,7 +320,8 @@ Checks interfaceChecks()
         {unload, "deletes every node", unloads},
         {unload, "needs no initialize", unloadsUninitialized},
         {"IC::ManagementInterface::registerForAlerts", "can be called and taken back", takesAlerts},
-        {"IC::ManagementInterface::operator std::string", "returns a form for log messages", form},
+        {"IC::ManagementInterface::operator std::string", "returns a form for log messages",
+         interfaceForm},
         {"IC::ManagementInterface", "holds 100,000 nodes", manyNodes},
     };
 }

@@ -124,7 +124,7 @@ template <IC::Error (MutableNode::*Set)(std::string const&)> std::string takesTe
     return "";
 }
 
-std::string form()
+std::string nodeForm()
 {
     TestNode node;
     node.setDescription("text");
@@ -292,7 +292,7 @@ Checks nodeChecks()
         {"IC::MutableNode::setDescription", "stores what getDescription returns", description},
         {"IC::MutableNode::setPath", "takes any text", takesTexts<&MutableNode::setPath>},
         {"IC::MutableNode::setParent", "takes any text", takesTexts<&MutableNode::setParent>},
-        {"IC::Node::operator std::string", "returns a form for log messages", form},
+        {"IC::Node::operator std::string", "returns a form for log messages", nodeForm},
         {"IC::MutableNode::setProperty", "stores what getProperty returns", stores},
         {"IC::MutableNode::setProperty", "replaces an earlier value", replaces},
         {"IC::MutableNode::setProperty", "keeps a copy", storesCopies},

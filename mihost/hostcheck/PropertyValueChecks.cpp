@@ -19,7 +19,7 @@ using IC::PropertyValue;
 
 constexpr long someTime = 1000000000;
 
-PropertyValue text(std::string const& content)
+PropertyValue textValue(std::string const& content)
 {
     return {content, true};
 }
@@ -103,7 +103,8 @@ std::string fromKind()
 std::string textOfTexts()
 {
     for (std::string const& content : oddTexts())
-        if (std::string problem = equal("the text form of a text", asText(text(content)), content);
+        if (std::string problem =
+                equal("the text form of a text", asText(textValue(content)), content);
             !problem.empty())
             return problem;
     return "";
@@ -162,7 +163,7 @@ std::string numberOfTexts()
                            Row{"12x", 0}, Row{" 12", 0}, Row{"-1", 0}, Row{"0x10", 0},
                            Row{"4294967296", 0}, Row{"18446744073709551621", 0}}) {
         std::string const what = std::string("the unsigned form of text '") + row.text + "'";
-        std::string problem = equal(what.c_str(), asNumber(text(row.text)), row.number);
+        std::string problem = equal(what.c_str(), asNumber(textValue(row.text)), row.number);
         if (!problem.empty())
             return problem;
     }
@@ -185,7 +186,7 @@ std::string getNumber()
          equal("getNumber of true", PropertyValue(Number(true), true).getNumber(), 1),
          equal("getNumber of a date", date(-someTime).getNumber(), -someTime),
          equal("getNumber of an enumeration", PropertyValue(EnumValue(5U), true).getNumber(), 5),
-         equal("getNumber of a text", text("5").getNumber(), 0)});
+         equal("getNumber of a text", textValue("5").getNumber(), 0)});
 }
 
 std::string getNumbers()
@@ -197,14 +198,14 @@ std::string getNumbers()
     return firstOf({equal("the first", back[0].getValue(), 1),
                     equal("the second", back[1].getValue(), -2),
                     equal("the second's kind", back[1].getKind(), Number::DateKind),
-                    holds(text("5").getNumbers().empty(), "a text has numbers")});
+                    holds(textValue("5").getNumbers().empty(), "a text has numbers")});
 }
 
 std::string getTexts()
 {
     std::vector<std::string> const& list = oddTexts();
     return firstOf({holds(PropertyValue(list, true).getTexts() == list, "the texts are others"),
-                    holds(text("5").getTexts().empty(), "a single text has a list")});
+                    holds(textValue("5").getTexts().empty(), "a single text has a list")});
 }
 
 std::string isA(PropertyValue const& value, PropertyValue::KindType kind, std::string const& form)
@@ -218,18 +219,18 @@ std::string copies()
 {
     PropertyValue original(std::vector<std::string>{"a", "b"}, false);
     PropertyValue const copy(original);
-    original = text("other");
+    original = textValue("other");
     return isA(copy, PropertyValue::TextsKind, "a,b");
 }
 
 std::string assigns()
 {
-    PropertyValue assigned = text("earlier");
+    PropertyValue assigned = textValue("earlier");
     PropertyValue original(Number(5U), false);
     PropertyValue& result = assigned = original;
     PropertyValue const& itself = assigned;
     assigned = itself;
-    original = text("other");
+    original = textValue("other");
     return firstOf({isA(assigned, PropertyValue::NumberKind, "5"),
                     holds(&result == &assigned, "the result is another object")});
 }

@@ -62,7 +62,7 @@ void layLink(Descriptor const& folder, std::string const& name, std::string cons
     check(lchown(path.c_str(), 0, 0), "cannot set the owner of " + path);
 }
 
-void makeFolder(std::string const& path, mode_t mode)
+void putFolder(std::string const& path, mode_t mode)
 {
     if (isFolder(path))
         return;
@@ -86,7 +86,7 @@ void layFolder(Descriptor const& folder, std::string const& path)
         } else if (S_ISLNK(status.st_mode)) {
             layLink(folder, name, place, static_cast<std::size_t>(status.st_size));
         } else if (S_ISDIR(status.st_mode)) {
-            makeFolder(place, status.st_mode);
+            putFolder(place, status.st_mode);
             layFolder(Descriptor(check(
                           openat(folder.get(), name.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC),
                           "cannot read the directory for " + place)),

@@ -40,7 +40,7 @@ void makeFolder(std::string const& path, mode_t mode)
         failed("cannot create " + path);
 }
 
-void bind(std::string const& from, std::string const& to, unsigned long flags = 0)
+void bindMount(std::string const& from, std::string const& to, unsigned long flags = 0)
 {
     check(mount(from.c_str(), to.c_str(), nullptr, MS_BIND | flags, nullptr),
           "cannot bind " + from);
@@ -124,7 +124,7 @@ void addDevices()
             continue;
         Descriptor const file(check(open(place.c_str(), O_CREAT | O_WRONLY | O_CLOEXEC, 0600),
                                     "cannot create " + place));
-        bind(device, place);
+        bindMount(device, place);
         makeReadOnly(place); // the device can be written, its owner and mode cannot change
     }
     struct Link {
@@ -152,11 +152,11 @@ void addKernelFileSystems()
         std::string const path = processes + "/" + name;
         if (access(path.c_str(), F_OK) != 0)
             continue;
-        bind(path, path);
+        bindMount(path, path);
         makeReadOnly(path);
     }
     if (access("/sys", F_OK) == 0) {
-        bind("/sys", copyRoot + "/sys", MS_REC);
+        bindMount("/sys", copyRoot + "/sys", MS_REC);
         makeReadOnly(copyRoot + "/sys");
     }
 }

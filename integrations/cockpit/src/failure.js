@@ -28,11 +28,11 @@ export function messageOf(stderr) {
 /** Returns the failure that Cockpit's exception means, or null if mihost ran and ended by itself. */
 export function failureOf(exception) {
     const message = String(exception.message ?? "");
-    // Newer versions of Cockpit report a signal as a negative exit status.
-    if (exception.exit_signal || exception.exit_status < 0)
-        return new Failure("killed", message);
     if (exception.problem && exception.problem !== "")
         return new Failure(kinds[exception.problem] ?? "failed", message);
+    // Newer versions of Cockpit report a signal as a negative exit status; older ones have -1 beside a problem.
+    if (exception.exit_signal || exception.exit_status < 0)
+        return new Failure("killed", message);
     if (exception.exit_status === 3)
         return new Failure("no-plugin", messageOf(message), 3);
     if (exception.exit_status === 127) // a shell between Cockpit and mihost

@@ -4,6 +4,7 @@ import { failureOf, messageOf } from "../src/failure.js";
 
 const cases = [
     ["a missing program", { problem: "not-found", message: "not-found" }, "missing"],
+    ["a missing program in older versions", { exit_status: -1, problem: "not-found", message: "" }, "missing"],
     ["a shell that does not find it", { exit_status: 127, message: "sh: mihost: not found" }, "missing"],
     ["a refused program", { problem: "access-denied", message: "access-denied" }, "denied"],
     ["a signal", { exit_signal: "KILL", problem: "terminated", message: "" }, "killed"],

@@ -160,8 +160,8 @@ std::optional<std::string> enterSandbox(std::string const& overlay)
         report.writeEnd.reset();
         return runAsCaller(child, std::move(report.readEnd));
     } catch (std::system_error const& error) {
-        if (error.code() == std::errc::operation_not_permitted)
-            return std::string(error.what()) + "; root's privileges are needed";
+        if (error.code() == std::errc::operation_not_permitted && geteuid() != 0)
+            return std::string(error.what()) + " (root's privileges are needed)";
         return error.what();
     }
 }

@@ -1,6 +1,7 @@
 #include "tests/support/Program.h"
 
 #include "TestPaths.h"
+#include "tests/support/MessageForm.h"
 
 #include <array>
 #include <cstdio>
@@ -65,7 +66,10 @@ Outcome runToEnd(std::vector<std::string> const& arguments, std::string const& i
     if (child < 0 || waitpid(child, &status, 0) != child)
         throw std::runtime_error("cannot run " + arguments.at(0));
     int const code = WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
-    return {code, textOf(out), textOf(err)};
+    Outcome const outcome{code, textOf(out), textOf(err)};
+    if (auto const flaw = flawOfMessages(outcome.err))
+        throw std::runtime_error(*flaw);
+    return outcome;
 }
 
 Outcome mihostRun(std::vector<std::string> arguments, std::string const& input)

@@ -12,7 +12,7 @@ struct Outcome {
 };
 
 /**
- * Runs a program to its end.
+ * Runs a program to its end. A message of mihost that is not in the usual form fails the test.
  *
  * @param arguments  the program's path first
  * @param input      what it reads from standard input, which is not a terminal

@@ -30,7 +30,7 @@ std::optional<std::string> objectionToCharacters(std::string_view text)
             return fmt::format("contains the byte {}, which is not UTF-8",
                                hexByte(static_cast<unsigned char>(text[0])));
         if (isControl(piece.character))
-            return fmt::format("contains the control character {}", printable(shown));
+            return fmt::format("contains the control character '{}'", printable(shown));
         if (shellMetacharacters.find(shown) != std::string_view::npos)
             return fmt::format("contains the shell metacharacter '{}'", shown);
         if (separators.find(shown) != std::string_view::npos)

@@ -31,11 +31,10 @@ void goIntoSandbox(std::string const& overlay)
     if (!reason)
         return;
     bool const isLimitedRoot = geteuid() == 0 && !hasCapability(CAP_SYS_ADMIN);
-    throw Failure(BadUsage,
-                  fmt::format("creating the sandbox: {}{}", *reason,
-                              isLimitedRoot ? " (root lacks CAP_SYS_ADMIN: grant it "
-                                              "where this container or service is started)"
-                                            : ""));
+    throw Failure(BadUsage, fmt::format("creating the sandbox: {}{}", *reason,
+                                        isLimitedRoot ? " (root lacks CAP_SYS_ADMIN: grant it "
+                                                        "to this container or service)"
+                                                      : ""));
 }
 
 } // namespace

@@ -3,6 +3,7 @@
 
 #include "TestPaths.h"
 #include "tests/support/Lines.h"
+#include "tests/support/MessageForm.h"
 
 #include <algorithm>
 #include <cctype>
@@ -106,34 +107,10 @@ std::vector<std::string> messagesOf(Source const& source)
     return messages;
 }
 
-/** Names such as UserSetAttrib, LANG or $6$ keep their capital letters. */
-bool isName(std::string const& word)
+/** The same for a literal, without the values that it is filled with. */
+std::optional<std::string> flawOfLiteral(std::string const& message)
 {
-    return std::any_of(word.begin() + 1, word.end(), [](unsigned char each) {
-        return std::isupper(each) || std::isdigit(each) || each == '_';
-    });
-}
-
-/** @return what is wrong with the form of a message; nothing if it is right */
-std::optional<std::string> flawOf(std::string const& message)
-{
-    constexpr std::size_t longest = 160; // characters, values not counted
-    std::string const values = "\\{[^}]*\\}";
-    std::string const text = std::regex_replace(message, std::regex(values), "");
-    if (text.size() > longest)
-        return "is too long";
-    if (text.find("\\n") != std::string::npos)
-        return "has more than one line";
-    if (text.size() > 1 && text.back() == '.' && text[text.size() - 2] != '.')
-        return "ends with a full stop";
-    std::string const first = text.substr(0, text.find_first_of(" :="));
-    if (!first.empty() && std::isupper(static_cast<unsigned char>(first[0])) && !isName(first))
-        return "begins with a capital letter";
-    std::string const said = std::regex_replace(text, std::regex("\\(.*\\)"), "");
-    if (said.find("; see ") != std::string::npos || said.find("; use ") != std::string::npos ||
-        said.find("; did you") != std::string::npos)
-        return "has what to do outside of parentheses";
-    return std::nullopt;
+    return flawOf(std::regex_replace(message, std::regex("\\{[^}]*\\}"), ""));
 }
 
 TEST(MessageForm, IsOneLineInLowerCaseWithoutAFullStop)
@@ -152,7 +129,7 @@ TEST(MessageForm, IsOneLineInLowerCaseWithoutAFullStop)
                 continue;
             for (std::string const& message : messagesOf(sourceOf(contentOf(entry.path())))) {
                 ++found;
-                if (auto const flaw = flawOf(message))
+                if (auto const flaw = flawOfLiteral(message))
                     ADD_FAILURE() << name << ": '" << message << "' " << *flaw;
             }
         }
@@ -183,7 +160,16 @@ TEST(MessageForm, HasNoneOfTheseFlaws)
     EXPECT_EQ(flawOf("there is no\\nsuch node"), "has more than one line");
     EXPECT_EQ(flawOf("no such node; see 'mihost tree'"), "has what to do outside of parentheses");
     EXPECT_EQ(flawOf(std::string(161, 'x')), "is too long");
-    EXPECT_EQ(flawOf("{" + std::string(200, 'x') + "}"), std::nullopt);
+    EXPECT_EQ(flawOfLiteral("{" + std::string(200, 'x') + "}"), std::nullopt);
+    EXPECT_EQ(flawOf("call UserAdd: '" + std::string(200, 'x') + "' failed"), std::nullopt);
+    EXPECT_EQ(flawOf("call UserAdd: failed; a command printed: No."), std::nullopt);
+}
+
+TEST(MessageForm, IsCheckedInEachLineOfStandardError)
+{
+    EXPECT_EQ(flawOfMessages("mihost: no node 'x'\nBut this is a command's.\n"), std::nullopt);
+    EXPECT_EQ(flawOfMessages("mihost: no node 'x'\nmihost: Oh\n"),
+              "'mihost: Oh' begins with a capital letter");
 }
 
 } // namespace messages_test

@@ -191,8 +191,8 @@ TEST_F(Overlay, WithoutPrivilegesTheReasonSaysWhatIsNeeded)
                          if (setuid(65534) != 0)
                              _exit(1);
                      }),
-              "cannot create a process namespace: Operation not permitted; root's privileges are "
-              "needed");
+              "cannot create a process namespace: Operation not permitted (root's privileges are "
+              "needed)");
 }
 
 TEST_F(Overlay, LayingOverTheMachineItselfIsRefused)

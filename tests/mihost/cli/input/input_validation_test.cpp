@@ -180,8 +180,8 @@ TEST(Objections, NameTheCharacterButNeverOneOfAPassword)
 {
     EXPECT_EQ(objection(Form::Words, "a;b"), "contains the shell metacharacter ';'");
     EXPECT_EQ(objection(Form::Words, "a,b"), "contains the separator ','");
-    EXPECT_EQ(objection(Form::Words, "a\nb"), "contains the control character \\n");
-    EXPECT_EQ(objection(Form::Words, "a\xC2\x85"), "contains the control character \\u0085");
+    EXPECT_EQ(objection(Form::Words, "a\nb"), "contains the control character '\\n'");
+    EXPECT_EQ(objection(Form::Words, "a\xC2\x85"), "contains the control character '\\u0085'");
     EXPECT_EQ(objection(Form::Words, "a\xFF"), "contains the byte \\xff, which is not UTF-8");
     std::string const reason = objection(Form::Password, "geheim;").value();
     EXPECT_EQ(reason.find("geheim"), std::string::npos);

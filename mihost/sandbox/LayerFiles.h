@@ -15,7 +15,7 @@
 namespace mihost::layerFiles
 {
 
-/** @return nothing if there is no file */
+/** @return nothing if the file does not exist */
 std::optional<struct stat> statusOf(Descriptor const& root, std::string const& path);
 
 /** @return the target of a symbolic link */

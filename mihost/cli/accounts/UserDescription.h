@@ -25,7 +25,7 @@ enum class PasswordState {
 
 /** Days are counted from 1970. A day that will never come is missing. */
 struct PasswordAgeing {
-    std::optional<long> minDays; // numbers of days, as stored; missing if there is no limit
+    std::optional<long> minDays; // numbers of days, as stored; missing without a limit
     std::optional<long> maxDays;
     std::optional<long> warnDays;
     std::optional<long> inactiveDays;

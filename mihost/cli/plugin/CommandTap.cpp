@@ -71,7 +71,7 @@ private:
     Descriptor before_;
 };
 
-/** @return negative if there is no pipe: commands then share this program's standard error */
+/** @return negative without a pipe: commands then share this program's standard error */
 int standardErrorEnd()
 {
     try {

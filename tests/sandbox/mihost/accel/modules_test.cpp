@@ -132,7 +132,7 @@ std::string randomModule(std::mt19937& random)
 /**
  * Expects that an answer is what modinfo prints, and that there is none if modinfo prints an error.
  *
- * @return whether there is no answer although modinfo prints no error
+ * @return whether it does not answer although modinfo prints no error
  */
 bool isLeftOut(std::string const& name)
 {

@@ -1,5 +1,5 @@
-// Machines with other shells, tools, locales and zones: the accelerator does not answer, or it prints
-// what the tool of that machine prints.
+// Machines with other shells, tools, locales and zones: the accelerator does not answer, or it
+// prints what the tool of that machine prints.
 
 #include "TestPaths.h"
 #include "tests/support/ComparedLog.h"

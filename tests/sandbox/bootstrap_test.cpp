@@ -29,39 +29,31 @@ Outcome run(std::string const& script, std::string const& argument = "build")
     return runToEnd({"/bin/bash", scripts + script, argument});
 }
 
-TEST(Bootstrap, NamesFedorasPackagesThatAreMissing)
+TEST(Bootstrap, NamesThePackagesThatAreMissing)
 {
-    makeMachine(fedora, "cmake | gcc-c++ | json-devel");
-    Outcome const outcome = run("bootstrap");
-    EXPECT_EQ(outcome.code, 1);
-    EXPECT_EQ(outcome.err, "bootstrap: packages are missing (as root, run 'dnf install gcc-c++ "
-                           "cmake json-devel')\n");
-}
-
-TEST(Bootstrap, NamesOpensusesPackagesThatAreMissing)
-{
-    makeMachine(opensuse, "ninja | nlohmann_json-devel | shadow");
-    Outcome const outcome = run("bootstrap", "test");
-    EXPECT_EQ(outcome.code, 1);
-    EXPECT_EQ(outcome.err, "bootstrap: packages are missing (as root, run 'zypper install ninja "
-                           "nlohmann_json-devel shadow')\n");
-}
-
-TEST(Bootstrap, RecognisesAFamilyByIdLike)
-{
-    makeMachine("ID=\"rocky\"\nID_LIKE=\"rhel centos fedora\"\n", "fmt-devel");
-    EXPECT_EQ(run("bootstrap").err,
-              "bootstrap: packages are missing (as root, run 'dnf install fmt-devel')\n");
-}
-
-TEST(Bootstrap, NamesAPackageOnce)
-{
-    makeMachine(fedora, "clang-tools-extra"); // where Debian has two packages
-    EXPECT_EQ(run("bootstrap", "check").err,
-              "bootstrap: packages are missing (as root, run 'dnf install clang-tools-extra')\n");
-    makeMachine(opensuse, "clang"); // where Debian has three
-    EXPECT_EQ(run("bootstrap", "check").err,
-              "bootstrap: packages are missing (as root, run 'zypper install clang')\n");
+    struct Row {
+        std::string release;
+        char const* lacking;
+        char const* argument;
+        std::string command;
+    };
+    for (Row const& row : {
+             Row{fedora, "cmake | gcc-c++ | json-devel", "build",
+                 "dnf install gcc-c++ cmake json-devel"},
+             Row{opensuse, "ninja | nlohmann_json-devel | shadow", "test",
+                 "zypper install ninja nlohmann_json-devel shadow"},
+             Row{"ID=\"rocky\"\nID_LIKE=\"rhel centos fedora\"\n", "fmt-devel", "build",
+                 "dnf install fmt-devel"},
+             // Where Debian has two packages and three:
+             Row{fedora, "clang-tools-extra", "check", "dnf install clang-tools-extra"},
+             Row{opensuse, "clang", "check", "zypper install clang"},
+         }) {
+        makeMachine(row.release, row.lacking);
+        Outcome const outcome = run("bootstrap", row.argument);
+        EXPECT_EQ(outcome.code, 1) << row.command;
+        EXPECT_EQ(outcome.err,
+                  "bootstrap: packages are missing (as root, run '" + row.command + "')\n");
+    }
 }
 
 TEST(Bootstrap, SucceedsIfNoPackageIsMissing)

@@ -269,27 +269,20 @@ protected:
     }
 };
 
-TEST_P(Tools, DoNotEndThePlugin)
-{
-    liveAndLeaveNothing();
-}
-
-TEST_P(Tools, YieldNoLogEntries)
+TEST_P(Tools, MakeMethodsAndReadsFailButDoNotEndThePlugin)
 {
     Recording const recording;
     plugin.initialize();
     EXPECT_TRUE(plugin.nodes(IC::nodeType::logEntry).empty());
     EXPECT_FALSE(recording.texts(6000).empty());
-}
-
-// Also if a tool dies without output: the shell then prints a message.
-TEST_P(Tools, MakeTheMethodFail)
-{
-    plugin.initialize();
     IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
+    // Also if a tool dies without output: the shell then prints a message.
     for (char const* call :
          {"LocalGroupDel,GroupName:CMPI_string:none", "UserAdd,UserName:CMPI_string:new"})
         EXPECT_EQ(os.setProperty(IC::property::createUser, {call, true}).getStatus(), 1U) << call;
+    plugin.unload();
+    endpwent();
+    liveAndLeaveNothing();
 }
 
 TEST_F(Limits, DoNotApplyToALineOfMegabytesOfBlanks)

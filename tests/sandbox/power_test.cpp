@@ -12,109 +12,55 @@
 namespace power_test
 {
 
-class Power : public testing::Test
+struct Request {
+    char const* name;
+    IC::PropertyValue value;
+    char const* command;
+    char const* announcement;
+};
+
+class Power : public testing::TestWithParam<Request>
 {
-protected:
-    Power()
-    {
-        machine::recordShell();
-    }
+};
 
-    void expectRan(std::string const& command)
-    {
-        EXPECT_EQ(machine::ran(), Lines{command});
-        EXPECT_EQ(mihost::refusedPowerCommands(), Lines{command});
-    }
-
-    /** Calls a member function of NQ::OsInfo without arguments; the object has no members. */
-    bool call(char const* function)
-    {
-        auto* const member = reinterpret_cast<bool (*)(void*)>(plugin.symbol(function));
-        char info = 0;
-        return member(&info);
-    }
-
-    Recording recording;
+TEST_P(Power, RequestRunsTheCommandAndIsStored)
+{
+    machine::lay("plain");
     Plugin plugin;
-};
-
-TEST_F(Power, StatusOfflineHaltsTheMachine)
-{
-    EXPECT_TRUE(call("NQ::OsInfo::statusOffline()"));
-    expectRan("/sbin/shutdown -h now");
-    EXPECT_EQ(recording.texts(4000), Lines{"Halt after shutdown."});
+    plugin.initialize();
+    machine::recordShell();
+    Recording const recording;
+    IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
+    EXPECT_EQ(os.setProperty(IC::property::requestedState, GetParam().value).getStatus(), 0);
+    EXPECT_EQ(machine::ran(), Lines{GetParam().command});
+    EXPECT_EQ(mihost::refusedPowerCommands(), Lines{GetParam().command});
+    EXPECT_EQ(text(os, IC::property::requestedState), static_cast<std::string>(GetParam().value));
+    EXPECT_EQ(recording.texts(4000), Lines{GetParam().announcement});
 }
 
-TEST_F(Power, StatusResetRestartsTheMachine)
+INSTANTIATE_TEST_SUITE_P(All, Power,
+                         testing::Values(Request{"Restart",
+                                                 {IC::EnumValue(9U), true},
+                                                 "/sbin/shutdown -r now",
+                                                 "Reboot after shutdown."},
+                                         Request{"Halt",
+                                                 {IC::Number(12U), true},
+                                                 "/sbin/shutdown -h now",
+                                                 "Halt after shutdown."}),
+                         [](auto const& request) { return std::string(request.param.name); });
+
+TEST(PowerWithoutShutdown, IsStoredAfterACommandThatIsMissing)
 {
-    EXPECT_TRUE(call("NQ::OsInfo::statusReset()"));
-    expectRan("/sbin/shutdown -r now");
-    EXPECT_EQ(recording.texts(4000), Lines{"Reboot after shutdown."});
-}
-
-/** The operating-system node of a plain machine, nothing recorded yet. */
-class PowerRequest : public Power
-{
-protected:
-    PowerRequest()
-    {
-        machine::lay("plain");
-        plugin.initialize();
-        machine::forget();
-        recording.clear();
-    }
-
-    IC::MutableNode& os()
-    {
-        return plugin.node(IC::nodeType::operatingSystem);
-    }
-
-    unsigned char request(IC::PropertyValue const& value)
-    {
-        return os().setProperty(IC::property::requestedState, value).getStatus();
-    }
-};
-
-TEST_F(PowerRequest, OfTwelveHaltsTheMachineAndIsStored)
-{
-    EXPECT_EQ(request({IC::EnumValue(12U), true}), 0);
-    expectRan("/sbin/shutdown -h now");
-    EXPECT_EQ(text(os(), IC::property::requestedState), "12");
-    EXPECT_EQ(recording.texts(4000), Lines{"Halt after shutdown."});
-}
-
-TEST_F(PowerRequest, OfNineRestartsTheMachineAndIsStored)
-{
-    EXPECT_EQ(request({IC::EnumValue(9U), true}), 0);
-    expectRan("/sbin/shutdown -r now");
-    EXPECT_EQ(text(os(), IC::property::requestedState), "9");
-    EXPECT_EQ(recording.texts(4000), Lines{"Reboot after shutdown."});
-}
-
-TEST_F(PowerRequest, MayBeANumberOrAText)
-{
-    EXPECT_EQ(request({IC::Number(12U), true}), 0);
-    EXPECT_EQ(request({"9", true}), 0);
-    EXPECT_EQ(machine::ran(), (Lines{"/sbin/shutdown -h now", "/sbin/shutdown -r now"}));
-}
-
-TEST_F(PowerRequest, OfAnyOtherNumberIsOnlyStored)
-{
-    for (unsigned int const number : {0U, 1U, 5U, 8U, 10U, 11U, 13U, 4294967295U}) {
-        EXPECT_EQ(request({IC::EnumValue(number), true}), 0);
-        EXPECT_EQ(text(os(), IC::property::requestedState), std::to_string(number));
-    }
-    EXPECT_EQ(machine::ran(), Lines());
-    EXPECT_EQ(mihost::refusedPowerCommands(), Lines());
-    EXPECT_EQ(recording.texts(4000), Lines());
-}
-
-TEST_F(PowerRequest, IsStoredEvenIfThereIsNoShutdownCommand)
-{
+    machine::lay("plain");
+    Plugin plugin;
+    plugin.initialize();
     machine::remove("/sbin/shutdown");
-    EXPECT_EQ(request({IC::EnumValue(12U), true}), 0);
+    machine::recordShell();
+    IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
+    EXPECT_EQ(os.setProperty(IC::property::requestedState, {IC::EnumValue(12U), true}).getStatus(),
+              0);
     EXPECT_EQ(machine::ran(), Lines{"/sbin/shutdown -h now"});
-    EXPECT_EQ(text(os(), IC::property::requestedState), "12");
+    EXPECT_EQ(text(os, IC::property::requestedState), "12");
 }
 
 } // namespace power_test

@@ -5,6 +5,7 @@
 #include "mihost/sandbox/Sandbox.h"
 
 #include <algorithm>
+#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <sstream>
@@ -126,6 +127,30 @@ void write(std::string const& path, std::string const& text, mode_t mode)
 void fake(std::string const& program, std::string const& script)
 {
     write(program, "#!/bin/sh\n" + script, 0755);
+}
+
+void writeIdRanges()
+{
+    write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+}
+
+void run(std::string const& line)
+{
+    expectSandbox();
+    if (std::system(line.c_str()) != 0)
+        throw std::runtime_error("failed: " + line);
+}
+
+Outcome mihostRunAsUser(std::vector<std::string> arguments, std::string const& input)
+{
+    expectSandbox();
+    // The build may be in a directory of root only.
+    for (fs::path folder = fs::path(MIHOST_FILE).parent_path(); folder != "/";
+         folder = folder.parent_path())
+        permissions(folder, fs::perms::group_exec | fs::perms::others_exec, fs::perm_options::add);
+    arguments.insert(arguments.begin(),
+                     {"/usr/bin/setpriv", "--reuid=65534", "--clear-groups", MIHOST_FILE});
+    return runToEnd(arguments, input);
 }
 
 void remove(std::string const& path)

@@ -1,6 +1,8 @@
 #ifndef TESTS_SUPPORT_MACHINE_H
 #define TESTS_SUPPORT_MACHINE_H
 
+#include "tests/support/Program.h"
+
 #include <string>
 #include <sys/types.h>
 #include <vector>
@@ -39,6 +41,15 @@ void write(std::string const& path, std::string const& text, mode_t mode = 0644)
 
 /** Replaces a program by a shell script, given without its first line. */
 void fake(std::string const& program, std::string const& script);
+
+/** Makes ids from 1000 to 60000 those of ordinary accounts and groups. */
+void writeIdRanges();
+
+/** Runs a command line. @throws std::runtime_error unless it succeeds */
+void run(std::string const& line);
+
+/** Runs mihost as a user without privileges. */
+Outcome mihostRunAsUser(std::vector<std::string> arguments, std::string const& input = "");
 
 /** Removes a file if it exists. */
 void remove(std::string const& path);

@@ -6,6 +6,7 @@
 #include <array>
 #include <cstdio>
 #include <memory>
+#include <ostream>
 #include <stdexcept>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -44,6 +45,28 @@ std::string textOf(File const& file)
 
 } // namespace
 
+bool operator==(Outcome const& one, Outcome const& other)
+{
+    return one.code == other.code && one.out == other.out && one.err == other.err;
+}
+
+std::ostream& operator<<(std::ostream& out, Outcome const& outcome)
+{
+    return out << "exit code " << outcome.code << "\n--- standard output\n"
+               << outcome.out << "--- standard error\n"
+               << outcome.err;
+}
+
+Outcome printed(std::string const& out)
+{
+    return {0, out, ""};
+}
+
+Outcome failed(int code, std::string const& message)
+{
+    return {code, "", "mihost: " + message + "\n"};
+}
+
 Outcome runToEnd(std::vector<std::string> const& arguments, std::string const& input)
 {
     File const in = fileOf(input);
@@ -76,4 +99,9 @@ Outcome mihostRun(std::vector<std::string> arguments, std::string const& input)
 {
     arguments.insert(arguments.begin(), MIHOST_FILE);
     return runToEnd(arguments, input);
+}
+
+Outcome bashRun(std::string const& line, std::string const& input)
+{
+    return runToEnd({"/bin/bash", "-c", "mihost=$1; " + line, "bash", MIHOST_FILE}, input);
 }

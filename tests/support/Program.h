@@ -1,6 +1,7 @@
 #ifndef TESTS_SUPPORT_PROGRAM_H
 #define TESTS_SUPPORT_PROGRAM_H
 
+#include <iosfwd>
 #include <string>
 #include <vector>
 
@@ -10,6 +11,15 @@ struct Outcome {
     std::string out;
     std::string err;
 };
+
+bool operator==(Outcome const& one, Outcome const& other);
+std::ostream& operator<<(std::ostream& out, Outcome const& outcome);
+
+/** The outcome of a program that succeeds and prints only this. */
+Outcome printed(std::string const& out);
+
+/** The outcome of mihost if it fails and prints only this message. */
+Outcome failed(int code, std::string const& message);
 
 /**
  * Runs a program to its end. A message of mihost that is not in the usual form fails the test.
@@ -21,5 +31,8 @@ Outcome runToEnd(std::vector<std::string> const& arguments, std::string const& i
 
 /** Runs mihost with the plug-in of the same build. */
 Outcome mihostRun(std::vector<std::string> arguments, std::string const& input = "");
+
+/** Runs a line in bash, with mihost's path in the variable $mihost. */
+Outcome bashRun(std::string const& line, std::string const& input = "");
 
 #endif

@@ -4,6 +4,8 @@
 
 #include <csignal>
 #include <cstdlib>
+#include <sched.h>
+#include <sys/mount.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -50,6 +52,19 @@ void Caller::say(std::string const& text)
         _exit(refused);
 }
 
+void Caller::sayAndWait()
+{
+    say(".");
+    for (;;)
+        pause();
+}
+
+void Caller::sayWorkingDirectory()
+{
+    char path[4096] = "";
+    say(getcwd(path, sizeof path) ? path : "none");
+}
+
 std::string Caller::hear(std::size_t length)
 {
     std::string text(length, '\0');
@@ -82,6 +97,30 @@ int Caller::wait()
     int status = 0;
     waitpid(std::exchange(process_, -1), &status, 0);
     return status;
+}
+
+void ownMounts()
+{
+    if (unshare(CLONE_NEWNS) != 0 ||
+        mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0)
+        _exit(1);
+}
+
+void mountOwnDisk(std::string const& path)
+{
+    ownMounts();
+    if (mount("tmpfs", path.c_str(), "tmpfs", 0, "") != 0)
+        _exit(1);
+}
+
+void continueInChild(std::function<void()> const& atItsEnd)
+{
+    if (pid_t const child = fork()) {
+        int status = 0;
+        waitpid(child, &status, 0);
+        atItsEnd();
+        _exit(WEXITSTATUS(status));
+    }
 }
 
 bool exists(std::string const& path)

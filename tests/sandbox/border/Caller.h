@@ -35,6 +35,12 @@ public:
     /** Sends text to the test, from inside. */
     static void say(std::string const& text);
 
+    /** Says "." from inside, then waits for signals. */
+    [[noreturn]] static void sayAndWait();
+
+    /** Says from inside what the working directory is. */
+    static void sayWorkingDirectory();
+
     /** Reads as many bytes; fewer if every process of the copy is gone before. */
     std::string hear(std::size_t length);
 
@@ -52,6 +58,15 @@ private:
     mihost::Descriptor readEnd_;
     pid_t process_;
 };
+
+/** Gives the calling process its own mounts, which no other process sees. */
+void ownMounts();
+
+/** The same, with an empty file system there. */
+void mountOwnDisk(std::string const& path);
+
+/** Continues in a child, and lets this process run the step and end as the child did. */
+void continueInChild(std::function<void()> const& atItsEnd);
 
 /** Whether anything is there, even a dangling link. */
 bool exists(std::string const& path);

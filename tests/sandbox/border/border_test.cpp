@@ -11,7 +11,6 @@
 #include <fstream>
 #include <net/if.h>
 #include <netinet/in.h>
-#include <sched.h>
 #include <sys/mount.h>
 #include <sys/shm.h>
 #include <sys/socket.h>
@@ -43,93 +42,49 @@ bool wrote(std::string const& path, std::string const& text)
     return contentOf(path) == text;
 }
 
-/** Gives the calling process its own mounts, which no other process sees. */
-void ownMounts()
-{
-    if (unshare(CLONE_NEWNS) != 0 ||
-        mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0)
-        _exit(1);
-}
-
-[[noreturn]] void waitForSignals()
-{
-    for (;;)
-        pause();
-}
-
 class Border : public BorderTest
 {
 };
 
-TEST_F(Border, WritesInsideDoNotReachTheMachinesFiles)
+TEST_F(Border, ChangesInsideDoNotReachTheMachinesFiles)
 {
     ScratchFolder const folder;
-    folder.write("file", "before");
-    Caller caller([&folder] { return wrote(folder.path("file"), "after") ? 0 : 1; });
-    EXPECT_EQ(caller.wait(), 0);
-    EXPECT_EQ(contentOf(folder.path("file")), "before");
-}
-
-TEST_F(Border, NewFilesInsideDoNotShowOnTheMachine)
-{
+    folder.write("changed", "before");
+    folder.write("removed", "before");
+    std::string const accounts = contentOf("/etc/passwd");
     std::string const name = "/oswmi-border-" + std::to_string(getpid());
-    Caller caller([&name] {
-        for (char const* folder : {"/etc", "/tmp", "/var/tmp", "/dev/shm", "/run", "/root"})
-            if (!wrote(folder + name, "new"))
+    Lines const folders = {"/etc", "/tmp", "/var/tmp", "/dev/shm", "/run", "/root"};
+    Caller caller([&] {
+        for (std::string const& path : folders)
+            if (!wrote(path + name, "new"))
                 return 1;
-        return 0;
+        if (!wrote(folder.path("changed"), "after"))
+            return 2;
+        if (unlink(folder.path("removed").c_str()) != 0 || exists(folder.path("removed")))
+            return 3;
+        return system("/usr/sbin/useradd -M oswmiborder") == 0 ? 0 : 4;
     });
     EXPECT_EQ(caller.wait(), 0);
-    for (char const* folder : {"/etc", "/tmp", "/var/tmp", "/dev/shm", "/run", "/root"})
-        EXPECT_FALSE(exists(folder + name)) << folder;
-}
-
-TEST_F(Border, FilesRemovedInsideStayOnTheMachine)
-{
-    ScratchFolder const folder;
-    folder.write("file", "before");
-    Caller caller([&folder] {
-        return unlink(folder.path("file").c_str()) == 0 && !exists(folder.path("file")) ? 0 : 1;
-    });
-    EXPECT_EQ(caller.wait(), 0);
-    EXPECT_TRUE(exists(folder.path("file")));
-}
-
-TEST_F(Border, AccountsMadeInsideDoNotShowOnTheMachine)
-{
-    std::string const before = contentOf("/etc/passwd");
-    Caller caller([] { return system("/usr/sbin/useradd -M oswmiborder") == 0 ? 0 : 1; });
-    EXPECT_EQ(caller.wait(), 0);
-    EXPECT_EQ(contentOf("/etc/passwd"), before);
+    for (std::string const& path : folders)
+        EXPECT_FALSE(exists(path + name)) << path;
+    EXPECT_EQ(contentOf(folder.path("changed")), "before");
+    EXPECT_EQ(contentOf(folder.path("removed")), "before");
+    EXPECT_EQ(contentOf("/etc/passwd"), accounts);
 }
 
 TEST_F(Border, MountsOfTheMachineAreUnchangedDuringACopy)
 {
     std::string const before = mountTable();
     Caller caller([]() -> int {
-        Caller::say(".");
-        waitForSignals();
-    });
-    ASSERT_EQ(caller.hear(1), ".");
-    EXPECT_EQ(mountTable(), before);
-    caller.send(SIGTERM);
-    caller.wait();
-    EXPECT_EQ(mountTable(), before);
-}
-
-TEST_F(Border, MountsMadeInsideDoNotShowOnTheMachine)
-{
-    std::string const before = mountTable();
-    Caller caller([]() -> int {
         if (mount("tmpfs", "/mnt", "tmpfs", 0, "") != 0)
             return 1;
-        Caller::say(".");
-        waitForSignals();
+        Caller::sayAndWait();
     });
     ASSERT_EQ(caller.hear(1), ".");
     EXPECT_EQ(mountTable(), before);
     caller.send(SIGTERM);
     caller.wait();
+    EXPECT_EQ(mountTable(), before);
 }
 
 TEST_F(Border, ACrashInsideLeavesNothingAndIsReported)
@@ -140,7 +95,7 @@ TEST_F(Border, ACrashInsideLeavesNothingAndIsReported)
     Caller caller([&folder]() -> int {
         wrote(folder.path("file"), "after");
         if (fork() == 0)
-            waitForSignals();
+            pause();
         abort();
     });
     EXPECT_EQ(caller.hearAll(), ""); // ends once the forgotten process has gone, too
@@ -165,10 +120,7 @@ class ForwardedSignals : public BorderTest, public testing::WithParamInterface<i
 
 TEST_P(ForwardedSignals, EndTheSandboxedProcessAndTheCaller)
 {
-    Caller caller([]() -> int {
-        Caller::say(".");
-        waitForSignals();
-    });
+    Caller caller([]() -> int { Caller::sayAndWait(); });
     ASSERT_EQ(caller.hear(1), ".");
     caller.send(GetParam());
     EXPECT_EQ(caller.hearAll(), "");
@@ -181,8 +133,7 @@ TEST_P(ForwardedSignals, CanBeHandledInside)
 {
     Caller caller([]() -> int {
         std::signal(GetParam(), [](int) { _exit(5); });
-        Caller::say(".");
-        waitForSignals();
+        Caller::sayAndWait();
     });
     ASSERT_EQ(caller.hear(1), ".");
     caller.send(GetParam());
@@ -203,8 +154,7 @@ TEST_F(Border, ATerminalsInterruptReachesTheSandboxedProcessOnce)
     Caller caller(
         []() -> int {
             std::signal(SIGINT, [](int) { Caller::say("i"); });
-            Caller::say(".");
-            waitForSignals();
+            Caller::sayAndWait();
         },
         "",
         [&name] {
@@ -226,8 +176,7 @@ TEST_F(Border, EverythingInsideDiesWithTheCaller)
     Caller caller([]() -> int {
         for (int const signal : {SIGHUP, SIGINT, SIGQUIT, SIGTERM, SIGUSR1, SIGUSR2})
             std::signal(signal, SIG_IGN);
-        Caller::say(".");
-        waitForSignals();
+        Caller::sayAndWait();
     });
     ASSERT_EQ(caller.hear(1), ".");
     caller.send(SIGKILL);
@@ -268,8 +217,7 @@ TEST_F(Border, SharedMemoryMadeInsideDoesNotShowOnTheMachine)
     Caller caller([key]() -> int {
         if (shmget(key, 4096, IPC_CREAT | IPC_EXCL | 0600) < 0)
             return 1;
-        Caller::say(".");
-        waitForSignals();
+        Caller::sayAndWait();
     });
     ASSERT_EQ(caller.hear(1), ".");
     EXPECT_LT(shmget(key, 4096, 0600), 0);
@@ -343,19 +291,13 @@ TEST_F(Border, OtherFileSystemsAreCopiedOnWriteToo)
         "",
         [&folder, &file] {
             folder.write("disk/none", "");
-            ownMounts();
             std::string const disk = folder.path("disk");
-            mount("tmpfs", disk.c_str(), "tmpfs", 0, "");
+            mountOwnDisk(disk);
             folder.write("disk/sub folder,:\\/file", "outer");
             mount("tmpfs", (disk + "/sub folder,:\\").c_str(), "tmpfs", 0, "");
             folder.write("disk/sub folder,:\\/file", "before");
-            // From here on, the machine is what this process sees; it checks it at the end.
-            if (pid_t const child = fork()) {
-                int status = 0;
-                waitpid(child, &status, 0);
-                Caller::say(" " + contentOf(file));
-                _exit(WEXITSTATUS(status));
-            }
+            // From here on, the machine is what this process sees.
+            continueInChild([&file] { Caller::say(" " + contentOf(file)); });
         });
     EXPECT_EQ(caller.hearAll(), "before before");
     EXPECT_EQ(caller.wait(), 0);
@@ -373,9 +315,9 @@ TEST_F(Border, ShowsAnUnsuitableFileSystemReadOnly)
         "",
         [&folder, &disk] {
             folder.write("disk/none", "");
-            ownMounts();
+            mountOwnDisk(disk);
             // Overlays can be stacked, but only a few deep.
-            if (mount("tmpfs", disk.c_str(), "tmpfs", 0, "") != 0 || chdir(disk.c_str()) != 0)
+            if (chdir(disk.c_str()) != 0)
                 _exit(1);
             for (char const* part : {"0", "1", "2", "u1", "u2", "w1", "w2"})
                 mkdir(part, 0755);
@@ -422,8 +364,7 @@ TEST_F(Border, KeepsTheWorkingDirectory)
     ScratchFolder const folder;
     Caller caller(
         [] {
-            char path[4096] = "";
-            Caller::say(getcwd(path, sizeof path) ? path : "none");
+            Caller::sayWorkingDirectory();
             return 0;
         },
         "",
@@ -438,14 +379,12 @@ TEST_F(Border, GoesToTheRootIfTheCopyLacksTheWorkingDirectory)
 {
     Caller caller(
         [] {
-            char path[4096] = "";
-            Caller::say(getcwd(path, sizeof path) ? path : "none");
+            Caller::sayWorkingDirectory();
             return 0;
         },
         "",
         [] {
-            ownMounts();
-            mount("tmpfs", "/run", "tmpfs", 0, "");
+            mountOwnDisk("/run");
             mkdir("/run/folder", 0700);
             if (chdir("/run/folder") != 0)
                 _exit(1);

@@ -6,10 +6,6 @@
 
 #include <filesystem>
 #include <fstream>
-#include <sched.h>
-#include <sys/mount.h>
-#include <sys/stat.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 namespace chroot_test
@@ -40,8 +36,7 @@ TEST_F(Chroot, IsCopiedOnWrite)
 {
     Caller caller(
         [] {
-            char path[4096] = "";
-            Caller::say(getcwd(path, sizeof path) ? path : "none");
+            Caller::sayWorkingDirectory();
             Caller::say(contentOf("file"));
             std::ofstream("/etc/file") << "after";
             std::ofstream("/tmp/new") << "new";
@@ -67,19 +62,11 @@ TEST_F(Chroot, IsCopiedWithItsMounts)
         },
         "",
         [this] {
-            if (unshare(CLONE_NEWNS) != 0 ||
-                mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0 ||
-                mount("tmpfs", root_.path("disk").c_str(), "tmpfs", 0, "") != 0)
-                _exit(1);
+            mountOwnDisk(root_.path("disk"));
             root_.write("disk/file", "before");
             enter();
-            // From here on, the machine is what this process sees; it checks it at the end.
-            if (pid_t const child = fork()) {
-                int status = 0;
-                waitpid(child, &status, 0);
-                Caller::say(" " + contentOf("/disk/file"));
-                _exit(WEXITSTATUS(status));
-            }
+            // From here on, the machine is what this process sees.
+            continueInChild([] { Caller::say(" " + contentOf("/disk/file")); });
         });
     EXPECT_EQ(caller.hearAll(), "before before");
     EXPECT_EQ(caller.wait(), 0);
@@ -88,13 +75,7 @@ TEST_F(Chroot, IsCopiedWithItsMounts)
 TEST_F(Chroot, DoesNotChangeTheMountsOfTheMachine)
 {
     std::string const before = contentOf("/proc/self/mountinfo");
-    Caller caller(
-        []() -> int {
-            Caller::say(".");
-            for (;;)
-                pause();
-        },
-        "", [this] { enter(); });
+    Caller caller([]() -> int { Caller::sayAndWait(); }, "", [this] { enter(); });
     ASSERT_EQ(caller.hear(1), ".");
     EXPECT_EQ(contentOf("/proc/self/mountinfo"), before);
 }

@@ -83,8 +83,11 @@ TEST_F(Overlay, ReplacesFilesAndLinksOfTheMachine)
 {
     folder.write("etc/passwd", "root:x:0:0::/root:/bin/sh\n");
     folder.write("etc/mtab", "none"); // a link on most machines
-    EXPECT_EQ(laid({"/etc/passwd", "/etc/mtab"}),
-              "644 0:0 root:x:0:0::/root:/bin/sh\n\n644 0:0 none\n");
+    folder.write("run/oswmi", "run");
+    folder.write("dev/shm/oswmi", "shm");
+    EXPECT_EQ(laid({"/etc/passwd", "/etc/mtab", "/run/oswmi", "/dev/shm/oswmi"}),
+              "644 0:0 root:x:0:0::/root:/bin/sh\n\n644 0:0 none\n"
+              "644 0:0 run\n644 0:0 shm\n");
 }
 
 TEST_F(Overlay, KeepsSymbolicLinks)
@@ -112,21 +115,11 @@ TEST_F(Overlay, FollowsTheMachinesLinksToDirectories)
 TEST_F(Overlay, MakesWorldReadableShadowFilesPrivate)
 {
     chmod(folder.write("etc/shadow", "").c_str(), 0644);
-    chmod(folder.write("etc/gshadow", "").c_str(), 0604);
-    EXPECT_EQ(laid({"/etc/shadow", "/etc/gshadow"}), "600 0:0 \n600 0:0 \n");
-}
-
-TEST_F(Overlay, KeepsOtherModesOfShadowFiles)
-{
-    chmod(folder.write("etc/shadow", "").c_str(), 0640);
-    EXPECT_EQ(laid({"/etc/shadow"}), "640 0:0 \n");
-}
-
-TEST_F(Overlay, ReplacesFilesInTemporaryAndRunDirectories)
-{
-    folder.write("run/oswmi", "run");
-    folder.write("dev/shm/oswmi", "shm");
-    EXPECT_EQ(laid({"/run/oswmi", "/dev/shm/oswmi"}), "644 0:0 run\n644 0:0 shm\n");
+    chmod(folder.write("etc/gshadow", "").c_str(), 0640);
+    EXPECT_EQ(laid({"/etc/shadow", "/etc/gshadow"}), "600 0:0 \n640 0:0 \n");
+    chmod(folder.path("etc/shadow").c_str(), 0640);
+    chmod(folder.path("etc/gshadow").c_str(), 0604);
+    EXPECT_EQ(laid({"/etc/shadow", "/etc/gshadow"}), "640 0:0 \n600 0:0 \n");
 }
 
 TEST_F(Overlay, DoesNotRestoreThePowerCommands)
@@ -135,18 +128,12 @@ TEST_F(Overlay, DoesNotRestoreThePowerCommands)
     EXPECT_NE(laid({"/sbin/shutdown"}), "755 0:0 the real one\n");
 }
 
-TEST_F(Overlay, IsRefusedWithTheReasonIfItIsMissing)
+TEST_F(Overlay, IsRefusedIfItIsMissingOrAFile)
 {
-    EXPECT_EQ(reason(folder.path("missing")), "cannot open the directory " +
-                                                  folder.path("missing") +
-                                                  ": No such file or directory");
-}
-
-TEST_F(Overlay, IsRefusedWithTheReasonForAFile)
-{
+    std::string const path = folder.path("file");
+    EXPECT_EQ(reason(path), "cannot open the directory " + path + ": No such file or directory");
     folder.write("file", "");
-    EXPECT_EQ(reason(folder.path("file")),
-              "cannot open the directory " + folder.path("file") + ": Not a directory");
+    EXPECT_EQ(reason(path), "cannot open the directory " + path + ": Not a directory");
 }
 
 TEST_F(Overlay, RefusesOtherThanFilesLinksAndDirectories)

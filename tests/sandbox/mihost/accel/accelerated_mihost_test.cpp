@@ -1,6 +1,7 @@
 // mihost shows and logs the same with and without the accelerator.
 
 #include "TestPaths.h"
+#include "tests/support/Holds.h"
 #include "tests/support/KernelModules.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
@@ -65,7 +66,7 @@ TEST_F(MihostAccel, ShowsAndTracesTheSameAsWithoutIt)
     EXPECT_EQ(plain.code, 0) << plain.err;
     EXPECT_EQ(fast.code, 0) << fast.err;
     EXPECT_EQ(fast.out, plain.out);
-    EXPECT_EQ(plain.err.find("answer"), std::string::npos) << plain.err;
+    EXPECT_FALSE(holds(plain.err, "answer"));
     EXPECT_EQ(Json::parse(fast.out).size(), moduleCount + 1U);
     Lines const expected = traceLines("/tmp/plain");
     EXPECT_GT(expected.size(), 5000U);
@@ -100,19 +101,19 @@ TEST_F(MihostAccel, SaysWhyItRunsCommandsUnlessTurnedOff)
                                            "driver-name"};
     machine::fake("/usr/sbin/lsmod", "echo 'Module Size Used'\necho 'module_7 1 0'\n");
     Outcome run = mihostRun(command);
-    EXPECT_NE(run.out.find("module_7"), std::string::npos) << run.out;
-    EXPECT_EQ(run.out.find("module_8"), std::string::npos) << run.out;
+    EXPECT_TRUE(holds(run.out, "module_7"));
+    EXPECT_FALSE(holds(run.out, "module_8"));
     char const* const reason = "lsmod                         0 answered      1 run: "
                                "the shell or the tool is a script\n";
-    EXPECT_NE(run.err.find(reason), std::string::npos) << run.err;
+    EXPECT_TRUE(holds(run.err, reason));
     machine::remove(ACCEL_FILE);
     run = mihostRun(command);
     EXPECT_EQ(run.code, 0);
-    EXPECT_NE(run.err.find(" run: libmiaccel.so.0: "), std::string::npos) << run.err;
-    EXPECT_NE(run.err.find("\nall                           0 answered "), std::string::npos);
+    EXPECT_TRUE(holds(run.err, " run: libmiaccel.so.0: "));
+    EXPECT_TRUE(holds(run.err, "\nall                           0 answered "));
     run = mihostRun({"--timing", "--no-accel", "get", "os", "os-name"});
     EXPECT_EQ(run.code, 0);
-    EXPECT_EQ(run.err.find("answered"), std::string::npos) << run.err;
+    EXPECT_FALSE(holds(run.err, "answered"));
 }
 
 } // namespace accelerated_mihost_test

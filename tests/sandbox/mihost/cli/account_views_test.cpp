@@ -1,19 +1,16 @@
 // `mihost user NAME` and `mihost group NAME`, at a terminal and in a pipe.
 
-#include "TestPaths.h"
+#include "tests/support/Holds.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "tests/support/MihostJson.h"
 #include "tests/support/TerminalRun.h"
 
 #include <ctime>
 #include <gtest/gtest.h>
-#include <nlohmann/json.hpp>
 
 namespace account_views_test
 {
-
-using Json = nlohmann::ordered_json;
 
 /** Accounts whose passwords were changed ten days ago. */
 class AccountViews : public testing::Test
@@ -22,8 +19,7 @@ protected:
     AccountViews()
     {
         machine::lay("plain");
-        machine::write("/etc/login.defs",
-                       "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+        machine::writeIdRanges();
         machine::write("/etc/passwd", "root:x:0:0:Super:/root:/bin/sh\n"
                                       "jdoe:x:1000:1000:J. Doe:/home/jdoe:/bin/sh\n"
                                       "nobody:x:65534:65534:\x1b[2J:/none:/usr/sbin/nologin\n");
@@ -36,11 +32,6 @@ protected:
         machine::write("/etc/pam.d/login", "auth required pam_tally2.so deny=3\n");
     }
 };
-
-bool holds(std::string const& text, std::string const& part)
-{
-    return text.find(part) != std::string::npos;
-}
 
 TEST_F(AccountViews, ShowOneUserAsText)
 {
@@ -62,15 +53,15 @@ TEST_F(AccountViews, ShowOneUserAsText)
              "Login failures        3 allowed\n",
              "Node                  user:jdoe\n",
          })
-        EXPECT_TRUE(holds(outcome.out, line)) << line << outcome.out;
-    EXPECT_TRUE(holds(outcome.out, " (10 days ago)\n")) << outcome.out;
-    EXPECT_TRUE(holds(outcome.out, " (in 12 days)\n")) << outcome.out;
-    EXPECT_FALSE(holds(outcome.out, "hash")) << outcome.out;
+        EXPECT_TRUE(holds(outcome.out, line));
+    EXPECT_TRUE(holds(outcome.out, " (10 days ago)\n"));
+    EXPECT_TRUE(holds(outcome.out, " (in 12 days)\n"));
+    EXPECT_FALSE(holds(outcome.out, "hash"));
 }
 
 TEST_F(AccountViews, ShowOneUserAsJson)
 {
-    Json const user = Json::parse(mihostRun({"--json", "user", "jdoe"}).out);
+    Json const user = mihostJson({"user", "jdoe"});
     EXPECT_EQ(user["uid"], 1000);
     EXPECT_EQ(user["primary-group"], (Json{{"name", "jdoe"}, {"gid", 1000}}));
     EXPECT_EQ(user["other-groups"], Json::array({{{"name", "crew"}, {"gid", 1001}}}));
@@ -93,12 +84,11 @@ TEST_F(AccountViews, SayWhyAnAccountHasNoNode)
     Outcome const outcome = mihostRun({"user", "nobody"});
     EXPECT_EQ(outcome.code, 0);
     EXPECT_TRUE(holds(outcome.out, "Node                  none: uid 65534 is above UID_MAX "
-                                   "60000\n"))
-        << outcome.out;
+                                   "60000\n"));
     EXPECT_TRUE(holds(outcome.out, "Primary group         65534 (no group has this id)\n"));
     EXPECT_EQ(outcome.err, "mihost: reading passwords and ageing: 'nobody' has no entry in "
                            "/etc/shadow, so some values are unknown (see 'mihost doctor')\n");
-    Json const user = Json::parse(mihostRun({"--json", "user", "nobody"}).out);
+    Json const user = mihostJson({"user", "nobody"});
     EXPECT_EQ(user["node"], nullptr);
     EXPECT_EQ(user["no-node"], "uid 65534 is above UID_MAX 60000");
     EXPECT_EQ(user["state"], nullptr);
@@ -115,20 +105,17 @@ TEST_F(AccountViews, ShowOneGroupAsTextAndAsJson)
                            "Other members     jdoe, gone (no such local account)\n"
                            "Node              group:crew\n");
     EXPECT_EQ(outcome.code, 0);
-    Json const group = Json::parse(mihostRun({"--json", "group", "jdoe"}).out);
+    Json const group = mihostJson({"group", "jdoe"});
     EXPECT_EQ(group["primary-group-of"], Json::array({"jdoe"}));
     EXPECT_EQ(group["other-members"], Json::array());
 }
 
 TEST_F(AccountViews, ExitWith4ForAnUnknownName)
 {
-    Outcome const user = mihostRun({"user", "jdeo"});
-    EXPECT_EQ(user.code, 4);
-    EXPECT_EQ(user.out, "");
-    EXPECT_EQ(user.err, "mihost: no local user 'jdeo' (did you mean 'jdoe'?)\n");
-    Outcome const group = mihostRun({"group", "xyz"});
-    EXPECT_EQ(group.code, 4);
-    EXPECT_EQ(group.err, "mihost: no local group 'xyz' (see 'mihost list groups')\n");
+    EXPECT_EQ(mihostRun({"user", "jdeo"}),
+              failed(4, "no local user 'jdeo' (did you mean 'jdoe'?)"));
+    EXPECT_EQ(mihostRun({"group", "xyz"}),
+              failed(4, "no local group 'xyz' (see 'mihost list groups')"));
 }
 
 TEST_F(AccountViews, ShowNoControlCharactersAtATerminal)
@@ -136,17 +123,16 @@ TEST_F(AccountViews, ShowNoControlCharactersAtATerminal)
     TerminalRun run({"user", "nobody"});
     EXPECT_EQ(run.end(), 0);
     EXPECT_FALSE(holds(run.output(), "\x1b[2J"));
-    EXPECT_TRUE(holds(run.output(), "UID                   65534\r\n")) << run.output();
+    EXPECT_TRUE(holds(run.output(), "UID                   65534\r\n"));
 }
 
 TEST_F(AccountViews, SayWhatOnlyRootCanRead)
 {
-    Outcome const outcome = runToEnd(
-        {"/usr/bin/setpriv", "--reuid=65534", "--clear-groups", MIHOST_FILE, "user", "jdoe"});
+    Outcome const outcome = machine::mihostRunAsUser({"user", "jdoe"});
     EXPECT_EQ(outcome.code, 0);
-    EXPECT_TRUE(holds(outcome.out, "State                 -\n")) << outcome.out;
-    EXPECT_TRUE(holds(outcome.out, "Account expires       -\n")) << outcome.out;
-    EXPECT_TRUE(holds(outcome.err, "/etc/shadow cannot be read: Permission denied")) << outcome.err;
+    EXPECT_TRUE(holds(outcome.out, "State                 -\n"));
+    EXPECT_TRUE(holds(outcome.out, "Account expires       -\n"));
+    EXPECT_TRUE(holds(outcome.err, "/etc/shadow cannot be read: Permission denied"));
 }
 
 } // namespace account_views_test

@@ -59,7 +59,7 @@ std::vector<std::pair<Lines, std::string>> allHelp(Lines const& command)
 void makeMachineOfTheExamples()
 {
     machine::lay("plain");
-    machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+    machine::writeIdRanges();
     machine::write("/etc/release", "Example Linux\nVERSION = 1\nPATCHLEVEL = 0\n");
     machine::write("/root/secret", "Secret-1\n", 0600);
     machine::write("/etc/shells", "/bin/sh\n/bin/bash\n");

@@ -1,6 +1,5 @@
 // One mihost at a time changes the machine.
 
-#include "TestPaths.h"
 #include "mihost/cli/change/ChangeLock.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
@@ -26,9 +25,8 @@ protected:
     MihostLock()
     {
         machine::lay("plain");
-        machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\n"
-                                          "GID_MAX 60000\n");
-        EXPECT_EQ(std::system("/usr/sbin/useradd -M jdoe"), 0);
+        machine::writeIdRanges();
+        machine::run("/usr/sbin/useradd -M jdoe");
     }
 
     /** Holds the lock like another mihost during a change. */
@@ -50,12 +48,10 @@ TEST_F(MihostLock, IsNeededByEveryChange)
           Lines{"set", "os", "create-user", "LocalGroupAdd,GroupName:CMPI_string:crew"},
           Lines{"set", "os", "clear-log", "9"}, Lines{"set", "os", "requested-state", "12"}}) {
         arguments.insert(arguments.begin(), {"--yes", "--lock-timeout", "0"});
-        Outcome const outcome = mihostRun(arguments);
-        EXPECT_EQ(outcome.code, 1);
-        EXPECT_EQ(outcome.out, "");
-        EXPECT_EQ(outcome.err, "mihost: waiting for the change lock: another mihost still holds it "
-                               "(try again, or raise --lock-timeout; 'fuser "
-                               "/run/mihost.lock' shows the process)\n");
+        EXPECT_EQ(mihostRun(arguments),
+                  failed(1, "waiting for the change lock: another mihost still holds it "
+                            "(try again, or raise --lock-timeout; 'fuser "
+                            "/run/mihost.lock' shows the process)"));
     }
     EXPECT_EQ(machine::entry("/etc/group", "crew"), Lines());
     EXPECT_EQ(machine::read("/etc/shadow"), shadow);
@@ -97,7 +93,7 @@ TEST_F(MihostLock, KeepsEveryMembershipThatIsAddedAtTheSameTime)
 {
     Lines const groups = {"ga", "gb", "gc", "gd", "ge", "gf"};
     for (std::string const& group : groups)
-        ASSERT_EQ(std::system(("groupadd " + group).c_str()), 0);
+        machine::run("groupadd " + group);
     std::vector<pid_t> children;
     for (std::string const& group : groups) {
         pid_t const child = fork();
@@ -118,17 +114,10 @@ TEST_F(MihostLock, KeepsEveryMembershipThatIsAddedAtTheSameTime)
 
 TEST_F(MihostLock, ReportsThatItNeedsRoot)
 {
-    auto const asNobody = [](Lines arguments) {
-        arguments.insert(arguments.begin(), {"/usr/bin/setpriv", "--reuid=65534", "--regid=65534",
-                                             "--clear-groups", "--inh-caps=-all", MIHOST_FILE});
-        return runToEnd(arguments);
-    };
-    Outcome const read = asNobody({"get", "os", "os-name"});
+    Outcome const read = machine::mihostRunAsUser({"get", "os", "os-name"});
     EXPECT_EQ(read.code, 0) << read.err;
-    Outcome const change = asNobody({"call", "LocalGroupAdd", "GroupName=crew"});
-    EXPECT_EQ(change.code, 1);
-    EXPECT_EQ(change.err,
-              "mihost: cannot lock /run/mihost.lock: Permission denied (changes need root)\n");
+    EXPECT_EQ(machine::mihostRunAsUser({"call", "LocalGroupAdd", "GroupName=crew"}),
+              failed(1, "cannot lock /run/mihost.lock: Permission denied (changes need root)"));
 }
 
 } // namespace lock_test

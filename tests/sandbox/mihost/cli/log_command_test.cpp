@@ -1,9 +1,10 @@
 // `mihost list log` with its own options.
 
 #include "TestPaths.h"
+#include "tests/support/Holds.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "tests/support/MihostJson.h"
 #include "tests/support/TerminalRun.h"
 
 #include <algorithm>
@@ -12,20 +13,12 @@
 #include <filesystem>
 #include <fstream>
 #include <gtest/gtest.h>
-#include <nlohmann/json.hpp>
 
 namespace log_command_test
 {
 
 namespace fs = std::filesystem;
-using Json = nlohmann::ordered_json;
-
 constexpr char logFile[] = "/var/log/messages";
-
-bool holds(std::string const& text, std::string const& part)
-{
-    return text.find(part) != std::string::npos;
-}
 
 void append(std::string const& text)
 {
@@ -73,7 +66,7 @@ TEST_F(MihostLog, ShowsMessagesWithoutTheAsterisksOfThePlugin)
     EXPECT_EQ(shown({"--full", "-n", "1"}), Lines{"*box sshd[8]: third*"});
     EXPECT_EQ(shown({"--no-hostname", "-n", "1"}), Lines{"sshd[8]: third"});
     Outcome const outcome = mihostRun({"--no-accel", "list", "log", "-n", "1"});
-    EXPECT_TRUE(holds(outcome.out, "2026-06-03 03:00:00  box sshd[8]: third\n")) << outcome.out;
+    EXPECT_TRUE(holds(outcome.out, "2026-06-03 03:00:00  box sshd[8]: third\n"));
 }
 
 TEST_F(MihostLog, ShowsOnlyTheNewestEntries)
@@ -104,7 +97,7 @@ TEST_F(MihostLog, ShowsOnlyMatchingEntriesAndCountsThem)
 
 TEST_F(MihostLog, PrintsTheChosenNodesAsJsonUnchanged)
 {
-    Json const nodes = Json::parse(mihostRun({"--json", "list", "log", "--grep", "third"}).out);
+    Json const nodes = mihostJson({"list", "log", "--grep", "third"});
     ASSERT_EQ(nodes.size(), 1U);
     EXPECT_EQ(nodes[0]["properties"]["message"]["value"], "*box sshd[8]: third*");
 }
@@ -134,7 +127,7 @@ TEST_F(MihostLog, RefusesWrongValuesAndItsOptionsForOtherLists)
         Outcome const outcome = mihostRun(arguments);
         EXPECT_EQ(outcome.code, 2) << each.message;
         EXPECT_EQ(outcome.out, "");
-        EXPECT_TRUE(holds(outcome.err, each.message)) << outcome.err;
+        EXPECT_TRUE(holds(outcome.err, each.message));
     }
 }
 
@@ -180,7 +173,7 @@ TEST_F(MihostLog, IsFollowedWithTheSameTextsAsThePlugins)
     run.type("\x03");
     run.end();
     for (std::string const& message : shown({}))
-        EXPECT_TRUE(holds(run.output(), "  " + message + "\r\n")) << message << run.output();
+        EXPECT_TRUE(holds(run.output(), "  " + message + "\r\n")) << message;
 }
 
 TEST_F(MihostLog, IsFollowedFromMoreLinesThanTheTreeHas)
@@ -193,17 +186,16 @@ TEST_F(MihostLog, IsFollowedFromMoreLinesThanTheTreeHas)
     run.waitFor("number 200.\r\n");
     run.type("\x03");
     EXPECT_EQ(run.end(), 0);
-    EXPECT_TRUE(holds(run.output(), "number 51.")) << run.output();
+    EXPECT_TRUE(holds(run.output(), "number 51."));
     EXPECT_FALSE(holds(run.output(), "number 50."));
 }
 
 TEST_F(MihostLog, CannotBeFollowedIfItIsMissing)
 {
     machine::remove(logFile);
-    Outcome const outcome = mihostRun({"list", "log", "--follow"});
-    EXPECT_EQ(outcome.code, 1);
-    EXPECT_EQ(outcome.err, "mihost: list log: /var/log/messages: No such file or directory (see "
-                           "'mihost doctor')\n");
+    EXPECT_EQ(mihostRun({"list", "log", "--follow"}),
+              failed(1, "list log: /var/log/messages: No such file or directory (see "
+                        "'mihost doctor')"));
 }
 
 } // namespace log_command_test

@@ -1,11 +1,13 @@
 // Long tables and trees at a terminal, shown by the user's pager.
 
+#include "tests/support/Holds.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 #include "tests/support/TerminalRun.h"
 
 #include <cstdlib>
+#include <filesystem>
 #include <gtest/gtest.h>
 
 namespace pager_test
@@ -41,28 +43,25 @@ protected:
 
     static bool wasPaged()
     {
-        return std::system("test -e /tmp/paged") == 0;
+        return std::filesystem::exists("/tmp/paged");
+    }
+
+    /** Runs mihost at a terminal and expects success. @return what the terminal shows */
+    static std::string shown(Lines const& arguments = {"list", "users"},
+                             unsigned short columns = 80)
+    {
+        TerminalRun run(arguments, columns);
+        EXPECT_EQ(run.end(), 0);
+        return run.output();
     }
 };
 
-bool stands(std::string const& text, std::string const& part)
-{
-    return text.find(part) != std::string::npos;
-}
-
 TEST_F(MihostPager, ShowsOutputThatDoesNotFitTheTerminal)
 {
-    TerminalRun run({"list", "users"});
-    EXPECT_EQ(run.end(), 0);
-    EXPECT_TRUE(stands(machine::read("/tmp/paged"), "u1029"));
-    EXPECT_FALSE(stands(run.output(), "u1029"));
-}
-
-TEST_F(MihostPager, ShowsColoursOfTheTerminal)
-{
-    TerminalRun run({"tree"});
-    EXPECT_EQ(run.end(), 0);
-    EXPECT_TRUE(stands(machine::read("/tmp/paged"), "\x1b[32muser:u1029\x1b[0m"));
+    EXPECT_FALSE(holds(shown(), "u1029"));
+    EXPECT_TRUE(holds(machine::read("/tmp/paged"), "u1029"));
+    shown({"tree"});
+    EXPECT_TRUE(holds(machine::read("/tmp/paged"), "\x1b[32muser:u1029\x1b[0m"));
 }
 
 TEST_F(MihostPager, IsNotUsedIfOutputFitsOrIsNotForPeople)
@@ -70,68 +69,51 @@ TEST_F(MihostPager, IsNotUsedIfOutputFitsOrIsNotForPeople)
     for (Lines const& arguments :
          {Lines{"list", "users", "--no-pager"}, Lines{"list", "users", "-o", "csv"},
           Lines{"--json", "tree"}, Lines{"list", "groups"}}) {
-        TerminalRun run(arguments);
-        EXPECT_EQ(run.end(), 0);
+        shown(arguments);
         EXPECT_FALSE(wasPaged()) << arguments[0];
     }
     mihostRun({"list", "users"}); // standard output is not a terminal
     EXPECT_FALSE(wasPaged());
     for (char const* none : {"cat", ""}) {
         setenv("MIHOST_PAGER", none, 1);
-        TerminalRun run({"list", "users"});
-        EXPECT_EQ(run.end(), 0);
-        EXPECT_TRUE(stands(run.output(), "u1029")) << none;
+        EXPECT_TRUE(holds(shown(), "u1029")) << none;
     }
 }
 
 TEST_F(MihostPager, CountsTheLinesThatTheTerminalWraps)
 {
     writeAccounts(12); // lines wider than the terminal: two of its lines each
-    TerminalRun fits({"list", "users", "--full"}, 80);
-    EXPECT_EQ(fits.end(), 0);
+    shown({"list", "users", "--full"}, 80);
     EXPECT_FALSE(wasPaged());
-    TerminalRun wraps({"list", "users", "--full"}, 40);
-    EXPECT_EQ(wraps.end(), 0);
+    shown({"list", "users", "--full"}, 40);
     EXPECT_TRUE(wasPaged());
 }
 
 TEST_F(MihostPager, ComesFromPagerUnlessMihostPagerIsSet)
 {
     setenv("PAGER", "cat >/tmp/other", 1);
-    TerminalRun own({"list", "users"});
-    own.end();
+    shown();
     EXPECT_TRUE(wasPaged());
     unsetenv("MIHOST_PAGER");
     TerminalRun other({"/bin/sh", "-c", "unset MIHOST_PAGER; exec \"$0\" list users", MIHOST_FILE},
                       80, "/usr/bin/env");
     other.end();
-    EXPECT_TRUE(stands(machine::read("/tmp/other"), "u1029"));
+    EXPECT_TRUE(holds(machine::read("/tmp/other"), "u1029"));
 }
 
 TEST_F(MihostPager, ReceivesTheUsersLocaleAndOptionsForLess)
 {
     setenv("MIHOST_PAGER", "echo \"$LC_ALL $LESS ${LESSSECURE-none}\" >/tmp/seen; cat >/dev/null",
            1);
-    TerminalRun run({"list", "users"});
-    run.end();
+    shown();
     EXPECT_EQ(machine::read("/tmp/seen"), "C.UTF-8 FRX none\n");
     setenv("LESS", "S", 1);
-    setenv("SUDO_UID", "1000", 1);
-    TerminalRun again({"list", "users"});
-    again.end();
-    EXPECT_EQ(machine::read("/tmp/seen"), "C.UTF-8 S 1\n");
-}
-
-TEST_F(MihostPager, StartsNoShellUnderDoasOrPkexecEither)
-{
-    setenv("MIHOST_PAGER", "echo \"${LESSSECURE-none}\" >/tmp/seen; cat >/dev/null", 1);
-    for (char const* caller : {"DOAS_USER", "PKEXEC_UID"}) {
+    for (char const* caller : {"SUDO_UID", "DOAS_USER", "PKEXEC_UID"}) {
         setenv(caller, "1000", 1);
-        machine::remove("/tmp/seen");
-        TerminalRun run({"list", "users"});
-        run.end();
+        shown();
         unsetenv(caller);
-        EXPECT_EQ(machine::read("/tmp/seen"), "1\n") << caller;
+        EXPECT_EQ(machine::read("/tmp/seen"), "C.UTF-8 S 1\n") << caller;
+        machine::remove("/tmp/seen");
     }
 }
 
@@ -139,10 +121,9 @@ TEST_F(MihostPager, MayEndBeforeItReadsEverything)
 {
     writeAccounts(5000);
     setenv("MIHOST_PAGER", "head -n 1", 1);
-    TerminalRun run({"list", "users"});
-    EXPECT_EQ(run.end(), 0);
-    EXPECT_TRUE(stands(run.output(), "user-name"));
-    EXPECT_FALSE(stands(run.output(), "u1000"));
+    std::string const text = shown();
+    EXPECT_TRUE(holds(text, "user-name"));
+    EXPECT_FALSE(holds(text, "u1000"));
 }
 
 TEST_F(MihostPager, CanBeLessAndRestoresTheTerminal)
@@ -182,21 +163,18 @@ TEST_F(MihostPager, RestoresTheTerminalWhenItIsKilled)
 TEST_F(MihostPager, IsReportedIfItCannotBeRunAndNothingIsLost)
 {
     setenv("MIHOST_PAGER", "no-such-pager", 1);
-    TerminalRun run({"list", "users"});
-    EXPECT_EQ(run.end(), 0);
-    EXPECT_TRUE(
-        stands(run.output(), "mihost: showing the output in 'no-such-pager': cannot run it"));
-    EXPECT_TRUE(stands(run.output(), "u1029"));
+    std::string const text = shown();
+    EXPECT_TRUE(holds(text, "mihost: showing the output in 'no-such-pager': cannot run it"));
+    EXPECT_TRUE(holds(text, "u1029"));
 }
 
 TEST_F(MihostPager, KeepsTheExitCodeOfTheCommand)
 {
     setenv("MIHOST_PAGER", "cat >/dev/null; exit 5", 1);
-    TerminalRun run({"list", "users"});
-    EXPECT_EQ(run.end(), 0);
+    shown();
     TerminalRun refused({"list", "users", "--sort", "none"});
     EXPECT_EQ(refused.end(), 4);
-    EXPECT_TRUE(stands(refused.output(), "mihost: no column 'none'"));
+    EXPECT_TRUE(holds(refused.output(), "mihost: no column 'none'"));
 }
 
 } // namespace pager_test

@@ -24,7 +24,7 @@ constexpr uid_t somebody = 65534;
 
 Outcome bash(std::string const& line)
 {
-    return runToEnd({"/bin/bash", "-c", "mihost=$1; " + line, "bash", MIHOST_FILE}, hash);
+    return bashRun(line, hash);
 }
 
 class MihostPrivateDirectory : public testing::Test
@@ -33,7 +33,7 @@ protected:
     void SetUp() override
     {
         machine::lay("plain");
-        ASSERT_EQ(std::system("/usr/sbin/useradd -M -s /bin/sh jdoe"), 0);
+        machine::run("/usr/sbin/useradd -M -s /bin/sh jdoe");
         fs::create_directories(parent);
         setenv("TMPDIR", parent, 1);
         path_ = std::getenv("PATH");

@@ -1,6 +1,7 @@
 // mihost with other programs: on either side of a pipe, and as a source of JSON.
 
 #include "TestPaths.h"
+#include "tests/support/Holds.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
@@ -9,11 +10,10 @@
 namespace scripting_test
 {
 
-/** Runs a line in bash, where $mihost is the program and a pipe fails if anything in it does. */
+/** Runs a line in bash, where a pipe fails if anything in it does. */
 Outcome bash(std::string const& line)
 {
-    return runToEnd(
-        {"/bin/bash", "-c", "mihost=$1; set -o pipefail; " + line, "bash", MIHOST_FILE});
+    return bashRun("set -o pipefail; " + line);
 }
 
 /** A machine whose texts have control characters, invalid UTF-8 and quotes. */
@@ -29,7 +29,7 @@ void makeMachineOfOddTexts(int users = 3)
     }
     machine::write("/etc/passwd", accounts);
     machine::write("/etc/shadow", shadow, 0600);
-    machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+    machine::writeIdRanges();
     machine::write("/var/log/messages", "Jan  2 03:04:05 \x80 \"\x7f\" \xc0\xaf\x1b]0;x\x07\n");
 }
 
@@ -65,9 +65,7 @@ TEST(MihostInAPipe, ReportsThatItsOutputCannotBeWritten)
                                   "doctor", "methods", "metrics", "shell <<<'get os 108'"}) {
         Outcome const outcome = bash("$mihost " + std::string(arguments) + " >/dev/full");
         EXPECT_EQ(outcome.code, 2) << arguments;
-        EXPECT_NE(outcome.err.find("cannot write the output: No space left on device\n"),
-                  std::string::npos)
-            << outcome.err;
+        EXPECT_TRUE(holds(outcome.err, "cannot write the output: No space left on device\n"));
     }
 }
 
@@ -116,11 +114,9 @@ TEST(MihostJson, IsValidForJqWhateverTheSystemsTextsHold)
              {"properties", "length", "9"},
              {"methods", "length", "12"},
              {"methods UserDel", ".[0].method", R"("UserDel")"}}) {
-        Outcome const outcome = bash("{ $mihost --json " + std::string(reading.arguments) +
-                                     "; echo $? >/tmp/code; } | jq -c '" + reading.filter + "'");
-        EXPECT_EQ(outcome.out, std::string(reading.result) + "\n") << reading.arguments;
-        EXPECT_EQ(outcome.err, "") << reading.arguments;
-        EXPECT_EQ(outcome.code, 0) << reading.arguments;
+        EXPECT_EQ(bash("{ $mihost --json " + std::string(reading.arguments) +
+                       "; echo $? >/tmp/code; } | jq -c '" + reading.filter + "'"),
+                  printed(std::string(reading.result) + "\n"));
     }
     for (char const* arguments :
          {"tree", "list users", "--timing tree 2>&1 >/dev/null", "--trace - tree 2>&1 >/dev/null"})

@@ -1,5 +1,6 @@
 // The shell without a terminal: scripts that drive one loaded plug-in.
 
+#include "tests/support/Holds.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
@@ -24,12 +25,10 @@ protected:
 
 TEST_F(MihostScript, RunsItsLinesOnOneLoadedPlugin)
 {
-    Outcome const outcome = mihostRun({"shell"}, "get os 108\n\n"
-                                                 "# a comment, then blanks and no line end\n"
-                                                 "   get   'os'  \"os-name\"   # and another");
-    EXPECT_EQ(outcome.out, "108 os-name  Linux\n108 os-name  Linux\n");
-    EXPECT_EQ(outcome.err, "");
-    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(mihostRun({"shell"}, "get os 108\n\n"
+                                   "# a comment, then blanks and no line end\n"
+                                   "   get   'os'  \"os-name\"   # and another"),
+              printed("108 os-name  Linux\n108 os-name  Linux\n"));
     EXPECT_EQ(machine::read("/tmp/asked"), "asked\n");
 }
 
@@ -67,7 +66,7 @@ TEST_F(MihostScript, EndsAtTheFirstLineThatFailsAndNamesIt)
             mihostRun({"shell"}, "get os 108\n" + std::string(script.line) + "\nget os 108\n");
         EXPECT_EQ(outcome.code, script.code) << script.line;
         EXPECT_EQ(outcome.out, "108 os-name  Linux\n") << script.line;
-        EXPECT_EQ(outcome.err.find(script.message), 0U) << outcome.err;
+        EXPECT_TRUE(startsWith(outcome.err, script.message));
         EXPECT_EQ(linesOf(outcome.err).size(), 1U) << outcome.err;
     }
 }
@@ -81,17 +80,14 @@ TEST_F(MihostScript, ContinuesAfterFailuresOnRequest)
     EXPECT_EQ(outcome.out, "108 os-name  Linux\n108 os-name  Linux\n");
     Lines const told = linesOf(outcome.err);
     ASSERT_EQ(told.size(), 2U);
-    EXPECT_EQ(told[0].find("mihost: line 1: "), 0U) << told[0];
-    EXPECT_EQ(told[1].find("mihost: line 3: "), 0U) << told[1];
+    EXPECT_TRUE(startsWith(told[0], "mihost: line 1: "));
+    EXPECT_TRUE(startsWith(told[1], "mihost: line 3: "));
 }
 
-TEST_F(MihostScript, EndsOnExitAndQuit)
+TEST_F(MihostScript, MayBeEmptyAndEndsOnExitAndQuit)
 {
-    for (char const* word : {"exit", "quit"}) {
-        Outcome const outcome = mihostRun({"shell"}, std::string(word) + "\nget nothing\n");
-        EXPECT_EQ(outcome.code, 0);
-        EXPECT_EQ(outcome.err, "");
-    }
+    for (char const* script : {"", "\n\n# nothing\n", "exit\nget nothing\n", "quit\nget nothing\n"})
+        EXPECT_EQ(mihostRun({"shell"}, script), printed(""));
 }
 
 TEST_F(MihostScript, PrintsOneJsonLineForEachCommand)
@@ -105,11 +101,11 @@ TEST_F(MihostScript, PrintsOneJsonLineForEachCommand)
     EXPECT_EQ(Json::parse(lines[0])["kind"], "os");
     EXPECT_TRUE(Json::parse(lines[1]).is_array());
     EXPECT_EQ(Json::parse(lines[2])["exit"], 4);
-    EXPECT_EQ(Json::parse(lines[2])["error"].get<std::string>().find("line 3: no node"), 0U);
+    EXPECT_TRUE(startsWith(Json::parse(lines[2])["error"].get<std::string>(), "line 3: no node"));
     EXPECT_EQ(Json::parse(lines[3])["exit"], 2);
     EXPECT_EQ(Json::parse(lines[4])["status"], 0);
     EXPECT_EQ(Json::parse(lines[5])["changed"], true);
-    EXPECT_EQ(Json::parse(lines[6])["text"].get<std::string>().find("read properties"), 0U);
+    EXPECT_TRUE(startsWith(Json::parse(lines[6])["text"].get<std::string>(), "read properties"));
     EXPECT_TRUE(Json::parse(lines[7]).contains("plugin"));
     EXPECT_TRUE(Json::parse(lines[8]).is_array());
     EXPECT_EQ(Json::parse(lines[9])["status"], 1);
@@ -126,18 +122,9 @@ TEST_F(MihostScript, AppliesOptionsToOneLineOnly)
 
 TEST_F(MihostScript, IsNeverReadForAPassword)
 {
-    Outcome const outcome =
-        mihostRun({"shell"}, "call UserSetPassword UserName=root Password=-\nget os 108\n");
-    EXPECT_EQ(outcome.code, 2);
-    EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(outcome.err, "mihost: line 1: Password cannot be read from standard input, which is "
-                           "the script (write it in the script)\n");
-}
-
-TEST_F(MihostScript, MayBeEmpty)
-{
-    EXPECT_EQ(mihostRun({"shell"}, "").code, 0);
-    EXPECT_EQ(mihostRun({"shell"}, "\n\n# nothing\n").out, "");
+    EXPECT_EQ(mihostRun({"shell"}, "call UserSetPassword UserName=root Password=-\nget os 108\n"),
+              failed(2, "line 1: Password cannot be read from standard input, which is "
+                        "the script (write it in the script)"));
 }
 
 TEST_F(MihostScript, DoesNotStartIfThePluginCannotBeLoaded)

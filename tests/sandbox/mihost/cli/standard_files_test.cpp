@@ -1,6 +1,7 @@
 // mihost started without some standard streams: files that it opens must not take their places.
 
 #include "TestPaths.h"
+#include "tests/support/Holds.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
@@ -9,11 +10,6 @@
 
 namespace standard_files_test
 {
-
-Outcome bash(std::string const& line)
-{
-    return runToEnd({"/bin/bash", "-c", "mihost=$1; " + line, "bash", MIHOST_FILE});
-}
 
 void expectJsonLinesOnly(std::string const& path)
 {
@@ -28,49 +24,49 @@ constexpr char badOutput[] = "mihost: cannot write the output: Bad file descript
 TEST(MihostStandardFiles, FailWithoutOutputAndKeepTheTrace)
 {
     machine::lay("plain");
-    Outcome const traced = bash("$mihost --trace /tmp/trace tree >&-");
+    Outcome const traced = bashRun("$mihost --trace /tmp/trace tree >&-");
     EXPECT_EQ(traced.code, 2);
     EXPECT_EQ(traced.err, badOutput);
     expectJsonLinesOnly("/tmp/trace");
     for (char const* command : {"tree", "--help", "__complete get ''", "shell <<<tree"}) {
-        Outcome const outcome = bash("$mihost " + std::string(command) + " >&-");
+        Outcome const outcome = bashRun("$mihost " + std::string(command) + " >&-");
         EXPECT_EQ(outcome.code, 2) << command;
-        EXPECT_NE(outcome.err.find("Bad file descriptor"), std::string::npos) << outcome.err;
+        EXPECT_TRUE(holds(outcome.err, "Bad file descriptor"));
     }
 }
 
 TEST(MihostStandardFiles, KeepMessagesOutOfTheTrace)
 {
     machine::lay("plain");
-    EXPECT_EQ(bash("$mihost --trace /tmp/trace tree 2>&-").code, 0);
+    EXPECT_EQ(bashRun("$mihost --trace /tmp/trace tree 2>&-").code, 0);
     expectJsonLinesOnly("/tmp/trace");
-    EXPECT_EQ(bash("$mihost --trace /tmp/trace get user:none 2>&-").code, 4);
+    EXPECT_EQ(bashRun("$mihost --trace /tmp/trace get user:none 2>&-").code, 4);
     expectJsonLinesOnly("/tmp/trace");
 }
 
 TEST(MihostStandardFiles, WithoutInputTheTreeIsTheSame)
 {
     machine::lay("plain");
-    std::string const tree = bash("$mihost tree </dev/null").out;
-    Outcome const outcome = bash("$mihost --trace /tmp/trace tree <&-");
+    std::string const tree = bashRun("$mihost tree </dev/null").out;
+    Outcome const outcome = bashRun("$mihost --trace /tmp/trace tree <&-");
     EXPECT_EQ(outcome.out, tree);
     EXPECT_EQ(outcome.err, "");
-    Outcome const script = bash("$mihost shell <&-");
+    Outcome const script = bashRun("$mihost shell <&-");
     EXPECT_EQ(script.code, 0) << script.err;
 }
 
 TEST(MihostStandardFiles, WithoutInputAPasswordIsRefused)
 {
     machine::lay("plain");
-    Outcome const outcome = bash("$mihost call UserSetPassword UserName=root Password=- <&-");
+    Outcome const outcome = bashRun("$mihost call UserSetPassword UserName=root Password=- <&-");
     EXPECT_EQ(outcome.code, 2);
-    EXPECT_NE(outcome.err.find("standard input is empty"), std::string::npos) << outcome.err;
+    EXPECT_TRUE(holds(outcome.err, "standard input is empty"));
 }
 
 TEST(MihostStandardFiles, WithoutAnyTheTraceIsComplete)
 {
     machine::lay("plain");
-    EXPECT_EQ(bash("$mihost --trace /tmp/trace tree <&- >&- 2>&-").code, 2);
+    EXPECT_EQ(bashRun("$mihost --trace /tmp/trace tree <&- >&- 2>&-").code, 2);
     expectJsonLinesOnly("/tmp/trace");
 }
 

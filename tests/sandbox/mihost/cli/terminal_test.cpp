@@ -2,6 +2,7 @@
 
 #include "mihost/cli/output/DisplayWidth.h"
 #include "mihost/sandbox/Sandbox.h"
+#include "tests/support/Holds.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
@@ -37,8 +38,7 @@ protected:
         unsetenv("NO_COLOR");
         std::filesystem::create_directory("/tmp/private");
         machine::lay("plain");
-        machine::write("/etc/login.defs",
-                       "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+        machine::writeIdRanges();
         machine::write("/etc/passwd", "root:x:0:0:Super:/root:/bin/sh\n"
                                       "jdoe:x:1000:1000:J. Doe:/home/jdoe:/bin/sh\n");
         machine::write("/etc/shadow", "root:*:19000:0:99999:7:::\njdoe:!:19000:0:99999:7:::\n",
@@ -53,12 +53,46 @@ protected:
     {
         return std::filesystem::is_empty("/tmp/private");
     }
+
+    /** Replaces userdel by a program that waits until letToolGo is called. */
+    static void makeToolWait()
+    {
+        machine::fake("/usr/sbin/userdel", "echo begun >/dev/tty; read go </tmp/go; "
+                                           "echo done >/tmp/done\n");
+        machine::run("mkfifo /tmp/go");
+    }
+
+    static void letToolGo()
+    {
+        machine::write("/tmp/answer", "go\n");
+        machine::run("cat /tmp/answer >/tmp/go");
+    }
 };
 
-bool stands(std::string const& text, std::string const& part)
+/** mihost's own shell. */
+class Shell : public TerminalRun
 {
-    return text.find(part) != std::string::npos;
-}
+public:
+    Shell() : TerminalRun({"shell"}) {}
+
+    /** Types a line at the next prompt. @return what is printed up to the end of the text */
+    std::string enter(std::string const& line, std::string const& text)
+    {
+        waitFor(prompt);
+        type(line + "\n");
+        return waitFor(text);
+    }
+
+    /** Types Ctrl-D at the next prompt: at another time it ends a line rather than the input. */
+    int leave()
+    {
+        waitFor(prompt);
+        type(ctrlD);
+        return end();
+    }
+};
+
+constexpr char osName[] = "108 os-name  Linux";
 
 /** The lines of a terminal's stream, without sequences for cursor and colours. */
 Lines plainLines(std::string const& text)
@@ -109,23 +143,21 @@ TEST_F(MihostTerminal, ShowsNoProgressOnADumbOne)
 
 TEST_F(MihostTerminal, HasColoursUnlessTheyAreTurnedOff)
 {
-    TerminalRun coloured({"tree"});
-    coloured.end();
-    EXPECT_TRUE(stands(coloured.output(), "\x1b[32muser:jdoe\x1b[0m"));
+    auto const shown = [](Lines const& arguments) {
+        TerminalRun run(arguments);
+        run.end();
+        return run.output();
+    };
+    std::string const coloured = "\x1b[32muser:jdoe\x1b[0m";
+    EXPECT_TRUE(holds(shown({"tree"}), coloured));
+    EXPECT_FALSE(holds(shown({"--color", "never", "tree"}), "\x1b[32m"));
     setenv("NO_COLOR", "1", 1);
-    TerminalRun plain({"tree"});
-    plain.end();
-    EXPECT_FALSE(stands(plain.output(), "\x1b[32m"));
-    TerminalRun forced({"--color=always", "tree"});
-    forced.end();
-    EXPECT_TRUE(stands(forced.output(), "\x1b[32muser:jdoe"));
+    EXPECT_FALSE(holds(shown({"tree"}), "\x1b[32m"));
+    EXPECT_TRUE(holds(shown({"tree"}), "user:jdoe #"));
+    EXPECT_TRUE(holds(shown({"--color=always", "tree"}), coloured));
     unsetenv("NO_COLOR");
-    TerminalRun never({"--color", "never", "tree"});
-    never.end();
-    EXPECT_FALSE(stands(never.output(), "\x1b[32m"));
-    EXPECT_TRUE(stands(mihostRun({"--color=always", "tree"}).out, "\x1b[32muser:jdoe"));
-    EXPECT_TRUE(stands(plain.output(), "user:jdoe #"));
-    EXPECT_FALSE(stands(mihostRun({"tree"}).out, "\x1b"));
+    EXPECT_TRUE(holds(mihostRun({"--color=always", "tree"}).out, coloured));
+    EXPECT_FALSE(holds(mihostRun({"tree"}).out, "\x1b"));
 }
 
 TEST_F(MihostTerminal, WrapsTextAtItsWidthAndLosesNothing)
@@ -145,16 +177,16 @@ TEST_F(MihostTerminal, WrapsTextAtItsWidthAndLosesNothing)
             for (std::string const& line : lines)
                 text += line.substr(std::min(line.size(), line.find_first_not_of("│ ")));
             bool const isWhole =
-                stands(text, std::string(50, 'a') + "李明李明李明李明李明李明李明李明");
+                holds(text, std::string(50, 'a') + "李明李明李明李明李明李明李明李明");
             EXPECT_EQ(isWhole, arguments.back() != "log") << columns << shown;
         }
-    EXPECT_TRUE(stands(mihostRun({"list", "users"}).out, "李明李明李明李明李明李明李明李明"));
+    EXPECT_TRUE(holds(mihostRun({"list", "users"}).out, "李明李明李明李明李明李明李明李明"));
 }
 
 TEST_F(MihostTerminal, DrawsWithAsciiInAnAsciiLocale)
 {
     setenv("LC_ALL", "C", 1);
-    EXPECT_TRUE(stands(mihostRun({"tree"}).out, "\n`-root #2 "));
+    EXPECT_TRUE(holds(mihostRun({"tree"}).out, "\n`-root #2 "));
 }
 
 TEST_F(MihostTerminal, ShowsNoControlCharactersOfTheSystemsTexts)
@@ -166,10 +198,10 @@ TEST_F(MihostTerminal, ShowsNoControlCharactersOfTheSystemsTexts)
                                    Lines{"list", "log"}, Lines{"get", "log:1"}}) {
         TerminalRun run(arguments, 200);
         run.end();
-        EXPECT_FALSE(stands(run.output(), "\x1b]"));
-        EXPECT_FALSE(stands(run.output(), "\x1b[2J"));
-        EXPECT_FALSE(stands(run.output(), "\x1b[31m"));
-        EXPECT_FALSE(stands(run.output(), "\x9b"));
+        EXPECT_FALSE(holds(run.output(), "\x1b]"));
+        EXPECT_FALSE(holds(run.output(), "\x1b[2J"));
+        EXPECT_FALSE(holds(run.output(), "\x1b[31m"));
+        EXPECT_FALSE(holds(run.output(), "\x9b"));
     }
 }
 
@@ -198,7 +230,7 @@ TEST_F(MihostTerminal, DoesNotEchoATypedPassword)
     EXPECT_FALSE(run.showsInput());
     run.type("geheim42\n");
     EXPECT_EQ(run.end(), 0);
-    EXPECT_FALSE(stands(run.output(), "geheim42"));
+    EXPECT_FALSE(holds(run.output(), "geheim42"));
     std::string const hash = machine::entry("/etc/shadow", "jdoe").at(1);
     EXPECT_EQ(hash, crypt("geheim42", hash.c_str()));
 }
@@ -242,7 +274,7 @@ TEST_F(MihostTerminal, ShowsThousandsOfNodesLineByLine)
             TerminalRun run(arguments, columns);
             EXPECT_EQ(run.end(), 0);
             std::string const& all = run.output();
-            EXPECT_TRUE(stands(all, "starting: users 2000")); // the last of the steps shown
+            EXPECT_TRUE(holds(all, "starting: users 2000")); // the last of the steps shown
             Lines const shown = plainLines(all.substr(all.rfind("\r\x1b[K")));
             EXPECT_GT(shown.size(), 2001U);
             EXPECT_LE(widest(shown), columns) << arguments[0];
@@ -251,15 +283,12 @@ TEST_F(MihostTerminal, ShowsThousandsOfNodesLineByLine)
 
 TEST_F(MihostTerminal, FinishesAChangeThatHasBegunBeforeCtrlCEndsIt)
 {
-    machine::fake("/usr/sbin/userdel", "echo begun >/dev/tty; read go </tmp/go; "
-                                       "echo done >/tmp/done\n");
-    ASSERT_EQ(std::system("mkfifo /tmp/go"), 0);
+    makeToolWait();
     TerminalRun run({"call", "UserDel", "UserName=jdoe"});
     run.waitFor("begun");
     run.type(ctrlC);
     run.waitFor("^C"); // shown once the signal is sent
-    machine::write("/tmp/answer", "go\n");
-    ASSERT_EQ(std::system("cat /tmp/answer >/tmp/go"), 0);
+    letToolGo();
     EXPECT_EQ(run.end(), 128 + SIGINT);
     EXPECT_EQ(machine::read("/tmp/done"), "done\n");
     EXPECT_TRUE(nothingIsLeft());
@@ -276,175 +305,117 @@ TEST_F(MihostTerminal, StopsAWatchOnCtrlC)
 
 TEST_F(MihostTerminal, RunsAShellWithAPrompt)
 {
-    TerminalRun run({"shell"});
-    run.waitFor(prompt);
-    run.type("get os 108\n");
-    run.waitFor("108 os-name  Linux\r\n");
-    run.waitFor(prompt);
-    run.type("get nothing\n");
-    run.waitFor("mihost: no node 'nothing'");
-    run.waitFor(prompt);
-    run.type("exit\n");
-    EXPECT_EQ(run.end(), 0);
+    Shell shell;
+    shell.enter("get os 108", osName);
+    shell.enter("get nothing", "mihost: no node 'nothing'");
+    shell.waitFor(prompt);
+    shell.type("exit\n");
+    EXPECT_EQ(shell.end(), 0);
+    EXPECT_TRUE(shell.showsInput());
     EXPECT_TRUE(nothingIsLeft());
-}
-
-TEST_F(MihostTerminal, EndsTheShellOnCtrlD)
-{
-    TerminalRun run({"shell"});
-    run.waitFor(prompt);
-    run.type(ctrlD);
-    EXPECT_EQ(run.end(), 0);
-    EXPECT_TRUE(run.showsInput());
 }
 
 TEST_F(MihostTerminal, EndsTheShellOnCtrlDDuringACommand)
 {
-    machine::fake("/usr/sbin/userdel", "echo begun >/dev/tty; read go </tmp/go\n");
-    ASSERT_EQ(std::system("mkfifo /tmp/go"), 0);
-    TerminalRun run({"shell"});
-    run.waitFor(prompt);
-    run.type("call UserDel UserName=jdoe\n");
-    run.waitFor("begun");
-    run.type(std::string("get os 108\n") + ctrlD);
-    machine::write("/tmp/answer", "go\n");
-    ASSERT_EQ(std::system("cat /tmp/answer >/tmp/go"), 0);
-    run.waitFor("108 os-name  Linux");
-    EXPECT_EQ(run.end(), 0);
-    EXPECT_TRUE(run.showsInput());
+    makeToolWait();
+    Shell shell;
+    shell.enter("call UserDel UserName=jdoe", "begun");
+    shell.type(std::string("get os 108\n") + ctrlD);
+    letToolGo();
+    shell.waitFor(osName);
+    EXPECT_EQ(shell.end(), 0);
+    EXPECT_TRUE(shell.showsInput());
 }
 
-TEST_F(MihostTerminal, RemembersTheLinesOfTheLastShellButNoPassword)
+TEST_F(MihostTerminal, RemembersTheLinesOfShellsButNoPassword)
 {
     setenv("HOME", "/tmp/home", 1);
     unsetenv("XDG_STATE_HOME");
     std::filesystem::create_directory("/tmp/home");
     std::string const history = "/tmp/home/.local/state/mihost/history";
-    TerminalRun first({"shell"});
+    Shell first;
+    first.enter("get os 108", osName);
+    first.enter("call UserSetPassword UserName=nobody-here Password=geheim42",
+                "mihost: call UserSetPassword");
     first.waitFor(prompt);
-    first.type("get os 108\n");
-    first.waitFor("108 os-name  Linux");
-    first.waitFor(prompt);
-    first.type("call UserSetPassword UserName=nobody-here Password=geheim42\n");
-    first.waitFor("mihost: call UserSetPassword");
-    first.waitFor(prompt);
-    first.type(ctrlD);
-    EXPECT_EQ(first.end(), 0);
+    first.type(up);
+    EXPECT_FALSE(holds(first.waitFor("get os 108"), "geheim42"));
+    first.type(ctrlC);
+    EXPECT_EQ(first.leave(), 0);
     EXPECT_EQ(machine::read(history), "get os 108\n");
+
+    Shell second;
+    second.enter(up, osName);
+    EXPECT_EQ(second.leave(), 0);
+    EXPECT_EQ(machine::read(history), "get os 108\nget os 108\n");
     EXPECT_EQ(std::filesystem::status(history).permissions(),
               std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
-
-    TerminalRun second({"shell"});
-    second.waitFor(prompt);
-    second.type(up);
-    second.waitFor("get os 108");
-    second.type("\n");
-    second.waitFor("108 os-name  Linux");
-    second.waitFor(prompt);
-    second.type(ctrlD);
-    EXPECT_EQ(second.end(), 0);
-    EXPECT_EQ(machine::read(history), "get os 108\nget os 108\n");
 }
 
 TEST_F(MihostTerminal, DropsAShellsLineOnCtrlC)
 {
-    TerminalRun run({"shell"});
-    run.waitFor(prompt);
-    run.type("power ha");
-    run.waitFor("a"); // of "ha"
-    run.type(ctrlC);
-    run.waitFor(prompt);
-    run.type("get os 108\n");
-    run.waitFor("108 os-name  Linux");
-    run.waitFor(prompt); // until then Ctrl-D ends a line rather than the input
-    run.type(ctrlD);
-    EXPECT_EQ(run.end(), 0);
+    Shell shell;
+    shell.waitFor(prompt);
+    shell.type("power ha");
+    shell.waitFor("a"); // of "ha"
+    shell.type(ctrlC);
+    shell.enter("get os 108", osName);
+    EXPECT_EQ(shell.leave(), 0);
 }
 
 TEST_F(MihostTerminal, ReturnsToTheShellWhenCtrlCStopsAWatch)
 {
-    TerminalRun run({"shell"});
-    run.waitFor(prompt);
-    run.type("watch os os-name --interval 1000\n");
-    run.waitFor("108 os-name  Linux");
-    run.type(ctrlC);
-    run.waitFor("^C\r\n");
-    run.waitFor(prompt);
-    run.type(ctrlD);
-    EXPECT_EQ(run.end(), 0);
+    Shell shell;
+    shell.enter("watch os os-name --interval 1000", osName);
+    shell.type(ctrlC);
+    shell.waitFor("^C\r\n");
+    EXPECT_EQ(shell.leave(), 0);
 }
 
 TEST_F(MihostTerminal, RedrawsTheLineAfterTheShellWasStopped)
 {
-    TerminalRun run({"shell"});
-    run.waitFor(prompt);
-    run.type("get os");
-    run.waitFor("get os");
-    run.type(ctrlZ);
-    run.waitForStop();
-    EXPECT_TRUE(run.showsInput());
-    kill(run.child(), SIGCONT);
-    run.waitFor("mihost> get os");
-    EXPECT_FALSE(run.showsInput()); // the editor shows it
-    run.type(" 108\n");
-    run.waitFor("108 os-name  Linux");
-    run.waitFor(prompt);
-    run.type(ctrlD);
-    EXPECT_EQ(run.end(), 0);
+    Shell shell;
+    shell.waitFor(prompt);
+    shell.type("get os");
+    shell.waitFor("get os");
+    shell.type(ctrlZ);
+    shell.waitForStop();
+    EXPECT_TRUE(shell.showsInput());
+    kill(shell.child(), SIGCONT);
+    shell.waitFor("mihost> get os");
+    EXPECT_FALSE(shell.showsInput()); // the editor shows it
+    shell.type(" 108\n");
+    shell.waitFor(osName);
+    EXPECT_EQ(shell.leave(), 0);
 }
 
 TEST_F(MihostTerminal, CompletesCommandsNodesPropertiesAndMethods)
 {
-    TerminalRun run({"shell"});
-    run.waitFor(prompt);
-    run.type("ge\tuser:j\tfull\t\n");
-    run.waitFor("312 full-name  J. Doe");
-    run.waitFor(prompt);
     machine::fake("/usr/sbin/userdel", "echo \"$@\" >/tmp/deleted\n");
-    run.type("call UserDe\tUserN\tjd\t\n");
-    run.waitFor(prompt);
+    Shell shell;
+    shell.enter("ge\tuser:j\tfull\t", "312 full-name  J. Doe");
+    shell.enter("call UserDe\tUserN\tjd\t", "mihost: call UserDel");
     EXPECT_EQ(machine::read("/tmp/deleted"), "jdoe\n");
-    run.type("get user:\t"); // more than one: they are listed
-    run.waitFor("user:root  user:jdoe");
-    run.waitFor("get user:"); // and the line is shown again
-    run.type(ctrlC);
-    run.waitFor(prompt);
-    run.type(ctrlD);
-    EXPECT_EQ(run.end(), 0);
-}
-
-TEST_F(MihostTerminal, KeepsTheShellsLinesButNoPasswords)
-{
-    TerminalRun run({"shell"});
-    run.waitFor(prompt);
-    run.type("get os 108\n");
-    run.waitFor("108 os-name  Linux");
-    run.waitFor(prompt);
-    run.type("call UserSetPassword UserName=none Password=geheim42\n");
-    run.waitFor("mihost: call UserSetPassword: the plug-in returned");
-    run.waitFor(prompt);
-    run.type(up);
-    EXPECT_FALSE(stands(run.waitFor("get os 108"), "geheim42"));
-    run.type("\n");
-    run.waitFor("108 os-name  Linux");
-    run.waitFor(prompt);
-    run.type(ctrlD);
-    EXPECT_EQ(run.end(), 0);
+    shell.waitFor(prompt);
+    shell.type("get user:\t"); // more than one: they are listed
+    shell.waitFor("user:root  user:jdoe");
+    shell.waitFor("get user:"); // and the line is shown again
+    shell.type(ctrlC);
+    EXPECT_EQ(shell.leave(), 0);
 }
 
 TEST_F(MihostTerminal, FollowsChangesOfItsSizeInTheShell)
 {
     machine::write("/var/log/messages", "Jan  2 03:04:05 " + std::string(150, 'x') + "end\n");
-    TerminalRun run({"shell"});
-    run.waitFor(prompt);
-    run.type("list log\n");
     std::string const whole = std::string(150, 'x') + "end\r";
-    EXPECT_FALSE(stands(run.waitFor(prompt), whole));
-    run.resize(200);
-    run.type("list log\n");
-    EXPECT_TRUE(stands(run.waitFor(prompt), whole));
-    run.type(ctrlD);
-    EXPECT_EQ(run.end(), 0);
+    Shell shell;
+    shell.waitFor(prompt);
+    shell.type("list log\n");
+    EXPECT_FALSE(holds(shell.waitFor(prompt), whole));
+    shell.resize(200);
+    shell.type("list log\n");
+    shell.waitFor(whole);
+    EXPECT_EQ(shell.leave(), 0);
 }
 
 TEST_F(MihostTerminal, NamesTheSandboxInTheShellsPrompt)

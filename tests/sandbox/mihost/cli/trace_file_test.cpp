@@ -1,7 +1,7 @@
 // The file that --trace writes: who can read it, and which files it does not replace.
 
-#include "TestPaths.h"
 #include "mihost/sandbox/Descriptor.h"
+#include "tests/support/Holds.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
@@ -17,18 +17,15 @@ namespace trace_file_test
 constexpr char file[] = "/tmp/trace";
 constexpr uid_t somebody = 65534;
 
-Outcome bash(std::string const& line)
+class MihostTraceFile : public testing::Test
 {
-    return runToEnd({"/bin/bash", "-c", "mihost=$1; umask 0; " + line, "bash", MIHOST_FILE});
-}
-
-/** A machine without a trace of an earlier test. */
-void layMachineWithoutTraces()
-{
-    machine::lay("plain");
-    for (char const* path : {file, "/etc/victim", "/var/tmp/real", "/tmp/pipe"})
-        machine::remove(path);
-}
+protected:
+    MihostTraceFile()
+    {
+        machine::lay("plain");
+        umask(0);
+    }
+};
 
 Outcome traced()
 {
@@ -48,30 +45,25 @@ unsigned int modeOf(std::string const& path)
     return statusOf(path).st_mode & 07777;
 }
 
-bool isTrace(std::string const& text)
+testing::AssertionResult isTrace(std::string const& text)
 {
-    return text.find("initialize: entry") != std::string::npos;
+    return holds(text, "initialize: entry");
 }
 
 void expectRefused(std::string const& reason)
 {
-    Outcome const outcome = traced();
-    EXPECT_EQ(outcome.code, 2);
-    EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(outcome.err, "mihost: cannot write the trace '/tmp/trace': " + reason + "\n");
+    EXPECT_EQ(traced(), failed(2, "cannot write the trace '/tmp/trace': " + reason));
 }
 
-TEST(MihostTraceFile, IsReadableByItsOwnerOnly)
+TEST_F(MihostTraceFile, IsReadableByItsOwnerOnly)
 {
-    layMachineWithoutTraces();
-    EXPECT_EQ(bash("$mihost --trace /tmp/trace get os 108").code, 0);
+    EXPECT_EQ(traced().code, 0);
     EXPECT_EQ(modeOf(file), 0600U);
     EXPECT_TRUE(isTrace(machine::read(file)));
 }
 
-TEST(MihostTraceFile, IsANewOneIfOthersMayHaveTheOldOneOpen)
+TEST_F(MihostTraceFile, IsANewOneIfOthersMayHaveTheOldOneOpen)
 {
-    layMachineWithoutTraces();
     machine::write(file, "old");
     mihost::Descriptor const reader(open(file, O_RDONLY));
     EXPECT_EQ(traced().code, 0);
@@ -81,29 +73,26 @@ TEST(MihostTraceFile, IsANewOneIfOthersMayHaveTheOldOneOpen)
     EXPECT_EQ(read(reader.get(), text, sizeof text), 3);
 }
 
-TEST(MihostTraceFile, IsTruncatedIfOnlyItsOwnerCanReadIt)
+TEST_F(MihostTraceFile, IsTruncatedIfOnlyItsOwnerCanReadIt)
 {
-    layMachineWithoutTraces();
     machine::write(file, std::string(1 << 20, 'x'), 0600);
     ino_t const before = statusOf(file).st_ino;
     EXPECT_EQ(traced().code, 0);
     EXPECT_EQ(statusOf(file).st_ino, before);
     EXPECT_EQ(machine::read(file).front(), '{');
-    EXPECT_EQ(machine::read(file).find('x' + std::string("xx")), std::string::npos);
+    EXPECT_FALSE(holds(machine::read(file), 'x' + std::string("xx")));
 }
 
-TEST(MihostTraceFile, IsNotAnotherUsers)
+TEST_F(MihostTraceFile, IsNotAnotherUsers)
 {
-    layMachineWithoutTraces();
     machine::write(file, "theirs");
     ASSERT_EQ(chown(file, somebody, somebody), 0);
     expectRefused("it belongs to another user (name another file)");
     EXPECT_EQ(machine::read(file), "theirs");
 }
 
-TEST(MihostTraceFile, IsNotWhereAnotherUsersLinkLeads)
+TEST_F(MihostTraceFile, IsNotWhereAnotherUsersLinkLeads)
 {
-    layMachineWithoutTraces();
     machine::write("/etc/victim", "precious", 0600);
     ASSERT_EQ(symlink("/etc/victim", file), 0);
     ASSERT_EQ(lchown(file, somebody, somebody), 0);
@@ -111,9 +100,8 @@ TEST(MihostTraceFile, IsNotWhereAnotherUsersLinkLeads)
     EXPECT_EQ(machine::read("/etc/victim"), "precious");
 }
 
-TEST(MihostTraceFile, IsWhereTheOwnersLinkLeads)
+TEST_F(MihostTraceFile, IsWhereTheOwnersLinkLeads)
 {
-    layMachineWithoutTraces();
     machine::write("/var/tmp/real", "old");
     ASSERT_EQ(symlink("/var/tmp/real", file), 0);
     EXPECT_EQ(traced().code, 0);
@@ -125,9 +113,8 @@ TEST(MihostTraceFile, IsWhereTheOwnersLinkLeads)
     EXPECT_EQ(modeOf("/var/tmp/real"), 0600U);
 }
 
-TEST(MihostTraceFile, DoesNotChangeAFileWithAnotherName)
+TEST_F(MihostTraceFile, DoesNotChangeAFileWithAnotherName)
 {
-    layMachineWithoutTraces();
     machine::write("/etc/victim", "precious", 0600);
     ASSERT_EQ(link("/etc/victim", file), 0);
     EXPECT_EQ(traced().code, 0);
@@ -135,26 +122,24 @@ TEST(MihostTraceFile, DoesNotChangeAFileWithAnotherName)
     EXPECT_TRUE(isTrace(machine::read(file)));
 }
 
-TEST(MihostTraceFile, MayBeAPipeOrAStream)
+TEST_F(MihostTraceFile, MayBeAPipeOrAStream)
 {
-    layMachineWithoutTraces();
-    EXPECT_TRUE(isTrace(bash("$mihost --trace /dev/stderr get os 108 2>&1 >/dev/null | cat").out));
-    EXPECT_TRUE(isTrace(bash("$mihost --trace /dev/stdout get os 108 | cat").out));
-    EXPECT_TRUE(isTrace(bash("$mihost --trace /dev/fd/3 get os 108 3>&1 >/dev/null | cat").out));
-    EXPECT_TRUE(isTrace(bash("mkfifo /tmp/pipe; cat /tmp/pipe & "
-                             "$mihost --trace /tmp/pipe get os 108; wait")
-                            .out));
-    EXPECT_EQ(bash("$mihost --trace /dev/null get os 108 >&-").code, 2);
+    for (char const* line : {"$mihost --trace /dev/stderr get os 108 2>&1 >/dev/null | cat",
+                             "$mihost --trace /dev/stdout get os 108 | cat",
+                             "$mihost --trace /dev/fd/3 get os 108 3>&1 >/dev/null | cat",
+                             "mkfifo /tmp/pipe; cat /tmp/pipe & "
+                             "$mihost --trace /tmp/pipe get os 108; wait"})
+        EXPECT_TRUE(isTrace(bashRun(line).out)) << line;
+    EXPECT_EQ(bashRun("$mihost --trace /dev/null get os 108 >&-").code, 2);
     EXPECT_EQ(modeOf("/dev/null"), 0666U);
 }
 
-TEST(MihostTraceFile, AppendsToAStandardStream)
+TEST_F(MihostTraceFile, AppendsToAStandardStream)
 {
-    layMachineWithoutTraces();
     machine::write("/tmp/log", "first line\n");
-    EXPECT_EQ(bash("$mihost --trace /dev/stderr get os 108 2>>/tmp/log").code, 0);
+    EXPECT_EQ(bashRun("$mihost --trace /dev/stderr get os 108 2>>/tmp/log").code, 0);
     std::string const log = machine::read("/tmp/log");
-    EXPECT_EQ(log.rfind("first line\n{", 0), 0U);
+    EXPECT_TRUE(startsWith(log, "first line\n{"));
     EXPECT_TRUE(isTrace(log));
     EXPECT_EQ(modeOf("/tmp/log"), 0644U); // unchanged: the caller opened it
 }

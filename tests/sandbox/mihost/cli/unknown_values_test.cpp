@@ -1,18 +1,13 @@
 // Values that the plug-in cannot read are shown as unknown, not as zero.
 
-#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "tests/support/MihostJson.h"
 
-#include <filesystem>
 #include <gtest/gtest.h>
-#include <nlohmann/json.hpp>
 
 namespace unknown_values_test
 {
-
-using Json = nlohmann::ordered_json;
 
 class UnknownValues : public testing::Test
 {
@@ -20,8 +15,7 @@ protected:
     UnknownValues()
     {
         machine::lay("plain");
-        machine::write("/etc/login.defs",
-                       "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
+        machine::writeIdRanges();
         machine::write("/etc/passwd", "root:x:0:0:root:/root:/bin/sh\n"
                                       "anna:x:1000:1000::/home/anna:/bin/sh\n"
                                       "ben:x:1001:1001::/home/ben:/bin/sh\n");
@@ -34,23 +28,11 @@ protected:
         machine::write("/etc/shadow", text, 0600);
     }
 
-    static Outcome runAsUser(Lines arguments, std::string const& input = "")
-    {
-        using std::filesystem::perms;
-        for (auto folder = std::filesystem::path(MIHOST_FILE).parent_path(); folder != "/";
-             folder = folder.parent_path())
-            permissions(folder, perms::group_exec | perms::others_exec,
-                        std::filesystem::perm_options::add);
-        arguments.insert(arguments.begin(),
-                         {"/usr/bin/setpriv", "--reuid=65534", "--clear-groups", MIHOST_FILE});
-        return runToEnd(arguments, input);
-    }
-
     /** The names of the properties that are shown as unknown. */
     static Lines unknownOf(std::string const& user, std::string const& reason)
     {
         Lines names;
-        Json const node = Json::parse(mihostRun({"--json", "get", user}).out);
+        Json const node = mihostJson({"get", user});
         for (auto const& [name, property] : node["properties"].items())
             if (property.contains("unknown")) {
                 EXPECT_EQ(property["unknown"], reason);
@@ -70,7 +52,7 @@ constexpr char warning[] = "mihost: reading passwords and ageing: /etc/shadow ca
 
 TEST_F(UnknownValues, AreShownAsADashWithOneWarning)
 {
-    Outcome const outcome = runAsUser(
+    Outcome const outcome = machine::mihostRunAsUser(
         {"get", "user:anna", "password-max-days", "password", "last-password-change", "user-name"});
     EXPECT_EQ(outcome.code, 0);
     EXPECT_EQ(outcome.out, "163 password-max-days     -\n117 password              -\n"
@@ -80,26 +62,19 @@ TEST_F(UnknownValues, AreShownAsADashWithOneWarning)
          {Lines{"tree", "--all"}, Lines{"--json", "tree"},
           Lines{"list", "users", "--columns", "user-name,password-max-days"},
           Lines{"watch", "user:root", "inactive-time", "--count", "2", "--interval", "0"}})
-        EXPECT_EQ(runAsUser(words).err, warning) << words[0];
-}
-
-TEST_F(UnknownValues, AreReportedOnlyIfTheyAreShown)
-{
+        EXPECT_EQ(machine::mihostRunAsUser(words).err, warning) << words[0];
     for (Lines const& words : {Lines{"tree"}, Lines{"list", "users"},
                                Lines{"get", "user:anna", "user-name"}, Lines{"get", "os"}})
-        EXPECT_EQ(runAsUser(words).err, "") << words[0];
-}
-
-TEST_F(UnknownValues, AreReportedForEachLineOfAScript)
-{
-    Outcome const outcome =
-        runAsUser({"shell"}, "get user:anna 163\nget os 108\nget user:anna 163\n");
-    EXPECT_EQ(outcome.err, std::string(warning) + warning);
+        EXPECT_EQ(machine::mihostRunAsUser(words).err, "") << words[0]; // none is shown
+    EXPECT_EQ(
+        machine::mihostRunAsUser({"shell"}, "get user:anna 163\nget os 108\nget user:anna 163\n")
+            .err,
+        std::string(warning) + warning); // once for each line
 }
 
 TEST_F(UnknownValues, AreNullInJsonWithTheReason)
 {
-    Outcome const outcome = runAsUser({"--json", "get", "user:anna", "118", "117"});
+    Outcome const outcome = machine::mihostRunAsUser({"--json", "get", "user:anna", "118", "117"});
     Json const properties = Json::parse(outcome.out)["properties"];
     for (Json const& property : properties) {
         EXPECT_EQ(property["value"], nullptr) << property;

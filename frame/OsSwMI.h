@@ -53,8 +53,9 @@ public:
     void createLogEntryNodes(bool refresh);
 
 protected:
-    MutableNode* currentNode_ = nullptr;           // the node being built
-    std::vector<unsigned int>* nodeIds_ = nullptr; // from initialize to unload
+    MutableNode* currentNode_ = nullptr; // the node being built
+    // Contract: from initialize to unload; ids are appended, and nothing here reads them.
+    std::vector<unsigned int>* nodeIds_ = nullptr;
     MutableNode* osSwNode_ = nullptr;
     MutableNode* rootNode_ = nullptr;
     MutableNode* computerNode_ = nullptr;
@@ -68,7 +69,7 @@ private:
     /** Takes the next node id and notes it in the node-id list. */
     MI_INTERNAL unsigned int takeNodeId();
 
-    /** Takes the next node id for a rebuild, which does not note ids. */
+    /** Takes the next node id only. Contract: rebuilt user and group nodes are not noted. */
     MI_INTERNAL unsigned int takeUnnotedNodeId();
 
     /**

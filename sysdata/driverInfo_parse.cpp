@@ -15,12 +15,12 @@ namespace
 struct Key {
     char const* name;
     int (driverInfo::*set)(std::string);
-    unsigned int Seen::*count;
+    bool Seen::*seen;
 };
 
 constexpr Key keys[] = {
-    {"version:", &driverInfo::setVersion, &Seen::versions},
-    {"description:", &driverInfo::setDescription, &Seen::descriptions},
+    {"version:", &driverInfo::setVersion, &Seen::version},
+    {"description:", &driverInfo::setDescription, &Seen::description},
 };
 
 } // namespace
@@ -44,7 +44,7 @@ bool takeFact(char* line, driverInfo& driver, Seen& seen)
         if (!space)
             return false;
         (driver.*key.set)(strget(space, ' '));
-        ++(seen.*key.count);
+        seen.*key.seen = true;
         return true;
     }
     return true;
@@ -52,9 +52,9 @@ bool takeFact(char* line, driverInfo& driver, Seen& seen)
 
 void complete(driverInfo& driver, Seen const& seen, char const* module)
 {
-    if (seen.versions == 0)
+    if (!seen.version)
         driver.setVersion("");
-    if (seen.descriptions == 0)
+    if (!seen.description)
         driver.setDescription("Driver");
     driver.setName(module);
     driver.setBuildNumber("");

@@ -27,14 +27,15 @@ bool findModule(char const* line, char (&module)[lineSize]);
 /** Contract: treats every module whose name begins with "Module" as the header, too. */
 bool isHeader(char const* module);
 
-/** How often each fact occurred in the output of modinfo for one module; the last one counts. */
+/** Which facts the output of modinfo for one module had so far. */
 struct Seen {
-    unsigned int versions = 0;
-    unsigned int descriptions = 0;
+    bool version = false;
+    bool description = false;
 };
 
 /**
- * Sets the version or the description from a line of modinfo; ignores other lines.
+ * Sets the version or the description from a line of modinfo, in place of an earlier one; ignores
+ * other lines.
  *
  * @param line  changed in place
  * @return false for a version or description without a space after it; the driver is unchanged

@@ -13,6 +13,7 @@ namespace NQ
 namespace
 {
 
+// Contract: one in the file ends it, too; a NUL does not.
 constexpr char endMark = '\xFF';
 constexpr std::size_t keyLength = 7;
 

@@ -87,18 +87,6 @@ bool isBenign(std::string const& output);
 /** Whether the output begins with one of chage's own notices. */
 bool isAgingNotice(std::string const& output);
 
-/** What happens to a member. */
-enum class Membership { add, remove };
-
-/**
- * The supplementary groups that a member shall have, comma-separated.
- *
- * @param identity     what id printed about the member
- * @param quotedGroup  the group to add or to leave out, in double quotes
- */
-std::string supplementaryGroups(std::string const& identity, std::string const& quotedGroup,
-                                Membership change);
-
 } // namespace os
 
 } // namespace NQ

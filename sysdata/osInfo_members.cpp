@@ -1,5 +1,7 @@
 // Group membership: usermod sets the whole list of a user's groups, so id reads it first.
 
+#include "sysdata/osInfo_members.h"
+
 #include "host/Methods.h"
 #include "sysdata/osInfo_commands.h"
 #include "sysdata/osInfo_linux.h"

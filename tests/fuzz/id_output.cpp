@@ -1,4 +1,4 @@
-#include "sysdata/osInfo_commands.h"
+#include "sysdata/osInfo_members.h"
 #include "tests/fuzz/support/System.h"
 
 // What id prints.

@@ -86,8 +86,8 @@ TEST(DriverFacts, TakeTheVersionAfterTheBlanks)
     Facts facts;
     EXPECT_TRUE(facts.take("version:        7.3.21-k8-NAPI\n"));
     EXPECT_EQ(facts.driver.getVersion(), "7.3.21-k8-NAPI");
-    EXPECT_EQ(facts.seen.versions, 1U);
-    EXPECT_EQ(facts.seen.descriptions, 0U);
+    EXPECT_TRUE(facts.seen.version);
+    EXPECT_FALSE(facts.seen.description);
 }
 
 TEST(DriverFacts, TakeTheDescriptionAfterTheBlanks)
@@ -95,8 +95,8 @@ TEST(DriverFacts, TakeTheDescriptionAfterTheBlanks)
     Facts facts;
     EXPECT_TRUE(facts.take("description:    Intel(R) PRO/1000 Network Driver\n"));
     EXPECT_EQ(facts.driver.getDescription(), "Intel(R) PRO/1000 Network Driver");
-    EXPECT_EQ(facts.seen.descriptions, 1U);
-    EXPECT_EQ(facts.seen.versions, 0U);
+    EXPECT_TRUE(facts.seen.description);
+    EXPECT_FALSE(facts.seen.version);
 }
 
 TEST(DriverFacts, KeepBlanksAndCarriageReturnsAtTheEnd)
@@ -126,7 +126,7 @@ TEST(DriverFacts, AreNotTakenFromKeysThatMerelyEndInVersion)
     EXPECT_TRUE(facts.take("srcversion:     0D3AAC3E6C2A4A0A0F0E9F1\n"));
     EXPECT_TRUE(facts.take("vermagic:       6.1.0-13-amd64 SMP preempt mod_unload modversions\n"));
     EXPECT_TRUE(facts.take("rhelversion:    9.3\n"));
-    EXPECT_EQ(facts.seen.versions, 0U);
+    EXPECT_FALSE(facts.seen.version);
     EXPECT_EQ(facts.driver.getVersion(), "");
 }
 
@@ -135,8 +135,8 @@ TEST(DriverFacts, AreNotTakenFromKeysAfterABlank)
     Facts facts;
     EXPECT_TRUE(facts.take(" version: 1.0\n"));
     EXPECT_TRUE(facts.take("\tdescription: disk\n"));
-    EXPECT_EQ(facts.seen.versions, 0U);
-    EXPECT_EQ(facts.seen.descriptions, 0U);
+    EXPECT_FALSE(facts.seen.version);
+    EXPECT_FALSE(facts.seen.description);
 }
 
 TEST(DriverFacts, AreTakenFromExactKeysOnly)
@@ -147,8 +147,8 @@ TEST(DriverFacts, AreTakenFromExactKeysOnly)
     EXPECT_TRUE(facts.take("description disk\n"));
     EXPECT_TRUE(facts.take("versio"));
     EXPECT_TRUE(facts.take(""));
-    EXPECT_EQ(facts.seen.versions, 0U);
-    EXPECT_EQ(facts.seen.descriptions, 0U);
+    EXPECT_FALSE(facts.seen.version);
+    EXPECT_FALSE(facts.seen.description);
 }
 
 TEST(DriverFacts, LetTheLastOccurrenceWin)
@@ -160,8 +160,8 @@ TEST(DriverFacts, LetTheLastOccurrenceWin)
     facts.take("description: second\n");
     EXPECT_EQ(facts.driver.getVersion(), "2");
     EXPECT_EQ(facts.driver.getDescription(), "second");
-    EXPECT_EQ(facts.seen.versions, 2U);
-    EXPECT_EQ(facts.seen.descriptions, 2U);
+    EXPECT_TRUE(facts.seen.version);
+    EXPECT_TRUE(facts.seen.description);
 }
 
 TEST(DriverFacts, AreRefusedWithoutASpace)
@@ -173,8 +173,8 @@ TEST(DriverFacts, AreRefusedWithoutASpace)
     EXPECT_FALSE(facts.take("version:\t2\n"));
     EXPECT_FALSE(facts.take("description:\n"));
     EXPECT_EQ(facts.driver.getVersion(), "1");
-    EXPECT_EQ(facts.seen.versions, 1U);
-    EXPECT_EQ(facts.seen.descriptions, 0U);
+    EXPECT_TRUE(facts.seen.version);
+    EXPECT_FALSE(facts.seen.description);
 }
 
 TEST(DriverFacts, CountAValueOfBlanksAsSeenAndEmpty)
@@ -183,7 +183,7 @@ TEST(DriverFacts, CountAValueOfBlanksAsSeenAndEmpty)
     EXPECT_TRUE(facts.take("description: something\n"));
     EXPECT_TRUE(facts.take("description:    \n"));
     EXPECT_EQ(facts.driver.getDescription(), "");
-    EXPECT_EQ(facts.seen.descriptions, 2U);
+    EXPECT_TRUE(facts.seen.description);
 }
 
 TEST(DriverCompletion, DefaultsWhatWasNeverSeen)

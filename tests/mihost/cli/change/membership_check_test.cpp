@@ -1,6 +1,6 @@
 #include "mihost/cli/change/MembershipCheck.h"
 
-#include "sysdata/osInfo_commands.h"
+#include "sysdata/osInfo_members.h"
 
 #include <cctype>
 #include <cstring>

@@ -3,7 +3,7 @@
 # descriptions in debian/control apply to the RPMs, too.
 
 # Packages are made of a whole build.
-if(NOT TARGET mihost OR NOT TARGET miaccel OR NOT TARGET mihost-exporter)
+if(NOT MI_PROGRAM)
     return()
 endif()
 

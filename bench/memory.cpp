@@ -58,7 +58,8 @@ void measureRefreshes(int many)
     IC::MutableNode& os = plugin.node(IC::nodeType::operatingSystem);
     Table table({"Refreshes", "Heap, bytes", "Resident, bytes"});
     for (int done = 1; done <= many; ++done) {
-        os.setProperty(IC::property::refresh, IC::PropertyValue(IC::Number(0U), true));
+        os.setProperty(IC::property::refresh,
+                       IC::PropertyValue(IC::Number(IC::command::rebuild), true));
         if (done != few && done != many)
             continue;
         Memory const now = memoryNow();

@@ -52,7 +52,8 @@ int main(int argc, char* argv[])
     IC::MutableNode& os = plugin().node(IC::nodeType::operatingSystem);
     for (int left = std::atoi(argv[1]); left > 0; --left) {
         double const before = millisecondsNow();
-        os.setProperty(IC::property::refresh, IC::PropertyValue(IC::Number(0U), true));
+        os.setProperty(IC::property::refresh,
+                       IC::PropertyValue(IC::Number(IC::command::rebuild), true));
         std::printf("%.4f\n", millisecondsNow() - before);
     }
     return EXIT_SUCCESS;

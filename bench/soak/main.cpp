@@ -10,9 +10,9 @@
 // the way; flat figures mean no leak. SHARE, a percentage, shortens all three. Exits 1
 // when descriptors or children grew, or memory by more than 2 percent between 50 and 100.
 
+#include "bench/support/MadeUp.h"
+#include "bench/support/Timed.h"
 #include "host/Properties.h"
-#include "mihost/sandbox/Sandbox.h"
-#include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 
 #include <cstdio>
@@ -47,29 +47,6 @@ Figures figuresNow()
         ++children;
     return {resident * (sysconf(_SC_PAGESIZE) / 1024), std::distance(begin(listing), end(listing)),
             children};
-}
-
-/** Accounts from 1000 on, each with its own group, and a short log. */
-void makeMachine(int users)
-{
-    std::string passwd = "root:x:0:0:root:/root:/bin/bash\n";
-    std::string shadow = "root:*:19000:0:99999:7:::\n";
-    std::string group = "root:x:0:\n";
-    for (int number = 0; number < users; ++number) {
-        std::string const id = std::to_string(10000 + number);
-        passwd +=
-            "user" + id + ":x:" + id + ':' + id + ":User " + id + ":/home/user" + id + ":/bin/sh\n";
-        shadow += "user" + id + ":$6$salt$hash:19000:0:99999:7:::\n";
-        group += "user" + id + ":x:" + id + ":root\n";
-    }
-    machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\nGID_MAX 60000\n");
-    machine::write("/etc/passwd", passwd);
-    machine::write("/etc/shadow", shadow);
-    machine::write("/etc/group", group);
-    machine::write("/etc/pam.d/login", "auth required pam_tally2.so deny=3\n");
-    machine::fake("/usr/sbin/lsmod", "echo Module Size Used by\necho loop 1 0\n");
-    machine::fake("/usr/sbin/modinfo", "echo description: Loopback\n");
-    machine::write("/var/log/messages", "Nov  1 10:00:00 host daemon: one\n");
 }
 
 /** @return whether nothing grew */
@@ -116,21 +93,20 @@ private:
 } // namespace
 
 int main(int argc, char** argv)
-{
+try {
     int const share = argc > 1 ? std::atoi(argv[1]) : 100;
     if (share < 1 || share > 100) {
         std::cerr << "soak: SHARE is a percentage from 1 to 100\n";
         return 2;
     }
-    if (auto const reason = mihost::enterSandbox()) {
-        std::cerr << "soak: no copy of this machine can be had: " << *reason << '\n';
-        return 1;
-    }
+    enterCopy();
+    madeUp::modules(1);
+    madeUp::systemLog(1);
     std::printf(
         "| what | times | at 10 %% (memory, descriptors, children) | at 50 %% | at 100 %% |\n"
         "|---|---|---|---|---|\n");
     bool flat = true;
-    makeMachine(1000);
+    madeUp::accounts(1000);
     {
         Plugin plugin;
         plugin.initialize();
@@ -139,11 +115,11 @@ int main(int argc, char** argv)
         flat = report("refreshes", 10 * share,
                       [&os](int) {
                           os.setProperty(IC::property::refresh,
-                                         IC::PropertyValue(IC::Number(0U), true));
+                                         IC::PropertyValue(IC::Number(IC::command::rebuild), true));
                       }) &&
                flat;
     }
-    makeMachine(10);
+    madeUp::accounts(10);
     flat = report("load, start, stop, close", 10 * share,
                   [](int) {
                       Plugin plugin;
@@ -153,4 +129,7 @@ int main(int argc, char** argv)
     if (!flat)
         std::cerr << "soak: something grew\n";
     return flat ? 0 : 1;
+} catch (std::exception const& problem) {
+    std::cerr << "soak: " << problem.what() << '\n';
+    return 1;
 }

@@ -45,7 +45,7 @@ Timed timed(std::vector<std::string> const& arguments)
 void enterCopy()
 {
     if (auto const reason = mihost::enterSandbox())
-        throw std::runtime_error("no copy of this machine can be had: " + *reason);
+        throw std::runtime_error("cannot copy this machine: " + *reason);
     setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
     setenv("LC_ALL", "C", 1);
 }

@@ -31,7 +31,7 @@ Error GroupNode::getProperty(unsigned int id, PropertyValue& value) const
     std::vector<groupInfo> groups;
     NQ::getGroupInfo(groups);
     value = values::number(static_cast<unsigned int>(groups.size()));
-    return {0, Number(0U), ""};
+    return {0, Number(0U), ""}; // Contract: elsewhere the code is empty
 }
 
 void OsSwMI::createGroupNodes(bool refresh)

@@ -3,7 +3,6 @@
 #include "frame/OsSwMI.h"
 #include "host/Methods.h"
 #include "host/Properties.h"
-#include "host/make_string.h"
 #include "nodes/OsNode.h"
 #include "nodes/nodeValues.h"
 #include "sysdata/logInfo_linux.h"
@@ -30,7 +29,7 @@ void rebuildAccounts()
 bool administer(NQ::OsInfo& info, PropertyValue const& value, NQ::log::Scope const& scope)
 {
     scope.progress("PropertyType::CreateUser: entry");
-    std::string const call = NQ::make_string(NQ::make_wstring(static_cast<std::string>(value)));
+    std::string const call = values::textOf(value);
     if (call.empty() || call == "dummy")
         return true;
     if (call.find(parameter::password) == std::string::npos)

@@ -2,7 +2,6 @@
 
 #include "frame/OsSwMI.h"
 #include "host/Properties.h"
-#include "host/make_string.h"
 #include "nodes/nodeValues.h"
 #include "sysdata/userInfo_linux.h"
 #include "util/MutexLock.h"
@@ -80,17 +79,11 @@ void setUserProperties(MutableNode& node, userInfo& user, std::size_t userCount)
          {property::elementCount, number(userCount)}});
 }
 
-/** Through wide text and back, as all texts of the host are read. */
-std::string textOf(PropertyValue const& value)
-{
-    return NQ::make_string(NQ::make_wstring(value));
-}
-
 std::string textOf(MutableNode const& node, unsigned int id)
 {
     PropertyValue value = values::emptyValue();
     node.getProperty(id, value);
-    return textOf(value);
+    return values::textOf(value);
 }
 
 /** Sets an account's encrypted password with chpasswd, which reads it from a file. */
@@ -110,13 +103,13 @@ void act(MutableNode const& node, unsigned int id, PropertyValue const& value,
 {
     switch (id) {
     case property::password:
-        setPassword(textOf(node, property::name), textOf(value), scope);
+        setPassword(textOf(node, property::name), values::textOf(value), scope);
         break;
     case property::inactiveTime:
-        userInfo().setInactivityTimeout(textOf(value), textOf(node, property::name));
+        userInfo().setInactivityTimeout(values::textOf(value), textOf(node, property::name));
         break;
     case property::passwordExpiration:
-        userInfo().setPasswordExpiration(textOf(value), textOf(node, property::name));
+        userInfo().setPasswordExpiration(values::textOf(value), textOf(node, property::name));
         break;
     case property::deleteUser:
         if (static_cast<unsigned int>(value) == command::deleteAccount)
@@ -150,7 +143,7 @@ Error UserNode::getProperty(unsigned int id, PropertyValue& value) const
     std::vector<userInfo> users;
     NQ::getUserInfo(users);
     value = number(users.size());
-    return {0, Number(0U), ""};
+    return {0, Number(0U), ""}; // Contract: elsewhere the code is empty
 }
 
 Error UserNode::setProperty(unsigned int const& id, PropertyValue const& value)

@@ -1,5 +1,7 @@
 #include "nodes/nodeValues.h"
 
+#include "host/make_string.h"
+
 namespace IC::values
 {
 
@@ -41,6 +43,11 @@ PropertyValue fixedNumberList()
 PropertyValue emptyValue()
 {
     return {PropertyValue::EmptyKind, true};
+}
+
+std::string textOf(PropertyValue const& value)
+{
+    return NQ::make_string(NQ::make_wstring(value));
 }
 
 Error success()

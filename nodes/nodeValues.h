@@ -33,6 +33,9 @@ PropertyValue fixedNumberList();
 /** A value of kind 0, to be filled by a read. */
 PropertyValue emptyValue();
 
+/** What a host wrote, as text. Contract: through wide text and back. */
+std::string textOf(PropertyValue const& value);
+
 Error success();
 Error failure();
 

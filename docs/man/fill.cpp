@@ -1,4 +1,4 @@
-// fill TEMPLATE: prints a manual page, with lists from the catalogue where the template has
+// fill_page TEMPLATE: prints a manual page, with lists from the catalogue where the template has
 // @PROPERTIES@ and @METHODS@ on lines of their own.
 
 #include "mihost/cli/output/CatalogueText.h"
@@ -98,7 +98,7 @@ int main(int argc, char* argv[])
                                                                   {"@METHODS@", writeMethods}};
     std::ifstream page(argc > 1 ? argv[1] : "");
     if (!page) {
-        std::cerr << "fill TEMPLATE\n";
+        std::cerr << "usage: fill_page TEMPLATE\n";
         return EXIT_FAILURE;
     }
     for (std::string line; std::getline(page, line);) {

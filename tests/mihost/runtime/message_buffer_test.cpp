@@ -42,23 +42,20 @@ bool isSurrogate(char32_t code)
     return code >= 0xD800 && code <= 0xDFFF;
 }
 
-TEST(MakeString, CopiesANarrowText)
+TEST(MakeString, CopiesANarrowTextAndReadsNullAsEmpty)
 {
     EXPECT_EQ(make_string("text"), "text");
     EXPECT_EQ(make_string(""), "");
-}
-
-TEST(MakeString, TurnsANullPointerIntoTheEmptyText)
-{
     EXPECT_EQ(make_string(static_cast<char const*>(nullptr)), "");
 }
 
-TEST(MakeWstring, DecodesUtf8)
+TEST(MakeWstring, DecodesUtf8AndContinuesAfterOtherBytes)
 {
     EXPECT_EQ(make_wstring("jdoe"), L"jdoe");
     EXPECT_EQ(make_wstring("J\xC3\xB6rg \xE2\x82\xAC \xF0\x9F\x98\x80"),
               L"J\u00F6rg \u20AC \U0001F600");
     EXPECT_EQ(make_wstring(""), L"");
+    EXPECT_EQ(make_wstring("\xC3(\xC3\xB6"), (std::wstring{0xDCC3, L'(', 0xF6}));
 }
 
 TEST(MakeWstring, DecodesAndEncodesEveryCodePoint)
@@ -144,11 +141,6 @@ TEST(MakeWstring, DecodesBytesThatAreNotUtf8OneByOne)
                       0xDC00U + static_cast<unsigned char>(test.bytes[i]))
                 << test.what;
     }
-}
-
-TEST(MakeWstring, ContinuesAfterAByteThatIsNotUtf8)
-{
-    EXPECT_EQ(make_wstring("\xC3(\xC3\xB6"), (std::wstring{0xDCC3, L'(', 0xF6}));
 }
 
 using VXLog::VXMessageBuffer;

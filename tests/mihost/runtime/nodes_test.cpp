@@ -31,23 +31,19 @@ protected:
     MutableNode node_{5, 4, {1, 2}, 46, 3};
 };
 
-TEST_F(NodeStore, KeepsItsIdsTypeAndIndex)
+TEST_F(NodeStore, KeepsItsIdsTypeAndIndexAndNothingElseAtFirst)
 {
     EXPECT_EQ(node_.getNodeId(), 5U);
     EXPECT_EQ(node_.getLinkedId(), 4U);
     EXPECT_EQ(node_.getMIIds(), (std::vector<unsigned int>{1, 2}));
     EXPECT_EQ(node_.getNodeType(), 46U);
     EXPECT_EQ(node_.getIndex(), 3U);
-}
-
-TEST_F(NodeStore, HoldsNothingElseAtFirst)
-{
     EXPECT_EQ(node_.getStatus(), 0U);
     EXPECT_EQ(node_.getDescription(), "");
     EXPECT_TRUE(node_.getProperties().empty());
 }
 
-TEST_F(NodeStore, KeepsStatusAndDescription)
+TEST_F(NodeStore, KeepsStatusDescriptionPathAndParent)
 {
     EXPECT_EQ(node_.setStatus(1).getStatus(), 0U);
     EXPECT_EQ(node_.setDescription("User Account").getStatus(), 0U);
@@ -57,10 +53,6 @@ TEST_F(NodeStore, KeepsStatusAndDescription)
     EXPECT_EQ(base.Node::getStatus(), 1U);
     EXPECT_EQ(base.Node::getDescription(), "User Account");
     EXPECT_EQ(static_cast<std::string>(base), "User Account");
-}
-
-TEST_F(NodeStore, KeepsAPathAndAParent)
-{
     EXPECT_EQ(node_.setPath("/os/users").getStatus(), 0U);
     EXPECT_EQ(node_.setParent("os").getStatus(), 0U);
 }
@@ -85,17 +77,13 @@ TEST_F(NodeStore, ReplacesAnEarlierValueOfTheSameProperty)
     EXPECT_FALSE(node_.getProperties().at(108).getFlag());
 }
 
-TEST_F(NodeStore, KeepsPropertiesApart)
+TEST_F(NodeStore, KeepsPropertiesApartAndReturnsACopy)
 {
     node_.setProperty(0, PropertyValue("zero", true));
     node_.setProperty(4294967295U, PropertyValue("last", true));
     EXPECT_EQ(text(0), "zero");
     EXPECT_EQ(text(4294967295U), "last");
     EXPECT_EQ(text(1), "none");
-}
-
-TEST_F(NodeStore, ReturnsACopyOfItsProperties)
-{
     node_.setProperty(108, PropertyValue("first", true));
     auto properties = node_.getProperties();
     properties.clear();

@@ -14,9 +14,10 @@ Paths mountsIn(std::string const& text)
     return mihost::mountsToCopy(folder.write("mountinfo", text));
 }
 
-TEST(MountTable, LeavesTheRootOut)
+TEST(MountTable, LeavesOutTheRootAndLinesThatEndEarly)
 {
     EXPECT_EQ(mountsIn("1 0 8:1 / / rw,relatime - ext4 /dev/sda1 rw\n"), Paths());
+    EXPECT_EQ(mountsIn("2 1 8:2 / /home rw shared:1\n\n2 1 8:2\n"), Paths());
 }
 
 TEST(MountTable, ListsOtherDisksParentsFirstAndEachOnce)
@@ -40,32 +41,19 @@ TEST(MountTable, LeavesOutFileSystemsThatTheCopyHasItself)
               Paths());
 }
 
-TEST(MountTable, LeavesOutTheKernelsOwnFileSystemsAnywhere)
+TEST(MountTable, LeavesOutTheKernelsOwnFileSystemsByWholeNames)
 {
     EXPECT_EQ(mountsIn("2 1 0:2 / /misc rw - autofs /etc/auto.misc rw\n"
                        "3 1 0:3 / /srv/jail/proc rw - proc proc rw\n"),
               Paths());
-}
-
-TEST(MountTable, ComparesWholeComponentsOfAPath)
-{
     EXPECT_EQ(mountsIn("2 1 8:2 / /runtime rw - ext4 /dev/sda2 rw\n"), Paths{"/runtime"});
 }
 
-TEST(MountTable, ReadsEscapedCharacters)
+TEST(MountTable, ReadsOnlyCharactersThatAreEscaped)
 {
     EXPECT_EQ(mountsIn("2 1 8:2 / /a\\040b\\011c\\012d\\134e rw - ext4 /dev/x rw\n"),
               Paths{"/a b\tc\nd\\e"});
-}
-
-TEST(MountTable, KeepsABackslashThatEscapesNothing)
-{
     EXPECT_EQ(mountsIn("2 1 8:2 / /a\\9\\1 rw - ext4 /dev/x rw\n"), Paths{"/a\\9\\1"});
-}
-
-TEST(MountTable, LeavesOutLinesThatEndEarly)
-{
-    EXPECT_EQ(mountsIn("2 1 8:2 / /home rw shared:1\n\n2 1 8:2\n"), Paths());
 }
 
 TEST(MountTable, IsNotTreatedAsEmptyIfItCannotBeRead)

@@ -23,15 +23,11 @@ TEST(LoginDefs, HasBothRanges)
     EXPECT_EQ(defs.missingKeys(), Lines());
 }
 
-TEST(LoginDefs, KnowsTheKeysWithoutANumber)
+TEST(LoginDefs, TakesTheLastNumberOfEachKeyAndNamesMissingOnes)
 {
     EXPECT_EQ(LoginDefs("").missingKeys(), (Lines{"UID_MIN", "UID_MAX", "GID_MIN", "GID_MAX"}));
     EXPECT_EQ(LoginDefs("UID_MIN\n#UID_MAX 1\n UID_MAX 1\nGID_MIN x\nGID_MAX 5\n").missingKeys(),
               (Lines{"UID_MIN", "UID_MAX", "GID_MIN"}));
-}
-
-TEST(LoginDefs, TakesTheLastNumberUntilEveryKeyWasFound)
-{
     LoginDefs const defs("UID_MIN 1\nUID_MIN 2\nUID_MIN none\nUID_MAX 9\nGID_MIN 3\n"
                          "GID_MAX 4\nGID_MAX 5\n");
     EXPECT_EQ(defs.users().lowest, 2U);
@@ -64,7 +60,7 @@ TEST(LoginDefs, FindsTheEncryptMethodAnywhereInItsLine)
               "YESCRYPT");
 }
 
-TEST(IdRange, HoldsItsBoundsAndZero)
+TEST(IdRange, HoldsItsBoundsAndZeroAndSaysWhichIsExceeded)
 {
     auto const range = LoginDefs(usual).users();
     for (unsigned int const id : {0U, 1000U, 60000U}) {
@@ -73,10 +69,6 @@ TEST(IdRange, HoldsItsBoundsAndZero)
     }
     EXPECT_FALSE(range.holds(999));
     EXPECT_FALSE(range.holds(60001));
-}
-
-TEST(IdRange, SaysWhichBoundAnIdIsBeyond)
-{
     LoginDefs const defs(usual);
     EXPECT_EQ(defs.users().objectionTo("uid", 65534), "uid 65534 is above UID_MAX 60000");
     EXPECT_EQ(defs.groups().objectionTo("gid", 2), "gid 2 is below GID_MIN 500");

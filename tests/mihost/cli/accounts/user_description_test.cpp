@@ -73,10 +73,6 @@ TEST(UserDescription, SaysWhyAnAccountHasNoNode)
 {
     EXPECT_EQ(describeUser(machineWith(""), "root")->noNode, "");
     EXPECT_EQ(describeUser(machineWith(""), "nobody")->noNode, "uid 65534 is above UID_MAX 60000");
-}
-
-TEST(UserDescription, IsMissingForAnUnknownName)
-{
     for (char const* name : {"none", "jdo", "jdoe:x", "odd", ""})
         EXPECT_FALSE(describeUser(machineWith(""), name)) << name;
 }
@@ -129,10 +125,6 @@ TEST(UserDescription, KnowsWhatIsStoredForAPassword)
           Case{"geheim42", PasswordState::Unusable}, Case{"", PasswordState::None}})
         EXPECT_EQ(jdoe("jdoe:" + std::string(each.stored) + ":19990::::::").password, each.state)
             << each.stored;
-}
-
-TEST(UserDescription, ReadsAPasswordFromTheAccountFile)
-{
     UserDescription const user = describeUser(machineWith(""), "nobody").value();
     EXPECT_EQ(user.password, PasswordState::Unusable);
     EXPECT_EQ(user.unknown, "");

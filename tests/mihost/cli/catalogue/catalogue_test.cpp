@@ -20,10 +20,6 @@ TEST(Catalogue, GivesEachPropertyOfAKindItsOwnIdAndName)
             EXPECT_STRNE(property.meaning, "") << kind.name << property.name;
         }
     }
-}
-
-TEST(Catalogue, HasNoNameThatLooksLikeAnId)
-{
     for (auto const& kind : nodeKinds())
         for (auto const& property : kind.properties)
             EXPECT_NE(std::string(property.name).find_first_not_of("0123456789"),

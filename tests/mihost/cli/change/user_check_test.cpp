@@ -25,34 +25,22 @@ std::string objectionToChange(Account const& node)
     return objectionToUserWrite(node, UserWrite::Change, accounts).value_or("none");
 }
 
-TEST(UserDelete, IsRefusedIfTheUidIsTheNameOfAnotherAccount)
+TEST(UserDelete, IsRefusedUnlessTheUidIsTheNameOfTheAccount)
 {
     EXPECT_EQ(objectionToDelete({"jdoe", "1500"}),
               "userdel would get the UID 1500, which is the name of another account: '1500' "
               "would be deleted (use 'mihost user delete jdoe', which keeps the home "
               "directory)");
-}
-
-TEST(UserDelete, IsRefusedIfTheUidIsNobodysName)
-{
     EXPECT_EQ(objectionToDelete({"ann", "1001"}),
               "userdel would get the UID 1001, but accepts only names (use 'mihost user delete "
               "ann', which keeps the home directory)");
-}
-
-TEST(UserDelete, IsDoneIfTheAccountIsNamedLikeItsOwnUid)
-{
     EXPECT_EQ(objectionToDelete({"1002", "1002"}), "none");
 }
 
-TEST(UserWrites, ReachTheAccountOfTheNode)
+TEST(UserWrites, AreRefusedIfTheyWouldNotReachTheAccountOfTheNode)
 {
     for (Account const& account : {accounts[0], accounts[1], accounts[2], accounts[3]})
         EXPECT_EQ(objectionToChange(account), "none") << account.name;
-}
-
-TEST(UserWrites, AreRefusedIfTheNameIsGoneOrBelongsToAnotherUid)
-{
     EXPECT_EQ(objectionToChange({"gone", "1001"}),
               "no account is named 'gone' (run 'mihost refresh')");
     EXPECT_EQ(objectionToChange({"jdoe", "1501"}),

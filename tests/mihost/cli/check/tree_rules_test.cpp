@@ -179,7 +179,7 @@ public:
     }
 };
 
-TEST(CheckOfReads, NamesUnknownPropertiesAndWrongKinds)
+TEST(CheckOfReads, NamesUnknownWrongAndMissingValues)
 {
     AnswersAll node(9, 0, {}, IC::nodeType::computer, 0);
     EXPECT_EQ(wrongReads({&node}),
@@ -187,10 +187,6 @@ TEST(CheckOfReads, NamesUnknownPropertiesAndWrongKinds)
     AnswersAll group(9, 0, {}, IC::nodeType::group, 1);
     EXPECT_EQ(wrongReads({&group}).front(),
               "group #9: group-id (89): reads as text rather than number");
-}
-
-TEST(CheckOfReads, NamesStoredPropertiesThatAreNotAnswered)
-{
     IC::MutableNode os(9, 0, {}, IC::nodeType::operatingSystem, 0);
     EXPECT_EQ(wrongReads({&os}), Findings{"os #9: clear-log (191): cannot be read"});
 }

@@ -68,24 +68,16 @@ private:
     std::vector<std::unique_ptr<IC::MutableNode>> owned_;
 };
 
-TEST_F(Addresses, FindSingleNodesByKindAndAnyNodeById)
+TEST_F(Addresses, FindNodesByIdByKindAndByName)
 {
     EXPECT_EQ(find("mi"), 1U);
     EXPECT_EQ(find("os"), 4U);
     EXPECT_EQ(find("log"), 9U);
     EXPECT_EQ(find("11"), 11U);
-}
-
-TEST_F(Addresses, FindRepeatedNodesByKindAndName)
-{
     EXPECT_EQ(find("user:jdoe"), 5U);
     EXPECT_EQ(find("group:jdoe"), 7U);
     EXPECT_EQ(find("driver:ext4"), 8U);
     EXPECT_EQ(find("log:1"), 10U);
-}
-
-TEST_F(Addresses, TakeEverythingAfterTheFirstColonAsTheName)
-{
     EXPECT_EQ(find("user:a:b"), 6U);
 }
 
@@ -103,15 +95,11 @@ TEST_F(Addresses, ThatAreInvalidAreRefusedWithAnExample)
     }
 }
 
-TEST_F(Addresses, NamingAKindOfNodeSuggestTheListCommand)
+TEST_F(Addresses, NearlyNamingANodeSuggestItsNameOrTheList)
 {
     EXPECT_EQ(refusalOf("group"), "no node 'group' (write group:NAME; see 'mihost list groups')");
     EXPECT_EQ(refusalOf("drivers"),
               "no node 'drivers' (write driver:NAME; see 'mihost list drivers')");
-}
-
-TEST_F(Addresses, NearlyNamingANodeSuggestItsName)
-{
     EXPECT_EQ(refusalOf("user:jdoo"), "no node 'user:jdoo' in the tree (did you mean user:jdoe?)");
     for (char const* address : {"user:ext4", "user:", "log:2", "3"})
         EXPECT_EQ(refusalOf(address),

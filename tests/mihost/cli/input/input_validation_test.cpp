@@ -87,14 +87,10 @@ TEST(MethodCallTexts, AreRefusedForEachForbiddenByte)
     });
 }
 
-TEST(MethodCallValues, MayHoldAnyLettersAndHarmlessCharacters)
+TEST(MethodCallValues, MayHoldHarmlessCharactersAndEscapedBlanks)
 {
     for (Form const form : {Form::AccountName, Form::Words, Form::Password})
         EXPECT_EQ(objection(form, "aZ09@+-./_Jürgen李"), std::nullopt);
-}
-
-TEST(MethodCallValues, MayHoldBlanksIfTheyAreEscaped)
-{
     EXPECT_EQ(objection(Form::Words, "John Smith"), std::nullopt);
     EXPECT_EQ(objection(Form::Path, "/home/john smith"), std::nullopt);
     EXPECT_EQ(objection(Form::AccountName, "john smith"), "contains a blank");
@@ -138,41 +134,29 @@ TEST(Names, OfDigitsOnlyAreRefusedForNewAccountsAndGroups)
     EXPECT_EQ(refusal([] { parseCall("UserDel", {"UserName=1001"}, noSecret); }), "accepted");
 }
 
-TEST(MethodCallValues, AreRefusedIfTheyAreEmpty)
+TEST(MethodCallValues, AreNeitherEmptyNorLongerThan254Bytes)
 {
     for (Form const form :
          {Form::AccountName, Form::Words, Form::Password, Form::Path, Form::Digits, Form::Day})
         EXPECT_EQ(objection(form, ""), "is empty");
-}
-
-TEST(MethodCallValues, AreRefusedBeyond254BytesOfEscapedText)
-{
     EXPECT_EQ(objection(Form::Words, std::string(254, 'a')), std::nullopt);
     EXPECT_NE(objection(Form::Words, std::string(255, 'a')), std::nullopt);
     EXPECT_EQ(objection(Form::Words, std::string(252, 'a') + " "), std::nullopt);
     EXPECT_NE(objection(Form::Words, std::string(253, 'a') + " "), std::nullopt);
 }
 
-TEST(MethodCallValues, OfNumbersAreOneToNineDigits)
+TEST(MethodCallValues, OfNumbersDaysAndPathsHaveTheirForm)
 {
     for (char const* right : {"0", "7", "99999", "999999999"})
         EXPECT_EQ(objection(Form::Digits, right), std::nullopt) << right;
     for (char const* wrong : {"-1", "+1", "1.5", "x", "1x", " 1", "1 ", "1000000000"})
         EXPECT_NE(objection(Form::Digits, wrong), std::nullopt) << wrong;
-}
-
-TEST(MethodCallValues, OfDaysAreDaysOfTheCalendar)
-{
     for (char const* right : {"2030-12-31", "2028-02-29", "1901-01-01"})
         EXPECT_EQ(objection(Form::Day, right), std::nullopt) << right;
     for (char const* wrong : {"2030-13-01", "2030-00-10", "2030-02-30", "2029-02-29", "2030-1-1",
                               "31.12.2030", "20301231", "1900-12-31", "2030-12-31 00"})
         EXPECT_EQ(objection(Form::Day, wrong), "is not a day (use YYYY-MM-DD, such as 2030-12-31)")
             << wrong;
-}
-
-TEST(MethodCallValues, OfPathsAreAbsolute)
-{
     EXPECT_EQ(objection(Form::Path, "home"), "is not an absolute path (it must begin with '/')");
 }
 

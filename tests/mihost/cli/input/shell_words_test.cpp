@@ -30,15 +30,11 @@ TEST(WordsOfALine, AreKeptTogetherByQuotesAndBackslashes)
     EXPECT_EQ(splitWords("a''b"), Words{"ab"});
 }
 
-TEST(WordsOfALine, EndAtAComment)
+TEST(WordsOfALine, EndAtACommentAndAreNotExpanded)
 {
     EXPECT_EQ(splitWords("# nothing"), Words());
     EXPECT_EQ(splitWords("get os # 108"), (Words{"get", "os"}));
     EXPECT_EQ(splitWords("get a#b '#c' \\#d"), (Words{"get", "a#b", "#c", "#d"}));
-}
-
-TEST(WordsOfALine, AreNotExpanded)
-{
     EXPECT_EQ(splitWords("$HOME ~ *.c `x` a;b a|b >f"),
               (Words{"$HOME", "~", "*.c", "`x`", "a;b", "a|b", ">f"}));
 }

@@ -11,22 +11,14 @@ using mihost::suggestion;
 std::vector<std::string> const names = {"tree",    "list",    "get",    "set",
                                         "UserAdd", "UserDel", "os-name"};
 
-TEST(Suggestion, IsTheNameInAnotherCase)
+TEST(Suggestion, IsTheNameInAnotherCaseOrWithFewOtherLetters)
 {
     EXPECT_EQ(nearest("useradd", names), "UserAdd");
     EXPECT_EQ(nearest("TREE", names), "tree");
-}
-
-TEST(Suggestion, IsTheNameThatDiffersByOneLetter)
-{
     EXPECT_EQ(nearest("tre", names), "tree");
     EXPECT_EQ(nearest("treee", names), "tree");
     EXPECT_EQ(nearest("lost", names), "list");
     EXPECT_EQ(nearest("lits", names), "list");
-}
-
-TEST(Suggestion, MayDifferByTwoLettersOnlyFromALongWord)
-{
     EXPECT_EQ(nearest("osname1", names), "os-name");
     EXPECT_EQ(nearest("lit1", names), "");
 }

@@ -105,10 +105,6 @@ TEST(ValueText, OfAMethodCallIsParsed)
     EXPECT_EQ(refusal(os, 74, "UserDel,UserName:CMPI_string:jdoe"), "accepted");
     EXPECT_EQ(refusal(os, 74, "UserDel,UserName:CMPI_string:a;b"),
               "UserName contains the shell metacharacter ';'");
-}
-
-TEST(ValueText, OfAMethodCallMayBeEmptyOrDummy)
-{
     EXPECT_EQ(refusal(os, 74, ""), "accepted");
     EXPECT_EQ(refusal(os, 74, "dummy"), "accepted");
 }

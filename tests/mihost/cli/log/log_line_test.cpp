@@ -59,17 +59,13 @@ TEST(LogLine, LosesLeadingBlanksAndWhatThePluginSkips)
     EXPECT_EQ(logLineOf(stamp + "a" + std::string(1, '\0') + "b", dayIn(2026, 6)).message, "a");
 }
 
-TEST(LogMessage, IsShownWithoutThePluginsAsterisks)
+TEST(LogMessage, LosesThePluginsAsterisksAndTheHost)
 {
     EXPECT_EQ(withoutAsterisks("*text*"), "text");
     EXPECT_EQ(withoutAsterisks("**"), "");
     EXPECT_EQ(withoutAsterisks("***"), "*");
     for (char const* other : {"", "*", "text", "*text", "text*"})
         EXPECT_EQ(withoutAsterisks(other), other);
-}
-
-TEST(LogMessage, LosesTheHostWithItsFirstWord)
-{
     EXPECT_EQ(withoutHostName("host prog[1]: text"), "prog[1]: text");
     EXPECT_EQ(withoutHostName("alone"), "alone");
     EXPECT_EQ(withoutHostName(""), "");

@@ -63,16 +63,12 @@ TEST(TableLayout, AlignsWideCharactersAndMarksEmptyCells)
     EXPECT_EQ(layOut(people(), {})[2], "Jürgen  22  -");
 }
 
-TEST(TableLayout, OmitsHeadingsOnRequest)
-{
-    EXPECT_EQ(layOut(people(), {}, false)[0], std::string("李明     1  ") + fox);
-}
-
-TEST(TableLayout, HasItsHeadingsAlsoWithoutRows)
+TEST(TableLayout, HasItsHeadingsAlsoWithoutRowsOrNever)
 {
     Table const table({{"name"}, {"id"}});
     EXPECT_EQ(mihost::withoutStyles(layOut(table, {}).at(0)), "name  id");
     EXPECT_EQ(layOut(table, {}, false), Lines());
+    EXPECT_EQ(layOut(people(), {}, false)[0], std::string("李明     1  ") + fox);
 }
 
 TEST(TableLayout, WrapsOnlyTheLastTextColumn)

@@ -43,10 +43,6 @@ TEST(TableSelection, ShowsTheUsualColumnsUnlessOthersAreChosen)
 {
     EXPECT_EQ(chosen({}), "root\t/bin/sh\njdoe\t/bin/bash\nanna\t\n");
     EXPECT_EQ(chosen({{"id", "name"}, "", {}}), "0\troot\n1000\tjdoe\n999\tanna\n");
-}
-
-TEST(TableSelection, FindsAColumnByItsOtherName)
-{
     EXPECT_EQ(chosen({{"311"}, "-311", {"311~0"}}), "1000\n0\n");
 }
 

@@ -32,10 +32,12 @@ TEST(Yaml, ShowsNestedListsAndObjectsAsBlocks)
                                   "none: []\n");
 }
 
-TEST(Yaml, StartsEveryDocument)
+TEST(Yaml, StartsEveryDocumentAndWritesSmallNumbers)
 {
     EXPECT_EQ(yamlText(Json::array()), "--- []\n");
     EXPECT_EQ(yamlText("text"), "--- text\n");
+    EXPECT_EQ(yamlText(1e-05), "--- 1.0e-05\n");
+    EXPECT_EQ(yamlText(0.5), "--- 0.5\n");
 }
 
 TEST(Yaml, QuotesTextsThatWouldBeReadAsSomethingElse)
@@ -64,12 +66,6 @@ TEST(Yaml, QuotesTextsThatWouldBeReadAsSomethingElse)
                                     {"李明", "\"李明\""},
                                     {"\n\x1b\u2028", R"("\U0000000a\U0000001b\U00002028")"}})
         EXPECT_EQ(yamlText(row.text), std::string("--- ") + row.shown + "\n");
-}
-
-TEST(Yaml, WritesSmallNumbersWithAPoint)
-{
-    EXPECT_EQ(yamlText(1e-05), "--- 1.0e-05\n");
-    EXPECT_EQ(yamlText(0.5), "--- 0.5\n");
 }
 
 TEST(JsonLines, HasALineForEachElementOrOneForTheDocument)

@@ -36,6 +36,11 @@ Words after(Words const& words)
     return wordsOf(complete(words, namesOf, mihost::commandTable()));
 }
 
+Completion::What kindAfter(Words const& words)
+{
+    return complete(words, namesOf, mihost::commandTable()).what;
+}
+
 TEST(Completion, BeginsWithTheCommands)
 {
     Words const commands = after({""});
@@ -60,45 +65,33 @@ TEST(Completion, OffersTheOptionsOfTheCommandAndThoseOfAll)
     EXPECT_EQ(after({"list", "--js"}), Words{"--json"});
     EXPECT_EQ(after({"--js"}), Words{"--json"});
     EXPECT_EQ(after({"--colu"}), Words());
-}
-
-TEST(Completion, OffersEachOptionOnce)
-{
     EXPECT_EQ(after({"list", "--help"}), (Words{"--help", "--help-all"}));
 }
 
-TEST(Completion, KnowsThatAHostFollows)
+TEST(Completion, ContinuesAfterAnOptionWithItsValue)
 {
     for (char const* option : {"--host", "-H"}) {
         EXPECT_EQ(after({option, "box", "ge"}), Words{"get"});
         EXPECT_EQ(after({option, "ge"}), Words());
     }
+    EXPECT_EQ(after({"--plugin", "file", "ge"}), Words{"get"});
+    EXPECT_EQ(after({"--plugin=file", "ge"}), Words{"get"});
+    EXPECT_EQ(after({"watch", "-n", ""}), Words());
+    EXPECT_EQ(after({"watch", "-n", "5", "lo"}), (Words{"log", "log:"}));
+    EXPECT_EQ(after({"watch", "-n5", "lo"}), (Words{"log", "log:"}));
+    EXPECT_EQ(after({"-y", "power", "h"}), Words{"halt"});
+    EXPECT_EQ(after({"-x5", "power", "h"}), Words());
 }
 
 TEST(Completion, LeavesFilesAndDirectoriesToTheShell)
 {
-    EXPECT_EQ(complete({"--plugin", ""}, namesOf, mihost::commandTable()).what,
-              Completion::What::Files);
-    EXPECT_EQ(complete({"get", "--trace", "x"}, namesOf, mihost::commandTable()).what,
-              Completion::What::Files);
-    EXPECT_EQ(complete({"--overlay", ""}, namesOf, mihost::commandTable()).what,
-              Completion::What::Folders);
-    EXPECT_EQ(complete({"--plugin=", ""}, namesOf, mihost::commandTable()).what,
-              Completion::What::Words);
-}
-
-TEST(Completion, OffersFilesAndFormsToCheck)
-{
-    EXPECT_EQ(complete({"check", ""}, namesOf, mihost::commandTable()).what,
-              Completion::What::Files);
+    EXPECT_EQ(kindAfter({"--plugin", ""}), Completion::What::Files);
+    EXPECT_EQ(kindAfter({"get", "--trace", "x"}), Completion::What::Files);
+    EXPECT_EQ(kindAfter({"--overlay", ""}), Completion::What::Folders);
+    EXPECT_EQ(kindAfter({"--plugin=", ""}), Completion::What::Words);
+    EXPECT_EQ(kindAfter({"check", ""}), Completion::What::Files);
     EXPECT_EQ(after({"check", "--format", ""}), (Words{"text", "tap", "junit"}));
     EXPECT_EQ(after({"check", "--r"}), Words{"--rounds"});
-}
-
-TEST(Completion, ContinuesAfterAnOptionWithItsValue)
-{
-    EXPECT_EQ(after({"--plugin", "file", "ge"}), Words{"get"});
-    EXPECT_EQ(after({"--plugin=file", "ge"}), Words{"get"});
 }
 
 TEST(Completion, OffersNodesAsTheyAreAddressed)
@@ -106,10 +99,6 @@ TEST(Completion, OffersNodesAsTheyAreAddressed)
     EXPECT_EQ(after({"get", ""}),
               (Words{"mi", "root", "computer", "os", "driver:", "user:", "group:", "log", "log:"}));
     EXPECT_EQ(after({"get", "lo"}), (Words{"log", "log:"}));
-}
-
-TEST(Completion, OffersTheNodesOfAKindByName)
-{
     EXPECT_EQ(after({"get", "user:"}), (Words{"user:root", "user:jdoe"}));
     EXPECT_EQ(after({"get", "user:j"}), Words{"user:jdoe"});
     EXPECT_EQ(after({"tree", "group:"}), Words{"group:staff"});
@@ -132,21 +121,13 @@ TEST(Completion, OffersTheValuesOfABoolean)
     EXPECT_EQ(after({"set", "os", "refresh", "0", ""}), Words());
 }
 
-TEST(Completion, OffersMethodsAndTheirParameters)
+TEST(Completion, OffersMethodsAndTheirParametersOnce)
 {
     EXPECT_EQ(after({"call", "UserD"}), Words{"UserDel"});
     EXPECT_EQ(after({"call", "UserDel", ""}), Words{"UserName="});
     EXPECT_EQ(after({"call", "NoMethod", ""}), Words());
-}
-
-TEST(Completion, OffersNoParameterTwice)
-{
     EXPECT_EQ(after({"call", "LocalGroupAddUser", "LocalGroupName=staff", ""}),
               Words{"DomainAndMember="});
-}
-
-TEST(Completion, OffersToAskForAPassword)
-{
     EXPECT_EQ(after({"call", "UserSetPassword", "P"}), Words{"Password=-"});
     EXPECT_EQ(after({"call", "UserSetPassword", "Password=-", ""}), Words{"UserName="});
     EXPECT_EQ(after({"set", "user:root", "password", ""}), Words{"-"});
@@ -160,10 +141,6 @@ TEST(Completion, OffersTheAccountsThatAParameterNames)
     EXPECT_EQ(after({"call", "LocalGroupDelUser", "LocalGroupName="}),
               Words{"LocalGroupName=staff"});
     EXPECT_EQ(after({"call", "LocalGroupDel", "GroupName="}), Words{"GroupName=staff"});
-}
-
-TEST(Completion, OffersNoNamesForANewAccountOrGroup)
-{
     EXPECT_EQ(after({"call", "UserAdd", "UserName="}), Words());
     EXPECT_EQ(after({"call", "LocalGroupAdd", "GroupName="}), Words());
 }
@@ -173,13 +150,11 @@ TEST(Completion, OffersTheWordsThatAnArgumentAccepts)
     EXPECT_EQ(after({"power", ""}), (Words{"restart", "halt"}));
     EXPECT_EQ(after({"list", "u"}), Words{"users"});
     EXPECT_EQ(after({"properties", "log"}), (Words{"log", "log-entry"}));
-}
-
-TEST(Completion, OffersTheCommandsThatHelpExplains)
-{
     EXPECT_EQ(after({"help", "po"}), Words{"power"});
     EXPECT_EQ(after({"help", "power", ""}), Words());
     EXPECT_EQ(after({"help", "nonsense", ""}), Words());
+    EXPECT_EQ(after({"tree", "-o", "js"}), (Words{"json", "jsonl"}));
+    EXPECT_EQ(after({"--color=ne"}), Words{"--color=never"});
 }
 
 TEST(Completion, OffersTheTasksAndTheAccountsThatACommandShows)
@@ -201,36 +176,15 @@ TEST(Completion, OffersTheValuesOfTasks)
     EXPECT_EQ(after({"user", "age", "--max"}), Words{"--max-days"});
     EXPECT_EQ(after({"user", "add", "--js"}), Words{"--json"});
     EXPECT_EQ(after({"user", "delete", "jdoe", ""}), Words());
-    EXPECT_EQ(complete({"user", "add", "--shell", ""}, namesOf, mihost::commandTable()).what,
-              Completion::What::Files);
-    EXPECT_EQ(complete({"user", "set-home", "jdoe", ""}, namesOf, mihost::commandTable()).what,
-              Completion::What::Folders);
+    EXPECT_EQ(kindAfter({"user", "add", "--shell", ""}), Completion::What::Files);
+    EXPECT_EQ(kindAfter({"user", "set-home", "jdoe", ""}), Completion::What::Folders);
 }
 
-TEST(Completion, KnowsTheValueOfAShortOption)
-{
-    EXPECT_EQ(after({"watch", "-n", ""}), Words());
-    EXPECT_EQ(after({"watch", "-n", "5", "lo"}), (Words{"log", "log:"}));
-    EXPECT_EQ(after({"watch", "-n5", "lo"}), (Words{"log", "log:"}));
-    EXPECT_EQ(after({"-y", "power", "h"}), Words{"halt"});
-    EXPECT_EQ(after({"-x5", "power", "h"}), Words());
-}
-
-TEST(Completion, OffersTheFormatsOfResults)
-{
-    EXPECT_EQ(after({"tree", "-o", "js"}), (Words{"json", "jsonl"}));
-    EXPECT_EQ(after({"--color=ne"}), Words{"--color=never"});
-}
-
-TEST(Completion, OffersColumnsToOrderAndChooseBy)
+TEST(Completion, OffersColumnsToShowOrderAndChooseBy)
 {
     EXPECT_EQ(after({"list", "groups", "--sort", "-group-n"}), Words{"-group-name"});
     EXPECT_EQ(after({"list", "groups", "--where", "group-n"}), Words{"group-name="});
     EXPECT_EQ(after({"list", "groups", "--where", "group-name=g"}), Words());
-}
-
-TEST(Completion, OffersColumnsOneAfterTheOther)
-{
     EXPECT_EQ(after({"list", "users", "--columns", "user-name,full"}),
               Words{"user-name,full-name"});
     EXPECT_EQ(after({"list", "users", "--columns=full"}), Words{"--columns=full-name"});

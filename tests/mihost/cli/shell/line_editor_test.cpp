@@ -18,15 +18,11 @@ TEST(CommonStart, IsWhatAllCandidatesBeginWith)
     EXPECT_EQ(commonStart({"get", "set"}), "");
 }
 
-TEST(WordsInColumns, AreBelowEachOther)
+TEST(WordsInColumns, AreBelowEachOtherOrOnALineEach)
 {
     EXPECT_EQ(inColumns({"tree", "list", "get", "doctor", "set"}, 24), "tree    list    get\n"
                                                                        "doctor  set\n");
     EXPECT_EQ(inColumns({"李明", "ab"}, 80), "李明  ab\n");
-}
-
-TEST(WordsInColumns, HaveALineEachInANarrowTerminal)
-{
     EXPECT_EQ(inColumns({"tree", "list"}, 3), "tree\nlist\n");
     EXPECT_EQ(inColumns({"tree", "list"}, 0), "tree\nlist\n");
 }

@@ -1,14 +1,14 @@
 // mihost check passes the plug-in, and fails plug-ins that are broken on purpose.
 
 #include "TestPaths.h"
+#include "tests/contract/mihost/cli/NeedsSandbox.h"
+#include "tests/support/Holds.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 #include "tests/support/ScratchFolder.h"
 
 #include <algorithm>
-#include <cstdlib>
 #include <filesystem>
-#include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 #include <set>
 
@@ -17,16 +17,6 @@ namespace check_command_test
 
 using Json = nlohmann::ordered_json;
 using Names = std::set<std::string>;
-
-/** mihost check runs only in a sandbox, which needs root. */
-void needSandbox()
-{
-    Outcome const outcome = mihostRun({"--sandbox", "version"});
-    char const* const required = std::getenv("MI_SANDBOX_REQUIRED");
-    if (outcome.code != 0 && !(required && std::string(required) == "1"))
-        GTEST_SKIP() << outcome.err;
-    ASSERT_EQ(outcome.code, 0) << outcome.err;
-}
 
 /** Checks a plug-in on a fixture machine. */
 Outcome checkRun(std::string const& plugin, std::vector<std::string> const& options = {})
@@ -60,13 +50,8 @@ struct Broken {
     Names failed;
 };
 
-class BrokenPlugin : public testing::TestWithParam<Broken>
+class BrokenPlugin : public NeedsSandbox, public testing::WithParamInterface<Broken>
 {
-protected:
-    void SetUp() override
-    {
-        needSandbox();
-    }
 };
 
 TEST_P(BrokenPlugin, FailsTheChecksOfItsFault)
@@ -85,8 +70,7 @@ TEST_P(BrokenPlugin, FailsTheChecksOfItsFault)
         GTEST_SKIP() << "this build cannot count the memory in use";
     EXPECT_EQ(outcome.code, 1) << outcome.err;
     ASSERT_FALSE(failed.empty());
-    EXPECT_NE(findingsOf(results, failed[0]).dump().find(GetParam().finding), std::string::npos)
-        << outcome.out;
+    EXPECT_TRUE(holds(findingsOf(results, failed[0]).dump(), GetParam().finding)) << outcome.out;
 }
 
 Broken const ways[] = {
@@ -161,19 +145,14 @@ INSTANTIATE_TEST_SUITE_P(Ways, BrokenPlugin, testing::ValuesIn(ways), [](auto co
     return name;
 });
 
-class Check : public testing::Test
+class Check : public NeedsSandbox
 {
 protected:
-    void SetUp() override
-    {
-        needSandbox();
-    }
-
     static void expectAllPassed(Outcome const& outcome)
     {
         EXPECT_EQ(outcome.code, 0) << outcome.out << outcome.err;
         EXPECT_EQ(outcome.err, "");
-        EXPECT_NE(outcome.out.find("\n0 of "), std::string::npos) << outcome.out;
+        EXPECT_TRUE(holds(outcome.out, "\n0 of "));
     }
 };
 
@@ -190,13 +169,15 @@ TEST_F(Check, PassesThePluginOnAFixtureMachine)
     expectAllPassed(outcome);
     char const* const summary =
         countsMemory ? " checks failed, 0 skipped\n" : " checks failed, 1 skipped\n";
-    EXPECT_NE(outcome.out.find(summary), std::string::npos) << outcome.out;
-    EXPECT_EQ(outcome.out.find("note: "), std::string::npos) << outcome.out;
+    EXPECT_TRUE(holds(outcome.out, summary));
+    EXPECT_FALSE(holds(outcome.out, "note: "));
 }
 
-TEST_F(Check, PassesThePluginOnThisMachine)
+TEST_F(Check, PassesThePluginOnThisMachineAndChangesNothing)
 {
+    std::string const groups = contentOf("/etc/group");
     expectAllPassed(mihostRun({"check", "--rounds", "2"}));
+    EXPECT_EQ(contentOf("/etc/group"), groups);
 }
 
 TEST_F(Check, PassesTheBrokenPluginWhenNothingIsBroken)
@@ -214,26 +195,11 @@ TEST_F(Check, SkipsTheMethodIfNoGroupCanBeAdded)
     Outcome const outcome =
         mihostRun({"--json", "--overlay", machine.name(), "check", "--rounds", "1"});
     EXPECT_EQ(outcome.code, 0) << outcome.out << outcome.err;
-    EXPECT_NE(outcome.out.find("a group cannot be added here: groupadd: locked"), std::string::npos)
-        << outcome.out;
+    EXPECT_TRUE(holds(outcome.out, "a group cannot be added here: groupadd: locked"));
     Json expected{"method.success", "method.group-node"};
     if (!countsMemory)
         expected.push_back("rounds.memory");
     EXPECT_EQ(namesWith(Json::parse(outcome.out), "skipped"), expected);
-}
-
-TEST_F(Check, ChecksThePluginOfTheOption)
-{
-    setenv("BROKEN", "entry-point", 1);
-    EXPECT_EQ(
-        mihostRun({"--overlay", MACHINES_DIR "/suse", "--plugin", BROKEN_PLUGIN, "check"}).code, 1);
-}
-
-TEST_F(Check, ChangesNothingOnThisMachine)
-{
-    std::string const groups = contentOf("/etc/group");
-    ASSERT_EQ(mihostRun({"check", "--rounds", "1"}).code, 0);
-    EXPECT_EQ(contentOf("/etc/group"), groups);
 }
 
 TEST_F(Check, NamesASymbolThatNoHeaderDeclares)
@@ -244,9 +210,7 @@ TEST_F(Check, NamesASymbolThatNoHeaderDeclares)
     EXPECT_EQ(findingsOf(results, "load.host-symbols"),
               Json({"mihost::nodeObserver(): no header of host/ declares it, although "
                     "libmihost.so.0 has it"}));
-    EXPECT_NE(outcome.out.find("public names are not defined: IC::GroupNode::GroupNode, "),
-              std::string::npos)
-        << outcome.out;
+    EXPECT_TRUE(holds(outcome.out, "public names are not defined: IC::GroupNode::GroupNode, "));
 }
 
 TEST_F(Check, RefusesAFileThatCannotBeLoaded)
@@ -254,7 +218,7 @@ TEST_F(Check, RefusesAFileThatCannotBeLoaded)
     Outcome const outcome = checkRun(PLUGIN_WITHOUT_ENTRY_POINT);
     EXPECT_EQ(outcome.code, 3);
     EXPECT_EQ(outcome.out, "");
-    EXPECT_NE(outcome.err.find("it has no entry point OpenMI"), std::string::npos) << outcome.err;
+    EXPECT_TRUE(holds(outcome.err, "it has no entry point OpenMI"));
     EXPECT_EQ(checkRun("/nonexistent").code, 3);
 }
 
@@ -269,7 +233,8 @@ TEST_F(Check, StopsAGroupThatHangs)
 TEST_F(Check, PrintsTapForHarnesses)
 {
     setenv("BROKEN", "index", 1);
-    Outcome const outcome = checkRun(BROKEN_PLUGIN, {"--format", "tap", "--rounds", "1"});
+    Outcome const outcome = mihostRun({"--overlay", MACHINES_DIR "/suse", "--plugin", BROKEN_PLUGIN,
+                                       "check", "--format", "tap", "--rounds", "1"});
     EXPECT_EQ(outcome.code, 1);
     auto const lines = linesOf(outcome.out);
     ASSERT_GT(lines.size(), 2U);
@@ -279,34 +244,29 @@ TEST_F(Check, PrintsTapForHarnesses)
         if (line.rfind("ok ", 0) == 0 || line.rfind("not ok ", 0) == 0)
             ++results;
     EXPECT_EQ(lines[1], "1.." + std::to_string(results));
-    EXPECT_NE(outcome.out.find(" - start.indexes\n  ---\n"), std::string::npos) << outcome.out;
+    EXPECT_TRUE(holds(outcome.out, " - start.indexes\n  ---\n"));
 }
 
 TEST_F(Check, PrintsJunitForBuildServers)
 {
     Outcome const outcome = checkRun(PLUGIN_FILE, {"--format", "junit", "--rounds", "1"});
     EXPECT_EQ(outcome.code, 0);
-    EXPECT_EQ(outcome.out.rfind("<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<testsuites ", 0), 0U);
-    EXPECT_NE(outcome.out.find("<testcase classname=\"start\" name=\"node-ids\"/>"),
-              std::string::npos)
-        << outcome.out;
+    EXPECT_TRUE(
+        startsWith(outcome.out, "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<testsuites "));
+    EXPECT_TRUE(holds(outcome.out, "<testcase classname=\"start\" name=\"node-ids\"/>"));
 }
 
-TEST(CheckUsage, RefusesInvalidOptionValues)
+TEST_F(Check, RefusesInvalidOptionsAndATrace)
 {
-    EXPECT_EQ(mihostRun({"check", "--format", "html"}).code, 2);
-    EXPECT_EQ(mihostRun({"check", "--rounds", "0"}).code, 2);
-    EXPECT_EQ(mihostRun({"check", "--time-limit", "0"}).code, 2);
-    EXPECT_EQ(mihostRun({"check", "--rounds", "some"}).code, 2);
-}
-
-TEST_F(Check, RefusesTwoFormatsOrATrace)
-{
+    ScratchFolder const folder;
+    for (Lines const& arguments :
+         {Lines{"check", "--format", "html"}, Lines{"check", "--rounds", "0"},
+          Lines{"check", "--time-limit", "0"}, Lines{"check", "--rounds", "some"},
+          Lines{"--trace", folder.path("trace"), "check"}})
+        EXPECT_EQ(mihostRun(arguments).code, 2) << arguments[2];
     Outcome const mixed = mihostRun({"--json", "check", "--format", "tap"});
     EXPECT_EQ(mixed.code, 2);
-    EXPECT_NE(mixed.err.find(" cannot be combined\n"), std::string::npos) << mixed.err;
-    ScratchFolder const folder;
-    EXPECT_EQ(mihostRun({"--trace", folder.path("trace"), "check"}).code, 2);
+    EXPECT_TRUE(holds(mixed.err, " cannot be combined\n"));
 }
 
 TEST(CheckWithoutASandbox, DoesNotRun)
@@ -314,7 +274,7 @@ TEST(CheckWithoutASandbox, DoesNotRun)
     Outcome const outcome = mihostRun({"--overlay", "/nonexistent", "check"});
     EXPECT_EQ(outcome.code, 2);
     EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(outcome.err.rfind("mihost: creating the sandbox: ", 0), 0U) << outcome.err;
+    EXPECT_TRUE(startsWith(outcome.err, "mihost: creating the sandbox: "));
     EXPECT_EQ(mihostRun({"shell"}, "check\n").code, 2);
 }
 

@@ -1,4 +1,5 @@
 #include "TestPaths.h"
+#include "tests/support/Holds.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
 
@@ -24,9 +25,9 @@ TEST(CatalogueCommands, NeedNoPlugin)
 TEST(CatalogueCommands, DescribeOneKindOrMethod)
 {
     std::string const group = mihostRun({"properties", "group"}).out;
-    EXPECT_EQ(group.rfind("group (type 51, group:NAME): ", 0), 0U) << group;
-    EXPECT_NE(group.find("165  members      texts"), std::string::npos) << group;
-    EXPECT_EQ(group.find("user-name"), std::string::npos);
+    EXPECT_TRUE(startsWith(group, "group (type 51, group:NAME): "));
+    EXPECT_TRUE(holds(group, "165  members      texts"));
+    EXPECT_FALSE(holds(group, "user-name"));
     std::string const method = mihostRun({"methods", "LocalGroupAdd"}).out;
     EXPECT_EQ(method, "LocalGroupAdd: adds a group\n"
                       "  parameter  value  required  meaning\n"
@@ -38,9 +39,9 @@ TEST(CatalogueCommands, DescribeOneKindOrMethod)
 TEST(CatalogueCommands, ListAMethodsParametersInItsHelp)
 {
     std::string const help = mihostRun({"call", "LocalGroupAdd", "--help"}).out;
-    EXPECT_NE(help.find("GroupName  name   required  the group's name"), std::string::npos) << help;
-    EXPECT_EQ(help.find("\xE2\x81"), std::string::npos); // no marks of styles
-    EXPECT_NE(mihostRun({"call", "--help"}).out.find("UserSetHomeDir"), std::string::npos);
+    EXPECT_TRUE(holds(help, "GroupName  name   required  the group's name"));
+    EXPECT_FALSE(holds(help, "\xE2\x81")); // no marks of styles
+    EXPECT_TRUE(holds(mihostRun({"call", "--help"}).out, "UserSetHomeDir"));
 }
 
 } // namespace documents_test

@@ -1,11 +1,9 @@
 // The commands in the README print what it shows.
 
 #include "TestPaths.h"
+#include "tests/contract/mihost/cli/NeedsSandbox.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Program.h"
-
-#include <cstdlib>
-#include <gtest/gtest.h>
 
 namespace readme_test
 {
@@ -44,12 +42,10 @@ bool matches(Lines const& lines, std::size_t line, Lines const& shown, std::size
            matches(lines, line + 1, shown, at + 1);
 }
 
-TEST(ReadmeSession, IsWhatTheProgramPrints)
+using ReadmeSession = NeedsSandbox;
+
+TEST_F(ReadmeSession, IsWhatTheProgramPrints)
 {
-    Outcome const sandbox = mihostRun({"--sandbox", "version"});
-    char const* const required = std::getenv("MI_SANDBOX_REQUIRED");
-    if (sandbox.code != 0 && !(required && std::string(required) == "1"))
-        GTEST_SKIP() << sandbox.err;
     std::vector<Step> const steps = readSession();
     ASSERT_GT(steps.size(), 5U);
     std::string before =

@@ -42,13 +42,12 @@ TEST(Version, HasThreeNumbersAndMaybeASuffix)
         << programVersion();
 }
 
-TEST(Version, IsTheFirstOneInTheChangelog)
+TEST(Version, IsInEveryFileThatIsNotConfigured)
 {
     EXPECT_EQ(versionIn("CHANGELOG.md", "## (\\d.*) - \\d{4}-\\d\\d-\\d\\d"), programVersion());
-}
-
-TEST(Version, IsThatOfTheDebianPackages)
-{
+    EXPECT_EQ(versionIn("integrations/ansible/galaxy.yml", "version: (.*)"), programVersion());
+    EXPECT_EQ(versionIn("integrations/cockpit/manifest.json", " *\"version\": \"(.*)\","),
+              programVersion());
     EXPECT_EQ(versionIn("packaging/debian/changelog", "mihost \\((.*)-\\d+\\).*"),
               packageVersion());
 }
@@ -60,17 +59,6 @@ TEST(Version, IsThatOfTheRpmPackages)
     std::string const built = contentOf(BUILD_DIR "/CPackConfig.cmake");
     std::string const wanted = "set(CPACK_PACKAGE_VERSION \"" + packageVersion() + "\")";
     EXPECT_NE(built.find(wanted), std::string::npos) << wanted;
-}
-
-TEST(Version, IsThatOfTheAnsibleCollection)
-{
-    EXPECT_EQ(versionIn("integrations/ansible/galaxy.yml", "version: (.*)"), programVersion());
-}
-
-TEST(Version, IsThatOfTheCockpitPage)
-{
-    EXPECT_EQ(versionIn("integrations/cockpit/manifest.json", " *\"version\": \"(.*)\","),
-              programVersion());
 }
 
 } // namespace version_test

@@ -128,7 +128,7 @@ INSTANTIATE_TEST_SUITE_P(Kinds, AccelBusybox, testing::Values("ln -sf", "ln -f")
 TEST_P(AccelBusybox, ReadsAChangingLogAsTheAcceleratorDoes)
 {
     EXPECT_TRUE(holds(real("sed --help"), "BusyBox"));
-    EXPECT_GT(percentOfSedsAnswered(8, 100), 50U);
+    EXPECT_GT(percentOfSedsAnswered(8, 30), 50U);
 }
 
 TEST_P(AccelBusybox, PrintsTheDateThatIsAnsweredInEveryZone)

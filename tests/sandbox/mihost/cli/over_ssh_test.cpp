@@ -97,14 +97,17 @@ TEST_F(MihostRemote, PassesEveryArgumentOnUnchanged)
         bytes += static_cast<char>(byte);
     for (char const* shell : {"/bin/sh", "/bin/bash", "/usr/bin/fish", "/usr/bin/zsh"}) {
         writeAccounts(shell);
-        for (std::string const& value :
-             {std::string(), std::string("it's a \"$HOME\" `id` \\ \\\\ \\' ! !! * ~ # ; & | > x"),
-              std::string("two\nlines"), std::string("~"), std::string("=ls"), bytes}) {
-            Outcome const outcome = mihostRun({"--host=box", "set", "os", "108", value, "--yes"});
-            EXPECT_EQ(outcome.code, 0) << shell << outcome.err;
-            EXPECT_EQ(outcome.out, "<set>\n<os>\n<108>\n<" + value + ">\n<--yes>\n")
-                << shell << outcome.err;
+        Lines const values = {
+            "",           "it's a \"$HOME\" `id` \\ \\\\ \\' ! !! * ~ # ; & | > x",
+            "two\nlines", "~",
+            "=ls",        bytes};
+        Lines arguments = {"--host=box", "get", "os"};
+        std::string expected = "<get>\n<os>\n";
+        for (std::string const& value : values) {
+            arguments.push_back(value);
+            expected += "<" + value + ">\n";
         }
+        EXPECT_EQ(mihostRun(arguments), printed(expected)) << shell;
     }
 }
 

@@ -20,7 +20,8 @@ FakeCommands::FakeCommands()
     };
     libc::hooks().pclose = [this](FILE* stream) {
         --open;
-        return std::fclose(stream);
+        std::fclose(stream);
+        return status;
     };
 }
 

@@ -35,6 +35,9 @@ public:
     /** The requested modes, one for each command. */
     std::vector<std::string> modes;
 
+    /** The exit status of each command, as from waitpid. */
+    int status = 0;
+
     /** Streams returned and not closed yet. */
     int open = 0;
 };

@@ -1,6 +1,7 @@
 #include "tests/support/Recording.h"
 
 #include <algorithm>
+#include <set>
 
 namespace
 {
@@ -55,6 +56,14 @@ std::vector<std::string> Recording::remarks() const
                                }),
                 found.end());
     return found;
+}
+
+std::vector<std::string> Recording::sources() const
+{
+    std::set<std::string> found;
+    for (LogRecord const& record : records())
+        found.insert(record.function + ' ' + record.file + ' ' + record.category);
+    return {found.begin(), found.end()};
 }
 
 bool Recording::has(std::string const& text, int level) const

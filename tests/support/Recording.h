@@ -38,6 +38,9 @@ public:
     /** @return the texts other than entry and exit lines */
     std::vector<std::string> remarks() const;
 
+    /** @return "FUNCTION FILE CATEGORY" of each kind of message, sorted, once each */
+    std::vector<std::string> sources() const;
+
     bool has(std::string const& text, int level) const;
     void clear();
 

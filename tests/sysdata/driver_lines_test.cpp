@@ -3,6 +3,7 @@
 
 #include <gtest/gtest.h>
 
+#include <optional>
 #include <string>
 
 namespace
@@ -10,16 +11,29 @@ namespace
 
 using namespace NQ::driverLines;
 
-struct Word {
-    bool found;
-    std::string text;
-};
-
-Word wordOf(std::string const& line)
+std::optional<std::string> moduleOf(std::string const& line)
 {
     char module[lineSize] = "";
-    bool const found = findModule(line.c_str(), module);
-    return {found, module};
+    return findModule(line.c_str(), module) ? std::optional<std::string>(module) : std::nullopt;
+}
+
+TEST(DriverLines, YieldTheFirstWordAsTheModule)
+{
+    for (char const* line : {"ext4                 823296  1\n", " \t ext4 823296 1\n",
+                             "ext4\t823296\n", "ext4", "ext4\n"})
+        EXPECT_EQ(moduleOf(line), "ext4") << line;
+    for (char const* line : {"\n", "", "  \t \r\n"})
+        EXPECT_EQ(moduleOf(line), std::nullopt) << line;
+    for (std::size_t const length : {511U, 5000U}) // never more than the buffer
+        EXPECT_EQ(moduleOf(std::string(length, 'a')), std::string(511, 'a'));
+}
+
+TEST(DriverHeader, IsRecognisedByItsFirstSixCharacters)
+{
+    for (char const* word : {"Module", "Module_of_mine", "Modules"})
+        EXPECT_TRUE(isHeader(word)) << word;
+    for (char const* word : {"Modul", "module", "aModule", ""})
+        EXPECT_FALSE(isHeader(word)) << word;
 }
 
 /** A record and its counts, fed line by line. */
@@ -34,156 +48,66 @@ struct Facts {
     Seen seen;
 };
 
-TEST(DriverLines, YieldTheFirstWordAsTheModule)
+TEST(DriverFacts, AreTakenAfterTheBlanksOfTheirLine)
 {
-    Word const word = wordOf("ext4                 823296  1\n");
-    EXPECT_TRUE(word.found);
-    EXPECT_EQ(word.text, "ext4");
+    struct {
+        char const* line;
+        char const* version;
+        char const* description;
+    } const cases[] = {
+        {"version:        7.3.21-k8-NAPI\n", "7.3.21-k8-NAPI", ""},
+        {"description:    Intel(R) PRO/1000 Network Driver\n", "",
+         "Intel(R) PRO/1000 Network Driver"},
+        {"version: 1.0  \r\n", "1.0  \r", ""},
+        {"version: 1.0", "1.0", ""},
+        {"version:1.0 beta 2\n", "beta 2", ""}, // from the first space on
+    };
+    for (auto const& [line, version, description] : cases) {
+        Facts facts;
+        EXPECT_TRUE(facts.take(line)) << line;
+        EXPECT_EQ(facts.driver.getVersion(), version);
+        EXPECT_EQ(facts.driver.getDescription(), description);
+        EXPECT_EQ(facts.seen.version, *version != '\0');
+        EXPECT_EQ(facts.seen.description, *description != '\0');
+    }
 }
 
-TEST(DriverLines, SkipBlanksAndTabsBeforeTheModule)
-{
-    EXPECT_EQ(wordOf(" \t ext4 823296 1\n").text, "ext4");
-    EXPECT_EQ(wordOf("ext4\t823296\n").text, "ext4");
-}
-
-TEST(DriverLines, YieldAModuleWithNothingAfterIt)
-{
-    EXPECT_EQ(wordOf("ext4").text, "ext4");
-    EXPECT_EQ(wordOf("ext4\n").text, "ext4");
-}
-
-TEST(DriverLines, YieldNoModuleIfTheyAreBlank)
-{
-    EXPECT_FALSE(wordOf("\n").found);
-    EXPECT_FALSE(wordOf("").found);
-    EXPECT_FALSE(wordOf("  \t \r\n").found);
-}
-
-TEST(DriverLines, NeverOverflowTheModuleBuffer)
-{
-    EXPECT_EQ(wordOf(std::string(511, 'a')).text, std::string(511, 'a'));
-    EXPECT_EQ(wordOf(std::string(5000, 'a')).text, std::string(511, 'a'));
-}
-
-TEST(DriverHeader, IsRecognisedByItsFirstSixCharacters)
-{
-    EXPECT_TRUE(isHeader("Module"));
-    EXPECT_TRUE(isHeader("Module_of_mine"));
-    EXPECT_TRUE(isHeader("Modules"));
-}
-
-TEST(DriverHeader, IsNotAnyOtherWord)
-{
-    EXPECT_FALSE(isHeader("Modul"));
-    EXPECT_FALSE(isHeader("module"));
-    EXPECT_FALSE(isHeader("aModule"));
-    EXPECT_FALSE(isHeader(""));
-}
-
-TEST(DriverFacts, TakeTheVersionAfterTheBlanks)
+TEST(DriverFacts, AreTakenFromExactKeysAtTheStartOnly)
 {
     Facts facts;
-    EXPECT_TRUE(facts.take("version:        7.3.21-k8-NAPI\n"));
-    EXPECT_EQ(facts.driver.getVersion(), "7.3.21-k8-NAPI");
-    EXPECT_TRUE(facts.seen.version);
+    for (char const* line : {"srcversion:     0D3AAC3E6C2A4A0A0F0E9F1\n",
+                             "vermagic:       6.1.0-13-amd64 SMP preempt mod_unload modversions\n",
+                             "rhelversion:    9.3\n", " version: 1.0\n", "\tdescription: disk\n",
+                             "Version: 1.0\n", "version 1.0\n", "description disk\n", "versio", ""})
+        EXPECT_TRUE(facts.take(line)) << line;
+    EXPECT_FALSE(facts.seen.version);
     EXPECT_FALSE(facts.seen.description);
-}
-
-TEST(DriverFacts, TakeTheDescriptionAfterTheBlanks)
-{
-    Facts facts;
-    EXPECT_TRUE(facts.take("description:    Intel(R) PRO/1000 Network Driver\n"));
-    EXPECT_EQ(facts.driver.getDescription(), "Intel(R) PRO/1000 Network Driver");
-    EXPECT_TRUE(facts.seen.description);
-    EXPECT_FALSE(facts.seen.version);
-}
-
-TEST(DriverFacts, KeepBlanksAndCarriageReturnsAtTheEnd)
-{
-    Facts facts;
-    facts.take("version: 1.0  \r\n");
-    EXPECT_EQ(facts.driver.getVersion(), "1.0  \r");
-}
-
-TEST(DriverFacts, TakeALineWithoutALineEnd)
-{
-    Facts facts;
-    facts.take("version: 1.0");
-    EXPECT_EQ(facts.driver.getVersion(), "1.0");
-}
-
-TEST(DriverFacts, BeginAtTheFirstSpaceOfTheLine)
-{
-    Facts facts;
-    EXPECT_TRUE(facts.take("version:1.0 beta 2\n"));
-    EXPECT_EQ(facts.driver.getVersion(), "beta 2");
-}
-
-TEST(DriverFacts, AreNotTakenFromKeysThatMerelyEndInVersion)
-{
-    Facts facts;
-    EXPECT_TRUE(facts.take("srcversion:     0D3AAC3E6C2A4A0A0F0E9F1\n"));
-    EXPECT_TRUE(facts.take("vermagic:       6.1.0-13-amd64 SMP preempt mod_unload modversions\n"));
-    EXPECT_TRUE(facts.take("rhelversion:    9.3\n"));
-    EXPECT_FALSE(facts.seen.version);
     EXPECT_EQ(facts.driver.getVersion(), "");
-}
-
-TEST(DriverFacts, AreNotTakenFromKeysAfterABlank)
-{
-    Facts facts;
-    EXPECT_TRUE(facts.take(" version: 1.0\n"));
-    EXPECT_TRUE(facts.take("\tdescription: disk\n"));
-    EXPECT_FALSE(facts.seen.version);
-    EXPECT_FALSE(facts.seen.description);
-}
-
-TEST(DriverFacts, AreTakenFromExactKeysOnly)
-{
-    Facts facts;
-    EXPECT_TRUE(facts.take("Version: 1.0\n"));
-    EXPECT_TRUE(facts.take("version 1.0\n"));
-    EXPECT_TRUE(facts.take("description disk\n"));
-    EXPECT_TRUE(facts.take("versio"));
-    EXPECT_TRUE(facts.take(""));
-    EXPECT_FALSE(facts.seen.version);
-    EXPECT_FALSE(facts.seen.description);
 }
 
 TEST(DriverFacts, LetTheLastOccurrenceWin)
 {
     Facts facts;
-    facts.take("version: 1\n");
-    facts.take("description: first\n");
-    facts.take("version: 2\n");
-    facts.take("description: second\n");
+    for (char const* line :
+         {"version: 1\n", "description: first\n", "version: 2\n", "description: second\n"})
+        EXPECT_TRUE(facts.take(line));
     EXPECT_EQ(facts.driver.getVersion(), "2");
     EXPECT_EQ(facts.driver.getDescription(), "second");
     EXPECT_TRUE(facts.seen.version);
     EXPECT_TRUE(facts.seen.description);
+    EXPECT_TRUE(facts.take("description:    \n")); // seen, and empty
+    EXPECT_EQ(facts.driver.getDescription(), "");
 }
 
 TEST(DriverFacts, AreRefusedWithoutASpace)
 {
     Facts facts;
     facts.take("version: 1\n");
-    EXPECT_FALSE(facts.take("version:2\n"));
-    EXPECT_FALSE(facts.take("version:\n"));
-    EXPECT_FALSE(facts.take("version:\t2\n"));
-    EXPECT_FALSE(facts.take("description:\n"));
+    for (char const* line : {"version:2\n", "version:\n", "version:\t2\n", "description:\n"})
+        EXPECT_FALSE(facts.take(line)) << line;
     EXPECT_EQ(facts.driver.getVersion(), "1");
     EXPECT_TRUE(facts.seen.version);
     EXPECT_FALSE(facts.seen.description);
-}
-
-TEST(DriverFacts, CountAValueOfBlanksAsSeenAndEmpty)
-{
-    Facts facts;
-    EXPECT_TRUE(facts.take("description: something\n"));
-    EXPECT_TRUE(facts.take("description:    \n"));
-    EXPECT_EQ(facts.driver.getDescription(), "");
-    EXPECT_TRUE(facts.seen.description);
 }
 
 TEST(DriverCompletion, DefaultsWhatWasNeverSeen)

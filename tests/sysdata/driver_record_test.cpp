@@ -68,10 +68,9 @@ TEST(DriverRecord, LogsOnlyEntryAndExitOfGettersAndSetters)
                                             std::string(field.setter) + ": exit",
                                             std::string(field.getter) + ": entry",
                                             std::string(field.getter) + ": exit"}));
-        for (LogRecord const& record : recording.records()) {
-            EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.DriverInfo");
-            EXPECT_EQ(record.file, "driverInfo_linux");
-        }
+        for (std::string const& source : recording.sources())
+            EXPECT_NE(source.find(" driverInfo_linux Veltrix.IC.MI.OsSwMI.DriverInfo"),
+                      source.npos);
     }
 }
 

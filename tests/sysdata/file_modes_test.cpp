@@ -34,42 +34,21 @@ protected:
         files_.write("/var/log/messages", "line\n");
         NQ::minMaxId::Instance(); // reads its file here
         commands_.otherwise = "";
-        auto const below = libc::hooks().fopen.answer();
-        libc::hooks().fopen = [this, below](char const* path, char const* mode) {
-            if (noting_)
-                opened_.insert(std::string(path) + "|" + mode);
-            return below(path, mode);
-        };
+        libc::hooks().fopen.watch([this](std::string const& path, std::string const& mode) {
+            opened_.insert(path + "|" + mode);
+        });
     }
 
     /** What is opened while the operations run. */
     Opened openedBy(std::function<void()> const& operations)
     {
         opened_.clear();
-        noting_ = true;
         operations();
-        noting_ = false;
         return opened_;
-    }
-
-    void searchReleaseFiles()
-    {
-        long date = 0;
-        std::string version;
-        info_.getInstallDate(date);
-        info_.getOSVersion(version);
-    }
-
-    void haveReleaseFiles()
-    {
-        for (char const* path : {"/etc/SuSE-release", "/etc/UnitedLinux-release",
-                                 "/etc/redhat-release", "/etc/vmware-release"})
-            files_.write(path, "");
     }
 
     FakeFiles const files_;
     FakeCommands commands_;
-    bool noting_ = false;
     Opened opened_;
     NQ::OsInfo info_;
 };
@@ -87,23 +66,25 @@ TEST_F(FileModes, OfTheListingsAreRoOrR)
     EXPECT_EQ(openedBy(list), (Opened{"/etc/passwd|ro", "/etc/shadow|ro", "/etc/pam.d/login|r"}));
 }
 
-TEST_F(FileModes, OfSearchedReleaseFilesAreR)
+TEST_F(FileModes, OfReleaseFilesAreR)
 {
     auto const search = [this] {
-        searchReleaseFiles();
-        char user[] = "jdoe";
-        NQ::userInfo().findIsAcctDisabled(user);
+        long date = 0;
+        std::string version;
+        info_.getInstallDate(date);
+        info_.getOSVersion(version);
     };
+    Opened const searched = {"/etc/SuSE-release|r", "/etc/UnitedLinux-release|r",
+                             "/etc/redhat-release|r", "/etc/release|r", "/etc/vmware-release|r"};
+    EXPECT_EQ(openedBy(search), searched);
+    for (char const* path : {"/etc/SuSE-release", "/etc/UnitedLinux-release", "/etc/redhat-release",
+                             "/etc/vmware-release"})
+        files_.write(path, "");
     EXPECT_EQ(openedBy(search),
-              (Opened{"/etc/SuSE-release|r", "/etc/UnitedLinux-release|r", "/etc/redhat-release|r",
-                      "/etc/release|r", "/etc/vmware-release|r"}));
-}
-
-TEST_F(FileModes, OfFoundReleaseFilesAreR)
-{
-    haveReleaseFiles();
-    EXPECT_EQ(openedBy([this] { searchReleaseFiles(); }),
               (Opened{"/etc/release|r", "/etc/SuSE-release|r", "/etc/UnitedLinux-release|r"}));
+    char user[] = "jdoe";
+    EXPECT_EQ(openedBy([&user] { NQ::userInfo().findIsAcctDisabled(user); }),
+              Opened{"/etc/SuSE-release|r"});
 }
 
 TEST_F(FileModes, OfTheProbesOfMethodsAreR)

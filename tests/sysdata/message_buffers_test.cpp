@@ -13,7 +13,6 @@
 
 TEST(Messages, UseOneBufferEach)
 {
-    libc::HookGuard const guard;
     libc::hooks().popen = [](char const*, char const*) -> FILE* { return nullptr; };
     libc::hooks().sysinfo = [](struct sysinfo*) { return -1; };
     Recording const recording;

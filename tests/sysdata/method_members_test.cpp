@@ -18,14 +18,9 @@ protected:
         commands_.ran.clear();
     }
 
-    int add(std::string const& group)
+    static int change(std::string const& method, std::string const& group)
     {
-        return change("LocalGroupAddUser", group);
-    }
-
-    int remove(std::string const& group)
-    {
-        return change("LocalGroupDelUser", group);
+        return execute(method, {text("LocalGroupName", group), text("DomainAndMember", "jdoe")});
     }
 
     /** The line that reads the present groups, and the one that sets this list. */
@@ -34,105 +29,55 @@ protected:
         return {idLine_, "/usr/sbin/usermod -G " + groups + " \"jdoe\" 2>&1"};
     }
 
-    /** The list that is set when jdoe, whom id shows in these groups, is added to another one. */
-    std::string added(std::string const& group, std::string const& groups = groupsOfJdoe)
-    {
-        identity("uid=1001(jdoe) " + groups + "\n");
-        EXPECT_EQ(add(group), 0);
-        return listSet();
-    }
-
-    /** The list that is set when jdoe is removed from a group. */
-    std::string removed(std::string const& group, std::string const& groups = groupsOfJdoe)
-    {
-        identity("uid=1001(jdoe) " + groups + "\n");
-        EXPECT_EQ(remove(group), 0);
-        return listSet();
-    }
-
+    static constexpr char add[] = "LocalGroupAddUser";
+    static constexpr char remove[] = "LocalGroupDelUser";
     std::string const idLine_ = "/usr/bin/id \"jdoe\" 2>&1";
-
-private:
-    /** What usermod was run with, after id and nothing else. */
-    std::string listSet() const
-    {
-        if (commands_.ran.size() != 2)
-            return std::to_string(commands_.ran.size()) + " commands";
-        std::string const start = "/usr/sbin/usermod -G ";
-        std::string const end = " \"jdoe\" 2>&1";
-        std::string const& line = commands_.ran[1];
-        std::string const list = line.substr(0, line.size() - end.size()).substr(start.size());
-        EXPECT_EQ(commands_.ran, linesThatSet(list));
-        return list;
-    }
-
-    static int change(char const* method, std::string const& group)
-    {
-        return execute(method, {text("LocalGroupName", group), text("DomainAndMember", "jdoe")});
-    }
 };
 
-TEST_F(GroupMemberChanges, AddTheGroupAfterThePresentOnes)
+TEST_F(GroupMemberChanges, SetTheListWithTheGroupOrWithoutIt)
 {
-    EXPECT_EQ(added("staff"), "jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\"");
-}
-
-TEST_F(GroupMemberChanges, RemoveTheGroupFromTheList)
-{
-    EXPECT_EQ(removed("sudo"), "jdoe,\"jdoe\",\"users\"");
-}
-
-TEST_F(GroupMemberChanges, KeepThePrimaryGroupAsTheOnlyOne)
-{
-    EXPECT_EQ(removed("sudo", "gid=100(users) groups=27(sudo)"), "users");
-}
-
-TEST_F(GroupMemberChanges, KeepGroupsWhoseNamesOnlyBeginAlike)
-{
-    EXPECT_EQ(removed("sudo", "gid=100(users) groups=100(users),27(sudo),28(sudoers),29(su)"),
-              "users,\"users\",\"sudoers\",\"su\"");
-}
-
-TEST_F(GroupMemberChanges, KeepThePrimaryGroupEvenIfItIsRemoved)
-{
-    EXPECT_EQ(removed("jdoe"), "jdoe,\"sudo\",\"users\"");
-}
-
-TEST_F(GroupMemberChanges, LoseAPrimaryGroupThatComparesAsOneMore)
-{
-    // The quoted group begins with a double quote, and "#" is the character after that.
-    EXPECT_EQ(removed("sudo", "gid=1001(#jdoe) groups=27(sudo),100(users)"), "\"users\"");
-    EXPECT_EQ(removed("sudo", "gid=1001($jdoe) groups=27(sudo),100(users)"), "$jdoe,\"users\"");
-    EXPECT_EQ(removed("sudo", "gid=1001(!jdoe) groups=27(sudo),100(users)"), "!jdoe,\"users\"");
-    EXPECT_EQ(removed("sudo", "gid=1001(\"t) groups=27(sudo),100(users)"), "\"users\"");
-}
-
-TEST_F(GroupMemberChanges, KeepSuchAPrimaryGroupWhenAdded)
-{
-    EXPECT_EQ(added("users", "gid=1001(#jdoe) groups=27(sudo)"), "#jdoe,\"sudo\",\"users\"");
-}
-
-TEST_F(GroupMemberChanges, FindTheListInOtherLanguages)
-{
-    EXPECT_EQ(added("staff", "gid=100(users) Gruppen=100(users),27(sudo)"),
-              "users,\"users\",\"sudo\",\"staff\"");
-}
-
-TEST_F(GroupMemberChanges, WorkForAMemberOfOnlyThePrimaryGroup)
-{
-    EXPECT_EQ(added("staff", "gid=100(users)"), "users,\"staff\"");
-}
-
-TEST_F(GroupMemberChanges, FindTheListAfterTheWordGroups)
-{
-    EXPECT_EQ(added("staff", "gid=100(users) egid=5(tty) groups=27(sudo)"),
-              "users,\"sudo\",\"staff\"");
-}
-
-TEST_F(GroupMemberChanges, WorkForAPrimaryGroupWithoutAName)
-{
-    EXPECT_EQ(added("staff", "gid=5000"), "\"staff\"");
-    EXPECT_EQ(removed("sudo", "gid=5000 groups=5000,27(sudo),100(users)"), "\"users\"");
+    struct {
+        char const* what;
+        char const* method;
+        char const* group;
+        std::string groups; // as id shows them
+        char const* list;
+    } const cases[] = {
+        {"after the present ones", add, "staff", groupsOfJdoe,
+         "jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\""},
+        {"taken from the list", remove, "sudo", groupsOfJdoe, "jdoe,\"jdoe\",\"users\""},
+        {"the primary group only", remove, "sudo", "gid=100(users) groups=27(sudo)", "users"},
+        {"names that only begin alike", remove, "sudo",
+         "gid=100(users) groups=100(users),27(sudo),28(sudoers),29(su)",
+         "users,\"users\",\"sudoers\",\"su\""},
+        {"the primary group stays", remove, "jdoe", groupsOfJdoe, "jdoe,\"sudo\",\"users\""},
+        // The quoted group begins with a double quote, and "#" is the character after that.
+        {"unless it compares as one more", remove, "sudo",
+         "gid=1001(#jdoe) groups=27(sudo),100(users)", "\"users\""},
+        {"two more", remove, "sudo", "gid=1001($jdoe) groups=27(sudo),100(users)",
+         "$jdoe,\"users\""},
+        {"one less", remove, "sudo", "gid=1001(!jdoe) groups=27(sudo),100(users)",
+         "!jdoe,\"users\""},
+        {"a later character", remove, "sudo", "gid=1001(\"t) groups=27(sudo),100(users)",
+         "\"users\""},
+        {"such a group is kept when one is added", add, "users", "gid=1001(#jdoe) groups=27(sudo)",
+         "#jdoe,\"sudo\",\"users\""},
+        {"another language", add, "staff", "gid=100(users) Gruppen=100(users),27(sudo)",
+         "users,\"users\",\"sudo\",\"staff\""},
+        {"no list", add, "staff", "gid=100(users)", "users,\"staff\""},
+        {"the list after the word groups", add, "staff",
+         "gid=100(users) egid=5(tty) groups=27(sudo)", "users,\"sudo\",\"staff\""},
+        {"a primary group without a name", add, "staff", "gid=5000", "\"staff\""},
+        {"and a list", remove, "sudo", "gid=5000 groups=5000,27(sudo),100(users)", "\"users\""},
+        {"a group twice", add, "sudo", groupsOfJdoe, "jdoe,\"jdoe\",\"sudo\",\"users\",\"sudo\""},
+        {"not a member", remove, "staff", groupsOfJdoe, "jdoe,\"jdoe\",\"sudo\",\"users\""},
+        {"a name that is cut off", add, "staff", "gid=100(us", "\"staff\""},
+    };
+    for (auto const& [what, method, group, groups, list] : cases) {
+        identity("uid=1001(jdoe) " + groups + "\n");
+        EXPECT_EQ(change(method, group), 0) << what;
+        EXPECT_EQ(commands_.ran, linesThatSet(list)) << what;
+    }
 }
 
 TEST_F(GroupMemberChanges, KeepAUserInItsOnlyNamedGroup)
@@ -141,15 +86,8 @@ TEST_F(GroupMemberChanges, KeepAUserInItsOnlyNamedGroup)
     identity("uid=1001(jdoe) gid=5000 groups=5000,27(sudo)\n");
     std::string const line = "/usr/sbin/usermod -G 2>&1";
     commands_.answers[line] = "usermod: option requires an argument -- 'G'\n";
-    EXPECT_EQ(remove("sudo"), 1);
+    EXPECT_EQ(change(remove, "sudo"), 1);
     EXPECT_EQ(commands_.ran, (Lines{idLine_, line}));
-}
-
-TEST_F(GroupMemberChanges, IgnoreACutOffName)
-{
-    identity("uid=1001(jdoe) gid=100(us");
-    EXPECT_EQ(add("staff"), 0);
-    EXPECT_EQ(commands_.ran, linesThatSet("\"staff\""));
 }
 
 TEST_F(GroupMemberChanges, WorkForNamesThatHoldTheSearchedWords)
@@ -168,40 +106,30 @@ TEST_F(GroupMemberChanges, AreNotMadeIfIdKnowsNothing)
     for (char const* output : {"", "id: jdoe: No such user\n", "uid=1(jdoe)\n",
                                "id: gid: No such user\n", "id: 'jdoe': no such user\n"}) {
         identity(output);
-        EXPECT_EQ(add("staff"), 1);
+        EXPECT_EQ(change(add, "staff"), 1);
         EXPECT_EQ(commands_.ran, Lines{idLine_});
     }
 }
 
-TEST_F(GroupMemberChanges, AreNotMadeIfIdCannotBeStarted)
+TEST_F(GroupMemberChanges, FailIfAToolCannotBeStarted)
 {
     commands_.otherwise.reset();
-    EXPECT_EQ(add("staff"), 1);
+    EXPECT_EQ(change(add, "staff"), 1);
     EXPECT_EQ(commands_.ran, Lines{idLine_});
+    identity(identityOfJdoe);
+    EXPECT_EQ(change(add, "staff"), 1);
+    EXPECT_EQ(commands_.ran.size(), 2U);
 }
 
-TEST_F(GroupMemberChanges, FailIfUsermodPrintsAnything)
+TEST_F(GroupMemberChanges, FailIfUsermodPrintsAnythingButThatForThePrimaryGroup)
 {
     identity(identityOfJdoe);
     commands_.answers[linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\"").at(1)] =
         "usermod: group 'staff' does not exist\n";
-    EXPECT_EQ(add("staff"), 1);
-}
-
-TEST_F(GroupMemberChanges, SucceedForThePrimaryGroup)
-{
-    identity(identityOfJdoe);
+    EXPECT_EQ(change(add, "staff"), 1);
     commands_.answers[linesThatSet("jdoe,\"sudo\",\"users\"").at(1)] =
         "usermod: `jdoe' is primary group name.\n";
-    EXPECT_EQ(remove("jdoe"), 0);
-}
-
-TEST_F(GroupMemberChanges, FailIfUsermodCannotBeStarted)
-{
-    identity(identityOfJdoe);
-    commands_.otherwise.reset();
-    EXPECT_EQ(add("staff"), 1);
-    EXPECT_EQ(commands_.ran.size(), 2U);
+    EXPECT_EQ(change(remove, "jdoe"), 0);
 }
 
 TEST_F(GroupMemberChanges, TakeTheirNamesFromTextParametersOnly)
@@ -209,6 +137,7 @@ TEST_F(GroupMemberChanges, TakeTheirNamesFromTextParametersOnly)
     identity(identityOfJdoe);
     EXPECT_EQ(execute("LocalGroupAddUser", {text("DomainAndMember", "jdoe"),
                                             {"LocalGroupName", "CMPI_uint32", "1"},
+                                            {"Colour", "CMPI_boolean", "red"},
                                             text("LocalGroupName", "my staff"),
                                             {"DomainAndMember", "CMPI_dateTime", "2010-5-7"},
                                             text("GroupName", "other")}),
@@ -225,15 +154,10 @@ TEST_F(GroupMemberChanges, QuoteAMemberThatIsNotGiven)
 TEST_F(GroupMemberChanges, RemoveForAnyMethodButTheOneThatAdds)
 {
     identity(identityOfJdoe);
-    NQ::OsInfo info;
-    EXPECT_FALSE(info.groupMemberChanges(
+    EXPECT_FALSE(NQ::OsInfo().groupMemberChanges(
         "anything", {text("LocalGroupName", "sudo"), text("DomainAndMember", "jdoe")}));
     EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"users\""));
-}
-
-TEST_F(GroupMemberChanges, AreMadeByAMethodCall)
-{
-    identity(identityOfJdoe);
+    commands_.ran.clear();
     EXPECT_TRUE(call("LocalGroupDelUser,LocalGroupName:CMPI_string:users,"
                      "DomainAndMember:CMPI_string:jdoe"));
     EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\""));
@@ -243,29 +167,13 @@ TEST_F(GroupMemberChanges, LogTheOutputOfTheTools)
 {
     identity(identityOfJdoe);
     Recording const log;
-    add("staff");
+    change(add, "staff");
     EXPECT_EQ(
         log.texts(),
         (Lines{"OsNode::executeMethod: entry", "groupMemberChanges: entry", "executeCommand: entry",
                "executeCommand: exit", "outputBuffer: " + identityOfJdoe, "executeCommand: entry",
                "executeCommand: exit", "outputBuffer: ", "groupMemberChanges: exit",
                "OsNode::executeMethod: exit"}));
-}
-
-TEST_F(GroupMemberChanges, ListAGroupTwiceIfItIsAddedAgain)
-{
-    EXPECT_EQ(added("sudo"), "jdoe,\"jdoe\",\"sudo\",\"users\",\"sudo\"");
-    EXPECT_EQ(removed("staff"), "jdoe,\"jdoe\",\"sudo\",\"users\""); // not a member
-}
-
-TEST_F(GroupMemberChanges, AreMadeWhateverTypesOtherParametersHave)
-{
-    identity(identityOfJdoe);
-    EXPECT_EQ(execute("LocalGroupAddUser", {text("LocalGroupName", "staff"),
-                                            {"Colour", "CMPI_boolean", "red"},
-                                            text("DomainAndMember", "jdoe")}),
-              0);
-    EXPECT_EQ(commands_.ran, linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\""));
 }
 
 } // namespace method_members_test

@@ -3,7 +3,6 @@
 #include "tests/interpose/Libc.h"
 #include "tests/sysdata/MethodTest.h"
 
-#include <algorithm>
 #include <array>
 
 namespace method_runner_test
@@ -36,63 +35,36 @@ protected:
 
 TEST_F(ExecuteCommand, JoinsTheProgramAndItsArgumentsByBlanks)
 {
-    EXPECT_EQ(run("/bin/one", {"-a", "two  three", "'"}), 0);
-    EXPECT_EQ(commands_.ran, Lines{"/bin/one -a two  three ' 2>&1"});
+    struct {
+        char const* program;
+        Lines arguments;
+        char const* line;
+    } const cases[] = {
+        {"/bin/one", {"-a", "two  three", "'"}, "/bin/one -a two  three ' 2>&1"},
+        {"/bin/one", {}, "/bin/one 2>&1"},
+        {"/bin/one", {"-a", "", "-b"}, "/bin/one -a 2>&1"},
+        {"/usr/sbin/useradd", {"jdoe"}, "/usr/sbin/useradd jdoe 2>&1;echo rc=$? 2>&1"},
+        {"/bin/echo", {"-useradd-"}, "/bin/echo -useradd- 2>&1;echo rc=$? 2>&1"},
+        {"/usr/sbin/userad", {"d"}, "/usr/sbin/userad d 2>&1"},
+    };
+    for (auto const& [program, arguments, line] : cases) {
+        EXPECT_EQ(run(program, arguments), 0);
+        EXPECT_EQ(commands_.ran.back(), line);
+    }
 }
 
-TEST_F(ExecuteCommand, RunsAProgramWithoutArguments)
+TEST_F(ExecuteCommand, CopiesTheOutputAndReportsAnyWhateverTheStatus)
 {
-    EXPECT_EQ(run("/bin/one", {}), 0);
-    EXPECT_EQ(commands_.ran, Lines{"/bin/one 2>&1"});
-}
-
-TEST_F(ExecuteCommand, EndsAtTheFirstEmptyArgument)
-{
-    run("/bin/one", {"-a", "", "-b"});
-    EXPECT_EQ(commands_.ran, Lines{"/bin/one -a 2>&1"});
-}
-
-TEST_F(ExecuteCommand, EchoesTheCodeOfALineThatHoldsUseradd)
-{
-    run("/usr/sbin/useradd", {"jdoe"});
-    run("/bin/echo", {"-useradd-"});
-    run("/usr/sbin/userad", {"d"});
-    EXPECT_EQ(commands_.ran,
-              (Lines{"/usr/sbin/useradd jdoe 2>&1;echo rc=$? 2>&1",
-                     "/bin/echo -useradd- 2>&1;echo rc=$? 2>&1", "/usr/sbin/userad d 2>&1"}));
-}
-
-TEST_F(ExecuteCommand, CopiesTheWholeOutput)
-{
-    commands_.otherwise = "one\ntwo\n\nthree";
-    EXPECT_EQ(run("/bin/one", {}), 1);
-    EXPECT_EQ(said(), "one\ntwo\n\nthree");
-}
-
-TEST_F(ExecuteCommand, CopiesWhatFollowsANulByteToo)
-{
-    output_.fill('#');
-    commands_.otherwise = std::string("one\0two", 7);
-    EXPECT_EQ(run("/bin/one", {}), 1);
-    EXPECT_EQ(std::string(output_.begin(), output_.begin() + 9), std::string("one\0two\0#", 9));
-}
-
-TEST_F(ExecuteCommand, ReportsASingleByteAndSilence)
-{
-    output_.fill('#');
-    EXPECT_EQ(run("/bin/one", {}), 0);
-    EXPECT_EQ(said(), "");
-    commands_.otherwise = "\n";
-    EXPECT_EQ(run("/bin/one", {}), 1);
-    EXPECT_EQ(said(), "\n");
-}
-
-TEST_F(ExecuteCommand, WritesNothingAfterTheOutput)
-{
-    output_.fill('#');
-    commands_.otherwise = "abc";
-    run("/bin/one", {});
-    EXPECT_EQ(std::string(output_.begin(), output_.begin() + 6), std::string("abc\0##", 6));
+    commands_.status = 1 << 8;
+    for (std::string const& output :
+         {std::string(), std::string("\n"), std::string("one\ntwo\n\nthree"),
+          std::string("one\0two", 7), std::string(bufferSize - 1, 'x')}) {
+        output_.fill('#');
+        commands_.otherwise = output;
+        EXPECT_EQ(run("/bin/one", {}), output.empty() ? 0 : 1);
+        EXPECT_EQ(std::string(output_.data(), output.size() + 2), output + std::string("\0#", 2));
+        EXPECT_EQ(commands_.open, 0);
+    }
 }
 
 TEST_F(ExecuteCommand, FailsIfThePipeCannotBeOpened)
@@ -102,33 +74,9 @@ TEST_F(ExecuteCommand, FailsIfThePipeCannotBeOpened)
     Recording const log;
     EXPECT_EQ(run("/bin/one", {"-p", "argument"}), 1);
     EXPECT_EQ(said(), "");
+    EXPECT_EQ(log.texts(), (Lines{"executeCommand: entry", "Cannot open process: /bin/one",
+                                  "executeCommand: exit"}));
     EXPECT_EQ(log.texts(6000), Lines{"Cannot open process: /bin/one"});
-}
-
-TEST_F(ExecuteCommand, IgnoresTheExitStatusOfTheCommand)
-{
-    libc::hooks().pclose = [](FILE* stream) {
-        std::fclose(stream);
-        return 1 << 8;
-    };
-    EXPECT_EQ(run("/bin/one", {}), 0);
-}
-
-TEST_F(ExecuteCommand, ClosesThePipe)
-{
-    commands_.otherwise = "x";
-    run("/bin/one", {});
-    EXPECT_EQ(commands_.ran.size(), 1U);
-    EXPECT_EQ(commands_.open, 0);
-}
-
-TEST_F(ExecuteCommand, KeepsOutputThatJustFits)
-{
-    commands_.otherwise = std::string(bufferSize - 1, 'x');
-    output_.fill('#');
-    EXPECT_EQ(run("/bin/one", {}), 1);
-    EXPECT_EQ(said(), std::string(bufferSize - 1, 'x'));
-    EXPECT_EQ(output_.back(), '#');
 }
 
 TEST_F(ExecuteCommand, ReadsLongerOutputToItsEndAndCutsIt)
@@ -173,13 +121,6 @@ TEST_F(ExecuteCommand, CountsTheEchoedCodeAsPartOfTheLine)
     EXPECT_EQ(commands_.ran.size(), 1U);
 }
 
-TEST_F(ExecuteCommand, LogsItsEntryAndExit)
-{
-    Recording const log;
-    run("/bin/one", {});
-    EXPECT_EQ(log.texts(), (Lines{"executeCommand: entry", "executeCommand: exit"}));
-}
-
 class PasswordEncryption : public MethodTest
 {
 protected:
@@ -189,18 +130,13 @@ protected:
     }
 };
 
-TEST_F(PasswordEncryption, EchoesThePasswordIntoPasswd)
-{
-    set("secret", "jdoe");
-    EXPECT_EQ(commands_.ran, Lines{"echo secret | /usr/bin/passwd jdoe --stdin 2>&1"});
-    EXPECT_EQ(commands_.open, 0);
-}
-
-TEST_F(PasswordEncryption, NeitherJudgesNorLogsTheOutput)
+TEST_F(PasswordEncryption, EchoesItIntoPasswdAndIgnoresTheOutput)
 {
     commands_.otherwise = "BAD PASSWORD\n";
     Recording const log;
     set("secret", "jdoe");
+    EXPECT_EQ(commands_.ran, Lines{"echo secret | /usr/bin/passwd jdoe --stdin 2>&1"});
+    EXPECT_EQ(commands_.open, 0);
     EXPECT_EQ(log.texts(), (Lines{"executePasswordEncryption: entry", "executeCommand: entry",
                                   "executeCommand: exit", "executePasswordEncryption: exit"}));
 }

@@ -6,6 +6,7 @@
 
 #include <gtest/gtest.h>
 
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -21,59 +22,48 @@ Lines tokens(std::string const& text, std::string const& delimiters)
 
 TEST(Tokenize, AppendsEveryRunThatHoldsNoDelimiterInOrder)
 {
-    EXPECT_EQ(tokens("one,two,three", ","), (Lines{"one", "two", "three"}));
-}
-
-TEST(Tokenize, SplitsAtEveryCharacterOfTheSet)
-{
-    EXPECT_EQ(tokens("one:two,three:,four", ",:"), (Lines{"one", "two", "three", "four"}));
-}
-
-TEST(Tokenize, MakesNoEmptyTokensOfRunsAndEnds)
-{
-    EXPECT_EQ(tokens(",,one,,,two,", ","), (Lines{"one", "two"}));
-}
-
-TEST(Tokenize, FindsNothingInAnEmptyTextOrOnlyDelimiters)
-{
-    EXPECT_EQ(tokens("", ","), Lines());
-    EXPECT_EQ(tokens(",,,", ","), Lines());
-}
-
-TEST(Tokenize, YieldsTheWholeTextIfItHoldsNoDelimiter)
-{
-    EXPECT_EQ(tokens("one two", ","), Lines{"one two"});
-    EXPECT_EQ(tokens("one,two", ""), Lines{"one,two"});
-}
-
-TEST(Tokenize, DoesNotClearTheList)
-{
-    Lines found{"before"};
-    NQ::Tokenize("one,two", found, ",");
-    EXPECT_EQ(found, (Lines{"before", "one", "two"}));
+    struct {
+        char const* text;
+        char const* delimiters;
+        Lines tokens;
+    } const cases[] = {{"one,two,three", ",", {"one", "two", "three"}},
+                       {"one:two,three:,four", ",:", {"one", "two", "three", "four"}},
+                       {"a:b,c;d", ",:", {"a", "b", "c;d"}},
+                       {",,one,,,two,", ",", {"one", "two"}},
+                       {"", ",", {}},
+                       {",,,", ",", {}},
+                       {"one two", ",", {"one two"}},
+                       {"one,two", "", {"one,two"}}};
+    for (auto const& [text, delimiters, tokens] : cases) {
+        Lines expected{"before"};
+        expected.insert(expected.end(), tokens.begin(), tokens.end());
+        Lines found{"before"};
+        NQ::Tokenize(text, found, delimiters);
+        EXPECT_EQ(found, expected) << text;
+        found = {"before"};
+        NQ::groupInfo().Tokenize(text, found, delimiters);
+        EXPECT_EQ(found, expected) << text;
+    }
 }
 
 TEST(Tokenize, LogsEachTokenBetweenEntryAndExit)
 {
-    Recording const log;
-    tokens("one,two", ",");
-    EXPECT_EQ(log.texts(), (Lines{"Tokenize: entry", "str.substr(lastPos, pos - lastPos) = one",
-                                  "str.substr(lastPos, pos - lastPos) = two", "Tokenize: exit"}));
-}
-
-TEST(Tokenize, LogsAtLevel3000AsTheCommandRunner)
-{
-    Recording const log;
-    tokens("one", ",");
-    std::vector<LogRecord> const records = log.records();
-    ASSERT_EQ(records.size(), 6U);
-    for (std::size_t at = 0; at < records.size(); ++at) {
-        EXPECT_EQ(records[at].trace, at % 2 == 1);
-        EXPECT_EQ(records[at].text, records[at - at % 2].text);
-        EXPECT_EQ(records[at].function, "Tokenize");
-        EXPECT_EQ(records[at].file, "MyProcess");
-        EXPECT_EQ(records[at].category, "Veltrix.IC.MI.OsSwMI.MyProcess");
-        EXPECT_EQ(records[at].level, 3000);
+    struct {
+        char const* source;
+        std::function<void()> run;
+    } const cases[] = {
+        {"Tokenize MyProcess Veltrix.IC.MI.OsSwMI.MyProcess", [] { tokens("one,two", ","); }},
+        {"Tokenize groupInfo_linux Veltrix.IC.MI.OsSwMI.GroupInfo", [] {
+             Lines found;
+             NQ::groupInfo().Tokenize("one,two", found, ",");
+         }}};
+    for (auto const& [source, run] : cases) {
+        Recording const log;
+        run();
+        EXPECT_EQ(log.texts(3000),
+                  (Lines{"Tokenize: entry", "str.substr(lastPos, pos - lastPos) = one",
+                         "str.substr(lastPos, pos - lastPos) = two", "Tokenize: exit"}));
+        EXPECT_EQ(log.sources(), Lines{source});
     }
 }
 
@@ -88,17 +78,12 @@ TEST(Tokenize, LogsNoTokenOfATextThatHoldsPasswordAnywhere)
 
 TEST(Tokenize, LooksForPasswordInTheWholeTextAndNotInItsTokens)
 {
-    Recording const log;
-    tokens("one,Pass,word", ",");
-    EXPECT_EQ(log.remarks().size(), 3U);
+    for (std::string const text : {"one,Pass,word", "password"}) {
+        Recording const log;
+        std::size_t const count = tokens(text, ",").size();
+        EXPECT_EQ(log.remarks().size(), count);
+    }
     EXPECT_EQ(tokens("one,Password", ","), (Lines{"one", "Password"}));
-}
-
-TEST(Tokenize, LogsATextThatHoldsPasswordInLowerCaseOnly)
-{
-    Recording const log;
-    tokens("password", ",");
-    EXPECT_EQ(log.remarks(), Lines{"str.substr(lastPos, pos - lastPos) = password"});
 }
 
 /** Records how many tokens the list holds when each of them is logged. */
@@ -127,20 +112,14 @@ private:
     Lines const& tokens_;
 };
 
-TEST(Tokenize, LogsEachTokenBeforeItAppendsIt)
+TEST(Tokenize, LogsEachTokenBeforeItAppendsItAndThatOfGroupsAfterIt)
 {
     Lines found;
     CountAtLog const log(found);
     NQ::Tokenize("one,two", found, ",");
-    EXPECT_EQ(log.counts, (std::vector<std::size_t>{0, 1}));
-}
-
-TEST(GroupTokenize, AppendsEachPieceBeforeItLogsIt)
-{
-    Lines found;
-    CountAtLog const log(found);
+    found.clear();
     NQ::groupInfo().Tokenize("one,two", found, ",");
-    EXPECT_EQ(log.counts, (std::vector<std::size_t>{1, 2}));
+    EXPECT_EQ(log.counts, (std::vector<std::size_t>{0, 1, 1, 2}));
 }
 
 } // namespace method_tokenize_test

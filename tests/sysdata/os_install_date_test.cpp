@@ -4,13 +4,13 @@
 #include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/LastOpened.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
 #include <cstdlib>
 #include <string>
-#include <vector>
 
 namespace os_install_date_test
 {
@@ -47,21 +47,14 @@ protected:
         return date();
     }
 
-    libc::HookGuard const guard_;
     FakeFiles const files_;
     FakeCommands commands_;
 };
 
-TEST_F(InstallDate, IsZeroWithoutAReleaseFile)
-{
-    EXPECT_EQ(date(), 0);
-    EXPECT_TRUE(commands_.ran.empty());
-}
-
 TEST_F(InstallDate, IsTheReleaseFilesLastStatusChange)
 {
     EXPECT_EQ(dateOf("Change: 2010-05-12 10:23:45.000000000 +0200\n"), may2010);
-    EXPECT_EQ(commands_.modes, std::vector<std::string>{"r"});
+    EXPECT_EQ(commands_.modes, Lines{"r"});
 }
 
 TEST_F(InstallDate, IsReadAsLocalTimeWhateverTheZoneOffset)
@@ -85,7 +78,7 @@ TEST_F(InstallDate, ComesFromTheCommandOfTheFirstFileThereIs)
         commands_.answers = {{file.command, "Change: 2010-05-12 10:23:45\n"}};
         commands_.ran.clear();
         EXPECT_EQ(date(), may2010) << file.path;
-        EXPECT_EQ(commands_.ran, std::vector<std::string>{file.command});
+        EXPECT_EQ(commands_.ran, Lines{file.command});
         files_.remove(file.path);
     }
     EXPECT_EQ(date(), 0);
@@ -99,109 +92,66 @@ TEST_F(InstallDate, IgnoresOtherReleaseFiles)
     EXPECT_TRUE(commands_.ran.empty());
 }
 
-TEST_F(InstallDate, IsZeroWhenTheCommandCannotBeStarted)
+TEST_F(InstallDate, IsZeroWhenTheCommandCannotBeStartedOrFindsNothing)
 {
-    Recording const log;
     files_.write("/etc/SuSE-release", "a line\n");
     files_.write("/etc/redhat-release", "a line\n");
     commands_.answers[redhatCommand] = "Change: 2010-05-12 10:23:45\n";
+    Recording const log;
     EXPECT_EQ(date(), 0);
-    EXPECT_EQ(commands_.ran, std::vector<std::string>{suseCommand});
-    EXPECT_TRUE(log.remarks().empty());
-}
-
-TEST_F(InstallDate, IsZeroWhenTheCommandWritesNothing)
-{
-    Recording const log;
+    EXPECT_EQ(commands_.ran, Lines{suseCommand});
+    files_.remove("/etc/SuSE-release");
     EXPECT_EQ(dateOf(""), 0);
-    EXPECT_TRUE(log.remarks().empty());
-}
-
-TEST_F(InstallDate, IsZeroWhenTheLineHoldsNoDate)
-{
-    Recording const log;
+    EXPECT_EQ(log.remarks(), Lines{});
     EXPECT_EQ(dateOf("stat: cannot stat\n"), 0);
-    EXPECT_EQ(log.remarks(), std::vector<std::string>{"Invalid YY: YY = 0"});
+    EXPECT_EQ(log.remarks(), Lines{"Invalid YY: YY = 0"});
+    EXPECT_EQ(commands_.open, 0);
 }
 
-TEST_F(InstallDate, TreatsMissingFieldsAsZero)
+TEST_F(InstallDate, IsReadFromTheLine)
 {
     constexpr long midnight = may2010 - 10 * hour - 23 * 60 - 45;
-    EXPECT_EQ(dateOf("Change: 2010-05-12 10:23\n"), may2010 - 45);
-    EXPECT_EQ(dateOf("Change: 2010-05-12 10\n"), midnight + 10 * hour);
-    EXPECT_EQ(dateOf("Change: 2010-05-12\n"), midnight);
-    EXPECT_EQ(dateOf("Change: 2010-05\n"), midnight - 12 * 24 * hour);
-    EXPECT_EQ(dateOf("Change: 2010\n"), 1262217600); // 31 December 2009
-}
-
-TEST_F(InstallDate, NeedsTheLineToBeginWithChange)
-{
-    EXPECT_EQ(dateOf(" Change: 2010-05-12 10:23:45\n"), 0);
-    EXPECT_EQ(dateOf("Changed: 2010-05-12 10:23:45\n"), 0);
-}
-
-TEST_F(InstallDate, KeepsTheLinesFirstCharacter)
-{
-    // A leading hyphen stays, so the line does not begin with the word.
-    EXPECT_EQ(dateOf("-Change: 2010-05-12 10:23:45\n"), 0);
+    std::string const start = "Change:";
+    std::string const stamp = "2010-05-12 10:23:45";
+    std::string const blanks(1023 - start.size() - stamp.size(), ' ');
+    struct {
+        char const* what;
+        std::string output;
+        long date;
+    } const cases[] = {
+        {"no seconds", "Change: 2010-05-12 10:23\n", may2010 - 45},
+        {"no minutes", "Change: 2010-05-12 10\n", midnight + 10 * hour},
+        {"no hours", "Change: 2010-05-12\n", midnight},
+        {"no day", "Change: 2010-05\n", midnight - 12 * 24 * hour},
+        {"no month: 31 December 2009", "Change: 2010\n", 1262217600},
+        {"a blank before the word", " Change: 2010-05-12 10:23:45\n", 0},
+        {"a longer word", "Changed: 2010-05-12 10:23:45\n", 0},
+        {"a hyphen, which stays if it is first", "-Change: 2010-05-12 10:23:45\n", 0},
+        {"the first line", "Change: 2010-05-12 10:23:45\nChange: 2011-05-12 10:23:45\n", may2010},
+        {"not the second", "Other\nChange: 2010-05-12 10:23:45\n", 0},
+        {"1023 characters", start + blanks + stamp + "\n", may2010},
+        {"the last 5 is cut off", start + blanks + " " + stamp + "\n", may2010 - 41},
+        {"zeros are decimal", "Change: 2010-08-09 08:09:08.000000000 +0200\n", 1281341348},
+    };
+    for (auto const& [what, output, date] : cases)
+        EXPECT_EQ(dateOf(output), date) << what;
     Recording const log;
     dateOf("Change: 2010-05-12 10:23:45\n");
     EXPECT_TRUE(log.has("strreplace: entry", 3000));
 }
 
-TEST_F(InstallDate, ComesFromTheFirstLine)
-{
-    EXPECT_EQ(dateOf("Change: 2010-05-12 10:23:45\nChange: 2011-05-12 10:23:45\n"), may2010);
-    EXPECT_EQ(dateOf("Other\nChange: 2010-05-12 10:23:45\n"), 0);
-}
-
-TEST_F(InstallDate, ComesFromTheFirst1023CharactersOfTheLine)
-{
-    std::string const date = "2010-05-12 10:23:45";
-    std::string const start = "Change:";
-    std::string const blanks(1023 - start.size() - date.size(), ' ');
-    EXPECT_EQ(dateOf(start + blanks + date + "\n"), may2010);
-    EXPECT_EQ(dateOf(start + blanks + " " + date + "\n"), may2010 - 41); // the last 5 is cut off
-}
-
-TEST_F(InstallDate, ClosesTheCommandsStream)
-{
-    dateOf("Change: 2010-05-12 10:23:45\n");
-    EXPECT_EQ(commands_.open, 0);
-    dateOf("");
-    EXPECT_EQ(commands_.open, 0);
-}
-
-TEST_F(InstallDate, KeepsTheReleaseFileOpenUntilTheCommandRuns)
-{
-    files_.write("/etc/redhat-release", "a line\n");
-    LastOpened const probe;
-    bool wasOpen = false;
-    libc::hooks().popen = [&](char const*, char const*) -> FILE* {
-        wasOpen = isOpen(probe.descriptor());
-        return nullptr;
-    };
-    date();
-    EXPECT_TRUE(wasOpen);
-    EXPECT_FALSE(isOpen(probe.descriptor()));
-}
-
-TEST_F(InstallDate, ReadsLeadingZerosAsDecimal)
-{
-    EXPECT_EQ(dateOf("Change: 2010-08-09 08:09:08.000000000 +0200\n"), 1281341348);
-}
-
-TEST_F(InstallDate, ClosesTheReleaseFileBeforeItReadsTheOutput)
+TEST_F(InstallDate, ClosesTheReleaseFileAfterTheCommandRunsAndBeforeItReads)
 {
     files_.write("/etc/redhat-release", "a line\n");
     commands_.answers[redhatCommand] = "Change: 2010-05-12 10:23:45\n";
     LastOpened const probe;
+    bool openAtStart = false;
     bool openAtRead = true;
-    libc::hooks().fgets = [&](char* buffer, int size, FILE* stream) {
-        openAtRead = isOpen(probe.descriptor());
-        return interpose::real(fgets)(buffer, size, stream);
-    };
+    libc::hooks().popen.watch(
+        [&](char const*, char const*) { openAtStart = isOpen(probe.descriptor()); });
+    libc::hooks().fgets.watch([&](char*, int, FILE*) { openAtRead = isOpen(probe.descriptor()); });
     EXPECT_EQ(date(), may2010);
+    EXPECT_TRUE(openAtStart);
     EXPECT_FALSE(openAtRead);
 }
 

@@ -11,131 +11,91 @@ namespace os_locale_test
 
 using NQ::OsInfo;
 
-void set(char const* name, char const* value)
+/** What one operation yields with these variables; null: not set. */
+std::string read(bool (OsInfo::*get)(std::string&), char const* lang, char const* characterType)
 {
-    if (value)
-        setenv(name, value, 1);
-    else
-        unsetenv(name);
-}
-
-std::string languageEdition(char const* lang, char const* characterType = nullptr)
-{
-    set("LANG", lang);
-    set("LC_CTYPE", characterType);
+    unsetenv("LANG");
+    unsetenv("LC_CTYPE");
+    if (lang)
+        setenv("LANG", lang, 1);
+    if (characterType)
+        setenv("LC_CTYPE", characterType, 1);
     std::string out = "before";
-    EXPECT_TRUE(OsInfo().getLanguageEdition(out));
+    EXPECT_TRUE((OsInfo().*get)(out));
     return out;
 }
 
-std::string codeSet(char const* lang, char const* characterType = nullptr)
-{
-    set("LANG", lang);
-    set("LC_CTYPE", characterType);
-    std::string out = "before";
-    EXPECT_TRUE(OsInfo().getCodeSet(out));
-    return out;
-}
+struct Case {
+    char const* lang;
+    char const* found;
+};
 
 TEST(LanguageEdition, IsTheLocaleWithoutItsCodeSetAndWithHyphens)
 {
-    EXPECT_EQ(languageEdition("en_US.UTF-8"), "en-US");
-    EXPECT_EQ(languageEdition("de_DE"), "de-DE");
-    EXPECT_EQ(languageEdition("C"), "C");
-}
-
-TEST(LanguageEdition, IsAmericanEnglishForPosix)
-{
-    EXPECT_EQ(languageEdition("POSIX"), "en-US");
-    EXPECT_EQ(languageEdition(nullptr, "POSIX"), "en-US");
-    EXPECT_EQ(languageEdition("  POSIX "), "en-US");
-    EXPECT_EQ(languageEdition("posix"), "posix");
-    EXPECT_EQ(languageEdition("POSIX.UTF-8"), "POSIX");
-}
-
-TEST(LanguageEdition, IsEmptyWithoutALocale)
-{
-    EXPECT_EQ(languageEdition(nullptr), "");
-    EXPECT_EQ(languageEdition(""), "");
-    EXPECT_EQ(languageEdition("", ""), "");
+    Case const cases[] = {
+        {"en_US.UTF-8", "en-US"},
+        {"de_DE", "de-DE"},
+        {"C", "C"},
+        {"POSIX", "en-US"},
+        {"  POSIX ", "en-US"},
+        {"posix", "posix"},
+        {"POSIX.UTF-8", "POSIX"},
+        {"", ""},
+        {"sr_RS@latin_old", "sr-RS@latin-old"}, // kept, since it follows no dot
+        {"sr_RS.UTF-8@latin", "sr-RS"},
+        {"en_US.a.b", "en-US.a"},
+        {"en_US.", "en-US"},
+        {".UTF-8", ""},
+        {"  en_US.UTF-8  ", "en-US"},
+        {"  en_US  ", "en-US"},
+        {"\ten_US\t", "\ten-US\t"},
+        {"en US", "en US"},
+    };
+    for (auto const& [lang, found] : cases)
+        EXPECT_EQ(read(&OsInfo::getLanguageEdition, lang, nullptr), found) << lang;
 }
 
 TEST(LanguageEdition, FallsBackToTheCharacterType)
 {
-    EXPECT_EQ(languageEdition(nullptr, "fr_FR.ISO-8859-1"), "fr-FR");
-    EXPECT_EQ(languageEdition("", "fr_FR.ISO-8859-1"), "fr-FR");
-    EXPECT_EQ(languageEdition("en_US.UTF-8", "fr_FR.ISO-8859-1"), "en-US");
-}
-
-TEST(LanguageEdition, DoesNotFallBackFromALanguageOfBlanks)
-{
-    EXPECT_EQ(languageEdition("   ", "fr_FR"), "");
-}
-
-TEST(LanguageEdition, KeepsAModifierThatFollowsNoDot)
-{
-    EXPECT_EQ(languageEdition("sr_RS@latin_old"), "sr-RS@latin-old");
-    EXPECT_EQ(languageEdition("sr_RS.UTF-8@latin"), "sr-RS");
-}
-
-TEST(LanguageEdition, IsCutAtTheLastDot)
-{
-    EXPECT_EQ(languageEdition("en_US.a.b"), "en-US.a");
-    EXPECT_EQ(languageEdition("en_US."), "en-US");
-    EXPECT_EQ(languageEdition(".UTF-8"), "");
-}
-
-TEST(LanguageEdition, LosesTheBlanksAroundIt)
-{
-    EXPECT_EQ(languageEdition("  en_US.UTF-8  "), "en-US");
-    EXPECT_EQ(languageEdition("  en_US  "), "en-US");
-    EXPECT_EQ(languageEdition("\ten_US\t"), "\ten-US\t");
-    EXPECT_EQ(languageEdition("en US"), "en US");
+    auto const of = [](char const* lang, char const* characterType) {
+        return read(&OsInfo::getLanguageEdition, lang, characterType);
+    };
+    EXPECT_EQ(of(nullptr, nullptr), "");
+    EXPECT_EQ(of("", ""), "");
+    EXPECT_EQ(of(nullptr, "POSIX"), "en-US");
+    EXPECT_EQ(of(nullptr, "fr_FR.ISO-8859-1"), "fr-FR");
+    EXPECT_EQ(of("", "fr_FR.ISO-8859-1"), "fr-FR");
+    EXPECT_EQ(of("en_US.UTF-8", "fr_FR.ISO-8859-1"), "en-US");
+    EXPECT_EQ(of("   ", "fr_FR"), "");
 }
 
 TEST(CodeSet, IsWhatFollowsTheFirstDot)
 {
-    EXPECT_EQ(codeSet("en_US.UTF-8"), "UTF-8");
-    EXPECT_EQ(codeSet("en_US.a.b"), "a.b");
-    EXPECT_EQ(codeSet("sr_RS.UTF-8@latin"), "UTF-8@latin");
-}
-
-TEST(CodeSet, IsUtf8ForPosix)
-{
-    EXPECT_EQ(codeSet("POSIX"), "UTF-8");
-    EXPECT_EQ(codeSet(" POSIX  "), "UTF-8");
-    EXPECT_EQ(codeSet("posix"), "posix");
-    EXPECT_EQ(codeSet("POSIX@x"), "POSIX@x");
-    EXPECT_EQ(codeSet("POSIX.ISO-8859-1"), "ISO-8859-1");
-}
-
-TEST(CodeSet, IsTheWholeLocaleWhenItHasNoDot)
-{
-    EXPECT_EQ(codeSet("en_US"), "en_US");
-    EXPECT_EQ(codeSet("C"), "C");
-}
-
-TEST(CodeSet, LosesTheBlanksAroundTheLocale)
-{
-    EXPECT_EQ(codeSet("  en_US  "), "en_US");
-    EXPECT_EQ(codeSet(" en_US.UTF-8  "), "UTF-8");
+    Case const cases[] = {
+        {"en_US.UTF-8", "UTF-8"},
+        {"en_US.a.b", "a.b"},
+        {"sr_RS.UTF-8@latin", "UTF-8@latin"},
+        {"POSIX", "UTF-8"},
+        {" POSIX  ", "UTF-8"},
+        {"posix", "posix"},
+        {"POSIX@x", "POSIX@x"},
+        {"POSIX.ISO-8859-1", "ISO-8859-1"},
+        {"en_US", "en_US"}, // the whole locale if it has no dot
+        {"C", "C"},
+        {"  en_US  ", "en_US"},
+        {" en_US.UTF-8  ", "UTF-8"},
+    };
+    for (auto const& [lang, found] : cases)
+        EXPECT_EQ(read(&OsInfo::getCodeSet, lang, nullptr), found) << lang;
 }
 
 TEST(CodeSet, IsThatOfTheProcessWhenNothingElseRemains)
 {
     std::setlocale(LC_ALL, "C");
-    EXPECT_EQ(codeSet(nullptr), "ANSI_X3.4-1968");
-    EXPECT_EQ(codeSet(""), "ANSI_X3.4-1968");
-    EXPECT_EQ(codeSet("   "), "ANSI_X3.4-1968");
-    EXPECT_EQ(codeSet("en_US."), "ANSI_X3.4-1968");
+    for (char const* lang : {static_cast<char const*>(nullptr), "", "   ", "en_US."})
+        EXPECT_EQ(read(&OsInfo::getCodeSet, lang, "fr_FR.ISO-8859-1"), "ANSI_X3.4-1968");
     ASSERT_NE(std::setlocale(LC_ALL, "C.UTF-8"), nullptr);
-    EXPECT_EQ(codeSet("en_US."), "UTF-8");
-}
-
-TEST(CodeSet, DoesNotFallBackToTheCharacterType)
-{
-    std::setlocale(LC_ALL, "C");
-    EXPECT_EQ(codeSet(nullptr, "fr_FR.ISO-8859-1"), "ANSI_X3.4-1968");
+    EXPECT_EQ(read(&OsInfo::getCodeSet, "en_US.", nullptr), "UTF-8");
 }
 
 } // namespace os_locale_test

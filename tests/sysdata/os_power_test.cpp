@@ -2,85 +2,56 @@
 
 #include "tests/interpose/Libc.h"
 #include "tests/support/FakeCommands.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
 #include <cstdio>
-#include <ostream>
 #include <string>
-#include <unistd.h>
-#include <vector>
 
 namespace os_power_test
 {
 
 using NQ::OsInfo;
 
-struct PowerCase {
+struct {
     bool (OsInfo::*act)();
-    char const* function;
-    char const* announcement;
-    char const* command;
-};
+    std::string function;
+    std::string announcement;
+    std::string command;
+} const actions[] = {
+    {&OsInfo::statusOffline, "statusOffline", "Halt after shutdown.", "/sbin/shutdown -h now"},
+    {&OsInfo::statusReset, "statusReset", "Reboot after shutdown.", "/sbin/shutdown -r now"}};
 
-[[maybe_unused]] void PrintTo(PowerCase const& test, std::ostream* out)
+TEST(OsInfoPower, AnnouncesItselfAtLevel4000AndThenRunsTheCommand)
 {
-    *out << test.function;
+    for (auto const& [act, function, announcement, command] : actions) {
+        FakeCommands const commands; // none reaches the machine
+        Recording const log;
+        Lines saidBefore;
+        libc::hooks().popen.watch([&](char const*, char const*) { saidBefore = log.texts(4000); });
+        EXPECT_TRUE((OsInfo().*act)());
+        EXPECT_EQ(commands.ran, Lines{command});
+        EXPECT_EQ(commands.modes, Lines{"r"});
+        EXPECT_EQ(saidBefore, Lines{announcement});
+        EXPECT_EQ(log.remarks(), Lines{announcement});
+        EXPECT_EQ(log.sources(), Lines{function + " OsSwMI Veltrix.IC.MI.OsSwMI.OsInfo"});
+    }
 }
 
-class OsInfoPower : public testing::TestWithParam<PowerCase>
+TEST(OsInfoPower, ClosesThePipeAndReadsNothingFromIt)
 {
-protected:
-    FakeCommands commands_; // no command reaches the machine
-};
-
-INSTANTIATE_TEST_SUITE_P(Of, OsInfoPower,
-                         testing::Values(PowerCase{&OsInfo::statusOffline, "statusOffline",
-                                                   "Halt after shutdown.", "/sbin/shutdown -h now"},
-                                         PowerCase{&OsInfo::statusReset, "statusReset",
-                                                   "Reboot after shutdown.",
-                                                   "/sbin/shutdown -r now"}),
-                         [](auto const& test) { return std::string(test.param.function); });
-
-TEST_P(OsInfoPower, AnnouncesItselfAtLevel4000AndThenRunsTheCommand)
-{
-    Recording const log;
-    std::vector<std::string> saidBefore;
-    libc::hooks().popen = [&](char const* command, char const* mode) -> FILE* {
-        commands_.ran.push_back(std::string(command) + "|" + mode);
-        saidBefore = log.texts(4000);
-        return nullptr;
-    };
-    EXPECT_TRUE((OsInfo().*GetParam().act)());
-    EXPECT_EQ(commands_.ran, std::vector<std::string>{std::string(GetParam().command) + "|r"});
-    EXPECT_EQ(saidBefore, std::vector<std::string>{GetParam().announcement});
-    EXPECT_EQ(log.remarks(), std::vector<std::string>{GetParam().announcement});
-    for (LogRecord const& record : log.records())
-        EXPECT_EQ(record.function, GetParam().function);
-}
-
-TEST_P(OsInfoPower, ClosesThePipeAndReadsNeitherOutputNorStatus)
-{
-    commands_.answers[GetParam().command] = "shutdown: Permission denied\n";
-    EXPECT_TRUE((OsInfo().*GetParam().act)());
-    EXPECT_EQ(commands_.ran, std::vector<std::string>{GetParam().command});
-    EXPECT_EQ(commands_.open, 0);
-}
-
-TEST_P(OsInfoPower, ReadsNothingFromTheCommandsPipe)
-{
-    FILE* const output = std::tmpfile();
-    std::fputs("shutdown: Permission denied\n", output);
-    std::rewind(output);
-    libc::hooks().popen = [&](char const*, char const*) { return output; };
-    long read = -1;
-    libc::hooks().pclose = [&read](FILE* stream) {
-        read = lseek(fileno(stream), 0, SEEK_CUR);
-        return std::fclose(stream);
-    };
-    EXPECT_TRUE((OsInfo().*GetParam().act)());
-    EXPECT_EQ(read, 0);
+    for (auto const& action : actions) {
+        FakeCommands commands;
+        commands.answers[action.command] = "shutdown: Permission denied\n";
+        long read = -1;
+        libc::hooks().pclose.watch([&read](FILE* stream) { read = std::ftell(stream); });
+        EXPECT_TRUE((OsInfo().*action.act)());
+        EXPECT_EQ(commands.ran, Lines{action.command});
+        EXPECT_EQ(commands.open, 0);
+        EXPECT_EQ(read, 0);
+    }
 }
 
 } // namespace os_power_test

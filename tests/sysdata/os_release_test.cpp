@@ -6,6 +6,7 @@
 #include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/LastOpened.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
@@ -14,7 +15,7 @@
 #include <string>
 #include <sys/utsname.h>
 #include <unistd.h>
-#include <vector>
+#include <utility>
 
 namespace os_release_test
 {
@@ -48,7 +49,6 @@ protected:
         return "none";
     }
 
-    libc::HookGuard const guard_;
     FakeFiles const files_;
     FakeCommands commands_;
 };
@@ -70,10 +70,6 @@ TEST_F(OSReleaseName, IsTheFirstLineUnchanged)
     EXPECT_EQ(of("  Kesto Linux 10.2 \t\r\nsecond\n"), "  Kesto Linux 10.2 \t\r");
     EXPECT_EQ(of("Kesto Linux"), "Kesto Linux");
     EXPECT_EQ(of(std::string(5000, 'x') + "\n"), std::string(5000, 'x'));
-}
-
-TEST_F(OSReleaseName, IsEmptyForAnEmptyFirstLine)
-{
     EXPECT_EQ(of("\nsecond\n"), "");
 }
 
@@ -81,6 +77,7 @@ TEST_F(OSReleaseName, FailsAndKeepsTheCallersTextWithoutALine)
 {
     std::string out = "before";
     EXPECT_FALSE(OsInfo().getOSReleaseName("/etc/release", out));
+    EXPECT_FALSE(OsInfo().getKestoVersion("/etc/release", out));
     files_.write("/etc/release", "");
     EXPECT_FALSE(OsInfo().getOSReleaseName("/etc/release", out));
     EXPECT_EQ(out, "before");
@@ -90,16 +87,10 @@ class OSName : public ReleaseFiles
 {
 };
 
-TEST_F(OSName, IsLinuxWithoutAReleaseFile)
-{
-    EXPECT_EQ(name(), "Linux");
-}
-
 TEST_F(OSName, ComesFromTheFirstReleaseFileThereIs)
 {
-    std::vector<std::string> const paths{"/etc/release", "/etc/vmware-release",
-                                         "/etc/redhat-release", "/etc/SuSE-release",
-                                         "/etc/UnitedLinux-release"};
+    Lines const paths{"/etc/release", "/etc/vmware-release", "/etc/redhat-release",
+                      "/etc/SuSE-release", "/etc/UnitedLinux-release"};
     for (std::string const& path : paths)
         files_.write(path, "from " + path + "\n");
     for (std::string const& path : paths) {
@@ -109,15 +100,11 @@ TEST_F(OSName, ComesFromTheFirstReleaseFileThereIs)
     EXPECT_EQ(name(), "Linux");
 }
 
-TEST_F(OSName, SkipsAReleaseFileWithoutALine)
+TEST_F(OSName, SkipsAReleaseFileWithoutALineButNotAnEmptyLine)
 {
     files_.write("/etc/release", "");
     files_.write("/etc/SuSE-release", "SUSE Linux\n");
     EXPECT_EQ(name(), "SUSE Linux");
-}
-
-TEST_F(OSName, IsEmptyIfTheFirstLineIs)
-{
     files_.write("/etc/release", "\n");
     EXPECT_EQ(name(), "");
 }
@@ -137,53 +124,30 @@ protected:
     }
 };
 
-TEST_F(KestoVersion, JoinsTheNumbersOfTheSecondAndThirdLine)
+TEST_F(KestoVersion, JoinsTheValuesOfTheSecondAndThirdLine)
 {
-    EXPECT_EQ(of("Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2\n"), "10.2");
-    EXPECT_EQ(of("Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2"), "10.2");
-}
-
-TEST_F(KestoVersion, IgnoresTheFirstLine)
-{
-    EXPECT_EQ(of("\nVERSION = 10\nPATCHLEVEL = 2\n"), "10.2");
-    EXPECT_EQ(of("VERSION = 9\nVERSION = 10\nPATCHLEVEL = 2\nVERSION = 11\n"), "10.2");
-}
-
-TEST_F(KestoVersion, NeedsASecondLineOfMoreThan9Characters)
-{
-    EXPECT_EQ(of("Kesto\nVERSIO=10\nPATCHLEVEL = 2\n"), "none");
-    EXPECT_EQ(of("Kesto\nVERSION=10\nPATCHLEVEL = 2\n"), "10.2");
-}
-
-TEST_F(KestoVersion, NeedsAThirdLineOfAtLeast13Characters)
-{
-    EXPECT_EQ(of("Kesto\nVERSION = 10\nPATCHLEVEL=2\n"), "none");
-    EXPECT_EQ(of("Kesto\nVERSION = 10\nPATCHLEVEL= 2\n"), "10.2");
-}
-
-TEST_F(KestoVersion, CutsAtTheLastEqualsSign)
-{
-    EXPECT_EQ(of("Kesto\nVERSION = 9 = 10\nPATCHLEVEL = 1 = 2\n"), "10.2");
-}
-
-TEST_F(KestoVersion, UsesAWholeLineWithoutAnEqualsSign)
-{
-    EXPECT_EQ(of("Kesto\n VERSION: 10 \n PATCHLEVEL: 2 \n"), "VERSION: 10.PATCHLEVEL: 2");
-}
-
-TEST_F(KestoVersion, KeepsAllButOneOfTheBlanksOfABlankValue)
-{
-    EXPECT_EQ(of("Kesto\nVERSION  =   \nPATCHLEVEL   =\n"), "  .");
-}
-
-TEST_F(KestoVersion, FailsWithoutTheFileOrWithoutThreeLines)
-{
-    std::string out = "before";
-    EXPECT_FALSE(OsInfo().getKestoVersion("/etc/release", out));
-    EXPECT_EQ(out, "before");
-    EXPECT_EQ(of(""), "none");
-    EXPECT_EQ(of("Kesto Linux\n"), "none");
-    EXPECT_EQ(of("Kesto Linux\nVERSION = 10\n"), "none");
+    struct {
+        char const* what;
+        char const* text;
+        char const* version;
+    } const cases[] = {
+        {"three lines", "Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2\n", "10.2"},
+        {"no line end", "Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2", "10.2"},
+        {"an empty first line", "\nVERSION = 10\nPATCHLEVEL = 2\n", "10.2"},
+        {"more lines", "VERSION = 9\nVERSION = 10\nPATCHLEVEL = 2\nVERSION = 11\n", "10.2"},
+        {"a second line of 9 characters", "Kesto\nVERSIO=10\nPATCHLEVEL = 2\n", "none"},
+        {"and of 10", "Kesto\nVERSION=10\nPATCHLEVEL = 2\n", "10.2"},
+        {"a third line of 12 characters", "Kesto\nVERSION = 10\nPATCHLEVEL=2\n", "none"},
+        {"and of 13", "Kesto\nVERSION = 10\nPATCHLEVEL= 2\n", "10.2"},
+        {"the last equals sign", "Kesto\nVERSION = 9 = 10\nPATCHLEVEL = 1 = 2\n", "10.2"},
+        {"none", "Kesto\n VERSION: 10 \n PATCHLEVEL: 2 \n", "VERSION: 10.PATCHLEVEL: 2"},
+        {"blank values", "Kesto\nVERSION  =   \nPATCHLEVEL   =\n", "  ."},
+        {"no lines", "", "none"},
+        {"one line", "Kesto Linux\n", "none"},
+        {"two lines", "Kesto Linux\nVERSION = 10\n", "none"},
+    };
+    for (auto const& [what, text, version] : cases)
+        EXPECT_EQ(of(text), version) << what;
 }
 
 class OSVersion : public ReleaseFiles
@@ -208,20 +172,16 @@ protected:
     int unameCalls_ = 0;
 };
 
-TEST_F(OSVersion, FailsWithoutAReleaseFile)
+TEST_F(OSVersion, ComesFromTheKeyValueFileFirstUnlessALineIsTooShort)
 {
-    EXPECT_EQ(version(), "none");
-    EXPECT_TRUE(commands_.ran.empty());
-    EXPECT_EQ(unameCalls_, 0);
-}
-
-TEST_F(OSVersion, ComesFromTheKeyValueFileFirst)
-{
+    EXPECT_EQ(version(), "none"); // no release file
     files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
     writeCommandFiles();
     files_.write("/etc/release", "Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2\n");
     EXPECT_EQ(version(), "10.2");
     EXPECT_EQ(unameCalls_, 0);
+    files_.write("/etc/release", "Kesto Linux\nVERSION = 10\nPATCHLEVEL=2\n");
+    EXPECT_EQ(version(), "6.1.0-37-amd64");
     EXPECT_TRUE(commands_.ran.empty());
 }
 
@@ -229,38 +189,15 @@ TEST_F(OSVersion, IsTheKernelsReleaseOnUnitedLinux)
 {
     files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
     writeCommandFiles();
-    EXPECT_EQ(version(), "6.1.0-37-amd64");
-    EXPECT_TRUE(commands_.ran.empty());
-}
-
-TEST_F(OSVersion, ClosesTheUnitedLinuxFileInAnyCase)
-{
-    files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
     for (bool const fails : {false, true}) {
         unameFails_ = fails;
         LastOpened const probe;
-        version();
+        EXPECT_EQ(version(), fails ? "none" : "6.1.0-37-amd64");
         EXPECT_NE(probe.descriptor(), -1);
         EXPECT_FALSE(isOpen(probe.descriptor()));
     }
-}
-
-TEST_F(OSVersion, FailsOnUnitedLinuxIfUnameFails)
-{
-    files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
-    writeCommandFiles();
-    unameFails_ = true;
-    EXPECT_EQ(version(), "none");
-    EXPECT_EQ(unameCalls_, 1);
+    EXPECT_EQ(unameCalls_, 2);
     EXPECT_TRUE(commands_.ran.empty());
-}
-
-TEST_F(OSVersion, TriesTheOtherFilesIfAKeyValueLineIsTooShort)
-{
-    files_.write("/etc/release", "Kesto Linux\nVERSION = 10\nPATCHLEVEL=2\n");
-    files_.write("/etc/SuSE-release", "SUSE Linux Enterprise Server 11 (x86_64)\n");
-    commands_.answers[suseCommand] = "11.3";
-    EXPECT_EQ(version(), "11.3");
 }
 
 TEST_F(OSVersion, ComesFromTheCommandOfTheFirstFileThereIs)
@@ -276,34 +213,21 @@ TEST_F(OSVersion, ComesFromTheCommandOfTheFirstFileThereIs)
         commands_.answers = {{file.command, "5.4"}};
         commands_.ran.clear();
         EXPECT_EQ(version(), "5.4") << file.path;
-        EXPECT_EQ(commands_.ran, std::vector<std::string>{file.command});
+        EXPECT_EQ(commands_.ran, Lines{file.command});
         files_.remove(file.path);
     }
     EXPECT_EQ(version(), "none");
 }
 
-TEST_F(OSVersion, IsCutAt9Characters)
+TEST_F(OSVersion, IsTheFirst9CharactersOfOneLineWithItsEnd)
 {
     writeCommandFiles();
-    commands_.answers[vmwareCommand] = "123456789";
-    EXPECT_EQ(version(), "123456789");
-    commands_.answers[vmwareCommand] = "1234567890";
-    EXPECT_EQ(version(), "123456789");
-}
-
-TEST_F(OSVersion, IsOneLineWithItsEnd)
-{
-    writeCommandFiles();
-    commands_.answers[vmwareCommand] = "5.4\n6.0\n";
-    EXPECT_EQ(version(), "5.4\n");
-}
-
-TEST_F(OSVersion, FailsWhenTheCommandCannotBeStarted)
-{
-    writeCommandFiles();
-    EXPECT_EQ(version(), "none");
-    // The other files are not tried.
-    EXPECT_EQ(commands_.ran, std::vector<std::string>{vmwareCommand});
+    for (auto const& [output, found] : {std::pair{"123456789", "123456789"},
+                                        {"1234567890", "123456789"},
+                                        {"5.4\n6.0\n", "5.4\n"}}) {
+        commands_.answers[vmwareCommand] = output;
+        EXPECT_EQ(version(), found);
+    }
 }
 
 /** How the command's stream is treated; the stream is a file, so both ways of closing it work. */
@@ -341,19 +265,13 @@ protected:
     int pcloseCalls_ = 0;
 };
 
-TEST_F(OSVersionStream, StartsAfterTheReleaseFileIsClosed)
+TEST_F(OSVersionStream, StartsAfterTheReleaseFileIsClosedAndIsClosedAsAFile)
 {
     answer("5.4");
     EXPECT_EQ(version(), "5.4");
     EXPECT_NE(probe_, -1);
     EXPECT_FALSE(probeWasOpen_);
     EXPECT_EQ(mode_, "r");
-}
-
-TEST_F(OSVersionStream, IsClosedAsAFileAndNotAsACommand)
-{
-    answer("5.4");
-    EXPECT_EQ(version(), "5.4");
     EXPECT_FALSE(isOpen(pipe_));
     EXPECT_EQ(pcloseCalls_, 0);
 }
@@ -386,32 +304,31 @@ protected:
     }
 };
 
-TEST_F(OSVersionCommand, KeepsDigitsDotsAndHyphensOfAVmwareFile)
+TEST_F(OSVersionCommand, FindsTheVersionInEachFile)
 {
-    files_.write("/etc/vmware-release", "VMware ESX Server 3.5 (Dali)\n");
-    EXPECT_EQ(version(), "3.5");
-    files_.write("/etc/vmware-release", "VMware ESX Server 3.0.1 [Releasebuild-32039]\n");
-    EXPECT_EQ(version(), "3.0.1-320");
+    struct {
+        char const* path;
+        char const* text;
+        char const* version;
+    } const files[] = {
+        {"/etc/SuSE-release",
+         "SUSE Linux Enterprise Server 10 (x86_64)\nVERSION = 10\nPATCHLEVEL = 2\n", "10.2"},
+        {"/etc/redhat-release", "Red Hat Enterprise Linux Server release 5.4 (Tikanga)\n", "5.4"},
+        {"/etc/vmware-release", "VMware ESX Server 3.5 (Dali)\n", "3.5"},
+        {"/etc/vmware-release", "VMware ESX Server 3.0.1 [Releasebuild-32039]\n", "3.0.1-320"}};
+    for (auto const& file : files) {
+        files_.write(file.path, file.text);
+        EXPECT_EQ(version(), file.version);
+    }
 }
 
-TEST_F(OSVersionCommand, KeepsDigitsAndDotsOfARedhatFile)
-{
-    files_.write("/etc/redhat-release", "Red Hat Enterprise Linux Server release 5.4 (Tikanga)\n");
-    EXPECT_EQ(version(), "5.4");
-}
-
-TEST_F(OSVersionCommand, JoinsTheNinthAndTheTwelfthWordOfASuseFile)
-{
-    files_.write("/etc/SuSE-release",
-                 "SUSE Linux Enterprise Server 10 (x86_64)\nVERSION = 10\nPATCHLEVEL = 2\n");
-    EXPECT_EQ(version(), "10.2");
-}
-
-TEST_F(OSVersion, FailsWithoutAMessage)
+TEST_F(OSVersion, FailsWithoutAMessageIfTheCommandCannotBeStarted)
 {
     Recording const log;
     writeCommandFiles();
-    EXPECT_EQ(version(), "none"); // the command cannot be started
+    EXPECT_EQ(version(), "none");
+    // The other files are not tried.
+    EXPECT_EQ(commands_.ran, Lines{vmwareCommand});
     files_.write("/etc/UnitedLinux-release", "x\n");
     unameFails_ = true;
     EXPECT_EQ(version(), "none");

@@ -4,12 +4,12 @@
 #include "tests/interpose/Libc.h"
 #include "tests/support/Account.h"
 #include "tests/support/FakeFiles.h"
-#include "tests/support/Recording.h"
+#include "tests/support/LastOpened.h"
+#include "tests/support/Lines.h"
 
 #include <gtest/gtest.h>
 
 #include <cerrno>
-#include <fcntl.h>
 #include <pwd.h>
 #include <string>
 #include <vector>
@@ -60,67 +60,40 @@ protected:
     }
 
     FakeFiles const files_;
-    libc::HookGuard const guard_;
-    std::vector<std::string> steps_;
+    Lines steps_;
     std::vector<std::size_t> bufferSizes_;
     int lockResult_ = 0;
 };
 
-TEST_F(UserCount, CountsRootAndTheUsersInTheRangeButNoSystemAccount)
+TEST_F(UserCount, CountsEveryUidZeroAndTheRangeButNoSystemAccount)
 {
-    EXPECT_EQ(countOf(account("root", 0) + account("daemon", 2) + account("jdoe", 1000)), 2U);
-}
-
-TEST_F(UserCount, IncludesBothEndsOfTheRange)
-{
-    EXPECT_EQ(countOf(account("below", 499) + account("first", 500)), 1U);
-    EXPECT_EQ(countOf(account("last", 60000) + account("above", 60001)), 1U);
-}
-
-TEST_F(UserCount, CountsEveryAccountWithUidZero)
-{
-    EXPECT_EQ(countOf(account("root", 0) + account("toor", 0)), 2U);
+    struct {
+        std::string passwd;
+        unsigned int count;
+    } const cases[] = {{account("root", 0) + account("daemon", 2) + account("jdoe", 1000), 2},
+                       {account("below", 499) + account("first", 500), 1},
+                       {account("last", 60000) + account("above", 60001), 1},
+                       {account("root", 0) + account("toor", 0), 2}};
+    for (auto const& [passwd, expected] : cases)
+        EXPECT_EQ(countOf(passwd), expected) << passwd;
 }
 
 TEST_F(UserCount, IsZeroWithoutAnAccountFile)
 {
     EXPECT_EQ(count(), 0U);
-    EXPECT_EQ(steps_, (std::vector<std::string>{"lock", "setpwent", "unlock"}));
-}
-
-TEST_F(UserCount, OpensTheAccountFileInModeRo)
-{
-    std::vector<std::string> opened;
-    auto const below = libc::hooks().fopen.answer();
-    libc::hooks().fopen = [&opened, below](char const* path, char const* mode) {
-        opened.push_back(std::string(path) + "|" + mode);
-        return below(path, mode);
-    };
-    NQ::minMaxId::Instance();
-    opened.clear();
-    countOf(account("root", 0));
-    ASSERT_EQ(opened.size(), 2U); // first the file written above
-    EXPECT_EQ(opened[1], "/etc/passwd|ro");
+    EXPECT_EQ(steps_, (Lines{"lock", "setpwent", "unlock"}));
 }
 
 TEST_F(UserCount, HoldsTheLockForTheWholeScan)
 {
-    countOf(account("root", 0) + account("jdoe", 1000));
-    EXPECT_EQ(steps_,
-              (std::vector<std::string>{"lock", "setpwent", "read", "read", "read", "unlock"}));
-}
-
-TEST_F(UserCount, ContinuesWithoutTheLock)
-{
-    lockResult_ = -1;
-    EXPECT_EQ(countOf(account("root", 0)), 1U);
-    EXPECT_EQ(steps_.back(), "unlock");
-}
-
-TEST_F(UserCount, ReadsEachLineIntoABufferOf4096Bytes)
-{
-    countOf(account("root", 0));
-    EXPECT_EQ(bufferSizes_, (std::vector<std::size_t>{4096, 4096}));
+    for (int const result : {0, -1}) {
+        lockResult_ = result;
+        steps_.clear();
+        bufferSizes_.clear();
+        EXPECT_EQ(countOf(account("root", 0) + account("jdoe", 1000)), 2U);
+        EXPECT_EQ(steps_, (Lines{"lock", "setpwent", "read", "read", "read", "unlock"}));
+        EXPECT_EQ(bufferSizes_, std::vector<std::size_t>(3, 4096));
+    }
 }
 
 TEST_F(UserCount, EndsAtALineThatDoesNotFitTheBuffer)
@@ -140,34 +113,22 @@ TEST_F(UserCount, EndsAtAnyError)
         return interpose::real(fgetpwent_r)(stream, entry, buffer, size, found);
     };
     EXPECT_EQ(countOf(account("root", 0) + account("a", 1000) + account("b", 1001)), 1U);
-    EXPECT_EQ(steps_, (std::vector<std::string>{"lock", "setpwent", "read", "read", "unlock"}));
+    EXPECT_EQ(steps_, (Lines{"lock", "setpwent", "read", "read", "unlock"}));
 }
 
 TEST_F(UserCount, ClosesTheAccountFileBeforeItReleasesTheLock)
 {
-    int descriptor = -1;
-    auto const below = libc::hooks().fopen.answer();
     files_.write("/etc/passwd", account("root", 0));
-    libc::hooks().fopen = [&](char const* path, char const* mode) {
-        FILE* const stream = below(path, mode);
-        if (std::string(path) == "/etc/passwd")
-            descriptor = fileno(stream);
-        return stream;
-    };
+    LastOpened const file;
     bool openAtRelease = true;
     libc::hooks().ulckpwdf = [&] {
-        openAtRelease = fcntl(descriptor, F_GETFD) != -1;
+        openAtRelease = isOpen(file.descriptor());
         return 0;
     };
+    NQ::minMaxId::Instance();
     count();
-    EXPECT_NE(descriptor, -1);
+    EXPECT_NE(file.descriptor(), -1);
     EXPECT_FALSE(openAtRelease);
-}
-
-TEST_F(UserCount, ReadsTheFileEachTime)
-{
-    EXPECT_EQ(countOf(account("root", 0)), 1U);
-    EXPECT_EQ(countOf(account("root", 0) + account("jdoe", 1000)), 2U);
 }
 
 } // namespace os_user_count_test

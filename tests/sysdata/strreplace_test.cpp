@@ -1,42 +1,42 @@
+#include "sysdata/logInfo_linux.h"
 #include "sysdata/osInfo_linux.h"
+#include "tests/support/Lines.h"
+#include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
 namespace strreplace_test
 {
 
-std::string replaced(std::string text, char from, char to)
+/** The operation that both classes have, on a text that may hold NUL bytes. */
+template <class Info> class Strreplace : public testing::Test
 {
-    text.push_back('\0');
-    NQ::OsInfo().strreplace(text.data(), from, to);
-    text.erase(text.find('\0'));
-    return text;
+protected:
+    static std::string replaced(std::string text, char from, char to)
+    {
+        Info().strreplace(text.data(), from, to);
+        return text;
+    }
+};
+
+using Classes = testing::Types<NQ::OsInfo, NQ::logInfo>;
+TYPED_TEST_SUITE(Strreplace, Classes);
+
+TYPED_TEST(Strreplace, ReplacesAllButTheFirstCharacterUpToTheEndOfTheText)
+{
+    EXPECT_EQ(this->replaced("-a-b-", '-', ' '), "-a b ");
+    EXPECT_EQ(this->replaced("-", '-', ' '), "-");
+    EXPECT_EQ(this->replaced(std::string("ab-c--d-\0-", 10), '-', ' '),
+              std::string("ab c  d \0-", 10));
+    EXPECT_EQ(this->replaced("abcbd", 'b', '\0'), std::string("a\0cbd", 5));
+    EXPECT_EQ(this->replaced(std::string("\0-", 2), '-', ' '), std::string("\0-", 2));
 }
 
-TEST(Strreplace, KeepsTheFirstCharacter)
+TYPED_TEST(Strreplace, LogsEntryAndExit)
 {
-    EXPECT_EQ(replaced("-a-b", '-', ' '), "-a b");
-}
-
-TEST(Strreplace, ReplacesEveryOtherCharacterUpToTheEndOfTheText)
-{
-    char text[] = "ab-c--d-\0-";
-    NQ::OsInfo().strreplace(text, '-', ' ');
-    EXPECT_EQ(std::string(text, 10), std::string("ab c  d \0-", 10));
-}
-
-TEST(Strreplace, StopsAtTheFirstReplacementByNul)
-{
-    char text[] = "abcbd";
-    NQ::OsInfo().strreplace(text, 'b', '\0');
-    EXPECT_EQ(std::string(text, 5), std::string("a\0cbd", 5));
-}
-
-TEST(Strreplace, KeepsAnEmptyText)
-{
-    char text[] = {'\0', '-', '\0'};
-    NQ::OsInfo().strreplace(text, '-', ' ');
-    EXPECT_EQ(std::string(text, 2), std::string("\0-", 2));
+    Recording const recording;
+    this->replaced("a-b", '-', ' ');
+    EXPECT_EQ(recording.texts(3000), (Lines{"strreplace: entry", "strreplace: exit"}));
 }
 
 } // namespace strreplace_test

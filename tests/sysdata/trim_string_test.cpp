@@ -5,40 +5,18 @@
 namespace trim_string_test
 {
 
-std::string trimmed(std::string text)
+TEST(TrimString, StripsBlanksFromBothEndsOfATextThatHasMore)
 {
-    NQ::OsInfo().trimString(text);
-    return text;
-}
-
-TEST(TrimString, StripsBlanksFromBothEnds)
-{
-    EXPECT_EQ(trimmed("  x  "), "x");
-    EXPECT_EQ(trimmed(" 10"), "10");
-    EXPECT_EQ(trimmed("10 "), "10");
-    EXPECT_EQ(trimmed("10"), "10");
-}
-
-TEST(TrimString, KeepsInnerBlanks)
-{
-    EXPECT_EQ(trimmed(" a  b "), "a  b");
-}
-
-TEST(TrimString, RemovesOneBlankFromATextOfBlanks)
-{
-    EXPECT_EQ(trimmed("   "), "  ");
-    EXPECT_EQ(trimmed(" "), "");
-}
-
-TEST(TrimString, KeepsAnEmptyText)
-{
-    EXPECT_EQ(trimmed(""), "");
-}
-
-TEST(TrimString, StripsNeitherTabsNorNewlines)
-{
-    EXPECT_EQ(trimmed(" \tx\n "), "\tx\n");
-    EXPECT_EQ(trimmed("\n"), "\n");
+    struct {
+        std::string text;
+        char const* trimmed;
+    } const cases[] = {{"  x  ", "x"},       {" 10", "10"}, {"10 ", "10"}, {"10", "10"},
+                       {" a  b ", "a  b"},   {"   ", "  "}, {" ", ""},     {"", ""},
+                       {" \tx\n ", "\tx\n"}, {"\n", "\n"}};
+    for (auto [text, trimmed] : cases) {
+        NQ::OsInfo().trimString(text);
+        EXPECT_EQ(text, trimmed);
+    }
 }
 
 } // namespace trim_string_test

@@ -7,9 +7,7 @@
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
 #include <string>
-#include <vector>
 
 namespace user_days_test
 {
@@ -23,12 +21,7 @@ class LabelledDays : public testing::Test
 protected:
     LabelledDays()
     {
-        setZone("UTC0");
-    }
-
-    static void setZone(char const* zone)
-    {
-        useZone(zone);
+        useZone("UTC0");
     }
 
     long days(std::string const& output, long reference, std::string label = "Password expires")
@@ -38,19 +31,75 @@ protected:
         return NQ::userInfo().getDays(command, label.data(), reference);
     }
 
-    Lines errors() const
-    {
-        return log_.texts(6000);
-    }
-
     FakeCommands commands_;
     Recording log_;
 };
 
 TEST_F(LabelledDays, AreThoseFromTheDateToTheReference)
 {
-    EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 + 10 * day), 10);
-    EXPECT_EQ(errors(), Lines{});
+    std::string const first = "Password expires : Jan 01, 2008\n";
+    std::string const never = "Password expires : never\n";
+    std::string const filler(1023, '.'); // as long as the piece that is read at once
+    std::string const backwards = "new_day < last_day";
+    std::string const noYear = "Invalid YY: YY = 0";
+    struct {
+        char const* what;
+        std::string output;
+        long reference;
+        long days;
+        Lines errors;
+    } const cases[] = {
+        {"ten days", first, firstOf2008 + 10 * day, 10, {}},
+        {"a second less", first, firstOf2008 + 10 * day - 1, 9, {}},
+        {"a second", first, firstOf2008 + 1, 0, {}},
+        {"the day itself", first, firstOf2008, 0, {}},
+        {"a month before", first, firstOf2008 - 31 * day, 99999, {backwards}},
+        {"a second before", first, firstOf2008 - 1, 99999, {backwards}},
+        {"the last line counts",
+         "Password expires : Dec 01, 2007\n" + first,
+         firstOf2008 + 10 * day,
+         10,
+         {}},
+        {"no label: since 1970", "nothing of the kind\n", firstOf2008, 13879, {noYear}},
+        {"no output", "", firstOf2008, 13879, {noYear}},
+        {"never is not a date",
+         never,
+         firstOf2008,
+         13879,
+         {"Invalid format: buffer = " + never, noYear}},
+        {"day and year stay, the month is January",
+         "Password expires : Mar 11, 2008\n" + never,
+         firstOf2008 + 30 * day,
+         20,
+         {"Invalid format: buffer = " + never}},
+        {"a date after an invalid line",
+         never + first,
+         firstOf2008 + 10 * day,
+         10,
+         {"Invalid format: buffer = " + never}},
+        {"never with a date: 19 January 2038",
+         "Password expires : never 01, 2008\n",
+         2147472000,
+         0,
+         {}},
+        {"and not a second less",
+         "Password expires : never 01, 2008\n",
+         2147472000 - 1,
+         99999,
+         {backwards}},
+        {"the second piece of a long line", filler + first, firstOf2008 + 10 * day, 10, {}},
+        {"within that piece",
+         filler + "." + first,
+         firstOf2008,
+         13879,
+         {"Invalid format: buffer = ." + first, noYear}},
+    };
+    for (auto const& [what, output, reference, expected, errors] : cases) {
+        log_.clear();
+        EXPECT_EQ(days(output, reference), expected) << what;
+        EXPECT_EQ(log_.texts(6000), errors) << what;
+        EXPECT_EQ(commands_.open, 0);
+    }
 }
 
 TEST_F(LabelledDays, AreReadFromWhatChagePrints)
@@ -62,31 +111,6 @@ TEST_F(LabelledDays, AreReadFromWhatChagePrints)
                                "Minimum number of days between password change\t\t: 0\n";
     EXPECT_EQ(days(output, firstOf2008 + 10 * day), 10);
     EXPECT_EQ(days(output, firstOf2008 + 10 * day, "Last password change"), 20);
-    EXPECT_EQ(errors(), Lines{});
-}
-
-TEST_F(LabelledDays, AreWholeDaysOnly)
-{
-    EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 + 10 * day - 1), 9);
-    EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 + 1), 0);
-}
-
-TEST_F(LabelledDays, AreNoneOnTheDayItself)
-{
-    EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008), 0);
-    EXPECT_EQ(errors(), Lines{});
-}
-
-TEST_F(LabelledDays, Are99999IfTheDateIsAfterTheReference)
-{
-    EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 - 31 * day), 99999);
-    EXPECT_EQ(errors(), Lines{"new_day < last_day"});
-}
-
-TEST_F(LabelledDays, Are99999IfTheDateIsOneSecondAfterTheReference)
-{
-    EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 - 1), 99999);
-    EXPECT_EQ(errors(), Lines{"new_day < last_day"});
 }
 
 TEST_F(LabelledDays, Are99999IfTheCommandCannotBeStarted)
@@ -97,84 +121,20 @@ TEST_F(LabelledDays, Are99999IfTheCommandCannotBeStarted)
     EXPECT_EQ(log_.texts(),
               (Lines{"getDays: entry", "Cannot open process: command = chage -l nobody",
                      "getDays: exit"}));
-    EXPECT_EQ(errors(), Lines{"Cannot open process: command = chage -l nobody"});
+    EXPECT_EQ(log_.texts(6000), Lines{"Cannot open process: command = chage -l nobody"});
 }
 
 TEST_F(LabelledDays, ReadTheDateAsLocalTime)
 {
-    setZone("CET-1");
+    useZone("CET-1");
     EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 - 3600), 0);
     EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 - 3601), 99999);
-    setZone("EST5");
+    useZone("EST5");
     EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 + 5L * 3600), 0);
     EXPECT_EQ(days("Password expires : Jan 01, 2008\n", firstOf2008 + 5L * 3600 - 1), 99999);
-}
-
-TEST_F(LabelledDays, LoseTheShortDayOfTheChangeToSummerTime)
-{
-    setZone("CET-1CEST,M3.5.0,M10.5.0/3");
-    long const march29 = 1206745200; // 2008-03-29 00:00 +0100
+    useZone("CET-1CEST,M3.5.0,M10.5.0/3");
+    long const march29 = 1206745200; // 2008-03-29 00:00 +0100; the next day has 23 hours
     EXPECT_EQ(days("Password expires : Mar 29, 2008\n", march29 + 2 * day - 3600), 1);
-}
-
-TEST_F(LabelledDays, AreCountedFromTheLastLineWithTheLabel)
-{
-    EXPECT_EQ(days("Password expires : Dec 01, 2007\nPassword expires : Jan 01, 2008\n",
-                   firstOf2008 + 10 * day),
-              10);
-}
-
-TEST_F(LabelledDays, AreCountedSince1970IfNoLineHasTheLabel)
-{
-    EXPECT_EQ(days("nothing of the kind\n", firstOf2008), 13879);
-    EXPECT_EQ(errors(), Lines{"Invalid YY: YY = 0"});
-}
-
-TEST_F(LabelledDays, AreCountedSince1970WithoutOutput)
-{
-    EXPECT_EQ(days("", firstOf2008), 13879);
-}
-
-TEST_F(LabelledDays, TreatTheWordNeverAsAnInvalidDate)
-{
-    EXPECT_EQ(days("Password expires\t: never\n", firstOf2008), 13879);
-    EXPECT_EQ(errors(), (Lines{"Invalid format: buffer = Password expires\t: never\n",
-                               "Invalid YY: YY = 0"}));
-}
-
-TEST_F(LabelledDays, KeepDayAndYearIfAnInvalidLineFollows)
-{
-    // The month is then none of the twelve, which counts as January.
-    EXPECT_EQ(
-        days("Password expires : Mar 11, 2008\nPassword expires : never\n", firstOf2008 + 30 * day),
-        20);
-    EXPECT_EQ(errors(), Lines{"Invalid format: buffer = Password expires : never\n"});
-}
-
-TEST_F(LabelledDays, ContinueAfterAnInvalidLine)
-{
-    EXPECT_EQ(
-        days("Password expires : never\nPassword expires : Jan 01, 2008\n", firstOf2008 + 10 * day),
-        10);
-}
-
-TEST_F(LabelledDays, CountTo19January2038IfADateFollowsNever)
-{
-    EXPECT_EQ(days("Password expires : never 01, 2008\n", 2147472000), 0);
-    EXPECT_EQ(days("Password expires : never 01, 2008\n", 2147472000 - 1), 99999);
-}
-
-TEST_F(LabelledDays, AreReadFromPiecesOf1023BytesOfALongLine)
-{
-    std::string const filler(1023, '.');
-    EXPECT_EQ(days(filler + "Password expires : Jan 01, 2008\n", firstOf2008 + 10 * day), 10);
-    EXPECT_EQ(days(filler + "." + "Password expires : Jan 01, 2008\n", firstOf2008), 13879);
-}
-
-TEST_F(LabelledDays, CloseTheCommandsPipe)
-{
-    days("Password expires : Jan 01, 2008\n", firstOf2008);
-    EXPECT_EQ(commands_.open, 0);
 }
 
 TEST_F(LabelledDays, ConvertTheDateOnceAtTheEndOfTheOutput)

@@ -10,9 +10,6 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
-#include <cerrno>
-#include <cstdlib>
 #include <fcntl.h>
 #include <locale>
 #include <new>
@@ -26,6 +23,11 @@ namespace user_list_test
 {
 
 using NQ::userInfo;
+
+std::string shadow(std::string const& name, std::string const& password)
+{
+    return name + ":" + password + ":1:2:3:4:5:6:\n";
+}
 
 /** A machine with its own accounts; every step of a listing is recorded. */
 class UserListing : public testing::Test
@@ -81,7 +83,6 @@ protected:
     }
 
     FakeFiles const files_;
-    libc::HookGuard const guard_;
     bool noting_ = false;
     int lockResult_ = 0;
     Lines steps_;
@@ -89,73 +90,45 @@ protected:
     int openAtRelease_ = 0;
 };
 
-TEST_F(UserListing, KeepsUidZeroAndOmitsSystemAccounts)
+TEST_F(UserListing, KeepsUidZeroAndTheRangeInTheOrderOfTheAccountFile)
 {
-    files_.write("/etc/passwd", account("root", 0) + account("daemon", 2) + account("jdoe", 1000));
-    EXPECT_EQ(names(), (Lines{"root", "jdoe"}));
-}
-
-TEST_F(UserListing, KeepsAnAccountWithUidAtTheMaximum)
-{
-    files_.write("/etc/passwd", account("above", 60001) + account("last", 60000));
-    EXPECT_EQ(names(), Lines{"last"});
-}
-
-TEST_F(UserListing, KeepsAnAccountWithUidAtTheMinimum)
-{
-    files_.write("/etc/passwd", account("below", 499) + account("first", 500));
-    EXPECT_EQ(names(), Lines{"first"});
-}
-
-TEST_F(UserListing, FollowsTheOrderOfTheAccountFile)
-{
-    files_.write("/etc/passwd", account("zoe", 3000) + account("root", 0) + account("abe", 1000));
-    EXPECT_EQ(names(), (Lines{"zoe", "root", "abe"}));
+    files_.write("/etc/passwd", account("zoe", 3000) + account("root", 0) + account("daemon", 2) +
+                                    account("abe", 1000) + account("above", 60001) +
+                                    account("last", 60000) + account("below", 499) +
+                                    account("first", 500));
+    EXPECT_EQ(names(), (Lines{"zoe", "root", "abe", "last", "first"}));
 }
 
 TEST_F(UserListing, ReplacesWhatTheListHeldBefore)
 {
-    files_.write("/etc/passwd", account("jdoe", 1000));
     std::vector<userInfo> users(3, userInfo("old"));
+    NQ::getUserInfo(users);
+    EXPECT_TRUE(users.empty()); // there is no account file yet
+    files_.write("/etc/passwd", account("jdoe", 1000));
+    users.resize(3);
     NQ::getUserInfo(users);
     ASSERT_EQ(users.size(), 1U);
     EXPECT_EQ(users.front().getUserName(), "jdoe");
 }
 
-TEST_F(UserListing, EmptiesTheListWithoutAnAccountFile)
-{
-    std::vector<userInfo> users(3, userInfo("old"));
-    NQ::getUserInfo(users);
-    EXPECT_TRUE(users.empty());
-    EXPECT_EQ(steps_, Lines{});
-}
-
-TEST_F(UserListing, ReadsTheLoginRulesForEachKeptUser)
+TEST_F(UserListing, ReleasesTheLockBeforeItClosesTheFiles)
 {
     files_.write("/etc/passwd", account("root", 0) + account("daemon", 2) + account("jdoe", 1000));
     files_.write("/etc/shadow", "");
-    list();
-    EXPECT_EQ(steps_, (Lines{"/etc/passwd ro", "/etc/shadow ro", "lock", "/etc/pam.d/login r",
-                             "/etc/pam.d/login r", "unlock"}));
-}
-
-TEST_F(UserListing, ReleasesTheLockBeforeItClosesTheFiles)
-{
-    files_.write("/etc/passwd", account("root", 0));
-    files_.write("/etc/shadow", "");
-    list();
-    EXPECT_EQ(opened_.size(), 2U);
-    EXPECT_EQ(openAtRelease_, 2);
-    for (int const descriptor : opened_)
-        EXPECT_FALSE(isOpen(descriptor));
-}
-
-TEST_F(UserListing, ContinuesWithoutTheLock)
-{
-    lockResult_ = -1;
-    files_.write("/etc/passwd", account("root", 0));
-    EXPECT_EQ(names(), Lines{"root"});
-    EXPECT_EQ(steps_.back(), "unlock");
+    for (int const result : {0, -1}) {
+        lockResult_ = result;
+        steps_.clear();
+        opened_.clear();
+        openAtRelease_ = 0;
+        EXPECT_EQ(names(), (Lines{"root", "jdoe"}));
+        // The rules are read for each listed user.
+        EXPECT_EQ(steps_, (Lines{"/etc/passwd ro", "/etc/shadow ro", "lock", "/etc/pam.d/login r",
+                                 "/etc/pam.d/login r", "unlock"}));
+        EXPECT_EQ(opened_.size(), 2U);
+        EXPECT_EQ(openAtRelease_, 2);
+        for (int const descriptor : opened_)
+            EXPECT_FALSE(isOpen(descriptor));
+    }
 }
 
 TEST_F(UserListing, ReleasesLockAndFilesWhenAnExceptionPasses)
@@ -174,33 +147,23 @@ TEST_F(UserListing, ReleasesLockAndFilesWhenAnExceptionPasses)
 TEST_F(UserListing, EndsAtAnyErrorAndReleasesTheLock)
 {
     files_.write("/etc/passwd", account("a", 1000) + account("b", 1001) + account("c", 1002));
-    int reads = 0;
-    libc::hooks().fgetpwent_r = [&reads](FILE* stream, passwd* entry, char* line, std::size_t size,
-                                         passwd** found) {
-        return ++reads == 2 ? EINVAL
-                            : interpose::real(fgetpwent_r)(stream, entry, line, size, found);
-    };
+    libc::hooks().fgetpwent_r.failAt(2);
     EXPECT_EQ(names(), Lines{"a"});
-    EXPECT_EQ(reads, 2);
+    EXPECT_EQ(libc::hooks().fgetpwent_r.stopCounting(), 2U);
     EXPECT_EQ(steps_.back(), "unlock");
 }
 
-TEST_F(UserListing, ReadsAccountLinesIntoABufferOf4096Bytes)
+TEST_F(UserListing, ReadsAccountAndShadowLinesIntoBuffersOf4096Bytes)
 {
-    files_.write("/etc/passwd", account("jdoe", 1000));
+    files_.write("/etc/passwd", account("a", 1000));
+    files_.write("/etc/shadow", shadow("a", "A"));
     std::vector<std::size_t> sizes;
-    libc::hooks().fgetpwent_r = [&sizes](FILE* stream, passwd* entry, char* line, std::size_t size,
-                                         passwd** found) {
-        sizes.push_back(size);
-        return interpose::real(fgetpwent_r)(stream, entry, line, size, found);
-    };
+    libc::hooks().fgetpwent_r.watch(
+        [&sizes](FILE*, passwd*, char*, std::size_t size, passwd**) { sizes.push_back(size); });
+    libc::hooks().fgetspent_r.watch(
+        [&sizes](FILE*, spwd*, char*, std::size_t size, spwd**) { sizes.push_back(size); });
     list();
-    EXPECT_EQ(sizes, (std::vector<std::size_t>{4096, 4096}));
-}
-
-std::string shadow(std::string const& name, std::string const& password)
-{
-    return name + ":" + password + ":1:2:3:4:5:6:\n";
+    EXPECT_EQ(sizes, std::vector<std::size_t>(3, 4096));
 }
 
 Lines passwordsOf(std::vector<userInfo> users)
@@ -211,7 +174,7 @@ Lines passwordsOf(std::vector<userInfo> users)
     return passwords;
 }
 
-TEST_F(UserListing, ReadsShadowLinesIntoABufferOf4096Bytes)
+TEST_F(UserListing, HasNoShadowFactsAfterALineThatDoesNotFitItsBuffer)
 {
     files_.write("/etc/passwd", account("a", 1000) + account("b", 1001));
     std::string const fitting(4060, 'p');
@@ -230,43 +193,12 @@ TEST_F(UserListing, SearchesTheShadowFileFromTheLastEntryOn)
     EXPECT_EQ(passwordsOf(list()), (Lines{"A", "B", "C", ""}));
 }
 
-TEST_F(UserListing, HasNoShadowFactsAfterAMissingUser)
+TEST_F(UserListing, LooksUpWholeNamesAndThoseOfListedAccountsOnly)
 {
-    files_.write("/etc/passwd", account("a", 1000) + account("b", 1001) + account("c", 1002));
-    files_.write("/etc/shadow", shadow("a", "A") + shadow("c", "C"));
-    std::vector<userInfo> users = list();
-    ASSERT_EQ(users.size(), 3U);
-    EXPECT_EQ(passwordsOf(users), (Lines{"A", "", ""}));
-    EXPECT_EQ(users[2].getPwdMinDays(), 0U);
-    EXPECT_EQ(users[2].getPwdMaxDays(), 0U);
-    EXPECT_EQ(users[2].getPwdWarnDays(), 0U);
-    EXPECT_EQ(users[2].getPwdExpDays(), 0U);
-    EXPECT_EQ(users[2].getPwdInactDays(), 0U);
-    EXPECT_EQ(users[2].getLstPwdChg(), 0U);
-}
-
-TEST_F(UserListing, LooksUpNoShadowEntryOfOmittedAccounts)
-{
-    files_.write("/etc/passwd", account("daemon", 2) + account("a", 1000));
-    files_.write("/etc/shadow", shadow("a", "A") + shadow("daemon", "*"));
+    files_.write("/etc/passwd", account("daemon", 2) + account("ann", 1000));
+    files_.write("/etc/shadow", shadow("anna", "X") + shadow("an", "Y") + shadow("ann", "A") +
+                                    shadow("daemon", "*"));
     EXPECT_EQ(passwordsOf(list()), Lines{"A"});
-}
-
-TEST_F(UserListing, ReadsEachShadowFieldAsItsOwnFact)
-{
-    files_.write("/etc/passwd", account("jdoe", 1000));
-    files_.write("/etc/shadow", "jdoe:secret:10:20:30:40:50:60:\n");
-    std::vector<userInfo> users = list();
-    ASSERT_EQ(users.size(), 1U);
-    userInfo& user = users.front();
-    EXPECT_EQ(user.getUserPassword(), "secret");
-    EXPECT_EQ(user.getLstPwdChg(), 10U * 86400);
-    EXPECT_EQ(user.getPwdMinDays(), 20U);
-    EXPECT_EQ(user.getPwdMaxDays(), 30U);
-    EXPECT_EQ(user.getPwdWarnDays(), 40U);
-    EXPECT_EQ(user.getPwdExpDays(), 50U);
-    EXPECT_EQ(user.getPwdInactDays(), 60U * 86400);
-    EXPECT_EQ(user.getPasswordHistoryDepth(), 0);
 }
 
 TEST_F(UserListing, HasEmptyTextsForARemoteDatabase)
@@ -333,41 +265,20 @@ TEST_F(UserListing, LogsAnUnparsableRuleUnderItsOwnNameAsAnError)
     files_.write("/etc/pam.d/login", "deny=x\n");
     Recording const log;
     list();
-    std::vector<LogRecord> records = log.records();
-    records.erase(std::remove_if(records.begin(), records.end(),
-                                 [](LogRecord const& record) { return record.level != 6000; }),
-                  records.end());
-    ASSERT_EQ(records.size(), 2U); // the level log and the trace log
-    for (LogRecord const& record : records) {
-        EXPECT_EQ(record.text, "Invalid format: line = deny=x");
-        EXPECT_EQ(record.function, "getUserInfo");
-        EXPECT_EQ(record.file, "userInfo_linux");
-        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.UserInfo");
-    }
-}
-
-TEST_F(UserListing, HasZeroFailuresIfTheRulesNameNoNumber)
-{
-    files_.write("/etc/passwd", account("jdoe", 1000));
-    for (char const* rules : {"", "auth required pam_unix.so\n", "deny=x\n"}) {
-        files_.write("/etc/pam.d/login", rules);
-        for (userInfo& user : list())
-            EXPECT_EQ(user.getMaxLoginFailures(), 0) << rules;
-    }
+    EXPECT_EQ(log.texts(6000), Lines{"Invalid format: line = deny=x"});
+    for (LogRecord const& record : log.records())
+        if (record.level == 6000) {
+            EXPECT_EQ(record.function, "getUserInfo");
+            EXPECT_EQ(record.file, "userInfo_linux");
+            EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.UserInfo");
+        }
 }
 
 TEST_F(UserListing, StartsTheFailuresAtZeroForEachUser)
 {
     files_.write("/etc/passwd", account("jdoe", 1000) + account("mary", 1001));
-    files_.write("/etc/pam.d/login", "deny=4\n");
     for (userInfo& user : list())
-        EXPECT_EQ(user.getMaxLoginFailures(), 4);
-    files_.write("/etc/pam.d/login", "auth required pam_unix.so\n");
-    for (userInfo& user : list())
-        EXPECT_EQ(user.getMaxLoginFailures(), 0);
-    files_.remove("/etc/pam.d/login");
-    for (userInfo& user : list())
-        EXPECT_EQ(user.getMaxLoginFailures(), 0);
+        EXPECT_EQ(user.getMaxLoginFailures(), 0); // there are no rules yet
 
     // The rules change while the accounts are read: the second user has none.
     bool first = true;
@@ -386,15 +297,20 @@ TEST_F(UserListing, StartsTheFailuresAtZeroForEachUser)
 TEST_F(UserListing, ReadsTheFailuresAsADecimalNumber)
 {
     files_.write("/etc/passwd", account("jdoe", 1000));
-    for (auto const& [rule, failures] : {std::pair{"deny=010", 10L},
-                                         {"deny=0x10", 0L},
-                                         {"deny=-3", -3L},
-                                         {"deny= 5", 5L},
-                                         {"deny=7x", 7L}}) {
-        files_.write("/etc/pam.d/login", std::string("deny=99\n") + rule + "\n");
-        std::vector<userInfo> users = list();
-        ASSERT_EQ(users.size(), 1U);
-        EXPECT_EQ(users[0].getMaxLoginFailures(), failures) << rule;
+    struct {
+        char const* rules;
+        long failures;
+    } const cases[] = {{"", 0},
+                       {"auth required pam_unix.so\n", 0},
+                       {"deny=x\n", 0},
+                       {"deny=99\ndeny=010\n", 10},
+                       {"deny=99\ndeny=0x10\n", 0},
+                       {"deny=99\ndeny=-3\n", -3},
+                       {"deny=99\ndeny= 5\n", 5},
+                       {"deny=99\ndeny=7x\n", 7}};
+    for (auto const& [rules, failures] : cases) {
+        files_.write("/etc/pam.d/login", rules);
+        EXPECT_EQ(list().at(0).getMaxLoginFailures(), failures) << rules;
     }
 }
 
@@ -406,35 +322,6 @@ TEST_F(UserListing, ReadsRulesOfAnyLengthToTheirEnd)
         for (userInfo& user : list())
             EXPECT_EQ(user.getMaxLoginFailures(), 2) << length;
     }
-}
-
-TEST_F(UserListing, SeesAChangeOfTheFilesTheNextTime)
-{
-    files_.write("/etc/passwd", account("jdoe", 1000));
-    EXPECT_EQ(names(), Lines{"jdoe"});
-    files_.write("/etc/passwd", account("jdoe", 1000) + account("new", 1001));
-    EXPECT_EQ(names(), (Lines{"jdoe", "new"}));
-}
-
-TEST_F(UserListing, PassesTheShadowReaderABufferOf4096Bytes)
-{
-    files_.write("/etc/passwd", account("a", 1000));
-    files_.write("/etc/shadow", shadow("a", "A"));
-    std::vector<std::size_t> sizes;
-    libc::hooks().fgetspent_r = [&sizes](FILE* stream, spwd* entry, char* line, std::size_t size,
-                                         spwd** found) {
-        sizes.push_back(size);
-        return interpose::real(fgetspent_r)(stream, entry, line, size, found);
-    };
-    list();
-    EXPECT_EQ(sizes, std::vector<std::size_t>{4096});
-}
-
-TEST_F(UserListing, ComparesWholeNamesWithTheShadowFile)
-{
-    files_.write("/etc/passwd", account("ann", 1000));
-    files_.write("/etc/shadow", shadow("anna", "X") + shadow("an", "Y") + shadow("ann", "A"));
-    EXPECT_EQ(passwordsOf(list()), Lines{"A"});
 }
 
 TEST_F(UserListing, OpensNothingElseWithoutAnAccountFile)

@@ -1,11 +1,11 @@
 #include "sysdata/userInfo_linux.h"
 
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
 #include <ctime>
 #include <functional>
 #include <string>
@@ -24,67 +24,47 @@ constexpr char const* east = "CET-1";
 constexpr char const* west = "EST5";
 constexpr char const* south = "AEST-10AEDT,M10.1.0,M4.1.0/3"; // has summer time in January
 
-TEST(UserRecord, MarksAnEmptyAgeingFieldWith32SetBits)
+/** All texts but the name. */
+Lines textsOf(userInfo& user)
 {
-    EXPECT_EQ(never, 0xFFFFFFFFUL);
+    return {user.getUserFullName(), user.getUserHomeDir(), user.getUserScriptPath(),
+            user.getUserPassword(), user.getUserId(),      user.getGroupId()};
+}
+
+/** All numbers; those of days as they are stored. */
+std::vector<long> numbersOf(userInfo& user)
+{
+    std::vector<long> numbers{user.getPasswordHistoryDepth(), user.getMaxLoginFailures()};
+    for (unsigned long const days :
+         {user.getPwdMinDays(), user.getPwdMaxDays(), user.getPwdWarnDays(), user.getPwdExpDays(),
+          user.getPwdInactDays(), user.getLstPwdChg()})
+        numbers.push_back(static_cast<long>(days));
+    return numbers;
 }
 
 TEST(UserRecord, StartsWithItsNameAndNothingElse)
 {
     userInfo user("jdoe");
     EXPECT_EQ(user.getUserName(), "jdoe");
-    EXPECT_EQ(user.getUserFullName(), "");
-    EXPECT_EQ(user.getUserHomeDir(), "");
-    EXPECT_EQ(user.getUserScriptPath(), "");
-    EXPECT_EQ(user.getUserPassword(), "");
-    EXPECT_EQ(user.getUserId(), "");
-    EXPECT_EQ(user.getGroupId(), "");
+    EXPECT_EQ(textsOf(user), Lines(6));
+    EXPECT_EQ(numbersOf(user), std::vector<long>(8, 0));
     EXPECT_FALSE(user.IsUserAcctDisabled());
     EXPECT_FALSE(user.IsDelete());
-    EXPECT_EQ(user.getPwdMinDays(), 0U);
-    EXPECT_EQ(user.getPwdMaxDays(), 0U);
-    EXPECT_EQ(user.getPwdWarnDays(), 0U);
-    EXPECT_EQ(user.getPasswordHistoryDepth(), 0);
-    EXPECT_EQ(user.getMaxLoginFailures(), 0);
-    EXPECT_EQ(user.getPwdInactDays(), 0U);
-    EXPECT_EQ(user.getLstPwdChg(), 0U);
-    EXPECT_EQ(user.getPwdExpDays(), 0U);
+    userInfo unnamed;
+    EXPECT_EQ(unnamed.getUserName(), "");
+    EXPECT_EQ(textsOf(unnamed), Lines(6));
 }
 
-TEST(UserRecord, StartsWithEmptyTextsWhenMadeWithoutAName)
+TEST(UserRecord, KeepsEachFactApart)
 {
-    userInfo user;
-    EXPECT_EQ(user.getUserName(), "");
-    EXPECT_EQ(user.getUserFullName(), "");
-    EXPECT_EQ(user.getUserHomeDir(), "");
-    EXPECT_EQ(user.getUserScriptPath(), "");
-    EXPECT_EQ(user.getUserPassword(), "");
-    EXPECT_EQ(user.getUserId(), "");
-    EXPECT_EQ(user.getGroupId(), "");
-}
-
-TEST(UserRecord, KeepsEachTextApart)
-{
-    userInfo user("name");
+    useZone("UTC0");
+    userInfo user("jdoe");
     user.setUserFullName("full");
     user.setUserHomeDir("home");
     user.setUserScriptPath("shell");
     user.setUserPassword("password");
     user.setUserId("1000");
     user.setGroupId("100");
-    EXPECT_EQ(user.getUserName(), "name");
-    EXPECT_EQ(user.getUserFullName(), "full");
-    EXPECT_EQ(user.getUserHomeDir(), "home");
-    EXPECT_EQ(user.getUserScriptPath(), "shell");
-    EXPECT_EQ(user.getUserPassword(), "password");
-    EXPECT_EQ(user.getUserId(), "1000");
-    EXPECT_EQ(user.getGroupId(), "100");
-}
-
-TEST(UserRecord, KeepsEachNumberApart)
-{
-    useZone("UTC0");
-    userInfo user("jdoe");
     user.setPwdMinDays(1);
     user.setPwdMaxDays(2);
     user.setPwdWarnDays(3);
@@ -94,59 +74,33 @@ TEST(UserRecord, KeepsEachNumberApart)
     user.setPasswordHistoryDepth(7);
     user.setMaxLoginFailures(-8);
     user.setUserAcctDisabled(true);
-    EXPECT_EQ(user.getPwdMinDays(), 1U);
-    EXPECT_EQ(user.getPwdMaxDays(), 2U);
-    EXPECT_EQ(user.getPwdWarnDays(), 3U);
-    EXPECT_EQ(user.getPwdExpDays(), 4U);
-    EXPECT_EQ(user.getPwdInactDays(), 5U * 86400);
-    EXPECT_EQ(user.getLstPwdChg(), 6U * 86400);
-    EXPECT_EQ(user.getPasswordHistoryDepth(), 7);
-    EXPECT_EQ(user.getMaxLoginFailures(), -8);
-    EXPECT_TRUE(user.IsUserAcctDisabled());
-    EXPECT_FALSE(user.IsDelete());
-}
-
-TEST(UserRecord, IsCopiedMemberByMember)
-{
-    userInfo user("jdoe");
-    user.setUserId("1000");
-    user.setPwdMaxDays(90);
     userInfo copy(user);
     user.setUserId("1001");
     user.setPwdMaxDays(30);
     EXPECT_EQ(copy.getUserName(), "jdoe");
-    EXPECT_EQ(copy.getUserId(), "1000");
-    EXPECT_EQ(copy.getPwdMaxDays(), 90U);
+    EXPECT_EQ(textsOf(copy), (Lines{"full", "home", "shell", "password", "1000", "100"}));
+    EXPECT_EQ(numbersOf(copy), (std::vector<long>{7, -8, 1, 2, 3, 4, 5L * 86400, 6L * 86400}));
+    EXPECT_TRUE(copy.IsUserAcctDisabled());
+    EXPECT_FALSE(copy.IsDelete());
 }
 
 TEST(UserRecord, ReplacesEmptyAgeingFieldsByDefaults)
 {
-    for (unsigned long const empty : {never, allBitsSet}) {
-        userInfo user("jdoe");
-        user.setPwdMinDays(empty);
-        user.setPwdMaxDays(empty);
-        user.setPwdWarnDays(empty);
-        user.setPwdExpDays(empty);
-        EXPECT_EQ(user.getPwdMinDays(), 0U);
-        EXPECT_EQ(user.getPwdMaxDays(), 99999U);
-        EXPECT_EQ(user.getPwdWarnDays(), 7U);
-        EXPECT_EQ(user.getPwdExpDays(), 99999U);
-    }
-}
-
-TEST(UserRecord, StoresEveryOtherNumberOfDaysAsGiven)
-{
-    for (unsigned long const days : {0UL, 1UL, 7UL, 99998UL, 99999UL, 100000UL, never - 1}) {
+    EXPECT_EQ(never, 0xFFFFFFFFUL);
+    using Days = std::vector<unsigned long>; // minimum, maximum, warning, expiry
+    auto const stored = [](unsigned long days) {
         userInfo user("jdoe");
         user.setPwdMinDays(days);
         user.setPwdMaxDays(days);
         user.setPwdWarnDays(days);
         user.setPwdExpDays(days);
-        EXPECT_EQ(user.getPwdMinDays(), days);
-        EXPECT_EQ(user.getPwdMaxDays(), days);
-        EXPECT_EQ(user.getPwdWarnDays(), days);
-        EXPECT_EQ(user.getPwdExpDays(), days);
-    }
+        return Days{user.getPwdMinDays(), user.getPwdMaxDays(), user.getPwdWarnDays(),
+                    user.getPwdExpDays()};
+    };
+    for (unsigned long const empty : {never, allBitsSet})
+        EXPECT_EQ(stored(empty), (Days{0, 99999, 7, 99999}));
+    for (unsigned long const days : {0UL, 1UL, 7UL, 99998UL, 99999UL, 100000UL, never - 1})
+        EXPECT_EQ(stored(days), Days(4, days));
 }
 
 unsigned long inactiveTime(unsigned long days)
@@ -163,67 +117,53 @@ unsigned long lastChange(unsigned long days)
     return user.getLstPwdChg();
 }
 
-TEST(UserInactiveTime, Is19January2038IfTheFieldIsEmptyOr99999)
+TEST(UserInactiveTime, IsLocalMidnightOfThatDay)
 {
-    for (unsigned long const days : {99999UL, never, allBitsSet}) {
+    constexpr unsigned long january2038 = 2147472000;
+    struct {
+        unsigned long days;
+        unsigned long inUtc;
+    } const cases[] = {{0, 0},
+                       {14000, 1209600000},
+                       {99999, january2038},
+                       {never, january2038},
+                       {allBitsSet, january2038},
+                       {99998, static_cast<unsigned long>(8639827200ULL)},
+                       {100000, static_cast<unsigned long>(8640000000ULL)}};
+    for (auto const& [days, inUtc] : cases) {
         useZone("UTC0");
-        EXPECT_EQ(inactiveTime(days), 2147472000U);
+        EXPECT_EQ(inactiveTime(days), inUtc) << days;
+        if (days == 0 || days == 99998 || days == 100000)
+            continue;
         useZone(east);
-        EXPECT_EQ(inactiveTime(days), 2147472000U - 3600);
+        EXPECT_EQ(inactiveTime(days), inUtc - 3600) << days;
+        useZone(south);
+        EXPECT_EQ(inactiveTime(days), inUtc - 11 * 3600) << days;
         useZone(west);
         // A time of 32 bits ends before that midnight, and an unknown time is 0.
-        EXPECT_EQ(inactiveTime(days), sizeof(time_t) == 4 ? 0U : 2147472000U + 5 * 3600);
+        bool const isUnknown = sizeof(time_t) == 4 && inUtc == january2038;
+        EXPECT_EQ(inactiveTime(days), isUnknown ? 0U : inUtc + 5 * 3600) << days;
     }
-}
-
-TEST(UserInactiveTime, CountsFromLocalMidnightOf1January1970)
-{
-    useZone("UTC0");
-    EXPECT_EQ(inactiveTime(0), 0U);
-    EXPECT_EQ(inactiveTime(14000), 1209600000U);
-    useZone(east);
-    EXPECT_EQ(inactiveTime(14000), 1209600000U - 3600);
-    useZone(west);
-    EXPECT_EQ(inactiveTime(14000), 1209600000U + 5 * 3600);
-}
-
-TEST(UserInactiveTime, IsInSummerTimeIfJanuaryIs)
-{
-    useZone(south);
-    EXPECT_EQ(inactiveTime(99999), 2147472000U - 11 * 3600);
-    EXPECT_EQ(inactiveTime(14000), 1209600000U - 11 * 3600);
-}
-
-TEST(UserLastChange, IsInSummerTimeIfJanuaryIs)
-{
-    useZone(south);
-    EXPECT_EQ(lastChange(13879), 1199145600U - 11 * 3600);
-}
-
-TEST(UserInactiveTime, CountsTheDaysAround99999LikeAnyOther)
-{
-    useZone("UTC0");
-    EXPECT_EQ(inactiveTime(99998), static_cast<unsigned long>(8639827200ULL));
-    EXPECT_EQ(inactiveTime(100000), static_cast<unsigned long>(8640000000ULL));
 }
 
 TEST(UserLastChange, IsCountedFromTheLocalMidnightOf1January1970)
 {
-    useZone("UTC0");
-    EXPECT_EQ(lastChange(0), 0U);
-    EXPECT_EQ(lastChange(13879), 1199145600U);
-    useZone(east);
-    EXPECT_EQ(lastChange(13879), 1199145600U - 3600);
-    useZone(west);
-    EXPECT_EQ(lastChange(13879), 1199145600U + 5 * 3600);
-}
-
-TEST(UserLastChange, CountsAnEmptyFieldAsDaysLikeAnyOther)
-{
-    useZone("UTC0");
-    for (unsigned long const empty : {never, allBitsSet})
-        EXPECT_EQ(lastChange(empty), static_cast<unsigned long>(371085174288000ULL));
-    EXPECT_EQ(lastChange(99999), static_cast<unsigned long>(8639913600ULL));
+    struct {
+        unsigned long days;
+        char const* zone;
+        unsigned long time;
+    } const cases[] = {{0, "UTC0", 0},
+                       {13879, "UTC0", 1199145600},
+                       {13879, east, 1199145600 - 3600},
+                       {13879, west, 1199145600 + 5 * 3600},
+                       {13879, south, 1199145600 - 11 * 3600},
+                       {99999, "UTC0", static_cast<unsigned long>(8639913600ULL)},
+                       {never, "UTC0", static_cast<unsigned long>(371085174288000ULL)},
+                       {allBitsSet, "UTC0", static_cast<unsigned long>(371085174288000ULL)}};
+    for (auto const& [days, zone, time] : cases) {
+        useZone(zone);
+        EXPECT_EQ(lastChange(days), time) << days << zone;
+    }
 }
 
 struct Access {
@@ -271,13 +211,8 @@ TEST(UserRecord, LogsEntryAndExitOfEverySetterAndGetter)
         log.clear();
         access.call(user);
         std::string const name = access.name;
-        EXPECT_EQ(log.texts(), (std::vector<std::string>{name + ": entry", name + ": exit"}));
-        for (LogRecord const& record : log.records()) {
-            EXPECT_EQ(record.function, name);
-            EXPECT_EQ(record.file, "userInfo_linux");
-            EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.UserInfo");
-            EXPECT_EQ(record.level, 3000);
-        }
+        EXPECT_EQ(log.texts(3000), (Lines{name + ": entry", name + ": exit"}));
+        EXPECT_EQ(log.sources(), Lines{name + " userInfo_linux Veltrix.IC.MI.OsSwMI.UserInfo"});
     }
 }
 
@@ -286,18 +221,16 @@ TEST(UserRecord, ConvertsItsDatesByMonthNameAndByMonthNumber)
     useZone("UTC0");
     Recording log;
     userInfo user("jdoe");
-    user.setPwdInactDays(1);
-    EXPECT_EQ(log.texts(), (std::vector<std::string>{"setPwdInactDays: entry", "to_time_t: entry",
-                                                     "to_time_t: exit", "setPwdInactDays: exit"}));
-    log.clear();
-    user.setPwdInactDays(99999);
-    EXPECT_EQ(log.texts(), (std::vector<std::string>{"setPwdInactDays: entry", "to_time_t: entry",
-                                                     "to_time_t: exit", "setPwdInactDays: exit"}));
+    for (unsigned long const days : {1UL, 99999UL}) {
+        log.clear();
+        user.setPwdInactDays(days);
+        EXPECT_EQ(log.texts(), (Lines{"setPwdInactDays: entry", "to_time_t: entry",
+                                      "to_time_t: exit", "setPwdInactDays: exit"}));
+    }
     log.clear();
     user.setLstPwdChg(1);
-    EXPECT_EQ(log.texts(), (std::vector<std::string>{"setLstPwdChg: entry", "ito_time_t: entry",
-                                                     "to_time_t: entry", "to_time_t: exit",
-                                                     "ito_time_t: exit", "setLstPwdChg: exit"}));
+    EXPECT_EQ(log.texts(), (Lines{"setLstPwdChg: entry", "ito_time_t: entry", "to_time_t: entry",
+                                  "to_time_t: exit", "ito_time_t: exit", "setLstPwdChg: exit"}));
 }
 
 TEST(UserRecord, LogsNoConstructionCopyOrDestruction)

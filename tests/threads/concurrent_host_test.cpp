@@ -85,7 +85,6 @@ protected:
         plugin.initialize();
     }
 
-    libc::HookGuard const guard;
     FileRoot const root{MACHINES_DIR "/users-and-groups"};
     Plugin plugin;
 };

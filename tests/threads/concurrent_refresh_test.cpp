@@ -15,7 +15,6 @@
 #include <algorithm>
 #include <atomic>
 #include <set>
-#include <string>
 #include <thread>
 #include <vector>
 

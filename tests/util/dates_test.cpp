@@ -1,6 +1,7 @@
 #include "util/MyProcess.h"
 
 #include "tests/interpose/Libc.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 
@@ -27,18 +28,16 @@ time_t named(int year, std::string month, int day, int hour, int minute, int sec
 constexpr time_t hour = 3600;
 constexpr time_t day = 24 * hour;
 
-TEST(ToTimeT, ConvertsTheLastSecondOfAYear)
-{
-    useZone(utc);
-    EXPECT_EQ(named(2008, "Dec", 31, 23, 59, 59), 1230767999);
-}
-
 TEST(ToTimeT, ReadsTheFieldsAsLocalTime)
 {
-    useZone(newYork);
-    EXPECT_EQ(named(2008, "Dec", 31, 23, 59, 59), 1230767999 + 5 * hour);
-    useZone(centralEurope);
-    EXPECT_EQ(named(2008, "Dec", 31, 23, 59, 59), 1230767999 - 3600);
+    struct {
+        char const* zone;
+        time_t shift;
+    } const zones[] = {{utc, 0}, {newYork, 5 * hour}, {centralEurope, -hour}};
+    for (auto const& [zone, shift] : zones) {
+        useZone(zone);
+        EXPECT_EQ(named(2008, "Dec", 31, 23, 59, 59), 1230767999 + shift) << zone;
+    }
 }
 
 TEST(ToTimeT, KnowsTheTwelveMonthsByName)
@@ -65,34 +64,19 @@ TEST(ToTimeT, TreatsOtherMonthNamesAsJanuaryWithoutAMessage)
     EXPECT_TRUE(log.remarks().empty());
 }
 
-TEST(ToTimeT, RejectsTheYear1900WithAMessage)
+TEST(ToTimeT, RejectsTheYear1900AndEarlierOnesWithAMessage)
 {
     useZone(utc);
-    Recording const log;
-    EXPECT_EQ(named(1900, "Jan", 1, 0, 0, 0), 0);
-    EXPECT_EQ(log.texts(), (std::vector<std::string>{"to_time_t: entry", "Invalid YY: YY = 1900",
-                                                     "to_time_t: exit"}));
-    EXPECT_EQ(log.texts(6000), std::vector<std::string>{"Invalid YY: YY = 1900"});
-}
-
-TEST(ToTimeT, RejectsEveryEarlierYearToo)
-{
-    useZone(utc);
-    Recording const log;
-    EXPECT_EQ(named(0, "Jan", 19, 0, 0, 0), 0);
-    EXPECT_EQ(named(-5, "Jan", 19, 0, 0, 0), 0);
-    EXPECT_EQ(named(INT_MIN, "Jan", 19, 0, 0, 0), 0);
-    EXPECT_EQ(log.texts(6000),
-              (std::vector<std::string>{"Invalid YY: YY = 0", "Invalid YY: YY = -5",
-                                        "Invalid YY: YY = -2147483648"}));
-}
-
-TEST(ToTimeT, AcceptsTheYear1901AsTheFirst)
-{
-    useZone(utc);
+    for (int const year : {1900, 0, -5, INT_MIN}) {
+        Recording const log;
+        EXPECT_EQ(named(year, "Jan", 19, 0, 0, 0), 0);
+        std::string const complaint = "Invalid YY: YY = " + std::to_string(year);
+        EXPECT_EQ(log.texts(), (Lines{"to_time_t: entry", complaint, "to_time_t: exit"}));
+        EXPECT_EQ(log.texts(6000), Lines{complaint});
+    }
     Recording const log;
     EXPECT_EQ(named(1901, "Dec", 14, 0, 0, 0), -2147472000);
-    EXPECT_TRUE(log.texts(6000).empty());
+    EXPECT_EQ(log.texts(6000), Lines{});
 }
 
 TEST(ToTimeT, CarriesFieldsOutOfRangeOver)
@@ -114,24 +98,16 @@ TEST(ToTimeT, IgnoresTheWeekday)
         EXPECT_EQ(NQ::to_time_t(2010, month, 12, weekday, 10, 23, 45, -1), 1273659825);
 }
 
-TEST(ToTimeT, LeavesSummerTimeToTheSystem)
+TEST(ToTimeT, LeavesSummerTimeToTheSystemUnlessItIsGiven)
 {
     useZone(centralEurope);
-    EXPECT_EQ(named(2010, "May", 12, 10, 23, 45, -1), 1273659825 - 2 * hour);
-    EXPECT_EQ(named(2010, "Jan", 12, 10, 23, 45, -1), 1263291825 - 3600);
-}
-
-TEST(ToTimeT, IsAnHourLaterForSummerInStandardTime)
-{
-    useZone(centralEurope);
-    EXPECT_EQ(named(2010, "May", 12, 10, 23, 45, 0), named(2010, "May", 12, 10, 23, 45, -1) + 3600);
-    EXPECT_EQ(named(2010, "Jan", 12, 10, 23, 45, 0), named(2010, "Jan", 12, 10, 23, 45, -1));
-}
-
-TEST(ToTimeT, IsAnHourEarlierForWinterInSummerTime)
-{
-    useZone(centralEurope);
-    EXPECT_EQ(named(2010, "Jan", 12, 10, 23, 45, 1), named(2010, "Jan", 12, 10, 23, 45, -1) - 3600);
+    constexpr time_t may = 1273659825 - 2 * hour;
+    constexpr time_t january = 1263291825 - hour;
+    EXPECT_EQ(named(2010, "May", 12, 10, 23, 45, -1), may);
+    EXPECT_EQ(named(2010, "Jan", 12, 10, 23, 45, -1), january);
+    EXPECT_EQ(named(2010, "May", 12, 10, 23, 45, 0), may + hour);
+    EXPECT_EQ(named(2010, "Jan", 12, 10, 23, 45, 0), january);
+    EXPECT_EQ(named(2010, "Jan", 12, 10, 23, 45, 1), january - hour);
 }
 
 TEST(ToTimeT, YieldsZeroForADateThatCannotBeRepresented)
@@ -180,13 +156,10 @@ TEST(ItoTimeT, LogsAroundTheConversionByName)
     useZone(utc);
     Recording const log;
     NQ::ito_time_t(1900, 1, 1, 0, 0, 0, 0, -1);
-    EXPECT_EQ(log.texts(), (std::vector<std::string>{"ito_time_t: entry", "to_time_t: entry",
-                                                     "Invalid YY: YY = 1900", "to_time_t: exit",
-                                                     "ito_time_t: exit"}));
-    for (LogRecord const& record : log.records()) {
-        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.MyProcess");
-        EXPECT_EQ(record.file, "MyProcess");
-    }
+    EXPECT_EQ(log.texts(), (Lines{"ito_time_t: entry", "to_time_t: entry", "Invalid YY: YY = 1900",
+                                  "to_time_t: exit", "ito_time_t: exit"}));
+    EXPECT_EQ(log.sources(), (Lines{"ito_time_t MyProcess Veltrix.IC.MI.OsSwMI.MyProcess",
+                                    "to_time_t MyProcess Veltrix.IC.MI.OsSwMI.MyProcess"}));
 }
 
 TEST(ToTimeT, DoesNotCallMktimeForYearsUpTo1900)
@@ -199,9 +172,8 @@ TEST(ToTimeT, DoesNotCallMktimeForYearsUpTo1900)
     EXPECT_STREQ(tzname[0], "BBB");
 }
 
-TEST(DateConversion, PassesEveryFieldButTheDayOfTheYearToMktime)
+TEST(ToTimeT, PassesEveryFieldButTheDayOfTheYearToMktime)
 {
-    libc::HookGuard const guard;
     std::tm passed{};
     libc::hooks().mktime = [&passed](std::tm* fields) {
         passed = *fields;
@@ -209,14 +181,9 @@ TEST(DateConversion, PassesEveryFieldButTheDayOfTheYearToMktime)
     };
     char month[] = "Mar";
     EXPECT_EQ(NQ::to_time_t(2010, month, 12, 5, 10, 23, 45, 1), 1);
-    EXPECT_EQ(passed.tm_year, 110);
-    EXPECT_EQ(passed.tm_mon, 2);
-    EXPECT_EQ(passed.tm_mday, 12);
-    EXPECT_EQ(passed.tm_wday, 5);
-    EXPECT_EQ(passed.tm_hour, 10);
-    EXPECT_EQ(passed.tm_min, 23);
-    EXPECT_EQ(passed.tm_sec, 45);
-    EXPECT_EQ(passed.tm_isdst, 1);
+    EXPECT_EQ((std::vector<int>{passed.tm_year, passed.tm_mon, passed.tm_mday, passed.tm_wday,
+                                passed.tm_hour, passed.tm_min, passed.tm_sec, passed.tm_isdst}),
+              (std::vector<int>{110, 2, 12, 5, 10, 23, 45, 1}));
 }
 
 } // namespace dates_test

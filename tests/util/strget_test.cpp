@@ -1,5 +1,6 @@
 #include "util/MyProcess.h"
 
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
@@ -9,86 +10,43 @@
 namespace strget_test
 {
 
-/** The value part of a line, and the line's bytes afterwards. */
-struct Value {
-    Value(std::string line, char c) : bytes(std::move(line))
-    {
-        char* const start = bytes.data();
-        char* const value = NQ::strget(start, c);
-        text = value;
-        offset = value - start;
+TEST(Strget, SkipsLeadingCharactersAndCutsEachLineEnd)
+{
+    struct {
+        char const* what;
+        std::string line;
+        char skipped;
+        std::ptrdiff_t offset;
+        char const* value;
+        std::string bytes; // of the line, afterwards
+    } const cases[] = {
+        {"blanks", "   1.2.3\n", ' ', 3, "1.2.3", std::string("   1.2.3\0", 9)},
+        {"two line ends", "abc\ndef\n", 'x', 0, "abc", std::string("abc\0def\0", 8)},
+        {"a blank line", " \n", ' ', 1, "", std::string(" \0", 2)},
+        {"no text", "", ' ', 0, "", ""},
+        {"only the character", "    ", ' ', 4, "", "    "},
+        {"a tab before the blank", "\t 5.0\n", ' ', 0, "\t 5.0", std::string("\t 5.0\0", 6)},
+        {"another character", "::a:b\n", ':', 2, "a:b", std::string("::a:b\0", 6)},
+        {"blanks at the end", " value  \r\n", ' ', 1, "value  \r", std::string(" value  \r\0", 10)},
+        {"line ends that are skipped", "\n\nvalue\n", '\n', 2, "value",
+         std::string("\n\nvalue\0", 8)},
+    };
+    for (auto const& [what, line, skipped, offset, value, bytes] : cases) {
+        std::string text = line;
+        char* const found = NQ::strget(text.data(), skipped);
+        EXPECT_EQ(found - text.data(), offset) << what;
+        EXPECT_STREQ(found, value) << what;
+        EXPECT_EQ(text, bytes) << what;
     }
-
-    std::string bytes;
-    std::string text;
-    std::ptrdiff_t offset;
-};
-
-TEST(Strget, SkipsLeadingBlanksAndCutsTheLineEnd)
-{
-    Value const value("   1.2.3\n", ' ');
-    EXPECT_EQ(value.text, "1.2.3");
-    EXPECT_EQ(value.offset, 3);
-    EXPECT_EQ(value.bytes, std::string("   1.2.3\0", 9));
-}
-
-TEST(Strget, OverwritesEveryNewlineAndNotOnlyTheFirst)
-{
-    Value const value("abc\ndef\n", 'x');
-    EXPECT_EQ(value.text, "abc");
-    EXPECT_EQ(value.offset, 0);
-    EXPECT_EQ(value.bytes, std::string("abc\0def\0", 8));
-}
-
-TEST(Strget, YieldsNothingForABlankLine)
-{
-    Value const value(" \n", ' ');
-    EXPECT_EQ(value.text, "");
-    EXPECT_EQ(value.offset, 1);
-}
-
-TEST(Strget, YieldsAnEmptyTextForAnEmptyText)
-{
-    Value const value("", ' ');
-    EXPECT_EQ(value.text, "");
-    EXPECT_EQ(value.offset, 0);
-}
-
-TEST(Strget, StopsAtTheEndOfALineOfOnlyTheCharacter)
-{
-    Value const value("    ", ' ');
-    EXPECT_EQ(value.text, "");
-    EXPECT_EQ(value.offset, 4);
-}
-
-TEST(Strget, SkipsOnlyTheGivenCharacter)
-{
-    EXPECT_EQ(Value("\t 5.0\n", ' ').text, "\t 5.0");
-    EXPECT_EQ(Value("::a:b\n", ':').text, "a:b");
-}
-
-TEST(Strget, KeepsTrailingBlanksAndCarriageReturns)
-{
-    EXPECT_EQ(Value(" value  \r\n", ' ').text, "value  \r");
-}
-
-TEST(Strget, KeepsNewlinesAmongTheSkippedCharacters)
-{
-    Value const value("\n\nvalue\n", '\n');
-    EXPECT_EQ(value.text, "value");
-    EXPECT_EQ(value.bytes, std::string("\n\nvalue\0", 8));
 }
 
 TEST(Strget, LogsItsEntryAndExitInItsUnitsCategory)
 {
     Recording const log;
-    Value const value("a\n", ' ');
-    EXPECT_EQ(log.texts(3000), (std::vector<std::string>{"strget: entry", "strget: exit"}));
-    for (LogRecord const& record : log.records()) {
-        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI.MyProcess");
-        EXPECT_EQ(record.file, "MyProcess");
-        EXPECT_EQ(record.function, "strget");
-    }
+    char line[] = "a\n";
+    NQ::strget(line, ' ');
+    EXPECT_EQ(log.texts(3000), (Lines{"strget: entry", "strget: exit"}));
+    EXPECT_EQ(log.sources(), Lines{"strget MyProcess Veltrix.IC.MI.OsSwMI.MyProcess"});
 }
 
 } // namespace strget_test

@@ -2,7 +2,6 @@
 
 #include "sysdata/osInfo_linux.h"
 
-#include "tests/interpose/Libc.h"
 #include "tests/support/FakeFiles.h"
 
 #include <gtest/gtest.h>
@@ -17,7 +16,6 @@ namespace os_threads_test
 
 TEST(OSThreads, ReadNameAndVersionAtOnce)
 {
-    libc::HookGuard const guard;
     FakeFiles const files;
     files.write("/etc/release", "Kesto Linux\nVERSION = 10\nPATCHLEVEL = 2\n");
     std::atomic<int> wrong{0};

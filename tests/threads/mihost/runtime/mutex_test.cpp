@@ -8,7 +8,6 @@
 #include <fstream>
 #include <string>
 #include <thread>
-#include <unistd.h>
 
 namespace mutex_test
 {

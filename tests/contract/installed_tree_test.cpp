@@ -24,33 +24,39 @@ std::string blockOf(std::string const& language, std::string const& text)
     return page.substr(first, page.find("```", first) - first);
 }
 
-/** An installed tree that was moved after installing, and a working directory for a host. */
+/** An installed tree that was moved after installing; made on first use. */
+fs::path prefix()
+{
+    static ScratchFolder const folder;
+    static bool const isInstalled = [] {
+        std::string const first = folder.path("first");
+        Outcome const outcome =
+            runToEnd({"/usr/bin/env", "cmake", "--install", BUILD_DIR, "--prefix", first});
+        EXPECT_EQ(outcome.code, 0) << outcome.out << outcome.err;
+        fs::rename(first, folder.path("tree"));
+        return true;
+    }();
+    EXPECT_TRUE(isInstalled);
+    return folder.path("tree");
+}
+
+fs::path libraries()
+{
+    return prefix() / LIBRARY_DIR;
+}
+
+/** That tree, and a working directory for a host. */
 class InstalledTree : public testing::Test
 {
-public:
+protected:
     InstalledTree()
     {
-        fs::create_directory(top_ / "work");
-        shell(std::string("cmake --install '") + BUILD_DIR + "' --prefix '" +
-              (top_ / "first").string() + "'");
-        fs::rename(top_ / "first", prefix());
         fs::copy(prefix() / "share/doc/mihost/examples", work());
-    }
-
-protected:
-    fs::path prefix() const
-    {
-        return top_ / "tree";
-    }
-
-    fs::path libraries() const
-    {
-        return prefix() / LIBRARY_DIR;
     }
 
     fs::path work() const
     {
-        return top_ / "work";
+        return folder_.path("work");
     }
 
     /** Runs shell lines of the page; the first failure ends them and is reported. */
@@ -64,7 +70,6 @@ protected:
 
 private:
     ScratchFolder const folder_;
-    fs::path const top_ = folder_.name();
 };
 
 constexpr char topOfTheTree[] = "1 OsSw Management Interface\n"

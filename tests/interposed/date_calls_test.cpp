@@ -95,20 +95,15 @@ TEST_F(DateCalls, OfALogEntryLeaveSummerTimeToTheSystem)
     EXPECT_EQ(conversions(), Calls{"by name 2026 Nov 20 0 10 11 12 -1"});
 }
 
-TEST_F(DateCalls, OfAnInactiveTimeAreByNameAtMidnight)
+TEST_F(DateCalls, OfAUsersDatesAreAtMidnight)
 {
     NQ::userInfo user("jdoe");
     user.setPwdInactDays(99999);
     user.setPwdInactDays(14000);
+    user.setLstPwdChg(14000);
     EXPECT_EQ(conversions(),
-              (Calls{"by name 2038 Jan 19 0 0 0 0 -1", "by name 1970 Jan 1 0 0 0 0 -1"}));
-}
-
-TEST_F(DateCalls, OfALastChangeAreByNumberAtMidnight)
-{
-    NQ::userInfo("jdoe").setLstPwdChg(14000);
-    EXPECT_EQ(conversions(),
-              (Calls{"by number 1970 1 1 0 0 0 0 -1", "by name 1970 Jan 1 0 0 0 0 -1"}));
+              (Calls{"by name 2038 Jan 19 0 0 0 0 -1", "by name 1970 Jan 1 0 0 0 0 -1",
+                     "by number 1970 1 1 0 0 0 0 -1", "by name 1970 Jan 1 0 0 0 0 -1"}));
 }
 
 TEST_F(DateCalls, OfAnAgeingDateAreByNumberAndOfChageByName)

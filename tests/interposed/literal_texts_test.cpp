@@ -39,16 +39,12 @@ protected:
     Frame frame_;
 };
 
-TEST_F(LiteralTexts, TheComputersNameIsNotALiteral)
+TEST_F(LiteralTexts, TheComputersNameIsNotALiteralEvenIfItIsEmpty)
 {
-    EXPECT_EQ(computerName("harbour"), "text harbour true");
-    EXPECT_EQ(standIns().literals, Lines());
-}
-
-TEST_F(LiteralTexts, AnEmptyComputersNameIsSetAndNotALiteral)
-{
-    EXPECT_EQ(computerName(""), "text  true");
-    EXPECT_EQ(standIns().literals, Lines());
+    for (std::string const name : {"harbour", ""}) {
+        EXPECT_EQ(computerName(name), "text " + name + " true");
+        EXPECT_EQ(standIns().literals, Lines());
+    }
 }
 
 TEST_F(LiteralTexts, OnlyProperty113OfAUserIsALiteral)

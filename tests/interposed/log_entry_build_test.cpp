@@ -83,15 +83,8 @@ TEST_F(LogEntryBuild, ReadsMessageAndTimeIntoOneValue)
     EXPECT_EQ(asked().reads, (Lines{"81 empty  true", "79 text *host* true"}));
     ASSERT_EQ(asked().values.size(), 2U);
     EXPECT_EQ(asked().values[0], asked().values[1]);
-}
-
-TEST_F(LogEntryBuild, FetchesAtMost511Characters)
-{
-    EXPECT_EQ(asked().fetches, (Lines{"1 511", "1 511"}));
-}
-
-TEST_F(LogEntryBuild, GivesItsTimeNoSubSeconds)
-{
+    EXPECT_EQ(asked().fetches, (Lines{"1 511", "1 511"})); // at most 511 characters
+    // No sub-seconds.
     EXPECT_EQ(standIns().dates, (std::vector<std::pair<long, unsigned short>>{{1795169472, 0}}));
 }
 

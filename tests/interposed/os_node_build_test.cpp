@@ -1,5 +1,6 @@
 #include "tests/interposed/StandIns.h"
 #include "tests/support/Frame.h"
+#include "tests/support/Lines.h"
 #include "tests/support/Recording.h"
 #include "tests/support/TimeZone.h"
 
@@ -7,7 +8,7 @@
 
 #include <algorithm>
 #include <cstdlib>
-#include <map>
+#include <iterator>
 #include <string>
 #include <utility>
 #include <vector>
@@ -93,25 +94,53 @@ TEST_F(OsNodeBuild, MakesTheNodeTheCurrentOneAndListsItOnce)
     EXPECT_EQ(interface_.osNode_->getDescription(), "Operating System");
 }
 
-TEST_F(OsNodeBuild, StoresEveryProperty)
+/** A property, the operation that yields its value (or none), and the value stored. */
+struct Fact {
+    unsigned int id;
+    std::string getter;
+    char const* stored;
+    bool isLive = false; // read again at each read of the property
+};
+
+// In the order in which they are stored.
+Fact const facts[] = {{128, "", "enumeration 35 true"},
+                      {123, "", "enumeration 1 false"},
+                      {125, "", "numbers 0,1,24 true"},
+                      {108, "getOSName", "text Kesto Linux true"},
+                      {134, "getOSVersion", "text 10.2 true"},
+                      {74, "", "text dummy true"},
+                      {75, "", "number 1 true"},
+                      {140, "getDistributed", "boolean false true"},
+                      {142, "getProcessMaxNumber", "number 142 true"},
+                      {143, "getProcessMaxMemory", "number 143 true"},
+                      {145, "getUserCount", "number 145 true"},
+                      {146, "getLicensedUserCount", "number 146 true"},
+                      {147, "getVirtualMemorySize", "number 147 true"},
+                      {148, "getVirtualMemoryFree", "number 148 true"},
+                      {155, "getLanguageEdition", "text en-US true"},
+                      {154, "getCodeSet", "text UTF-8 true"},
+                      {144, "getProcessCount", "number 1440 true", true},
+                      {149, "getPhysicalMemoryFree", "number 1490 true", true},
+                      {150, "getPhysicalMemorySize", "number 1500 true", true},
+                      {151, "getSwapFileSize", "number 1510 true", true},
+                      {153, "getSwapFileFree", "number 1530 true", true},
+                      {152, "getSwapFileSizeStored", "number 1520 true", true},
+                      {141, "getLastBootTime", "date 1273659825 true"},
+                      {139, "getInstallDate", "date 1230767999 true"}};
+
+TEST_F(OsNodeBuild, ReadsAndStoresEveryPropertyInAFixedOrder)
 {
-    std::map<unsigned int, std::string> const expected{
-        {74, "text dummy true"},        {75, "number 1 true"},
-        {108, "text Kesto Linux true"}, {123, "enumeration 1 false"},
-        {125, "numbers 0,1,24 true"},   {128, "enumeration 35 true"},
-        {134, "text 10.2 true"},        {139, "date 1230767999 true"},
-        {140, "boolean false true"},    {141, "date 1273659825 true"},
-        {142, "number 142 true"},       {143, "number 143 true"},
-        {144, "number 1440 true"},      {145, "number 145 true"},
-        {146, "number 146 true"},       {147, "number 147 true"},
-        {148, "number 148 true"},       {149, "number 1490 true"},
-        {150, "number 1500 true"},      {151, "number 1510 true"},
-        {152, "number 1520 true"},      {153, "number 1530 true"},
-        {154, "text UTF-8 true"},       {155, "text en-US true"}};
-    std::map<unsigned int, std::string> properties;
-    for (auto const& [id, value] : build().getProperties())
-        properties[id] = shown(value);
-    EXPECT_EQ(properties, expected);
+    standIns().calls.clear();
+    build();
+    EXPECT_EQ(interface_.osNode_->getProperties().size(), std::size(facts));
+    Lines calls;
+    for (Fact const& fact : facts) {
+        EXPECT_EQ(stored(fact.id), fact.stored) << fact.id;
+        if (!fact.getter.empty())
+            calls.push_back(fact.getter);
+        calls.push_back("set " + std::to_string(fact.id));
+    }
+    EXPECT_EQ(standIns().calls, calls);
 }
 
 TEST_F(OsNodeBuild, StoresTheDistributedFlagAsATruthValue)
@@ -121,53 +150,11 @@ TEST_F(OsNodeBuild, StoresTheDistributedFlagAsATruthValue)
     EXPECT_EQ(stored(140), "boolean true true");
 }
 
-TEST_F(OsNodeBuild, ReadsAndStoresInAFixedOrder)
-{
-    standIns().calls.clear();
-    build();
-    EXPECT_EQ(standIns().calls, (std::vector<std::string>{"set 128", "set 123",
-                                                          "set 125", "getOSName",
-                                                          "set 108", "getOSVersion",
-                                                          "set 134", "set 74",
-                                                          "set 75",  "getDistributed",
-                                                          "set 140", "getProcessMaxNumber",
-                                                          "set 142", "getProcessMaxMemory",
-                                                          "set 143", "getUserCount",
-                                                          "set 145", "getLicensedUserCount",
-                                                          "set 146", "getVirtualMemorySize",
-                                                          "set 147", "getVirtualMemoryFree",
-                                                          "set 148", "getLanguageEdition",
-                                                          "set 155", "getCodeSet",
-                                                          "set 154", "getProcessCount",
-                                                          "set 144", "getPhysicalMemoryFree",
-                                                          "set 149", "getPhysicalMemorySize",
-                                                          "set 150", "getSwapFileSize",
-                                                          "set 151", "getSwapFileFree",
-                                                          "set 153", "getSwapFileSizeStored",
-                                                          "set 152", "getLastBootTime",
-                                                          "set 141", "getInstallDate",
-                                                          "set 139"}));
-}
-
 TEST_F(OsNodeBuild, LeavesThePropertyOfAnUnknownFactUnset)
 {
-    struct {
-        char const* getter;
-        unsigned int id;
-    } const facts[] = {{"getOSName", 108},
-                       {"getOSVersion", 134},
-                       {"getDistributed", 140},
-                       {"getProcessMaxNumber", 142},
-                       {"getProcessMaxMemory", 143},
-                       {"getUserCount", 145},
-                       {"getLicensedUserCount", 146},
-                       {"getVirtualMemorySize", 147},
-                       {"getVirtualMemoryFree", 148},
-                       {"getLanguageEdition", 155},
-                       {"getCodeSet", 154},
-                       {"getLastBootTime", 141},
-                       {"getInstallDate", 139}};
-    for (auto const& fact : facts) {
+    for (Fact const& fact : facts) {
+        if (fact.getter.empty() || fact.isLive)
+            continue;
         standIns().failing = {fact.getter, "getLastBootTime", "getInstallDate"};
         Recording const log;
         build();
@@ -178,36 +165,25 @@ TEST_F(OsNodeBuild, LeavesThePropertyOfAnUnknownFactUnset)
     }
 }
 
-TEST_F(OsNodeBuild, StoresTheProcessCountForUnknownFreeMemory)
-{
-    standIns().failing = {"getPhysicalMemoryFree"};
-    build();
-    EXPECT_EQ(stored(149), "number 1440 true");
-    EXPECT_EQ(stored(150), "number 1500 true");
-}
-
 TEST_F(OsNodeBuild, StoresThePreviousFigureForUnreadableOnes)
-{
-    standIns().failing = {"getSwapFileSize", "getSwapFileFree", "getSwapFileSizeStored"};
-    build();
-    EXPECT_EQ(stored(151), "number 1500 true");
-    EXPECT_EQ(stored(153), "number 1500 true");
-    EXPECT_EQ(stored(152), "number 1500 true");
-}
-
-TEST_F(OsNodeBuild, StoresAnEmptyValueForAnUnreadableFirstFigure)
 {
     standIns().failing = {"getProcessCount"};
     build();
     EXPECT_EQ(stored(144), "empty  true");
     EXPECT_EQ(stored(149), "number 1490 true");
+    standIns().failing = {"getPhysicalMemoryFree", "getSwapFileSize", "getSwapFileFree",
+                          "getSwapFileSizeStored"};
+    build();
+    EXPECT_EQ(stored(149), "number 1440 true");
+    for (unsigned int const id : {150U, 151U, 153U, 152U})
+        EXPECT_EQ(stored(id), "number 1500 true") << id;
 }
 
 TEST_F(OsNodeBuild, SeedsWithTheNodesOwnReads)
 {
     Recording const log;
     build();
-    std::vector<std::string> const texts = log.texts();
+    Lines const texts = log.texts();
     EXPECT_EQ(std::count(texts.begin(), texts.end(), "OsNode::getProperty: entry"), 6);
     EXPECT_EQ(std::count(texts.begin(), texts.end(), "OsNode::getProperty: exit"), 6);
     EXPECT_EQ(std::count(texts.begin(), texts.end(), "OsNode::setProperty: entry"), 24);
@@ -221,14 +197,19 @@ TEST_F(OsNodeBuild, GivesItsTwoTimesNoSubSeconds)
     EXPECT_EQ(standIns().dates, expected);
 }
 
-TEST_F(OsNodeBuild, LogsItsEntryItsExitAndTheTwoTimes)
+TEST_F(OsNodeBuild, LogsEachTimeInLocalTimeRightAfterItIsStored)
 {
+    useZone("CET-1CEST,M3.5.0,M10.5.0/3");
     Recording const log;
     build();
-    EXPECT_EQ(log.texts().front(), "createOsNodes: entry");
-    EXPECT_EQ(log.texts().back(), "createOsNodes: exit");
-    EXPECT_TRUE(log.has("LastBootTime = Wed May 12 10:23:45 2010\n", 3000));
-    EXPECT_TRUE(log.has("InstallDate = Wed Dec 31 23:59:59 2008\n", 3000));
+    Lines const texts = log.texts(3000);
+    EXPECT_EQ(texts.front(), "createOsNodes: entry");
+    EXPECT_EQ(Lines(texts.end() - 7, texts.end()),
+              (Lines{"OsNode::setProperty: entry", "OsNode::setProperty: exit",
+                     "LastBootTime = Wed May 12 12:23:45 2010\n", "OsNode::setProperty: entry",
+                     "OsNode::setProperty: exit", "InstallDate = Thu Jan  1 00:59:59 2009\n",
+                     "createOsNodes: exit"}));
+    EXPECT_EQ(stored(141), "date 1273659825 true");
     for (LogRecord const& record : log.records()) {
         EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
         EXPECT_EQ(record.file, "OsSwMI");
@@ -236,28 +217,6 @@ TEST_F(OsNodeBuild, LogsItsEntryItsExitAndTheTwoTimes)
             EXPECT_EQ(record.function, "createOsNodes");
         }
     }
-}
-
-TEST_F(OsNodeBuild, LogsEachTimeRightAfterItIsStored)
-{
-    Recording const log;
-    build();
-    std::vector<std::string> const texts = log.texts();
-    std::vector<std::string> const end(texts.end() - 7, texts.end());
-    EXPECT_EQ(end, (std::vector<std::string>{
-                       "OsNode::setProperty: entry", "OsNode::setProperty: exit",
-                       "LastBootTime = Wed May 12 10:23:45 2010\n", "OsNode::setProperty: entry",
-                       "OsNode::setProperty: exit", "InstallDate = Wed Dec 31 23:59:59 2008\n",
-                       "createOsNodes: exit"}));
-}
-
-TEST_F(OsNodeBuild, WritesTheTimesInLocalTime)
-{
-    useZone("CET-1CEST,M3.5.0,M10.5.0/3");
-    Recording const log;
-    build();
-    EXPECT_TRUE(log.has("LastBootTime = Wed May 12 12:23:45 2010\n", 3000));
-    EXPECT_EQ(stored(141), "date 1273659825 true");
 }
 
 /** Records messages in order with the lives of the fact readers. */
@@ -285,7 +244,7 @@ TEST_F(OsNodeBuild, DestroysItsFactReaderBeforeLoggingItsExit)
 {
     MessagesAmongLives const noting;
     build();
-    std::vector<std::string> const& lives = standIns().lives;
+    Lines const& lives = standIns().lives;
     // One more than its 24 writes and its 6 reads make for themselves.
     EXPECT_EQ(std::count(lives.begin(), lives.end(), "OsInfo made"), 24 + 6 + 1);
     EXPECT_EQ(std::count(lives.begin(), lives.end(), "OsInfo gone"), 24 + 6 + 1);
@@ -313,32 +272,21 @@ protected:
     Node& node_;
 };
 
-struct Live {
-    unsigned int id;
-    char const* getter;
-};
-
-constexpr Live liveProperties[] = {{144, "getProcessCount"},       {149, "getPhysicalMemoryFree"},
-                                   {150, "getPhysicalMemorySize"}, {151, "getSwapFileSize"},
-                                   {152, "getSwapFileSizeStored"}, {153, "getSwapFileFree"}};
-
-TEST_F(OsNodeRead, ReadsALiveFigureEachTime)
+TEST_F(OsNodeRead, ReadsALiveFigureEachTimeAndStoresNone)
 {
-    for (Live const& live : liveProperties) {
+    for (Fact const& fact : facts) {
+        if (!fact.isLive)
+            continue;
         standIns().calls.clear();
         for (unsigned int const figure : {0U, 17U, 0xFFFFFFFFU}) {
-            standIns().numbers[live.getter] = figure;
-            EXPECT_EQ(read(live.id), "number " + std::to_string(figure) + " true") << live.getter;
+            standIns().numbers[fact.getter] = figure;
+            EXPECT_EQ(read(fact.id), "number " + std::to_string(figure) + " true") << fact.getter;
         }
-        EXPECT_EQ(standIns().calls, std::vector<std::string>(3, live.getter));
+        EXPECT_EQ(standIns().calls, Lines(3, fact.getter));
+        EXPECT_EQ(stored(fact.id), fact.stored);
+        standIns().failing = {fact.getter};
+        EXPECT_EQ(read(fact.id), "text before false") << fact.getter;
     }
-}
-
-TEST_F(OsNodeRead, DoesNotStoreALiveFigure)
-{
-    standIns().numbers["getProcessCount"] = 17;
-    read(144);
-    EXPECT_EQ(stored(144), "number 1440 true");
 }
 
 TEST_F(OsNodeRead, IgnoresTheStoredValueOfALiveFigure)
@@ -346,14 +294,6 @@ TEST_F(OsNodeRead, IgnoresTheStoredValueOfALiveFigure)
     EXPECT_EQ(node_.setProperty(144, PropertyValue("stored", true)).getStatus(), 0U);
     EXPECT_EQ(read(144), "number 1440 true");
     EXPECT_EQ(stored(144), "text stored true");
-}
-
-TEST_F(OsNodeRead, KeepsTheCallersValueForAnUnreadableFigure)
-{
-    for (Live const& live : liveProperties) {
-        standIns().failing = {live.getter};
-        EXPECT_EQ(read(live.id), "text before false") << live.getter;
-    }
 }
 
 TEST_F(OsNodeRead, ReadsTheClearCommandAsZeroWhateverWasStored)
@@ -367,21 +307,11 @@ TEST_F(OsNodeRead, ReadsTheClearCommandAsZeroWhateverWasStored)
 
 TEST_F(OsNodeRead, AnswersEveryOtherPropertyFromTheStore)
 {
-    for (auto const& [id, value] : node_.getProperties()) {
-        bool live = false;
-        for (Live const& property : liveProperties)
-            live = live || property.id == id;
-        if (live)
-            continue;
-        standIns().calls.clear();
-        EXPECT_EQ(read(id), shown(value)) << id;
-        EXPECT_TRUE(standIns().calls.empty()) << id;
-    }
-}
-
-TEST_F(OsNodeRead, AnswersTheRequestedStateAsWritten)
-{
-    EXPECT_EQ(read(123), "enumeration 1 false");
+    for (Fact const& fact : facts)
+        if (!fact.isLive) {
+            EXPECT_EQ(read(fact.id), fact.stored);
+        }
+    EXPECT_TRUE(standIns().calls.empty());
     node_.setProperty(123, PropertyValue(IC::EnumValue(5U), true));
     EXPECT_EQ(read(123), "enumeration 5 true");
 }
@@ -402,23 +332,9 @@ TEST_F(OsNodeRead, MakesOneFactReaderForEachRead)
         MessagesAmongLives const noting;
         PropertyValue value("", true);
         node_.getProperty(id, value);
-        EXPECT_EQ(standIns().lives,
-                  (std::vector<std::string>{"OsNode::getProperty: entry", "OsInfo made",
-                                            "OsInfo gone", "OsNode::getProperty: exit"}))
+        EXPECT_EQ(standIns().lives, (Lines{"OsNode::getProperty: entry", "OsInfo made",
+                                           "OsInfo gone", "OsNode::getProperty: exit"}))
             << id;
-    }
-}
-
-TEST_F(OsNodeRead, LogsItsEntryAndExitUnderTheClassName)
-{
-    for (unsigned int const id : {144U, 191U, 108U, 4711U}) {
-        Recording const log;
-        PropertyValue value("", true);
-        node_.getProperty(id, value);
-        EXPECT_EQ(log.texts(3000), (std::vector<std::string>{"OsNode::getProperty: entry",
-                                                             "OsNode::getProperty: exit"}));
-        for (LogRecord const& record : log.records())
-            EXPECT_EQ(record.function, "getProperty");
     }
 }
 
@@ -426,7 +342,7 @@ TEST_F(OsNodeBuild, MakesOnlyTheDummyTextOfALiteral)
 {
     standIns().literals.clear();
     build();
-    EXPECT_EQ(standIns().literals, std::vector<std::string>{"dummy"});
+    EXPECT_EQ(standIns().literals, Lines{"dummy"});
 }
 
 } // namespace

@@ -133,20 +133,17 @@ TEST_F(PublicCalls, TheGroupListingSetsTheMembersOfEachGroup)
     EXPECT_EQ(groups[0].getGroupMembers(), (Calls{"anna", "ben", "carl"}));
 }
 
-TEST_F(PublicCalls, TheGroupListingReadsBothBoundsForEveryGroup)
+TEST_F(PublicCalls, TheListingsReadBothBoundsForEveryEntry)
 {
     files_.write("/etc/group", "team:x:500:\ncrew:x:501:\n");
+    files_.write("/etc/passwd", "root:x:0:0:::\ndaemon:x:2:2:::\njdoe:x:1000:1000:::\n");
     standIns() = {};
     std::vector<NQ::groupInfo> groups;
     NQ::getGroupInfo(groups);
     EXPECT_EQ(allBut("set"),
               (Calls{"getMinGroupId", "getMaxGroupId", "getMinGroupId", "getMaxGroupId"}));
     EXPECT_EQ(standIns().calls, Calls(4, "Instance"));
-}
 
-TEST_F(PublicCalls, TheUserListingReadsBothBoundsForEveryAccount)
-{
-    files_.write("/etc/passwd", "root:x:0:0:::\ndaemon:x:2:2:::\njdoe:x:1000:1000:::\n");
     standIns() = {};
     std::vector<NQ::userInfo> users;
     NQ::getUserInfo(users);

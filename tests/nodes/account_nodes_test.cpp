@@ -93,16 +93,9 @@ TEST_P(AccountNodes, HaveTheOrderOfTheDatabase)
     }
     EXPECT_EQ(listed().size(), 3U);
     EXPECT_EQ(frame.nextNodeId_, 33U);
+    EXPECT_EQ(*frame.nodeIds_, (Ids{30, 31, 32}));
+    EXPECT_TRUE(frame.published.empty());
     EXPECT_EQ(frame.currentNode_, nodes().back());
-}
-
-TEST_P(AccountNodes, KeepTheInterfaceIdsTheyWereMadeWith)
-{
-    frame.miIds_ = {7, 9};
-    build(false);
-    frame.miIds_.push_back(11);
-    for (IC::MutableNode const* node : nodes())
-        EXPECT_EQ(node->getMIIds(), (Ids{7, 9}));
 }
 
 TEST_P(AccountNodes, QueryTheirParentsIdOnceEach)
@@ -114,15 +107,6 @@ TEST_P(AccountNodes, QueryTheirParentsIdOnceEach)
     ASSERT_EQ(nodes().size(), 3U);
     for (unsigned int i = 0; i < 3; ++i)
         EXPECT_EQ(nodes()[i]->getLinkedId(), 101 + i);
-}
-
-TEST_P(AccountNodes, NoteTheirIdsAndAreNotPublishedAtTheStart)
-{
-    frame.nextNodeId_ = 30;
-    build(false);
-    EXPECT_EQ(*frame.nodeIds_, (Ids{30, 31, 32}));
-    EXPECT_TRUE(frame.published.empty());
-    EXPECT_TRUE(frame.deleted.empty());
 }
 
 TEST_P(AccountNodes, ArePublishedOnARefreshAndTheirIdsNotNoted)

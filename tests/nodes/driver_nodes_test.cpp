@@ -17,14 +17,6 @@ using Ids = std::vector<unsigned int>;
 class DriverNodes : public testing::Test
 {
 protected:
-    void haveThreeModules()
-    {
-        commands.answers = {{"lsmod", "Module Size Used by\nxfs 1 0\next4 2 0\nloop 3 0\n"},
-                            {"modinfo xfs", "description: SGI XFS\nversion: 1.2\n"},
-                            {"modinfo ext4", "description: Fourth Extended Filesystem\n"},
-                            {"modinfo loop", "version: 9\n"}};
-    }
-
     std::vector<IC::MutableNode*> drivers() const
     {
         return frame.ofType(44);
@@ -36,7 +28,17 @@ protected:
 
 TEST_F(DriverNodes, AreBelowTheOperatingSystemInTheOrderOfLsmod)
 {
-    haveThreeModules();
+    commands.answers = {{"lsmod", "Module Size Used by\nxfs 1 0\next4 2 0\nloop 3 0\n"},
+                        {"modinfo xfs", "description: SGI XFS\nversion: 1.2\n"},
+                        {"modinfo ext4", "description: Fourth Extended Filesystem\n"},
+                        {"modinfo loop", "version: 9\n"}};
+    struct {
+        std::string name;
+        std::string version;
+        char const* description;
+    } const expected[] = {{"xfs", "1.2", "SGI XFS"},
+                          {"ext4", "", "Fourth Extended Filesystem"},
+                          {"loop", "9", "Driver"}};
     frame.nextNodeId_ = 30;
     frame.createDriverNodes();
     ASSERT_EQ(drivers().size(), 3U);
@@ -48,34 +50,17 @@ TEST_F(DriverNodes, AreBelowTheOperatingSystemInTheOrderOfLsmod)
         EXPECT_EQ(node.getMIIds(), Ids{7});
         EXPECT_EQ(node.getStatus(), 1U);
         EXPECT_TRUE(typeid(node) == typeid(IC::MutableNode));
+        EXPECT_EQ(node.getDescription(), expected[i].description);
+        EXPECT_EQ(node.getProperties().size(), 4U);
+        EXPECT_EQ(storedValue(node, 134), "text " + expected[i].version + " true");
+        EXPECT_EQ(storedValue(node, 108), "text " + expected[i].name + " true");
+        EXPECT_EQ(storedValue(node, 70), "text  true");
+        EXPECT_EQ(storedValue(node, 36), "text  true");
     }
     EXPECT_EQ(frame.nextNodeId_, 33U);
     EXPECT_EQ(*frame.nodeIds_, (Ids{30, 31, 32}));
     EXPECT_EQ(frame.currentNode_, drivers().back());
-}
-
-TEST_F(DriverNodes, AreDescribedByTheModulesDescription)
-{
-    haveThreeModules();
-    frame.createDriverNodes();
-    ASSERT_EQ(drivers().size(), 3U);
-    EXPECT_EQ(drivers()[0]->getDescription(), "SGI XFS");
-    EXPECT_EQ(drivers()[1]->getDescription(), "Fourth Extended Filesystem");
-    EXPECT_EQ(drivers()[2]->getDescription(), "Driver");
-}
-
-TEST_F(DriverNodes, HoldFourTexts)
-{
-    haveThreeModules();
-    frame.createDriverNodes();
-    ASSERT_EQ(drivers().size(), 3U);
-    IC::MutableNode const& xfs = *drivers()[0];
-    EXPECT_EQ(xfs.getProperties().size(), 4U);
-    EXPECT_EQ(storedValue(xfs, 134), "text 1.2 true");
-    EXPECT_EQ(storedValue(xfs, 108), "text xfs true");
-    EXPECT_EQ(storedValue(xfs, 70), "text  true");
-    EXPECT_EQ(storedValue(xfs, 36), "text  true");
-    EXPECT_EQ(storedValue(*drivers()[1], 134), "text  true");
+    EXPECT_TRUE(frame.published.empty());
 }
 
 TEST_F(DriverNodes, AreSetUpInTheOrderThatHostsSee)
@@ -87,36 +72,12 @@ TEST_F(DriverNodes, AreSetUpInTheOrderThatHostsSee)
                                   "setProperty(108)", "setProperty(70)", "setProperty(36)"}));
 }
 
-TEST_F(DriverNodes, KeepTheInterfaceIdsTheyWereMadeWith)
-{
-    haveThreeModules();
-    frame.miIds_ = {7, 9};
-    frame.createDriverNodes();
-    frame.miIds_.push_back(11);
-    for (IC::MutableNode const* node : drivers())
-        EXPECT_EQ(node->getMIIds(), (Ids{7, 9}));
-}
-
-TEST_F(DriverNodes, AreNotPublished)
-{
-    haveThreeModules();
-    frame.createDriverNodes();
-    EXPECT_TRUE(frame.published.empty());
-}
-
-TEST_F(DriverNodes, AreNoneWithoutModules)
-{
-    commands.answers = {{"lsmod", "Module Size Used by\n"}};
-    frame.createDriverNodes();
-    EXPECT_TRUE(drivers().empty());
-    EXPECT_TRUE(frame.nodeIds_->empty());
-}
-
 TEST_F(DriverNodes, AreNotBuiltWhenLsmodCannotBeStarted)
 {
     Recording const recording;
     frame.createDriverNodes();
     EXPECT_TRUE(drivers().empty());
+    EXPECT_TRUE(frame.nodeIds_->empty());
     EXPECT_EQ(recording.texts(), (Lines{"createDriverNodes: entry", "getDriverInfo: entry",
                                         "Cannot open process: lsmod", "getDriverInfo: exit",
                                         "createDriverNodes: exit"}));

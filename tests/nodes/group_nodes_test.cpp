@@ -3,7 +3,6 @@
 
 #include "nodes/nodeValues.h"
 #include "tests/interpose/Libc.h"
-#include "tests/support/FakeCommands.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
 #include "tests/support/Lines.h"
@@ -14,6 +13,7 @@
 
 #include <grp.h>
 #include <new>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -37,7 +37,6 @@ protected:
     }
 
     FakeFiles const files;
-    libc::HookGuard const guard;
     Frame frame;
 };
 
@@ -51,12 +50,6 @@ TEST_F(GroupNodes, HoldFourProperties)
     EXPECT_EQ(storedValue(team, 89), "number 500 true");
     EXPECT_EQ(storedValue(team, 165), "texts anna,ben,carl true");
     EXPECT_EQ(storedValue(team, 51), "number 2 true");
-}
-
-TEST_F(GroupNodes, HoldAnEmptyListWithoutMembers)
-{
-    frame.createGroupNodes(false);
-    ASSERT_EQ(groups().size(), 2U);
     EXPECT_EQ(storedValue(*groups()[0], 165), "texts  true");
     EXPECT_TRUE(groups()[0]->getProperties().at(165).getTexts().empty());
 }
@@ -136,19 +129,24 @@ TEST_F(GroupNodes, ReleaseTheLocksWhenAnExceptionPasses)
     EXPECT_EQ(held, 0);
 }
 
-TEST_F(GroupNodes, AreStoredWithoutTheUserBuildersFlag)
+TEST_F(GroupNodes, NeitherSetNorClearTheUserBuildersFlag)
 {
-    struct FlagSeen : mihost::LogSink {
+    struct FlagsSeen : mihost::LogSink {
         void write(mihost::LogMessage const&) override
         {
-            seen = seen || IC::OSSWMI::MI_call;
+            seen.insert(IC::OSSWMI::MI_call);
         }
-        bool seen = false;
-    } sink;
-    mihost::setLogSink(&sink);
-    frame.createGroupNodes(false);
-    mihost::setLogSink(nullptr);
-    EXPECT_FALSE(sink.seen);
+        std::set<bool> seen;
+    };
+    for (bool const before : {false, true}) {
+        FlagsSeen sink;
+        IC::OSSWMI::MI_call = before;
+        mihost::setLogSink(&sink);
+        frame.createGroupNodes(false);
+        mihost::setLogSink(nullptr);
+        EXPECT_EQ(sink.seen, std::set<bool>{before});
+    }
+    IC::OSSWMI::MI_call = false;
 }
 
 TEST_F(GroupNodes, AreNoneOnAnEmptyDatabase)
@@ -173,32 +171,6 @@ TEST_F(GroupNodes, AnswerTheirCountWithoutALock)
     EXPECT_EQ(locked, Lines{"the listing's"});
 }
 
-TEST_F(GroupNodes, OnlyStoreWhatIsWrittenToThem)
-{
-    frame.createGroupNodes(false);
-    FakeCommands const commands;
-    Recording const log;
-    EXPECT_EQ(groups()[1]->setProperty(138, IC::values::number(1)).getStatus(), 0);
-    EXPECT_EQ(storedValue(*groups()[1], 138), "number 1 true");
-    EXPECT_TRUE(commands.ran.empty());
-    EXPECT_TRUE(log.records().empty()); // the framework's own store
-}
-
-TEST_F(GroupNodes, LogReadsConstructionAndDestruction)
-{
-    Recording log;
-    auto* const node = new IC::GroupNode(1, 2, {}, 51, 3);
-    EXPECT_EQ(log.texts(), Lines{"GroupNode::GroupNode: entry"});
-    log.clear();
-    IC::PropertyValue value = IC::values::emptyValue();
-    node->getProperty(108, value);
-    EXPECT_EQ(log.texts(),
-              (Lines{"GroupNode::getProperty: entry", "GroupNode::getProperty: exit"}));
-    log.clear();
-    delete node;
-    EXPECT_EQ(log.texts(), Lines{"GroupNode::~GroupNode: entry"});
-}
-
 TEST_F(GroupNodes, LogEveryReadUnderTheFramesName)
 {
     frame.createGroupNodes(false);
@@ -217,14 +189,6 @@ TEST_F(GroupNodes, LogEveryReadUnderTheFramesName)
                 EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
             }
     }
-}
-
-TEST_F(GroupNodes, DoNotChangeTheUserBuildersFlag)
-{
-    IC::OSSWMI::MI_call = true;
-    frame.createGroupNodes(false);
-    EXPECT_TRUE(IC::OSSWMI::MI_call);
-    IC::OSSWMI::MI_call = false;
 }
 
 TEST_F(GroupNodes, LogTheSourceLineOfEachMessage)

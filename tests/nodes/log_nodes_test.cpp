@@ -8,7 +8,7 @@
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
+#include <algorithm>
 #include <string>
 #include <typeinfo>
 #include <vector>
@@ -79,9 +79,14 @@ TEST_F(LogNodes, HaveOneLogUnderTheOperatingSystem)
     EXPECT_TRUE(frame.published.empty());
 }
 
-TEST_F(LogNodes, HaveSixPropertiesOnTheLog)
+TEST_F(LogNodes, SetTheLogUpInTheOrderThatHostsSee)
 {
+    Recording const recording;
+    NodeCalls const calls;
     frame.createLogNodes();
+    EXPECT_EQ(calls.calls, (Lines{"setStatus(1)", "setDescription(OS Log)", "setProperty(123)",
+                                  "setProperty(125)", "setProperty(37)", "setProperty(108)",
+                                  "setProperty(114)", "setProperty(84)"}));
     EXPECT_EQ(frame.logNode_->getProperties().size(), 6U);
     EXPECT_EQ(storedValue(*frame.logNode_, 123), "enumeration 1 true");
     EXPECT_EQ(storedValue(*frame.logNode_, 125), "numbers 0,1,24 true");
@@ -89,24 +94,7 @@ TEST_F(LogNodes, HaveSixPropertiesOnTheLog)
     EXPECT_EQ(storedValue(*frame.logNode_, 108), "text OS Log true");
     EXPECT_EQ(storedValue(*frame.logNode_, 114), "enumeration 2 true");
     EXPECT_EQ(storedValue(*frame.logNode_, 84), "text *string LogData* true");
-}
-
-TEST_F(LogNodes, SetTheLogUpInTheOrderThatHostsSee)
-{
-    NodeCalls const calls;
-    frame.createLogNodes();
-    EXPECT_EQ(calls.calls, (Lines{"setStatus(1)", "setDescription(OS Log)", "setProperty(123)",
-                                  "setProperty(125)", "setProperty(37)", "setProperty(108)",
-                                  "setProperty(114)", "setProperty(84)"}));
-}
-
-TEST_F(LogNodes, LogOnlyEntryAndExitOfTheLogsBuilder)
-{
-    Recording const recording;
-    frame.createLogNodes();
     EXPECT_EQ(recording.texts(3000), (Lines{"createLogNodes: entry", "createLogNodes: exit"}));
-    EXPECT_EQ(recording.records().front().category, "Veltrix.IC.MI.OsSwMI");
-    EXPECT_EQ(recording.records().front().file, "OsSwMI");
     EXPECT_TRUE(commands.ran.empty());
 }
 
@@ -127,6 +115,10 @@ TEST_F(LogNodes, HaveOneEntryForEachLineNewestFirst)
         EXPECT_EQ(entry.getDescription(), "OS LogEntry");
         EXPECT_TRUE(typeid(entry) == typeid(IC::LogEntryNode));
         EXPECT_EQ(frame.logEntryNodes_[i], &entry);
+        EXPECT_EQ(entry.getProperties().size(), 3U);
+        EXPECT_EQ(storedValue(entry, 89), "number " + std::to_string(i + 1) + " true");
+        EXPECT_EQ(storedValue(entry, 81), "text *message " + std::to_string(3 - i) + "* true");
+        EXPECT_EQ(storedValue(entry, 79), "date " + std::to_string(firstStamp + 3 - i) + " true");
     }
     EXPECT_EQ(frame.logEntryNodes_.size(), 3U);
     EXPECT_EQ(frame.nextNodeId_, 63U);
@@ -135,21 +127,7 @@ TEST_F(LogNodes, HaveOneEntryForEachLineNewestFirst)
     EXPECT_TRUE(frame.published.empty());
 }
 
-TEST_F(LogNodes, StoreIndexMessageAndTimeOnAnEntry)
-{
-    haveLines(3);
-    build();
-    ASSERT_EQ(entries().size(), 3U);
-    EXPECT_EQ(entries()[0]->getProperties().size(), 3U);
-    EXPECT_EQ(storedValue(*entries()[0], 89), "number 1 true");
-    EXPECT_EQ(storedValue(*entries()[0], 81), "text *message 3* true");
-    EXPECT_EQ(storedValue(*entries()[0], 79), "date " + std::to_string(firstStamp + 3) + " true");
-    EXPECT_EQ(storedValue(*entries()[2], 89), "number 3 true");
-    EXPECT_EQ(storedValue(*entries()[2], 81), "text *message 1* true");
-    EXPECT_EQ(storedValue(*entries()[2], 79), "date " + std::to_string(firstStamp + 1) + " true");
-}
-
-TEST_F(LogNodes, SetAnEntryUpInTheOrderThatHostsSee)
+TEST_F(LogNodes, SetAnEntryUpInTheOrderThatHostsAndTheShellSee)
 {
     haveLines(1);
     frame.createLogNodes();
@@ -157,13 +135,6 @@ TEST_F(LogNodes, SetAnEntryUpInTheOrderThatHostsSee)
     frame.createLogEntryNodes(false);
     EXPECT_EQ(calls.calls, (Lines{"setStatus(1)", "setDescription(OS LogEntry)", "setProperty(89)",
                                   "setProperty(81)", "setProperty(79)"}));
-}
-
-TEST_F(LogNodes, RunTheCommandsOfAnEntryInOrder)
-{
-    haveLines(1);
-    frame.createLogNodes();
-    frame.createLogEntryNodes(false);
     std::string const wc = systemLog::count;
     std::string const sed = systemLog::line(1);
     EXPECT_EQ(commands.ran, (Lines{wc, wc, wc, wc, sed, wc, wc, wc, sed, "date"}));
@@ -176,55 +147,38 @@ TEST_F(LogNodes, LogTheStepsOfAnEntryInOrder)
     Recording const recording;
     frame.createLogEntryNodes(false);
     Lines nodesOnly;
-    Lines functions;
     for (LogRecord const& record : recording.records()) {
         if (record.trace || record.category != "Veltrix.IC.MI.OsSwMI")
             continue;
-        nodesOnly.push_back(record.text);
-        functions.push_back(record.function);
+        nodesOnly.push_back(record.function + " | " + record.text);
         EXPECT_EQ(record.file, "OsSwMI");
     }
-    EXPECT_EQ(functions,
-              (Lines{"createLogEntryNodes", "LogEntryNode", "setProperty", "setProperty",
-                     "getProperty", "getProperty", "setProperty", "setProperty", "getProperty",
-                     "getProperty", "setProperty", "setProperty", "createLogEntryNodes"}));
-    EXPECT_EQ(nodesOnly,
-              (Lines{"createLogEntryNodes: entry", "LogEntryNode::LogEntryNode: entry",
-                     "LogEntryNode::setProperty: entry", "LogEntryNode::setProperty: exit",
-                     "LogEntryNode::getProperty: entry", "LogEntryNode::getProperty: exit",
-                     "LogEntryNode::setProperty: entry", "LogEntryNode::setProperty: exit",
-                     "LogEntryNode::getProperty: entry", "LogEntryNode::getProperty: exit",
-                     "LogEntryNode::setProperty: entry", "LogEntryNode::setProperty: exit",
-                     "createLogEntryNodes: exit"}));
+    Lines expected{"createLogEntryNodes | createLogEntryNodes: entry",
+                   "LogEntryNode | LogEntryNode::LogEntryNode: entry"};
+    for (std::string const function :
+         {"setProperty", "getProperty", "setProperty", "getProperty", "setProperty"})
+        for (char const* end : {": entry", ": exit"})
+            expected.push_back(function + " | LogEntryNode::" + function + end);
+    expected.emplace_back("createLogEntryNodes | createLogEntryNodes: exit");
+    EXPECT_EQ(nodesOnly, expected);
     EXPECT_EQ(recording.texts(6000), Lines{});
 }
 
 TEST_F(LogNodes, HaveAsManyEntriesAsLinesUpToFifty)
 {
-    struct Case {
-        unsigned int lines;
-        std::size_t nodes;
-    };
-    for (Case const& example :
-         {Case{0, 0}, {1, 1}, {3, 3}, {49, 49}, {50, 50}, {51, 50}, {120, 50}}) {
+    for (unsigned int const lines : {0U, 1U, 3U, 49U, 50U, 51U, 120U}) {
         Frame other;
-        haveLines(example.lines);
+        haveLines(lines);
         other.createLogNodes();
         other.createLogEntryNodes(false);
-        EXPECT_EQ(other.ofType(47).size(), example.nodes) << example.lines;
-        EXPECT_EQ(other.logEntryNodes_.size(), example.nodes) << example.lines;
-    }
-}
-
-TEST_F(LogNodes, ShowTheLastFiftyOfALongLog)
-{
-    haveLines(120);
-    build();
-    ASSERT_EQ(entries().size(), 50U);
-    for (unsigned int i = 0; i < 50; ++i) {
-        EXPECT_EQ(entries()[i]->getIndex(), i + 1);
-        EXPECT_EQ(storedValue(*entries()[i], 81),
-                  "text *message " + std::to_string(120 - i) + "* true");
+        std::vector<IC::MutableNode*> const shown = other.ofType(47);
+        ASSERT_EQ(shown.size(), std::min(lines, 50U));
+        EXPECT_EQ(other.logEntryNodes_.size(), shown.size());
+        for (unsigned int i = 0; i < shown.size(); ++i) {
+            EXPECT_EQ(shown[i]->getIndex(), i + 1);
+            EXPECT_EQ(storedValue(*shown[i], 81),
+                      "text *message " + std::to_string(lines - i) + "* true");
+        }
     }
 }
 
@@ -282,20 +236,16 @@ TEST_F(LogNodes, RunNoCommandForTheIndexAndForStoredProperties)
     haveLines(1);
     build();
     commands.ran.clear();
-    ASSERT_EQ(entries().size(), 1U);
-    EXPECT_EQ(read(*entries()[0], 89), "0 number 1 true");
-    EXPECT_EQ(read(*entries()[0], 500), "1 text before true");
+    IC::MutableNode& entry = *entries().at(0);
+    EXPECT_EQ(read(entry, 89), "0 number 1 true");
+    EXPECT_EQ(read(entry, 500), "1 text before true");
+    for (unsigned int const id : {108U, 81U}) {
+        EXPECT_EQ(entry.setProperty(id, IC::PropertyValue("mine", true)).getStatus(), 0);
+        EXPECT_EQ(storedValue(entry, id), "text mine true");
+    }
+    EXPECT_EQ(read(entry, 108), "0 text mine true");
     EXPECT_TRUE(commands.ran.empty());
-}
-
-TEST_F(LogNodes, AnswerOtherPropertiesFromTheStore)
-{
-    haveLines(1);
-    build();
-    ASSERT_EQ(entries().size(), 1U);
-    EXPECT_EQ(read(*entries()[0], 108), "1 text before true");
-    entries()[0]->setProperty(108, IC::PropertyValue("mine", true));
-    EXPECT_EQ(read(*entries()[0], 108), "0 text mine true");
+    EXPECT_EQ(read(entry, 81), "0 text *message 1* true");
 }
 
 TEST_F(LogNodes, FailAReadBeyondTheLogAndKeepTheValue)
@@ -311,47 +261,12 @@ TEST_F(LogNodes, FailAReadBeyondTheLogAndKeepTheValue)
                                             "Invalid index: getMaxLine()=0, logIndex=3"}));
 }
 
-TEST_F(LogNodes, FailWithAnEmptyText)
-{
-    haveLines(3);
-    build();
-    haveLines(0);
-    ASSERT_EQ(entries().size(), 3U);
-    IC::PropertyValue value("before", true);
-    IC::Error const error = entries()[2]->getProperty(81, value);
-    EXPECT_EQ(static_cast<std::string>(error),
-              static_cast<std::string>(IC::Error(1, IC::Number(IC::Number::EmptyKind), "")));
-}
-
-TEST_F(LogNodes, StoreWhatIsWrittenAndKeepTheLog)
-{
-    haveLines(1);
-    build();
-    ASSERT_EQ(entries().size(), 1U);
-    commands.ran.clear();
-    EXPECT_EQ(entries()[0]->setProperty(81, IC::PropertyValue("mine", true)).getStatus(), 0);
-    EXPECT_TRUE(commands.ran.empty());
-    EXPECT_EQ(storedValue(*entries()[0], 81), "text mine true");
-    EXPECT_EQ(read(*entries()[0], 81), "0 text *message 1* true");
-}
-
-TEST_F(LogNodes, LogAnEntrysDestruction)
-{
-    haveLines(1);
-    build();
-    ASSERT_EQ(entries().size(), 1U);
-    Recording const recording;
-    frame.deleteNode(entries()[0]);
-    EXPECT_EQ(recording.texts(), Lines{"LogEntryNode::~LogEntryNode: entry"});
-}
-
 TEST_F(LogNodes, AreReplacedOnARefresh)
 {
     haveLines(2);
     build();
     auto const old = frame.logEntryNodes_;
     IC::MutableNode const* const log = frame.logNode_;
-    unsigned int const next = frame.nextNodeId_;
     haveLines(3);
     frame.createLogEntryNodes(true);
     EXPECT_EQ(frame.deleted, old);
@@ -359,116 +274,28 @@ TEST_F(LogNodes, AreReplacedOnARefresh)
     EXPECT_EQ(frame.published, frame.logEntryNodes_);
     for (unsigned int i = 0; i < 3; ++i) {
         EXPECT_EQ(entries()[i], frame.logEntryNodes_[i]);
-        EXPECT_EQ(entries()[i]->getNodeId(), next + i);
+        EXPECT_EQ(entries()[i]->getNodeId(), 12 + i);
         EXPECT_EQ(entries()[i]->getIndex(), i + 1);
         EXPECT_EQ(storedValue(*entries()[i], 81),
                   "text *message " + std::to_string(3 - i) + "* true");
     }
+    EXPECT_EQ(*frame.nodeIds_, (Ids{9, 10, 11, 12, 13, 14}));
     EXPECT_EQ(frame.logNode_, log);
 }
 
-TEST_F(LogNodes, NoteTheirIdsOnARefreshToo)
+TEST_F(LogNodes, AreAllDeletedBeforeTheLogIsCounted)
 {
-    haveLines(1);
-    build();
-    EXPECT_EQ(*frame.nodeIds_, (Ids{9, 10}));
-    frame.createLogEntryNodes(true);
-    EXPECT_EQ(*frame.nodeIds_, (Ids{9, 10, 11}));
-}
-
-TEST_F(LogNodes, AreAllDeletedAndNoneMadeWhenTheLogWasCleared)
-{
-    haveLines(3);
+    haveLines(2);
     build();
     auto const old = frame.logEntryNodes_;
     haveLines(0);
+    Recording const recording;
     frame.createLogEntryNodes(true);
     EXPECT_EQ(frame.deleted, old);
     EXPECT_TRUE(frame.logEntryNodes_.empty());
     EXPECT_TRUE(entries().empty());
     EXPECT_TRUE(frame.published.empty());
     EXPECT_EQ(frame.ofType(35).size(), 1U);
-}
-
-TEST_F(LogNodes, ArePublishedAsSoonAsEachIsComplete)
-{
-    haveLines(2);
-    frame.createLogNodes();
-    Recording const recording;
-    frame.createLogEntryNodes(true);
-    Lines order;
-    for (std::string const& text : recording.texts())
-        if (text == "LogEntryNode::LogEntryNode: entry" || text == "publishNode: entry")
-            order.push_back(text);
-    EXPECT_EQ(order, (Lines{"LogEntryNode::LogEntryNode: entry", "publishNode: entry",
-                            "LogEntryNode::LogEntryNode: entry", "publishNode: entry"}));
-    ASSERT_EQ(frame.published.size(), 2U);
-    EXPECT_NE(storedValue(*frame.published[0], 79), "unset");
-}
-
-TEST_F(LogNodes, AreAllMadeEvenIfTheHostRefusesThem)
-{
-    haveLines(2);
-    frame.createLogNodes();
-    frame.setLoadCallBack(
-        [](IC::Node* const&, void const*) {
-            return IC::Error(1, IC::Number(IC::Number::EmptyKind), "no room");
-        },
-        nullptr, nullptr);
-    Recording const recording;
-    frame.createLogEntryNodes(true);
-    EXPECT_EQ(entries().size(), 2U);
-    EXPECT_EQ(frame.logEntryNodes_.size(), 2U);
-    EXPECT_EQ(recording.texts(6000), Lines(2, "addNewNode error = status 1: no room"));
-}
-
-TEST_F(LogNodes, AreForgottenAfterUnload)
-{
-    haveLines(2);
-    build();
-    frame.unload();
-    EXPECT_TRUE(frame.logEntryNodes_.empty());
-    EXPECT_TRUE(frame.deleted.empty());
-}
-
-TEST_F(LogNodes, AreNotDeletedWithoutARefresh)
-{
-    haveLines(2);
-    build();
-    frame.createLogEntryNodes(false);
-    EXPECT_TRUE(frame.deleted.empty());
-    EXPECT_EQ(frame.logEntryNodes_.size(), 4U);
-}
-
-struct RefusingFrame : Frame {
-    IC::Error deleteNode(IC::Node* node) override
-    {
-        Frame::deleteNode(node);
-        return {1, IC::Number(IC::Number::EmptyKind), "refused"};
-    }
-};
-
-TEST_F(LogNodes, AreAllReplacedWhateverTheirDeletionReturns)
-{
-    RefusingFrame other;
-    haveLines(3);
-    other.createLogNodes();
-    other.createLogEntryNodes(false);
-    auto const old = other.logEntryNodes_;
-    Recording const recording;
-    other.createLogEntryNodes(true);
-    EXPECT_EQ(other.deleted, old);
-    EXPECT_EQ(other.logEntryNodes_.size(), 3U);
-    EXPECT_EQ(other.published.size(), 3U);
-    EXPECT_EQ(recording.texts(6000), Lines{});
-}
-
-TEST_F(LogNodes, AreDeletedBeforeTheLogIsCountedAgain)
-{
-    haveLines(2);
-    build();
-    Recording const recording;
-    frame.createLogEntryNodes(true);
     Lines const said = recording.texts();
     ASSERT_GE(said.size(), 4U);
     EXPECT_EQ(Lines(said.begin(), said.begin() + 4),
@@ -476,23 +303,33 @@ TEST_F(LogNodes, AreDeletedBeforeTheLogIsCountedAgain)
                      "LogEntryNode::~LogEntryNode: entry", "getMaxLine: entry"}));
 }
 
-struct WatchingFrame : Frame {
-    IC::Error addNewNode(IC::Node*& node) override
-    {
-        seen.push_back(node->getDescription() + " " + std::to_string(node->getStatus()) + " " +
-                       std::to_string(node->getProperties().size()));
-        return Frame::addNewNode(node);
-    }
-    Lines seen;
-};
-
-TEST_F(LogNodes, AreCompleteWhenTheyArePublished)
+TEST_F(LogNodes, ArePublishedAsSoonAsEachIsComplete)
 {
-    WatchingFrame other;
+    struct : Frame {
+        IC::Error addNewNode(IC::Node*& node) override
+        {
+            seen.push_back(std::to_string(ofType(47).size()) + " " + node->getDescription() + " " +
+                           std::to_string(node->getStatus()) + " " +
+                           std::to_string(node->getProperties().size()));
+            return Frame::addNewNode(node);
+        }
+        Lines seen;
+    } other;
     haveLines(2);
     other.createLogNodes();
     other.createLogEntryNodes(true);
-    EXPECT_EQ(other.seen, Lines(2, "OS LogEntry 1 3"));
+    EXPECT_EQ(other.seen, (Lines{"1 OS LogEntry 1 3", "2 OS LogEntry 1 3"}));
+}
+
+TEST_F(LogNodes, AreForgottenAfterUnloadAndKeptWithoutARefresh)
+{
+    haveLines(2);
+    build();
+    frame.createLogEntryNodes(false);
+    EXPECT_EQ(frame.logEntryNodes_.size(), 4U);
+    frame.unload();
+    EXPECT_TRUE(frame.logEntryNodes_.empty());
+    EXPECT_TRUE(frame.deleted.empty());
 }
 
 } // namespace log_nodes_test

@@ -41,47 +41,45 @@ protected:
     Frame frame;
 };
 
-TEST_F(UserNodes, HoldTwentyFourProperties)
+TEST_F(UserNodes, HoldTwentyFourPropertiesInTheOrderThatHostsSee)
 {
-    files.write("/etc/passwd", account("root", 0) + "anna:x:1000:100:Anna,,,:/home/a:/bin/ksh\n");
-    files.write("/etc/shadow", "root:*:::::::\nanna:$6$salt$hash:14000:1:90:14:30:15000:\n");
+    files.write("/etc/passwd", "anna:x:1000:100:Anna,,,:/home/a:/bin/ksh\n");
+    files.write("/etc/shadow", "anna:$6$salt$hash:14000:1:90:14:30:15000:\n");
     files.write("/etc/pam.d/login", "auth required pam_tally2.so deny=3\n");
+    struct {
+        unsigned int id;
+        char const* value;
+    } const properties[] = {
+        {123, "enumeration 1 true"}, {125, "numbers 0,1,24 true"},    {108, "text anna true"},
+        {109, "number 4 true"},      {89, "text 1000 true"},          {90, "number 4 true"},
+        {311, "text 100 true"},      {312, "text Anna,,, true"},      {158, "text /home/a true"},
+        {159, "text /bin/ksh true"}, {117, "text $6$salt$hash true"}, {120, "number 12 true"},
+        {163, "number 90 true"},     {162, "number 14 true"},         {161, "number 1 true"},
+        {44, "number 30 true"},      {118, "date 1296000000 true"},   {119, "number 0 true"},
+        {113, "text  true"},         {91, "date 1296000000 true"},    {160, "date 1209600000 true"},
+        {106, "number 3 true"},      {138, "boolean false true"},     {51, "number 1 true"},
+    };
+    NodeCalls const calls;
     frame.createUserNodes(false);
-    ASSERT_EQ(users().size(), 2U);
-    IC::MutableNode const& anna = *users()[1];
-    EXPECT_EQ(anna.getProperties().size(), 24U);
-    EXPECT_EQ(storedValue(anna, 123), "enumeration 1 true");
-    EXPECT_EQ(storedValue(anna, 125), "numbers 0,1,24 true");
-    EXPECT_EQ(storedValue(anna, 108), "text anna true");
-    EXPECT_EQ(storedValue(anna, 109), "number 4 true");
-    EXPECT_EQ(storedValue(anna, 89), "text 1000 true");
-    EXPECT_EQ(storedValue(anna, 90), "number 4 true");
-    EXPECT_EQ(storedValue(anna, 311), "text 100 true");
-    EXPECT_EQ(storedValue(anna, 312), "text Anna,,, true");
-    EXPECT_EQ(storedValue(anna, 158), "text /home/a true");
-    EXPECT_EQ(storedValue(anna, 159), "text /bin/ksh true");
-    EXPECT_EQ(storedValue(anna, 117), "text $6$salt$hash true");
-    EXPECT_EQ(storedValue(anna, 120), "number 12 true");
-    EXPECT_EQ(storedValue(anna, 163), "number 90 true");
-    EXPECT_EQ(storedValue(anna, 162), "number 14 true");
-    EXPECT_EQ(storedValue(anna, 161), "number 1 true");
-    EXPECT_EQ(storedValue(anna, 44), "number 30 true");
-    EXPECT_EQ(storedValue(anna, 118), "date 1296000000 true");
-    EXPECT_EQ(storedValue(anna, 119), "number 0 true");
-    EXPECT_EQ(storedValue(anna, 113), "text  true");
-    EXPECT_EQ(storedValue(anna, 91), "date 1296000000 true");
-    EXPECT_EQ(storedValue(anna, 160), "date 1209600000 true");
-    EXPECT_EQ(storedValue(anna, 106), "number 3 true");
-    EXPECT_EQ(storedValue(anna, 138), "boolean false true");
-    EXPECT_EQ(storedValue(anna, 51), "number 2 true");
+    Lines expected{"setStatus(1)", "setDescription(User Account)"};
+    for (auto const& [id, value] : properties) {
+        expected.push_back("setProperty(" + std::to_string(id) + ")");
+        EXPECT_EQ(storedValue(*users().at(0), id), value) << id;
+    }
+    EXPECT_EQ(calls.calls, expected);
 }
 
-TEST_F(UserNodes, CountTheBytesOfTheirTexts)
+TEST_F(UserNodes, CountTheBytesOfTheirNameAndTheDigitsOfTheirId)
 {
-    files.write("/etc/passwd", "j\xC3\xB6rg:x:1000:100::/:/bin/sh\n");
+    files.write("/etc/passwd",
+                account("christopher", 1000) + account("jo", 50001) + account("j\xC3\xB6rg", 1002));
     frame.createUserNodes(false);
-    ASSERT_EQ(users().size(), 1U);
-    EXPECT_EQ(storedValue(*users()[0], 109), "number 5 true");
+    ASSERT_EQ(users().size(), 3U);
+    EXPECT_EQ(storedValue(*users()[0], 109), "number 11 true");
+    EXPECT_EQ(storedValue(*users()[0], 90), "number 4 true");
+    EXPECT_EQ(storedValue(*users()[1], 109), "number 2 true");
+    EXPECT_EQ(storedValue(*users()[1], 90), "number 5 true");
+    EXPECT_EQ(storedValue(*users()[2], 109), "number 5 true");
 }
 
 TEST_F(UserNodes, HaveTheSystemsDefaultsForEmptyAgeingFields)
@@ -97,23 +95,6 @@ TEST_F(UserNodes, HaveTheSystemsDefaultsForEmptyAgeingFields)
     EXPECT_EQ(storedValue(anna, 44), "number 99999 true");
     EXPECT_EQ(storedValue(anna, 118), "date 2147472000 true");
     EXPECT_EQ(storedValue(anna, 91), "date 2147472000 true");
-}
-
-Lines setUp()
-{
-    Lines calls{"setStatus(1)", "setDescription(User Account)"};
-    for (int const id : {123, 125, 108, 109, 89,  90,  311, 312, 158, 159, 117, 120,
-                         163, 162, 161, 44,  118, 119, 113, 91,  160, 106, 138, 51})
-        calls.push_back("setProperty(" + std::to_string(id) + ")");
-    return calls;
-}
-
-TEST_F(UserNodes, AreSetUpInTheOrderThatHostsSee)
-{
-    files.write("/etc/passwd", account("root", 0));
-    NodeCalls const calls;
-    frame.createUserNodes(false);
-    EXPECT_EQ(calls.calls, setUp());
 }
 
 TEST_F(UserNodes, ShowTheAccountsAsTheyAreAtTheRefresh)
@@ -248,48 +229,13 @@ TEST_F(UserNodes, LogAReadUnderTheConstructorsName)
     Recording log;
     users()[0]->getProperty(108, value);
     EXPECT_EQ(log.texts(3000), (Lines{"UserNode::UserNode: entry", "UserNode::UserNode: exit"}));
+    EXPECT_EQ(log.sources(), Lines{"getProperty OsSwMI Veltrix.IC.MI.OsSwMI"});
     log.clear();
     users()[0]->getProperty(51, value);
     Lines const texts = log.texts(3000);
     EXPECT_EQ(texts.front(), "UserNode::UserNode: entry");
     EXPECT_EQ(texts.at(1), "getUserInfo: entry");
     EXPECT_EQ(texts.back(), "UserNode::UserNode: exit");
-}
-
-TEST_F(UserNodes, LogTheirConstructionAndDestruction)
-{
-    Recording log;
-    auto* const node = new IC::UserNode(1, 2, {}, 46, 3);
-    EXPECT_EQ(log.texts(), Lines{"UserNode::UserNode: entry"});
-    log.clear();
-    delete node;
-    EXPECT_EQ(log.texts(), Lines{"UserNode::~UserNode: entry"});
-}
-
-TEST_F(UserNodes, LogAReadUnderTheFramesName)
-{
-    frame.createUserNodes(false);
-    Recording const log;
-    IC::PropertyValue value = IC::values::emptyValue();
-    users()[0]->getProperty(108, value);
-    ASSERT_EQ(log.records().size(), 4U);
-    for (LogRecord const& record : log.records()) {
-        EXPECT_EQ(record.level, 3000);
-        EXPECT_EQ(record.function, "getProperty");
-        EXPECT_EQ(record.file, "OsSwMI");
-        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
-    }
-}
-
-TEST_F(UserNodes, CountTheDigitsOfTheirIdApartFromTheirName)
-{
-    files.write("/etc/passwd", account("christopher", 1000) + account("jo", 50001));
-    frame.createUserNodes(false);
-    ASSERT_EQ(users().size(), 2U);
-    EXPECT_EQ(storedValue(*users()[0], 109), "number 11 true");
-    EXPECT_EQ(storedValue(*users()[0], 90), "number 4 true");
-    EXPECT_EQ(storedValue(*users()[1], 109), "number 2 true");
-    EXPECT_EQ(storedValue(*users()[1], 90), "number 5 true");
 }
 
 } // namespace user_nodes_test

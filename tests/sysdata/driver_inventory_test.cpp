@@ -142,8 +142,11 @@ TEST_F(DriverInventory, KeepsLsmodOpenWhileEachModinfoRuns)
 {
     commands.answers = {{"lsmod", "a\nb\n"}, {"modinfo a", ""}, {"modinfo b", ""}};
     std::vector<int> openBefore;
-    libc::hooks().popen.watch(
-        [this, &openBefore](char const*, char const*) { openBefore.push_back(commands.open); });
+    libc::hooks().popen = [&, fake = libc::hooks().popen.answer()](char const* command,
+                                                                   char const* mode) {
+        openBefore.push_back(commands.open);
+        return fake(command, mode);
+    };
     list();
     EXPECT_EQ(openBefore, (std::vector<int>{0, 1, 1}));
 }

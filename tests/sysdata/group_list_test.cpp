@@ -138,7 +138,7 @@ TEST_F(GroupListing, HoldsItsOwnMutexWhileItUsesTheDatabase)
     EXPECT_EQ(steps_, (Lines{"lock 4294967295", "setgrent", "getgrent", "endgrent", "unlock"}));
 }
 
-TEST_F(GroupListing, ReturnsWhatUnlockingReturnedAndUsesTheSameMutexEachTime)
+TEST_F(GroupListing, ReturnsWhatUnlockingItsOneMutexReturned)
 {
     MutexCalls mutexes;
     std::set<NQ::Mutex const*> locked;

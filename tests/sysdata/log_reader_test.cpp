@@ -216,7 +216,7 @@ TEST_F(LogReader, EmptiesTheBufferWhenSedCannotBeStarted)
     EXPECT_EQ(recording.texts(6000), Lines{"sed -n '%dp' /var/log/messages"});
 }
 
-TEST_F(LogReader, YieldsTheMessageBetweenAsterisksFromTheEndOfTheFile)
+TEST_F(LogReader, YieldsMessagesFromTheEndBetweenAsterisks)
 {
     EXPECT_EQ(data(1), "*host sshd[1]: session opened*");
     commands.answers[sed(8)] = "Nov 20 10:11:12 third from the end\n";
@@ -225,7 +225,7 @@ TEST_F(LogReader, YieldsTheMessageBetweenAsterisksFromTheEndOfTheFile)
     EXPECT_EQ(data(10), "*the oldest*");
 }
 
-TEST_F(LogReader, NamesTheFirstCountRefusesByTheSecondAndFetchesByTheLast)
+TEST_F(LogReader, NamesRefusesAndFetchesByThreeCounts)
 {
     commands.first[wc] = {"10 f\n", "11 f\n", "12 f\n"};
     commands.answers[sed(12)] = "Nov  3 01:02:03 newest of all\n";
@@ -384,7 +384,7 @@ TEST_F(LogReader, FindsNoTimeInAnotherStampAndRunsNoDate)
     }
 }
 
-TEST_F(LogReader, DatesAnEntryToZeroIfDateCannotBeStartedOrIsTooEarly)
+TEST_F(LogReader, DatesAnEntryToZeroWithoutADateOrAYear)
 {
     commands.answers["date"] = "Sat Nov 21 03:15:30 UTC 1900\n";
     Recording recording;
@@ -503,7 +503,7 @@ TEST_F(LogReader, LogsTheExitOfEveryReadOfATime)
     expectBothEnds(1);
 }
 
-TEST_F(LogReader, NeitherReadsNorWritesItsStringNorTheStatusOfItsCommands)
+TEST_F(LogReader, UsesNeitherItsStringNorTheStatusOfCommands)
 {
     std::string& member = onlyMember(log);
     EXPECT_EQ(member, "");

@@ -156,7 +156,7 @@ TEST_F(Methods, PassTheRedhatOptionToUseraddOnly)
               (Lines{line, "/usr/bin/chage -E -1 jdoe 2>&1", "/usr/sbin/userdel jdoe 2>&1"}));
 }
 
-TEST_F(Methods, OmitTheOptionOfAnEmptyPathAndEndAtAnyOtherEmptyValue)
+TEST_F(Methods, OmitAnEmptyPathAndEndAtAnyOtherEmptyValue)
 {
     EXPECT_EQ(execute("UserSetHomeDir", {text("HomeDir", ""), text("ScriptPath", ""),
                                          text("Comment", "x"), text("UserName", "jdoe")}),

@@ -118,7 +118,7 @@ TEST_F(SettingAPassword, IgnoresTheOutputOfPasswd)
     EXPECT_EQ(commands_.ran, (Lines{usermodLine_, passwdLine_}));
 }
 
-TEST_F(SettingAPassword, StopsIfTheMainCommandFailsButNotWithoutAChange)
+TEST_F(SettingAPassword, StopsIfTheMainCommandFails)
 {
     commands_.answers[usermodLine_] = "usermod: user 'jdoe' does not exist\n";
     EXPECT_EQ(setPassword(), 1);

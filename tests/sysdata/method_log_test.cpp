@@ -263,7 +263,7 @@ TEST_F(MethodLog, HidesThePasswordWithinAToolsOutput)
         EXPECT_EQ(shown(output, password), "outputBuffer: " + logged);
 }
 
-TEST_F(MethodLog, HidesEachOfSeveralPasswordsAndNothingForAnEmptyOne)
+TEST_F(MethodLog, HidesEachPasswordAndNothingForAnEmptyOne)
 {
     commands_.otherwise = "abc ab\n";
     EXPECT_EQ(outputsOf("UserSetPassword", {text("Password", "ab"), text("Password", "abc")}),

@@ -121,7 +121,7 @@ TEST_F(GroupMemberChanges, FailIfAToolCannotBeStarted)
     EXPECT_EQ(commands_.ran.size(), 2U);
 }
 
-TEST_F(GroupMemberChanges, FailIfUsermodPrintsAnythingButThatForThePrimaryGroup)
+TEST_F(GroupMemberChanges, FailIfUsermodPrintsAnyOtherLine)
 {
     identity(identityOfJdoe);
     commands_.answers[linesThatSet("jdoe,\"jdoe\",\"sudo\",\"users\",\"staff\"").at(1)] =

@@ -213,7 +213,7 @@ TEST(MethodParser, LogsTheConvertedDate)
                       "paramInfo.type=CMPI_dateTime", "paramInfo.value=2010-5-7"}));
 }
 
-TEST(MethodParser, RejectsAnUnreadableDateAndKeepsEarlierParameters)
+TEST(MethodParser, RejectsAnUnreadableDateAndKeepsTheRest)
 {
     for (std::string const date :
          {"soon", "2010-12-31", "20101231", "20101231000000", "20101231000000.000000",
@@ -277,7 +277,7 @@ TEST(MethodParser, TokenizesTheTextAndThenEachItem)
                 "paramInfo.name=UserName", "paramInfo.type=CMPI_string", "paramInfo.value=jdoe"}));
 }
 
-TEST(MethodParser, ReadsDatesByTheTwoScanningFormatsAndPadsNoZeros)
+TEST(MethodParser, ReadsDatesByTheTwoScanningFormats)
 {
     for (auto const& [value, date] : {std::pair{"20100507123456.654321+120", "2010-5-7"},
                                       {"20101231000000.000000-060", "2010-12-31"},

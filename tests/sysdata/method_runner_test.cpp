@@ -53,7 +53,7 @@ TEST_F(ExecuteCommand, JoinsTheProgramAndItsArgumentsByBlanks)
     }
 }
 
-TEST_F(ExecuteCommand, CopiesTheOutputAndReportsAnyWhateverTheStatus)
+TEST_F(ExecuteCommand, CopiesTheOutputAndReportsAny)
 {
     commands_.status = 1 << 8;
     for (std::string const& output :

@@ -112,7 +112,7 @@ private:
     Lines const& tokens_;
 };
 
-TEST(Tokenize, LogsEachTokenBeforeItAppendsItAndThatOfGroupsAfterIt)
+TEST(Tokenize, LogsATokenBeforeAppendingItForGroupsAfter)
 {
     Lines found;
     CountAtLog const log(found);

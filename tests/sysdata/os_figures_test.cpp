@@ -73,7 +73,7 @@ TEST(OsInfoFixedValues, AreTheSameOnEveryMachineAndReadNothing)
 
 struct RamCase {
     NumberGetter get;
-    unsigned long Figures::*field;
+    unsigned long& (*field)(Figures& figures);
     char const* failure;
     char const* function;
 };
@@ -91,7 +91,7 @@ protected:
         // Every other field has a value that would be noticed.
         kernel_.figures.totalram = kernel_.figures.freeram = 11 << 20;
         kernel_.figures.totalhigh = kernel_.figures.bufferram = 13 << 20;
-        kernel_.figures.*GetParam().field = amount;
+        GetParam().field(kernel_.figures) = amount;
         kernel_.figures.mem_unit = memoryUnit;
         return read(GetParam().get);
     }
@@ -101,9 +101,11 @@ protected:
 
 INSTANTIATE_TEST_SUITE_P(
     Of, OsInfoRam,
-    testing::Values(RamCase{&OsInfo::getPhysicalMemorySize, &Figures::totalram,
+    testing::Values(RamCase{&OsInfo::getPhysicalMemorySize,
+                            [](Figures& figures) -> unsigned long& { return figures.totalram; },
                             "physicalMemorySize failed", "getPhysicalMemorySize"},
-                    RamCase{&OsInfo::getPhysicalMemoryFree, &Figures::freeram,
+                    RamCase{&OsInfo::getPhysicalMemoryFree,
+                            [](Figures& figures) -> unsigned long& { return figures.freeram; },
                             "physicalMemoryFree failed", "getPhysicalMemoryFree"}),
     [](auto const& test) { return std::string(test.param.function); });
 

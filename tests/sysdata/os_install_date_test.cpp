@@ -92,7 +92,7 @@ TEST_F(InstallDate, IgnoresOtherReleaseFiles)
     EXPECT_TRUE(commands_.ran.empty());
 }
 
-TEST_F(InstallDate, IsZeroWhenTheCommandCannotBeStartedOrFindsNothing)
+TEST_F(InstallDate, IsZeroIfTheCommandFailsOrFindsNothing)
 {
     files_.write("/etc/SuSE-release", "a line\n");
     files_.write("/etc/redhat-release", "a line\n");
@@ -140,7 +140,7 @@ TEST_F(InstallDate, IsReadFromTheLine)
     EXPECT_TRUE(log.has("strreplace: entry", 3000));
 }
 
-TEST_F(InstallDate, ClosesTheReleaseFileAfterTheCommandRunsAndBeforeItReads)
+TEST_F(InstallDate, ClosesTheFileAfterStartingAndBeforeReading)
 {
     files_.write("/etc/redhat-release", "a line\n");
     commands_.answers[redhatCommand] = "Change: 2010-05-12 10:23:45\n";

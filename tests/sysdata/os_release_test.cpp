@@ -172,7 +172,7 @@ protected:
     int unameCalls_ = 0;
 };
 
-TEST_F(OSVersion, ComesFromTheKeyValueFileFirstUnlessALineIsTooShort)
+TEST_F(OSVersion, ComesFromTheKeyValueFileIfItsLinesAreLong)
 {
     EXPECT_EQ(version(), "none"); // no release file
     files_.write("/etc/UnitedLinux-release", "UnitedLinux 1.0\n");
@@ -265,7 +265,7 @@ protected:
     int pcloseCalls_ = 0;
 };
 
-TEST_F(OSVersionStream, StartsAfterTheReleaseFileIsClosedAndIsClosedAsAFile)
+TEST_F(OSVersionStream, StartsAfterTheFileIsClosedAndEndsAsAFile)
 {
     answer("5.4");
     EXPECT_EQ(version(), "5.4");

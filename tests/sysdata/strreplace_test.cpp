@@ -8,35 +8,30 @@
 namespace strreplace_test
 {
 
-/** The operation that both classes have, on a text that may hold NUL bytes. */
-template <class Info> class Strreplace : public testing::Test
+/** What an operation of that name makes of a text, which may hold NUL bytes. */
+template <class Info> std::string replaced(std::string text, char from, char to)
 {
-protected:
-    static std::string replaced(std::string text, char from, char to)
-    {
-        Info().strreplace(text.data(), from, to);
-        return text;
-    }
-};
-
-using Classes = testing::Types<NQ::OsInfo, NQ::logInfo>;
-TYPED_TEST_SUITE(Strreplace, Classes);
-
-TYPED_TEST(Strreplace, ReplacesAllButTheFirstCharacterUpToTheEndOfTheText)
-{
-    EXPECT_EQ(this->replaced("-a-b-", '-', ' '), "-a b ");
-    EXPECT_EQ(this->replaced("-", '-', ' '), "-");
-    EXPECT_EQ(this->replaced(std::string("ab-c--d-\0-", 10), '-', ' '),
-              std::string("ab c  d \0-", 10));
-    EXPECT_EQ(this->replaced("abcbd", 'b', '\0'), std::string("a\0cbd", 5));
-    EXPECT_EQ(this->replaced(std::string("\0-", 2), '-', ' '), std::string("\0-", 2));
+    Info().strreplace(text.data(), from, to);
+    return text;
 }
 
-TYPED_TEST(Strreplace, LogsEntryAndExit)
+template <class Info> void expectReplacements()
 {
+    EXPECT_EQ(replaced<Info>("-a-b-", '-', ' '), "-a b ");
+    EXPECT_EQ(replaced<Info>("-", '-', ' '), "-");
+    EXPECT_EQ(replaced<Info>(std::string("ab-c--d-\0-", 10), '-', ' '),
+              std::string("ab c  d \0-", 10));
+    EXPECT_EQ(replaced<Info>("abcbd", 'b', '\0'), std::string("a\0cbd", 5));
+    EXPECT_EQ(replaced<Info>(std::string("\0-", 2), '-', ' '), std::string("\0-", 2));
     Recording const recording;
-    this->replaced("a-b", '-', ' ');
+    replaced<Info>("a-b", '-', ' ');
     EXPECT_EQ(recording.texts(3000), (Lines{"strreplace: entry", "strreplace: exit"}));
+}
+
+TEST(Strreplace, KeepsTheFirstCharacterAndEndsWithTheText)
+{
+    expectReplacements<NQ::OsInfo>();
+    expectReplacements<NQ::logInfo>();
 }
 
 } // namespace strreplace_test

@@ -54,7 +54,7 @@ TEST_F(UserDeletion, ReturnsOneIfTheCommandCannotBeStarted)
     EXPECT_EQ(log_.sources(), Lines{"setDelete userInfo_linux Veltrix.IC.MI.OsSwMI.UserInfo"});
 }
 
-TEST_F(UserDeletion, RunsALineThatFillsItsBufferOf1024BytesAndNoLongerOne)
+TEST_F(UserDeletion, RunsALineOf1023BytesAndNoLongerOne)
 {
     std::string const name(1023 - 11, 'x');
     EXPECT_EQ(userInfo().setDelete(name), 1);
@@ -295,7 +295,7 @@ TEST_F(CommandRunner, CopiesWhatFollowsANulByteToo)
     EXPECT_EQ(std::string(output, sizeof output), std::string("one\0two\0#", 9));
 }
 
-TEST_F(CommandRunner, CopiesTheOutputAndIsTrueIfThereIsAnyWhateverTheStatus)
+TEST_F(CommandRunner, CopiesTheOutputAndIsTrueIfThereIsAny)
 {
     commands_.status = 1 << 8;
     for (std::string const& output : {std::string(), std::string("x"), std::string(15000, 'o')}) {
@@ -317,7 +317,7 @@ TEST_F(CommandRunner, IsFalseForACommandThatCannotBeStarted)
     EXPECT_FALSE(userInfo().findIsAcctDisabled(user));
 }
 
-TEST_F(CommandRunner, RunsALineThatFillsItsBufferOf5000BytesAndNoLongerOne)
+TEST_F(CommandRunner, RunsALineOf4999BytesAndNoLongerOne)
 {
     std::string const argument(4999 - 13 - 1 - 5, 'x');
     runTool({"ignored", argument.c_str()});

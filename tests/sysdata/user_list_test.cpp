@@ -90,7 +90,7 @@ protected:
     int openAtRelease_ = 0;
 };
 
-TEST_F(UserListing, KeepsUidZeroAndTheRangeInTheOrderOfTheAccountFile)
+TEST_F(UserListing, KeepsUidZeroAndTheRangeInTheFilesOrder)
 {
     files_.write("/etc/passwd", account("zoe", 3000) + account("root", 0) + account("daemon", 2) +
                                     account("abe", 1000) + account("above", 60001) +
@@ -153,7 +153,7 @@ TEST_F(UserListing, EndsAtAnyErrorAndReleasesTheLock)
     EXPECT_EQ(steps_.back(), "unlock");
 }
 
-TEST_F(UserListing, ReadsAccountAndShadowLinesIntoBuffersOf4096Bytes)
+TEST_F(UserListing, ReadsLinesIntoBuffersOf4096Bytes)
 {
     files_.write("/etc/passwd", account("a", 1000));
     files_.write("/etc/shadow", shadow("a", "A"));
@@ -174,7 +174,7 @@ Lines passwordsOf(std::vector<userInfo> users)
     return passwords;
 }
 
-TEST_F(UserListing, HasNoShadowFactsAfterALineThatDoesNotFitItsBuffer)
+TEST_F(UserListing, HasNoShadowFactsAfterALineThatDoesNotFit)
 {
     files_.write("/etc/passwd", account("a", 1000) + account("b", 1001));
     std::string const fitting(4060, 'p');

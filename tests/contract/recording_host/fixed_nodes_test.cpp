@@ -4,9 +4,11 @@
 #include "tests/contract/recording_host/Loaded.h"
 
 #include <algorithm>
+#include <map>
 #include <set>
 #include <sys/utsname.h>
 #include <typeinfo>
+#include <utility>
 
 namespace fixed_nodes_test
 {
@@ -21,11 +23,6 @@ protected:
             std::string("harbour").copy(system->nodename, sizeof system->nodename - 1);
             return 0;
         };
-    }
-
-    void TearDown() override
-    {
-        libc::hooks().uname = nullptr;
     }
 
     /** The events between a builder's entry and exit message. */
@@ -45,57 +42,38 @@ protected:
     }
 };
 
-TEST_F(FixedNodes, TheInterfacesNodeHasTheInterfacesId)
+TEST_F(FixedNodes, AreMadeOneBelowTheOther)
 {
-    plugin.initialize(5);
-    EXPECT_EQ(eventsOf("createOsSwNodes"), (Lines{"MutableNode(5, 0, [5], 39, 0)", "setStatus(1)",
-                                                  "setDescription(OsSw Management Interface)"}));
+    for (bool const unameFails : {false, true}) {
+        if (unameFails)
+            libc::hooks().uname = [](utsname*) { return -1; };
+        host.events.clear();
+        plugin.initialize(5);
+        EXPECT_EQ(eventsOf("createOsSwNodes"),
+                  (Lines{"MutableNode(5, 0, [5], 39, 0)", "setStatus(1)",
+                         "setDescription(OsSw Management Interface)"}));
+        EXPECT_EQ(eventsOf("createRootNode"), (Lines{"MutableNode(6, 5, [5], 59, 0)",
+                                                     "setStatus(1)", "setDescription(ROOT Node)"}));
+        Lines computer{"MutableNode(7, 6, [5], 40, 0)", "setStatus(1)", "setDescription(Computer)",
+                       "log: getComputerName: entry", "log: getComputerName: exit"};
+        if (!unameFails)
+            computer.emplace_back("setProperty(108, text harbour true)");
+        EXPECT_EQ(eventsOf("createComputerNodes"), computer);
+        EXPECT_EQ(firstIds(4), (Ids{5, 6, 5, 7}));
+        plugin.unload();
+    }
 }
 
-TEST_F(FixedNodes, TheRootHasTheFirstCountedId)
-{
-    plugin.initialize(5);
-    EXPECT_EQ(eventsOf("createRootNode"), (Lines{"MutableNode(6, 5, [5], 59, 0)", "setStatus(1)",
-                                                 "setDescription(ROOT Node)"}));
-}
-
-TEST_F(FixedNodes, TheComputerIsMadeBelowTheRootAndNamed)
-{
-    plugin.initialize(5);
-    EXPECT_EQ(eventsOf("createComputerNodes"),
-              (Lines{"MutableNode(7, 6, [5], 40, 0)", "setStatus(1)", "setDescription(Computer)",
-                     "log: getComputerName: entry", "log: getComputerName: exit",
-                     "setProperty(108, text harbour true)"}));
-}
-
-TEST_F(FixedNodes, TheComputerHasNoNameIfUnameFails)
-{
-    libc::hooks().uname = [](utsname*) { return -1; };
-    plugin.initialize(5);
-    EXPECT_EQ(eventsOf("createComputerNodes"),
-              (Lines{"MutableNode(7, 6, [5], 40, 0)", "setStatus(1)", "setDescription(Computer)",
-                     "log: getComputerName: entry", "log: getComputerName: exit"}));
-    IC::MutableNode const& computer = plugin.node(IC::nodeType::computer);
-    EXPECT_EQ(computer.getStatus(), 1U);
-    EXPECT_EQ(computer.getDescription(), "Computer");
-    EXPECT_FALSE(property(computer, IC::property::name));
-}
-
-TEST_F(FixedNodes, TheComputersNameIsReadOnce)
+TEST_F(FixedNodes, OnlyTheComputerHasAPropertyWhichIsReadOnce)
 {
     plugin.initialize();
+    EXPECT_TRUE(plugin.node(IC::nodeType::osSw).getProperties().empty());
+    EXPECT_TRUE(plugin.node(IC::nodeType::root).getProperties().empty());
     libc::hooks().uname = [](utsname* system) {
         std::string("renamed").copy(system->nodename, sizeof system->nodename - 1);
         return 0;
     };
     EXPECT_EQ(text(plugin.node(IC::nodeType::computer), IC::property::name), "harbour");
-}
-
-TEST_F(FixedNodes, NeitherTheInterfacesNodeNorTheRootHasProperties)
-{
-    plugin.initialize();
-    EXPECT_TRUE(plugin.node(IC::nodeType::osSw).getProperties().empty());
-    EXPECT_TRUE(plugin.node(IC::nodeType::root).getProperties().empty());
 }
 
 TEST_F(FixedNodes, OnlyTheOperatingSystemHasItsOwnClass)
@@ -110,33 +88,15 @@ TEST_F(FixedNodes, OnlyTheOperatingSystemHasItsOwnClass)
     EXPECT_STREQ(typeid(os).name(), "N2IC6OsNodeE");
 }
 
-TEST_F(FixedNodes, TheIdListHoldsTheInterfacesOwnIdTwice)
-{
-    plugin.initialize(5);
-    EXPECT_EQ(firstIds(4), (Ids{5, 6, 5, 7}));
-}
-
-TEST_F(FixedNodes, AreFollowedByAllOthersInTheIdList)
+TEST_F(FixedNodes, IdsAreCountedAndListedInTheOrderOfBuilding)
 {
     commands.answers = {{"lsmod", "exnet 24576 0\nexfs 114688 2\n"},
                         {"modinfo exnet", ""},
                         {"modinfo exfs", ""},
-                        {"wc -l /var/log/messages", "3 /var/log/messages\n"}};
-    plugin.initialize(5);
-    Ids expected = {5, 6, 5, 7};
-    for (IC::MutableNode const* node : plugin.nodes())
-        if (node->getNodeId() > 7)
-            expected.push_back(node->getNodeId());
-    EXPECT_EQ(*inside(&OpenInterface::nodeIds_), expected);
-}
-
-TEST_F(FixedNodes, IdsAreCountedInTheOrderOfBuilding)
-{
-    commands.answers = {{"lsmod", "exnet 24576 0\n"},
-                        {"modinfo exnet", ""},
                         {"wc -l /var/log/messages", "2 /var/log/messages\n"}};
     plugin.initialize(5);
     Ids types;
+    Ids listed = {5, 6, 5, 7};
     unsigned int next = 6;
     for (IC::MutableNode const* node : plugin.nodes()) {
         if (types.empty() || types.back() != node->getNodeType())
@@ -144,34 +104,15 @@ TEST_F(FixedNodes, IdsAreCountedInTheOrderOfBuilding)
         if (node->getNodeType() != IC::nodeType::osSw) {
             EXPECT_EQ(node->getNodeId(), next++);
         }
+        if (node->getNodeId() > 7)
+            listed.push_back(node->getNodeId());
     }
     EXPECT_EQ(types, (Ids{39, 59, 40, 17, 44, 46, 51, 35, 47}));
     EXPECT_EQ(inside(&OpenInterface::nextNodeId_), next);
+    EXPECT_EQ(*inside(&OpenInterface::nodeIds_), listed);
 }
 
-TEST_F(FixedNodes, TheInterfacesNodeDoesNotAdvanceTheCounter)
-{
-    unsigned int counter = 0;
-    host.onSetStatus = [this, &counter](IC::MutableNode& node) {
-        if (node.getNodeType() == IC::nodeType::osSw)
-            counter = inside(&OpenInterface::nextNodeId_);
-    };
-    plugin.initialize(5);
-    EXPECT_EQ(counter, 6U);
-}
-
-TEST_F(FixedNodes, AreInTheirMembersAndTheListFromTheStart)
-{
-    plugin.initialize();
-    auto const nodes = plugin.nodes();
-    ASSERT_GE(nodes.size(), 4U);
-    EXPECT_EQ(inside(&OpenInterface::osSwNode_), nodes[0]);
-    EXPECT_EQ(inside(&OpenInterface::rootNode_), nodes[1]);
-    EXPECT_EQ(inside(&OpenInterface::computerNode_), nodes[2]);
-    EXPECT_EQ(inside(&OpenInterface::osNode_), nodes[3]);
-}
-
-TEST_F(FixedNodes, AreListedBeforeTheirStatusIsSet)
+TEST_F(FixedNodes, AreListedAndInTheirMemberBeforeTheirStatusIsSet)
 {
     commands.answers = {{"lsmod", "exnet 24576 0\n"},
                         {"modinfo exnet", ""},
@@ -179,33 +120,25 @@ TEST_F(FixedNodes, AreListedBeforeTheirStatusIsSet)
     std::set<unsigned int> types;
     host.onSetStatus = [this, &types](IC::MutableNode& node) {
         types.insert(node.getNodeType());
+        std::map<unsigned int, IC::Node*> members = {
+            {IC::nodeType::osSw, inside(&OpenInterface::osSwNode_)},
+            {IC::nodeType::root, inside(&OpenInterface::rootNode_)},
+            {IC::nodeType::computer, inside(&OpenInterface::computerNode_)},
+            {IC::nodeType::operatingSystem, inside(&OpenInterface::osNode_)},
+            {IC::nodeType::driver, &node}, // in no member
+            {IC::nodeType::log, inside(&OpenInterface::logNode_)}};
+        auto const lastOf = [](auto const& nodes) {
+            return nodes.empty() ? nullptr : nodes.back();
+        };
+        members[IC::nodeType::user] = lastOf(inside(&OpenInterface::userNodes_));
+        members[IC::nodeType::group] = lastOf(inside(&OpenInterface::groupNodes_));
+        members[IC::nodeType::logEntry] = lastOf(inside(&OpenInterface::logEntryNodes_));
+        EXPECT_EQ(members.at(node.getNodeType()), &node) << node.getNodeType();
         EXPECT_EQ(inside(&OpenInterface::currentNode_), &node);
         EXPECT_EQ(inside(&OpenInterface::nodes_).back(), &node);
-        switch (node.getNodeType()) {
-        case IC::nodeType::user:
-            EXPECT_EQ(inside(&OpenInterface::userNodes_).back(), &node);
-            break;
-        case IC::nodeType::group:
-            EXPECT_EQ(inside(&OpenInterface::groupNodes_).back(), &node);
-            break;
-        case IC::nodeType::logEntry:
-            EXPECT_EQ(inside(&OpenInterface::logEntryNodes_).back(), &node);
-            break;
-        default:
-            break;
-        }
     };
     plugin.initialize();
     EXPECT_EQ(types, (std::set<unsigned int>{17, 35, 39, 40, 44, 46, 47, 51, 59}));
-}
-
-TEST_F(FixedNodes, EachIsTheParentOfTheNext)
-{
-    plugin.initialize(5);
-    EXPECT_EQ(plugin.node(IC::nodeType::osSw).getLinkedId(), 0U);
-    EXPECT_EQ(plugin.node(IC::nodeType::root).getLinkedId(), 5U);
-    EXPECT_EQ(plugin.node(IC::nodeType::computer).getLinkedId(), 6U);
-    EXPECT_EQ(plugin.node(IC::nodeType::operatingSystem).getLinkedId(), 7U);
 }
 
 TEST_F(FixedNodes, KeepTheInterfaceIdsTheyWereMadeWith)
@@ -232,39 +165,21 @@ TEST_F(FixedNodes, ALaterInterfaceIdShowsInTheNodesMadeAfterIt)
     EXPECT_EQ(plugin.node(IC::nodeType::computer).getMIIds(), (Ids{5, 9}));
 }
 
-TEST_F(FixedNodes, AreInTheirMemberBeforeTheirStatusIsSet)
-{
-    Ids seen;
-    host.onSetStatus = [this, &seen](IC::MutableNode& node) {
-        for (IC::MutableNode* member :
-             {inside(&OpenInterface::osSwNode_), inside(&OpenInterface::rootNode_),
-              inside(&OpenInterface::computerNode_), inside(&OpenInterface::osNode_),
-              inside(&OpenInterface::logNode_)})
-            if (member == &node)
-                seen.push_back(node.getNodeType());
-    };
-    plugin.initialize(5);
-    EXPECT_EQ(seen, (Ids{39, 59, 40, 17, 35}));
-}
-
-TEST_F(FixedNodes, NoteTheInterfacesIdAfterTheyAreMade)
+TEST_F(FixedNodes, TakeTheCountersValueAndNoteTheirIdAfterwards)
 {
     Ids noted;
     host.onNode = [this, &noted] {
         noted.push_back(static_cast<unsigned int>(inside(&OpenInterface::nodeIds_)->size()));
     };
-    plugin.initialize(5);
-    ASSERT_GE(noted.size(), 3U);
-    EXPECT_EQ(Ids(noted.begin(), noted.begin() + 3), (Ids{0, 2, 4}));
-}
-
-TEST_F(FixedNodes, TakeTheCountersCurrentValue)
-{
-    host.onSetStatus = [this](IC::MutableNode& node) {
+    unsigned int counter = 0;
+    host.onSetStatus = [this, &counter](IC::MutableNode& node) {
         if (node.getNodeType() == IC::nodeType::osSw)
-            inside(&OpenInterface::nextNodeId_) = 40;
+            counter = std::exchange(inside(&OpenInterface::nextNodeId_), 40);
     };
     plugin.initialize(5);
+    EXPECT_EQ(counter, 6U); // which the interface's own node does not advance
+    ASSERT_GE(noted.size(), 3U);
+    EXPECT_EQ(Ids(noted.begin(), noted.begin() + 3), (Ids{0, 2, 4}));
     EXPECT_EQ(plugin.node(IC::nodeType::root).getNodeId(), 40U);
     EXPECT_EQ(plugin.node(IC::nodeType::root).getLinkedId(), 5U);
     EXPECT_EQ(plugin.node(IC::nodeType::computer).getNodeId(), 41U);

@@ -9,158 +9,89 @@
 namespace node_classes_test
 {
 
-class NodeClasses : public Loaded, public testing::WithParamInterface<char const*>
+class NodeClasses : public Loaded
 {
-protected:
-    NodeClasses()
-    {
+};
+
+TEST_F(NodeClasses, PassTheirArgumentsOnAndLogTheirLives)
+{
+    for (std::string const name : {"OsNode", "UserNode", "GroupNode", "LogEntryNode"}) {
         host.events.clear();
+        host.logCalls.clear();
+        std::unique_ptr<IC::MutableNode>(construct(name)).reset();
+        EXPECT_EQ(
+            host.events,
+            (Lines{"MutableNode(11, 12, [13 14], 15, 16)", "log: " + name + "::" + name + ": entry",
+                   "log: " + name + "::~" + name + ": entry", "~MutableNode()"}));
+        ASSERT_EQ(host.logCalls.size(), 4U);
+        for (LogCall const& call : host.logCalls) {
+            EXPECT_EQ(call.file, "OsSwMI");
+            EXPECT_EQ(call.category, "Veltrix.IC.MI.OsSwMI");
+            EXPECT_EQ(call.level, 3000);
+        }
     }
-};
-
-TEST_P(NodeClasses, PassTheirArgumentsOnAndLogOneMessage)
-{
-    std::unique_ptr<IC::MutableNode> const node(construct(GetParam()));
-    std::string const name = GetParam();
-    EXPECT_EQ(host.events, (Lines{"MutableNode(11, 12, [13 14], 15, 16)",
-                                  "log: " + name + "::" + name + ": entry"}));
-}
-
-TEST_P(NodeClasses, LogOneMessageBeforeTheyAreDestroyed)
-{
-    std::unique_ptr<IC::MutableNode> node(construct(GetParam()));
-    host.events.clear();
-    node.reset();
-    std::string const name = GetParam();
-    EXPECT_EQ(host.events, (Lines{"log: " + name + "::~" + name + ": entry", "~MutableNode()"}));
-}
-
-TEST_P(NodeClasses, LogUnderTheFramesCategoryAndFile)
-{
-    host.logCalls.clear();
-    std::unique_ptr<IC::MutableNode>(construct(GetParam())).reset();
-    ASSERT_EQ(host.logCalls.size(), 4U);
-    for (LogCall const& call : host.logCalls) {
-        EXPECT_EQ(call.file, "OsSwMI");
-        EXPECT_EQ(call.category, "Veltrix.IC.MI.OsSwMI");
-        EXPECT_EQ(call.level, 3000);
-    }
-}
-
-INSTANTIATE_TEST_SUITE_P(All, NodeClasses,
-                         testing::Values("OsNode", "UserNode", "GroupNode", "LogEntryNode"),
-                         [](auto const& name) { return std::string(name.param); });
-
-struct Operation {
-    char const* className;
-    char const* says; // the beginning of its two messages
-};
-
-void PrintTo(Operation const& operation, std::ostream* out)
-{
-    *out << operation.says;
 }
 
 // No class handles this id: it is only stored and read back.
 constexpr unsigned int plainProperty = 4711;
 
-class Reads : public Loaded, public testing::WithParamInterface<Operation>
+TEST_F(NodeClasses, LogEntryAndExitAroundTheFrameworksReadAndStore)
 {
-};
+    struct {
+        char const* name;
+        std::string read;  // the beginning of the two messages of a read
+        std::string write; // and of a write
+    } const classes[] = {
+        {"OsNode", "OsNode::getProperty", "OsNode::setProperty"},
+        // Contract: a user node's read logs under its constructor's name.
+        {"UserNode", "UserNode::UserNode", "UserNode::setProperty"},
+        {"GroupNode", "GroupNode::getProperty", ""},
+        {"LogEntryNode", "LogEntryNode::getProperty", "LogEntryNode::setProperty"}};
+    for (auto const& [name, read, write] : classes) {
+        std::unique_ptr<IC::MutableNode> const node(construct(name));
+        host.events.clear();
+        IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
+        IC::Error const answer = node->getProperty(plainProperty, value);
+        EXPECT_EQ(static_cast<std::string>(answer), "status 1, not set");
+        EXPECT_EQ(host.events, (Lines{"log: " + read + ": entry", "log: " + read + ": exit"}));
 
-TEST_P(Reads, LogEntryAndExitAroundTheFrameworksRead)
-{
-    std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
-    host.events.clear();
-    IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
-    IC::Error const answer = node->getProperty(plainProperty, value);
-    EXPECT_EQ(static_cast<std::string>(answer), "status 1, not set");
-    std::string const says = GetParam().says;
-    EXPECT_EQ(host.events, (Lines{"log: " + says + ": entry", "log: " + says + ": exit"}));
-}
-
-// Contract: a user node's read logs under its constructor's name.
-INSTANTIATE_TEST_SUITE_P(All, Reads,
-                         testing::Values(Operation{"OsNode", "OsNode::getProperty"},
-                                         Operation{"UserNode", "UserNode::UserNode"},
-                                         Operation{"GroupNode", "GroupNode::getProperty"},
-                                         Operation{"LogEntryNode", "LogEntryNode::getProperty"}),
-                         [](auto const& operation) {
-                             return std::string(operation.param.className);
-                         });
-
-class Writes : public Loaded, public testing::WithParamInterface<Operation>
-{
-};
-
-TEST_P(Writes, LogEntryAndExitAroundTheFrameworksStore)
-{
-    std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
-    host.events.clear();
-    IC::PropertyValue const value("x", true);
-    EXPECT_EQ(node->setProperty(plainProperty, value).getStatus(), 0);
-    std::string const says = GetParam().says;
-    std::string const stores = "setProperty(4711, text x true)";
-    EXPECT_EQ(host.events, (Lines{"log: " + says + ": entry", stores, "log: " + says + ": exit"}));
-    EXPECT_EQ(text(*node, plainProperty), "x");
-}
-
-TEST_P(Writes, ReturnTheFrameworksStatus)
-{
-    std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
-    host.setterStatus = 7;
-    IC::PropertyValue const value("x", true);
-    EXPECT_EQ(node->setProperty(plainProperty, value).getStatus(), 7);
-}
-
-INSTANTIATE_TEST_SUITE_P(All, Writes,
-                         testing::Values(Operation{"OsNode", "OsNode::setProperty"},
-                                         Operation{"UserNode", "UserNode::setProperty"},
-                                         Operation{"LogEntryNode", "LogEntryNode::setProperty"}),
-                         [](auto const& operation) {
-                             return std::string(operation.param.className);
-                         });
-
-/** A property that a class reads itself, and the status that it makes. */
-struct OwnAnswer {
-    char const* name;
-    char const* className;
-    unsigned int id;
-    char const* status;
-};
-
-void PrintTo(OwnAnswer const& answer, std::ostream* out)
-{
-    *out << answer.name;
-}
-
-class OwnReads : public Loaded, public testing::WithParamInterface<OwnAnswer>
-{
-};
-
-TEST_P(OwnReads, MakeOneStatusWithoutTheFramework)
-{
-    std::unique_ptr<IC::MutableNode> const node(construct(GetParam().className));
-    host.errors.clear();
-    IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
-    node->getProperty(GetParam().id, value);
-    EXPECT_EQ(host.errors, Lines{GetParam().status});
+        constexpr unsigned char statuses[] = {0, 7};
+        for (unsigned char const status : statuses) {
+            host.events.clear();
+            host.setterStatus = status;
+            EXPECT_EQ(node->setProperty(plainProperty, {"x", true}).getStatus(), status);
+            Lines expected{"setProperty(4711, text x true)"};
+            if (!write.empty())
+                expected = {"log: " + write + ": entry", expected[0], "log: " + write + ": exit"};
+            EXPECT_EQ(host.events, expected);
+        }
+        EXPECT_EQ(text(*node, plainProperty), "x");
+    }
 }
 
 constexpr char const* success = "Error(0, empty 0, \"\")";
 constexpr char const* countSuccess = "Error(0, unsigned 0, \"\")";
 constexpr char const* failure = "Error(1, empty 0, \"\")";
 
-// The log cannot be counted here, and the index of the entry's node is 16.
-INSTANTIATE_TEST_SUITE_P(All, OwnReads,
-                         testing::Values(OwnAnswer{"ProcessCount", "OsNode", 144, success},
-                                         OwnAnswer{"ClearCommand", "OsNode", 191, success},
-                                         OwnAnswer{"UserCount", "UserNode", 51, countSuccess},
-                                         OwnAnswer{"GroupCount", "GroupNode", 51, countSuccess},
-                                         OwnAnswer{"LogIndex", "LogEntryNode", 89, success},
-                                         OwnAnswer{"LogMessage", "LogEntryNode", 81, failure},
-                                         OwnAnswer{"LogTime", "LogEntryNode", 79, failure}),
-                         [](auto const& answer) { return std::string(answer.param.name); });
+TEST_F(NodeClasses, MakeOneStatusForAPropertyThatTheyReadThemselves)
+{
+    // The log cannot be counted here, and the index of the entry's node is 16.
+    struct {
+        char const* name;
+        unsigned int id;
+        char const* status;
+    } const reads[] = {{"OsNode", 144, success},       {"OsNode", 191, success},
+                       {"UserNode", 51, countSuccess}, {"GroupNode", 51, countSuccess},
+                       {"LogEntryNode", 89, success},  {"LogEntryNode", 81, failure},
+                       {"LogEntryNode", 79, failure}};
+    for (auto const& [name, id, status] : reads) {
+        std::unique_ptr<IC::MutableNode> const node(construct(name));
+        host.errors.clear();
+        IC::PropertyValue value(IC::PropertyValue::EmptyKind, true);
+        node->getProperty(id, value);
+        EXPECT_EQ(host.errors, Lines{status}) << name << ' ' << id;
+    }
+}
 
 class CommandWrites : public Loaded
 {
@@ -195,23 +126,7 @@ TEST_F(CommandWrites, TakeNoLockIfNothingIsRebuilt)
         EXPECT_EQ(event.find("lock("), std::string::npos) << event;
 }
 
-class GroupNodeWrites : public Loaded
-{
-};
-
-TEST_F(GroupNodeWrites, OnlyStoreTheValueAndLogNothing)
-{
-    std::unique_ptr<IC::MutableNode> const node(construct("GroupNode"));
-    host.events.clear();
-    node->setProperty(plainProperty, IC::PropertyValue("x", true));
-    EXPECT_EQ(host.events, Lines{"setProperty(4711, text x true)"});
-}
-
-class UserCommandWrites : public Loaded
-{
-};
-
-TEST_F(UserCommandWrites, ReturnTheStoresStatusIfTheActionFails)
+TEST_F(CommandWrites, OfAUserReturnTheStoresStatusIfTheActionFails)
 {
     std::filesystem::current_path("/proc"); // "usrandpwd" cannot be created there
     std::unique_ptr<IC::MutableNode> const user(construct("UserNode"));
@@ -229,11 +144,7 @@ TEST_F(UserCommandWrites, ReturnTheStoresStatusIfTheActionFails)
     std::filesystem::current_path("/");
 }
 
-class LogEntryReads : public Loaded
-{
-};
-
-TEST_F(LogEntryReads, MakeOneSuccessStatusAndTakeNoLock)
+TEST_F(NodeClasses, MakeOneSuccessStatusForALogEntryAndTakeNoLock)
 {
     commands.answers = systemLog::answers(systemLog::messages(16));
     std::unique_ptr<IC::MutableNode> const node(construct("LogEntryNode")); // its index is 16

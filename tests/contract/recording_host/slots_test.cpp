@@ -6,6 +6,7 @@
 #include <dlfcn.h>
 #include <link.h>
 #include <memory>
+#include <utility>
 
 namespace slots_test
 {
@@ -98,50 +99,26 @@ class Slots : public Loaded
 {
 };
 
-TEST_F(Slots, OfAnInterfaceAreInOrder)
+TEST_F(Slots, AreInOrderAndOfThePluginDifferInWhatItOverrides)
 {
     IC::ManagementInterface const interface;
     EXPECT_EQ(slotsOf(&interface), interfaceSlots);
-}
-
-TEST_F(Slots, OfThePluginDifferInWhatItOverrides)
-{
+    IC::MutableNode const node(1, 0, {1}, 39, 0);
+    EXPECT_EQ(slotsOf(&node), nodeSlots);
     EXPECT_EQ(slotsOf(&plugin.interface()), overridden(interfaceSlots, "ManagementInterface",
                                                        "OsSwMI", {"initialize", "unload"}));
 }
 
-TEST_F(Slots, OfANodeAreInOrder)
+TEST_F(Slots, OfANodeClassDifferInWhatItOverrides)
 {
-    IC::MutableNode const node(1, 0, {1}, 39, 0);
-    EXPECT_EQ(slotsOf(&node), nodeSlots);
+    Lines const both{"getProperty", "setProperty"};
+    for (auto const& [name, overrides] : {std::pair{"OsNode", both},
+                                          {"UserNode", both},
+                                          {"GroupNode", Lines{"getProperty"}},
+                                          {"LogEntryNode", both}}) {
+        std::unique_ptr<IC::MutableNode> const node(construct(name));
+        EXPECT_EQ(slotsOf(node.get()), overridden(nodeSlots, "MutableNode", name, overrides));
+    }
 }
-
-struct NodeClass {
-    char const* name;
-    Lines overrides;
-};
-
-void PrintTo(NodeClass const& nodeClass, std::ostream* out)
-{
-    *out << nodeClass.name;
-}
-
-class NodeSlots : public Loaded, public testing::WithParamInterface<NodeClass>
-{
-};
-
-TEST_P(NodeSlots, DifferInWhatTheClassOverrides)
-{
-    std::unique_ptr<IC::MutableNode> const node(construct(GetParam().name));
-    EXPECT_EQ(slotsOf(node.get()),
-              overridden(nodeSlots, "MutableNode", GetParam().name, GetParam().overrides));
-}
-
-INSTANTIATE_TEST_SUITE_P(Classes, NodeSlots,
-                         testing::Values(NodeClass{"OsNode", {"getProperty", "setProperty"}},
-                                         NodeClass{"UserNode", {"getProperty", "setProperty"}},
-                                         NodeClass{"GroupNode", {"getProperty"}},
-                                         NodeClass{"LogEntryNode", {"getProperty", "setProperty"}}),
-                         [](auto const& nodeClass) { return std::string(nodeClass.param.name); });
 
 } // namespace slots_test

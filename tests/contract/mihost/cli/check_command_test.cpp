@@ -21,7 +21,8 @@ using Names = std::set<std::string>;
 /** Checks a plug-in on a fixture machine. */
 Outcome checkRun(std::string const& plugin, std::vector<std::string> const& options = {})
 {
-    std::vector<std::string> arguments = {"--overlay", MACHINES_DIR "/suse", "check", plugin};
+    std::vector<std::string> arguments = {"--overlay", MACHINES_DIR "/unitedlinux", "check",
+                                          plugin};
     arguments.insert(arguments.end(), options.begin(), options.end());
     return mihostRun(arguments);
 }
@@ -233,8 +234,8 @@ TEST_F(Check, StopsAGroupThatHangs)
 TEST_F(Check, PrintsTapForHarnesses)
 {
     setenv("BROKEN", "index", 1);
-    Outcome const outcome = mihostRun({"--overlay", MACHINES_DIR "/suse", "--plugin", BROKEN_PLUGIN,
-                                       "check", "--format", "tap", "--rounds", "1"});
+    Outcome const outcome = mihostRun({"--overlay", MACHINES_DIR "/unitedlinux", "--plugin",
+                                       BROKEN_PLUGIN, "check", "--format", "tap", "--rounds", "1"});
     EXPECT_EQ(outcome.code, 1);
     auto const lines = linesOf(outcome.out);
     ASSERT_GT(lines.size(), 2U);

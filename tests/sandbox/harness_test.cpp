@@ -1,7 +1,6 @@
 // The helpers that the other tests of this tier use.
 
 #include "host/Properties.h"
-#include "mihost/sandbox/Sandbox.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"

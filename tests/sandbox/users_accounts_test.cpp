@@ -183,19 +183,15 @@ TEST_F(RealAccounts, CountFrom1970IfThePasswordNeverExpires)
     EXPECT_EQ(machine::ran(), (Lines{"chage -l jdoe", "chage -I 18396 jdoe"}));
 }
 
-TEST_F(RealAccounts, AreNotDeletedBecauseUserdelReceivesTheUid)
+TEST_F(RealAccounts, AreDeletedOnlyIfTheUidIsTheName)
 {
+    machine::run("useradd --badname -u 4712 -m 4712");
     load();
     write(IC::property::deleteUser, {IC::Number(1U), true});
     EXPECT_EQ(machine::ran(), Lines{"userdel -r 4711"});
     EXPECT_FALSE(machine::entry("/etc/passwd", "jdoe").empty());
     EXPECT_TRUE(std::filesystem::exists("/home/jdoe"));
-}
-
-TEST_F(RealAccounts, AreDeletedWithTheirHomeIfTheUidIsTheName)
-{
-    machine::run("useradd --badname -u 4712 -m 4712");
-    load();
+    machine::forget();
     plugin.node(IC::nodeType::user, "4712")
         .setProperty(IC::property::deleteUser, {IC::Number(1U), true});
     EXPECT_EQ(machine::ran(), Lines{"userdel -r 4712"});

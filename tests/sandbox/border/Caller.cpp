@@ -3,7 +3,6 @@
 #include "tests/support/Sandbox.h"
 
 #include <csignal>
-#include <cstdlib>
 #include <sched.h>
 #include <sys/mount.h>
 #include <sys/stat.h>

@@ -4,7 +4,6 @@
 #include "tests/support/Lines.h"
 #include "tests/support/ScratchFolder.h"
 
-#include <algorithm>
 #include <csignal>
 #include <cstdio>
 #include <fcntl.h>

@@ -23,20 +23,17 @@ std::string inBash(std::string const& line)
     return outcome.out;
 }
 
-TEST(BashCompletion, OffersWords)
+TEST(BashCompletion, OffersWordsAndNothingForAnUnknownCommand)
 {
     EXPECT_EQ(inBash("mihost power "), "restart\nhalt\n");
     EXPECT_EQ(inBash("mihost power re"), "restart\n");
+    EXPECT_EQ(inBash("mihost nonsense "), "\n");
 }
 
-TEST(BashCompletion, WritesNoBlankAfterAnIncompleteWord)
+TEST(BashCompletion, AddsWhatTheLineLacks)
 {
     EXPECT_EQ(inBash("mihost get us"), "-o nospace\nuser:\n");
     EXPECT_EQ(inBash("mihost call UserDel U"), "-o nospace\nUserName=\n");
-}
-
-TEST(BashCompletion, OmitsThePartBeforeAColonOrEqualsSign)
-{
     EXPECT_EQ(inBash("mihost get user:roo"), "root\n");
     EXPECT_EQ(inBash("mihost call UserDel UserName=roo"), "root\n");
 }
@@ -45,11 +42,6 @@ TEST(BashCompletion, OffersFilesAndFolders)
 {
     EXPECT_EQ(inBash("mihost --trace /etc/login.d"), "-o filenames\n/etc/login.defs\n");
     EXPECT_EQ(inBash("mihost --overlay /etc/pam"), "-o filenames\n/etc/pam.d\n");
-}
-
-TEST(BashCompletion, OffersNothingForAnUnknownCommand)
-{
-    EXPECT_EQ(inBash("mihost nonsense "), "\n");
 }
 
 } // namespace completion_scripts_test

@@ -1,7 +1,6 @@
 // `mihost user NAME` and `mihost group NAME`, at a terminal and in a pipe.
 
 #include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/MihostJson.h"
 #include "tests/support/TerminalRun.h"
@@ -33,7 +32,7 @@ protected:
     }
 };
 
-TEST_F(AccountViews, ShowOneUserAsText)
+TEST_F(AccountViews, ShowOneUserAsTextAndAsJson)
 {
     Outcome const outcome = mihostRun({"user", "jdoe"});
     EXPECT_EQ(outcome.code, 0);
@@ -57,10 +56,6 @@ TEST_F(AccountViews, ShowOneUserAsText)
     EXPECT_TRUE(holds(outcome.out, " (10 days ago)\n"));
     EXPECT_TRUE(holds(outcome.out, " (in 12 days)\n"));
     EXPECT_FALSE(holds(outcome.out, "hash"));
-}
-
-TEST_F(AccountViews, ShowOneUserAsJson)
-{
     Json const user = mihostJson({"user", "jdoe"});
     EXPECT_EQ(user["uid"], 1000);
     EXPECT_EQ(user["primary-group"], (Json{{"name", "jdoe"}, {"gid", 1000}}));

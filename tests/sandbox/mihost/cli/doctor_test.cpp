@@ -186,14 +186,11 @@ TEST_F(Doctor, NamesTheCapabilityThatRootLacks)
     EXPECT_EQ(missing, Lines{"capability CAP_SYS_ADMIN: --sandbox and --overlay"});
 }
 
-TEST_F(Doctor, ReportsAMissingLocale)
+TEST_F(Doctor, ReportsAMissingLocaleAndMissingIdRanges)
 {
     unsetenv("LANG");
     expectMissing("locale in LANG", "LANG is not set", "language-edition and code-set of os");
-}
-
-TEST_F(Doctor, ReportsMissingIdRanges)
-{
+    setenv("LANG", "C.UTF-8", 1);
     machine::write("/etc/login.defs", "UID_MIN 1000\nUID_MAX 60000\nGID_MIN 1000\n");
     expectMissing("id ranges in /etc/login.defs", "no line begins with GID_MAX and a number",
                   "ordinary users, ordinary groups");

@@ -7,8 +7,6 @@
 #include "tests/support/MihostJson.h"
 #include "tests/support/TerminalRun.h"
 
-#include <algorithm>
-#include <csignal>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
@@ -69,11 +67,18 @@ TEST_F(MihostLog, ShowsMessagesWithoutTheAsterisksOfThePlugin)
     EXPECT_TRUE(holds(outcome.out, "2026-06-03 03:00:00  box sshd[8]: third\n"));
 }
 
-TEST_F(MihostLog, ShowsOnlyTheNewestEntries)
+TEST_F(MihostLog, ShowsOnlyTheNewestOrMatchingEntries)
 {
     EXPECT_EQ(shown({"-n", "2"}), (Lines{"box sshd[8]: third", ": line"}));
     EXPECT_EQ(shown({"--lines=100"}).size(), 4U);
     EXPECT_EQ(shown({"-n", "0"}), Lines());
+    EXPECT_EQ(shown({"--grep", "sshd\\[[0-9]\\]"}),
+              (Lines{"box sshd[8]: third", "box sshd[7]: second"}));
+    EXPECT_EQ(shown({"--grep", "second|first", "-n", "1"}), Lines{"box sshd[7]: second"});
+    EXPECT_EQ(shown({"--grep", "\\*"}), Lines()); // asterisks are not part of a message
+    Json const nodes = mihostJson({"list", "log", "--grep", "third"});
+    ASSERT_EQ(nodes.size(), 1U);
+    EXPECT_EQ(nodes[0]["properties"]["message"]["value"], "*box sshd[8]: third*");
 }
 
 TEST_F(MihostLog, ShowsOnlyEntriesOfAPeriod)
@@ -85,21 +90,6 @@ TEST_F(MihostLog, ShowsOnlyEntriesOfAPeriod)
               (Lines{"box sshd[7]: second", "box su: first"}));
     EXPECT_EQ(shown({"--since", "2026-06-02", "--until", "2026-06-03"}),
               Lines{"box sshd[7]: second"});
-}
-
-TEST_F(MihostLog, ShowsOnlyMatchingEntriesAndCountsThem)
-{
-    EXPECT_EQ(shown({"--grep", "sshd\\[[0-9]\\]"}),
-              (Lines{"box sshd[8]: third", "box sshd[7]: second"}));
-    EXPECT_EQ(shown({"--grep", "second|first", "-n", "1"}), Lines{"box sshd[7]: second"});
-    EXPECT_EQ(shown({"--grep", "\\*"}), Lines()); // asterisks are not part of a message
-}
-
-TEST_F(MihostLog, PrintsTheChosenNodesAsJsonUnchanged)
-{
-    Json const nodes = mihostJson({"list", "log", "--grep", "third"});
-    ASSERT_EQ(nodes.size(), 1U);
-    EXPECT_EQ(nodes[0]["properties"]["message"]["value"], "*box sshd[8]: third*");
 }
 
 TEST_F(MihostLog, RefusesWrongValuesAndItsOptionsForOtherLists)

@@ -8,7 +8,6 @@
 #include "tests/support/Program.h"
 #include "tests/support/TerminalRun.h"
 
-#include <csignal>
 #include <cstdlib>
 #include <filesystem>
 #include <gtest/gtest.h>

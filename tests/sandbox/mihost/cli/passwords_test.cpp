@@ -7,7 +7,6 @@
 #include "tests/support/Program.h"
 
 #include <algorithm>
-#include <cstdlib>
 #include <gtest/gtest.h>
 
 namespace passwords_test

@@ -1,6 +1,5 @@
 // The directory that mihost works in may hold a password hash, so nothing of it may stay.
 
-#include "TestPaths.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

@@ -1,6 +1,5 @@
 // mihost with other programs: on either side of a pipe, and as a source of JSON.
 
-#include "TestPaths.h"
 #include "tests/support/Holds.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"

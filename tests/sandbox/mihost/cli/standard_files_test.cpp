@@ -1,6 +1,5 @@
 // mihost started without some standard streams: files that it opens must not take their places.
 
-#include "TestPaths.h"
 #include "tests/support/Holds.h"
 #include "tests/support/Lines.h"
 #include "tests/support/Machine.h"

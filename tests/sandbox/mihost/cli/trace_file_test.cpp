@@ -6,7 +6,6 @@
 #include "tests/support/Program.h"
 
 #include <fcntl.h>
-#include <filesystem>
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 #include <unistd.h>

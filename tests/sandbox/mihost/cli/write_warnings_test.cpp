@@ -5,7 +5,6 @@
 #include "tests/support/Machine.h"
 #include "tests/support/Program.h"
 
-#include <cstdlib>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 

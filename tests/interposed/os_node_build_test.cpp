@@ -210,13 +210,9 @@ TEST_F(OsNodeBuild, LogsEachTimeInLocalTimeRightAfterItIsStored)
                      "OsNode::setProperty: exit", "InstallDate = Thu Jan  1 00:59:59 2009\n",
                      "createOsNodes: exit"}));
     EXPECT_EQ(stored(141), "date 1273659825 true");
-    for (LogRecord const& record : log.records()) {
-        EXPECT_EQ(record.category, "Veltrix.IC.MI.OsSwMI");
-        EXPECT_EQ(record.file, "OsSwMI");
-        if (record.text.find(" = ") != std::string::npos) {
-            EXPECT_EQ(record.function, "createOsNodes");
-        }
-    }
+    std::string const unit = " OsSwMI Veltrix.IC.MI.OsSwMI";
+    EXPECT_EQ(log.sources(), (Lines{"OsNode" + unit, "createOsNodes" + unit, "getProperty" + unit,
+                                    "setProperty" + unit}));
 }
 
 /** Records messages in order with the lives of the fact readers. */

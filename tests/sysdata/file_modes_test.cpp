@@ -76,15 +76,15 @@ TEST_F(FileModes, OfReleaseFilesAreR)
     };
     Opened const searched = {"/etc/SuSE-release|r", "/etc/UnitedLinux-release|r",
                              "/etc/redhat-release|r", "/etc/release|r", "/etc/vmware-release|r"};
+    char user[] = "jdoe";
+    auto const queryLock = [&user] { NQ::userInfo().findIsAcctDisabled(user); };
     EXPECT_EQ(openedBy(search), searched);
+    EXPECT_EQ(openedBy(queryLock), (Opened{"/etc/SuSE-release|r", "/etc/UnitedLinux-release|r"}));
     for (char const* path : {"/etc/SuSE-release", "/etc/UnitedLinux-release", "/etc/redhat-release",
                              "/etc/vmware-release"})
         files_.write(path, "");
     EXPECT_EQ(openedBy(search),
               (Opened{"/etc/release|r", "/etc/SuSE-release|r", "/etc/UnitedLinux-release|r"}));
-    char user[] = "jdoe";
-    EXPECT_EQ(openedBy([&user] { NQ::userInfo().findIsAcctDisabled(user); }),
-              Opened{"/etc/SuSE-release|r"});
 }
 
 TEST_F(FileModes, OfTheProbesOfMethodsAreR)

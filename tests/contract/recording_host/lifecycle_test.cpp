@@ -473,6 +473,17 @@ TEST_F(Library, KeepsTheIdRangesOnTheHeapAndReadsThemAgain)
     EXPECT_EQ(bounds, (std::vector<Ids>{redhat, redhat, {1000, 1000, 60000, 60000}}));
 }
 
+TEST_F(Lifecycle, SetsTheFlagOnlyWhileAUserNodeIsSetUp)
+{
+    bool const& flag = object<bool>("IC::OSSWMI::MI_call");
+    host.onNode = [&flag] { EXPECT_FALSE(flag); };
+    host.onSetStatus = [&flag](IC::MutableNode const& node) {
+        EXPECT_EQ(flag, node.getNodeType() == IC::nodeType::user) << node.getNodeType();
+    };
+    plugin.initialize();
+    EXPECT_GE(plugin.nodes(IC::nodeType::user).size(), 2U);
+}
+
 TEST_F(Lifecycle, HoldsTheLockThroughoutABuildAndARebuild)
 {
     struct {

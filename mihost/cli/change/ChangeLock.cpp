@@ -25,8 +25,8 @@ constexpr milliseconds pollInterval{50};
 Failure cannotLock(std::string const& file, int problem)
 {
     bool const isDenied = problem == EACCES || problem == EPERM;
-    return {PluginRefused, fmt::format("cannot lock {}: {}{}", file, std::strerror(problem),
-                                       isDenied ? " (changes need root)" : "")};
+    return {Failed, fmt::format("cannot lock {}: {}{}", file, std::strerror(problem),
+                                isDenied ? " (changes need root)" : "")};
 }
 
 /** @return whether the lock was taken; not if another process holds it */
@@ -56,7 +56,7 @@ ChangeLock::ChangeLock(std::string const& file, Patience patience)
         auto const now = steady_clock::now();
         if (now >= limit)
             throw Failure(
-                PluginRefused,
+                Failed,
                 fmt::format("waiting for the change lock: another mihost still holds it (try "
                             "again, or raise --lock-timeout; 'fuser {}' shows the "
                             "process)",

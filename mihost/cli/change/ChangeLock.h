@@ -24,7 +24,7 @@ public:
     /**
      * Waits until no other process holds the lock.
      *
-     * @throws Failure (PluginRefused) if the file cannot be opened or the limit is reached
+     * @throws Failure (Failed) if the file cannot be opened or the limit is reached
      */
     ChangeLock(std::string const& file, Patience patience);
 

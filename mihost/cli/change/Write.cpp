@@ -242,7 +242,7 @@ void carryOut(Session& session, Write const& write)
     for (std::size_t at = write.warnings.size(); at < report.warnings.size(); ++at)
         warn(report.warnings[at]);
     if (!report.error.empty())
-        throw Failure(PluginRefused, fmt::format("{}: {}", write.what, report.error));
+        throw Failure(Failed, fmt::format("{}: {}", write.what, report.error));
     bool const isUnchanged = write.acts && !report.changed && !write.expectations.empty();
     if (isUnchanged && !session.out().takesDocuments())
         tellUnchanged(write);

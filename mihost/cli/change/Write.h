@@ -29,7 +29,7 @@ struct Write {
  *
  * A write of the present state succeeds and reports that nothing changed.
  *
- * @throws Failure (PluginRefused) if the plug-in or a command refuses, or the change had no effect
+ * @throws Failure (Failed) if the plug-in or a command refuses, or the change had no effect
  */
 void carryOut(Session& session, Write const& write);
 

@@ -36,7 +36,7 @@ std::string shown(std::string const& line)
 Json toJson(WriteReport const& report)
 {
     Json document;
-    document["status"] = report.error.empty() ? static_cast<int>(Done) : PluginRefused;
+    document["status"] = report.error.empty() ? static_cast<int>(Done) : Failed;
     document["changed"] = report.changed;
     document["changes"] = listToJson(report.changes);
     document["warnings"] = listToJson(report.warnings);

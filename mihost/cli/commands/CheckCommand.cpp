@@ -56,7 +56,7 @@ public:
         write(results, session);
         if (std::any_of(results.begin(), results.end(),
                         [](checks::Result const& result) { return result.failed(); }))
-            session.endWith(PluginRefused);
+            session.endWith(Failed);
     }
 
 private:

@@ -107,7 +107,7 @@ public:
             return !isMet(need) && !isBeyondFixing(need);
         });
         if (isFixable)
-            session.endWith(PluginRefused);
+            session.endWith(Failed);
     }
 };
 

@@ -164,8 +164,7 @@ void LogOptions::follow(Session& session) const
         while (waitForNextRound(session.out(), signals, interval))
             printThose(log.newLines());
     } catch (std::system_error const& error) {
-        throw Failure(PluginRefused,
-                      fmt::format("list log: {} (see 'mihost doctor')", error.what()));
+        throw Failure(Failed, fmt::format("list log: {} (see 'mihost doctor')", error.what()));
     }
 }
 

@@ -34,8 +34,8 @@ template <class Step> int guarded(Step step)
         tell(failure);
         return failure.code();
     } catch (std::exception const& error) { // no memory or no descriptor is left
-        tell({PluginRefused, error.what()});
-        return PluginRefused;
+        tell({Failed, error.what()});
+        return Failed;
     }
 }
 

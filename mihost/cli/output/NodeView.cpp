@@ -97,7 +97,7 @@ NodeView liveView(IC::MutableNode const& node, std::vector<std::string> const& n
         IC::PropertyValue value = emptyValue();
         IC::Error const error = node.getProperty(id, value);
         if (error.getStatus() != 0)
-            throw Failure(PluginRefused,
+            throw Failure(Failed,
                           fmt::format("property '{}' of node '{}': {} (see 'mihost doctor')", name,
                                       addressOf(node), static_cast<std::string>(error)));
         result.properties.push_back(view(kind, id, value, secrets, gap));

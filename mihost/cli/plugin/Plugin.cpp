@@ -85,8 +85,8 @@ void Plugin::start()
     IC::Error const error = interface_->initialize(ownMiId, IC::Number(0U), IC::Number(0U));
     started_ = true;
     if (error.getStatus() != 0)
-        throw Failure(PluginRefused, fmt::format("the plug-in did not start: {}",
-                                                 static_cast<std::string>(error)));
+        throw Failure(
+            Failed, fmt::format("the plug-in did not start: {}", static_cast<std::string>(error)));
 }
 
 std::string Plugin::path() const

@@ -9,11 +9,10 @@ namespace mihost
 
 enum ExitCode {
     Done = 0,
-    PluginRefused = 1, // the plug-in answered with a non-zero status; the doctor misses something
-    BadUsage =
-        2, // wrong usage, refused input, or a sandbox, trace or output file that cannot be opened
-    NoPlugin = 3, // the plug-in cannot be loaded, or has no folder to run in
-    NotFound = 4  // no such node or property
+    Failed = 1,   // the read, the change or a check
+    BadUsage = 2, // also refused input, and a sandbox, trace or output file that cannot be opened
+    NoPlugin = 3, // it cannot be loaded, or has no directory to run in
+    NotFound = 4  // no such node, property, account or group
 };
 
 /** Ends a command: the reason on one line, and the exit code of the program. */

@@ -31,7 +31,7 @@ protected:
         try {
             ChangeLock const lock(file, none);
         } catch (Failure const& failure) {
-            EXPECT_EQ(failure.code(), mihost::PluginRefused);
+            EXPECT_EQ(failure.code(), mihost::Failed);
             return failure.what();
         }
         return "locked";

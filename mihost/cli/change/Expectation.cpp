@@ -5,6 +5,7 @@
 #include "mihost/cli/change/PasswordHash.h"
 #include "mihost/cli/input/Day.h"
 #include "mihost/cli/input/Decimal.h"
+#include "mihost/cli/log/LogLine.h"
 
 #include <algorithm>
 #include <fmt/format.h>
@@ -182,8 +183,6 @@ std::string dayOfSum(std::string const& user, std::vector<std::size_t> const& fi
     return dayOfField(std::to_string(sum));
 }
 
-constexpr char logFile[] = "/var/log/messages";
-
 /** Distinguishes a log from the same log emptied, even if lines were added since. */
 struct LogState {
     off_t size;
@@ -195,10 +194,10 @@ std::optional<LogState> logState()
     constexpr std::size_t enough = 4096;
     struct stat status {
     };
-    if (stat(logFile, &status) != 0)
+    if (stat(systemLog, &status) != 0)
         return std::nullopt;
     LogState state{status.st_size, std::string(enough, '\0')};
-    std::ifstream file(logFile, std::ios::binary);
+    std::ifstream file(systemLog, std::ios::binary);
     file.read(state.start.data(), static_cast<std::streamsize>(enough));
     state.start.resize(static_cast<std::size_t>(std::max<std::streamsize>(file.gcount(), 0)));
     return state;

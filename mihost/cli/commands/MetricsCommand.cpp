@@ -1,4 +1,5 @@
 #include "mihost/cli/commands/CommandRows.h"
+#include "mihost/cli/log/LogLine.h"
 #include "mihost/cli/metrics/MachineMetrics.h"
 #include "mihost/cli/plugin/Session.h"
 #include "mihost/cli/system/ReplacedFile.h"
@@ -17,11 +18,9 @@ namespace mihost
 namespace
 {
 
-constexpr char logFile[] = "/var/log/messages";
-
 std::uint64_t linesOfLog()
 {
-    std::ifstream log(logFile, std::ios::binary);
+    std::ifstream log(systemLog, std::ios::binary);
     return static_cast<std::uint64_t>(
         std::count(std::istreambuf_iterator<char>(log), std::istreambuf_iterator<char>(), '\n'));
 }

@@ -1,5 +1,7 @@
 #include "mihost/cli/plugin/PhaseCounter.h"
 
+#include "mihost/cli/log/LogLine.h"
+
 #include <algorithm>
 #include <cstdlib>
 #include <fmt/format.h>
@@ -25,7 +27,6 @@ struct PhaseSteps {
 namespace
 {
 
-constexpr unsigned int mostLogEntries = 50;
 constexpr std::string_view moduleHeading = "buffer = Module "; // the first line of lsmod
 
 constexpr PhaseSteps countedPhases[] = {

@@ -6,19 +6,7 @@ namespace mihost
 namespace
 {
 
-struct File {
-    char const* path;
-    bool secret; // the password field of a line is a hash
-};
-
 constexpr std::size_t passwordField = 1; // the first being 0
-
-constexpr File files[] = {
-    {accountFile, false},
-    {shadowFile, true},
-    {groupFile, false},
-    {groupShadowFile, true},
-};
 
 std::vector<std::string> linesIn(AccountFiles const& all, char const* path)
 {
@@ -32,20 +20,19 @@ std::vector<FileChange> changesBetween(AccountFiles const& before, AccountFiles 
                                        Secrets secrets)
 {
     std::vector<FileChange> changes;
-    for (File const& file : files) {
-        auto const old = linesIn(before, file.path);
-        auto const now = linesIn(after, file.path);
+    for (char const* const path : {accountFile, shadowFile, groupFile, groupShadowFile}) {
+        auto const old = linesIn(before, path);
+        auto const now = linesIn(after, path);
         FileChange change;
-        change.file = file.path;
+        change.file = path;
         change.removed = missingIn(old, now);
         change.added = missingIn(now, old);
         if (change.removed.empty() && change.added.empty())
             continue;
-        if (file.secret && secrets == Secrets::Hide) {
+        if (secrets == Secrets::Hide)
             for (auto* const lines : {&change.removed, &change.added})
                 for (std::string& line : *lines)
                     hideHash(line, passwordField);
-        }
         changes.push_back(change);
     }
     return changes;

@@ -34,6 +34,16 @@ TEST(AccountFileChanges, HideHashesUnlessAskedForThem)
               Lines{"jdoe:$6$salt$hash:19000::::::"});
 }
 
+TEST(AccountFileChanges, HideHashesInEveryAccountFile)
+{
+    for (char const* file : {"/etc/passwd", "/etc/shadow", "/etc/group", "/etc/gshadow"}) {
+        AccountFiles const after = {{file, {"jdoe:$6$salt$hash:1000:100::/:/bin/sh"}}};
+        EXPECT_EQ(changesBetween({}, after, Secrets::Hide).at(0).added,
+                  Lines{"jdoe:(hidden):1000:100::/:/bin/sh"})
+            << file;
+    }
+}
+
 TEST(AccountFileChanges, HideHashesOfBrokenLines)
 {
     AccountFiles const after = {{"/etc/shadow", {"jdoe:secret", "noColonAtAll"}}};

@@ -26,6 +26,7 @@ struct Act {
     char const* tool = "";               // as in Write
     Expect* expectations = nullptr;      // none for what cannot be checked
     char const* warning = "";            // "" for none; {} is the account's name
+    char const* danger = "";             // to be confirmed; as the warning
 
     Act of(unsigned int only) const
     {
@@ -46,6 +47,10 @@ struct Act {
     Act warns(char const* text) const
     {
         return with(&Act::warning, text);
+    }
+    Act asks(char const* text) const
+    {
+        return with(&Act::danger, text);
     }
 
 private:
@@ -143,14 +148,19 @@ std::vector<Act> const& acts()
     namespace command = IC::command;
     namespace property = IC::property;
     static std::vector<Act> const all{
-        onOs(property::requestedState, command::restart).by(shutdownTool),
-        onOs(property::requestedState, command::halt).by(shutdownTool),
+        onOs(property::requestedState, command::restart)
+            .by(shutdownTool)
+            .asks("restart the machine"),
+        onOs(property::requestedState, command::halt).by(shutdownTool).asks("halt the machine"),
         onOs(property::refresh, command::rebuild).onTree().expects(completeLists),
-        onOs(property::clearLog, command::emptyLog).expects(emptyLog),
+        onOs(property::clearLog, command::emptyLog).expects(emptyLog).asks("empty the system log"),
         onUser(property::password).expects(hash),
         onUser(property::inactiveTime).expects(inactivity).warns(inactivityWarning),
         onUser(property::passwordExpiration).expects(expiry).warns(expirationWarning),
-        onUser(property::deleteUser).of(command::deleteAccount).expects(deletion),
+        onUser(property::deleteUser)
+            .of(command::deleteAccount)
+            .expects(deletion)
+            .asks("delete the account {} and its home directory"),
     };
     return all;
 }
@@ -233,6 +243,13 @@ Write propertyWrite(Session& session, IC::MutableNode& node, Property const& pro
     if (*act->warning)
         write.warnings.push_back(fmt::format(act->warning, userOf(node)));
     return write;
+}
+
+std::string dangerOf(IC::MutableNode const& node, unsigned int property,
+                     IC::PropertyValue const& value)
+{
+    Act const* const act = findAct(node, property, value);
+    return act ? fmt::format(act->danger, userOf(node)) : "";
 }
 
 Write osWrite(Session& session, IC::MutableNode& os, std::string const& what, unsigned int property,

@@ -13,8 +13,12 @@ namespace mihost
 Write propertyWrite(Session& session, IC::MutableNode& node, Property const& property,
                     IC::PropertyValue const& value);
 
+/** What must be confirmed before a property is written; empty for nothing. */
+std::string dangerOf(IC::MutableNode const& node, unsigned int property,
+                     IC::PropertyValue const& value);
+
 /**
- * The same for an acting property of the operating-system node.
+ * The same as propertyWrite for an acting property of the operating-system node.
  *
  * @param what  the command that the user gave, such as "power halt"
  */

@@ -32,6 +32,15 @@ std::string counted(std::size_t count, char const* one, char const* several)
     return fmt::format("{} {}", count, count == 1 ? one : several);
 }
 
+/** @param command  as typed, such as "power halt" */
+void clearAndCarryOut(Session& session, std::string const& command, unsigned int property,
+                      IC::PropertyValue const& value)
+{
+    IC::MutableNode& os = session.node("os");
+    ChangeLock const lock = clearChange(session, command, dangerOf(os, property, value));
+    carryOut(session, osWrite(session, os, command, property, value));
+}
+
 class Refresh : public Command
 {
 public:
@@ -57,10 +66,8 @@ public:
 
     void run(Session& session) override
     {
-        IC::MutableNode& os = session.node("os");
-        ChangeLock const lock = clearChange(session, "clear-log", "empty the system log");
-        carryOut(session, osWrite(session, os, "clear-log", IC::property::clearLog,
-                                  number(IC::command::emptyLog)));
+        clearAndCarryOut(session, "clear-log", IC::property::clearLog,
+                         number(IC::command::emptyLog));
         if (session.out().takesDocuments())
             return;
         session.out().line(
@@ -85,11 +92,8 @@ public:
     void run(Session& session) override
     {
         unsigned int const state = action_ == restart ? IC::command::restart : IC::command::halt;
-        IC::MutableNode& os = session.node("os");
-        std::string const command = "power " + action_;
-        ChangeLock const lock = clearChange(session, command, action_ + " the machine");
-        carryOut(session, osWrite(session, os, command, IC::property::requestedState,
-                                  IC::PropertyValue(IC::EnumValue(state), true)));
+        clearAndCarryOut(session, "power " + action_, IC::property::requestedState,
+                         IC::PropertyValue(IC::EnumValue(state), true));
     }
 
 private:

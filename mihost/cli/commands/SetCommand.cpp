@@ -16,25 +16,6 @@ namespace mihost
 namespace
 {
 
-/** A write that needs a prompt. */
-struct Danger {
-    unsigned int nodeType;
-    unsigned int property;
-    unsigned int value;
-    char const* what; // {} is the account's name
-};
-
-constexpr Danger dangers[] = {
-    {IC::nodeType::operatingSystem, IC::property::requestedState, IC::command::restart,
-     "restart the machine"},
-    {IC::nodeType::operatingSystem, IC::property::requestedState, IC::command::halt,
-     "halt the machine"},
-    {IC::nodeType::operatingSystem, IC::property::clearLog, IC::command::emptyLog,
-     "empty the system log"},
-    {IC::nodeType::user, IC::property::deleteUser, IC::command::deleteAccount,
-     "delete the account {} and its home directory"},
-};
-
 /** The call in a value, if it is one that the plug-in carries out rather than only stores. */
 std::optional<MethodCall> callIn(Property const& property, IC::PropertyValue const& value)
 {
@@ -44,16 +25,12 @@ std::optional<MethodCall> callIn(Property const& property, IC::PropertyValue con
     return takeApart(text);
 }
 
-std::string dangerOf(IC::MutableNode const& node, Property const& property,
-                     IC::PropertyValue const& value)
+std::string questionBefore(IC::MutableNode const& node, Property const& property,
+                           IC::PropertyValue const& value)
 {
     if (auto const call = callIn(property, value))
         return dangerOf(*call);
-    for (Danger const& danger : dangers)
-        if (danger.nodeType == node.getNodeType() && danger.property == property.id &&
-            danger.value == static_cast<unsigned int>(value))
-            return fmt::format(danger.what, storedText(node, IC::property::name));
-    return "";
+    return dangerOf(node, property.id, value);
 }
 
 /** Rebuilding nodes reads the machine only. */
@@ -69,7 +46,7 @@ void checkMachine(IC::MutableNode const& node, Property const& property,
         checkMembership(*call);
     bool const deletes = property.id == IC::property::deleteUser;
     if (node.getNodeType() == IC::nodeType::user &&
-        (!deletes || static_cast<unsigned int>(value) == 1))
+        (!deletes || static_cast<unsigned int>(value) == IC::command::deleteAccount))
         checkUserWrite(node, deletes ? UserWrite::Delete : UserWrite::Change);
 }
 
@@ -115,7 +92,7 @@ public:
         std::optional<ChangeLock> lock;
         if (changesMachine(*property))
             lock = clearChange(session, fmt::format("set {}", property->name),
-                               dangerOf(node, *property, value),
+                               questionBefore(node, *property, value),
                                [&] { checkMachine(node, *property, value); });
         carryOut(session, writeOf(session, node, *property, value));
     }

@@ -2,7 +2,7 @@
 
 #include "mihost/cli/system/TextFile.h"
 
-#include <charconv>
+#include <algorithm>
 
 namespace mihost
 {
@@ -36,14 +36,6 @@ Record recordIn(std::vector<std::string> const& lines, std::string const& name)
 Record recordOf(std::string const& file, std::string const& name)
 {
     return recordIn(linesOf(contentOf(file)), name);
-}
-
-std::optional<unsigned int> idOf(std::string const& field)
-{
-    unsigned int id = 0;
-    char const* const end = field.data() + field.size();
-    auto const [rest, problem] = std::from_chars(field.data(), end, id);
-    return problem == std::errc() && rest == end ? std::optional(id) : std::nullopt;
 }
 
 AccountFiles readAccountFiles()

@@ -2,7 +2,6 @@
 #define MIHOST_CLI_ACCOUNTS_ACCOUNTFILES_H
 
 #include <map>
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -42,9 +41,6 @@ Record recordOf(std::string const& file, std::string const& name);
 
 /** The pieces between separators, empty ones included. */
 std::vector<std::string> fieldsOf(std::string const& line, char separator);
-
-/** A field that is an id; nothing for anything else. */
-std::optional<unsigned int> idOf(std::string const& field);
 
 /** The lines of the files that hold the accounts, by path. Files that cannot be read are empty. */
 using AccountFiles = std::map<std::string, std::vector<std::string>>;

@@ -1,5 +1,7 @@
 #include "mihost/cli/accounts/GroupDescription.h"
 
+#include "mihost/cli/input/Decimal.h"
+
 #include <algorithm>
 
 namespace mihost
@@ -13,7 +15,8 @@ std::vector<std::string> accountsOf(AccountData const& data, unsigned int group)
     std::vector<std::string> names;
     for (std::string const& line : data.files.at(accountFile)) {
         Record const account = fieldsOf(line, ':');
-        if (account.size() > accountField::Group && idOf(account[accountField::Group]) == group)
+        if (account.size() > accountField::Group &&
+            parseDecimal(account[accountField::Group]) == group)
             names.push_back(account[0]);
     }
     return names;
@@ -34,7 +37,7 @@ std::vector<GroupDescription::Member> membersIn(AccountData const& data, std::st
 std::optional<GroupDescription> describeGroup(AccountData const& data, std::string const& name)
 {
     Record const group = recordIn(data.files.at(groupFile), name);
-    auto const id = group.empty() ? std::nullopt : idOf(group[groupField::Id]);
+    auto const id = group.empty() ? std::nullopt : parseDecimal(group[groupField::Id]);
     if (!id)
         return std::nullopt;
     return GroupDescription{name, *id, accountsOf(data, *id),

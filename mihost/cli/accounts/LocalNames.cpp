@@ -4,6 +4,7 @@
 #include "host/Properties.h"
 #include "mihost/cli/accounts/AccountFiles.h"
 #include "mihost/cli/accounts/LoginDefs.h"
+#include "mihost/cli/input/Decimal.h"
 #include "mihost/cli/system/TextFile.h"
 
 namespace mihost
@@ -18,7 +19,7 @@ std::vector<std::string> accounts(char const* path, IdRange const& range)
     std::vector<std::string> names;
     for (std::string const& line : linesOf(contentOf(path))) {
         Record const record = fieldsOf(line, ':');
-        auto const id = record.size() > 2 ? idOf(record[2]) : std::nullopt;
+        auto const id = record.size() > 2 ? parseDecimal(record[2]) : std::nullopt;
         if (id && range.holds(*id))
             names.push_back(record[0]);
     }

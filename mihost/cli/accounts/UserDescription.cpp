@@ -1,7 +1,8 @@
 #include "mihost/cli/accounts/UserDescription.h"
 
+#include "mihost/cli/input/Decimal.h"
+
 #include <algorithm>
-#include <charconv>
 #include <cstdlib>
 #include <fmt/format.h>
 
@@ -17,10 +18,8 @@ constexpr long neverExpires = 10000;
 /** Nothing for an empty field, -1 and texts that are not numbers. */
 std::optional<long> daysOf(std::string const& field)
 {
-    long days = 0;
-    char const* const end = field.data() + field.size();
-    auto const [rest, problem] = std::from_chars(field.data(), end, days);
-    return problem == std::errc() && rest == end && days >= 0 ? std::optional(days) : std::nullopt;
+    auto const days = parseDecimal(field);
+    return days ? std::optional<long>(*days) : std::nullopt;
 }
 
 std::optional<long> sum(std::optional<long> first, std::optional<long> second)
@@ -68,7 +67,7 @@ NamedGroup groupOfId(AccountData const& data, unsigned int id)
 {
     for (std::string const& line : data.files.at(groupFile)) {
         Record const group = fieldsOf(line, ':');
-        if (group.size() > groupField::Id && idOf(group[groupField::Id]) == id)
+        if (group.size() > groupField::Id && parseDecimal(group[groupField::Id]) == id)
             return {id, group[0]};
     }
     return {id, ""};
@@ -82,7 +81,7 @@ std::vector<NamedGroup> groupsThatList(AccountData const& data, std::string cons
         if (group.size() <= groupField::Members)
             continue;
         auto const members = fieldsOf(group[groupField::Members], ',');
-        auto const id = idOf(group[groupField::Id]);
+        auto const id = parseDecimal(group[groupField::Id]);
         if (id && std::find(members.begin(), members.end(), name) != members.end())
             groups.push_back({*id, group[0]});
     }
@@ -130,8 +129,8 @@ std::optional<UserDescription> describeUser(AccountData const& data, std::string
     Record const account = recordIn(data.files.at(accountFile), name);
     if (account.empty())
         return std::nullopt;
-    auto const id = idOf(account[accountField::Id]);
-    auto const group = idOf(account[accountField::Group]);
+    auto const id = parseDecimal(account[accountField::Id]);
+    auto const group = parseDecimal(account[accountField::Group]);
     if (!id || !group)
         return std::nullopt;
     UserDescription user{};

@@ -17,14 +17,6 @@ AccountData readAccountData()
     return {readAccountFiles(), readLoginDefs(), contentOf("/etc/pam.d/login"), problem};
 }
 
-std::vector<std::string> namesIn(AccountData const& data, std::string const& file)
-{
-    std::vector<std::string> names;
-    for (std::string const& line : data.files.at(file))
-        names.push_back(line.substr(0, line.find(':')));
-    return names;
-}
-
 long allowedLoginFailures(std::string const& loginRules)
 {
     constexpr char key[] = "deny=";

@@ -5,7 +5,6 @@
 #include "mihost/cli/accounts/LoginDefs.h"
 
 #include <string>
-#include <vector>
 
 namespace mihost
 {
@@ -19,9 +18,6 @@ struct AccountData {
 };
 
 AccountData readAccountData();
-
-/** The first field of each record of a file. */
-std::vector<std::string> namesIn(AccountData const& data, std::string const& file);
 
 /** The login failures that the rules allow, by the last "deny=" with a number; 0 for any. */
 long allowedLoginFailures(std::string const& loginRules);

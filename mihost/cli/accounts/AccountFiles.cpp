@@ -38,6 +38,14 @@ Record recordOf(std::string const& file, std::string const& name)
     return recordIn(linesOf(contentOf(file)), name);
 }
 
+std::vector<std::string> recordNames(std::vector<std::string> const& lines)
+{
+    std::vector<std::string> names;
+    for (std::string const& line : lines)
+        names.push_back(line.substr(0, line.find(':')));
+    return names;
+}
+
 AccountFiles readAccountFiles()
 {
     AccountFiles all;

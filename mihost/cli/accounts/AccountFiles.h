@@ -39,6 +39,9 @@ Record recordIn(std::vector<std::string> const& lines, std::string const& name);
 /** The record of this name as the file has it now; empty if it has none or cannot be read. */
 Record recordOf(std::string const& file, std::string const& name);
 
+/** The first field of each record. */
+std::vector<std::string> recordNames(std::vector<std::string> const& lines);
+
 /** The pieces between separators, empty ones included. */
 std::vector<std::string> fieldsOf(std::string const& line, char separator);
 

@@ -24,7 +24,7 @@ std::vector<std::string> accountsOf(AccountData const& data, unsigned int group)
 
 std::vector<GroupDescription::Member> membersIn(AccountData const& data, std::string const& list)
 {
-    std::vector<std::string> const known = namesIn(data, accountFile);
+    std::vector<std::string> const known = recordNames(data.files.at(accountFile));
     std::vector<GroupDescription::Member> members;
     for (std::string const& name : fieldsOf(list, ','))
         if (!name.empty())

@@ -55,7 +55,7 @@ void showGroup(Session& session, std::string const& name)
     AccountData const data = readAccountData();
     auto const group = describeGroup(data, name);
     if (!group)
-        failForNoAccount("group", name, namesIn(data, groupFile));
+        failForNoAccount("group", name, recordNames(data.files.at(groupFile)));
     if (session.out().takesDocuments())
         session.out().json(documentOf(*group));
     else

@@ -45,20 +45,12 @@ Parameter const& parameterOf(Task const& task, TaskValue const& value)
     return *findParameter(*findMethod(task.method), value.parameter);
 }
 
-std::vector<std::string> namesIn(char const* file)
-{
-    std::vector<std::string> names;
-    for (std::string const& line : linesOf(contentOf(file)))
-        names.push_back(line.substr(0, line.find(':')));
-    return names;
-}
-
 /** @throws Failure (NotFound) for a name that is in no record */
 void checkThatItExists(TaskValue const& value, std::string const& name)
 {
     for (Existing const& each : existing)
         if (each.argument == value.name && recordOf(each.file, name).empty()) {
-            std::string const meant = nearest(name, namesIn(each.file));
+            std::string const meant = nearest(name, recordNames(linesOf(contentOf(each.file))));
             throw Failure(
                 NotFound,
                 fmt::format("no {} '{}'{}", each.noun, name,

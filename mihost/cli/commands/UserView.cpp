@@ -177,7 +177,7 @@ void showUser(Session& session, std::string const& name)
     AccountData const data = readAccountData();
     auto const user = describeUser(data, name);
     if (!user)
-        failForNoAccount("user", name, namesIn(data, accountFile));
+        failForNoAccount("user", name, recordNames(data.files.at(accountFile)));
     if (session.out().takesDocuments())
         session.out().json(documentOf(*user));
     else

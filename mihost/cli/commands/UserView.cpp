@@ -3,8 +3,8 @@
 #include "mihost/cli/accounts/UserDescription.h"
 #include "mihost/cli/commands/Facts.h"
 #include "mihost/cli/input/Day.h"
+#include "mihost/cli/output/UnknownValues.h"
 #include "mihost/cli/plugin/Session.h"
-#include "mihost/cli/system/Stderr.h"
 
 #include <ctime>
 #include <fmt/format.h>
@@ -182,11 +182,7 @@ void showUser(Session& session, std::string const& name)
         session.out().json(documentOf(*user));
     else
         writeFacts(factsOf(*user), session.out());
-    if (!user->unknown.empty())
-        warn(
-            fmt::format("reading passwords and ageing: {}, so some values are unknown (see 'mihost "
-                        "doctor')",
-                        user->unknown));
+    noteUnknown(user->unknown);
 }
 
 } // namespace mihost

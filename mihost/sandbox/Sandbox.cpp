@@ -5,6 +5,7 @@
 #include "mihost/sandbox/LayOver.h"
 #include "mihost/sandbox/MachineCopy.h"
 #include "mihost/sandbox/Network.h"
+#include "mihost/sandbox/Pipe.h"
 #include "mihost/sandbox/Power.h"
 #include "mihost/sandbox/Privileges.h"
 #include "mihost/sandbox/Relay.h"
@@ -12,7 +13,6 @@
 #include "mihost/sandbox/SystemCall.h"
 
 #include <cstdio>
-#include <fcntl.h>
 #include <poll.h>
 #include <sched.h>
 #include <sys/prctl.h>
@@ -30,19 +30,6 @@ constexpr char ready = 'r';
 constexpr char problem = 'p';
 
 bool inside = false;
-
-struct Pipe {
-    Pipe()
-    {
-        int ends[2];
-        check(pipe2(ends, O_CLOEXEC), "cannot create a pipe");
-        readEnd = Descriptor(ends[0]);
-        writeEnd = Descriptor(ends[1]);
-    }
-
-    Descriptor readEnd;
-    Descriptor writeEnd;
-};
 
 std::string readToEnd(Descriptor const& from)
 {

@@ -4,8 +4,7 @@
 #include "mihost/cli/output/Json.h"
 #include "mihost/cli/system/Failure.h"
 #include "mihost/runtime/Text.h"
-#include "mihost/sandbox/Descriptor.h"
-#include "mihost/sandbox/SystemCall.h"
+#include "mihost/sandbox/Pipe.h"
 
 #include <algorithm>
 #include <csignal>
@@ -36,19 +35,6 @@ constexpr char notesKey[] = "notes";
 constexpr char skippedKey[] = "skipped";
 constexpr char notLoadedKey[] = "not-loaded";
 constexpr char lastKey[] = "last"; // the plug-in's state is unusable
-
-struct Pipe {
-    Pipe()
-    {
-        int ends[2];
-        mihost::check(pipe2(ends, O_CLOEXEC), "cannot create a pipe");
-        readEnd = Descriptor(ends[0]);
-        writeEnd = Descriptor(ends[1]);
-    }
-
-    Descriptor readEnd;
-    Descriptor writeEnd;
-};
 
 // --- In the scenario's process
 

@@ -1,10 +1,7 @@
 #include "mihost/cli/system/DrainedPipe.h"
 
-#include "mihost/sandbox/SystemCall.h"
-
 #include <array>
 #include <csignal>
-#include <fcntl.h>
 #include <poll.h>
 #include <sys/eventfd.h>
 #include <sys/ioctl.h>
@@ -37,10 +34,6 @@ template <class Function> std::thread startWithoutSignals(Function function)
 
 DrainedPipe::DrainedPipe() : stop_(check(eventfd(0, EFD_CLOEXEC), "cannot create an event"))
 {
-    int ends[2];
-    check(pipe2(ends, O_CLOEXEC), "cannot create a pipe");
-    readEnd_ = Descriptor(ends[0]);
-    writeEnd_ = Descriptor(ends[1]);
     thread_ = startWithoutSignals([this] { drain(); });
 }
 
@@ -59,7 +52,7 @@ std::string DrainedPipe::take()
 
 void DrainedPipe::drain()
 {
-    std::array<pollfd, 2> watched{pollfd{readEnd_.get(), POLLIN, 0},
+    std::array<pollfd, 2> watched{pollfd{pipe_.readEnd.get(), POLLIN, 0},
                                   pollfd{stop_.get(), POLLIN, 0}};
     while (watched[1].revents == 0) {
         if (poll(watched.data(), watched.size(), -1) < 0)
@@ -72,10 +65,10 @@ void DrainedPipe::drain()
 void DrainedPipe::readWhatIsThere()
 {
     int length = 0; // not to the end: a command left running may write for ever
-    if (ioctl(readEnd_.get(), FIONREAD, &length) != 0 || length == 0)
+    if (ioctl(pipe_.readEnd.get(), FIONREAD, &length) != 0 || length == 0)
         return;
     std::string block(static_cast<std::size_t>(length), '\0');
-    ssize_t const got = read(readEnd_.get(), block.data(), block.size());
+    ssize_t const got = read(pipe_.readEnd.get(), block.data(), block.size());
     if (got > 0)
         text_.append({block.data(), static_cast<std::size_t>(got)});
 }

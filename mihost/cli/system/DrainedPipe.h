@@ -2,7 +2,7 @@
 #define MIHOST_CLI_SYSTEM_DRAINEDPIPE_H
 
 #include "mihost/cli/system/BoundedText.h"
-#include "mihost/sandbox/Descriptor.h"
+#include "mihost/sandbox/Pipe.h"
 
 #include <mutex>
 #include <string>
@@ -23,7 +23,7 @@ public:
 
     int writeEnd() const
     {
-        return writeEnd_.get();
+        return pipe_.writeEnd.get();
     }
 
     /** The beginning of what was written since the last call. */
@@ -33,8 +33,7 @@ private:
     void drain();
     void readWhatIsThere();
 
-    Descriptor readEnd_;
-    Descriptor writeEnd_;
+    Pipe pipe_;
     Descriptor stop_;
     std::mutex mutex_; // of reading and of the text
     BoundedText text_;

@@ -10,6 +10,7 @@
 
 #include <algorithm>
 #include <fmt/format.h>
+#include <iterator>
 
 namespace mihost
 {
@@ -17,12 +18,13 @@ namespace mihost
 namespace
 {
 
-/** The shell's own words, in addition to the commands. */
+/** The shell's own words, in addition to the commands; both leave it. */
 constexpr char const* ownWords[] = {"exit", "quit"};
 
 bool isExit(std::vector<std::string> const& words)
 {
-    return words.size() == 1 && (words[0] == "exit" || words[0] == "quit");
+    return words.size() == 1 &&
+           std::find(std::begin(ownWords), std::end(ownWords), words[0]) != std::end(ownWords);
 }
 
 /** Names that can be typed as they are. */

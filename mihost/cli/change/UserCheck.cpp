@@ -1,15 +1,16 @@
 #include "mihost/cli/change/UserCheck.h"
 
 #include "host/Properties.h"
+#include "mihost/cli/accounts/AccountFiles.h"
 #include "mihost/cli/input/Address.h"
 #include "mihost/cli/input/InputValidation.h"
 #include "mihost/cli/system/Failure.h"
 #include "mihost/runtime/Text.h"
+#include "mihost/sandbox/OwnedStream.h"
 
 #include <algorithm>
 #include <cstdio>
 #include <fmt/format.h>
-#include <memory>
 #include <pwd.h>
 
 namespace mihost
@@ -54,13 +55,7 @@ std::optional<std::string> objectionToDelete(Account const& node,
 /** As the plug-in and the account tools read the file. */
 std::vector<Account> accountsOfMachine()
 {
-    struct Close {
-        void operator()(std::FILE* file) const
-        {
-            std::fclose(file);
-        }
-    };
-    std::unique_ptr<std::FILE, Close> const file(std::fopen("/etc/passwd", "re"));
+    Stream const file(std::fopen(accountFile, "re"));
     std::vector<Account> accounts;
     while (passwd const* entry = file ? fgetpwent(file.get()) : nullptr)
         accounts.push_back({entry->pw_name, std::to_string(entry->pw_uid)});

@@ -2,8 +2,8 @@
 #define MIHOST_CLI_SHELL_LINEEDITOR_H
 
 #include "mihost/cli/system/SignalWaiter.h"
+#include "mihost/sandbox/OwnedStream.h"
 
-#include <cstdio>
 #include <functional>
 #include <histedit.h>
 #include <memory>
@@ -45,12 +45,6 @@ private:
     void obey(int signal);
     unsigned char offer(std::vector<std::string> const& candidates, std::string const& typed);
 
-    struct CloseFile {
-        void operator()(std::FILE* file) const
-        {
-            std::fclose(file);
-        }
-    };
     struct EndEditor {
         void operator()(EditLine* editor) const
         {
@@ -69,8 +63,8 @@ private:
     int typedBefore_ = 0; // bytes left that were typed before the prompt
     std::string prompt_;
     Completer completer_;
-    termios settings_{};                           // the terminal's, outside of reading
-    std::unique_ptr<std::FILE, CloseFile> screen_; // standard error, written piece by piece
+    termios settings_{}; // the terminal's, outside of reading
+    Stream screen_;      // standard error, written piece by piece
     std::unique_ptr<History, EndHistory> history_;
     std::unique_ptr<EditLine, EndEditor> editor_;
 };

@@ -27,18 +27,6 @@ std::optional<long> sum(std::optional<long> first, std::optional<long> second)
     return first && second ? std::optional(*first + *second) : std::nullopt;
 }
 
-PasswordState passwordState(std::string const& stored)
-{
-    if (stored.empty())
-        return PasswordState::None;
-    if (stored[0] == '!')
-        return PasswordState::Locked;
-    // A hash by any method begins with $, or is one of the two old forms of 13 and 20 characters.
-    constexpr std::size_t shortestHash = 13;
-    bool const isHash = stored[0] == '$' || stored.size() >= shortestHash;
-    return isHash ? PasswordState::Set : PasswordState::Unusable;
-}
-
 PasswordAgeing ageingOf(Record const& shadow)
 {
     auto const field = [&shadow](int at) { return daysOf(shadow[static_cast<std::size_t>(at)]); };
@@ -123,6 +111,18 @@ std::string stateOfPassword(UserDescription const& user, long today)
 }
 
 } // namespace
+
+PasswordState passwordState(std::string const& stored)
+{
+    if (stored.empty())
+        return PasswordState::None;
+    if (stored[0] == '!')
+        return PasswordState::Locked;
+    // A hash by any method begins with $, or is one of the two old forms of 13 and 20 characters.
+    constexpr std::size_t shortestHash = 13;
+    bool const isHash = stored[0] == '$' || stored.size() >= shortestHash;
+    return isHash ? PasswordState::Set : PasswordState::Unusable;
+}
 
 std::optional<UserDescription> describeUser(AccountData const& data, std::string const& name)
 {

@@ -23,6 +23,9 @@ enum class PasswordState {
     None      // no password is needed
 };
 
+/** @param stored  the password field of an account */
+PasswordState passwordState(std::string const& stored);
+
 /** Days are counted from 1970. A day that will never come is missing. */
 struct PasswordAgeing {
     std::optional<long> minDays; // numbers of days, as stored; missing without a limit

@@ -1,5 +1,6 @@
 #include "mihost/cli/metrics/MachineMetrics.h"
 
+#include "mihost/cli/accounts/UserDescription.h"
 #include "mihost/cli/catalogue/Catalogue.h"
 
 #include <algorithm>
@@ -134,9 +135,9 @@ std::optional<Account> accountOf(NodeView const& user)
     auto const change = numberOf(user, "last-password-change");
     if (!password || !expiry || !change)
         return std::nullopt;
-    std::string const hash = static_cast<std::string>(password->value);
+    PasswordState const state = passwordState(static_cast<std::string>(password->value));
     Account account{textOf(user, "user-name"), expiry, *change,
-                    !hash.empty() && (hash[0] == '!' || hash[0] == '*')};
+                    state == PasswordState::Locked || state == PasswordState::Unusable};
     if (isNever(*expiry))
         account.expiry.reset();
     return account;

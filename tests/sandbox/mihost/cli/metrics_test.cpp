@@ -42,6 +42,7 @@ protected:
         add(1002, fmt::format("*:0:0:99999:7::{}:", dayFromToday(-1)));
         add(1003, fmt::format("$6$a$hash:19000:0:99999:7::{}:", dayFromToday(40)));
         add(1004, "$6$a$hash:19000:0:99999:7:::");
+        add(1005, "no-hash:19000:0:99999:7:::");
         machine::write("/etc/passwd", accounts);
         machine::write("/etc/shadow", shadow, 0600);
         machine::write("/etc/group", "root:x:0:\ncrew:x:1000:user1000\nother:x:1001:\n");
@@ -84,7 +85,7 @@ TEST_F(Metrics, HaveTheValuesOfTheTree)
                 std::stod(treeValue("os", "last-boot-time")), 1);
     std::string const kib = treeValue("os", "physical-memory-size");
     EXPECT_EQ(valueOf("mi_memory_size_bytes", all), std::to_string(std::stoull(kib) * 1024));
-    EXPECT_EQ(valueOf("mi_users", all), "6");
+    EXPECT_EQ(valueOf("mi_users", all), "7");
     EXPECT_EQ(valueOf("mi_groups", all), "3");
     EXPECT_EQ(valueOf("mi_log_lines", all), "2");
     EXPECT_EQ(valueOf("mi_log_newest_time_seconds", all), treeValue("log:1", "time"));
@@ -101,7 +102,7 @@ TEST_F(Metrics, HaveLabelsAndCountAccountsByTheirState)
     EXPECT_EQ(valueOf(R"(mi_accounts_expiring{days="7"})", all), "1");
     EXPECT_EQ(valueOf(R"(mi_accounts_expiring{days="30"})", all), "2");
     EXPECT_EQ(valueOf("mi_accounts_expired", all), "1");
-    EXPECT_EQ(valueOf("mi_accounts_disabled", all), "2");
+    EXPECT_EQ(valueOf("mi_accounts_disabled", all), "3");
     EXPECT_EQ(valueOf("mi_accounts_password_never_changed", all), "1");
     Json const expected = {
         {"metric", "mi_accounts_expiring"}, {"labels", {{"days", "7"}}}, {"value", 1.0}};
@@ -128,7 +129,7 @@ TEST_F(Metrics, OmitAccountStatesThatCannotBeRead)
 {
     machine::remove("/etc/shadow");
     auto const all = lines();
-    EXPECT_EQ(valueOf("mi_users", all), "6");
+    EXPECT_EQ(valueOf("mi_users", all), "7");
     EXPECT_EQ(valueOf("mi_accounts_disabled", all), "");
     EXPECT_EQ(valueOf("mi_accounts_expired", all), "");
     EXPECT_EQ(valueOf(R"(mi_doctor_ok{need="passwords in /etc/shadow"})", all), "0");
@@ -151,7 +152,7 @@ TEST_F(Metrics, AreWrittenToAFile)
     Outcome const outcome = mihostRun({"metrics", "--output", "mi.prom"});
     EXPECT_EQ(outcome.code, 0) << outcome.err;
     EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(valueOf("mi_users", mihost::linesOf(mihost::contentOf("/tmp/mi.prom"))), "6");
+    EXPECT_EQ(valueOf("mi_users", mihost::linesOf(mihost::contentOf("/tmp/mi.prom"))), "7");
 }
 
 TEST_F(Metrics, ReportATreeThatCannotBeRead)

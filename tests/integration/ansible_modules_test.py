@@ -130,12 +130,14 @@ class CallAndSet(Modules):
         results = self.play(
             {**task('mi_call', method='UserSetPassword', parameters={'UserName': 'ben', 'Password': 'x'}),
              'ignore_errors': True},
-            {**task('mi_set', node='user:ben', property='password', value=HASH), 'ignore_errors': True},
+            *({**task('mi_set', node='user:ben', property=name, value=HASH), 'ignore_errors': True}
+              for name in ('password', '117', '0117')),
             task('mi_set', node='user:ben', property='password', secret=HASH),
         )
         self.assertIn('option password', results[0]['msg'])
-        self.assertIn('option secret', results[1]['msg'])
-        self.assertTrue(results[2]['changed'])
+        for result in results[1:4]:
+            self.assertIn('option secret', result['msg'])
+        self.assertTrue(results[4]['changed'])
         self.assertEqual(self.record('/etc/shadow', 'ben')[1], HASH)
 
 

@@ -117,7 +117,7 @@ def main():
     value = module.params['value']
     if value is None:
         value = module.params['secret']
-    elif name in SECRET:
+    elif name.lstrip('0') in SECRET:  # mihost reads an id with leading zeros
         module.fail_json(msg='%s holds a secret, so its value belongs into the option secret' % name)
     words = ['set', module.params['node'], name, value]
     line = script_line(words, module.params['confirm'])

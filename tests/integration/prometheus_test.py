@@ -241,7 +241,7 @@ class Scraped(Daemons):
 
     def test_both_sources_have_the_trees_values(self):
         system = {
-            entry.get('name', name): entry['value']
+            name: entry['value']
             for name, entry in json.loads(mihost('--json', 'get', 'os'))['properties'].items()
         }
         users = len(json.loads(mihost('--json', 'list', 'users')))

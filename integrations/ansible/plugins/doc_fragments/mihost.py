@@ -4,7 +4,7 @@ __metaclass__ = type
 
 
 class ModuleDocFragment(object):
-    """Options, attributes and return values that the modules share."""
+    """Options and attributes that the modules share."""
 
     DOCUMENTATION = r'''
 options:

@@ -15,11 +15,7 @@ SINGLE = ('computer', 'os')
 
 def values_of(node):
     """The properties of a node; a value that is hidden or unknown is None."""
-    values = {}
-    for key, entry in node['properties'].items():
-        name = entry.get('name') or key
-        values[name.replace('-', '_')] = entry['value']
-    return values
+    return dict((name.replace('-', '_'), entry['value']) for name, entry in node['properties'].items())
 
 
 def native(nodes):

@@ -28,7 +28,7 @@ class Login(cockpit.PageTest):
 
     def log_in(self, name):
         self.browser.leave()
-        self.browser.driver.get(cockpit.ADDRESS)
+        self.browser.load(cockpit.ADDRESS)
         self.browser.type('#login-user-input', name)
         self.browser.type('#login-password-input', PASSWORD)
         self.browser.click('#login-button')

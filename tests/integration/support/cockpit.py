@@ -22,7 +22,9 @@ from support import environment
 
 try:
     from selenium import webdriver
-    from selenium.common.exceptions import ElementClickInterceptedException, StaleElementReferenceException
+    from selenium.common.exceptions import (
+        ElementClickInterceptedException, StaleElementReferenceException, TimeoutException,
+    )
     from selenium.webdriver.chrome.service import Service
     from selenium.webdriver.common.by import By
     from selenium.webdriver.common.keys import Keys
@@ -41,6 +43,7 @@ NEEDED = (
     'cockpit-bridge', environment.daemon(WS), environment.daemon(SHELL),
 )
 
+LOAD_LIMIT = 60  # seconds; without it a hanging Chromium would be waited for 300
 PORT = 9090
 ADDRESS = f'http://127.0.0.1:{PORT}'
 MIHOST = '/usr/local/bin/mihost'
@@ -90,8 +93,13 @@ def read(path):
 
 
 def install_mihost(script=RECORDER):
-    """Puts a program where the page looks for mihost."""
-    write(MIHOST, script, 0o755)
+    """Puts a program where the page looks for mihost.
+
+    Renamed into place: a file cannot be written while it is being started.
+    """
+    draft = MIHOST + '.new'
+    write(draft, script, 0o755)
+    os.replace(draft, MIHOST)
 
 
 def install_cockpit():
@@ -211,6 +219,7 @@ class Browser:
         options.set_capability('goog:loggingPrefs', {'browser': 'ALL'})
         service = Service('/usr/bin/chromedriver', log_path=os.devnull)
         self.driver = webdriver.Chrome(service=service, options=options)
+        self.driver.set_page_load_timeout(LOAD_LIMIT)
         self.driver.execute_cdp_cmd('Page.addScriptToEvaluateOnNewDocument', {'source': WATCH_POLICY})
         self.size(1280, 900)
         self.scheme('light')
@@ -232,11 +241,18 @@ class Browser:
             {'name': 'prefers-reduced-motion', 'value': 'reduce'},
         ]})
 
+    def load(self, address):
+        """Goes to an address; fails if that takes too long, as when Chromium hangs."""
+        try:
+            self.driver.get(address)
+        except TimeoutException:
+            raise TimeoutError(f'{address} is not loaded after {LOAD_LIMIT} seconds') from None
+
     def open(self, tab=None):
         """Loads the page again with a tab of it chosen; the earlier calls of mihost are forgotten."""
-        self.driver.get('about:blank')
+        self.load('about:blank')
         forget_calls()
-        self.driver.get(f'{ADDRESS}/cockpit/@localhost/mihost/index.html')
+        self.load(f'{ADDRESS}/cockpit/@localhost/mihost/index.html')
         if tab:
             self.click(f'#tab-{tab}')
 
@@ -244,7 +260,7 @@ class Browser:
         """Leaves the page and deletes its cookies, the session included."""
         self.driver.switch_to.default_content()
         self.driver.delete_all_cookies()
-        self.driver.get('about:blank')
+        self.load('about:blank')
 
     def enter(self, css):
         """Enters a frame: elements are looked for in it from now on."""

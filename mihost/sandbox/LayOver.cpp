@@ -87,9 +87,9 @@ void layFolder(Descriptor const& folder, std::string const& path)
             layLink(folder, name, place, static_cast<std::size_t>(status.st_size));
         } else if (S_ISDIR(status.st_mode)) {
             putFolder(place, status.st_mode);
-            layFolder(Descriptor(check(
-                          openat(folder.get(), name.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC),
-                          "cannot read the directory for " + place)),
+            layFolder(Descriptor(check(openat(folder.get(), name.c_str(),
+                                              O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC),
+                                       "cannot read the directory for " + place)),
                       place);
         } else {
             errno = EINVAL;

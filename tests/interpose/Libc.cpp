@@ -3,6 +3,7 @@
 #include <grp.h>
 #include <pwd.h>
 #include <shadow.h>
+#include <sys/stat.h>
 #include <sys/sysinfo.h>
 #include <sys/utsname.h>
 #include <sys/vfs.h>
@@ -173,6 +174,12 @@ int fstatfs(int descriptor, struct statfs* system) noexcept
 {
     static auto* const next = real(fstatfs);
     return hooks().fstatfs(next, descriptor, system);
+}
+
+int fstatat(int directory, char const* path, struct stat* status, int flags) noexcept
+{
+    static auto* const next = real(fstatat);
+    return hooks().fstatat(next, directory, path, status, flags);
 }
 
 uid_t geteuid() noexcept

@@ -12,6 +12,7 @@
 struct group;
 struct passwd;
 struct spwd;
+struct stat;
 struct statfs;
 struct sysinfo;
 struct utsname;
@@ -47,6 +48,8 @@ struct Hooks {
     Call<int(clockid_t clock, timespec* now)> clock_gettime{"clock_gettime", -1};
     Call<ssize_t(int descriptor, void* buffer, std::size_t size, off_t offset)> pread{"pread", -1};
     Call<int(int descriptor, struct statfs* system)> fstatfs{"fstatfs", -1};
+    Call<int(int directory, char const* path, struct stat* status, int flags)> fstatat{"fstatat",
+                                                                                       -1};
     Call<uid_t()> geteuid{"geteuid"};
 };
 

@@ -1,5 +1,6 @@
 // The directory laid over a copy, and the reasons to refuse a copy.
 
+#include "tests/interpose/Libc.h"
 #include "tests/sandbox/border/Caller.h"
 #include "tests/support/Lines.h"
 #include "tests/support/ScratchFolder.h"
@@ -142,6 +143,21 @@ TEST_F(Overlay, RefusesOtherThanFilesLinksAndDirectories)
     ASSERT_EQ(mkfifo(folder.path("etc/pipe").c_str(), 0600), 0);
     EXPECT_EQ(reason(folder.name()), "cannot lay over /etc/pipe, neither a file nor a link nor "
                                      "a directory: Invalid argument");
+}
+
+TEST_F(Overlay, DoesNotFollowALinkThatReplacesADirectory)
+{
+    ScratchFolder const elsewhere;
+    folder.write("etc/file", "");
+    libc::hooks().fstatat = [&](int directory, char const* path, struct stat* status, int flags) {
+        int const result = interpose::real(::fstatat)(directory, path, status, flags);
+        if (std::string(path) == "etc") { // seen as a directory, not opened yet
+            renameat(directory, path, directory, "old");
+            EXPECT_EQ(symlinkat(elsewhere.name().c_str(), directory, path), 0);
+        }
+        return result;
+    };
+    EXPECT_EQ(reason(folder.name()), "cannot read the directory for /etc: Not a directory");
 }
 
 TEST_F(Overlay, IsRefusedIfAFileWouldReplaceADirectory)

@@ -2,6 +2,7 @@
 
 #include "host/MutableNode.h"
 #include "mihost/runtime/NodeIndex.h"
+#include "mihost/runtime/Outcome.h"
 #include "mihost/runtime/Runtime.h"
 
 #include <algorithm>
@@ -13,20 +14,8 @@
 namespace IC
 {
 
-namespace
-{
-
-Error success()
-{
-    return {0, Number(0U), ""};
-}
-
-Error failure(std::string const& reason)
-{
-    return {1, Number(Number::EmptyKind), reason};
-}
-
-} // namespace
+using mihost::failure;
+using mihost::success;
 
 struct [[gnu::visibility("hidden")]] ManagementInterface::Own
 {

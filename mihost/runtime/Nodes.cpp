@@ -1,5 +1,6 @@
 #include "host/MutableNode.h"
 #include "host/Node.h"
+#include "mihost/runtime/Outcome.h"
 
 #include <algorithm>
 #include <mutex>
@@ -8,15 +9,8 @@
 namespace IC
 {
 
-namespace
-{
-
-Error success()
-{
-    return {0, Number(Number::EmptyKind), ""};
-}
-
-} // namespace
+using mihost::failure;
+using mihost::success;
 
 // The lock is held for one lookup or one store only, and nothing is called while it is held.
 struct [[gnu::visibility("hidden")]] Node::Store
@@ -48,7 +42,7 @@ Error Node::getProperty(unsigned int id, PropertyValue& value) const
     std::lock_guard const held(store_->lock);
     auto const found = store_->properties.find(id);
     if (found == store_->properties.end())
-        return {1, Number(Number::EmptyKind), "property " + std::to_string(id) + " is not set"};
+        return failure("property " + std::to_string(id) + " is not set");
     value = found->second;
     return success();
 }

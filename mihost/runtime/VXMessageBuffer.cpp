@@ -8,36 +8,31 @@
 namespace VXLog
 {
 
-namespace
-{
-
-class AppendToString : public std::streambuf
-{
-public:
-    explicit AppendToString(std::string& text) : text_(text) {}
-
-protected:
-    int_type overflow(int_type character) override
-    {
-        if (!traits_type::eq_int_type(character, traits_type::eof()))
-            text_.push_back(traits_type::to_char_type(character));
-        return traits_type::not_eof(character);
-    }
-
-    std::streamsize xsputn(char const* text, std::streamsize length) override
-    {
-        text_.append(text, static_cast<std::size_t>(length));
-        return length;
-    }
-
-private:
-    std::string& text_;
-};
-
-} // namespace
-
 struct [[gnu::visibility("hidden")]] VXMessageBuffer::Stream
 {
+    class AppendToString : public std::streambuf
+    {
+    public:
+        explicit AppendToString(std::string& text) : text_(text) {}
+
+    protected:
+        int_type overflow(int_type character) override
+        {
+            if (!traits_type::eq_int_type(character, traits_type::eof()))
+                text_.push_back(traits_type::to_char_type(character));
+            return traits_type::not_eof(character);
+        }
+
+        std::streamsize xsputn(char const* text, std::streamsize length) override
+        {
+            text_.append(text, static_cast<std::size_t>(length));
+            return length;
+        }
+
+    private:
+        std::string& text_;
+    };
+
     explicit Stream(std::string & text) : buffer(text), out(&buffer)
     {
         out.imbue(std::locale::classic()); // plain digits, regardless of the host's locale

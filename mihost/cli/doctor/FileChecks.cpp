@@ -1,12 +1,11 @@
 #include "mihost/cli/doctor/FileChecks.h"
 
 #include "mihost/cli/accounts/LoginDefs.h"
+#include "mihost/cli/log/LogLine.h"
 #include "mihost/cli/system/TextFile.h"
 #include "mihost/sandbox/OwnedStream.h"
 
 #include <algorithm>
-#include <array>
-#include <cctype>
 #include <cerrno>
 #include <cstdio>
 #include <fmt/format.h>
@@ -15,7 +14,6 @@
 #include <memory>
 #include <pwd.h>
 #include <shadow.h>
-#include <string_view>
 
 namespace mihost
 {
@@ -93,24 +91,6 @@ std::vector<std::string> shadowNames(std::string const& text)
     return names;
 }
 
-bool isStamp(std::string_view line)
-{
-    static constexpr std::array<std::string_view, 12> months = {
-        "Jan", "Feb", "Mar", "Apr", "May", "Jun", "Jul", "Aug", "Sep", "Oct", "Nov", "Dec"};
-    constexpr std::string_view form = " 00 00:00:00 "; // 0 means a digit; the first may be a blank
-    constexpr std::size_t monthLength = 3;
-    if (std::find(months.begin(), months.end(), line.substr(0, monthLength)) == months.end())
-        return false;
-    std::string rest(line.substr(monthLength, form.size()));
-    if (rest.compare(0, 2, "  ") == 0)
-        rest[1] = '0';
-    std::replace_if(
-        rest.begin(), rest.end(),
-        [](char character) { return std::isdigit(static_cast<unsigned char>(character)) != 0; },
-        '0');
-    return rest == form;
-}
-
 } // namespace
 
 Problem problemOfRanges(std::string const& text)
@@ -159,7 +139,7 @@ Problem problemOfRelease(std::string const& text)
 Problem problemOfStamps(std::vector<std::string> const& lines)
 {
     auto const other = std::find_if(lines.rbegin(), lines.rend(),
-                                    [](std::string const& line) { return !isStamp(line); });
+                                    [](std::string const& line) { return !hasStamp(line); });
     if (other == lines.rend())
         return std::nullopt;
     return fmt::format("a line begins with '{}' instead of a time stamp like 'Jan  2 03:04:05 '",

@@ -1,6 +1,7 @@
 #include "mihost/cli/log/LogLine.h"
 
 #include <algorithm>
+#include <cctype>
 #include <cstdio>
 #include <cstring>
 #include <iterator>
@@ -52,6 +53,23 @@ LogLine logLineOf(std::string_view line, std::tm const& today)
     read.remove_prefix(std::min(read.find_first_not_of(' '), read.size()));
     std::string_view const message = read.substr(std::min(stampLength + 1, read.size()));
     return {timeOf(std::string(read.substr(0, stampLength)), today), std::string(message)};
+}
+
+bool hasStamp(std::string_view line)
+{
+    constexpr std::string_view form = " 00 00:00:00 "; // 0 means a digit; the first may be a blank
+    constexpr std::size_t monthLength = 3;
+    std::string_view const month = line.substr(0, monthLength);
+    if (std::find(std::begin(months), std::end(months), month) == std::end(months))
+        return false;
+    std::string rest(line.substr(monthLength, form.size()));
+    if (rest.compare(0, 2, "  ") == 0)
+        rest[1] = '0';
+    std::replace_if(
+        rest.begin(), rest.end(),
+        [](char character) { return std::isdigit(static_cast<unsigned char>(character)) != 0; },
+        '0');
+    return rest == form;
 }
 
 std::string withoutAsterisks(std::string const& message)

@@ -26,6 +26,9 @@ struct LogLine {
  */
 LogLine logLineOf(std::string_view line, std::tm const& today);
 
+/** Whether the line begins with a complete time stamp, such as "Jan  2 03:04:05 ". */
+bool hasStamp(std::string_view line);
+
 /** The message without the asterisks that the plug-in puts around it. */
 std::string withoutAsterisks(std::string const& message);
 

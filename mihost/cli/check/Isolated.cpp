@@ -18,6 +18,7 @@
 #include <sys/syscall.h>
 #include <sys/wait.h>
 #include <system_error>
+#include <utility>
 
 namespace mihost::checks
 {
@@ -195,14 +196,10 @@ Ending readReport(Descriptor const& from, Child const& child, std::chrono::secon
     }
 }
 
-std::string lastLine(std::string const& text)
+std::string lastLine(std::string text)
 {
-    std::size_t const end = text.find_last_not_of('\n');
-    if (end == std::string::npos)
-        return "";
-    std::size_t const start = text.rfind('\n', end);
-    return text.substr(start == std::string::npos ? 0 : start + 1,
-                       end - (start == std::string::npos ? 0 : start + 1) + 1);
+    text.erase(text.find_last_not_of('\n') + 1);
+    return text.substr(text.rfind('\n') + 1);
 }
 
 /** The last line that the process wrote to standard error. */
@@ -217,7 +214,7 @@ std::string lastWords(Descriptor const& complaints)
     std::string text(static_cast<std::size_t>(status.st_size - from), '\0');
     ssize_t const count = pread(complaints.get(), text.data(), text.size(), from);
     text.resize(static_cast<std::size_t>(std::max<ssize_t>(count, 0)));
-    return validUtf8(lastLine(text));
+    return validUtf8(lastLine(std::move(text)));
 }
 
 std::string endText(Ending ending, int status, Settings const& settings, std::string const& words)
@@ -238,10 +235,10 @@ std::vector<std::string> textsOf(Json const& list)
 }
 
 /** The lines that the process wrote, one after the other. */
-class Report
+class ReportLines
 {
 public:
-    explicit Report(std::string const& text) : text_(text) {}
+    explicit ReportLines(std::string const& text) : text_(text) {}
 
     /** @return null after the last whole line */
     Json next()
@@ -274,14 +271,14 @@ Verdict verdictOf(Json const& document)
 std::vector<Result> resultsOf(Scenario const& scenario, std::string const& text,
                               std::string const& end)
 {
-    Report report(text);
+    ReportLines lines(text);
     std::vector<Result> results;
     std::string stoppedBy;
     for (Check const& check : scenario.checks) {
         Result result{fmt::format("{}.{}", scenario.name, check.name), check.meaning, {}};
         if (!stoppedBy.empty()) {
             result.verdict.skipped = fmt::format("not reached after {}", stoppedBy);
-        } else if (Json const line = report.next(); !line.is_null()) {
+        } else if (Json const line = lines.next(); !line.is_null()) {
             result.verdict = verdictOf(line);
             if (line[lastKey])
                 stoppedBy = result.name;

@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-/** Tables and trees as lines for people. */
+/** Tables as lines for people. */
 namespace mihost
 {
 
@@ -26,6 +26,9 @@ struct Room {
     }
 };
 
+/** Columns; in fewer, wrapped text is hard to read. */
+constexpr std::size_t leastText = 20;
+
 /** Texts in columns, printable and perhaps styled. */
 struct Grid {
     std::vector<Column> columns;
@@ -37,23 +40,13 @@ struct Grid {
 std::vector<std::string> layOut(Grid const& grid, Room const& room);
 
 /**
- * A table as rows below headings. If the rows do not fit with 20 columns for the wrapping text,
- * each row becomes lines of heading and value, with an empty line between rows.
+ * A table as rows below headings. If the rows do not fit with leastText columns for the wrapping
+ * text, each row becomes lines of heading and value, with an empty line between rows.
  */
 std::vector<std::string> layOut(Table const& table, Room const& room, bool hasHeadings = true);
 
 /** Each row as lines of heading and value, at any width. */
 std::vector<std::string> layOutRecords(Table const& table, Room const& room);
-
-/** One node of a tree. */
-struct Branch {
-    std::size_t parent; // an index of the same list, smaller than its own; itself for none
-    std::string name;   // printable and perhaps styled, never wrapped unless the room is too small
-    std::string text;   // next to the name
-    Grid details;       // below the text
-};
-
-std::vector<std::string> layOut(std::vector<Branch> const& branches, Room const& room);
 
 } // namespace mihost
 

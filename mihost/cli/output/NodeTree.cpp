@@ -5,6 +5,7 @@
 #include "mihost/cli/output/NodeJson.h"
 #include "mihost/cli/output/PropertyText.h"
 #include "mihost/cli/output/Style.h"
+#include "mihost/cli/output/TreeLayout.h"
 #include "mihost/runtime/Text.h"
 
 #include <fmt/format.h>

@@ -1,4 +1,4 @@
-#include "mihost/cli/output/Layout.h"
+#include "mihost/cli/output/TreeLayout.h"
 
 #include "mihost/cli/output/DisplayWidth.h"
 #include "mihost/cli/output/Style.h"

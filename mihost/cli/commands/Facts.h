@@ -18,10 +18,6 @@ struct Fact {
 /** Writes the facts as two columns. */
 void writeFacts(std::vector<Fact> const& facts, Output& out);
 
-/** @throws Failure (NotFound) with a similar name if there is one */
-[[noreturn]] void failForNoAccount(char const* kind, std::string const& name,
-                                   std::vector<std::string> const& known);
-
 } // namespace mihost
 
 #endif

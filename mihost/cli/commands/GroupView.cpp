@@ -2,6 +2,7 @@
 
 #include "mihost/cli/accounts/GroupDescription.h"
 #include "mihost/cli/commands/Facts.h"
+#include "mihost/cli/commands/UnknownName.h"
 #include "mihost/cli/plugin/Session.h"
 
 #include <fmt/format.h>
@@ -55,7 +56,7 @@ void showGroup(Session& session, std::string const& name)
     AccountData const data = readAccountData();
     auto const group = describeGroup(data, name);
     if (!group)
-        failForNoAccount("group", name, recordNames(data.files.at(groupFile)));
+        failForUnknownGroup(name);
     if (session.out().takesDocuments())
         session.out().json(documentOf(*group));
     else

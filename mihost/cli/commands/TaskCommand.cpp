@@ -4,10 +4,9 @@
 #include "mihost/cli/change/Clearance.h"
 #include "mihost/cli/change/MembershipCheck.h"
 #include "mihost/cli/commands/NewPassword.h"
+#include "mihost/cli/commands/UnknownName.h"
 #include "mihost/cli/input/Help.h"
-#include "mihost/cli/input/Suggestion.h"
 #include "mihost/cli/system/Failure.h"
-#include "mihost/cli/system/TextFile.h"
 
 #include <CLI/Error.hpp>
 #include <algorithm>
@@ -27,12 +26,12 @@ constexpr std::string_view neverExpires = "never"; // in place of a day
 struct Existing {
     std::string_view argument;
     char const* file;
-    char const* noun;
+    void (*failForUnknown)(std::string const& name);
 };
 
 constexpr Existing existing[] = {
-    {"USER", accountFile, "account"},
-    {"GROUP", groupFile, "group"},
+    {"USER", accountFile, failForUnknownAccount},
+    {"GROUP", groupFile, failForUnknownGroup},
 };
 
 bool isOption(TaskValue const& value)
@@ -49,13 +48,8 @@ Parameter const& parameterOf(Task const& task, TaskValue const& value)
 void checkThatItExists(TaskValue const& value, std::string const& name)
 {
     for (Existing const& each : existing)
-        if (each.argument == value.name && recordOf(each.file, name).empty()) {
-            std::string const meant = nearest(name, recordNames(linesOf(contentOf(each.file))));
-            throw Failure(
-                NotFound,
-                fmt::format("no {} '{}'{}", each.noun, name,
-                            meant.empty() ? "" : fmt::format(" (did you mean {}?)", meant)));
-        }
+        if (each.argument == value.name && recordOf(each.file, name).empty())
+            each.failForUnknown(name);
 }
 
 /** The names of the options that the task has. */
@@ -172,13 +166,13 @@ void TaskCommand::carryOutTask(Session& session) const
 
 void TaskCommand::run(Session& session)
 {
-    if (!task_) {
-        subject_.show(session, shown_);
-        return;
-    }
-    std::string const what = fmt::format("{} {}: ", subject_.command, task_->name);
+    std::string const what = task_ ? fmt::format("{} {}: ", subject_.command, task_->name)
+                                   : fmt::format("{}: ", subject_.command);
     try {
-        carryOutTask(session);
+        if (task_)
+            carryOutTask(session);
+        else
+            subject_.show(session, shown_);
     } catch (Failure const& failure) {
         bool const isNamed = std::string_view(failure.what()).substr(0, what.size()) == what;
         throw Failure(failure.code(), (isNamed ? "" : what) + failure.what());

@@ -2,6 +2,7 @@
 
 #include "mihost/cli/accounts/UserDescription.h"
 #include "mihost/cli/commands/Facts.h"
+#include "mihost/cli/commands/UnknownName.h"
 #include "mihost/cli/input/Day.h"
 #include "mihost/cli/output/UnknownValues.h"
 #include "mihost/cli/plugin/Session.h"
@@ -177,7 +178,7 @@ void showUser(Session& session, std::string const& name)
     AccountData const data = readAccountData();
     auto const user = describeUser(data, name);
     if (!user)
-        failForNoAccount("user", name, recordNames(data.files.at(accountFile)));
+        failForUnknownAccount(name);
     if (session.out().takesDocuments())
         session.out().json(documentOf(*user));
     else

@@ -108,9 +108,9 @@ TEST_F(AccountViews, ShowOneGroupAsTextAndAsJson)
 TEST_F(AccountViews, ExitWith4ForAnUnknownName)
 {
     EXPECT_EQ(mihostRun({"user", "jdeo"}),
-              failed(4, "no local user 'jdeo' (did you mean 'jdoe'?)"));
+              failed(4, "user: no account 'jdeo' (did you mean jdoe?)"));
     EXPECT_EQ(mihostRun({"group", "xyz"}),
-              failed(4, "no local group 'xyz' (see 'mihost list groups')"));
+              failed(4, "group: no group 'xyz' (see 'mihost list groups')"));
 }
 
 TEST_F(AccountViews, ShowNoControlCharactersAtATerminal)

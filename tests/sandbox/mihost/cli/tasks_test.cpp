@@ -133,7 +133,7 @@ TEST_F(Tasks, RefuseUnknownNamesAndSuggestTheNearest)
     expectRefused(
         {{{"user", "delete", "jdo", "-y"}, "user delete: no account 'jdo' (did you mean jdoe?)"},
          {{"user", "set-shell", "nobody-here", "/bin/sh"},
-          "user set-shell: no account 'nobody-here'"},
+          "user set-shell: no account 'nobody-here' (see 'mihost list users')"},
          {{"group", "add-member", "stuff", "jdoe"},
           "group add-member: no group 'stuff' (did you mean staff?)"},
          {{"group", "remove-member", "crew", "jdo"},

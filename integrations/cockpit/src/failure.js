@@ -11,7 +11,7 @@ const kinds = { // Cockpit's name of a problem
 };
 
 export class Failure extends Error {
-    /** The kind is one of those above, "no-plugin", "too-old", "garbled" or "failed". */
+    /** The kind is one of those above, "no-plugin" or "garbled". */
     constructor(kind, message, exit = null) {
         super(message);
         this.kind = kind;

@@ -1,5 +1,6 @@
 #include "mihost/cli/change/SandboxChanges.h"
 
+#include "mihost/cli/accounts/AccountFiles.h"
 #include "mihost/cli/system/TextFile.h"
 
 #include <algorithm>
@@ -26,8 +27,11 @@ struct AccountFile {
 };
 
 constexpr AccountFile accountFiles[] = {
-    {"/etc/passwd", 1},  {"/etc/shadow", 1},           {"/etc/group", 1},
-    {"/etc/gshadow", 1}, {"/etc/security/opasswd", 3},
+    {accountFile, 1},
+    {shadowFile, 1},
+    {groupFile, 1},
+    {groupShadowFile, 1},
+    {"/etc/security/opasswd", 3},
 };
 
 /** The file itself or a backup that a tool keeps next to it, such as /etc/shadow- or

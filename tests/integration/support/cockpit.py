@@ -22,9 +22,7 @@ from support import environment
 
 try:
     from selenium import webdriver
-    from selenium.common.exceptions import (
-        ElementClickInterceptedException, StaleElementReferenceException, TimeoutException,
-    )
+    from selenium.common.exceptions import ElementClickInterceptedException, StaleElementReferenceException
     from selenium.webdriver.chrome.service import Service
     from selenium.webdriver.common.by import By
     from selenium.webdriver.common.keys import Keys
@@ -43,7 +41,6 @@ NEEDED = (
     'cockpit-bridge', environment.daemon(WS), environment.daemon(SHELL),
 )
 
-LOAD_LIMIT = 60  # seconds; without it a hanging Chromium would be waited for 300
 PORT = 9090
 ADDRESS = f'http://127.0.0.1:{PORT}'
 MIHOST = '/usr/local/bin/mihost'
@@ -217,9 +214,9 @@ class Browser:
         for argument in (*CHROMIUM, f'--user-data-dir={self.profile.name}'):
             options.add_argument(argument)
         options.set_capability('goog:loggingPrefs', {'browser': 'ALL'})
+        options.page_load_strategy = 'none'  # load() waits instead
         service = Service('/usr/bin/chromedriver', log_path=os.devnull)
         self.driver = webdriver.Chrome(service=service, options=options)
-        self.driver.set_page_load_timeout(LOAD_LIMIT)
         self.driver.execute_cdp_cmd('Page.addScriptToEvaluateOnNewDocument', {'source': WATCH_POLICY})
         self.size(1280, 900)
         self.scheme('light')
@@ -242,11 +239,12 @@ class Browser:
         ]})
 
     def load(self, address):
-        """Goes to an address; fails if that takes too long, as when Chromium hangs."""
-        try:
-            self.driver.get(address)
-        except TimeoutException:
-            raise TimeoutError(f'{address} is not loaded after {LOAD_LIMIT} seconds') from None
+        """Goes to an address. The page is asked whether it is loaded: chromedriver sometimes misses it for minutes."""
+        self.driver.get(address)
+        self.wait(
+            'return document.readyState === "complete" && location.href.startsWith(arguments[0])', address,
+            what=f'{address} is not loaded',
+        )
 
     def open(self, tab=None):
         """Loads the page again with a tab of it chosen; the earlier calls of mihost are forgotten."""

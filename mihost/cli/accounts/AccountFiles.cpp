@@ -41,6 +41,7 @@ Record recordOf(std::string const& file, std::string const& name)
 std::vector<std::string> recordNames(std::vector<std::string> const& lines)
 {
     std::vector<std::string> names;
+    names.reserve(lines.size());
     for (std::string const& line : lines)
         names.push_back(line.substr(0, line.find(':')));
     return names;

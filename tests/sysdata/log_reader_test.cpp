@@ -479,7 +479,7 @@ TEST_F(LogClearing, OpensTheLogForWritingAndClosesIt)
 TEST_F(LogClearing, FailsWithoutAMessageIfTheFileCannotBeOpened)
 {
     Recording const recording;
-    EXPECT_FALSE(logInfo().clearLog()); // there is no such directory
+    EXPECT_FALSE(logInfo().clearLog()); // its directory is missing
     EXPECT_EQ(recording.texts(), (Lines{"clearLog: entry", "clearLog: exit"}));
 }
 

@@ -103,7 +103,7 @@ TEST_F(UserListing, ReplacesWhatTheListHeldBefore)
 {
     std::vector<userInfo> users(3, userInfo("old"));
     NQ::getUserInfo(users);
-    EXPECT_TRUE(users.empty()); // there is no account file yet
+    EXPECT_TRUE(users.empty()); // the account files are not written yet
     files_.write("/etc/passwd", account("jdoe", 1000));
     users.resize(3);
     NQ::getUserInfo(users);
@@ -278,7 +278,7 @@ TEST_F(UserListing, StartsTheFailuresAtZeroForEachUser)
 {
     files_.write("/etc/passwd", account("jdoe", 1000) + account("mary", 1001));
     for (userInfo& user : list())
-        EXPECT_EQ(user.getMaxLoginFailures(), 0); // there are no rules yet
+        EXPECT_EQ(user.getMaxLoginFailures(), 0); // without rules
 
     // The rules change while the accounts are read: the second user has none.
     bool first = true;

@@ -27,6 +27,7 @@ TerminalRun::TerminalRun(std::vector<std::string> arguments, unsigned short colu
     winsize size{24, columns, 0, 0};
     child_ = forkpty(&master_, nullptr, nullptr, &size);
     if (child_ == 0) {
+        std::signal(SIGINT, SIG_DFL);     // a script's background job ignores it
         fcntl(ends[1], F_SETFD, 0);       // it stays open and is inherited
         setenv("MIHOST_PAGER", "cat", 0); // a pager would wait for keys
         execv(list[0], list.data());

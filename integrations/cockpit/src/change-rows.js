@@ -2,10 +2,9 @@
 
 /** Returns the files that change and, separately, the account tools' backups. */
 export function sortChanges(changes) {
-    const isBackup = change => /^\/etc\/(passwd|shadow|group|gshadow|subuid|subgid)-$/.test(change.file);
     return {
-        files: changes.filter(change => !isBackup(change)),
-        backups: changes.filter(isBackup),
+        files: changes.filter(change => !change.backup),
+        backups: changes.filter(change => change.backup),
     };
 }
 

@@ -3,9 +3,10 @@ import { test } from "node:test";
 import { differenceOf, sortChanges } from "../src/change-rows.js";
 
 test("sortChanges separates the account tools' backups", () => {
-    const files = ["/etc/passwd", "/etc/passwd-", "/home/x-", "/etc/a-"].map(file => ({ file }));
-    const sorted = sortChanges(files);
-    assert.deepEqual(sorted.files.map(change => change.file), ["/etc/passwd", "/home/x-", "/etc/a-"]);
+    const sorted = sortChanges([
+        { file: "/etc/passwd" }, { file: "/etc/passwd-", backup: true }, { file: "/home/x-" },
+    ]);
+    assert.deepEqual(sorted.files.map(change => change.file), ["/etc/passwd", "/home/x-"]);
     assert.deepEqual(sorted.backups.map(change => change.file), ["/etc/passwd-"]);
 });
 

@@ -42,12 +42,6 @@ std::string countOf(std::vector<std::string> const& lines, char const* what)
     return fmt::format("{} line{} {}", lines.size(), lines.size() == 1 ? "" : "s", what);
 }
 
-/** As account tools call the file that they copy before they change it. */
-bool isBackup(std::string const& file)
-{
-    return file.back() == '-';
-}
-
 /** Such as " (directory, mode 0700, owner 1000:1000)"; empty if there is nothing to say. */
 std::string remark(FileChange const& change)
 {
@@ -58,9 +52,9 @@ std::string remark(FileChange const& change)
         remarks.push_back(textOf("mode", change.mode));
     if (differs(change.owner) && !change.owner.after.empty())
         remarks.push_back(textOf("owner", change.owner));
-    if (isBackup(change.file) && !change.removed.empty())
+    if (change.isBackup && !change.removed.empty())
         remarks.push_back(countOf(change.removed, "removed"));
-    if (isBackup(change.file) && !change.added.empty())
+    if (change.isBackup && !change.added.empty())
         remarks.push_back(countOf(change.added, "added"));
     return remarks.empty() ? "" : fmt::format(" ({})", fmt::join(remarks, ", "));
 }
@@ -110,6 +104,8 @@ Json toJson(FileChange const& change)
         document["mode"] = attributeToJson(change.mode);
     if (differs(change.owner))
         document["owner"] = attributeToJson(change.owner);
+    if (change.isBackup)
+        document["backup"] = true;
     return document;
 }
 
@@ -117,7 +113,7 @@ void writeText(std::vector<FileChange> const& changes, Output& out)
 {
     for (FileChange const& change : changes) {
         out.line(change.change + " " + printable(change.file) + remark(change));
-        if (isBackup(change.file))
+        if (change.isBackup)
             continue; // more than this write differs, and it was not requested
         for (std::string const& line : change.removed)
             out.line("  - " + printable(line));

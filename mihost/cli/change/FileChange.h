@@ -25,6 +25,7 @@ struct FileChange {
     std::string kind = "file";      // or "directory", "link", "device", "pipe" or "socket"
     Attribute mode{};               // octal
     Attribute owner{};              // numbers, as in 1000:100
+    bool isBackup = false;          // the account tools', such as /etc/passwd-
 };
 
 /** The lines that the others lack, each as often as it is missing there. */
@@ -36,7 +37,7 @@ void hideHash(std::string& record, std::size_t field);
 
 Json toJson(FileChange const& change);
 
-/** For people to read: of a backup, such as /etc/passwd-, the number of lines only. */
+/** For people to read: of a backup the number of lines only. */
 void writeText(std::vector<FileChange> const& changes, Output& out);
 
 } // namespace mihost

@@ -23,7 +23,7 @@ constexpr std::string_view lockFiles[] = {
 
 struct AccountFile {
     std::string_view path;
-    std::size_t secret; // the field that may hold a hash, the first being 0
+    std::optional<std::size_t> secret; // the field that may hold a hash, the first being 0
 };
 
 constexpr AccountFile accountFiles[] = {
@@ -32,6 +32,8 @@ constexpr AccountFile accountFiles[] = {
     {groupFile, 1},
     {groupShadowFile, 1},
     {"/etc/security/opasswd", 3},
+    {"/etc/subuid", {}},
+    {"/etc/subgid", {}},
 };
 
 /** The file itself or a backup that a tool keeps next to it, such as /etc/shadow- or
@@ -85,11 +87,11 @@ bool everybodyMayRead(std::optional<FileState> const& state)
     return !state || (state->mode & S_IROTH) != 0;
 }
 
-void addLines(FileChange& shown, PathChange const& change, Secrets secrets)
+void addLines(FileChange& shown, PathChange const& change, AccountFile const* account,
+              Secrets secrets)
 {
     if (!change.oldText || !change.newText)
         return;
-    AccountFile const* const account = accountFileOf(change.path);
     bool const isPublic = everybodyMayRead(change.before) && everybodyMayRead(change.after);
     if (secrets == Secrets::Hide && !account && !isPublic)
         return;
@@ -97,10 +99,10 @@ void addLines(FileChange& shown, PathChange const& change, Secrets secrets)
     auto const after = linesOf(*change.newText);
     shown.removed = missingIn(before, after);
     shown.added = missingIn(after, before);
-    if (secrets == Secrets::Hide && account)
+    if (secrets == Secrets::Hide && account && account->secret)
         for (auto* const lines : {&shown.removed, &shown.added})
             for (std::string& line : *lines)
-                hideHash(line, account->secret);
+                hideHash(line, *account->secret);
 }
 
 std::vector<std::string> targetOf(std::optional<FileState> const& state)
@@ -114,6 +116,8 @@ FileChange shownOf(PathChange const& change, Secrets secrets)
 {
     FileChange shown;
     shown.file = change.path;
+    AccountFile const* const account = accountFileOf(change.path);
+    shown.isBackup = account && account->path != change.path;
     if (!change.before)
         shown.change = "created";
     if (!change.after)
@@ -123,7 +127,7 @@ FileChange shownOf(PathChange const& change, Secrets secrets)
     shown.owner = {ownerOf(change.before), ownerOf(change.after)};
     shown.removed = missingIn(targetOf(change.before), targetOf(change.after));
     shown.added = missingIn(targetOf(change.after), targetOf(change.before));
-    addLines(shown, change, secrets);
+    addLines(shown, change, account, secrets);
     return shown;
 }
 

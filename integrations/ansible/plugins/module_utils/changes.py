@@ -5,11 +5,6 @@ from __future__ import absolute_import, division, print_function
 __metaclass__ = type
 
 
-def is_backup(path):
-    """The account tools keep a backup next to a changed file."""
-    return path.startswith('/etc/') and path.endswith('-')
-
-
 def attribute_lines(change, side):
     """Mode and owner, which mihost reports only if they differ."""
     lines = []
@@ -21,12 +16,12 @@ def attribute_lines(change, side):
 
 
 def diff_of(changes):
-    """One entry for each file, with the lines that differ after all changes."""
+    """One entry for each file but backups, with the lines that differ after all changes."""
     entries = {}
     order = []
     for change in changes:
         path = change['file']
-        if is_backup(path):
+        if change.get('backup'):
             continue
         if path not in entries:
             entries[path] = dict(before=[], after=[])

@@ -112,8 +112,7 @@ TEST(ShownChanges, HaveTheLinesOfTexts)
 
 TEST(ShownChanges, HideHashesInAccountFilesAndTheirCopies)
 {
-    for (std::string const path : {"/etc/shadow", "/etc/gshadow", "/etc/passwd", "/etc/group",
-                                   "/etc/shadow.org", "/etc/shadow~"}) {
+    for (std::string const path : {"/etc/shadow", "/etc/gshadow", "/etc/passwd", "/etc/group"}) {
         PathChange const change = texts(path, "", "jdoe:$6$salt$hash:1::\n", 0600);
         EXPECT_EQ(shown({change}), "changed " + path + "\n  + jdoe:(hidden):1::\n");
         EXPECT_EQ(shown({change}, Secrets::Show),
@@ -121,11 +120,13 @@ TEST(ShownChanges, HideHashesInAccountFilesAndTheirCopies)
     }
     EXPECT_EQ(shown({texts("/etc/security/opasswd", "", "jdoe:1000:1:$6$a$b,$6$c$d\n", 0600)}),
               "changed /etc/security/opasswd\n  + jdoe:1000:1:(hidden)\n");
-    FileChange const backup =
-        mihost::shownChanges({texts("/etc/shadow-", "", "jdoe:$6$salt$hash:1::\n", 0600)}, "",
-                             Secrets::Hide)
-            .at(0);
-    EXPECT_EQ(backup.added, Lines{"jdoe:(hidden):1::"});
+    for (std::string const path : {"/etc/shadow-", "/etc/shadow.org", "/etc/shadow~"})
+        EXPECT_EQ(mihost::shownChanges({texts(path, "", "jdoe:$6$salt$hash:1::\n", 0600)}, "",
+                                       Secrets::Hide)
+                      .at(0)
+                      .added,
+                  Lines{"jdoe:(hidden):1::"})
+            << path;
 }
 
 TEST(ShownChanges, HideLinesOfOtherUnreadableFiles)
@@ -141,12 +142,25 @@ TEST(ShownChanges, HideLinesOfOtherUnreadableFiles)
 
 TEST(ShownChanges, CountTheLinesOfBackups)
 {
-    EXPECT_EQ(shown({texts("/etc/passwd-", "a\nb\n", "b\nc\nd\n")}),
-              "changed /etc/passwd- (1 line removed, 2 lines added)\n");
-    EXPECT_EQ(mihost::listToJson(mihost::shownChanges({texts("/etc/passwd-", "a\n", "b\n")}, "",
-                                                      Secrets::Hide))[0]["added"]
+    for (std::string const path : {"/etc/passwd-", "/etc/shadow.org", "/etc/subuid-"})
+        EXPECT_EQ(shown({texts(path, "a\nb\n", "b\nc\nd\n")}),
+                  "changed " + path + " (1 line removed, 2 lines added)\n");
+}
+
+TEST(ShownChanges, HaveTheLinesOfBackupsInJson)
+{
+    EXPECT_EQ(mihost::listToJson(
+                  mihost::shownChanges({texts("/etc/passwd-", "a\n", "b\n")}, "", Secrets::Hide))
                   .dump(),
-              R"(["b"])");
+              R"([{"file":"/etc/passwd-","change":"changed","kind":"file",)"
+              R"("removed":["a"],"added":["b"],"backup":true}])");
+}
+
+TEST(ShownChanges, AreNoBackupsOfFilesThatOnlyLookLikeOne)
+{
+    for (std::string const path : {"/home/jdoe/notes-", "/etc/hosts-", "/etc/subuid"})
+        EXPECT_EQ(shown({texts(path, "1:2\n", "1:3\n")}),
+                  "changed " + path + "\n  - 1:2\n  + 1:3\n");
 }
 
 TEST(ShownChanges, LeaveOutLockFilesAndTheProgramsOwnFiles)

@@ -1,3 +1,4 @@
+#include "host/Methods.h"
 #include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/commands/GroupView.h"
 #include "mihost/cli/commands/TaskCommand.h"
@@ -8,15 +9,16 @@ namespace mihost
 namespace
 {
 
-constexpr TaskValue localGroup = {"GROUP", "LocalGroupName", "", "the group's name"};
-constexpr TaskValue memberOfGroup = {"USER", "DomainAndMember", "", "login name of the member"};
+constexpr TaskValue localGroup = {"GROUP", IC::parameter::localGroupName, "", "the group's name"};
+constexpr TaskValue memberOfGroup = {"USER", IC::parameter::domainAndMember, "",
+                                     "login name of the member"};
 
 std::vector<Task> const groupTasks = {
     {
         "add",
         "add a group",
-        "LocalGroupAdd",
-        {{"NAME", "GroupName", "", "name of the new group"}},
+        IC::method::localGroupAdd,
+        {{"NAME", IC::parameter::groupName, "", "name of the new group"}},
         {
             {"mihost group add builders", "add a group"},
             {"mihost --json group add builders", "print what changed as JSON"},
@@ -25,8 +27,8 @@ std::vector<Task> const groupTasks = {
     Task{
         "delete",
         "delete a group",
-        "LocalGroupDel",
-        {{"GROUP", "GroupName", "", "the group's name"}},
+        IC::method::localGroupDel,
+        {{"GROUP", IC::parameter::groupName, "", "the group's name"}},
         {
             {"mihost group delete staff", "delete after a prompt"},
             {"mihost --sandbox group delete staff -y", "try it in a sandbox"},
@@ -36,7 +38,7 @@ std::vector<Task> const groupTasks = {
     {
         "add-member",
         "add a user to a group",
-        "LocalGroupAddUser",
+        IC::method::localGroupAddUser,
         {localGroup, memberOfGroup},
         {
             {"mihost group add-member staff jdoe", "make jdoe a member of staff"},
@@ -46,7 +48,7 @@ std::vector<Task> const groupTasks = {
     {
         "remove-member",
         "remove a user from a group",
-        "LocalGroupDelUser",
+        IC::method::localGroupDelUser,
         {localGroup, memberOfGroup},
         {
             {"mihost group remove-member crew jdoe", "remove jdoe from crew"},

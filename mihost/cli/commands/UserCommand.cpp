@@ -1,3 +1,4 @@
+#include "host/Methods.h"
 #include "mihost/cli/commands/CommandRows.h"
 #include "mihost/cli/commands/TaskCommand.h"
 #include "mihost/cli/commands/UserView.h"
@@ -8,34 +9,34 @@ namespace mihost
 namespace
 {
 
-constexpr TaskValue account = {"USER", "UserName", "", "login name"};
-constexpr TaskValue minDays = {"--min-days", "daysMustKeepPassword", "N",
+constexpr TaskValue account = {"USER", IC::parameter::userName, "", "login name"};
+constexpr TaskValue minDays = {"--min-days", IC::parameter::daysMustKeepPassword, "N",
                                "set the minimum password age in days"};
-constexpr TaskValue maxDays = {"--max-days", "daysMustChangePasswordAfter", "N",
+constexpr TaskValue maxDays = {"--max-days", IC::parameter::daysMustChangePasswordAfter, "N",
                                "set the maximum password age in days"};
-constexpr TaskValue warnDays = {"--warn-days", "daysWarnBeforePasswordExpire", "N",
+constexpr TaskValue warnDays = {"--warn-days", IC::parameter::daysWarnBeforePasswordExpire, "N",
                                 "warn N days before the password expires"};
-constexpr TaskValue inactiveDays = {"--inactive-days", "daysExpireAfter", "N",
+constexpr TaskValue inactiveDays = {"--inactive-days", IC::parameter::daysExpireAfter, "N",
                                     "disable the account N days after the password expires"};
 
 std::vector<Task> const userTasks = {
     {
         "add",
         "add an account",
-        "UserAdd",
+        IC::method::userAdd,
         {
-            {"NAME", "UserName", "", "login name of the new account"},
-            {"--full-name", "Comment", "FULL-NAME", "set the full name"},
-            {"--home", "HomeDir", "DIR", "set the home directory"},
-            {"--shell", "ScriptPath", "FILE", "set the login shell"},
-            {"--password", "Password", "",
+            {"NAME", IC::parameter::userName, "", "login name of the new account"},
+            {"--full-name", IC::parameter::comment, "FULL-NAME", "set the full name"},
+            {"--home", IC::parameter::homeDir, "DIR", "set the home directory"},
+            {"--shell", IC::parameter::scriptPath, "FILE", "set the login shell"},
+            {"--password", IC::parameter::password, "",
              "set a password, read from a prompt or standard input; without one, login by password "
              "is disabled"},
             minDays,
             maxDays,
             warnDays,
             inactiveDays,
-            {"--expires", "passwordExpirationDate", "DAY",
+            {"--expires", IC::parameter::passwordExpirationDate, "DAY",
              "expire the account on DAY, YYYY-MM-DD or never"},
         },
         {
@@ -47,7 +48,7 @@ std::vector<Task> const userTasks = {
     Task{
         "delete",
         "delete an account, keeping its home directory and mail",
-        "UserDel",
+        IC::method::userDel,
         {account},
         {
             {"mihost user delete jdoe", "delete after a prompt"},
@@ -58,8 +59,8 @@ std::vector<Task> const userTasks = {
     {
         "set-shell",
         "set an account's login shell",
-        "UserSetScriptPath",
-        {account, {"SHELL", "ScriptPath", "FILE", "absolute path of the shell"}},
+        IC::method::userSetScriptPath,
+        {account, {"SHELL", IC::parameter::scriptPath, "FILE", "absolute path of the shell"}},
         {
             {"mihost user set-shell jdoe /bin/bash", "set the shell"},
             {"mihost user set-shell jdoe /usr/sbin/nologin", "refuse logins"},
@@ -68,8 +69,9 @@ std::vector<Task> const userTasks = {
     {
         "set-home",
         "move an account's home directory",
-        "UserSetHomeDir",
-        {account, {"HOME", "HomeDir", "DIR", "absolute path; the files are moved there"}},
+        IC::method::userSetHomeDir,
+        {account,
+         {"HOME", IC::parameter::homeDir, "DIR", "absolute path; the files are moved there"}},
         {
             {"mihost user set-home jdoe /srv/jdoe", "move the directory"},
             {"mihost --sandbox user set-home jdoe /srv/jdoe", "show which files would move"},
@@ -78,8 +80,8 @@ std::vector<Task> const userTasks = {
     {
         "set-name",
         "set an account's full name",
-        "UserSetFullName",
-        {account, {"FULL-NAME", "FullName", "", "full name"}},
+        IC::method::userSetFullName,
+        {account, {"FULL-NAME", IC::parameter::fullName, "", "full name"}},
         {
             {"mihost user set-name jdoe 'Jane Doe'", "set the full name"},
             {"mihost --json user set-name jdoe 'Jane Doe'", "print what changed as JSON"},
@@ -88,8 +90,8 @@ std::vector<Task> const userTasks = {
     {
         "set-password",
         "set an account's password, read from a prompt or standard input",
-        "UserSetPassword",
-        {account, {"--password", "Password", "", ""}},
+        IC::method::userSetPassword,
+        {account, {"--password", IC::parameter::password, "", ""}},
         {
             {"mihost user set-password jdoe", "prompt for the password"},
             {"mihost user set-password jdoe --password-file /root/secret", "read it from a file"},
@@ -98,8 +100,8 @@ std::vector<Task> const userTasks = {
     {
         "expire",
         "set the day on which an account expires",
-        "UserSetAttrib",
-        {account, {"DAY", "passwordExpirationDate", "", "YYYY-MM-DD or never"}},
+        IC::method::userSetAttrib,
+        {account, {"DAY", IC::parameter::passwordExpirationDate, "", "YYYY-MM-DD or never"}},
         {
             {"mihost user expire jdoe 2030-12-31", "expire the account on that day"},
             {"mihost user expire jdoe never", "remove the expiry date"},
@@ -108,7 +110,7 @@ std::vector<Task> const userTasks = {
     Task{
         "age",
         "set an account's password ageing",
-        "UserSetAttrib",
+        IC::method::userSetAttrib,
         {account, minDays, maxDays, warnDays, inactiveDays},
         {
             {"mihost user age jdoe --max-days 90 --warn-days 14",

@@ -14,8 +14,7 @@ namespace mihost
 constexpr char columnGap[] = "  ";
 constexpr std::size_t gapWidth = sizeof columnGap - 1;
 
-/** Prints texts in columns, by libsmartcols. A cell may have several lines, which are not wrapped.
- */
+/** Prints texts in columns, by libsmartcols. A cell may have several lines; none is wrapped. */
 class ColumnPrinter
 {
 public:

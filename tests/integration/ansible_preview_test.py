@@ -3,7 +3,7 @@
 import unittest
 
 from support import environment
-from support.ansible import Controller, task
+from support.ansible import Controller
 
 # name, how the machine gets into that state, whether the account has a home directory, a part of the
 # real error message, and of the predicted one

@@ -3,8 +3,9 @@
 import socket
 import subprocess
 
-from support import cockpit
-from support.cockpit import Keys, PageTest
+from support import cockpit, machine
+from support.browser import Keys
+from support.cockpit import PageTest
 
 CARL = 'carl:x:1002:100:Carl Example:/home/carl:/bin/sh'
 CARL_WITH_BASH = 'carl:x:1002:100:Carl Example:/home/carl:/bin/bash'
@@ -13,7 +14,7 @@ PASSWORD = 'Correct-Horse9'
 
 class ChangeTest(PageTest):
     def setUp(self):
-        cockpit.lay_machine()
+        machine.lay()
 
     def open_account(self, name):
         self.browser.open('users')
@@ -40,7 +41,7 @@ class ChangeTest(PageTest):
 
     def assert_unchanged(self, *names):
         for name in names:
-            self.assertEqual(cockpit.read(f'/etc/{name}'), cockpit.read(f'{cockpit.MACHINE}/etc/{name}'), name)
+            self.assertEqual(machine.read(f'/etc/{name}'), machine.read(f'{machine.MACHINE}/etc/{name}'), name)
         self.assertEqual(self.changes(), [])
 
     def can_apply(self):
@@ -69,7 +70,7 @@ class Accounts(ChangeTest):
         self.start_shell_change()
         self.preview()
         self.apply()
-        self.assertEqual(cockpit.accounts_file('passwd')['carl'], CARL_WITH_BASH)
+        self.assertEqual(machine.accounts_file('passwd')['carl'], CARL_WITH_BASH)
         self.assertEqual(self.changes(), ['--json --yes user set-shell -- carl /bin/bash'])
         self.browser.see('#account', '/bin/bash')
 
@@ -121,7 +122,7 @@ class Accounts(ChangeTest):
         self.browser.tab_to('#preview-apply')
         self.browser.press(Keys.ENTER)
         self.browser.see('#notice', 'Done: ')
-        self.assertEqual(cockpit.accounts_file('passwd')['carl'], CARL_WITH_BASH)
+        self.assertEqual(machine.accounts_file('passwd')['carl'], CARL_WITH_BASH)
 
     def test_escape_cancels(self):
         self.start_shell_change()
@@ -136,7 +137,7 @@ class Accounts(ChangeTest):
         self.browser.act('#field-expires', lambda field: field.send_keys('02032031'))  # as it is typed in English
         self.preview()
         self.apply()
-        self.assertEqual(cockpit.accounts_file('shadow')['carl'].split(':')[7], '22313')  # that day, since 1970
+        self.assertEqual(machine.accounts_file('shadow')['carl'].split(':')[7], '22313')  # that day, since 1970
 
     def test_changes_ageing(self):
         self.open_account('carl')
@@ -147,7 +148,7 @@ class Accounts(ChangeTest):
         self.fill(**{'max-days': '60', 'warn-days': '7'})
         self.preview()
         self.apply()
-        self.assertEqual(cockpit.accounts_file('shadow')['carl'].split(':')[3:7], ['1', '60', '7', '30'])
+        self.assertEqual(machine.accounts_file('shadow')['carl'].split(':')[3:7], ['1', '60', '7', '30'])
 
     def test_adds_an_account_with_a_group(self):
         self.browser.open('users')
@@ -156,15 +157,15 @@ class Accounts(ChangeTest):
         self.browser.see('#preview', 'Enter a value.')
         self.fill(**{'user': 'dora', 'full-name': 'Dora D', 'shell': '/bin/sh'})
         self.preview()
-        self.assertNotIn('dora', cockpit.accounts_file('passwd'))
+        self.assertNotIn('dora', machine.accounts_file('passwd'))
         self.apply()
-        self.assertEqual(cockpit.accounts_file('passwd')['dora'], 'dora:x:1003:100:Dora D:/home/dora:/bin/sh')
+        self.assertEqual(machine.accounts_file('passwd')['dora'], 'dora:x:1003:100:Dora D:/home/dora:/bin/sh')
         self.browser.button('dora', '#users-table')
         self.browser.click('#user-groups-add')
         self.fill(group='team')
         self.preview()
         self.apply()
-        self.assertEqual(cockpit.accounts_file('group')['team'], 'team:x:1500:anna,ben,carl,dora')
+        self.assertEqual(machine.accounts_file('group')['team'], 'team:x:1500:anna,ben,carl,dora')
         self.browser.see('#account', 'team')
 
     def test_deletes_only_if_the_name_is_typed(self):
@@ -179,7 +180,7 @@ class Accounts(ChangeTest):
         self.assert_unchanged('passwd', 'shadow', 'group')
         self.browser.type('#confirm-name', 'carl')
         self.apply()
-        self.assertNotIn('carl', cockpit.accounts_file('passwd'))
+        self.assertNotIn('carl', machine.accounts_file('passwd'))
         self.browser.see('#users-table', 'ben')
         self.browser.not_seen('#users-table', 'carl')
 
@@ -196,13 +197,13 @@ class Password(ChangeTest):
         self.assert_seen_nowhere()
         self.apply()
         self.assert_seen_nowhere()
-        secret = cockpit.accounts_file('shadow')['carl'].split(':')[1]
+        secret = machine.accounts_file('shadow')['carl'].split(':')[1]
         check = ['perl', '-e', 'print crypt($ARGV[0], $ARGV[1])', PASSWORD, secret]
         self.assertEqual(subprocess.run(check, capture_output=True, text=True).stdout, secret)
 
     def assert_seen_nowhere(self):
         """Neither as an argument of a process nor in the page, its address or its storage."""
-        processes = cockpit.read(cockpit.PROCESSES)
+        processes = machine.read(cockpit.PROCESSES)
         self.assertIn('cockpit-bridge', processes)
         self.assertIn('user set-password -- carl', '\n'.join(cockpit.calls()))
         for text in (
@@ -241,7 +242,7 @@ class Machine(ChangeTest):
         self.browser.see('#log-lines', 'three')
         self.browser.click('#log-clear')
         self.refuse_then_confirm()
-        self.assertEqual(cockpit.read('/var/log/messages'), '')
+        self.assertEqual(machine.read('/var/log/messages'), '')
         self.browser.not_seen('#log-lines', 'three')
 
     def test_restarts_only_if_its_name_is_typed(self):
@@ -264,13 +265,13 @@ class Groups(ChangeTest):
         self.fill(group='crew')
         self.preview()
         self.apply()
-        self.assertEqual(cockpit.accounts_file('group')['crew'], 'crew:x:1501:')
+        self.assertEqual(machine.accounts_file('group')['crew'], 'crew:x:1501:')
         self.browser.button('crew', '#groups-table')
         self.browser.click('#group-delete')
         self.preview()
         self.browser.type('#confirm-name', 'crew')
         self.apply()
-        self.assertNotIn('crew', cockpit.accounts_file('group'))
+        self.assertNotIn('crew', machine.accounts_file('group'))
 
     def test_removes_a_member(self):
         self.browser.open('groups')
@@ -278,7 +279,7 @@ class Groups(ChangeTest):
         self.browser.button('Remove user ben', '#group')
         self.preview()
         self.apply()
-        self.assertEqual(cockpit.accounts_file('group')['team'], 'team:x:1500:anna,carl')
+        self.assertEqual(machine.accounts_file('group')['team'], 'team:x:1500:anna,carl')
 
 
 class Unprivileged(ChangeTest):

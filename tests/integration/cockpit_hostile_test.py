@@ -3,7 +3,7 @@
 import re
 import urllib.request
 
-from support import cockpit
+from support import cockpit, machine
 from support.cockpit import PageTest
 
 MARKUP = '<img src=x onerror="window.ran=1"><b>bold</b>'
@@ -15,13 +15,13 @@ CONTROLS = 'bell \a escape \x1b[31m back \b\b end \u202etxt.exe'
 class Hostile(PageTest):
     @classmethod
     def prepare(cls):
-        cockpit.lay_machine()
-        passwd = cockpit.read('/etc/passwd').replace('Anna,,,', MARKUP).replace('Ben', SCRIPT)
-        cockpit.write('/etc/passwd', passwd)
+        machine.lay()
+        passwd = machine.read('/etc/passwd').replace('Anna,,,', MARKUP).replace('Ben', SCRIPT)
+        machine.write('/etc/passwd', passwd)
         with open('/etc/group', 'a') as groups:
             groups.write(f'{GROUP}:x:1600:carl\n')
-        cockpit.write('/usr/sbin/modinfo', f"#!/bin/sh\necho 'version:        {MARKUP}'\n", 0o755)
-        cockpit.write('/var/log/messages', cockpit.log_lines([MARKUP, SCRIPT, CONTROLS]))
+        machine.write('/usr/sbin/modinfo', f"#!/bin/sh\necho 'version:        {MARKUP}'\n", 0o755)
+        machine.write('/var/log/messages', machine.log_lines([MARKUP, SCRIPT, CONTROLS]))
 
     def setUp(self):
         self.browser.open()

@@ -5,7 +5,7 @@ import shutil
 import subprocess
 import time
 
-from support import cockpit, environment
+from support import cockpit, environment, machine
 
 ACCOUNTS = ('root', 'anna', 'ben', 'carl')
 PASSWORD = 'correct horse'
@@ -16,14 +16,14 @@ class Login(cockpit.PageTest):
 
     @classmethod
     def prepare(cls):
-        cockpit.lay_machine()
+        machine.lay()
         changed = int(time.time()) // 86400 - 20
-        cockpit.write('/etc/shadow', ''.join(f'{name}:*:{changed}:0:90:14:30::\n' for name in ACCOUNTS), 0o600)
+        machine.write('/etc/shadow', ''.join(f'{name}:*:{changed}:0:90:14:30::\n' for name in ACCOUNTS), 0o600)
         shutil.copy(environment.daemon('/etc/pam.d/cockpit'), '/etc/pam.d/cockpit')
         # Newer versions leave the session of a login to systemd, unless there is a command.
         if os.path.exists(environment.daemon('/usr/lib/systemd/system/cockpit-session.socket')):
             session = environment.daemon('/usr/lib/cockpit/cockpit-session')
-            cockpit.write('/etc/cockpit/cockpit.conf', f'[Basic]\nCommand = {session}\n')
+            machine.write('/etc/cockpit/cockpit.conf', f'[Basic]\nCommand = {session}\n')
         subprocess.run(['chpasswd'], input=f'root:{PASSWORD}\nanna:{PASSWORD}\n', text=True, check=True)
 
     def log_in(self, name):

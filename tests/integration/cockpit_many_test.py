@@ -1,6 +1,6 @@
 """Ten thousand users and a log of a million lines."""
 
-from support import cockpit
+from support import cockpit, machine
 from support.cockpit import PageTest
 
 USERS = 10000
@@ -10,7 +10,7 @@ LINES = 1000000
 class Many(PageTest):
     @classmethod
     def prepare(cls):
-        cockpit.lay_machine()
+        machine.lay()
         names = [f'user{number:05}' for number in range(USERS)]
         with open('/etc/passwd', 'a') as accounts:
             accounts.writelines(
@@ -21,7 +21,7 @@ class Many(PageTest):
             secrets.writelines(f'{name}:!:14000:1:90:14:30:15000:\n' for name in names)
         with open('/var/log/messages', 'w') as log:
             for first in range(0, LINES, 1000):
-                log.write(cockpit.log_lines(f'line {number}' for number in range(first, first + 1000)))
+                log.write(machine.log_lines(f'line {number}' for number in range(first, first + 1000)))
 
     def few(self, css):
         """Expects far fewer elements than there are users or lines."""

@@ -2,7 +2,7 @@
 
 import os
 
-from support import cockpit, environment
+from support import cockpit, environment, machine
 from support.cockpit import PageTest
 
 GO = '/run/go-on'
@@ -82,7 +82,7 @@ class States(PageTest):
         cockpit.install_mihost(SLOW)
         self.browser.open()
         self.state('slow', 'taking long')
-        cockpit.write(GO, '')
+        machine.write(GO, '')
         self.addCleanup(os.unlink, GO)
         self.browser.see('#tree', 'anna')
         self.browser.gone('#state [data-state=slow]')

@@ -5,7 +5,9 @@ import io
 import subprocess
 
 from support import cockpit, environment
-from support.cockpit import Keys, PageTest
+from support.browser import Keys
+from support.cockpit import PageTest
+from support.wait import until
 
 
 def rows(*arguments):
@@ -26,7 +28,7 @@ class Tree(PageTest):
 
     def listed(self, *addresses):
         """Waits until exactly these nodes are listed."""
-        cockpit.until(lambda: self.addresses() == list(addresses), lambda: str(self.addresses()))
+        until(lambda: self.addresses() == list(addresses), lambda: str(self.addresses()))
 
     def choose(self, address):
         self.browser.click(f'#tree [data-address="{address}"]')
@@ -38,7 +40,7 @@ class Tree(PageTest):
         expected = [row['address'] for row in rows('tree')]
         self.assertEqual(self.addresses(), [each for each in expected if not each.startswith('log:')])
         self.browser.click('#tree [data-address=log] .mi-tree__toggle')
-        cockpit.until(lambda: len(self.addresses()) == len(expected), 'the log does not open')
+        until(lambda: len(self.addresses()) == len(expected), 'the log does not open')
         self.assertEqual(self.addresses(), expected)
 
     def test_search_keeps_what_matches_and_its_parents(self):
@@ -50,7 +52,7 @@ class Tree(PageTest):
 
     def test_kind_filter_keeps_the_nodes_of_one_kind(self):
         self.browser.click('#kind-filter option[value=group]')
-        cockpit.until(lambda: 'user:anna' not in self.addresses(), 'users stay')
+        until(lambda: 'user:anna' not in self.addresses(), 'users stay')
         groups = [each for each in self.addresses() if each.startswith('group:')]
         self.assertEqual(groups, ['group:root', 'group:anna', 'group:ben', 'group:team'])
 
@@ -75,7 +77,7 @@ class Tree(PageTest):
         more = [subprocess.Popen(['sleep', '1000']) for _ in range(40)]
         try:
             # The kernel counts the processes of the whole machine, and others may end meanwhile.
-            cockpit.until(lambda: int(self.value('process-count')) != before, 'the figure stays')
+            until(lambda: int(self.value('process-count')) != before, 'the figure stays')
         finally:
             for process in more:
                 process.kill()

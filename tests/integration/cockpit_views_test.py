@@ -3,8 +3,9 @@
 import json
 import subprocess
 
-from support import cockpit, environment
+from support import cockpit, environment, machine
 from support.cockpit import PageTest
+from support.wait import until
 
 
 class Views(PageTest):
@@ -13,7 +14,7 @@ class Views(PageTest):
         return self.browser.attributes(f'{table} tr[data-name]', 'data-name')
 
     def listed(self, table, *names):
-        cockpit.until(lambda: self.names(table) == list(names), lambda: f'{table}: {self.names(table)}')
+        until(lambda: self.names(table) == list(names), lambda: f'{table}: {self.names(table)}')
 
     def test_users_are_sorted_by_any_column(self):
         self.browser.open('users')
@@ -96,7 +97,7 @@ class Views(PageTest):
 
 class Log(PageTest):
     def setUp(self):
-        cockpit.write('/var/log/messages', cockpit.log_lines(['one', 'two', 'three']))
+        machine.write('/var/log/messages', machine.log_lines(['one', 'two', 'three']))
         self.browser.open('log')
         self.browser.see('#log-lines', 'one', 'two', 'three')
 
@@ -105,7 +106,7 @@ class Log(PageTest):
 
     def add(self, *messages):
         with open('/var/log/messages', 'a') as log:
-            log.write(cockpit.log_lines(messages))
+            log.write(machine.log_lines(messages))
 
     def test_filter_keeps_the_lines_that_match(self):
         self.browser.type('#log-filter', 'T')
@@ -123,8 +124,8 @@ class Log(PageTest):
     def test_follows_only_while_switched_on(self):
         self.browser.click('#panel-log .pf-v6-c-switch')
         self.browser.wait('return document.querySelector("#panel-log [aria-busy]")?.ariaBusy !== "true"')
-        cockpit.until(lambda: self.shown() == ['one', 'two', 'three'], 'the lines are not read again')
-        cockpit.until(lambda: not cockpit.running('--follow'), 'mihost goes on')
+        until(lambda: self.shown() == ['one', 'two', 'three'], 'the lines are not read again')
+        until(lambda: not cockpit.running('--follow'), 'mihost goes on')
         self.add('four')
         self.browser.click('#panel-log .pf-v6-c-switch')
         self.browser.see('#log-lines', 'four')

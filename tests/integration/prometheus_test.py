@@ -8,19 +8,17 @@ import os
 import re
 import shutil
 import subprocess
-import sys
 import tempfile
-import time
 import unittest
 import urllib.error
 import urllib.parse
 import urllib.request
 
-from support import environment
+from support import environment, machine
+from support.wait import until
 
 PROMETHEUS = os.path.join(environment.SOURCE, 'integrations', 'prometheus')
 EXPORTER = os.path.join(environment.BIN, 'mihost-exporter')
-MACHINE = os.path.join(environment.SOURCE, 'tests', 'machines', 'users-and-groups')
 
 EXPORTER_PORT, NODE_PORT, PROMETHEUS_PORT = 9811, 9100, 9090
 
@@ -34,23 +32,6 @@ scrape_configs:
 '''
 
 
-def prepare_machine():
-    """An invented machine with modules and a log."""
-    shutil.copytree(MACHINE, '/', dirs_exist_ok=True)
-    os.chmod('/etc/shadow', 0o600)
-    for name, script in (
-        ('lsmod', 'echo Module Size Used by; echo one 1 0; echo two 1 0'),
-        ('modinfo', 'echo "version:        1.$1"'),
-    ):
-        path = f'/usr/sbin/{name}'
-        os.unlink(path)
-        with open(path, 'w') as program:
-            program.write(f'#!/bin/sh\n{script}\n')
-        os.chmod(path, 0o755)
-    with open('/var/log/messages', 'w') as log:
-        log.write(time.strftime('%b %e %H:%M:%S host test: one\n') * 3)
-
-
 def get(port, path, method='GET'):
     """Returns the status, content type and body of the answer."""
     request = urllib.request.Request(f'http://127.0.0.1:{port}{path}', method=method)
@@ -62,19 +43,9 @@ def get(port, path, method='GET'):
             return error.code, error.headers['Content-Type'], error.read().decode()
 
 
-def until(condition, what):
-    """Waits until the condition is true and returns it; fails only after two minutes."""
-    deadline = time.monotonic() + 120
-    while True:
-        try:
-            result = condition()
-        except (urllib.error.URLError, ConnectionError, json.JSONDecodeError):
-            result = None
-        if result:
-            return result
-        if time.monotonic() > deadline:
-            raise TimeoutError(what)
-        time.sleep(0.1)
+def until_served(condition, what):
+    """As until, while nothing answers or half an answer comes."""
+    return until(condition, what, retry=(urllib.error.URLError, ConnectionError, json.JSONDecodeError))
 
 
 def query(expression):
@@ -115,7 +86,7 @@ class Daemons(unittest.TestCase):
 class Exporter(Daemons):
     def setUp(self):
         self.process = self.start_exporter(EXPORTER_PORT, environment.MIHOST, 'metrics')
-        until(lambda: get(EXPORTER_PORT, '/')[0] == 404, 'no exporter')
+        until_served(lambda: get(EXPORTER_PORT, '/')[0] == 404, 'no exporter')
 
     def tearDown(self):
         self.process.terminate()
@@ -138,7 +109,7 @@ class Exporter(Daemons):
 
     def test_command_does_not_get_the_socket(self):
         self.start_exporter(9812, '/bin/sh', '-c', 'env; ls -l /proc/$$/fd')
-        body = until(lambda: get(9812, '/metrics')[2], 'no exporter')
+        body = until_served(lambda: get(9812, '/metrics')[2], 'no exporter')
         self.assertIn('PATH=', body)
         self.assertNotIn('LISTEN_', body)
         self.assertIn('pipe:', body)
@@ -148,7 +119,7 @@ class Exporter(Daemons):
 class ExporterAlone(Daemons):
     def test_says_when_there_are_no_metrics(self):
         self.start_exporter(9813, '/bin/false')
-        status, _, body = until(lambda: get(9813, '/metrics'), 'no exporter')
+        status, _, body = until_served(lambda: get(9813, '/metrics'), 'no exporter')
         self.assertEqual((status, body), (500, 'mihost printed no metrics\n'))
 
     def test_needs_a_socket(self):
@@ -232,7 +203,7 @@ class Scraped(Daemons):
             f'--storage.tsdb.path={cls.folder}/data', f'--web.listen-address=127.0.0.1:{PROMETHEUS_PORT}',
         )
         for job in ('direct', 'textfile'):
-            until(lambda: query(f'mi_collection_success{{job="{job}"}}'), f'no metrics of {job}')
+            until_served(lambda: query(f'mi_collection_success{{job="{job}"}}'), f'no metrics of {job}')
 
     def value(self, expression):
         samples = query(expression)
@@ -275,10 +246,10 @@ class Scraped(Daemons):
             [environment.MIHOST, '--plugin', '/none', 'metrics', '--output', self.textfile], stderr=subprocess.DEVNULL
         )
         try:
-            until(lambda: self.value('mi_collection_success{job="textfile"}') == 0, 'the failure is not seen')
+            until_served(lambda: self.value('mi_collection_success{job="textfile"}') == 0, 'the failure is not seen')
         finally:
             mihost('metrics', '--accounts', '--output', self.textfile)
-            until(lambda: self.value('mi_collection_success{job="textfile"}') == 1, 'no metrics any more')
+            until_served(lambda: self.value('mi_collection_success{job="textfile"}') == 1, 'no metrics any more')
 
     def test_every_query_of_the_dashboard_has_an_answer(self):
         with open(os.path.join(PROMETHEUS, 'grafana', 'mihost.json')) as file:
@@ -313,7 +284,7 @@ class Tools(unittest.TestCase):
 
 
 def setUpModule():
-    prepare_machine()
+    machine.lay()
 
 
 if __name__ == '__main__':

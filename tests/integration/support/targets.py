@@ -6,8 +6,8 @@ import subprocess
 import sys
 
 from support import environment
+from support.machine import MACHINE
 
-MACHINE = os.path.join(environment.SOURCE, 'tests', 'machines', 'users-and-groups')
 SCRIPT = os.path.join(os.path.dirname(__file__), 'target.py')
 
 

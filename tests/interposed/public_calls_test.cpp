@@ -135,14 +135,14 @@ TEST_F(PublicCalls, TheGroupListingSetsTheMembersOfEachGroup)
 
 TEST_F(PublicCalls, TheListingsReadBothBoundsForEveryEntry)
 {
-    files_.write("/etc/group", "team:x:500:\ncrew:x:501:\n");
+    files_.write("/etc/group", "root:x:0:\ntty:x:5:\nteam:x:500:\n");
     files_.write("/etc/passwd", "root:x:0:0:::\ndaemon:x:2:2:::\njdoe:x:1000:1000:::\n");
     standIns() = {};
     std::vector<NQ::groupInfo> groups;
     NQ::getGroupInfo(groups);
-    EXPECT_EQ(allBut("set"),
-              (Calls{"getMinGroupId", "getMaxGroupId", "getMinGroupId", "getMaxGroupId"}));
-    EXPECT_EQ(standIns().calls, Calls(4, "Instance"));
+    EXPECT_EQ(allBut("set"), (Calls{"getMinGroupId", "getMaxGroupId", "getMinGroupId",
+                                    "getMaxGroupId", "getMinGroupId", "getMaxGroupId"}));
+    EXPECT_EQ(standIns().calls, Calls(6, "Instance"));
 
     standIns() = {};
     std::vector<NQ::userInfo> users;

@@ -7,6 +7,7 @@
 
 #include <string>
 #include <typeinfo>
+#include <utility>
 #include <vector>
 
 namespace driver_nodes_test
@@ -70,6 +71,18 @@ TEST_F(DriverNodes, AreSetUpInTheOrderThatHostsSee)
     frame.createDriverNodes();
     EXPECT_EQ(calls.calls, (Lines{"setStatus(1)", "setDescription(Disk)", "setProperty(134)",
                                   "setProperty(108)", "setProperty(70)", "setProperty(36)"}));
+}
+
+TEST_F(DriverNodes, ReadTheirParentsIdOnceEachAfterTakingTheirOwn)
+{
+    commands.answers = {{"lsmod", "xfs 1 0\nloop 1 0\n"}};
+    commands.otherwise = "";
+    CountingParent parent(frame);
+    IC::MutableNode* const real = std::exchange(frame.osNode_, &parent);
+    frame.createDriverNodes();
+    frame.osNode_ = real;
+    EXPECT_EQ(drivers().size(), 2U);
+    EXPECT_TRUE(CountingParent::wasReadInOrder(drivers()));
 }
 
 TEST_F(DriverNodes, AreNotBuiltWhenLsmodCannotBeStarted)

@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <string>
 #include <typeinfo>
+#include <utility>
 #include <vector>
 
 namespace log_nodes_test
@@ -127,6 +128,22 @@ TEST_F(LogNodes, HaveOneEntryForEachLineNewestFirst)
     EXPECT_TRUE(frame.published.empty());
 }
 
+TEST_F(LogNodes, ReadTheirParentsIdOnceEachAfterTakingTheirOwn)
+{
+    haveLines(2);
+    CountingParent system(frame);
+    IC::MutableNode* const realSystem = std::exchange(frame.osNode_, &system);
+    frame.createLogNodes();
+    frame.osNode_ = realSystem;
+    EXPECT_TRUE(CountingParent::wasReadInOrder(frame.ofType(35)));
+    CountingParent log(frame);
+    IC::MutableNode* const realLog = std::exchange(frame.logNode_, &log);
+    frame.createLogEntryNodes(false);
+    frame.logNode_ = realLog;
+    EXPECT_EQ(entries().size(), 2U);
+    EXPECT_TRUE(CountingParent::wasReadInOrder(entries()));
+}
+
 TEST_F(LogNodes, SetAnEntryUpInTheOrderThatHostsAndTheShellSee)
 {
     haveLines(1);
@@ -209,8 +226,12 @@ TEST_F(LogNodes, LeaveMessageAndTimeUnsetIfTheLogShrinks)
     haveLines(0);
     commands.first[systemLog::count] = {"2 f\n"};
     commands.answers[systemLog::line(0)] = "";
+    Recording const recording;
     build();
     ASSERT_EQ(entries().size(), 2U);
+    EXPECT_EQ(recording.texts(6000),
+              (Lines{"Invalid format: buffer = ", "Invalid index: getMaxLine()=0, Index=2",
+                     "Invalid index: getMaxLine()=0, logIndex=2"})); // each is tried
     EXPECT_EQ(storedValue(*entries()[0], 81), "text ** true"); // one past the oldest is accepted
     EXPECT_EQ(storedValue(*entries()[1], 81), "unset");
     EXPECT_EQ(storedValue(*entries()[1], 79), "unset");

@@ -64,19 +64,36 @@ public:
     std::vector<IC::Node*> deleted;
 };
 
-/** A node that returns another id at each call: 101, 102 and so on. */
-class Counter : public IC::MutableNode
+/**
+ * A parent whose id shows when it is read: 1000 for each read so far, plus the interface's next
+ * node id at that moment.
+ */
+class CountingParent : public IC::MutableNode
 {
 public:
-    Counter() : MutableNode(100, 0, {7}, IC::nodeType::operatingSystem, 0) {}
+    explicit CountingParent(Frame const& frame)
+        : MutableNode(100, 0, {7}, IC::nodeType::operatingSystem, 0), frame_(frame)
+    {
+    }
 
     unsigned int getNodeId() const override
     {
-        return ++id_;
+        return 1000 * ++reads_ + frame_.nextNodeId_;
+    }
+
+    /** Whether each node read it once, after taking its own id. */
+    static bool wasReadInOrder(std::vector<IC::MutableNode*> const& nodes)
+    {
+        unsigned int reads = 0;
+        for (IC::MutableNode const* node : nodes)
+            if (node->getLinkedId() != 1000 * ++reads + node->getNodeId() + 1)
+                return false;
+        return true;
     }
 
 private:
-    mutable unsigned int id_ = 100;
+    Frame const& frame_;
+    mutable unsigned int reads_ = 0;
 };
 
 /** @return a stored property as shown() writes it; "unset" if there is none */

@@ -163,7 +163,10 @@ TEST_F(DriverInventory, ReplacesWhatTheVectorHeld)
     EXPECT_EQ(commands.ran, Lines{"lsmod"});
     commands.answers = {{"lsmod", "loop 1 0\n"}, {"modinfo loop", ""}};
     drivers.resize(3);
+    std::vector<std::size_t> atStart;
+    libc::hooks().popen.watch([&](char const*, char const*) { atStart.push_back(drivers.size()); });
     NQ::getDriverInfo(drivers);
+    EXPECT_EQ(atStart, std::vector<std::size_t>(2, 0)); // emptied first
     EXPECT_EQ(factsOf(drivers), Lines{"loop||Driver"});
 }
 

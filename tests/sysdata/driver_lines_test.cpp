@@ -1,5 +1,7 @@
 #include "sysdata/driverInfo_linux.h"
 #include "sysdata/driverInfo_parse.h"
+#include "tests/support/Lines.h"
+#include "tests/support/Recording.h"
 
 #include <gtest/gtest.h>
 
@@ -115,7 +117,12 @@ TEST(DriverCompletion, DefaultsWhatWasNeverSeen)
     Facts facts;
     facts.driver.setBuildNumber("1");
     facts.driver.setManufacturer("m");
+    Recording const log;
     complete(facts.driver, facts.seen, "loop");
+    EXPECT_EQ(log.texts(), (Lines{"setVersion: entry", "setVersion: exit", "setDescription: entry",
+                                  "setDescription: exit", "setName: entry", "setName: exit",
+                                  "setBuildNumber: entry", "setBuildNumber: exit",
+                                  "setManufacturer: entry", "setManufacturer: exit"}));
     EXPECT_EQ(facts.driver.getName(), "loop");
     EXPECT_EQ(facts.driver.getVersion(), "");
     EXPECT_EQ(facts.driver.getDescription(), "Driver");

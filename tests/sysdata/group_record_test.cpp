@@ -48,6 +48,7 @@ TEST(GroupRecord, JoinsPrimaryMembersAndThenItsOwn)
     FakeFiles const files;
     EXPECT_EQ(members(500, {"ben", "carl"}), (Names{"ben", "carl"})); // no account file
     EXPECT_EQ(members(500, {}), Names{});
+    EXPECT_EQ(members(500, {"van dam"}), Names{"van dam"});
     files.write("/etc/passwd", account("root", 1000, 0) + account("anna", 2, 500) +
                                    account("zoe", 1000, 501) + account("ben", 1000, 500));
     EXPECT_EQ(members(500, {"ben", "Xaver"}), (Names{"anna", "ben", "Xaver"}));

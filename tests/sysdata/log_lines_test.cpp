@@ -61,6 +61,7 @@ TEST(LogToday, IsTheSecondWordAndTheLastNumber)
     } const cases[] = {{"Sat Nov 21 03:15:30 UTC 2026\n", "Nov", 2026},
                        {"Fri Jan  2 03:15:30 AM CET 2026\n", "Jan", 2026},
                        {"Sat Nov 21 03:15:30 UTC 12026\n", "Nov", 12026},
+                       {" Jan Feb 2026\n", "Jan", 2026}, // the word after the first space
                        {"Sat " + std::string(5000, 'M') + " 2026", std::string(511, 'M'), 2026}};
     for (auto const& [output, month, year] : cases) {
         Today today;

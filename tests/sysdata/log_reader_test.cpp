@@ -308,9 +308,9 @@ TEST_F(LogReader, YieldsWhatFollowsTheFirstSixteenCharacters)
     }
 }
 
-TEST_F(LogReader, LogsEveryStepOfAMessageInOrder)
+TEST_F(LogReader, LogsEveryStepOfAMessageAndOfATimeInOrder)
 {
-    Recording const recording;
+    Recording recording;
     data(1);
     Lines expected{"getData: entry"};
     for (int i = 0; i < 3; ++i)
@@ -321,11 +321,18 @@ TEST_F(LogReader, LogsEveryStepOfAMessageInOrder)
          {"getLog: entry", "buffer = Nov 20 10:11:12 host sshd[1]: session opened\n",
           "strget: entry", "strget: exit", "getLog: exit", "getData: exit"})
         expected.emplace_back(text);
-    EXPECT_EQ(recording.texts(3000), expected);
-    EXPECT_EQ(recording.texts(6000), Lines{});
+    EXPECT_EQ(recording.texts(), expected);
     EXPECT_EQ(commands.ran, (Lines{wc, wc, wc, sed(10)}));
     EXPECT_EQ(commands.modes, Lines(4, "r"));
     EXPECT_EQ(commands.open, 0);
+
+    recording.clear();
+    timeOf(1);
+    expected.front() = "getCreationTime: entry"; // then the same, and the conversion
+    expected.back() = "to_time_t: entry";
+    expected.emplace_back("to_time_t: exit");
+    expected.emplace_back("getCreationTime: exit");
+    EXPECT_EQ(recording.texts(), expected);
 }
 
 TEST_F(LogReader, ReadsATimeStampInTheYearOfTheDate)

@@ -106,7 +106,10 @@ TEST_F(UserListing, ReplacesWhatTheListHeldBefore)
     EXPECT_TRUE(users.empty()); // the account files are not written yet
     files_.write("/etc/passwd", account("jdoe", 1000));
     users.resize(3);
+    std::vector<std::size_t> atOpening;
+    libc::hooks().fopen.watch([&](char const*, char const*) { atOpening.push_back(users.size()); });
     NQ::getUserInfo(users);
+    EXPECT_EQ(atOpening, std::vector<std::size_t>(3, 0)); // emptied first
     ASSERT_EQ(users.size(), 1U);
     EXPECT_EQ(users.front().getUserName(), "jdoe");
 }

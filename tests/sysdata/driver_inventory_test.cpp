@@ -185,7 +185,10 @@ TEST_F(DriverInventory, LogsEveryStepInOrder)
     commands.answers = {{"lsmod", std::string(header) + "loop 1 0\n"},
                         {"modinfo loop", "version: 1\nlicense: GPL\n"}};
     Recording const recording;
+    Lines closedAfter;
+    libc::hooks().pclose.watch([&](FILE*) { closedAfter.push_back(recording.texts().back()); });
     list();
+    EXPECT_EQ(closedAfter, Lines(2, "setManufacturer: exit")); // before the exit
     EXPECT_EQ(
         recording.texts(3000),
         (Lines{"getDriverInfo: entry", "buffer = Module                  Size  Used by\n",

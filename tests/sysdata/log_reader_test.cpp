@@ -278,7 +278,9 @@ TEST_F(LogReader, RefusesIndexesAboveOneOfAnUncountableLog)
     EXPECT_TRUE(log.getData(text, 1));
     EXPECT_EQ(text, "**");
     EXPECT_FALSE(log.getData(text, 2));
+    Recording const recording;
     EXPECT_FALSE(log.getData(text, 4294967295U));
+    EXPECT_TRUE(recording.has("Invalid index: getMaxLine()=0, Index=4294967295", 6000));
 }
 
 TEST_F(LogReader, YieldsWhatFollowsTheFirstSixteenCharacters)

@@ -306,6 +306,7 @@ TEST_F(UserListing, ReadsTheFailuresAsADecimalNumber)
     } const cases[] = {{"", 0},
                        {"auth required pam_unix.so\n", 0},
                        {"deny=x\n", 0},
+                       {"deny=99\ndeny=x\ndeny=8\n", 8},
                        {"deny=99\ndeny=010\n", 10},
                        {"deny=99\ndeny=0x10\n", 0},
                        {"deny=99\ndeny=-3\n", -3},

@@ -8,9 +8,9 @@
 #include "host/Properties.h"
 #include "tests/interpose/Allocation.h"
 #include "tests/interpose/Libc.h"
+#include "tests/support/FakeCommands.h"
 #include "tests/support/FileRoot.h"
 #include "tests/support/ScratchFolder.h"
-#include "tests/support/Streams.h"
 
 #include <gtest/gtest.h>
 

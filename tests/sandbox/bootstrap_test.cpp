@@ -2,7 +2,6 @@
 
 #include "TestPaths.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
 
 #include <filesystem>
 #include <gtest/gtest.h>

@@ -1,9 +1,6 @@
 // The helpers that the other tests of this tier use.
 
-#include "host/Properties.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Plugin.h"
 
 #include <cstdlib>
 #include <gtest/gtest.h>
@@ -55,15 +52,6 @@ TEST(Machine, FindsAccountRecordsByTheirWholeName)
     machine::write("/etc/group", "staffer:x:5:\nstaff:x:6:joe,\n");
     EXPECT_EQ(machine::entry("/etc/group", "staff"), (Lines{"staff", "x", "6", "joe,"}));
     EXPECT_EQ(machine::entry("/etc/group", "sta"), Lines());
-}
-
-TEST(Plugin, ShowsItsTreeWhenLoadedAsAHostDoes)
-{
-    Plugin plugin;
-    EXPECT_EQ(plugin.initialize(7).getStatus(), 0);
-    EXPECT_EQ(plugin.node(IC::nodeType::osSw).getNodeId(), 7U);
-    EXPECT_EQ(plugin.node(IC::nodeType::root).getLinkedId(), 7U);
-    EXPECT_EQ(text(plugin.node(IC::nodeType::operatingSystem), IC::property::clearLog), "0");
 }
 
 } // namespace harness_test

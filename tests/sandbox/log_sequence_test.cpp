@@ -3,7 +3,6 @@
 // script/expected-log derives the expected file from the machine's files, without the plug-in.
 
 #include "TestPaths.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"

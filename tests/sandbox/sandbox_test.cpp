@@ -1,7 +1,6 @@
 // A copy of the machine, seen from inside.
 
 #include "mihost/sandbox/Sandbox.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 
 #include <cctype>

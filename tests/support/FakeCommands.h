@@ -3,11 +3,15 @@
 
 #include "tests/interpose/Libc.h"
 
+#include <cstdio>
 #include <deque>
 #include <map>
 #include <optional>
 #include <string>
 #include <vector>
+
+/** @return the text as a stream; unlike fmemopen, this also works with NUL bytes and no text */
+FILE* streamOf(std::string const& text);
 
 /**
  * Answers commands with given output while it exists, and records every command.

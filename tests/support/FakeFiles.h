@@ -4,6 +4,7 @@
 #include "tests/support/FileRoot.h"
 #include "tests/support/ScratchFolder.h"
 
+#include <filesystem>
 #include <string>
 
 /**
@@ -14,18 +15,24 @@
 class FakeFiles
 {
 public:
-    FakeFiles();
-    ~FakeFiles() = default;
-    FakeFiles(FakeFiles const&) = delete;
-    FakeFiles& operator=(FakeFiles const&) = delete;
+    FakeFiles() : root_(folder_.name()) {}
 
     /** @param path  as the plug-in names it, such as "/etc/passwd" */
-    void write(std::string const& path, std::string const& text) const;
+    void write(std::string const& path, std::string const& text) const
+    {
+        folder_.write(path, text);
+    }
 
-    void remove(std::string const& path) const;
+    void remove(std::string const& path) const
+    {
+        std::filesystem::remove(realPath(path));
+    }
 
     /** @return where the file really is */
-    std::string realPath(std::string const& path) const;
+    std::string realPath(std::string const& path) const
+    {
+        return folder_.name() + path;
+    }
 
 private:
     ScratchFolder folder_;

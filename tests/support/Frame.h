@@ -2,8 +2,9 @@
 #define TESTS_SUPPORT_FRAME_H
 
 #include "host/Properties.h"
+#include "tests/interpose/Host.h"
 #include "tests/support/Insides.h"
-#include "tests/support/NodeCalls.h"
+#include "tests/support/Shown.h"
 
 #include <string>
 #include <vector>
@@ -62,6 +63,40 @@ public:
     /** The nodes that were published, and those whose deletion was requested. */
     std::vector<IC::Node*> published;
     std::vector<IC::Node*> deleted;
+};
+
+/**
+ * Records the calls of the framework's node setters, in order, while it exists.
+ *
+ * Each call is a text such as "setStatus(1)", "setDescription(Driver)" or "setProperty(108)".
+ */
+class NodeCalls
+{
+public:
+    NodeCalls()
+    {
+        host::hooks().setStatus.watch([this](IC::MutableNode*, unsigned int const& status) {
+            calls.push_back("setStatus(" + std::to_string(status) + ")");
+        });
+        host::hooks().setDescription.watch(
+            [this](IC::MutableNode*, std::string const& description) {
+                calls.push_back("setDescription(" + description + ")");
+            });
+        host::hooks().setProperty.watch(
+            [this](IC::MutableNode*, unsigned int const& id, IC::PropertyValue const&) {
+                calls.push_back("setProperty(" + std::to_string(id) + ")");
+            });
+    }
+    ~NodeCalls()
+    {
+        host::hooks().setStatus.reset();
+        host::hooks().setDescription.reset();
+        host::hooks().setProperty.reset();
+    }
+    NodeCalls(NodeCalls const&) = delete;
+    NodeCalls& operator=(NodeCalls const&) = delete;
+
+    std::vector<std::string> calls;
 };
 
 /**

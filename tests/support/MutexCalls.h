@@ -1,7 +1,7 @@
 #ifndef TESTS_SUPPORT_MUTEXCALLS_H
 #define TESTS_SUPPORT_MUTEXCALLS_H
 
-#include "host/Mutex.h"
+#include "tests/interpose/Host.h"
 
 #include <functional>
 
@@ -13,8 +13,23 @@
 class MutexCalls
 {
 public:
-    MutexCalls();
-    ~MutexCalls();
+    MutexCalls()
+    {
+        host::hooks().lock.watch([this](NQ::Mutex* mutex, unsigned long timeout) {
+            if (onLock)
+                onLock(*mutex, timeout);
+        });
+        host::hooks().unlock = [this](NQ::Mutex* mutex) {
+            int const answer = onUnlock ? onUnlock(*mutex) : 0;
+            int const result = host::hooks().unlock.real()(mutex);
+            return answer != 0 ? answer : result;
+        };
+    }
+    ~MutexCalls()
+    {
+        host::hooks().lock.reset();
+        host::hooks().unlock.reset();
+    }
     MutexCalls(MutexCalls const&) = delete;
     MutexCalls& operator=(MutexCalls const&) = delete;
 

@@ -1,6 +1,8 @@
 #ifndef TESTS_SUPPORT_PROGRAM_H
 #define TESTS_SUPPORT_PROGRAM_H
 
+#include "tests/support/Lines.h"
+
 #include <iosfwd>
 #include <string>
 #include <vector>

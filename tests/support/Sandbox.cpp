@@ -34,9 +34,10 @@ bool sandboxIsRequired()
 
 int runTestsInSandbox(int argc, char* argv[])
 {
-    // So that commands and their language do not depend on the caller.
+    // So that commands, their language and their terminal do not depend on the caller.
     setenv("PATH", "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin:/sbin:/bin", 1);
     setenv("LC_ALL", "C", 1);
+    setenv("TERM", "xterm", 1);
     testing::InitGoogleTest(&argc, argv);
     return runTestsOneByOne([] {
         if (auto const reason = mihost::enterSandbox()) {

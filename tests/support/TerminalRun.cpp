@@ -128,3 +128,10 @@ int TerminalRun::end(std::chrono::milliseconds limit)
     child_ = -1;
     return WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
 }
+
+Outcome atTerminal(std::vector<std::string> const& arguments, unsigned short columns)
+{
+    TerminalRun run(arguments, columns);
+    int const code = run.end();
+    return {code, run.output(), ""};
+}

@@ -2,6 +2,7 @@
 #define TESTS_SUPPORT_TERMINALRUN_H
 
 #include "TestPaths.h"
+#include "tests/support/Program.h"
 
 #include <chrono>
 #include <string>
@@ -79,5 +80,8 @@ private:
     std::string output_;
     std::size_t seen_ = 0;
 };
+
+/** Runs mihost at a terminal to its end. @return what the terminal shows, as standard output */
+Outcome atTerminal(std::vector<std::string> const& arguments, unsigned short columns = 80);
 
 #endif

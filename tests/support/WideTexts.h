@@ -1,6 +1,8 @@
 #ifndef TESTS_SUPPORT_WIDETEXTS_H
 #define TESTS_SUPPORT_WIDETEXTS_H
 
+#include "tests/interpose/Host.h"
+
 #include <string>
 #include <vector>
 
@@ -8,8 +10,20 @@
 class WideTexts
 {
 public:
-    WideTexts();
-    ~WideTexts();
+    WideTexts()
+    {
+        host::hooks().widen.watch([this](std::string const& text) { widened.push_back(text); });
+        host::hooks().narrow.watch([this](std::wstring const& text) {
+            narrowed.push_back(host::hooks().narrow.real()(text));
+        });
+        host::hooks().makeText.watch([this](char const* text) { made.emplace_back(text); });
+    }
+    ~WideTexts()
+    {
+        host::hooks().widen.reset();
+        host::hooks().narrow.reset();
+        host::hooks().makeText.reset();
+    }
     WideTexts(WideTexts const&) = delete;
     WideTexts& operator=(WideTexts const&) = delete;
 

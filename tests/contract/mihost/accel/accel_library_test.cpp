@@ -1,12 +1,10 @@
 // The built library, linked to a program or preloaded.
 
 #include "TestPaths.h"
-#include "tests/support/Holds.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 #include "tests/support/ScratchFolder.h"
 
 #include <cstdlib>
-#include <gtest/gtest.h>
 
 namespace accel_library_test
 {

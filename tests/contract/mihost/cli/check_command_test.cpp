@@ -2,20 +2,16 @@
 
 #include "TestPaths.h"
 #include "tests/contract/mihost/cli/NeedsSandbox.h"
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 #include "tests/support/ScratchFolder.h"
 
 #include <algorithm>
 #include <filesystem>
-#include <nlohmann/json.hpp>
 #include <set>
 
 namespace check_command_test
 {
 
-using Json = nlohmann::ordered_json;
 using Names = std::set<std::string>;
 
 /** Checks a plug-in on a fixture machine. */

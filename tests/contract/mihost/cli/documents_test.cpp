@@ -1,9 +1,5 @@
 #include "TestPaths.h"
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
-#include "tests/support/Program.h"
-
-#include <gtest/gtest.h>
+#include "tests/support/Mihost.h"
 
 namespace documents_test
 {

@@ -1,10 +1,7 @@
 #include "TestPaths.h"
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 
 #include <cstdlib>
-#include <gtest/gtest.h>
 #include <unistd.h>
 
 namespace loading_test

@@ -1,9 +1,6 @@
 #include "TestPaths.h"
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 
-#include <gtest/gtest.h>
 #include <regex>
 #include <set>
 

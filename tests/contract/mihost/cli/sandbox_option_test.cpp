@@ -2,20 +2,15 @@
 
 #include "TestPaths.h"
 #include "tests/contract/mihost/cli/NeedsSandbox.h"
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 #include "tests/support/ScratchFolder.h"
 
 #include <filesystem>
-#include <nlohmann/json.hpp>
 #include <sys/stat.h>
 #include <unistd.h>
 
 namespace sandbox_option_test
 {
-
-using Json = nlohmann::ordered_json;
 
 /** Null if the file is not among the changes. */
 Json changeOf(std::string const& file, Json const& answer)

@@ -1,21 +1,15 @@
 // mihost shows and logs the same with and without the accelerator.
 
 #include "TestPaths.h"
-#include "tests/support/Holds.h"
 #include "tests/support/KernelModules.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 
 #include <cstdlib>
-#include <gtest/gtest.h>
-#include <nlohmann/json.hpp>
 #include <regex>
 
 namespace accelerated_mihost_test
 {
-
-using Json = nlohmann::ordered_json;
 
 constexpr int moduleCount = 30;
 

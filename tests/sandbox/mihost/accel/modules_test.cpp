@@ -1,12 +1,11 @@
 // lsmod and modinfo, run and answered by the accelerator, and compared byte by byte.
 
 #include "tests/support/BothWays.h"
-#include "tests/support/Holds.h"
 #include "tests/support/KernelModules.h"
 #include "tests/support/Machine.h"
+#include "tests/support/Mihost.h"
 
 #include <filesystem>
-#include <gtest/gtest.h>
 #include <random>
 #include <sys/mount.h>
 
@@ -151,18 +150,17 @@ void expectAgreement(std::string const& name)
     EXPECT_FALSE(isLeftOut(name)) << name;
 }
 
-TEST(AccelModinfo, AgreesWithModinfoOnHundredsOfModules)
+TEST(AccelModinfo, AgreesWithModinfoOnRandomModules)
 {
     std::mt19937 random(11);
-    constexpr int modules = 300;
+    constexpr int modules = 150;
     for (int i = 0; i < modules; ++i)
         kernelModules::write("kernel/drivers/mod-" + std::to_string(i) + ".ko",
                              randomModule(random));
     kernelModules::index();
     int leftOut = 0; // a changed byte may have made a key too long
     for (int i = 0; i < modules; ++i)
-        for (char const* name : {"mod_", "mod-"})
-            leftOut += isLeftOut(name + std::to_string(i));
+        leftOut += isLeftOut((i % 10 == 0 ? "mod-" : "mod_") + std::to_string(i));
     EXPECT_LT(leftOut, modules / 50);
 }
 

@@ -3,9 +3,9 @@
 
 #include "TestPaths.h"
 #include "tests/support/ComparedLog.h"
-#include "tests/support/Holds.h"
 #include "tests/support/KernelModules.h"
-#include "tests/support/Program.h"
+#include "tests/support/Machine.h"
+#include "tests/support/Mihost.h"
 
 #include <cstdlib>
 
@@ -191,7 +191,7 @@ TEST(AccelZones, FollowTheSystemsOwnZoneFile)
         auto const [expected, found] = bothways::dates();
         EXPECT_EQ(found, expected) << zone;
     }
-    EXPECT_GE(bothways::countOf("date").answered, 3U);
+    EXPECT_GE(bothways::countOf("date").answered, 2U); // the hour may change
 }
 
 } // namespace tools_test

@@ -2,62 +2,41 @@
 
 #include "TestPaths.h"
 #include "mihost/cli/input/Day.h"
-#include "mihost/cli/output/DisplayWidth.h"
 #include "mihost/sandbox/Sandbox.h"
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/MihostJson.h"
+#include "tests/support/Mihost.h"
 
-#include <algorithm>
 #include <ctime>
 #include <filesystem>
 
 namespace commands_test
 {
 
-/** Modules and a log, as lsmod and modinfo print them and syslog writes it. */
-void makeMachine()
-{
-    setenv("LC_ALL", "C.UTF-8", 1);
-    machine::lay("plain");
-    machine::fake("/usr/sbin/lsmod", "echo 'Module Size Used'\necho 'ext4 1 0'\necho 'xfs 1 0'\n");
-    machine::fake("/usr/sbin/modinfo",
-                  "echo \"description:    Driver of $1\"\necho 'version:        1.0'\n");
-    machine::write("/var/log/messages", "Jan  2 03:04:05 first line\nJan  2 03:04:06 second\n");
-}
-
 TEST(MihostTree, HasALineForEachNodeBelowItsParent)
 {
-    makeMachine();
-    Lines const lines = linesOf(mihostRun({"tree"}).out);
-    ASSERT_GE(lines.size(), 6U);
-    std::string const last = "        └─log:2 #" + std::to_string(lines.size());
-    struct Row {
-        std::size_t line;
-        std::string name;
-        std::string text;
-    };
-    std::size_t const textsBegin = lines[0].find("OsSw");
-    for (Row const& row :
-         std::initializer_list<Row>{{0, "mi #1  ", "  OsSw Management Interface"},
-                                    {1, "└─root #2  ", "  ROOT Node"},
-                                    {3, "    └─os #4  ", "  Operating System: Linux"},
-                                    {4, "      ├─driver:ext4 #5  ", "  Driver of ext4: 1.0"},
-                                    {lines.size() - 1, last, "  OS LogEntry: *first line*"}}) {
-        std::string const& line = lines[row.line];
-        EXPECT_TRUE(startsWith(line, row.name));
-        ASSERT_GE(line.size(), row.text.size());
-        std::size_t const text = line.size() - row.text.size();
-        EXPECT_EQ(line.substr(text), row.text) << line;
-        EXPECT_EQ(mihost::displayWidth(line.substr(0, text + 2)), textsBegin) << line;
-    }
-    EXPECT_EQ(linesOf(mihostRun({}).out), lines);
+    setenv("LC_ALL", "C.UTF-8", 1);
+    machine::lay("small");
+    EXPECT_EQ(mihostRun({"tree"}).out,
+              "mi #1                   OsSw Management Interface\n"
+              "└─root #2               ROOT Node\n"
+              "  └─computer #3         Computer: " +
+                  mihostRun({"get", "computer", "108", "-o", "value"}).out +
+                  "    └─os #4             Operating System: Linux\n"
+                  "      ├─driver:ext4 #5  Driver of ext4: 1.0\n"
+                  "      ├─driver:xfs #6   Driver of xfs: 1.0\n"
+                  "      ├─user:root #7    User Account: Super\n"
+                  "      ├─user:jdoe #8    User Account: J. Doe\n"
+                  "      ├─group:root #9   Group: root\n"
+                  "      ├─group:jdoe #10  Group: jdoe\n"
+                  "      └─log #11         OS Log\n"
+                  "        ├─log:1 #12     OS LogEntry: *second*\n"
+                  "        └─log:2 #13     OS LogEntry: *first line*\n");
+    EXPECT_EQ(mihostRun({}), mihostRun({"tree"}));
 }
 
 TEST(MihostTree, CanBeginAtAnyNodeAndShowProperties)
 {
-    makeMachine();
+    machine::lay("small");
     EXPECT_EQ(mihostRun({"tree", "--all", "driver:xfs"}).out,
               "driver:xfs #6  Driver of xfs: 1.0\n"
               "                36 manufacturer    -\n"
@@ -68,18 +47,15 @@ TEST(MihostTree, CanBeginAtAnyNodeAndShowProperties)
 
 TEST(MihostTree, AsJsonIsAnArrayInTheOrderOfTheNodeList)
 {
-    makeMachine();
+    machine::lay("small");
     Json const tree = mihostJson({"tree"});
     Lines kinds;
     for (Json const& node : tree) {
         EXPECT_EQ(node["id"], kinds.size() + 1);
         kinds.push_back(node["kind"]);
     }
-    kinds.erase(std::remove_if(kinds.begin(), kinds.end(),
-                               [](auto const& kind) { return kind == "user" || kind == "group"; }),
-                kinds.end());
-    EXPECT_EQ(kinds, (Lines{"mi", "root", "computer", "os", "driver", "driver", "log", "log-entry",
-                            "log-entry"}));
+    EXPECT_EQ(kinds, (Lines{"mi", "root", "computer", "os", "driver", "driver", "user", "user",
+                            "group", "group", "log", "log-entry", "log-entry"}));
     EXPECT_EQ(tree[3]["properties"]["clear-log"].dump(), // not stored, but read
               R"({"id":191,"kind":"number","flag":true,"value":0})");
     EXPECT_EQ(tree[3]["properties"]["requested-state"]["flag"], false);
@@ -87,7 +63,7 @@ TEST(MihostTree, AsJsonIsAnArrayInTheOrderOfTheNodeList)
 
 TEST(MihostTree, HasThePropertiesAndKindsThatTheCatalogueNames)
 {
-    makeMachine();
+    machine::lay("small");
     Json const catalogue = mihostJson({"properties"});
     for (Json const& node : mihostJson({"tree"}))
         for (auto const& [name, property] : node["properties"].items()) {
@@ -103,7 +79,7 @@ TEST(MihostTree, HasThePropertiesAndKindsThatTheCatalogueNames)
 
 TEST(MihostGet, ReadsLivePropertiesLive)
 {
-    makeMachine();
+    machine::lay("small");
     EXPECT_EQ(mihostRun({"get", "log:1", "message"}), printed(" 81 message  *second*\n"));
     EXPECT_EQ(mihostRun({"get", "os", "191"}), printed("191 clear-log  0\n"));
     EXPECT_EQ(mihostRun({"--json", "get", "os", "108"}), mihostRun({"get", "--json", "os", "108"}));
@@ -117,10 +93,9 @@ TEST(MihostGet, ReadsLivePropertiesLive)
 
 TEST(MihostGet, ExitsWith4ForAnUnknownNodeOrProperty)
 {
-    makeMachine();
+    machine::lay("small");
     for (Lines const& arguments :
-         {Lines{"get", "driver:none"}, Lines{"get", "999"}, Lines{"get", "os", "none"},
-          Lines{"get", "os", "999"}, Lines{"get", "os", "message"}, Lines{"tree", "user:none"},
+         {Lines{"get", "driver:none"}, Lines{"get", "os", "999"}, Lines{"tree", "user:none"},
           Lines{"set", "os", "none", "1"}, Lines{"list", "log", "--columns", "none"}}) {
         Outcome const outcome = mihostRun(arguments);
         EXPECT_EQ(outcome.code, 4) << arguments[1];
@@ -141,7 +116,7 @@ TEST(MihostGet, ReportsANodeWithoutPropertiesAndAnUnsetOne)
 
 TEST(MihostList, IsATableOfTheRequestedColumns)
 {
-    makeMachine();
+    machine::lay("small");
     EXPECT_EQ(mihostRun({"list", "drivers"}).out, "driver-name  driver-version  description\n"
                                                   "ext4         1.0             Driver of ext4\n"
                                                   "xfs          1.0             Driver of xfs\n");
@@ -155,35 +130,15 @@ TEST(MihostList, IsATableOfTheRequestedColumns)
     EXPECT_EQ(mihostRun({"list", "things"}).code, 2);
 }
 
-TEST(MihostList, PointsToTheDoctorIfThereIsNothingToList)
-{
-    makeMachine();
-    machine::write("/var/log/messages", "");
-    EXPECT_EQ(mihostRun({"list", "log"}),
-              (Outcome{0, "index  time  message\n",
-                       "mihost: nothing to list under log (see 'mihost doctor')\n"}));
-    EXPECT_EQ(mihostRun({"--json", "list", "log"}).err, "");
-}
-
-TEST(MihostOutput, KeepsControlCharactersFromTheTerminal)
-{
-    makeMachine();
-    machine::write("/var/log/messages", "Jan  2 03:04:05 a\x1b[31mb\xFF\n");
-    EXPECT_EQ(mihostRun({"get", "log:1", "81"}).out, " 81 message  *a\\x1b[31mb\\xff*\n");
-    for (Lines const& arguments : {Lines{"tree"}, Lines{"tree", "--all"}, Lines{"list", "log"}})
-        EXPECT_EQ(mihostRun(arguments).out.find_first_of("\x1b\xFF"), std::string::npos);
-    EXPECT_EQ(mihostJson({"get", "log:1", "81"})["properties"]["message"]["value"],
-              "*a\x1b[31mb\\xff*");
-}
-
 TEST(MihostTrace, IsJsonLinesInCallOrderWithBothLoggerOperations)
 {
-    makeMachine();
+    machine::lay("small");
     EXPECT_EQ(mihostRun({"--trace", "/tmp/trace", "version"}).code, 0);
     EXPECT_EQ(machine::read("/tmp/trace"), ""); // nothing was started
 
     EXPECT_EQ(mihostRun({"--trace", "/tmp/trace", "tree"}).code, 0);
     Lines const lines = linesOf(machine::read("/tmp/trace"));
+    EXPECT_EQ(mihostRun({"--trace", "-", "tree"}).err.substr(0, lines.at(0).size()), lines[0]);
     ASSERT_GT(lines.size(), 2U);
     for (std::string const& line : lines)
         EXPECT_TRUE(Json::accept(line)) << line;
@@ -198,28 +153,9 @@ TEST(MihostTrace, IsJsonLinesInCallOrderWithBothLoggerOperations)
     }
 }
 
-TEST(MihostTrace, GoesToStandardErrorForADash)
-{
-    makeMachine();
-    Outcome const outcome = mihostRun({"--trace", "-", "get", "os", "108"});
-    EXPECT_EQ(outcome.out, "108 os-name  Linux\n");
-    EXPECT_EQ(Json::parse(linesOf(outcome.err).at(0))["message"], "initialize: entry");
-}
-
-TEST(MihostTrace, ThatCannotBeWrittenIsReportedWithExitCode2)
-{
-    makeMachine();
-    EXPECT_EQ(mihostRun({"--trace", "/dev/full", "get", "os", "108"}),
-              (Outcome{2, "108 os-name  Linux\n",
-                       "mihost: cannot write the trace '/dev/full': No space left on device\n"}));
-    Outcome const missing = mihostRun({"--trace", "/nonexistent/file", "get", "os", "108"});
-    EXPECT_EQ(missing.code, 2);
-    EXPECT_EQ(missing.out, "");
-}
-
 TEST(MihostTiming, ShowsPhasesAndCommandsOfTheStart)
 {
-    makeMachine();
+    machine::lay("small");
     Outcome const outcome = mihostRun({"--timing", "--json", "get", "os", "108"});
     Json const timing = Json::parse(outcome.err)["timing"];
     std::map<std::string, int> commands;
@@ -236,7 +172,7 @@ TEST(MihostTiming, ShowsPhasesAndCommandsOfTheStart)
 
 TEST(MihostWatch, PrintsTheFirstReadingAndThenOnlyWhatChanged)
 {
-    makeMachine();
+    machine::lay("small");
     long const before = std::time(nullptr);
     std::string const line =
         mihostRun({"watch", "os", "os-name", "--interval", "0", "--count", "3"}).out;
@@ -274,29 +210,12 @@ TEST(MihostVersion, NamesProgramContractAndPluginFile)
 TEST(MihostUsage, IsRefusedWithACorrectionOrTheHelp)
 {
     std::vector<std::pair<Lines, std::string>> const refusals = {
-        {{"tre"}, "no command 'tre' (did you mean tree?)"},
         {{"tre", "os"}, "no command 'tre' (did you mean tree?)"},
-        {{"--timng", "tree"}, "tree: no option '--timng' (did you mean --timing?)"},
-        {{"tree", "--al"}, "tree: no option '--al' (did you mean --all?)"},
-        {{"list", "users", "--colums=id"},
-         "list: no option '--colums=id' (did you mean --columns?)"},
-        {{"tree", "--nothing"}, "tree: no option '--nothing' (see 'mihost tree --help')"},
-        {{"--nothing"}, "no option '--nothing' (see 'mihost --help')"},
-        {{"tree", "os", "extra"}, "tree: unexpected argument 'extra' (see 'mihost tree --help')"},
-        {{"power", "hatl"}, "power: ACTION: unknown value 'hatl' (did you mean halt?)"},
         {{"power", "sleep"}, "power: ACTION: unknown value 'sleep' (use restart, halt)"},
-        {{"watch", "os", "108", "--interval", "nan"},
-         "watch: --interval: 'nan' is not a number from 0 to 86400 (see 'mihost watch --help')"},
-        {{"watch", "os", "108", "--interval", "-1"},
-         "watch: --interval: '-1' is not a number from 0 to 86400 (see 'mihost watch --help')"},
-        {{"get"}, "get: NODE is required (see 'mihost get --help')"},
-        {{"set", "os"}, "set: PROPERTY is required (see 'mihost set --help')"},
         {{"help", "gett"}, "help: no command 'gett' (did you mean get?)"},
         {{"help", "get", "os"}, "help: unexpected argument 'os'"}};
     for (auto const& [arguments, message] : refusals)
         EXPECT_EQ(mihostRun(arguments), failed(2, message));
-    EXPECT_TRUE(
-        startsWith(mihostRun({"nonsense"}).err, "mihost: no command 'nonsense' (use tree, list, "));
     EXPECT_EQ(mihostRun({"shell"}, "get").err,
               "mihost: line 1: get: NODE is required (see 'help get')\n");
 }
@@ -313,7 +232,7 @@ TEST(MihostUsage, ShowsTheHelpOfTheProgramAndOfEachCommand)
 
 TEST(MihostDangers, NeedYesWithoutATerminal)
 {
-    makeMachine();
+    machine::lay("small");
     for (Lines const& arguments :
          {Lines{"power", "halt"}, Lines{"power", "restart"}, Lines{"clear-log"},
           Lines{"set", "os", "requested-state", "9"}, Lines{"set", "os", "123", "12"},
@@ -330,7 +249,7 @@ TEST(MihostDangers, NeedYesWithoutATerminal)
 
 TEST(MihostPluginRun, GivesCommandsAPrivateDirectoryAndNoInput)
 {
-    makeMachine();
+    machine::lay("small");
     machine::fake("/usr/sbin/lsmod",
                   "{ pwd; umask; echo \"$LC_ALL $LANG\"; stat -c %a .; cat; } >/tmp/said\n"
                   "echo complaint >&2\n");
@@ -350,7 +269,7 @@ TEST(MihostPluginRun, GivesCommandsAPrivateDirectoryAndNoInput)
 
 TEST(MihostPluginRun, UsesTheCodeSetOfTheLocaleWithoutLang)
 {
-    makeMachine();
+    machine::lay("small");
     unsetenv("LANG");
     unsetenv("LC_CTYPE");
     setenv("LC_ALL", "C.UTF-8", 1);

@@ -66,7 +66,6 @@ protected:
         fs::create_directories("/tmp/home");
         fs::current_path("/tmp/here");
         setenv("HOME", "/tmp/home", 1);
-        setenv("TERM", "xterm", 1);
         setenv("LC_ALL", "C.UTF-8", 1);
     }
 

@@ -1,11 +1,9 @@
 // What the doctor finds on machines that lack one thing or another, and that its advice helps.
 
 #include "TestPaths.h"
-#include "tests/support/Holds.h"
 #include "tests/support/KernelModules.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/MihostJson.h"
+#include "tests/support/Mihost.h"
 
 #include <set>
 #include <sstream>
@@ -80,12 +78,6 @@ protected:
         EXPECT_TRUE(holds(outcome.out, "no fix   " + name + ": " + problem + "\n"));
         EXPECT_TRUE(holds(outcome.out, "           no fix   " + why + "\n"));
         EXPECT_TRUE(holds(outcome.out, " 1 cannot be fixed here\n"));
-    }
-
-    /** Follows the advice for Debian. */
-    static void follow(Json const& need)
-    {
-        machine::run(need["debian"]);
     }
 };
 
@@ -225,7 +217,7 @@ TEST_F(Doctor, ReportsUnsortedShadowEntriesAndAFixThatWorks)
                    0600);
     expectMissing("order of /etc/shadow",
                   "no entry for 'anna' at its place in the order of /etc/passwd", effect);
-    follow(need("order of /etc/shadow"));
+    machine::run(need("order of /etc/shadow")["debian"]);
     EXPECT_EQ(need("order of /etc/shadow")["ok"], true);
     machine::remove("/etc/shadow");
     expectMissing("passwords in /etc/shadow", "No such file or directory",
@@ -241,7 +233,7 @@ TEST_F(Doctor, ReportsAMissingReleaseFileAndAFixThatWorks)
               "such a file would make this another distribution");
     expectMissing("version in a release file", "no known file exists", "os-version of os");
     expectMissing("name in a release file", "no known file exists", "os-name is just \"Linux\"");
-    follow(need("name in a release file"));
+    machine::run(need("name in a release file")["debian"]);
     EXPECT_EQ(need("name in a release file")["ok"], true);
     EXPECT_EQ(need("version in a release file")["ok"], true);
     EXPECT_EQ(mihostRun({"get", "os", "os-name", "os-version"}).out,

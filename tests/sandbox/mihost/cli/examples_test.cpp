@@ -2,41 +2,26 @@
 
 #include "TestPaths.h"
 #include "mihost/cli/commands/CommandRows.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 
 #include <algorithm>
 #include <filesystem>
-#include <gtest/gtest.h>
 
 namespace examples_test
 {
 
-/** The lines that a help text shows as examples, without their explanations. */
-Lines examplesIn(std::string const& help)
+/** The first words of the lines below a heading of a help text, up to two blanks. */
+Lines listedIn(std::string const& help, std::string const& heading)
 {
-    Lines examples;
-    bool isAtExamples = false;
+    Lines listed;
+    bool isBelow = false;
     for (std::string const& line : linesOf(help)) {
-        if (isAtExamples && line.rfind("  ", 0) == 0)
-            examples.push_back(line.substr(2, line.find("  ", 2) - 2));
-        isAtExamples = line == "Examples:" || (isAtExamples && line.rfind("  ", 0) == 0);
+        isBelow = line == heading || (isBelow && line.rfind("  ", 0) == 0);
+        if (isBelow && line != heading && line[2] != ' ') // not the rest of a text
+            listed.push_back(line.substr(2, line.find("  ", 2) - 2));
     }
-    return examples;
-}
-
-/** The names that a help text shows as commands. */
-Lines commandsIn(std::string const& help)
-{
-    Lines commands;
-    bool isAtCommands = false;
-    for (std::string const& line : linesOf(help)) {
-        if (isAtCommands && line.rfind("  ", 0) == 0 && line.rfind("   ", 0) != 0)
-            commands.push_back(line.substr(2, line.find(' ', 2) - 2));
-        isAtCommands = line == "Commands:" || (isAtCommands && line.rfind("  ", 0) == 0);
-    }
-    return commands;
+    return listed;
 }
 
 /** The help of the command and of all commands below it. */
@@ -46,7 +31,7 @@ std::vector<std::pair<Lines, std::string>> allHelp(Lines const& command)
     words.insert(words.end(), command.begin(), command.end());
     std::string const help = mihostRun(words).out;
     std::vector<std::pair<Lines, std::string>> all = {{command, help}};
-    for (std::string const& name : commandsIn(help)) {
+    for (std::string const& name : listedIn(help, "Commands:")) {
         Lines below = command;
         below.push_back(name);
         for (auto const& each : allHelp(below))
@@ -75,7 +60,7 @@ void makeMachineOfTheExamples()
 /** Each runs in its own sandbox and answers yes; the input is for those that read a password. */
 void runExamples(std::string const& help, std::string const& input)
 {
-    Lines const examples = examplesIn(help);
+    Lines const examples = listedIn(help, "Examples:");
     EXPECT_EQ(examples.size(), 2U) << help;
     for (std::string const& example : examples) {
         std::size_t const at = example.find("mihost ");

@@ -3,14 +3,11 @@
 #include "TestPaths.h"
 #include "mihost/cli/commands/CommandRows.h"
 #include "tests/sandbox/mihost/cli/Login.h"
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/MihostJson.h"
+#include "tests/support/Mihost.h"
 
 #include <cstdlib>
 #include <filesystem>
-#include <gtest/gtest.h>
 #include <map>
 #include <set>
 

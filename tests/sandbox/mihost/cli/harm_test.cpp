@@ -1,14 +1,11 @@
 // Writes that would change an account or group other than the intended one are refused before any
 // command runs.
 
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 
 #include <algorithm>
 #include <filesystem>
-#include <gtest/gtest.h>
 
 namespace harm_test
 {
@@ -86,19 +83,6 @@ TEST_F(MihostHarm, WritesNothingForANodeThatNamesAnotherUid)
     EXPECT_EQ(machine::read("/etc/shadow"), shadow);
     EXPECT_EQ(mihostRun({"set", "user:jdoe", "password", hash}).code, 0);
     EXPECT_EQ(machine::entry("/etc/shadow", "jdoe").at(1), hash);
-}
-
-TEST_F(MihostHarm, AddsNoAccountOrGroupWhoseNameIsANumber)
-{
-    for (Lines const& arguments :
-         {Lines{"call", "UserAdd", "UserName=1001"}, Lines{"call", "UserAdd", "UserName=+1"},
-          Lines{"call", "LocalGroupAdd", "GroupName=0"},
-          Lines{"set", "os", "create-user", "UserAdd,UserName:CMPI_string:1001"}}) {
-        Outcome const outcome = mihostRun(arguments);
-        EXPECT_EQ(outcome.code, 2) << arguments.back();
-        EXPECT_TRUE(holds(outcome.err, "would read it as an id"));
-    }
-    EXPECT_FALSE(ran("/usr/sbin/"));
 }
 
 class MihostMembership : public MihostHarm

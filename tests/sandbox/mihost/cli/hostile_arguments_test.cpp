@@ -4,10 +4,8 @@
 #include "mihost/cli/catalogue/Catalogue.h"
 #include "mihost/cli/input/Command.h"
 #include "mihost/cli/plugin/CommandGuard.h"
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/MihostJson.h"
+#include "tests/support/Mihost.h"
 
 #include <algorithm>
 #include <cctype>
@@ -27,13 +25,11 @@ std::string quoted(std::string const& word)
     return text + "'";
 }
 
-/** Without line ends, which a line of the shell mode cannot hold: another test has those. */
+/** One for each way to begin a command. Line ends, which no line of a script has, are apart. */
 Lines hostileWords()
 {
-    return {"x;touch /tmp/pwned",       "x`touch /tmp/pwned`",    "x$(touch /tmp/pwned)",
-            "x|touch /tmp/pwned",       "x&touch /tmp/pwned",     "x>/tmp/pwned",
-            "x\" ;touch /tmp/pwned \"", "x' ;touch /tmp/pwned '", "x\\;touch${IFS}/tmp/pwned",
-            "\x1B[2J;touch /tmp/pwned", "\xFF;touch /tmp/pwned"};
+    return {"x;touch /tmp/pwned",           "x`touch /tmp/pwned`",    "x$(touch /tmp/pwned)",
+            "x\" |touch \xFF/tmp/pwned \"", "x' &touch /tmp/pwned '", "x\\;touch${IFS}/tmp/pwned"};
 }
 
 /** One special byte each: no letter, digit or line end. */
@@ -49,63 +45,38 @@ Lines hostileBytes()
 /** Every command, with {} in place of each of its arguments and option values. */
 Lines commandLines()
 {
-    Lines lines = {"{}",
-                   "--lock-timeout {} refresh",
-                   "refresh {}",
-                   "clear-log --yes {}",
-                   "power --yes {}",
-                   "version {}",
-                   "doctor {}",
-                   "properties {}",
-                   "methods {}",
-                   "tree {}",
-                   "tree --all {}",
-                   "tree --all={}",
-                   "list {}",
-                   "list users --columns {}",
-                   "list log -n {}",
-                   "list log --since {}",
-                   "list log --until {}",
-                   "user {}",
-                   "group {}",
-                   "get {}",
-                   "get os {}",
-                   "get user:{}",
-                   "get group:{}",
-                   "get driver:{}",
-                   "get log:{}",
-                   "watch {} os-name --count 1",
-                   "watch os {} --count 1",
-                   "watch os os-name --count {}",
-                   "watch os os-name --count 1 --interval {}",
-                   "set {} delete true",
-                   "set user:jdoe {} true",
-                   "set user:{} delete true --yes",
-                   "call {}",
-                   "call UserDel {}",
-                   "call UserDel {}=jdoe",
-                   "call UserDel UserName={}",
-                   "help {}",
-                   "user add {}",
-                   "user delete --yes {}",
-                   "user set-shell {} /bin/sh",
-                   "user set-shell jdoe {}",
-                   "user set-home {} /srv",
-                   "user set-home jdoe {}",
-                   "user set-name {} Name",
-                   "user set-name jdoe {}",
-                   "user set-password {}",
-                   "user set-password jdoe --password-file {}",
-                   "user expire {} never",
-                   "user expire jdoe {}",
-                   "user age {} --max-days 1",
-                   "user age jdoe --max-days {}",
-                   "group add {}",
-                   "group delete --yes {}",
-                   "group add-member {} jdoe",
-                   "group add-member crew {}",
-                   "group remove-member {} jdoe",
-                   "group remove-member crew {}"};
+    std::pair<char const*, Lines> const commands[] = {
+        {"", {"{}", "--lock-timeout {} refresh"}},
+        {"refresh", {"{}"}},
+        {"clear-log --yes", {"{}"}},
+        {"power --yes", {"{}"}},
+        {"version", {"{}"}},
+        {"doctor", {"{}"}},
+        {"properties", {"{}"}},
+        {"methods", {"{}"}},
+        {"help", {"{}"}},
+        {"tree", {"{}", "--all={}"}},
+        {"list", {"{}", "users --columns {}", "log -n {}", "log --since {}", "log --until {}"}},
+        {"get", {"{}", "os {}", "user:{}", "group:{}", "driver:{}", "log:{}"}},
+        {"watch --count 1", {"{} os-name", "os {}", "os os-name --interval {}"}},
+        {"watch os os-name", {"--count {}"}},
+        {"set --yes", {"{} delete true", "user:jdoe {} true", "user:{} delete true"}},
+        {"set user:jdoe", {"user-name {}", "user-id {}"}},
+        {"call", {"{}", "UserDel {}", "UserDel {}=jdoe", "UserDel UserName={}"}},
+        {"user", {"{}", "add {}", "delete --yes {}", "set-password {}"}},
+        {"user set-password jdoe", {"--password-file {}"}},
+        {"user set-shell", {"{} /bin/sh", "jdoe {}"}},
+        {"user set-home", {"{} /srv", "jdoe {}"}},
+        {"user set-name", {"{} Name", "jdoe {}"}},
+        {"user expire", {"{} never", "jdoe {}"}},
+        {"user age", {"{} --max-days 1", "jdoe --max-days {}"}},
+        {"group", {"{}", "add {}", "delete --yes {}"}},
+        {"group add-member", {"{} jdoe", "crew {}"}},
+        {"group remove-member", {"{} jdoe", "crew {}"}}};
+    Lines lines;
+    for (auto const& [command, arguments] : commands)
+        for (std::string const& argument : arguments)
+            lines.push_back(std::string(command) + ' ' + argument);
     for (char const* option : {"full-name", "home", "shell", "password-file", "expires", "min-days",
                                "max-days", "warn-days", "inactive-days"})
         lines.push_back("user add asmith --" + std::string(option) + " {}");
@@ -114,8 +85,6 @@ Lines commandLines()
             if (property.has(mihost::Property::Acts))
                 lines.push_back(std::string("set ") + (kind.single ? kind.address : "user:jdoe") +
                                 " " + property.name + " {} --yes");
-    lines.emplace_back("set user:jdoe user-name {}");
-    lines.emplace_back("set user:jdoe user-id {}");
     for (mihost::Method const& method : mihost::methods())
         for (mihost::Parameter const& parameter : method.parameters) {
             std::string line = "call " + std::string(method.name) + " --yes";
@@ -190,7 +159,7 @@ TEST_F(InjectionInto, AnyArgumentOfAnyCommandReachesNoShell)
     std::size_t count = 0;
     for (std::string const& line : commandLines()) {
         Lines all = words;
-        if (line.find("UserDel UserName={}") != std::string::npos || line == "get {}")
+        if (line == "get {}") // a unit test has those of methods
             all.insert(all.end(), bytes.begin(), bytes.end());
         for (std::string const& word : all) {
             // A name can hold these.
@@ -219,7 +188,6 @@ TEST_F(InjectionInto, AnyOptionOfTheProgramReachesNoShell)
     for (std::string const& word : hostileWords()) {
         EXPECT_EQ(mihostRun({"--plugin", word, "tree"}).code, 3) << word;
         EXPECT_EQ(mihostRun({"--overlay", word, "tree"}).code, 2) << word;
-        EXPECT_EQ(mihostRun({"--lock-timeout", word, "tree"}).code, 2) << word;
         mihostRun({"--trace", word, "get", "os", "os-name"}); // some are names of files
         mihostRun({"__complete", word, "get", word});
         mihostRun({"__complete-bash", "mihost get " + word, word});
@@ -234,7 +202,7 @@ TEST_F(InjectionInto, AnyFileOfMetricsReachesNoShell)
         mihostRun({"metrics", "--output", word}); // some are names of files
     }
     for (std::string const& line : machine::ran())
-        EXPECT_FALSE(holds(line, "pwned"));
+        EXPECT_FALSE(holds(line, "pwned")); // the doctor's own lines have pipes
     EXPECT_FALSE(std::filesystem::exists(mark));
 }
 

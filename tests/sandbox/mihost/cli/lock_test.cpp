@@ -1,12 +1,10 @@
 // One mihost at a time changes the machine.
 
 #include "mihost/cli/change/ChangeLock.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 #include "tests/support/TerminalRun.h"
 
-#include <gtest/gtest.h>
 #include <optional>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -24,9 +22,7 @@ class MihostLock : public testing::Test
 protected:
     MihostLock()
     {
-        machine::lay("plain");
-        machine::writeIdRanges();
-        machine::run("/usr/sbin/useradd -M jdoe");
+        machine::lay("small");
     }
 
     /** Holds the lock like another mihost during a change. */

@@ -1,11 +1,9 @@
 #include "host/Properties.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
+#include "tests/support/Mihost.h"
 #include "tests/support/Plugin.h"
-#include "tests/support/Program.h"
 
 #include <algorithm>
-#include <gtest/gtest.h>
 
 namespace offered_words_test
 {

@@ -1,13 +1,11 @@
 // The directory that mihost works in may hold a password hash, so nothing of it may stay.
 
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 
 #include <csignal>
 #include <cstdlib>
 #include <filesystem>
-#include <gtest/gtest.h>
 #include <unistd.h>
 
 namespace private_directory_test
@@ -15,9 +13,7 @@ namespace private_directory_test
 
 namespace fs = std::filesystem;
 
-constexpr char folder[] = "/tmp/private";
-constexpr char parent[] = "/tmp/private/tmp";
-constexpr char tools[] = "/tmp/private/bin";
+constexpr char parent[] = "/tmp/private";
 constexpr char hash[] = "$6$saltsalt$hashhashhash\n";
 constexpr uid_t somebody = 65534;
 
@@ -29,26 +25,16 @@ Outcome bash(std::string const& line)
 class MihostPrivateDirectory : public testing::Test
 {
 protected:
-    void SetUp() override
+    MihostPrivateDirectory()
     {
-        machine::lay("plain");
-        machine::run("/usr/sbin/useradd -M -s /bin/sh jdoe");
-        fs::create_directories(parent);
+        machine::lay("small");
+        fs::create_directory(parent);
         setenv("TMPDIR", parent, 1);
-        path_ = std::getenv("PATH");
     }
 
-    void TearDown() override
+    static void fakeChpasswd(std::string const& script)
     {
-        unsetenv("TMPDIR");
-        setenv("PATH", path_.c_str(), 1);
-        fs::remove_all(folder);
-    }
-
-    void fakeChpasswd(std::string const& script) const
-    {
-        machine::fake(std::string(tools) + "/chpasswd", script);
-        setenv("PATH", (std::string(tools) + ":" + path_).c_str(), 1);
+        machine::fake("/usr/sbin/chpasswd", script);
     }
 
     static std::vector<fs::path> found()
@@ -74,9 +60,6 @@ protected:
     {
         EXPECT_EQ(mihostRun({"get", "os", "108"}).code, 0);
     }
-
-private:
-    std::string path_;
 };
 
 TEST_F(MihostPrivateDirectory, OfAKilledStartIsRemovedByTheNext)

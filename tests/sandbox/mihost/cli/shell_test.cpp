@@ -1,17 +1,10 @@
 // The shell without a terminal: scripts that drive one loaded plug-in.
 
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
-
-#include <gtest/gtest.h>
-#include <nlohmann/json.hpp>
+#include "tests/support/Mihost.h"
 
 namespace shell_test
 {
-
-using Json = nlohmann::ordered_json;
 
 class MihostScript : public testing::Test
 {

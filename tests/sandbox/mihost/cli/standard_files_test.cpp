@@ -1,11 +1,7 @@
 // mihost started without some standard streams: files that it opens must not take their places.
 
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
-
-#include <gtest/gtest.h>
+#include "tests/support/Mihost.h"
 
 namespace standard_files_test
 {

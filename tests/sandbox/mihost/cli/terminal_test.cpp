@@ -2,10 +2,8 @@
 
 #include "mihost/cli/output/DisplayWidth.h"
 #include "mihost/sandbox/Sandbox.h"
-#include "tests/support/Holds.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 #include "tests/support/TerminalRun.h"
 
 #include <algorithm>
@@ -14,7 +12,6 @@
 #include <csignal>
 #include <cstdlib>
 #include <filesystem>
-#include <gtest/gtest.h>
 
 namespace terminal_test
 {
@@ -32,20 +29,10 @@ protected:
     {
         setenv("LC_ALL", "C.UTF-8", 1);
         std::setlocale(LC_CTYPE, "C.UTF-8");
-        setenv("TERM", "xterm", 1);
         setenv("TMPDIR", "/tmp/private", 1);
         unsetenv("NO_COLOR");
         std::filesystem::create_directory("/tmp/private");
-        machine::lay("plain");
-        machine::writeIdRanges();
-        machine::write("/etc/passwd", "root:x:0:0:Super:/root:/bin/sh\n"
-                                      "jdoe:x:1000:1000:J. Doe:/home/jdoe:/bin/sh\n");
-        machine::write("/etc/shadow", "root:*:19000:0:99999:7:::\njdoe:!:19000:0:99999:7:::\n",
-                       0600);
-        machine::write("/etc/group", "root:x:0:\njdoe:x:1000:\n");
-        machine::write("/var/log/messages", "Jan  2 03:04:05 line\n");
-        machine::fake("/usr/sbin/lsmod", "echo 'Module Size'\necho 'ext4 1'\necho 'xfs 1'\n");
-        machine::fake("/usr/sbin/modinfo", "echo \"description:    Driver of $1\"\n");
+        machine::lay("small");
     }
 
     static bool nothingIsLeft()
@@ -124,7 +111,7 @@ TEST_F(MihostTerminal, ShowsThePhaseOfTheStartAndHowFarItIs)
     TerminalRun run({"get", "os", "108"});
     for (char const* step :
          {"starting: operating system", "starting: drivers", "drivers 1", "drivers 2",
-          "starting: users", "users 2", "groups 2/2", "log entries 1/1"})
+          "starting: users", "users 2", "groups 2/2", "log entries 2/2"})
         run.waitFor(step);
     run.waitFor("\r\x1b[K"); // and clears it
     run.waitFor("108 os-name  Linux");
@@ -135,20 +122,14 @@ TEST_F(MihostTerminal, ShowsThePhaseOfTheStartAndHowFarItIs)
 TEST_F(MihostTerminal, HasNoProgressIfDumbAndAsciiLinesInC)
 {
     setenv("TERM", "dumb", 1);
-    TerminalRun run({"get", "os", "108"});
-    EXPECT_EQ(run.end(), 0);
-    EXPECT_EQ(run.output(), "108 os-name  Linux\r\n");
+    EXPECT_EQ(atTerminal({"get", "os", "108"}), printed("108 os-name  Linux\r\n"));
     setenv("LC_ALL", "C", 1);
     EXPECT_TRUE(holds(mihostRun({"tree"}).out, "\n`-root #2 "));
 }
 
 TEST_F(MihostTerminal, HasColoursUnlessTheyAreTurnedOff)
 {
-    auto const shown = [](Lines const& arguments) {
-        TerminalRun run(arguments);
-        run.end();
-        return run.output();
-    };
+    auto const shown = [](Lines const& arguments) { return atTerminal(arguments).out; };
     std::string const coloured = "\x1b[32muser:jdoe\x1b[0m";
     EXPECT_TRUE(holds(shown({"tree"}), coloured));
     EXPECT_FALSE(holds(shown({"--color", "never", "tree"}), "\x1b[32m"));
@@ -169,9 +150,8 @@ TEST_F(MihostTerminal, WrapsTextAtItsWidthAndLosesNothing)
     for (unsigned short const columns : std::initializer_list<unsigned short>{40, 80, 81, 82, 200})
         for (Lines const& arguments :
              {Lines{"tree"}, Lines{"list", "users"}, Lines{"list", "log"}}) {
-            TerminalRun run(arguments, columns);
-            EXPECT_EQ(run.end(), 0);
-            std::string const shown = run.output().substr(run.output().rfind("\r\x1b[K"));
+            std::string const all = atTerminal(arguments, columns).out;
+            std::string const shown = all.substr(all.rfind("\r\x1b[K"));
             Lines const lines = plainLines(shown);
             EXPECT_LE(widest(lines), columns) << arguments[0];
             std::string text;
@@ -191,12 +171,9 @@ TEST_F(MihostTerminal, ShowsNoControlCharactersOfTheSystemsTexts)
                                         "32m\n");
     for (Lines const& arguments : {Lines{"tree", "--all"}, Lines{"list", "users"},
                                    Lines{"list", "log"}, Lines{"get", "log:1"}}) {
-        TerminalRun run(arguments, 200);
-        run.end();
-        EXPECT_FALSE(holds(run.output(), "\x1b]"));
-        EXPECT_FALSE(holds(run.output(), "\x1b[2J"));
-        EXPECT_FALSE(holds(run.output(), "\x1b[31m"));
-        EXPECT_FALSE(holds(run.output(), "\x9b"));
+        std::string const shown = atTerminal(arguments, 200).out;
+        for (char const* control : {"\x1b]", "\x1b[2J", "\x1b[31m", "\x9b"})
+            EXPECT_FALSE(holds(shown, control));
     }
 }
 
@@ -257,25 +234,6 @@ TEST_F(MihostTerminal, IsRestoredAfterCtrlCDuringTheStart)
     }
 }
 
-TEST_F(MihostTerminal, ShowsHundredsOfNodesLineByLine)
-{
-    std::string accounts = "root:x:0:0::/:/bin/sh\n";
-    for (int id = 1000; id < 1600; ++id)
-        accounts += "u" + std::to_string(id) + ":x:" + std::to_string(id) +
-                    ":100:" + std::string(100, 'n') + "李明:/home:/bin/sh\n";
-    machine::write("/etc/passwd", accounts);
-    for (unsigned short const columns : std::initializer_list<unsigned short>{80, 200})
-        for (Lines const& arguments : {Lines{"tree"}, Lines{"list", "users"}}) {
-            TerminalRun run(arguments, columns);
-            EXPECT_EQ(run.end(), 0);
-            std::string const& all = run.output();
-            EXPECT_TRUE(holds(all, "starting: users 600")); // the last of the steps shown
-            Lines const shown = plainLines(all.substr(all.rfind("\r\x1b[K")));
-            EXPECT_GT(shown.size(), 601U);
-            EXPECT_LE(widest(shown), columns) << arguments[0];
-        }
-}
-
 TEST_F(MihostTerminal, FinishesAChangeThatHasBegunBeforeCtrlCEndsIt)
 {
     makeToolWait();
@@ -295,18 +253,6 @@ TEST_F(MihostTerminal, StopsAWatchOnCtrlC)
     run.waitFor("108 os-name  Linux");
     run.type(ctrlC);
     EXPECT_EQ(run.end(), 0);
-    EXPECT_TRUE(nothingIsLeft());
-}
-
-TEST_F(MihostTerminal, RunsAShellWithAPrompt)
-{
-    Shell shell;
-    shell.enter("get os 108", osName);
-    shell.enter("get nothing", "mihost: no node 'nothing'");
-    shell.waitFor(prompt);
-    shell.type("exit\n");
-    EXPECT_EQ(shell.end(), 0);
-    EXPECT_TRUE(shell.showsInput());
     EXPECT_TRUE(nothingIsLeft());
 }
 
@@ -355,7 +301,10 @@ TEST_F(MihostTerminal, DropsAShellsLineOnCtrlC)
     shell.waitFor("a"); // of "ha"
     shell.type(ctrlC);
     shell.enter("get os 108", osName);
+    shell.enter("get nothing", "mihost: no node 'nothing'");
     EXPECT_EQ(shell.leave(), 0);
+    EXPECT_TRUE(shell.showsInput());
+    EXPECT_TRUE(nothingIsLeft());
 }
 
 TEST_F(MihostTerminal, ReturnsToTheShellWhenCtrlCStopsAWatch)

@@ -1,12 +1,10 @@
 // The file that --trace writes: who can read it, and which files it does not replace.
 
 #include "mihost/sandbox/Descriptor.h"
-#include "tests/support/Holds.h"
 #include "tests/support/Machine.h"
-#include "tests/support/Program.h"
+#include "tests/support/Mihost.h"
 
 #include <fcntl.h>
-#include <gtest/gtest.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -88,6 +86,12 @@ TEST_F(MihostTraceFile, IsNotAnotherUsers)
     ASSERT_EQ(chown(file, somebody, somebody), 0);
     expectRefused("it belongs to another user (name another file)");
     EXPECT_EQ(machine::read(file), "theirs");
+}
+
+TEST_F(MihostTraceFile, IsNotInAMissingDirectory)
+{
+    EXPECT_EQ(mihostRun({"--trace", "/none/file", "get", "os", "108"}),
+              failed(2, "cannot write the trace '/none/file': No such file or directory"));
 }
 
 TEST_F(MihostTraceFile, IsNotWhereAnotherUsersLinkLeads)

@@ -1,10 +1,7 @@
 // Values that the plug-in cannot read are shown as unknown, not as zero.
 
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
-#include "tests/support/MihostJson.h"
-
-#include <gtest/gtest.h>
+#include "tests/support/Mihost.h"
 
 namespace unknown_values_test
 {

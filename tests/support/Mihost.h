@@ -1,8 +1,19 @@
-#ifndef TESTS_SUPPORT_HOLDS_H
-#define TESTS_SUPPORT_HOLDS_H
+#ifndef TESTS_SUPPORT_MIHOST_H
+#define TESTS_SUPPORT_MIHOST_H
+
+#include "tests/support/Program.h"
 
 #include <gtest/gtest.h>
-#include <string>
+#include <nlohmann/json.hpp>
+
+using Json = nlohmann::ordered_json;
+
+/** Runs mihost with --json. @return what it prints */
+inline Json mihostJson(std::vector<std::string> arguments)
+{
+    arguments.insert(arguments.begin(), "--json");
+    return Json::parse(mihostRun(arguments).out);
+}
 
 /** Whether a text contains another; a failed expectation shows both. */
 inline testing::AssertionResult holds(std::string const& text, std::string const& part)

@@ -2,7 +2,6 @@
 
 #include "TestPaths.h"
 #include "host/Properties.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -65,26 +64,6 @@ TEST_F(Drivers, AreShownForModulesOfEveryOddForm)
                                    {"wide", "3", std::string(495, 'd')}}));
 }
 
-TEST_F(Drivers, AreFourHundredForAsManyModules)
-{
-    machine::fake("/usr/sbin/lsmod", "echo Module Size Used by\nseq -f 'module%g 4096 0' 400\n");
-    machine::fake("/usr/sbin/modinfo", "echo \"version: of $1\"\n");
-    std::vector<Driver> const drivers = shown();
-    ASSERT_EQ(drivers.size(), 400U);
-    EXPECT_EQ(drivers.front(), (Driver{"module1", "of module1", "Driver"}));
-    EXPECT_EQ(drivers.back(), (Driver{"module400", "of module400", "Driver"}));
-    EXPECT_EQ(plugin.nodes(IC::nodeType::driver).back()->getIndex(), 400U);
-}
-
-TEST_F(Drivers, AreThoseOfTheKernel)
-{
-    Lines const modules = linesOf(contentOf("/proc/modules"));
-    std::vector<Driver> const drivers = shown();
-    ASSERT_EQ(drivers.size(), modules.size());
-    for (std::size_t at = 0; at < modules.size(); ++at)
-        EXPECT_EQ(drivers[at].name, modules[at].substr(0, modules[at].find(' ')));
-}
-
 TEST_F(Drivers, AreDescribedByTheModulesThemselves)
 {
     utsname system{};
@@ -119,18 +98,6 @@ TEST_F(Drivers, HaveOnlyNamesOnAMachineWithoutModinfo)
     ASSERT_EQ(drivers.size(), 8U);
     for (Driver const& driver : drivers)
         EXPECT_EQ(driver, (Driver{driver.name, "", "Driver"}));
-}
-
-TEST_F(Drivers, SurviveGarbageFromEveryCommand)
-{
-    machine::fake("/usr/sbin/lsmod", "head -c 3000 /dev/zero; echo; echo loop 1\n"
-                                     "printf '\\377\\001\\n   \\n'; head -c 2000 /dev/zero\n");
-    machine::fake("/usr/sbin/modinfo", "printf 'version: 1\\000\\n'; head -c 4000 /dev/zero\n"
-                                       "printf 'description:'\n");
-    std::vector<Driver> const drivers = shown();
-    ASSERT_EQ(drivers.size(), 2U);
-    EXPECT_EQ(drivers[0], (Driver{"loop", "1", "Driver"}));
-    EXPECT_EQ(drivers[1].name, "\377\001");
 }
 
 } // namespace drivers_test

@@ -181,20 +181,6 @@ TEST_F(DescriptorLimits, LeaveNothingOpenWhereverTheyAreReached)
     expectAWholeStart();
 }
 
-TEST_F(DescriptorLimits, AreReportedAsCommandsThatCannotBeStarted)
-{
-    rlim_t const used = lowestFree();
-    Recording const recording;
-    {
-        Limit const limit(RLIMIT_NOFILE, used);
-        plugin.initialize();
-    }
-    EXPECT_TRUE(recording.has("Cannot open process: lsmod", 3000));
-    EXPECT_TRUE(recording.has("Cannot open process: wc -l /var/log/messages", 6000));
-    EXPECT_TRUE(plugin.nodes(IC::nodeType::driver).empty());
-    EXPECT_TRUE(plugin.nodes(IC::nodeType::logEntry).empty());
-}
-
 TEST_F(Limits, OfProcessesLeaveNoneWhereverTheyAreReached)
 {
     for (rlim_t most = 0; most <= 4; ++most) {
@@ -204,16 +190,6 @@ TEST_F(Limits, OfProcessesLeaveNoneWhereverTheyAreReached)
         liveAndLeaveNothing();
     }
     expectAWholeStart();
-}
-
-TEST_F(Limits, OfProcessesAreReportedAsCommandsThatCannotBeStarted)
-{
-    Recording const recording;
-    Ordinary const user;
-    Limit const limit(RLIMIT_NPROC, 0);
-    plugin.initialize();
-    EXPECT_TRUE(recording.has("Cannot open process: lsmod", 3000));
-    EXPECT_TRUE(recording.has("Cannot open process: wc -l /var/log/messages", 6000));
 }
 
 TEST_F(Limits, OfTheDiskDoNotChangeThePassword)

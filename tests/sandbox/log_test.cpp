@@ -1,7 +1,6 @@
 // The system log as read by the real wc, sed and date.
 
 #include "host/Properties.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -111,18 +110,6 @@ TEST_P(LogOfLines, ShowsTheNewestFiftyAtMost)
 
 INSTANTIATE_TEST_SUITE_P(All, LogOfLines, testing::Values(0, 51));
 
-TEST_F(Log, ShowsTheTimeOfEachEntry)
-{
-    startOn("Nov  2 01:02:03 host one\nJan 31 23:59:59 host two\nFeb 29 12:00:00 host three\n");
-    // February has 28 days in 2026, so this is the day after.
-    EXPECT_EQ(read(IC::property::creationTime),
-              (Lines{"2026-03-01 12:00:00", "2026-01-31 23:59:59", "2026-11-02 01:02:03"}));
-    machine::fake("/usr/bin/date", "echo 'Fri Jan  2 03:15:30 UTC 2026'\n");
-    machine::write(path, "Nov 30 10:11:12 a\nDec 31 23:59:59 b\nJan  1 00:00:01 c\n");
-    EXPECT_EQ(read(IC::property::creationTime),
-              (Lines{"2026-01-01 00:00:01", "2025-12-31 23:59:59", "2026-11-30 10:11:12"}));
-}
-
 TEST_F(Log, UnderstandsTheRealDate)
 {
     std::filesystem::rename("/usr/bin/date.real", "/usr/bin/date");
@@ -150,24 +137,12 @@ TEST_F(Log, IsReadAgainAsItGrowsShrinksAndVanishes)
     EXPECT_EQ(read(IC::property::message), (Lines{"*news*", "*message 3*", "*message 2*"}));
     EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "2026-11-20 10:11:30");
     machine::write(path, lines(1));
-    Recording const recording;
     EXPECT_EQ(read(IC::property::message), (Lines{"*message 1*", "**", "(status 1)"}));
     EXPECT_EQ(text(*entries()[2], IC::property::creationTime), "(status 1)");
-    EXPECT_EQ(recording.texts(6000), (Lines{"Invalid index: getMaxLine()=1, Index=3",
-                                            "Invalid index: getMaxLine()=1, logIndex=3"}));
     machine::remove(path);
     EXPECT_EQ(read(IC::property::message), (Lines{"**", "(status 1)", "(status 1)"}));
     EXPECT_EQ(text(*entries()[0], IC::property::creationTime), "(status 1)");
     EXPECT_EQ(messages(), newest(3, 3));
-}
-
-TEST_F(Log, HasNoEntriesIfItIsMissing)
-{
-    machine::remove(path);
-    Recording const recording;
-    plugin.initialize();
-    EXPECT_TRUE(entries().empty());
-    EXPECT_TRUE(recording.has("Invalid format: buffer = ", 6000));
 }
 
 TEST_F(Log, HasNoEntriesWithoutReadPermission)
@@ -196,26 +171,6 @@ TEST_F(Log, KeepsItsOwnerAndModeWhenItIsCleared)
     EXPECT_EQ(now.st_mode & 07777U, 0640U);
     EXPECT_EQ(now.st_uid, 12345U);
     EXPECT_EQ(now.st_gid, 23456U);
-}
-
-TEST_F(Log, GetsEntriesForLinesWrittenDuringTheClearing)
-{
-    startOn(lines(2));
-    // A logger that writes between the clearing and the count.
-    machine::fake("/usr/local/bin/wc", "[ -s /var/log/messages ] || "
-                                       "echo 'Nov 20 10:11:40 news' >/var/log/messages\n"
-                                       "exec /usr/bin/wc \"$@\"\n");
-    clear();
-    EXPECT_EQ(messages(), Lines{"*news*"});
-}
-
-TEST_F(Log, KeepsLinesAndEntriesIfItCannotBeCleared)
-{
-    startOn(lines(2));
-    dropPrivileges();
-    clear();
-    EXPECT_EQ(machine::read(path), lines(2));
-    EXPECT_EQ(messages(), newest(2, 2));
 }
 
 } // namespace log_test

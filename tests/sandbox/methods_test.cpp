@@ -2,7 +2,6 @@
 // that the host receives.
 
 #include "host/Properties.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/Recording.h"
@@ -33,14 +32,9 @@ public:
     /** Writes a method-call text as a host does. @return the status */
     int call(std::string const& text)
     {
-        return write(IC::property::createUser, IC::PropertyValue(text, true));
-    }
-
-    int write(unsigned int id, IC::PropertyValue const& value)
-    {
         received.clear();
         machine::forget();
-        return os().setProperty(id, value).getStatus();
+        return os().setProperty(IC::property::createUser, {text, true}).getStatus();
     }
 
     IC::MutableNode& os() const
@@ -275,13 +269,6 @@ TEST_P(Methods, ChangeOneMembershipAndKeepTheOthers)
     EXPECT_EQ(text(host_.plugin().node(IC::nodeType::group, "crew"), IC::property::members), "");
 }
 
-TEST_P(Methods, GetShadowingRunsNothingAndSucceeds)
-{
-    EXPECT_EQ(host_.call("GetShadowing"), 0);
-    EXPECT_EQ(host_.ran(), Lines());
-    EXPECT_TRUE(host_.hasReceived(IC::nodeType::user, "root"));
-}
-
 TEST_P(Methods, PassValuesAsShellText)
 {
     // Only the last command's errors are merged in, so the failure goes unnoticed, too.
@@ -381,32 +368,6 @@ TEST_F(UserAdd, MakesNoUserGroupOnARedhatMachine)
     EXPECT_EQ(host.call(call_), 0);
     EXPECT_EQ(host.ran(), (Lines{useraddLine("/usr/sbin/useradd -n"), chageLine_}));
     expectAdded(host);
-}
-
-TEST_F(UserAdd, FailsOnARedhatMachineWithoutTheOption)
-{
-    HostedMachine host("redhat");
-    bool const known = succeeds("/usr/sbin/useradd -n -D");
-    EXPECT_EQ(host.call(call_), known ? 0 : 1);
-    EXPECT_EQ(host.ran().at(0), useraddLine("/usr/sbin/useradd -n"));
-    EXPECT_EQ(machine::entry("/etc/passwd", "jdoe").empty(), !known);
-    EXPECT_EQ(host.received.empty(), !known);
-}
-
-TEST(Commands, ClearTheLogAndRefreshUsersAndGroups)
-{
-    HostedMachine host("plain");
-    ASSERT_FALSE(host.plugin().nodes(IC::nodeType::logEntry).empty());
-    EXPECT_EQ(host.write(IC::property::clearLog, {IC::Number(9U), true}), 0);
-    EXPECT_EQ(machine::read("/var/log/messages"), "");
-    EXPECT_TRUE(host.plugin().nodes(IC::nodeType::logEntry).empty());
-
-    machine::run("/usr/sbin/useradd jdoe && /usr/sbin/groupadd crew");
-    EXPECT_EQ(host.plugin().find(IC::nodeType::user, "jdoe"), nullptr);
-    EXPECT_EQ(host.write(IC::property::refresh, {IC::Number(0U), true}), 0);
-    EXPECT_TRUE(host.hasReceived(IC::nodeType::user, "jdoe"));
-    EXPECT_TRUE(host.hasReceived(IC::nodeType::group, "crew"));
-    EXPECT_EQ(text(host.os(), IC::property::refresh), "0");
 }
 
 } // namespace methods_test

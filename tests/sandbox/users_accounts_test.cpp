@@ -1,7 +1,6 @@
 // Users and groups made by the real account tools, and the effects of writes to user nodes.
 
 #include "host/Properties.h"
-#include "tests/support/Lines.h"
 #include "tests/support/Machine.h"
 #include "tests/support/Plugin.h"
 #include "tests/support/TimeZone.h"
@@ -212,30 +211,6 @@ TEST_F(RealAccounts, AreInTheirGroupsAsGroupaddAndUsermodMadeThem)
     EXPECT_EQ(machine::ran(), Lines{});
 }
 
-/** The value of one property in all nodes of a type, in order. */
-Lines all(Plugin const& plugin, unsigned int type, unsigned int id)
-{
-    Lines found;
-    for (IC::MutableNode const* node : plugin.nodes(type))
-        found.push_back(stored(*node, id));
-    return found;
-}
-
-TEST(LaidMachine, ShowsItsUsersAndGroupsInTheOrderOfItsFiles)
-{
-    machine::lay("users-and-groups");
-    Plugin plugin;
-    plugin.initialize();
-    EXPECT_EQ(all(plugin, IC::nodeType::user, IC::property::name),
-              (Lines{"root", "anna", "ben", "carl"}));
-    EXPECT_EQ(all(plugin, IC::nodeType::user, IC::property::maxLoginFailures),
-              (Lines{"3", "3", "3", "3"}));
-    EXPECT_EQ(all(plugin, IC::nodeType::group, IC::property::name),
-              (Lines{"root", "anna", "ben", "team"}));
-    EXPECT_EQ(all(plugin, IC::nodeType::group, IC::property::members),
-              (Lines{"root", "anna", "ben", "anna,ben,carl"}));
-}
-
 TEST(LaidMachine, ShowsAllMembersOfAGroupOfTenThousand)
 {
     machine::lay("users-and-groups");
@@ -245,8 +220,8 @@ TEST(LaidMachine, ShowsAllMembersOfAGroupOfTenThousand)
     machine::write("/etc/group", "root:x:0:\nlarge:x:5000:" + members + "\nlast:x:5001:\n");
     Plugin plugin;
     plugin.initialize();
-    EXPECT_EQ(all(plugin, IC::nodeType::group, IC::property::members),
-              (Lines{"root", members, ""}));
+    EXPECT_EQ(stored(plugin.node(IC::nodeType::group, "large"), IC::property::members), members);
+    EXPECT_EQ(stored(plugin.node(IC::nodeType::group, "last"), IC::property::members), "");
 }
 
 } // namespace users_accounts_test

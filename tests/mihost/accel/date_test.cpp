@@ -120,9 +120,10 @@ TEST(AccelDate, IsRunOnceAndThenAnswered)
 {
     auto const [expected, found] = bothways::dates();
     EXPECT_EQ(found, expected);
-    answered("date");
+    for (int times = 0; times < 2; ++times) // the hour may change
+        answered("date");
     EXPECT_GE(countOf("date").answered, 1U);
-    EXPECT_GE(countOf("date").ran, 1U); // the hour may have changed
+    EXPECT_GE(countOf("date").ran, 1U);
     EXPECT_EQ(bothways::reasonOf("date"), "date runs once an hour, for comparison");
 }
 

@@ -224,32 +224,6 @@ TEST_F(RuntimeInterface, AnswersStatus1ForANodeThatItDoesNotList)
     EXPECT_EQ(listed(), Ids{2});
 }
 
-TEST_F(RuntimeInterface, DeletesNodesInAnyOrder)
-{
-    std::mt19937 random(17);
-    for (int round = 0; round < 50; ++round) {
-        Nodes nodes;
-        for (unsigned int id = 0; id < 20; ++id)
-            nodes.push_back(add(id));
-        Ids order(20);
-        for (unsigned int id = 0; id < 20; ++id)
-            order[id] = id;
-        if (round > 1)
-            std::shuffle(order.begin(), order.end(), random);
-        else if (round == 1)
-            std::reverse(order.begin(), order.end());
-
-        Ids left = listed();
-        for (unsigned int const id : order) {
-            events_.clear();
-            EXPECT_EQ(interface_.deleteNode(nodes[id]).getStatus(), 0U);
-            EXPECT_EQ(events_, Events{"gone " + std::to_string(id)});
-            left.erase(std::find(left.begin(), left.end(), id));
-            ASSERT_EQ(listed(), left);
-        }
-    }
-}
-
 TEST_F(RuntimeInterface, KeepsTheOrderThroughAdditionsAndDeletions)
 {
     std::mt19937 random(19);

@@ -7,7 +7,6 @@
 
 #include <climits>
 #include <locale>
-#include <ostream>
 #include <random>
 #include <string>
 
@@ -94,24 +93,6 @@ TEST(MakeWstring, KeepsAnyBytesThereAndBack)
         for (char& byte : text)
             byte = random() % 2 != 0 ? alphabet[random() % alphabet.size()]
                                      : static_cast<char>(random() % 256);
-        ASSERT_EQ(thereAndBack(text), text);
-    }
-}
-
-TEST(MakeWstring, KeepsRandomUtf8ThereAndBack)
-{
-    std::mt19937 random(20081231);
-    for (int round = 0; round < 5000; ++round) {
-        std::string text;
-        std::size_t characters = 0;
-        for (auto left = random() % 24; left > 0; --left) {
-            auto const code = static_cast<char32_t>(random() % 0x110000);
-            if (isSurrogate(code))
-                continue;
-            text += utf8(code);
-            ++characters;
-        }
-        ASSERT_EQ(make_wstring(text).size(), characters);
         ASSERT_EQ(thereAndBack(text), text);
     }
 }

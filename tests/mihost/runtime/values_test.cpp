@@ -115,24 +115,6 @@ TEST(Alert, CarriesANodeAndAText)
     EXPECT_EQ(IC::Alert(copy).getText(), "full");
 }
 
-struct ValueCase {
-    char const* name;
-    PropertyValue value;
-    PropertyValue::KindType kind;
-    std::string text;
-    unsigned int asUnsigned;
-    long long number;
-};
-
-void PrintTo(ValueCase const& test, std::ostream* out)
-{
-    *out << test.name;
-}
-
-class ValueConversion : public testing::TestWithParam<ValueCase>
-{
-};
-
 PropertyValue numbers(std::vector<Number> const& list)
 {
     return {list, true};
@@ -143,68 +125,63 @@ PropertyValue texts(std::vector<std::string> const& list)
     return {list, true};
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Of, ValueConversion,
-    testing::Values(
-        ValueCase{"text", {"jdoe", true}, PropertyValue::TextKind, "jdoe", 0, 0},
-        ValueCase{"stringText",
-                  {std::string("a\0b", 3), true},
-                  PropertyValue::TextKind,
-                  std::string("a\0b", 3),
-                  0,
-                  0},
-        ValueCase{"emptyText", {"", true}, PropertyValue::TextKind, "", 0, 0},
-        ValueCase{"decimalText", {"0009", true}, PropertyValue::TextKind, "0009", 9, 0},
-        ValueCase{"number", {Number(42U), true}, PropertyValue::NumberKind, "42", 42, 42},
-        ValueCase{"largestNumber",
-                  {Number(4294967295U), true},
-                  PropertyValue::NumberKind,
-                  "4294967295",
-                  4294967295U,
-                  4294967295},
-        ValueCase{"true_", {Number(true), true}, PropertyValue::BooleanKind, "true", 1, 1},
-        ValueCase{"false_", {Number(false), true}, PropertyValue::BooleanKind, "false", 0, 0},
-        ValueCase{
-            "enumeration", {EnumValue(35U), true}, PropertyValue::EnumerationKind, "35", 35, 35},
-        ValueCase{
-            "emptyNumber", {Number(Number::EmptyKind), true}, PropertyValue::EmptyKind, "", 0, 0},
-        ValueCase{"empty", {PropertyValue::EmptyKind, true}, PropertyValue::EmptyKind, "", 0, 0},
-        ValueCase{"emptyOfAKind",
-                  {PropertyValue::NumbersKind, true},
-                  PropertyValue::NumbersKind,
-                  "",
-                  0,
-                  0},
-        ValueCase{"numbers", numbers({Number(0U), Number(1U), Number(24U)}),
-                  PropertyValue::NumbersKind, "0,1,24", 0, 0},
-        ValueCase{"oneNumber", numbers({Number(9U)}), PropertyValue::NumbersKind, "9", 0, 0},
-        ValueCase{"mixedNumbers", numbers({Number(true), Number(Number::EmptyKind), Number(2U)}),
-                  PropertyValue::NumbersKind, "true,,2", 0, 0},
-        ValueCase{"noNumbers", numbers({}), PropertyValue::NumbersKind, "", 0, 0},
-        ValueCase{"texts", texts({"jdoe", "", "a,b"}), PropertyValue::TextsKind, "jdoe,,a,b", 0, 0},
-        ValueCase{"noTexts", texts({}), PropertyValue::TextsKind, "", 0, 0}),
-    [](auto const& test) { return std::string(test.param.name); });
+struct ValueCase {
+    PropertyValue value;
+    PropertyValue::KindType kind;
+    std::string text;
+    unsigned int asUnsigned = 0;
+    long long number = 0;
+};
 
-TEST_P(ValueConversion, KnowsItsKindItsTextAndItsNumber)
+std::vector<ValueCase> valueCases()
 {
-    EXPECT_EQ(GetParam().value.getKind(), GetParam().kind);
-    EXPECT_EQ(asText(GetParam().value), GetParam().text);
-    EXPECT_EQ(asUnsigned(GetParam().value), GetParam().asUnsigned);
-    EXPECT_EQ(GetParam().value.getNumber(), GetParam().number);
-    std::ostringstream out;
-    out << "[" << GetParam().value << "]";
-    EXPECT_EQ(out.str(), "[" + GetParam().text + "]");
+    using Kind = PropertyValue;
+    std::string const withNul("a\0b", 3);
+    return {{{"jdoe", true}, Kind::TextKind, "jdoe"},
+            {{withNul, true}, Kind::TextKind, withNul},
+            {{"", true}, Kind::TextKind, ""},
+            {{"0009", true}, Kind::TextKind, "0009", 9},
+            {{Number(42U), true}, Kind::NumberKind, "42", 42, 42},
+            {{Number(4294967295U), true}, Kind::NumberKind, "4294967295", 4294967295U, 4294967295},
+            {{Number(true), true}, Kind::BooleanKind, "true", 1, 1},
+            {{Number(false), true}, Kind::BooleanKind, "false"},
+            {{EnumValue(35U), true}, Kind::EnumerationKind, "35", 35, 35},
+            {{Number(Number::EmptyKind), true}, Kind::EmptyKind, ""},
+            {{PropertyValue::EmptyKind, true}, Kind::EmptyKind, ""},
+            {{PropertyValue::NumbersKind, true}, Kind::NumbersKind, ""},
+            {numbers({Number(0U), Number(1U), Number(24U)}), Kind::NumbersKind, "0,1,24"},
+            {numbers({Number(9U)}), Kind::NumbersKind, "9"},
+            {numbers({Number(true), Number(Number::EmptyKind), Number(2U)}), Kind::NumbersKind,
+             "true,,2"},
+            {numbers({}), Kind::NumbersKind, ""},
+            {texts({"jdoe", "", "a,b"}), Kind::TextsKind, "jdoe,,a,b"},
+            {texts({}), Kind::TextsKind, ""}};
 }
 
-TEST_P(ValueConversion, SurvivesCopyAndAssignment)
+TEST(PropertyValue, KnowsItsKindItsTextAndItsNumber)
 {
-    PropertyValue copy("before", !GetParam().value.getFlag());
-    copy = GetParam().value;
-    PropertyValue const again(copy);
-    copy = PropertyValue("after", false);
-    EXPECT_EQ(again.getKind(), GetParam().kind);
-    EXPECT_EQ(again.getFlag(), GetParam().value.getFlag());
-    EXPECT_EQ(asText(again), GetParam().text);
+    for (auto const& [value, kind, text, asNumber, number] : valueCases()) {
+        EXPECT_EQ(value.getKind(), kind) << text;
+        EXPECT_EQ(asText(value), text);
+        EXPECT_EQ(asUnsigned(value), asNumber) << text;
+        EXPECT_EQ(value.getNumber(), number) << text;
+        std::ostringstream out;
+        out << "[" << value << "]";
+        EXPECT_EQ(out.str(), "[" + text + "]");
+    }
+}
+
+TEST(PropertyValue, SurvivesCopyAndAssignment)
+{
+    for (ValueCase const& each : valueCases()) {
+        PropertyValue copy("before", !each.value.getFlag());
+        copy = each.value;
+        PropertyValue const again(copy);
+        copy = PropertyValue("after", false);
+        EXPECT_EQ(again.getKind(), each.kind) << each.text;
+        EXPECT_EQ(again.getFlag(), each.value.getFlag()) << each.text;
+        EXPECT_EQ(asText(again), each.text);
+    }
 }
 
 TEST(PropertyValue, BecomesTheNumberOfATextOfDigitsThatFits)

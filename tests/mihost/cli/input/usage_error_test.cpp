@@ -16,29 +16,57 @@ std::string refusalOf(Words const& words)
     return refusal([&words] { mihost::CommandLine(mihost::commandTable()).parse(words); });
 }
 
-TEST(UsageError, NamesTheMissingValueOfAnOption)
+TEST(UsageError, SaysWhatIsWrongAndWhatToWrite)
 {
-    EXPECT_EQ(refusalOf({"-H"}), "--host: no value given (write --host [USER@]HOST)");
-    EXPECT_EQ(refusalOf({"list", "log", "-n"}), "list: --lines: no value given (write --lines N)");
-    EXPECT_EQ(refusalOf({"--color"}), "--color: no value given (write --color auto|always|never)");
-    EXPECT_EQ(refusalOf({"list", "users", "--where"}),
-              "list: --where: no value given (write --where COLUMN=VALUE|COLUMN~TEXT)");
-}
-
-TEST(UsageError, NamesAnOptionThatIsRepeated)
-{
-    EXPECT_EQ(refusalOf({"-o", "json", "-o", "yaml", "version"}),
-              "version: --output-format: given more than once (see 'mihost version --help')");
-    EXPECT_EQ(refusalOf({"--json", "-o", "yaml", "version"}),
-              "version: --json and -o cannot be combined (see 'mihost version --help')");
-}
-
-TEST(UsageError, NamesAFlagWithAValue)
-{
-    EXPECT_EQ(refusalOf({"--sandbox=x", "tree"}),
-              "tree: --sandbox takes no value (see 'mihost tree --help')");
-    EXPECT_EQ(refusalOf({"user", "add", "jdoe", "--password=secret"}),
-              "user add: --password takes no value (see 'mihost user add --help')");
+    struct Row {
+        Words words;
+        char const* message;
+    };
+    for (Row const& row : std::initializer_list<Row>{
+             // an option without its value, a repeated one, and a flag with a value
+             {{"-H"}, "--host: no value given (write --host [USER@]HOST)"},
+             {{"list", "log", "-n"}, "list: --lines: no value given (write --lines N)"},
+             {{"--color"}, "--color: no value given (write --color auto|always|never)"},
+             {{"list", "users", "--where"},
+              "list: --where: no value given (write --where COLUMN=VALUE|COLUMN~TEXT)"},
+             {{"-o", "json", "-o", "yaml", "version"},
+              "version: --output-format: given more than once (see 'mihost version --help')"},
+             {{"--json", "-o", "yaml", "version"},
+              "version: --json and -o cannot be combined (see 'mihost version --help')"},
+             {{"--sandbox=x", "tree"}, "tree: --sandbox takes no value (see 'mihost tree --help')"},
+             {{"user", "add", "jdoe", "--password=secret"},
+              "user add: --password takes no value (see 'mihost user add --help')"},
+             // arguments
+             {{"get"}, "get: NODE is required (see 'mihost get --help')"},
+             {{"set", "os"}, "set: PROPERTY is required (see 'mihost set --help')"},
+             {{"user"}, "user: USER or a command is required (see 'mihost user --help')"},
+             {{"user", "set-shell", "jdoe"},
+              "user set-shell: SHELL is required (see 'mihost user set-shell --help')"},
+             {{"tree", "os", "extra"},
+              "tree: unexpected argument 'extra' (see 'mihost tree --help')"},
+             {{"user", "jdoe", "lock"},
+              "user: unexpected argument 'lock' (see 'mihost user --help')"},
+             {{"user", "jdoe", "delete", "jdoe"},
+              "user delete: unexpected argument 'jdoe' (see 'mihost user delete --help')"},
+             {{"user", "delete", "jdoe", "staff"},
+              "user delete: unexpected argument 'staff' (see 'mihost user delete --help')"},
+             {{"watch", "os", "108", "--interval", "nan"},
+              "watch: --interval: 'nan' is not a number from 0 to 86400 (see 'mihost watch "
+              "--help')"},
+             // unknown names
+             {{"doctr"}, "no command 'doctr' (did you mean doctor?)"},
+             {{"user", "set-shel", "jdoe"},
+              "user: no command 'set-shel' (did you mean set-shell?)"},
+             {{"--timng", "tree"}, "tree: no option '--timng' (did you mean --timing?)"},
+             {{"list", "users", "--colums=id"},
+              "list: no option '--colums=id' (did you mean --columns?)"},
+             {{"user", "add", "asmith", "--shel", "/bin/sh"},
+              "user add: no option '--shel' (did you mean --shell?)"},
+             {{"tree", "--nothing"}, "tree: no option '--nothing' (see 'mihost tree --help')"},
+             {{"--nothing"}, "no option '--nothing' (see 'mihost --help')"},
+             {{"power", "hatl"}, "power: ACTION: unknown value 'hatl' (did you mean halt?)"}})
+        EXPECT_EQ(refusalOf(row.words), row.message);
+    EXPECT_EQ(refusalOf({"nonsense"}).rfind("no command 'nonsense' (use tree, list, ", 0), 0U);
 }
 
 TEST(UsageError, SaysWhichNumbersAnOptionTakes)
@@ -53,22 +81,6 @@ TEST(UsageError, SaysWhichNumbersAnOptionTakes)
     EXPECT_EQ(refusalOf({"--lock-timeout", "0.5", "refresh"}),
               "refresh: --lock-timeout: '0.5' is not a whole number from 0 to 86400 (see 'mihost "
               "refresh --help')");
-}
-
-TEST(UsageError, AsksForAnAccountOrATask)
-{
-    EXPECT_EQ(refusalOf({"user"}),
-              "user: USER or a command is required (see 'mihost user --help')");
-    EXPECT_EQ(refusalOf({"user", "jdoe", "lock"}),
-              "user: unexpected argument 'lock' (see 'mihost user --help')");
-}
-
-TEST(UsageError, SuggestsWhatWasMeant)
-{
-    EXPECT_EQ(refusalOf({"doctr"}), "no command 'doctr' (did you mean doctor?)");
-    EXPECT_EQ(refusalOf({"tree", "--jsno"}), "tree: no option '--jsno' (did you mean --json?)");
-    EXPECT_EQ(refusalOf({"user", "set-shel", "jdoe"}),
-              "user: no command 'set-shel' (did you mean set-shell?)");
 }
 
 } // namespace usage_error_test

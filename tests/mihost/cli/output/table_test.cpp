@@ -93,25 +93,32 @@ TEST(TableSelection, TakesTheFirstOperatorAsTheConditions)
     EXPECT_EQ(valueText(table.selected({{}, "", {"text~a=b"}})), "a=b\n");
 }
 
-int codeOf(Selection const& selection)
-{
-    try {
-        people().selected(selection);
-    } catch (Failure const& failure) {
-        return failure.code();
-    }
-    return mihost::Done;
-}
-
 TEST(TableSelection, RefusesUnknownColumnsAndWhatIsNotACondition)
 {
-    EXPECT_EQ(codeOf({{"none"}, "", {}}), mihost::NotFound);
-    EXPECT_EQ(codeOf({{""}, "", {}}), mihost::NotFound);
-    EXPECT_EQ(codeOf({{}, "none", {}}), mihost::NotFound);
-    EXPECT_EQ(codeOf({{}, "-", {}}), mihost::NotFound);
-    EXPECT_EQ(codeOf({{}, "", {"none=1"}}), mihost::NotFound);
-    EXPECT_EQ(codeOf({{}, "", {"name"}}), mihost::BadUsage);
-    EXPECT_EQ(codeOf({{}, "", {"=root"}}), mihost::BadUsage);
+    std::string const noCondition =
+        ": not a condition (use COLUMN=VALUE for equal, COLUMN~TEXT for containing)";
+    struct Row {
+        Selection selection;
+        int code;
+        std::string message;
+    };
+    for (Row const& row : std::initializer_list<Row>{
+             {{{"none"}, "", {}}, mihost::NotFound, "no column 'none' (use name, id, shell)"},
+             {{{"names"}, "", {}}, mihost::NotFound, "no column 'names' (did you mean name?)"},
+             {{{""}, "", {}}, mihost::NotFound, "no column '' (use name, id, shell)"},
+             {{{}, "none", {}}, mihost::NotFound, "no column 'none' (use name, id, shell)"},
+             {{{}, "-", {}}, mihost::NotFound, "no column '' (use name, id, shell)"},
+             {{{}, "", {"none=1"}}, mihost::NotFound, "no column 'none' (use name, id, shell)"},
+             {{{}, "", {"name"}}, mihost::BadUsage, "--where name" + noCondition},
+             {{{}, "", {"=root"}}, mihost::BadUsage, "--where =root" + noCondition},
+         })
+        try {
+            people().selected(row.selection);
+            ADD_FAILURE() << row.message;
+        } catch (Failure const& failure) {
+            EXPECT_EQ(failure.code(), row.code);
+            EXPECT_EQ(failure.what(), row.message);
+        }
 }
 
 TEST(TableAsJson, HasValuesInTheirOwnTypes)

@@ -1,6 +1,5 @@
 #include "mihost/cli/plugin/CommandGuard.h"
 
-#include <cctype>
 #include <cstring>
 #include <gtest/gtest.h>
 #include <string>

@@ -77,6 +77,7 @@ TEST_F(DriverInventory, ReadsTheFactsOfAModule)
          "version: 1\nversion:2\ndescription:disk\n",
          "loop|1|Driver",
          {"Invalid format: buffer2 = version:2\n", "Invalid format: buffer2 = description:disk\n"}},
+        {"facts twice", "version: 1\ndescription: a\nversion: 2\ndescription: b\n", "loop|2|b", {}},
         {"a description of blanks", "description:     \n", "loop||", {}},
         {"510 characters", "description: " + longest + "\n", "loop||" + longest, {}},
         {"a longer line, which is read as two",

@@ -86,6 +86,7 @@ TEST(IdRanges, ReadsTheNumberAfterAKeyAndOneByte)
         {"a comment", "#UID_MIN 1000\n", 0},
         {"a key after a blank", " UID_MIN 1000\n", 0},
         {"a key after a tab", "\tUID_MIN 1000\n", 0},
+        {"a key after a carriage return", "UMASK 022\rUID_MIN 1000\n", 0},
         {"another key", "SYS_UID_MIN 1000\n", 0},
         {"other lines", "# Range of ids\n\nUMASK 022\nUID_MI 7\nuid_min 8\nUID_MIN 1000\n", 1000},
         {"no line end", "UMASK 022\nUID_MIN 1000", 1000},

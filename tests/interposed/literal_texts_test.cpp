@@ -1,5 +1,6 @@
 // Which text properties are made of literals, and which of std::string.
 
+#include "nodes/OsNode.h"
 #include "tests/interposed/StandIns.h"
 #include "tests/support/FakeFiles.h"
 #include "tests/support/Frame.h"
@@ -45,6 +46,14 @@ TEST_F(LiteralTexts, TheComputersNameIsNotALiteralEvenIfItIsEmpty)
         EXPECT_EQ(computerName(name), "text " + name + " true");
         EXPECT_EQ(standIns().literals, Lines());
     }
+}
+
+TEST_F(LiteralTexts, AFailedMethodStoresAnEmptyLiteral)
+{
+    IC::OsNode node(9, 7, {7}, 17, 0);
+    node.setProperty(74, {std::string("NoSuchMethod"), true});
+    EXPECT_EQ(storedValue(node, 74), "text  true");
+    EXPECT_EQ(standIns().literals, Lines{""});
 }
 
 TEST_F(LiteralTexts, OnlyProperty113OfAUserIsALiteral)

@@ -90,6 +90,27 @@ bool NQ::OsInfo::groupMemberChanges(std::string method, std::vector<ParamInfo> p
     return true;
 }
 
+void NQ::OsInfo::strreplace(char* s, char from, char to)
+{
+    static auto* const real = interpose::real(&OsInfo::strreplace);
+    seen().push_back(std::string("strreplace ") + from + to);
+    real(this, s, from, to);
+}
+
+bool NQ::OsInfo::getOSReleaseName(std::string path, std::string& out)
+{
+    seen().push_back("getOSReleaseName " + path);
+    out = "of " + path;
+    return path == "/etc/SuSE-release";
+}
+
+bool NQ::OsInfo::getKestoVersion(std::string path, std::string& out)
+{
+    seen().push_back("getKestoVersion " + path);
+    out = "10.2";
+    return true;
+}
+
 namespace
 {
 
@@ -164,6 +185,33 @@ TEST_F(PublicCalls, TheParserSplitsAtBothLevelsWithTokenize)
         EXPECT_EQ(seen(), (Calls{"Tokenize ,", "Tokenize :", "Tokenize :"}));
         EXPECT_EQ(params.size(), 2U);
     }
+}
+
+TEST_F(PublicCalls, TheNameAndTheVersionUseTheReadersOfTheirFiles)
+{
+    static auto* const realName = interpose::real(&NQ::OsInfo::getOSName);
+    static auto* const realVersion = interpose::real(&NQ::OsInfo::getOSVersion);
+    NQ::OsInfo info;
+    std::string name;
+    std::string version;
+    EXPECT_TRUE(realName(&info, name));
+    EXPECT_TRUE(realVersion(&info, version));
+    EXPECT_EQ(name, "of /etc/SuSE-release");
+    EXPECT_EQ(version, "10.2");
+    EXPECT_EQ(seen(),
+              (Calls{"getOSReleaseName /etc/release", "getOSReleaseName /etc/vmware-release",
+                     "getOSReleaseName /etc/redhat-release", "getOSReleaseName /etc/SuSE-release",
+                     "getKestoVersion /etc/release"}));
+}
+
+TEST_F(PublicCalls, TheInstallDateReplacesHyphensAndThenColons)
+{
+    files_.write("/etc/redhat-release", "");
+    commands_.otherwise = "Change: 2010-05-12 10:23:45\n";
+    long date = 0;
+    EXPECT_TRUE(realGetInstallDate(date));
+    EXPECT_NE(date, 0);
+    EXPECT_EQ(seen(), (Calls{"strreplace - ", "strreplace : "}));
 }
 
 TEST_F(PublicCalls, TheExecutorUsesRunnerAndPasswordSetter)

@@ -509,6 +509,10 @@ TEST_F(Lifecycle, HoldsTheLockThroughoutABuildAndARebuild)
             EXPECT_EQ(std::count(entry, exit, "unlock()"), unlocks);
         }
     }
+    host.events.clear();
+    plugin.node(IC::nodeType::operatingSystem).setProperty(75, {IC::Number(0U), true});
+    // Around the users, around the groups, and around the listing of the groups.
+    EXPECT_EQ(std::count(host.events.begin(), host.events.end(), "lock(4294967295)"), 3);
 }
 
 TEST_F(Lifecycle, HasTheCategoryOfEveryUnitFromTheStart)

@@ -9,6 +9,7 @@
 
 #include "sysdata/driverInfo_linux.h"
 #include "sysdata/logInfo_linux.h"
+#include "sysdata/osInfo_linux.h"
 #include "tests/interpose/Libc.h"
 #include "tests/support/Insides.h"
 #include "util/MyProcess.h"
@@ -120,6 +121,19 @@ static_assert(is<FILE* (NQ::MyProcess::*)(char const*, char const*)>(&NQ::MyProc
 static_assert(is<char* (*)(char*, char)>(&NQ::strget));
 static_assert(is<time_t (*)(int, char*, int, int, int, int, int, int)>(&NQ::to_time_t));
 static_assert(is<time_t (*)(int, int, int, int, int, int, int, int)>(&NQ::ito_time_t));
+static_assert(is<int (NQ::OsInfo::*)(std::string, std::string&, std::vector<NQ::ParamInfo>&)>(
+    &NQ::OsInfo::parseMethodAndParams));
+static_assert(is<int (NQ::OsInfo::*)(std::string, std::vector<NQ::ParamInfo>, bool&)>(
+    &NQ::OsInfo::executeMethod));
+static_assert(is<int (NQ::OsInfo::*)(char*, char**, char*)>(&NQ::OsInfo::executeCommand));
+static_assert(is<void (NQ::OsInfo::*)(char*, char*)>(&NQ::OsInfo::executePasswordEncryption));
+static_assert(is<bool (NQ::OsInfo::*)(std::string, std::vector<NQ::ParamInfo>)>(
+    &NQ::OsInfo::groupMemberChanges));
+static_assert(is<void (NQ::OsInfo::*)(std::string&)>(&NQ::OsInfo::trimString));
+static_assert(is<void (NQ::OsInfo::*)(char*, char, char)>(&NQ::OsInfo::strreplace));
+static_assert(
+    is<void (*)(std::string const&, std::vector<std::string>&, std::string const&)>(&NQ::Tokenize));
+static_assert(is<void (IC::OsSwMI::*)(IC::Node*)>(&IC::OsSwMI::publishNode));
 static_assert(is<void (IC::OsSwMI::*)()>(&IC::OsSwMI::createDriverNodes));
 static_assert(is<void (IC::OsSwMI::*)()>(&IC::OsSwMI::createLogNodes));
 static_assert(is<void (IC::OsSwMI::*)(bool)>(&IC::OsSwMI::createLogEntryNodes));

@@ -95,6 +95,8 @@ TEST_F(FileModes, OfTheProbesOfMethodsAreR)
         info_.executeMethod("GetShadowing", {}, shadowing);
     };
     EXPECT_EQ(openedBy(probe), (Opened{"/etc/redhat-release|r", "/etc/shadow|r"}));
+    auto const remove = [this] { info_.setCreateUser("UserDel,UserName:CMPI_string:jdoe"); };
+    EXPECT_EQ(openedBy(remove), Opened());
 }
 
 TEST_F(FileModes, OfTheClearedLogIsW)

@@ -65,6 +65,7 @@ TEST_F(GroupMemberChanges, SetTheListWithTheGroupOrWithoutIt)
         {"another language", add, "staff", "gid=100(users) Gruppen=100(users),27(sudo)",
          "users,\"users\",\"sudo\",\"staff\""},
         {"no list", add, "staff", "gid=100(users)", "users,\"staff\""},
+        {"no equals sign", add, "staff", "gid 100(users)", "users,\"staff\""},
         {"the list after the word groups", add, "staff",
          "gid=100(users) egid=5(tty) groups=27(sudo)", "users,\"sudo\",\"staff\""},
         {"a primary group without a name", add, "staff", "gid=5000", "\"staff\""},
@@ -128,7 +129,7 @@ TEST_F(GroupMemberChanges, FailIfUsermodPrintsAnyOtherLine)
         "usermod: group 'staff' does not exist\n";
     EXPECT_EQ(change(add, "staff"), 1);
     commands_.answers[linesThatSet("jdoe,\"sudo\",\"users\"").at(1)] =
-        "usermod: `jdoe' is primary group name.\n";
+        "usermod: `jdoe' is primary group name\n";
     EXPECT_EQ(change(remove, "jdoe"), 0);
 }
 

@@ -92,6 +92,7 @@ TEST(MethodParser, SplitsATextIntoTheMethodAndItsParameters)
          ",UserAdd,:UserName::CMPI_string:::jdoe:",
          "UserAdd",
          {"UserName|CMPI_string|jdoe"}},
+        {"a colon in the method", "User:Add:x", "User:Add:x", {}},
         {"parts beyond the third",
          "UserAdd,Comment:CMPI_string:12:30",
          "UserAdd",
@@ -218,7 +219,8 @@ TEST(MethodParser, RejectsAnUnreadableDateAndKeepsTheRest)
     for (std::string const date :
          {"soon", "2010-12-31", "20101231", "20101231000000", "20101231000000.000000",
           "20101231000000.000000+", "20101231000000.000000*000", "2010123.000000+000",
-          "20101231000000.000000 +060"}) {
+          "20101231000000.000000 +060", "201012310000000.000000+000", "201012310000000.000000-000",
+          "20101231000000.0000000+000", "20101231000000.0000000-000"}) {
         std::string const text = "UserAdd,UserName:CMPI_string:jdoe,passwordExpirationDate:"
                                  "CMPI_dateTime:" +
                                  date + ",Comment:CMPI_string:Test";

@@ -1,5 +1,8 @@
 #include "sysdata/osInfo_linux.h"
 
+#include "tests/support/Lines.h"
+#include "tests/support/WideTexts.h"
+
 #include <gtest/gtest.h>
 
 #include <clocale>
@@ -96,6 +99,15 @@ TEST(CodeSet, IsThatOfTheProcessWhenNothingElseRemains)
         EXPECT_EQ(read(&OsInfo::getCodeSet, lang, "fr_FR.ISO-8859-1"), "ANSI_X3.4-1968");
     ASSERT_NE(std::setlocale(LC_ALL, "C.UTF-8"), nullptr);
     EXPECT_EQ(read(&OsInfo::getCodeSet, "en_US.", nullptr), "UTF-8");
+}
+
+TEST(Locale, IsConvertedByTheHost)
+{
+    std::setlocale(LC_ALL, "C");
+    WideTexts const texts;
+    read(&OsInfo::getLanguageEdition, "", "fr_FR");
+    read(&OsInfo::getCodeSet, "en_US.", nullptr);
+    EXPECT_EQ(texts.made, (Lines{"", "fr_FR", "en_US.", "ANSI_X3.4-1968"}));
 }
 
 } // namespace os_locale_test

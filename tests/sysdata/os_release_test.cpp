@@ -115,9 +115,9 @@ protected:
     /** The version; "none" if there is none, which also leaves the caller's text unchanged. */
     std::string of(std::string const& text)
     {
-        files_.write("/etc/release", text);
+        files_.write("/etc/kesto", text);
         std::string out = "before";
-        if (OsInfo().getKestoVersion("/etc/release", out))
+        if (OsInfo().getKestoVersion("/etc/kesto", out))
             return out;
         EXPECT_EQ(out, "before");
         return "none";

@@ -1,16 +1,15 @@
-// The reference runtime's logger and log sinks.
+// The reference runtime's log sinks.
+
+#include "mihost/runtime/Sinks.h"
 
 #include "host/VXLogger.h"
-#include "mihost/runtime/Sinks.h"
 #include "tests/support/Lines.h"
-#include "tests/support/Recording.h"
 #include "tests/support/ScratchFolder.h"
+
+#include <gtest/gtest.h>
 
 #include <cerrno>
 #include <cstdio>
-#include <gtest/gtest.h>
-#include <string>
-#include <vector>
 
 namespace sinks_test
 {
@@ -89,39 +88,6 @@ TEST(LineWriter, ReportsAFailureThatShowsOnlyAtTheEnd)
     out.write("line");
     EXPECT_EQ(out.finish(), ENOSPC);
     std::fclose(full);
-}
-
-TEST(Logger, PassesEveryArgumentOfBothCallsToTheSink)
-{
-    Recording const log;
-    char extra[] = "extra";
-    VXLogger::logLevelMessage("function", "file", 12, "category", 3000, nullptr, 0, 0, "text");
-    VXLogger::traceLevelMessage("other", "unit", 34, "dotted.category", 6000, extra, 5, 6, "more");
-    std::vector<LogRecord> const records = log.records();
-    ASSERT_EQ(records.size(), 2U);
-    auto const texts = [](LogRecord const& record) {
-        return record.function + ' ' + record.file + ' ' + record.category + ' ' + record.text;
-    };
-    auto const numbers = [](LogRecord const& record) {
-        return std::vector<int>{record.line, record.level, record.first, record.second};
-    };
-    EXPECT_FALSE(records[0].trace);
-    EXPECT_EQ(texts(records[0]), "function file category text");
-    EXPECT_EQ(numbers(records[0]), (std::vector<int>{12, 3000, 0, 0}));
-    EXPECT_TRUE(records[0].extraIsNull);
-    EXPECT_TRUE(records[1].trace);
-    EXPECT_EQ(texts(records[1]), "other unit dotted.category more");
-    EXPECT_EQ(numbers(records[1]), (std::vector<int>{34, 6000, 5, 6}));
-    EXPECT_FALSE(records[1].extraIsNull);
-}
-
-TEST(Logger, DropsMessagesWithoutASink)
-{
-    Recording const log;
-    mihost::setLogSink(nullptr);
-    VXLogger::logLevelMessage("function", "file", 12, "category", 3000, nullptr, 0, 0, "text");
-    VXLogger::traceLevelMessage("function", "file", 12, "category", 3000, nullptr, 0, 0, "text");
-    EXPECT_TRUE(log.records().empty());
 }
 
 } // namespace sinks_test

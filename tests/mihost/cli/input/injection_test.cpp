@@ -4,8 +4,10 @@
 #include "mihost/cli/input/ValueText.h"
 #include "mihost/cli/plugin/CommandGuard.h"
 #include "mihost/cli/system/Failure.h"
+#include "tests/mihost/cli/input/RightValue.h"
 #include "tests/sysdata/MethodTest.h"
 
+#include <array>
 #include <optional>
 
 namespace injection_test
@@ -22,15 +24,6 @@ constexpr char const* attacks[] = {
     "x\xC2\x85y",  "x\xFFy",   "-x",       "+1",        "x\ty",       "x\x1B[2J", "",
     "x\" \"y",     "x 2>&1",   "--help",
 };
-
-/** @return a value of the form that is accepted */
-std::string rightValue(Form form)
-{
-    return form == Form::Digits ? "7"
-           : form == Form::Path ? "/home/jdoe"
-           : form == Form::Day  ? "2030-12-31"
-                                : "jdoe";
-}
 
 /** @return the attacks, and the text with each byte from 1 to 255 at its start, middle and end */
 std::vector<std::string> variantsOf(std::string const& right)
@@ -100,7 +93,6 @@ TEST_F(Injection, IntoAnyParameterOfAnyMethodRunsNothingElse)
             // A value that occurs nowhere else in the lines.
             std::string const marker = parameter.form == Form::Path ? "/marker" : "marker";
             auto const harmless = isText ? callText(method, parameter, marker) : std::nullopt;
-            EXPECT_TRUE(callText(method, parameter, rightValue(parameter.form))) << parameter.name;
             for (std::string const& value : variantsOf(rightValue(parameter.form))) {
                 auto const text = callText(method, parameter, value);
                 if (!text)

@@ -1,7 +1,9 @@
 #include "mihost/cli/input/InputValidation.h"
 #include "mihost/cli/input/MethodCall.h"
 #include "tests/mihost/cli/Refusal.h"
+#include "tests/mihost/cli/input/RightValue.h"
 
+#include <functional>
 #include <gtest/gtest.h>
 
 namespace input_validation_test
@@ -11,10 +13,78 @@ using mihost::Form;
 using mihost::objection;
 using mihost::parseCall;
 
+/** Calls look(method, parameter, words) for every parameter of every method.
+ *
+ * words(value) returns all parameters of the method as NAME=VALUE, this one with that value.
+ */
+void forEachParameter(
+    std::function<void(mihost::Method const&, mihost::Parameter const&,
+                       std::function<std::vector<std::string>(std::string const&)> const&)> const&
+        look)
+{
+    for (auto const& method : mihost::methods())
+        for (auto const& parameter : method.parameters)
+            look(method, parameter, [&](std::string const& value) {
+                std::vector<std::string> words;
+                for (auto const& other : method.parameters)
+                    words.push_back(std::string(other.name) + "=" +
+                                    (&other == &parameter ? value : rightValue(other.form)));
+                return words;
+            });
+}
+
 std::string noSecret(std::string const&)
 {
     ADD_FAILURE() << "nothing must be prompted for";
     return "";
+}
+
+constexpr char forbidden[] = "|&;<>()$`\\\"'*?[]#~=%!{}^,:";
+
+TEST(MethodCallValues, AreRefusedForEachForbiddenByte)
+{
+    forEachParameter([](auto const& method, auto const& parameter, auto const& wordsWith) {
+        std::string const right = rightValue(parameter.form);
+        EXPECT_EQ(refusal([&] { parseCall(method.name, wordsWith(right), noSecret); }), "accepted")
+            << method.name << " " << parameter.name;
+        for (int byte = 0; byte < 256; ++byte) {
+            char const character = static_cast<char>(byte);
+            bool const isControl = byte < 0x20 || byte == 0x7F;
+            bool const isForbidden = isControl || byte >= 0x80 || // alone, such a byte is not UTF-8
+                                     std::string(forbidden).find(character) != std::string::npos;
+            if (!isForbidden)
+                continue;
+            for (std::size_t const at : {std::size_t{0}, right.size() / 2, right.size()}) {
+                std::string value = right;
+                value.insert(at, 1, character);
+                EXPECT_NE(refusal([&] { parseCall(method.name, wordsWith(value), noSecret); }),
+                          "accepted")
+                    << method.name << " " << parameter.name << " byte " << byte << " at " << at;
+            }
+        }
+    });
+}
+
+TEST(MethodCallTexts, AreRefusedForEachForbiddenByte)
+{
+    forEachParameter([](auto const& method, auto const& parameter, auto const& wordsWith) {
+        std::string const right = rightValue(parameter.form);
+        auto const call = parseCall(method.name, wordsWith(right), noSecret);
+        for (int byte = 0; byte < 256; ++byte) {
+            char const character = static_cast<char>(byte);
+            bool const isControl = byte < 0x20 || byte == 0x7F;
+            // A comma begins a new item and a colon a new part, which are refused as such.
+            if (!isControl && byte < 0x80 &&
+                std::string(forbidden).find(character) == std::string::npos)
+                continue;
+            auto broken = call;
+            for (auto& argument : broken.arguments)
+                if (argument.parameter == &parameter)
+                    argument.value.insert(1, 1, character) += "x";
+            EXPECT_NE(refusal([&] { mihost::takeApart(textOf(broken)); }), "accepted")
+                << method.name << " " << parameter.name << " byte " << byte;
+        }
+    });
 }
 
 TEST(MethodCallValues, MayHoldHarmlessCharactersAndEscapedBlanks)

@@ -356,6 +356,10 @@ TEST_F(LogReader, ReadsATimeStampInTheYearOfTheDate)
          at(2025, 12, 31, 23, 59, 59)},
         {"Jan  1 00:00:01 host\n", "Thu Dec 31 03:15:30 UTC 2026\n", "UTC0",
          at(2026, 1, 1, 0, 0, 1)},
+        {"Nov 30 10:11:12 host\n", "Fri Jan  2 03:15:30 UTC 2026\n", "UTC0",
+         at(2026, 11, 30, 10, 11, 12)},
+        {"Feb 29 12:00:00 host\n", "Sat Nov 21 03:15:30 UTC 2026\n", "UTC0", // has 28 days
+         at(2026, 3, 1, 12, 0, 0)},
         // Only fifteen characters are read: the last digit is the sixteenth.
         {"Nov  20 10:11:12 host\n", "Sat Nov 21 03:15:30 UTC 2026\n", "UTC0",
          at(2026, 11, 20, 10, 11, 1)},
